@@ -1,0 +1,38 @@
+#pragma once
+
+#include <cstdint>
+#include <limits>
+
+namespace VFontEffect::internal {
+
+/// Every conversion from floating point to a signed integer goes through here: toward zero,
+/// saturating at the limits of 32 bits, NaN to 0, as 64-bit ARM converts. A plain cast would be
+/// undefined outside the range and differs between CPUs.
+template <class Real>
+inline int32_t toInt(Real value) {
+    if (!(value == value)) return 0;
+    if (value >= static_cast<Real>(2147483648.0)) return std::numeric_limits<int32_t>::max();
+    if (value < static_cast<Real>(-2147483648.0)) return std::numeric_limits<int32_t>::min();
+    return static_cast<int32_t>(value);
+}
+
+/// The value inside [low, high]; a NaN, not being above `low`, gives `low`.
+inline float clampOrLow(float value, float low, float high) {
+    if (!(value > low)) return low;
+    return value < high ? value : high;
+}
+
+/// The value inside [low, high]; a NaN, being neither below nor above, stays.
+inline float clampKeepingNan(float value, float low, float high) {
+    if (value < low) return low;
+    return value > high ? high : value;
+}
+
+/// A 64-bit coordinate cut to the range of an int.
+inline int saturateToInt(int64_t value) {
+    constexpr int64_t kLow = std::numeric_limits<int>::min();
+    constexpr int64_t kHigh = std::numeric_limits<int>::max();
+    return static_cast<int>(value < kLow ? kLow : value > kHigh ? kHigh : value);
+}
+
+}  // namespace VFontEffect::internal
