@@ -1,0 +1,70 @@
+#include <cmath>
+#include <cstdint>
+
+#include "core/effect_types.h"
+#include "core/numeric.h"
+#include "cores/covered_fill.h"
+#include "cores/gradient_table.h"
+#include "cores/paint_input.h"
+#include "cores/property_copy.h"
+#include "voreleffect/VFECore.h"
+
+namespace VFontEffect {
+
+using namespace internal;
+
+namespace {
+
+/// Radians per degree, negated: with y downwards, positive angles turn counter-clockwise. Deliberate:
+/// seven digits, a little below pi / 180.
+constexpr float kRadiansPerDegree = -0.01745328F;
+
+constexpr int64_t kMiddleIndex = 128;
+
+/// The length of the line through the centre of a w x h box at an angle.
+float lengthAcross(float angle, float w, float h) {
+    if (std::fabs(std::tan(angle)) < h / w) return w / std::fabs(std::cos(angle));
+    return h / std::fabs(std::sin(angle));
+}
+
+}  // namespace
+
+VFLinearGradient::VFLinearGradient() : mProperty(nullptr) {
+    mEffectType = kLinearGradient;
+}
+
+VFLinearGradient::~VFLinearGradient() {
+    releaseCopy(mProperty);
+}
+
+void VFLinearGradient::setProperty(VFProperty* property) {
+    replaceCopy(mProperty, property);
+}
+
+VFProperty* VFLinearGradient::getProperty() {
+    return mProperty;
+}
+
+void VFLinearGradient::doPostProcessing(ParamPostProcessing* params) {
+    const CoverageBox box = coverageOf(params);
+    if (!box || !canFill(mProperty)) return;
+    const GradientTable table(mProperty->mGradient, mProperty->mGradientCount);
+
+    const auto w = static_cast<float>(box.width);
+    const auto h = static_cast<float>(box.height);
+    const float angle = mProperty->mAngle * kRadiansPerDegree;
+    const float step = (256.0F / mProperty->mScale) / lengthAcross(angle, w, h);
+    const float stepX = std::cos(angle) * step;
+    const float stepY = std::sin(angle) * step;
+    const float centreX = w * 0.5F;
+    const float centreY = h * 0.5F;
+    fillCovered(box, params->dstBitmap, [&](int64_t y) {
+        const float rowTerm = stepY * (static_cast<float>(y) - centreY);
+        return [&table, rowTerm, stepX, centreX](int64_t x) {
+            const float t = rowTerm + stepX * (static_cast<float>(x) - centreX);
+            return table.at(int64_t{toInt(t)} + kMiddleIndex);
+        };
+    });
+}
+
+}  // namespace VFontEffect

@@ -1,0 +1,42 @@
+#include "core/effect_types.h"
+#include "cores/glow.h"
+#include "cores/property_copy.h"
+#include "voreleffect/VFECore.h"
+
+namespace VFontEffect {
+
+using namespace internal;
+
+VFOuterGlow::VFOuterGlow() : mProperty(nullptr) {
+    mEffectType = kOuterGlow;
+}
+
+VFOuterGlow::~VFOuterGlow() {
+    releaseCopy(mProperty);
+}
+
+void VFOuterGlow::setProperty(VFProperty* property) {
+    replaceCopy(mProperty, property);
+}
+
+VFProperty* VFOuterGlow::getProperty() {
+    return mProperty;
+}
+
+int VFOuterGlow::getOffset() {
+    return glowReach(GlowRecord::of(mProperty));
+}
+
+void VFOuterGlow::makeColorLUT(unsigned int* table, float fadeStart, int curve) {
+    fillGlowTable(GlowRecord::of(mProperty), fadeStart, curve, table);
+}
+
+void VFOuterGlow::increaseByBoxFilter(unsigned char* mask, int passes, int width, int height) {
+    growByBoxFilter(mask, passes, width, height);
+}
+
+void VFOuterGlow::doPostProcessing(ParamPostProcessing* params) {
+    if (mProperty != nullptr) paintGlow(params, GlowRecord::of(mProperty), Sense::plain);
+}
+
+}  // namespace VFontEffect

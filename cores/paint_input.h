@@ -1,0 +1,55 @@
+#pragma once
+
+#include <cmath>
+#include <cstdint>
+
+#include "core/numeric.h"
+#include "core/views.h"
+#include "voreleffect/VFECore.h"
+
+/// What a core paints from: checked once, then trusted.
+namespace VFontEffect::internal {
+
+/// Sizes beyond this many pixels are no text effect, and would cost gigabytes or minutes.
+constexpr float kLargestSizePx = 1024.0F;
+
+inline bool isAbsurd(float sizePx) {
+    return sizePx > kLargestSizePx || std::isinf(sizePx);
+}
+
+/// A box of the mask that lies inside it and is not empty.
+struct CoverageBox {
+    MaskView mask;
+    int64_t left = 0;
+    int64_t top = 0;
+    int64_t width = 0;
+    int64_t height = 0;
+
+    explicit operator bool() const { return static_cast<bool>(mask); }
+
+    /// First of the `width` coverage bytes of row y of the box.
+    unsigned char* row(int64_t y) const { return mask.at(left, top + y); }
+
+    static CoverageBox of(const MaskView& mask, int64_t left, int64_t top, int64_t width,
+                          int64_t height) {
+        const bool inside = left >= 0 && top >= 0 && width > 0 && height > 0 &&
+                            left + width <= mask.width && top + height <= mask.height;
+        if (!mask || !inside) return {};
+        return {mask, left, top, width, height};
+    }
+};
+
+/// The coverage under the text box; empty when anything that a core needs is missing, when the box is
+/// empty or inverted, or when it leaves the mask.
+inline CoverageBox coverageOf(const VFECore::ParamPostProcessing* params) {
+    if (params == nullptr || params->dstBitmap == nullptr || params->textRect == nullptr) return {};
+    const VFRect& box = *params->textRect;
+    return CoverageBox::of(MaskView::of(params->srcBitmap), box.mLeft, box.mTop,
+                           int64_t{box.mRight} - box.mLeft, int64_t{box.mBottom} - box.mTop);
+}
+
+/// Blend modes of the blender's entry points.
+constexpr int kModeSrcOver = 1;
+constexpr int kModeDstOver = 2;
+
+}  // namespace VFontEffect::internal

@@ -1,0 +1,31 @@
+#pragma once
+
+#include <algorithm>
+#include <cmath>
+#include <cstdint>
+
+#include "core/numeric.h"
+
+/// What both shadows derive from their record.
+namespace VFontEffect::internal {
+
+struct ShadowOffset {
+    int x;
+    int y;
+};
+
+/// How far the shadow is moved, in whole pixels rounded half away from zero. The angle names where
+/// the light comes from, with y downwards; the shadow falls on the far side.
+inline ShadowOffset shadowOffset(float angleDeg, float distancePx) {
+    const float angle = angleDeg * 3.14159F / 180.0F;
+    const float across = std::cos(angle) * distancePx;
+    const float down = std::sin(angle) * distancePx;
+    return {toInt((across < 0.0F ? 0.5F : -0.5F) - across), toInt(down + (down > 0.0F ? 0.5F : -0.5F))};
+}
+
+/// The blur radius of a shadow; a negative size does not blur.
+inline int shadowRadius(float sizePx) {
+    return std::max(0, toInt(static_cast<double>(sizePx) + 0.5));
+}
+
+}  // namespace VFontEffect::internal
