@@ -1,0 +1,129 @@
+#include <algorithm>
+
+#include "core/effect_types.h"
+#include "core/numeric.h"
+#include "effect/normalise.h"
+#include "property/limits.h"
+#include "voreleffect/VFEffect.h"
+
+namespace VFontEffect {
+
+using namespace internal;
+
+namespace {
+
+template <class Shadow>
+Shadow shadowRecord(float angle, float distance, float size, unsigned int color, float opacity) {
+    const float o = clampedOpacity(opacity);
+    return Shadow(wholeDegrees(angle, 360), wholePixels(distance), wholePixels(size),
+                  premultipliedColour(color, o), o);
+}
+
+/// Bevel and emboss: each colour carries the product of the effect's opacity and its own.
+template <class Relief>
+Relief reliefRecord(int style, float size, float depth, int technique, int direction, int soften,
+                    float opacity, float angle, float altitude, unsigned int highlightColor,
+                    float highlightOpacity, unsigned int shadowColor, float shadowOpacity) {
+    const float o = clampedOpacity(opacity);
+    const float highlight = clampedOpacity(highlightOpacity);
+    const float shadow = clampedOpacity(shadowOpacity);
+    return Relief(style, size, clampOrLow(depth, 0.0F, kLargestDepth), technique, direction,
+                  std::clamp(soften, 0, kLargestSoften), o, wholeDegrees(angle, 360),
+                  wholeDegrees(altitude, 90),
+                  straightColour(highlightColor, clampedOpacity(o * highlight)), highlight,
+                  straightColour(shadowColor, clampedOpacity(o * shadow)), shadow);
+}
+
+}  // namespace
+
+unsigned int VFEffect::addOuterShadowText(float angle, float distance, float size, unsigned int color,
+                                          float opacity) {
+    auto record = shadowRecord<VFOuterShadowProperty>(angle, distance, size, color, opacity);
+    return static_cast<unsigned int>(addEffect(kOuterShadow, &record));
+}
+
+unsigned int VFEffect::addInnerShadowText(float angle, float distance, float size, unsigned int color,
+                                          float opacity) {
+    auto record = shadowRecord<VFInnerShadowProperty>(angle, distance, size, color, opacity);
+    return static_cast<unsigned int>(addEffect(kInnerShadow, &record));
+}
+
+unsigned int VFEffect::addOuterGlowText(float size, unsigned int color, float opacity, int count,
+                                        VFGradient* gradient) {
+    const float o = clampedOpacity(opacity);
+    NormalisedStops stops(gradient, count, o);
+    VFOuterGlowProperty record(wholePixels(size), straightColour(color, o), o, stops.count(),
+                               stops.data());
+    return static_cast<unsigned int>(addEffect(kOuterGlow, &record));
+}
+
+unsigned int VFEffect::addInnerGlowText(float size, unsigned int color, float opacity, int count,
+                                        VFGradient* gradient) {
+    const float o = clampedOpacity(opacity);
+    NormalisedStops stops(gradient, count, o);
+    VFInnerGlowProperty record(wholePixels(size), straightColour(color, o), o, stops.count(),
+                               stops.data());
+    return static_cast<unsigned int>(addEffect(kInnerGlow, &record));
+}
+
+unsigned int VFEffect::addBevelText(int style, float size, float depth, int technique, int direction,
+                                    int soften, float opacity, float angle, float altitude,
+                                    unsigned int highlightColor, float highlightOpacity,
+                                    unsigned int shadowColor, float shadowOpacity) {
+    auto record = reliefRecord<VFBevelProperty>(style, size, depth, technique, direction, soften,
+                                                opacity, angle, altitude, highlightColor,
+                                                highlightOpacity, shadowColor, shadowOpacity);
+    return static_cast<unsigned int>(addEffect(kBevel, &record));
+}
+
+unsigned int VFEffect::addEmbossText(int style, float size, float depth, int technique, int direction,
+                                     int soften, float opacity, float angle, float altitude,
+                                     unsigned int highlightColor, float highlightOpacity,
+                                     unsigned int shadowColor, float shadowOpacity) {
+    auto record = reliefRecord<VFEmbossProperty>(style, size, depth, technique, direction, soften,
+                                                 opacity, angle, altitude, highlightColor,
+                                                 highlightOpacity, shadowColor, shadowOpacity);
+    return static_cast<unsigned int>(addEffect(kEmboss, &record));
+}
+
+unsigned int VFEffect::addLinearGradientText(float angle, float scale, float opacity, int count,
+                                             VFGradient* gradient) {
+    const float o = clampedOpacity(opacity);
+    NormalisedStops stops(gradient, count, o);
+    VFLinearGradientProperty record(wholeDegrees(angle, 360),
+                                    clampOrLow(scale, 0.0F, kLargestGradientScale), o, stops.count(),
+                                    stops.data());
+    return static_cast<unsigned int>(addEffect(kLinearGradient, &record));
+}
+
+unsigned int VFEffect::addRadialGradientText(float scale, float opacity, int count,
+                                             VFGradient* gradient) {
+    const float o = clampedOpacity(opacity);
+    NormalisedStops stops(gradient, count, o);
+    // Deliberate: the record has an angle, the call offers none.
+    VFRadialGradientProperty record(0.0F, clampOrLow(scale, 0.0F, kLargestGradientScale), o,
+                                    stops.count(), stops.data());
+    return static_cast<unsigned int>(addEffect(kRadialGradient, &record));
+}
+
+unsigned int VFEffect::addStrokeText(float size, unsigned int color, float opacity, int strokeStyle,
+                                     int position) {
+    const float o = clampedOpacity(opacity);
+    VFStrokeProperty record(wholePixels(size), premultipliedColour(color, o), o, strokeStyle, position);
+    return static_cast<unsigned int>(addEffect(kStroke, &record));
+}
+
+unsigned int VFEffect::addPatternText(VFBitmap* pattern, float scale, float opacity) {
+    VFPatternProperty record(pattern, clampOrLow(scale, 0.0F, kLargestPatternScale),
+                             clampedOpacity(opacity));
+    return static_cast<unsigned int>(addEffect(kPattern, &record));
+}
+
+unsigned int VFEffect::addText(unsigned int color, float opacity) {
+    mTextAlpha = static_cast<unsigned char>(color >> 24);
+    const float o = clampedOpacity(opacity);
+    VFTextProperty record(premultipliedColour(color, o), o);
+    return static_cast<unsigned int>(addEffect(kText, &record));
+}
+
+}  // namespace VFontEffect

@@ -1,0 +1,32 @@
+#include <cstddef>
+#include <new>
+
+#include "voreleffect/VFEffect.h"
+
+namespace VFontEffect {
+
+char* VFEffect::getMapKey() {
+    std::size_t reserved = 0;
+    for (VFECore* core : mEffects) {
+        if (VFProperty* record = core->getProperty()) {
+            reserved += static_cast<std::size_t>(record->getSequentialCharLength());
+        }
+    }
+    // Zeroed, because some records write less than they reserve: equal looks give equal keys to the
+    // last byte, and a set that writes nothing gives an empty string.
+    char* key = new (std::nothrow) char[reserved + 1]();
+    if (key == nullptr) return nullptr;
+    char* cursor = key;
+    for (VFECore* core : mEffects) {
+        if (VFProperty* record = core->getProperty()) record->toSequentialChar(&cursor);
+    }
+    return key;
+}
+
+char* VFEffect::getMapKey(unsigned int color) {
+    mTextColor = color;
+    addText(color, mTextOpacity);
+    return getMapKey();
+}
+
+}  // namespace VFontEffect
