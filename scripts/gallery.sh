@@ -1,0 +1,20 @@
+#!/usr/bin/env bash
+# Paints docs/gallery: every preset at 48 and 160 pixels, on a dark and on a light background.
+set -euo pipefail
+cd "$(dirname "$0")/.."
+
+scripts/demo.sh > /dev/null
+paint=build/demo/tools/vorelpaint
+mkdir -p docs/gallery
+rm -f docs/gallery/*.png
+
+declare -A backgrounds=([dark]='#23272E' [light]='#F4F1EA')
+for preset in $("$paint" --list-presets | awk '{print $1}'); do
+    for shade in dark light; do
+        common=(--preset "$preset" --background "${backgrounds[$shade]}")
+        "$paint" "${common[@]}" --font 'DejaVu Sans:bold' --size 160 --padding 16 \
+            -o "docs/gallery/$preset-160-$shade.png" "Type"
+        "$paint" "${common[@]}" --font 'DejaVu Sans:bold' --size 48 --effect-scale 0.5 \
+            -o "docs/gallery/$preset-48-$shade.png" "Summer Sale: 50% Off"
+    done
+done

@@ -1,0 +1,70 @@
+#include "file_io.h"
+
+#include <gtest/gtest.h>
+
+#include <filesystem>
+
+#include "error.h"
+#include "program.h"
+
+namespace vorelpaint {
+namespace {
+
+using vorel_test::readBytes;
+using vorel_test::TempDir;
+
+void writeNew(std::FILE* file) {
+    std::fputs("new", file);
+}
+
+void writeHalfAndFail(std::FILE* file) {
+    std::fputs("ne", file);
+    throw ToolError("the pen broke");
+}
+
+TEST(FileIo, WriteFile_ReplacesTheOldFile) {
+    const TempDir dir;
+    const std::string path = dir.write("a", "something older");
+    writeFile(path, writeNew);
+    EXPECT_EQ(readBytes(path), "new");
+    EXPECT_EQ(dir.list(), std::vector<std::string>{"a"});
+}
+
+TEST(FileIo, WriteFile_FailureLeavesTheOldFileAndNothingElse) {
+    const TempDir dir;
+    const std::string path = dir.write("a", "old");
+    EXPECT_THROW(writeFile(path, writeHalfAndFail), ToolError);
+    EXPECT_THROW(writeFile(dir.file("b"), writeHalfAndFail), ToolError);
+    EXPECT_EQ(readBytes(path), "old");
+    EXPECT_EQ(dir.list(), std::vector<std::string>{"a"});
+}
+
+TEST(FileIo, WriteFile_ThroughALinkReplacesItsTarget) {
+    const TempDir dir;
+    const std::string target = dir.write("target", "old");
+    std::filesystem::create_symlink(target, dir.file("link"));
+    writeFile(dir.file("link"), writeNew);
+    EXPECT_EQ(readBytes(target), "new");
+    EXPECT_TRUE(std::filesystem::is_symlink(dir.file("link")));
+}
+
+TEST(FileIo, WriteFile_DeviceWithoutSpaceIsReported) {
+    EXPECT_THROW(writeFile("/dev/full", writeNew), ToolError);
+}
+
+TEST(FileIo, ReadFile_StopsAtTheLimit) {
+    const TempDir dir;
+    const std::string path = dir.write("a", "12345");
+    EXPECT_EQ(readFile(path, 5), "12345");
+    EXPECT_THROW(readFile(path, 4), ToolError);
+    EXPECT_THROW(readFile("/dev/zero", 1000), ToolError);
+}
+
+TEST(FileIo, ReadFile_RefusesWhatIsNoFile) {
+    const TempDir dir;
+    EXPECT_THROW(readFile(dir.path().string(), 10), ToolError);
+    EXPECT_THROW(readFile(dir.file("none"), 10), ToolError);
+}
+
+}  // namespace
+}  // namespace vorelpaint

@@ -1,0 +1,40 @@
+#pragma once
+
+#include <filesystem>
+#include <string>
+#include <vector>
+
+namespace vorel_test {
+
+/// A directory of its own for one test, removed with everything in it.
+class TempDir {
+  public:
+    TempDir();
+    ~TempDir();
+    TempDir(const TempDir&) = delete;
+    TempDir& operator=(const TempDir&) = delete;
+
+    const std::filesystem::path& path() const { return mPath; }
+    std::string file(const std::string& name) const { return (mPath / name).string(); }
+    std::string write(const std::string& name, const std::string& bytes) const;  ///< the file's path
+    std::vector<std::string> list() const;                                       ///< sorted names
+
+  private:
+    std::filesystem::path mPath;
+};
+
+std::string readBytes(const std::filesystem::path& path);
+
+struct Outcome {
+    int exitCode;  ///< -1 when a signal ended the program
+    std::string out;
+    std::string err;
+};
+
+/// Runs vorelpaint with these arguments and this standard input to its end.
+Outcome runVorelpaint(const std::vector<std::string>& arguments, const std::string& input = "");
+
+/// The same with standard output going to `outPath`.
+Outcome runVorelpaintInto(const std::string& outPath, const std::vector<std::string>& arguments);
+
+}  // namespace vorel_test

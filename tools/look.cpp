@@ -1,0 +1,162 @@
+#include "look.h"
+
+#include <voreleffect/VFBitmap.h>
+
+#include <algorithm>
+#include <memory>
+#include <new>
+#include <utility>
+#include <variant>
+
+#include "png_io.h"
+
+namespace vorelpaint {
+namespace {
+
+using VFontEffect::VFBitmap;
+using VFontEffect::VFEffect;
+using VFontEffect::VFGlyph;
+using VFontEffect::VFGradient;
+
+constexpr unsigned int kNoCore = 0xFFFFFFFFU;
+
+int countOf(const Stops& stops) {
+    return static_cast<int>(stops.size());
+}
+
+/// The library reads stops without changing them, but takes a pointer to mutable ones.
+VFGradient* dataOf(const Stops& stops) {
+    return const_cast<VFGradient*>(stops.data());
+}
+
+/// The library's patterns are A, R, G, B in memory.
+VFBitmap patternBitmap(Image image) {
+    for (size_t at = 0; at < image.pixels.size(); at += 4) {
+        std::rotate(&image.pixels[at], &image.pixels[at + 3], &image.pixels[at] + 4);
+    }
+    return {static_cast<unsigned int>(image.width), static_cast<unsigned int>(image.height),
+            image.pixels.data(), 4};
+}
+
+Image readPattern(const std::filesystem::path& path) {
+    try {
+        return readPng(path);
+    } catch (const ToolError& error) {
+        throw StyleError(std::string("pattern.image: ") + error.what());
+    }
+}
+
+/// Makes the add-call of one effect and returns its result.
+class AddCall {
+  public:
+    AddCall(VFEffect& effects, const Style& style, uint32_t fill, float textOpacity)
+        : mEffects(effects), mStyle(style), mFill(fill), mTextOpacity(textOpacity) {}
+
+    unsigned int operator()(const OuterShadow& e) const {
+        return mEffects.addOuterShadowText(e.angle, e.distance, e.size, e.color, e.opacity);
+    }
+    unsigned int operator()(const InnerShadow& e) const {
+        return mEffects.addInnerShadowText(e.angle, e.distance, e.size, e.color, e.opacity);
+    }
+    unsigned int operator()(const OuterGlow& e) const {
+        return mEffects.addOuterGlowText(e.size, e.color, e.opacity, countOf(e.gradient),
+                                         dataOf(e.gradient));
+    }
+    unsigned int operator()(const InnerGlow& e) const {
+        return mEffects.addInnerGlowText(e.size, e.color, e.opacity, countOf(e.gradient),
+                                         dataOf(e.gradient));
+    }
+    unsigned int operator()(const Bevel& e) const { return addRelief(&VFEffect::addBevelText, e); }
+    unsigned int operator()(const Emboss& e) const { return addRelief(&VFEffect::addEmbossText, e); }
+    unsigned int operator()(const LinearGradient& e) const {
+        return mEffects.addLinearGradientText(e.angle, e.scale, e.opacity, countOf(e.gradient),
+                                              dataOf(e.gradient));
+    }
+    unsigned int operator()(const RadialGradient& e) const {
+        return mEffects.addRadialGradientText(e.scale, e.opacity, countOf(e.gradient),
+                                              dataOf(e.gradient));
+    }
+    unsigned int operator()(const Stroke& e) const {
+        return mEffects.addStrokeText(e.size, e.color, e.opacity, e.strokeStyle, e.position);
+    }
+    unsigned int operator()(const Pattern& e) const {
+        VFBitmap bitmap = patternBitmap(readPattern(mStyle.baseDir / e.image));
+        return mEffects.addPatternText(&bitmap, e.scale, e.opacity);
+    }
+    unsigned int operator()(const TextFill& e) const {
+        return mEffects.addText(mFill, e.opacity * mTextOpacity);
+    }
+
+  private:
+    template <typename Call>
+    unsigned int addRelief(Call call, const Relief& e) const {
+        return (mEffects.*call)(e.style, e.size, e.depth, e.technique, e.direction, e.soften, e.opacity,
+                                e.angle, e.altitude, e.highlightColor, e.highlightOpacity, e.shadowColor,
+                                e.shadowOpacity);
+    }
+
+    VFEffect& mEffects;
+    const Style& mStyle;
+    uint32_t mFill;
+    float mTextOpacity;
+};
+
+bool hasTextFill(const Style& style) {
+    return std::any_of(style.effects.begin(), style.effects.end(),
+                       [](const Effect& effect) { return std::holds_alternative<TextFill>(effect); });
+}
+
+void checkSize(int width, int height) {
+    const bool fits = width <= TextLayout::kMaxSide && height <= TextLayout::kMaxSide &&
+                      int64_t{width} * height <= Look::kMaxPixels;
+    if (fits) return;
+    throw ToolError("the picture would be " + std::to_string(width) + " x " + std::to_string(height) +
+                    " pixels; at most " + std::to_string(TextLayout::kMaxSide) + " on a side and " +
+                    std::to_string(Look::kMaxPixels) + " in all");
+}
+
+}  // namespace
+
+Look::Look(const Style& style, uint32_t fill, float textOpacity) {
+    mEffects.setTextOpacity(textOpacity);
+    const AddCall add(mEffects, style, fill, textOpacity);
+    for (const Effect& effect : style.effects) {
+        if (std::visit(add, effect) == kNoCore) mUnpainted.emplace_back(effectName(effect));
+    }
+    const std::unique_ptr<char[]> key(hasTextFill(style) ? mEffects.getMapKey()
+                                                         : mEffects.getMapKey(fill));
+    if (!key) throw std::bad_alloc();
+    mKey = key.get();
+}
+
+Margins Look::margins() {
+    return {mEffects.getLeftOffset(), mEffects.getTopOffset(), mEffects.getRightOffset(),
+            mEffects.getBottomOffset()};
+}
+
+Image Look::paint(const TextLayout& text, int padding) {
+    const Margins space = margins();
+    const Box& ink = text.inkBox();
+    const int width = ink.width() + space.left + space.right + 2 * padding;
+    const int height = ink.height() + space.top + space.bottom + 2 * padding;
+    checkSize(width, height);
+
+    mEffects.initEffect(width, height);
+    VFBitmap picture(static_cast<unsigned int>(width), static_cast<unsigned int>(height), 4);
+    if (picture.mData == nullptr) throw std::bad_alloc();
+    mEffects.setDstBitmap(&picture);
+    for (size_t i = 0; i < text.glyphCount(); ++i) {
+        GlyphMask mask = text.rasterise(i);
+        VFGlyph glyph{mask.coverage.data(), static_cast<unsigned short>(mask.box.width()),
+                      static_cast<unsigned short>(mask.box.height())};
+        mEffects.renderEffectLayer(mask.box.left - ink.left + space.left + padding,
+                                   mask.box.top - ink.top + space.top + padding, &glyph);
+    }
+    mEffects.doEffectPostProcessing();
+    mEffects.compositeLayers(&picture);
+
+    const size_t bytes = static_cast<size_t>(width) * static_cast<size_t>(height) * 4;
+    return {width, height, std::vector<uint8_t>(picture.mData, picture.mData + bytes)};
+}
+
+}  // namespace vorelpaint

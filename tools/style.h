@@ -1,0 +1,116 @@
+#pragma once
+
+#include <voreleffect/VFBitmap.h>
+
+#include <cstdint>
+#include <filesystem>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <variant>
+#include <vector>
+
+#include "error.h"
+
+/// A look as a style file describes it: one record per add-call of the library, in file order.
+/// The fields carry the names, units and ranges of the add-calls' arguments (VFEffect.h); colours
+/// are 0xRRGGBB.
+namespace vorelpaint {
+
+using Stops = std::vector<VFontEffect::VFGradient>;
+
+struct Shadow {
+    float angle;
+    float distance;
+    float size;
+    uint32_t color;
+    float opacity;
+};
+struct OuterShadow : Shadow {};
+struct InnerShadow : Shadow {};
+
+struct Glow {
+    float size;
+    uint32_t color;
+    float opacity;
+    Stops gradient;  ///< empty: the glow has the one colour `color`
+};
+struct OuterGlow : Glow {};
+struct InnerGlow : Glow {};
+
+struct Relief {
+    int style;
+    float size;
+    float depth;
+    int technique;
+    int direction;
+    int soften;
+    float opacity;
+    float angle;
+    float altitude;
+    uint32_t highlightColor;
+    float highlightOpacity;
+    uint32_t shadowColor;
+    float shadowOpacity;
+};
+struct Bevel : Relief {};
+struct Emboss : Relief {};
+
+struct LinearGradient {
+    float angle;
+    float scale;
+    float opacity;
+    Stops gradient;
+};
+
+struct RadialGradient {
+    float scale;
+    float opacity;
+    Stops gradient;
+};
+
+struct Stroke {
+    float size;
+    uint32_t color;
+    float opacity;
+    int strokeStyle;
+    int position;  ///< 0 centre, 1 outside, 2 inside
+};
+
+struct Pattern {
+    std::filesystem::path image;  ///< a PNG file, relative to Style::baseDir
+    float scale;
+    float opacity;
+};
+
+struct TextFill {
+    uint32_t color;
+    float opacity;
+};
+
+using Effect = std::variant<OuterShadow, InnerShadow, OuterGlow, InnerGlow, Bevel, Emboss,
+                            LinearGradient, RadialGradient, Stroke, Pattern, TextFill>;
+
+/// The effect's key in a style file, such as "outerShadow".
+std::string_view effectName(const Effect& effect);
+
+struct Style {
+    std::string description;
+    std::optional<uint32_t> color;     ///< the fill, unless the caller chooses one
+    std::optional<float> textOpacity;  ///< the text's opacity, unless the caller chooses one
+    std::vector<Effect> effects;       ///< in the order of the file: the last lies on top
+    std::filesystem::path baseDir;
+};
+
+/// What is wrong in a style file: where in it (a path such as "outerShadow.size", or the line of a
+/// syntax error), then the fault and the range.
+class StyleError : public ToolError {
+  public:
+    using ToolError::ToolError;
+};
+
+/// Reads a style file's text. Relative paths in it start from `baseDir`; no file is opened.
+/// Throws StyleError.
+Style parseStyle(std::string_view json, const std::filesystem::path& baseDir);
+
+}  // namespace vorelpaint

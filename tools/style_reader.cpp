@@ -1,0 +1,169 @@
+#include <array>
+#include <utility>
+
+#include "json_object.h"
+#include "style.h"
+
+namespace vorelpaint {
+namespace {
+
+constexpr Range kUnit{0, 1};
+constexpr Range kAngle{-360, 360};
+constexpr Range kAltitude{0, 90};
+constexpr Range kPixels{0, 100};
+constexpr Range kStopCount{1, 256};
+constexpr Range kCode{0, 255};
+// The library draws nothing below a scale of 0.1.
+constexpr Range kGradientScale{0.1, 2};
+constexpr Range kPatternScale{0.1, 10};
+constexpr Range kDepth{0, 10};
+constexpr Range kSoften{0, 16};
+
+Stops readStops(const JsonObject& effect) {
+    constexpr std::string_view kKey = "gradient";
+    Stops stops;
+    for (const Json& element : effect.array(kKey, kStopCount)) {
+        const std::string path = effect.pathOf(kKey) + "[" + std::to_string(stops.size()) + "]";
+        const JsonObject stop(element, path, {"color", "opacity", "location"});
+        const float location = stop.number("location", kUnit);
+        if (!stops.empty() && location < stops.back().mLocation) {
+            stop.fail("location", "lies before the stop that precedes it");
+        }
+        stops.push_back({stop.color("color"), stop.number("opacity", kUnit, 1.0F), location});
+    }
+    return stops;
+}
+
+Shadow readShadow(const Json& value, const char* name) {
+    const JsonObject effect(value, name, {"angle", "distance", "size", "color", "opacity"});
+    return {effect.number("angle", kAngle), effect.number("distance", kPixels),
+            effect.number("size", kPixels), effect.color("color"),
+            effect.number("opacity", kUnit, 1.0F)};
+}
+
+/// A glow takes its colours from the stops where there are any, else from `color`.
+Glow readGlow(const Json& value, const char* name) {
+    const JsonObject effect(value, name, {"size", "color", "opacity", "gradient"});
+    const bool hasStops = effect.has("gradient");
+    const std::optional<uint32_t> unused = hasStops ? std::optional<uint32_t>(0) : std::nullopt;
+    return {effect.number("size", kPixels), effect.color("color", unused),
+            effect.number("opacity", kUnit, 1.0F), hasStops ? readStops(effect) : Stops{}};
+}
+
+Relief readRelief(const Json& value, const char* name) {
+    const JsonObject effect(
+        value, name,
+        {"style", "size", "depth", "technique", "direction", "soften", "opacity", "angle", "altitude",
+         "highlightColor", "highlightOpacity", "shadowColor", "shadowOpacity"});
+    return {effect.integer("style", kCode, 0),
+            effect.number("size", kPixels),
+            effect.number("depth", kDepth, 1.0F),
+            effect.integer("technique", kCode, 0),
+            effect.integer("direction", kCode, 0),
+            effect.integer("soften", kSoften, 0),
+            effect.number("opacity", kUnit, 1.0F),
+            effect.number("angle", kAngle),
+            effect.number("altitude", kAltitude),
+            effect.color("highlightColor"),
+            effect.number("highlightOpacity", kUnit, 1.0F),
+            effect.color("shadowColor"),
+            effect.number("shadowOpacity", kUnit, 1.0F)};
+}
+
+Effect readLinearGradient(const Json& value, const char* name) {
+    const JsonObject effect(value, name, {"angle", "scale", "opacity", "gradient"});
+    return LinearGradient{effect.number("angle", kAngle), effect.number("scale", kGradientScale, 1.0F),
+                          effect.number("opacity", kUnit, 1.0F), readStops(effect)};
+}
+
+Effect readRadialGradient(const Json& value, const char* name) {
+    const JsonObject effect(value, name, {"scale", "opacity", "gradient"});
+    return RadialGradient{effect.number("scale", kGradientScale, 1.0F),
+                          effect.number("opacity", kUnit, 1.0F), readStops(effect)};
+}
+
+Effect readStroke(const Json& value, const char* name) {
+    const JsonObject effect(value, name, {"size", "color", "opacity", "strokeStyle", "position"});
+    return Stroke{effect.number("size", kPixels), effect.color("color"),
+                  effect.number("opacity", kUnit, 1.0F), effect.integer("strokeStyle", kCode, 0),
+                  effect.choice("position", {"center", "outside", "inside"})};
+}
+
+Effect readPattern(const Json& value, const char* name) {
+    const JsonObject effect(value, name, {"image", "scale", "opacity"});
+    const std::string image = effect.string("image");
+    if (image.empty()) effect.fail("image", "must name a PNG file");
+    return Pattern{image, effect.number("scale", kPatternScale, 1.0F),
+                   effect.number("opacity", kUnit, 1.0F)};
+}
+
+Effect readTextFill(const Json& value, const char* name) {
+    const JsonObject effect(value, name, {"color", "opacity"});
+    return TextFill{effect.color("color"), effect.number("opacity", kUnit, 1.0F)};
+}
+
+template <typename Kind, auto kRead>
+Effect readAs(const Json& value, const char* name) {
+    return Kind{kRead(value, name)};
+}
+
+struct EffectKind {
+    const char* name;
+    Effect (*read)(const Json& value, const char* name);
+};
+
+/// The keys of a style file in the order of the alternatives of Effect.
+constexpr std::array<EffectKind, std::variant_size_v<Effect>> kEffectKinds{{
+    {"outerShadow", readAs<OuterShadow, readShadow>},
+    {"innerShadow", readAs<InnerShadow, readShadow>},
+    {"outerGlow", readAs<OuterGlow, readGlow>},
+    {"innerGlow", readAs<InnerGlow, readGlow>},
+    {"bevel", readAs<Bevel, readRelief>},
+    {"emboss", readAs<Emboss, readRelief>},
+    {"linearGradient", readLinearGradient},
+    {"radialGradient", readRadialGradient},
+    {"stroke", readStroke},
+    {"pattern", readPattern},
+    {"text", readTextFill},
+}};
+
+std::vector<std::string_view> knownKeys() {
+    std::vector<std::string_view> keys{"description", "color", "textOpacity"};
+    for (const EffectKind& kind : kEffectKinds)
+        keys.emplace_back(kind.name);
+    return keys;
+}
+
+void refuseSecondFill(const Style& style) {
+    if (!style.color) return;
+    for (const Effect& effect : style.effects) {
+        if (std::holds_alternative<TextFill>(effect)) {
+            throw StyleError("color: the fill has its colour in text.color already");
+        }
+    }
+}
+
+}  // namespace
+
+std::string_view effectName(const Effect& effect) {
+    return kEffectKinds[effect.index()].name;
+}
+
+Style parseStyle(std::string_view json, const std::filesystem::path& baseDir) {
+    const Json root = parseJson(json);
+    const JsonObject file(root, "", knownKeys());
+    Style style;
+    style.baseDir = baseDir;
+    if (file.has("description")) style.description = file.string("description");
+    if (file.has("color")) style.color = file.color("color");
+    if (file.has("textOpacity")) style.textOpacity = file.number("textOpacity", kUnit);
+    for (const auto& item : root.items()) {
+        for (const EffectKind& kind : kEffectKinds) {
+            if (item.key() == kind.name) style.effects.push_back(kind.read(item.value(), kind.name));
+        }
+    }
+    refuseSecondFill(style);
+    return style;
+}
+
+}  // namespace vorelpaint
