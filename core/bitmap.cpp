@@ -13,8 +13,12 @@ unsigned int formatOf(unsigned int bytesPerPixel) {
 }
 
 /// The byte count of a bitmap's buffer: the product of its numbers in 32-bit unsigned arithmetic.
+unsigned int byteCount(unsigned int width, unsigned int height, unsigned int bytesPerPixel) {
+    return width * height * bytesPerPixel;
+}
+
 unsigned int byteCount(const VFBitmap& bitmap) {
-    return bitmap.mWidth * bitmap.mHeight * bitmap.mBytesPerPixel;
+    return byteCount(bitmap.mWidth, bitmap.mHeight, bitmap.mBytesPerPixel);
 }
 
 unsigned char* allocateZeroed(size_t bytes) {
@@ -56,7 +60,7 @@ VFBitmap::VFBitmap() : mWidth(0), mHeight(0), mData(nullptr), mFormat(4), mBytes
 VFBitmap::VFBitmap(unsigned int width, unsigned int height, unsigned int bytesPerPixel)
     : mWidth(width),
       mHeight(height),
-      mData(allocateZeroed(width * height * bytesPerPixel)),
+      mData(allocateZeroed(byteCount(width, height, bytesPerPixel))),
       mFormat(formatOf(bytesPerPixel)),
       mBytesPerPixel(bytesPerPixel) {}
 

@@ -1,0 +1,20 @@
+#!/usr/bin/env bash
+# Checks the layout (clang-format) and the code (clang-tidy) of everything that is tracked.
+#
+#     scripts/format.sh            check; fails on the first difference or finding
+#     scripts/format.sh --fix      lay the sources out anew first
+set -euo pipefail
+cd "$(dirname "$0")/.."
+source scripts/packages.sh
+
+need_packages clang-format-14 clang-tidy-14
+
+mapfile -t sources < <(git ls-files --cached --others --exclude-standard '*.h' '*.cpp')
+if [[ "${1:-}" == --fix ]]; then clang-format-14 -i "${sources[@]}"; fi
+clang-format-14 --dry-run --Werror "${sources[@]}"
+
+database=build/release
+[[ -f $database/compile_commands.json ]] || scripts/test.sh release
+printf '%s\n' "${sources[@]}" | grep -E '^(core|property|blend|effect|cores|tools)/.*\.cpp$' |
+    xargs -P "$(nproc)" -n 4 clang-tidy-14 --quiet -p "$database" 2> /dev/null
+echo "layout and code are clean"

@@ -1,0 +1,24 @@
+#!/usr/bin/env bash
+# Builds the project three times and runs all tests in each: g++ Release, clang with AddressSanitizer
+# and UndefinedBehaviorSanitizer, and 64-bit ARM under qemu. Installs what it needs on Debian (as root).
+#
+#     scripts/test.sh              all three builds
+#     scripts/test.sh release      one of them: release, sanitize, arm64 or dev
+set -euo pipefail
+cd "$(dirname "$0")/.."
+. scripts/packages.sh
+
+need_packages cmake ninja-build g++ clang-14 libclang-rt-14-dev pkg-config \
+    googletest libgtest-dev libbenchmark-dev libstb-dev android-liblog-dev \
+    libraqm-dev libfreetype-dev libfribidi-dev libharfbuzz-dev libfontconfig-dev libpng-dev \
+    nlohmann-json3-dev libcli11-dev fontconfig fonts-dejavu-core \
+    g++-aarch64-linux-gnu qemu-user-static
+
+presets=("$@")
+[[ $# -gt 0 ]] || presets=(release sanitize arm64)
+for preset in "${presets[@]}"; do
+    echo "== $preset"
+    cmake --preset "$preset" > /dev/null
+    cmake --build --preset "$preset" -- --quiet
+    ctest --preset "$preset" --parallel "$(nproc)" --progress
+done
