@@ -1,4 +1,7 @@
+#include <cstdint>
+
 #include "blend/rows.h"
+#include "core/blend_modes.h"
 #include "core/views.h"
 #include "voreleffect/VFBlender.h"
 
@@ -68,9 +71,6 @@ void blendWords(int x, int y, const VFBitmap* dst, const unsigned int* source, i
 
 /// Deliberate: a byte source skips one byte, not one pixel, per column left of the destination.
 constexpr int kByteSourceSkip = 1;
-
-constexpr int kModeSrcOver = 1;
-constexpr int kModeDstOver = 2;
 
 constexpr int kOrderArgb = 0;
 constexpr int kOrderRgba = 1;

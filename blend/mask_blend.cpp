@@ -1,4 +1,7 @@
+#include <cstdint>
+
 #include "blend/rows.h"
+#include "core/blend_modes.h"
 #include "core/views.h"
 #include "voreleffect/VFBlender.h"
 
@@ -33,11 +36,6 @@ void blendMask(int x, int y, const VFBitmap* dst, const unsigned char* mask, int
                                   mask + (row - y) * maskStride + (clip.left - x), color};
     });
 }
-
-constexpr int kModeSrcOver = 1;
-constexpr int kModeDstOver = 2;
-constexpr int kModeDstOverGate = 3;
-constexpr int kModeDstOverClip = 7;
 
 }  // namespace
 

@@ -86,7 +86,7 @@ struct DstOverMask {
     }
 };
 
-/// Colour under the destination wherever the mask is not 0.
+/// Colour under the destination wherever the mask is not 0. Deliberate: the mask does not scale it.
 struct DstOverGate {
     template <class L>
     static Pixel<L> apply(const Pixel<L>& d, L mask, const Pixel<L>& colour) {
@@ -96,7 +96,8 @@ struct DstOverGate {
     }
 };
 
-/// Colour under the destination, then the whole pixel times the mask.
+/// Colour under the destination, then the whole pixel times the mask. Deliberate: erases whatever lies
+/// where the mask is 0.
 struct DstOverClip {
     template <class L>
     static Pixel<L> apply(const Pixel<L>& d, L mask, const Pixel<L>& colour) {

@@ -28,6 +28,17 @@ inline float clampKeepingNan(float value, float low, float high) {
     return value > high ? high : value;
 }
 
+/// Whole degrees within a turn, with the sign of the angle.
+inline int32_t reducedDegrees(float degrees, int32_t turn) {
+    return toInt(degrees) % turn;
+}
+
+/// Whole degrees in 0..turn - 1.
+inline int32_t wholeDegrees(float degrees, int32_t turn) {
+    const int32_t reduced = reducedDegrees(degrees, turn);
+    return reduced < 0 ? reduced + turn : reduced;
+}
+
 /// A 64-bit coordinate cut to the range of an int.
 inline int saturateToInt(int64_t value) {
     constexpr int64_t kLow = std::numeric_limits<int>::min();

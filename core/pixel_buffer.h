@@ -20,17 +20,13 @@ class PixelBuffer {
     explicit PixelBuffer(T* block) : mData(block) {}
 
     PixelBuffer(PixelBuffer&& other) noexcept : mData(std::exchange(other.mData, nullptr)) {}
-    PixelBuffer& operator=(PixelBuffer&& other) noexcept {
-        std::swap(mData, other.mData);
-        return *this;
-    }
+    PixelBuffer& operator=(PixelBuffer&&) = delete;
     ~PixelBuffer() { std::free(mData); }
 
     explicit operator bool() const { return mData != nullptr; }
     T* data() { return mData; }
     const T* data() const { return mData; }
     T& operator[](size_t i) { return mData[i]; }
-    const T& operator[](size_t i) const { return mData[i]; }
 
   private:
     /// More than this for one working buffer is no size of a text effect.

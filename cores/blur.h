@@ -1,7 +1,6 @@
 #pragma once
 
 #include <cstdint>
-#include <cstring>
 
 #include "core/pixel_buffer.h"
 #include "cores/padded_mask.h"

@@ -1,6 +1,7 @@
-#include <cmath>
+#include <cstdint>
 
 #include "core/numeric.h"
+#include "core/portable_math.h"
 #include "cores/blur.h"
 
 namespace VFontEffect::internal {
@@ -17,7 +18,7 @@ BlurKernel makeKernel(int radius, uint32_t centre, Round round) {
     const float spread = static_cast<float>(radius) * static_cast<float>(radius) / kLn100;
     for (int i = 1; i <= radius; ++i) {
         const auto weight =
-            static_cast<uint32_t>(round(std::exp(static_cast<float>(-(i * i)) / spread)));
+            static_cast<uint32_t>(round(portableExp(static_cast<float>(-(i * i)) / spread)));
         kernel.weights[static_cast<size_t>(i)] = weight;
         kernel.total += 2 * weight;
     }

@@ -2,6 +2,7 @@
 
 #include <cstdint>
 
+#include "core/blend_modes.h"
 #include "core/numeric.h"
 #include "core/pixel_buffer.h"
 #include "cores/paint_input.h"
@@ -9,9 +10,12 @@
 
 namespace VFontEffect::internal {
 
+/// A gradient or pattern below this scale draws nothing. A NaN is not below it.
+constexpr float kSmallestScale = 0.1F;
+
 /// Fills the covered pixels of a box and blends them beneath what the destination holds.
 /// `shaderOf(y)` gives the shader of a row, `shader(x)` the premultiplied colour word of a pixel, both
-/// counted from the box's corner. Coverage gates a pixel; it does not scale its colour.
+/// counted from the box's corner. Deliberate: coverage gates a pixel, it does not scale its colour.
 template <class ShaderOf>
 void fillCovered(const CoverageBox& box, const VFBitmap* destination, ShaderOf shaderOf) {
     auto image = PixelBuffer<unsigned int>::zeroed(box.width, box.height);

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cstdint>
 
+#include "core/blend_modes.h"
 #include "core/fixed_point.h"
 #include "core/numeric.h"
 #include "core/pixel_buffer.h"
@@ -17,7 +18,8 @@ namespace {
 constexpr float kFadeStart = 0.3F;
 constexpr int kCurve = 0;
 
-/// The glow's pictures are `pad` = whole size + 1 pixels per step of their construction.
+/// `pad`, the whole size + 1, is the unit of a glow: growth and blur are fractions of it, the margin is
+/// twice of it.
 int growthPasses(int pad) {
     return std::max(1, toInt(pad * 0.4750000089406967));
 }
@@ -52,13 +54,14 @@ void paintGlow(const VFECore::ParamPostProcessing* params, const GlowRecord& rec
     if (!mask || !kernel || !image) return;
     const int width = saturateToInt(mask.width);
     const int height = saturateToInt(mask.height);
-    growByBoxFilter(mask.bytes.data(), growthPasses(pad), width, height);
+    if (!growByBoxFilter(mask.bytes.data(), growthPasses(pad), width, height)) return;
 
     std::fill_n(image.data(), mask.width * mask.height, borderWord(sense));
     const int64_t inner = mask.width - 2 * int64_t{kernel.radius};
     const bool blurred = blurPlane(mask, kernel, sense, [&](int64_t y, const uint8_t* values) {
         unsigned int* const row = image.data() + y * mask.width + kernel.radius;
-        // Strong values lie near the text, at the start of the table.
+        // Strong values lie near the text, at the start of the table. Deliberate: values end at 255, so
+        // entry 0 is never taken.
         for (int64_t x = 0; x < inner; ++x)
             row[x] = table[kTableLast - values[x]];
     });

@@ -67,11 +67,11 @@ void fillGlowTable(const GlowRecord& record, float fadeStart, int curve, unsigne
 }
 
 // Deliberate: the sum of nine is divided by 4, so every pass brightens as well as spreads.
-void growByBoxFilter(unsigned char* mask, int passes, int width, int height) {
-    if (mask == nullptr || passes < 1 || width < 1 || height <= 2) return;
+bool growByBoxFilter(unsigned char* mask, int passes, int width, int height) {
+    if (mask == nullptr || passes < 1 || width < 1 || height <= 2) return true;
     auto above = PixelBuffer<uint8_t>::uninitialised(width);
     auto grown = PixelBuffer<uint8_t>::zeroed(width);
-    if (!above || !grown) return;
+    if (!above || !grown) return false;
     const auto rowBytes = static_cast<size_t>(width);
     for (int pass = 0; pass < passes; ++pass) {
         // A row is replaced only after its old values were saved for the row below it.
@@ -89,6 +89,7 @@ void growByBoxFilter(unsigned char* mask, int passes, int width, int height) {
             std::memcpy(row, grown.data(), rowBytes);
         }
     }
+    return true;
 }
 
 }  // namespace VFontEffect::internal

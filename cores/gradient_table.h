@@ -2,6 +2,7 @@
 
 #include <cstdint>
 
+#include "cores/covered_fill.h"
 #include "cores/stop_ramp.h"
 
 namespace VFontEffect::internal {
@@ -22,9 +23,6 @@ class GradientTable {
 
     uint32_t mColours[kTableSize];
 };
-
-/// A gradient below this scale draws nothing; so does a pattern. A NaN is not below it.
-constexpr float kSmallestScale = 0.1F;
 
 /// Whether a gradient record has what it takes to draw.
 template <class Property>

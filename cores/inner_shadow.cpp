@@ -1,5 +1,7 @@
 #include <algorithm>
+#include <cstdint>
 
+#include "core/blend_modes.h"
 #include "core/effect_types.h"
 #include "core/numeric.h"
 #include "cores/blur.h"
@@ -14,6 +16,9 @@ namespace VFontEffect {
 using namespace internal;
 
 namespace {
+
+// Deliberate: the shadow is painted over the whole box, and is 255 outside the glyphs. The text fill, or
+// the composite, takes away what lies outside them.
 
 /// Whether the moved, blurred glyph still meets the box.
 ///

@@ -3,6 +3,7 @@
 
 #include "core/effect_types.h"
 #include "core/numeric.h"
+#include "core/portable_math.h"
 #include "cores/covered_fill.h"
 #include "cores/gradient_table.h"
 #include "cores/paint_input.h"
@@ -23,8 +24,8 @@ constexpr int64_t kMiddleIndex = 128;
 
 /// The length of the line through the centre of a w x h box at an angle.
 float lengthAcross(float angle, float w, float h) {
-    if (std::fabs(std::tan(angle)) < h / w) return w / std::fabs(std::cos(angle));
-    return h / std::fabs(std::sin(angle));
+    if (std::fabs(portableTan(angle)) < h / w) return w / std::fabs(portableCos(angle));
+    return h / std::fabs(portableSin(angle));
 }
 
 }  // namespace
@@ -54,8 +55,8 @@ void VFLinearGradient::doPostProcessing(ParamPostProcessing* params) {
     const auto h = static_cast<float>(box.height);
     const float angle = mProperty->mAngle * kRadiansPerDegree;
     const float step = (256.0F / mProperty->mScale) / lengthAcross(angle, w, h);
-    const float stepX = std::cos(angle) * step;
-    const float stepY = std::sin(angle) * step;
+    const float stepX = portableCos(angle) * step;
+    const float stepY = portableSin(angle) * step;
     const float centreX = w * 0.5F;
     const float centreY = h * 0.5F;
     fillCovered(box, params->dstBitmap, [&](int64_t y) {

@@ -1,5 +1,8 @@
 #include <algorithm>
+#include <cstdint>
+#include <cstring>
 
+#include "core/blend_modes.h"
 #include "core/effect_types.h"
 #include "core/numeric.h"
 #include "cores/blur.h"
@@ -73,7 +76,8 @@ void VFOuterShadow::doPostProcessing(ParamPostProcessing* params) {
     const CoverageBox box = coverageOf(params);
     if (!box || mProperty == nullptr || isAbsurd(mProperty->mSize)) return;
 
-    // A margin of twice the blur's reach: every tap of every pixel that is not 0 lies inside.
+    // Deliberate: a margin of twice the blur's reach: every tap of every pixel that is not 0 lies
+    // inside.
     const int radius = shadowRadius(mProperty->mSize);
     const int64_t margin = 2 * int64_t{radius};
     const Placement place = {box.left - margin + mOffsetX, box.top - margin + mOffsetY,

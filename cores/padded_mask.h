@@ -8,8 +8,8 @@
 
 namespace VFontEffect::internal {
 
-/// Whether a padded mask holds the coverage with an empty border, or 255 minus the coverage with a
-/// full one.
+/// Whether a step gives its values or 255 minus them: a padded mask the coverage with an empty border or
+/// its inverse with a full one, a blur the mean of the taps or its inverse.
 enum class Sense { plain, inverted };
 
 /// A plane of bytes in working memory; empty when memory ran out.

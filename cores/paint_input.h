@@ -48,8 +48,4 @@ inline CoverageBox coverageOf(const VFECore::ParamPostProcessing* params) {
                            int64_t{box.mRight} - box.mLeft, int64_t{box.mBottom} - box.mTop);
 }
 
-/// Blend modes of the blender's entry points.
-constexpr int kModeSrcOver = 1;
-constexpr int kModeDstOver = 2;
-
 }  // namespace VFontEffect::internal

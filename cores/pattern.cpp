@@ -6,7 +6,6 @@
 #include "core/fixed_point.h"
 #include "core/numeric.h"
 #include "cores/covered_fill.h"
-#include "cores/gradient_table.h"
 #include "cores/paint_input.h"
 #include "cores/property_copy.h"
 #include "voreleffect/VFECore.h"
@@ -71,8 +70,8 @@ uint32_t sample(const ColourView& pattern, const Tap& x, const Tap& y, float opa
     return premultiply(alpha << 24 | channel(1) << 16 | channel(2) << 8 | channel(3));
 }
 
-/// The covered box. Unlike the other cores' boxes it may reach beyond the right and bottom edges of the
-/// mask as far as its size is cut to that of the mask.
+/// The covered box. Unlike the other cores' boxes, one larger than the mask is first cut to the mask's
+/// size; unless it starts at the left or top edge it still leaves the mask then, and nothing is drawn.
 CoverageBox fillBox(const VFECore::ParamPostProcessing* params) {
     if (params == nullptr || params->dstBitmap == nullptr || params->textRect == nullptr) return {};
     const MaskView mask = MaskView::of(params->srcBitmap);

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <new>
 
 #include "voreleffect/VFProperty.h"
@@ -44,48 +45,67 @@ inline VFPatternProperty* rebuilt(const VFPatternProperty& p) {
     return new (std::nothrow) VFPatternProperty(p.mPattern, p.mScale, p.mOpacity);
 }
 
-/// Gives a copy its own stop array, where the record has one.
-template <class Record>
-auto ownContents(Record& copy, int) -> decltype(copy.mGradient, bool()) {
-    const VFGradient* const shared = copy.mGradient;
-    if (shared == nullptr) return true;
-    const int count = copy.mGradientCount > 0 ? copy.mGradientCount : 0;
-    copy.mGradient = new (std::nothrow) VFGradient[static_cast<size_t>(count)];
-    for (int i = 0; copy.mGradient != nullptr && i < count; ++i)
-        copy.mGradient[i] = shared[i];
-    return copy.mGradient != nullptr;
+/// Puts a copy in the place of a shared stop array; false when memory ran out.
+inline bool ownStops(VFGradient*& stops, int count) {
+    if (stops == nullptr) return true;
+    const VFGradient* const shared = stops;
+    const auto own = static_cast<std::size_t>(count > 0 ? count : 0);
+    stops = new (std::nothrow) VFGradient[own];
+    for (std::size_t i = 0; stops != nullptr && i < own; ++i)
+        stops[i] = shared[i];
+    return stops != nullptr;
 }
 
-/// Gives a copy its own pattern bitmap, where the record has one.
-template <class Record>
-auto ownContents(Record& copy, int) -> decltype(copy.mPattern, bool()) {
-    if (copy.mPattern == nullptr) return true;
-    copy.mPattern = new (std::nothrow) VFBitmap(*copy.mPattern);
-    return copy.mPattern != nullptr;
+/// Puts a copy in the place of a shared bitmap; false when memory ran out.
+inline bool ownBitmap(VFBitmap*& bitmap) {
+    if (bitmap == nullptr) return true;
+    const VFBitmap* const shared = bitmap;
+    bitmap = new (std::nothrow) VFBitmap(*shared);
+    return bitmap != nullptr && (bitmap->mData != nullptr || shared->mData == nullptr);
 }
 
-template <class Record>
-bool ownContents(Record& /*copy*/, long) {
+/// Gives a copy its own array or bitmap, where its class has one. Even when that fails it holds nothing
+/// shared afterwards.
+inline bool ownContents(VFProperty& /*copy*/) {
     return true;
 }
-
-template <class Record>
-auto releaseContents(Record& owned, int) -> decltype(owned.mGradient, void()) {
-    delete[] owned.mGradient;
+inline bool ownContents(VFOuterGlowProperty& p) {
+    return ownStops(p.mGradient, p.mGradientCount);
+}
+inline bool ownContents(VFInnerGlowProperty& p) {
+    return ownStops(p.mGradient, p.mGradientCount);
+}
+inline bool ownContents(VFLinearGradientProperty& p) {
+    return ownStops(p.mGradient, p.mGradientCount);
+}
+inline bool ownContents(VFRadialGradientProperty& p) {
+    return ownStops(p.mGradient, p.mGradientCount);
+}
+inline bool ownContents(VFPatternProperty& p) {
+    return ownBitmap(p.mPattern);
 }
 
-template <class Record>
-auto releaseContents(Record& owned, int) -> decltype(owned.mPattern, void()) {
-    delete owned.mPattern;
+inline void releaseContents(VFProperty& /*owned*/) {}
+inline void releaseContents(VFOuterGlowProperty& p) {
+    delete[] p.mGradient;
 }
-
-template <class Record>
-void releaseContents(Record& /*owned*/, long) {}
+inline void releaseContents(VFInnerGlowProperty& p) {
+    delete[] p.mGradient;
+}
+inline void releaseContents(VFLinearGradientProperty& p) {
+    delete[] p.mGradient;
+}
+inline void releaseContents(VFRadialGradientProperty& p) {
+    delete[] p.mGradient;
+}
+inline void releaseContents(VFPatternProperty& p) {
+    delete p.mPattern;
+}
 
 /// Destroys a core's own record with the array or bitmap that came with it.
 template <class Record>
 void releaseCopy(Record* owned) {
-    if (owned != nullptr) releaseContents(*owned, 0);
+    if (owned != nullptr) releaseContents(*owned);
     delete owned;
 }
 
@@ -97,8 +117,8 @@ bool replaceCopy(Record*& stored, const VFProperty* given) {
     if (given == nullptr) return false;
     Record* copy = rebuilt(static_cast<const Record&>(*given));
     if (copy == nullptr) return false;
-    if (!ownContents(*copy, 0)) {
-        delete copy;
+    if (!ownContents(*copy)) {
+        releaseCopy(copy);
         return false;
     }
     releaseCopy(stored);

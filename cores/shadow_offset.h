@@ -1,10 +1,9 @@
 #pragma once
 
 #include <algorithm>
-#include <cmath>
-#include <cstdint>
 
 #include "core/numeric.h"
+#include "core/portable_math.h"
 
 /// What both shadows derive from their record.
 namespace VFontEffect::internal {
@@ -15,11 +14,12 @@ struct ShadowOffset {
 };
 
 /// How far the shadow is moved, in whole pixels rounded half away from zero. The angle names where
-/// the light comes from, with y downwards; the shadow falls on the far side.
+/// the light comes from, with y downwards; the shadow falls on the far side. Deliberate: only the
+/// horizontal move is negated, and pi has six digits.
 inline ShadowOffset shadowOffset(float angleDeg, float distancePx) {
     const float angle = angleDeg * 3.14159F / 180.0F;
-    const float across = std::cos(angle) * distancePx;
-    const float down = std::sin(angle) * distancePx;
+    const float across = portableCos(angle) * distancePx;
+    const float down = portableSin(angle) * distancePx;
     return {toInt((across < 0.0F ? 0.5F : -0.5F) - across), toInt(down + (down > 0.0F ? 0.5F : -0.5F))};
 }
 

@@ -1,6 +1,7 @@
 #include <algorithm>
 #include <cstdint>
 
+#include "core/blend_modes.h"
 #include "core/effect_types.h"
 #include "core/numeric.h"
 #include "core/pixel_buffer.h"

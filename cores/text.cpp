@@ -1,3 +1,4 @@
+#include "core/blend_modes.h"
 #include "core/effect_types.h"
 #include "core/numeric.h"
 #include "core/views.h"
@@ -8,15 +9,6 @@
 namespace VFontEffect {
 
 using namespace internal;
-
-namespace {
-
-/// Blend modes of drawBitmapBlend8. In layered mode the fill only slides under what is there; else
-/// it also clips everything painted so far to the glyph.
-constexpr int kLayeredMode = 3;
-constexpr int kClippingMode = 7;
-
-}  // namespace
 
 VFText::VFText() : mProperty(nullptr) {
     mEffectType = kText;
@@ -38,10 +30,12 @@ void VFText::doPostProcessing(ParamPostProcessing* params) {
     if (params == nullptr || mProperty == nullptr || params->dstBitmap == nullptr) return;
     const MaskView mask = MaskView::of(params->srcBitmap);
     if (!mask) return;
+    // In layered mode the fill only slides beneath what is there; else it also clips everything painted
+    // so far to the glyph.
+    const int mode = params->useOuterLayer == 1 ? kModeDstOverGate : kModeDstOverClip;
     const int width = saturateToInt(mask.width);
     VFBlender().drawBitmapBlend8(0, 0, params->dstBitmap, mask.data, width, saturateToInt(mask.height),
-                                 width, mProperty->mColor,
-                                 params->useOuterLayer == 1 ? kLayeredMode : kClippingMode);
+                                 width, mProperty->mColor, mode);
 }
 
 }  // namespace VFontEffect

@@ -15,8 +15,17 @@ namespace {
 template <class Shadow>
 Shadow shadowRecord(float angle, float distance, float size, unsigned int color, float opacity) {
     const float o = clampedOpacity(opacity);
-    return Shadow(wholeDegrees(angle, 360), wholePixels(distance), wholePixels(size),
-                  premultipliedColour(color, o), o);
+    return Shadow(static_cast<float>(wholeDegrees(angle, kTurn)), wholePixels(distance),
+                  wholePixels(size), premultipliedColour(color, o), o);
+}
+
+template <class Glow>
+unsigned int addGlow(VFEffect& set, int type, float size, unsigned int color, float opacity, int count,
+                     const VFGradient* gradient) {
+    const float o = clampedOpacity(opacity);
+    NormalisedStops stops(gradient, count, o);
+    Glow record(wholePixels(size), straightColour(color, o), o, stops.count(), stops.data());
+    return static_cast<unsigned int>(set.addEffect(type, &record));
 }
 
 /// Bevel and emboss: each colour carries the product of the effect's opacity and its own.
@@ -28,8 +37,9 @@ Relief reliefRecord(int style, float size, float depth, int technique, int direc
     const float highlight = clampedOpacity(highlightOpacity);
     const float shadow = clampedOpacity(shadowOpacity);
     return Relief(style, size, clampOrLow(depth, 0.0F, kLargestDepth), technique, direction,
-                  std::clamp(soften, 0, kLargestSoften), o, wholeDegrees(angle, 360),
-                  wholeDegrees(altitude, 90),
+                  std::clamp(soften, 0, kLargestSoften), o,
+                  static_cast<float>(wholeDegrees(angle, kTurn)),
+                  static_cast<float>(wholeDegrees(altitude, kQuarterTurn)),
                   straightColour(highlightColor, clampedOpacity(o * highlight)), highlight,
                   straightColour(shadowColor, clampedOpacity(o * shadow)), shadow);
 }
@@ -50,20 +60,12 @@ unsigned int VFEffect::addInnerShadowText(float angle, float distance, float siz
 
 unsigned int VFEffect::addOuterGlowText(float size, unsigned int color, float opacity, int count,
                                         VFGradient* gradient) {
-    const float o = clampedOpacity(opacity);
-    NormalisedStops stops(gradient, count, o);
-    VFOuterGlowProperty record(wholePixels(size), straightColour(color, o), o, stops.count(),
-                               stops.data());
-    return static_cast<unsigned int>(addEffect(kOuterGlow, &record));
+    return addGlow<VFOuterGlowProperty>(*this, kOuterGlow, size, color, opacity, count, gradient);
 }
 
 unsigned int VFEffect::addInnerGlowText(float size, unsigned int color, float opacity, int count,
                                         VFGradient* gradient) {
-    const float o = clampedOpacity(opacity);
-    NormalisedStops stops(gradient, count, o);
-    VFInnerGlowProperty record(wholePixels(size), straightColour(color, o), o, stops.count(),
-                               stops.data());
-    return static_cast<unsigned int>(addEffect(kInnerGlow, &record));
+    return addGlow<VFInnerGlowProperty>(*this, kInnerGlow, size, color, opacity, count, gradient);
 }
 
 unsigned int VFEffect::addBevelText(int style, float size, float depth, int technique, int direction,
@@ -90,7 +92,7 @@ unsigned int VFEffect::addLinearGradientText(float angle, float scale, float opa
                                              VFGradient* gradient) {
     const float o = clampedOpacity(opacity);
     NormalisedStops stops(gradient, count, o);
-    VFLinearGradientProperty record(wholeDegrees(angle, 360),
+    VFLinearGradientProperty record(static_cast<float>(wholeDegrees(angle, kTurn)),
                                     clampOrLow(scale, 0.0F, kLargestGradientScale), o, stops.count(),
                                     stops.data());
     return static_cast<unsigned int>(addEffect(kLinearGradient, &record));

@@ -1,3 +1,5 @@
+#include <cstdint>
+
 #include "blend/rows.h"
 #include "core/views.h"
 #include "voreleffect/VFEffect.h"

@@ -5,6 +5,7 @@
 
 namespace VFontEffect {
 
+// Deliberate: fragments follow the list, whose order planning changes; they are not sorted.
 char* VFEffect::getMapKey() {
     std::size_t reserved = 0;
     for (VFECore* core : mEffects) {

@@ -32,12 +32,6 @@ inline uint32_t premultipliedColour(uint32_t color, float opacity) {
     return premultiply(straightColour(color, opacity));
 }
 
-/// Whole degrees in 0..turn - 1.
-inline float wholeDegrees(float degrees, int turn) {
-    const int32_t whole = toInt(degrees) % turn;
-    return static_cast<float>(whole < 0 ? whole + turn : whole);
-}
-
 /// Whole pixels in 0..100.
 inline float wholePixels(float pixels) {
     return static_cast<float>(std::clamp(toInt(pixels), 0, kLargestPixelSize));

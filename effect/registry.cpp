@@ -1,4 +1,5 @@
 #include <algorithm>
+#include <cstdint>
 #include <new>
 
 #include "core/effect_types.h"
@@ -49,6 +50,7 @@ VFEffect::VFEffect(const VFEffect& other)
       mNextEffectId(other.mNextEffectId),
       mTextAlpha(other.mTextAlpha),
       mOrdered(other.mOrdered) {
+    mEffects.reserve(other.mEffects.size());
     for (VFECore* core : other.mEffects)
         addEffect(core->getId(), core->getStyle(), core->getProperty());
 }
@@ -62,6 +64,7 @@ int VFEffect::addEffect(int id, int type, VFProperty* property) {
     mOrdered = false;
     VFECore* core = getEffect(type);
     if (core == nullptr) {
+        mEffects.reserve(mEffects.size() + 1);  // before a core exists that could be lost
         core = createEffect(id, type, nullptr);
         if (core == nullptr) return -1;
         mEffects.push_back(core);
@@ -92,6 +95,7 @@ VFECore* VFEffect::getEffect(int type) {
     return found != mEffects.end() ? *found : nullptr;
 }
 
+// Deliberate: the rest of the list stays in paint order, or out of it, as it was.
 bool VFEffect::removeEffect(int id) {
     const auto found = std::find_if(mEffects.begin(), mEffects.end(),
                                     [id](VFECore* core) { return core->getId() == id; });
@@ -131,7 +135,7 @@ bool VFEffect::hasEffects() {
 }
 
 void VFEffect::setTextOpacity(float opacity) {
-    // Compared as given: an opacity above 1 re-arms the ordering every time it is set.
+    // Deliberate: compared as given, so an opacity above 1 re-arms the ordering every time it is set.
     if (opacity != mTextOpacity) mOrdered = false;
     mTextOpacity = clampOrLow(opacity, 0.0F, 1.0F);
 }

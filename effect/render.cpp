@@ -1,5 +1,5 @@
 #include <algorithm>
-#include <limits>
+#include <cstdint>
 
 #include "core/numeric.h"
 #include "effect/routing.h"

@@ -29,7 +29,8 @@ enum class Target { destination, outerLayer, both };
 
 inline Target strokeTarget(int position) {
     // Deliberate: here only position 2 is inside, while isUnderEffect takes every position but 0 and
-    // 1 for inside. An unknown position paints over the text, into the outer layer.
+    // 1 for inside. An unknown position paints into the outer layer, which the composite hides where
+    // the glyph covers.
     if (position == kStrokeCentre) return Target::both;
     return position == kStrokeInside ? Target::destination : Target::outerLayer;
 }

@@ -1,8 +1,13 @@
 #pragma once
 
-/// Upper limits that the records and the add-calls clamp to; the lower limit of each is 0.
+/// What the records and the add-calls clamp and reduce to.
 namespace VFontEffect::internal {
 
+/// Degrees after which an angle or an altitude starts again.
+constexpr int kTurn = 360;
+constexpr int kQuarterTurn = 90;
+
+/// Upper limits; the lower limit of each is 0.
 constexpr float kLargestGradientScale = 2.0F;
 constexpr float kLargestPatternScale = 10.0F;
 constexpr float kLargestDepth = 10.0F;

@@ -8,15 +8,6 @@ namespace VFontEffect {
 
 using namespace internal;
 
-namespace {
-
-/// Whole degrees within one turn, with the sign of the angle.
-float reduced(float degrees, int turn) {
-    return static_cast<float>(toInt(degrees) % turn);
-}
-
-}  // namespace
-
 VFProperty::VFProperty(unsigned int color, float opacity) : mColor(color), mOpacity(opacity) {}
 VFProperty::~VFProperty() = default;
 
@@ -29,7 +20,10 @@ VFOuterShadowProperty::VFOuterShadowProperty(float angle, float distance, float 
 
 VFInnerShadowProperty::VFInnerShadowProperty(float angle, float distance, float size, unsigned int color,
                                              float opacity)
-    : VFProperty(color, opacity), mAngle(reduced(angle, 360)), mDistance(distance), mSize(size) {}
+    : VFProperty(color, opacity),
+      mAngle(static_cast<float>(reducedDegrees(angle, kTurn))),
+      mDistance(distance),
+      mSize(size) {}
 
 VFStrokeProperty::VFStrokeProperty(float size, unsigned int color, float opacity, int strokeStyle,
                                    int position)
@@ -46,7 +40,7 @@ VFInnerGlowProperty::VFInnerGlowProperty(float size, unsigned int color, float o
 VFLinearGradientProperty::VFLinearGradientProperty(float angle, float scale, float opacity, int count,
                                                    VFGradient* gradient)
     : VFProperty(0, opacity),
-      mAngle(reduced(angle, 360)),
+      mAngle(static_cast<float>(reducedDegrees(angle, kTurn))),
       mScale(clampKeepingNan(scale, 0.0F, kLargestGradientScale)),
       mGradientCount(count),
       mGradient(gradient) {}
@@ -54,7 +48,7 @@ VFLinearGradientProperty::VFLinearGradientProperty(float angle, float scale, flo
 VFRadialGradientProperty::VFRadialGradientProperty(float angle, float scale, float opacity, int count,
                                                    VFGradient* gradient)
     : VFProperty(0, opacity),
-      mAngle(reduced(angle, 360)),
+      mAngle(static_cast<float>(reducedDegrees(angle, kTurn))),
       mScale(clampKeepingNan(scale, 0.0F, kLargestGradientScale)),
       mGradientCount(count),
       mGradient(gradient) {}
@@ -70,8 +64,8 @@ VFBevelProperty::VFBevelProperty(int style, float size, float depth, int techniq
       mTechnique(technique),
       mDirection(direction),
       mSoften(std::clamp(soften, 0, kLargestSoften)),
-      mAngle(reduced(angle, 360)),
-      mAltitude(reduced(altitude, 90)),
+      mAngle(static_cast<float>(reducedDegrees(angle, kTurn))),
+      mAltitude(static_cast<float>(reducedDegrees(altitude, kQuarterTurn))),
       mHighlightColor(highlightColor),
       mHighlightOpacity(highlightOpacity),
       mShadowColor(shadowColor),
@@ -88,8 +82,8 @@ VFEmbossProperty::VFEmbossProperty(int style, float size, float depth, int techn
       mTechnique(technique),
       mDirection(direction),
       mSoften(std::clamp(soften, 0, kLargestSoften)),
-      mAngle(reduced(angle, 360)),
-      mAltitude(reduced(altitude, 90)),
+      mAngle(static_cast<float>(reducedDegrees(angle, kTurn))),
+      mAltitude(static_cast<float>(reducedDegrees(altitude, kQuarterTurn))),
       mHighlightColor(highlightColor),
       mHighlightOpacity(highlightOpacity),
       mShadowColor(shadowColor),

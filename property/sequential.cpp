@@ -1,13 +1,12 @@
-#include <limits>
-
-#include "core/numeric.h"
 #include "property/sequential_writer.h"
 #include "voreleffect/VFProperty.h"
 
 namespace VFontEffect {
 
-using internal::saturateToInt;
 using internal::SequentialWriter;
+
+// Deliberate: opacities of gradients, stops, bevel and emboss do not enter the key, and the small fields
+// keep 7 bits, the scale of a gradient 8.
 
 namespace {
 
@@ -27,12 +26,9 @@ constexpr int kReliefChars =
     kLetter + kSmall + kBytePair + kQuad + 3 * kSmall + kAngle + kSmall + 2 * kWord;
 constexpr int kPatternChars = 17;
 
-/// Deliberate: a stop reserves one character more than it writes.
-constexpr int64_t kStopChars = kWord + kSmall + 1;
-
 /// Reserved characters of a record with stops.
 int withStops(int fixedChars, int count) {
-    return count < 1 ? fixedChars : saturateToInt(fixedChars + kStopChars * count);
+    return fixedChars + SequentialWriter::kReservedStopChars * SequentialWriter::keptStops(count);
 }
 
 /// Lets `write` fill a fragment that starts with `letter`, and moves the cursor past it.

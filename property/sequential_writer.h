@@ -1,8 +1,11 @@
 #pragma once
 
+#include <algorithm>
 #include <cstdint>
+#include <limits>
 
 #include "core/numeric.h"
+#include "property/limits.h"
 #include "voreleffect/VFBitmap.h"
 
 namespace VFontEffect::internal {
@@ -19,6 +22,15 @@ class SequentialWriter {
     static constexpr int kBytePairChars = 2;
     static constexpr int kQuadChars = 4;
 
+    /// Deliberate: a stop reserves one character more than it writes.
+    static constexpr int kReservedStopChars = kWordChars + kSmallChars + 1;
+
+    /// As many stops as a fragment can reserve characters for.
+    static int keptStops(int count) {
+        constexpr int kMostStops = std::numeric_limits<int>::max() / kReservedStopChars - 10;
+        return std::clamp(count, 0, kMostStops);
+    }
+
     SequentialWriter(char* start, char letter) : mAt(start) { *mAt++ = letter; }
 
     /// A 32-bit word as eight nibbles, the highest first.
@@ -30,8 +42,7 @@ class SequentialWriter {
 
     /// Whole degrees in 0..359 as 2 + 7 bits.
     SequentialWriter& angle(float degrees) {
-        int32_t whole = toInt(degrees) % 360;
-        if (whole < 0) whole += 360;
+        const int32_t whole = wholeDegrees(degrees, kTurn);
         return small(whole >> 7).small(whole);
     }
 
@@ -47,7 +58,7 @@ class SequentialWriter {
 
     /// Each stop is its colour and its position in hundredths. No array counts as no stops.
     SequentialWriter& stops(const VFGradient* gradient, int count) {
-        for (int i = 0; gradient != nullptr && i < count; ++i) {
+        for (int i = 0; gradient != nullptr && i < keptStops(count); ++i) {
             word(gradient[i].mColor).small(gradient[i].mLocation * 100.0F);
         }
         return *this;

@@ -13,8 +13,8 @@ mapfile -t sources < <(git ls-files --cached --others --exclude-standard '*.h' '
 if [[ "${1:-}" == --fix ]]; then clang-format-14 -i "${sources[@]}"; fi
 clang-format-14 --dry-run --Werror "${sources[@]}"
 
-database=build/release
-[[ -f $database/compile_commands.json ]] || scripts/test.sh release
+database=build/sanitize
+[[ -f $database/compile_commands.json ]] || scripts/test.sh sanitize
 printf '%s\n' "${sources[@]}" | grep -E '^(core|property|blend|effect|cores|tools)/.*\.cpp$' |
     xargs -P "$(nproc)" -n 4 clang-tidy-14 --quiet -p "$database" 2> /dev/null
 echo "layout and code are clean"

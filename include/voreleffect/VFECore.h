@@ -7,9 +7,6 @@
 ///
 /// VFEffect (VFEffect.h) makes, owns and drives them; a caller needs this header only to look at a
 /// core that VFEffect::getEffect returned, or to drive one by hand.
-///
-/// A program that derives classes of its own from these or from VFProperty is compiled with
-/// -fno-rtti, as the library is: the library carries no type information to derive from.
 namespace VFontEffect {
 
 /// The interface of an effect core. The virtual operations stand in slot order, the destructor first.

@@ -99,7 +99,8 @@ class VF_API VFEffect {
                                int position);
 
     /// A bitmap tiled over the text from the top left corner of its box. The bitmap has 4 bytes per
-    /// pixel in memory order A, R, G, B, straight. Scale 0..10; below 0.1 nothing is drawn.
+    /// pixel in memory order A, R, G, B, straight. Scale 0..10; below 0.1 nothing is drawn, nor for a
+    /// bitmap that is null, has no pixels or another number of bytes per pixel.
     unsigned int addPatternText(VFBitmap* pattern, float scale, float opacity);
 
     /// The plain fill. Also called by getMapKey(color) with the text opacity.
@@ -109,17 +110,19 @@ class VF_API VFEffect {
 
     /// Gives `property` (copied; null leaves the core without a new record) to the core of that
     /// type, made with this id if there is none; a negative id asks for the next of the counter.
-    /// Returns the id of the core that holds it, or -1 when there is no core of that type.
+    /// Returns the id of the core that holds it, or -1 when there is no core of that type or memory ran
+    /// out.
     int addEffect(int id, int type, VFProperty* property);
     int addEffect(int type, VFProperty* property);
 
-    /// Makes a core that is not in the list; the caller owns it. Null for a type without a core.
+    /// Makes a core that is not in the list; the caller owns it. Null for a type without a core, or when
+    /// memory ran out.
     VFECore* createEffect(int id, int type, VFECore* ignored);
 
     int getNewEffectId();               ///< takes the next id from the counter
     VFECore* getEffect(int type);       ///< the core of that type, owned by the set, or null
     bool removeEffect(int id);          ///< destroys the core of that id; false if there is none
-    void releaseEffect(VFECore* core);  ///< destroys a core that is in no list
+    void releaseEffect(VFECore* core);  ///< destroys a core that is in no list; null does nothing
     void releaseEffect();               ///< destroys every core and starts ids at 0 again
     void cleanAllEffect();              ///< the same as releaseEffect()
     void releaseBitmap();               ///< drops the layers of the run and the destination
@@ -195,9 +198,9 @@ class VF_API VFEffect {
     bool mResetTextRect = true;
     int mUseOuterLayer = 0;
     float mTextOpacity = 1.0F;
-    unsigned int mTextColor = 0xFF000000U;
+    unsigned int mTextColor = 0xFF000000U;  // kept with the look, not used for drawing
     int mNextEffectId = 0;
-    unsigned char mTextAlpha = 255;
+    unsigned char mTextAlpha = 255;  // likewise
     bool mOrdered = false;
 };
 

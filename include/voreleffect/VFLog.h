@@ -5,7 +5,7 @@
 namespace VFontEffect {
 
 /// Levels of the log, one bit each; a mask of enabled levels is their bitwise or.
-enum VFLogLevel {
+enum VFLogLevel : int {
     VFLogDebug = 1,    ///< Android priority debug
     VFLogInfo = 2,     ///< Android priority info; also the level of every timing line
     VFLogWarning = 4,  ///< Android priority warn

@@ -144,18 +144,18 @@ class VF_API VFBevelProperty : public VFProperty {
     int getSequentialCharLength() override;
     bool toSequentialChar(char** cursor) override;
 
-    int mStyle;
-    float mSize;
-    float mDepth;
-    int mTechnique;
-    int mDirection;
-    int mSoften;
-    float mAngle;
-    float mAltitude;
+    int mStyle;                    ///< opaque, but that 1 lies inside the glyph
+    float mSize;                   ///< pixels
+    float mDepth;                  ///< 0 to 10
+    int mTechnique;                ///< opaque
+    int mDirection;                ///< opaque
+    int mSoften;                   ///< pixels, 0 to 16
+    float mAngle;                  ///< of the light, whole degrees within one turn
+    float mAltitude;               ///< of the light, whole degrees within a quarter turn
     unsigned int mHighlightColor;  ///< straight
-    float mHighlightOpacity;
-    unsigned int mShadowColor;  ///< straight
-    float mShadowOpacity;
+    float mHighlightOpacity;       ///< 0 to 1
+    unsigned int mShadowColor;     ///< straight
+    float mShadowOpacity;          ///< 0 to 1
 };
 
 /// Parameters of an emboss. No core paints it: VFEffect::addEmbossText always returns -1.
@@ -168,18 +168,18 @@ class VF_API VFEmbossProperty : public VFProperty {
     int getSequentialCharLength() override;
     bool toSequentialChar(char** cursor) override;
 
-    int mStyle;
-    float mSize;
-    float mDepth;
-    int mTechnique;
-    int mDirection;
-    int mSoften;
-    float mAngle;
-    float mAltitude;
+    int mStyle;                    ///< opaque
+    float mSize;                   ///< pixels
+    float mDepth;                  ///< 0 to 10
+    int mTechnique;                ///< opaque
+    int mDirection;                ///< opaque
+    int mSoften;                   ///< pixels, 0 to 16
+    float mAngle;                  ///< of the light, whole degrees within one turn
+    float mAltitude;               ///< of the light, whole degrees within a quarter turn
     unsigned int mHighlightColor;  ///< straight
-    float mHighlightOpacity;
-    unsigned int mShadowColor;  ///< straight
-    float mShadowOpacity;
+    float mHighlightOpacity;       ///< 0 to 1
+    unsigned int mShadowColor;     ///< straight
+    float mShadowOpacity;          ///< 0 to 1
 };
 
 /// A bitmap tiled over the text. mColor is 0.

@@ -26,7 +26,7 @@ TEST(HostLiblog, Line_ReachesTheRealFunctionWithItsTagAndPriority) {
         const std::string line = printed(level);
         EXPECT_NE(line.find("vfeffect"), std::string::npos) << line;
         EXPECT_NE(line.find("[x] n=3 \n"), std::string::npos) << line;
-        EXPECT_NE(line.find(letter), std::string::npos) << line;
+        EXPECT_NE(line.find(std::string(" ") + letter + " "), std::string::npos) << line;
     }
 }
 

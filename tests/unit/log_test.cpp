@@ -1,6 +1,7 @@
 #include <gtest/gtest.h>
 #include <voreleffect/VFLog.h>
 
+#include <algorithm>
 #include <cstdarg>
 #include <cstdio>
 #include <string>
