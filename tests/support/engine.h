@@ -28,8 +28,8 @@ constexpr int kText = 12;
 constexpr int kNone = 13;
 
 /// The types that have a core.
-constexpr int kCoreTypes[] = {kOuterShadow,    kInnerShadow,    kOuterGlow, kInnerGlow, kLinearGradient,
-                              kRadialGradient, kStroke,         kPattern,   kText};
+constexpr int kCoreTypes[] = {kOuterShadow,    kInnerShadow, kOuterGlow, kInnerGlow, kLinearGradient,
+                              kRadialGradient, kStroke,      kPattern,   kText};
 
 constexpr unsigned int kNoEffect = 0xFFFFFFFFU;
 constexpr float kNan = std::numeric_limits<float>::quiet_NaN();
@@ -40,7 +40,8 @@ class SolidGlyph {
   public:
     SolidGlyph(int width, int height, uint8_t coverage = 255)
         : pixels(static_cast<size_t>(width) * static_cast<size_t>(height), coverage),
-          glyph{pixels.data(), static_cast<unsigned short>(width), static_cast<unsigned short>(height)} {}
+          glyph{pixels.data(), static_cast<unsigned short>(width), static_cast<unsigned short>(height)} {
+    }
     SolidGlyph(const SolidGlyph&) = delete;
     SolidGlyph& operator=(const SolidGlyph&) = delete;
 
@@ -70,7 +71,9 @@ inline std::string takeKey(char* key) {
     return text;
 }
 
-inline std::string keyOf(VFontEffect::VFEffect& set) { return takeKey(set.getMapKey()); }
+inline std::string keyOf(VFontEffect::VFEffect& set) {
+    return takeKey(set.getMapKey());
+}
 
 /// The type letters of the key in list order: the only characters of it below 0x80.
 inline std::string orderOf(VFontEffect::VFEffect& set) {

@@ -45,10 +45,10 @@ class FakeCore : public VFontEffect::VFECoreBase {
     std::vector<ParamInit> inits;
     std::vector<ParamRender> renders;
     std::vector<ParamPostProcessing> paints;
-    std::vector<VFontEffect::VFRect> boxes;                ///< the text box of each paint
+    std::vector<VFontEffect::VFRect> boxes;  ///< the text box of each paint
     std::function<void(const ParamPostProcessing&)> onPaint;
-    std::vector<int>* sequence = nullptr;                  ///< gets the type number at each paint
-    int* destroyed = nullptr;                              ///< counts destructions
+    std::vector<int>* sequence = nullptr;  ///< gets the type number at each paint
+    int* destroyed = nullptr;              ///< counts destructions
     VFontEffect::VFRect offsets;
 
   private:
@@ -94,9 +94,15 @@ inline std::vector<VFontEffect::VFECore*>& effectsOf(VFontEffect::VFEffect& set)
     return set.*reveal(hidden::EffectList());
 }
 
-inline int& nextEffectIdOf(VFontEffect::VFEffect& set) { return set.*reveal(hidden::NextEffectId()); }
-inline unsigned char textAlphaOf(VFontEffect::VFEffect& set) { return set.*reveal(hidden::TextAlpha()); }
-inline unsigned int textColorOf(VFontEffect::VFEffect& set) { return set.*reveal(hidden::TextColor()); }
+inline int& nextEffectIdOf(VFontEffect::VFEffect& set) {
+    return set.*reveal(hidden::NextEffectId());
+}
+inline unsigned char textAlphaOf(VFontEffect::VFEffect& set) {
+    return set.*reveal(hidden::TextAlpha());
+}
+inline unsigned int textColorOf(VFontEffect::VFEffect& set) {
+    return set.*reveal(hidden::TextColor());
+}
 
 /// Appends a fake core to the list of `set`, which owns it from then on.
 inline FakeCore* insertCore(VFontEffect::VFEffect& set, int style,

@@ -28,7 +28,9 @@ VFBitmap numberedMask() {
     return VFBitmap(5, 5, numbers.data(), 1);
 }
 
-TEST(Rect, StartsAsZeros) { EXPECT_EQ(sidesOf(VFRect()), (std::vector<int>{0, 0, 0, 0})); }
+TEST(Rect, StartsAsZeros) {
+    EXPECT_EQ(sidesOf(VFRect()), (std::vector<int>{0, 0, 0, 0}));
+}
 
 TEST(Rect, KeepsItsSidesInOrder) {
     const VFRect rect(1, 2, 3, 4);
@@ -211,7 +213,8 @@ TEST(Crop, EmptyRectangle_HasNoExtent) {
 
 TEST(Crop, RectangleLeavingTheSource_HasNoCoverage) {
     const VFBitmap source = numberedMask();
-    for (VFRect rect : {VFRect(3, 3, 6, 5), VFRect(-1, 0, 2, 2), VFRect(0, -1, 3, 1), VFRect(7, 7, 10, 9)}) {
+    for (VFRect rect :
+         {VFRect(3, 3, 6, 5), VFRect(-1, 0, 2, 2), VFRect(0, -1, 3, 1), VFRect(7, 7, 10, 9)}) {
         const VFBitmap crop(source, &rect);
         expectNumbers(crop, 3, 2, 1, 2);
         EXPECT_EQ(bytesOf(crop), Bytes(6, 0));

@@ -6,6 +6,7 @@
 #include <string>
 #include <vector>
 
+#include "tests/support/both_sets.h"
 #include "tests/support/compare.h"
 #include "tests/support/literal_engine.h"
 #include "tests/support/mask_gallery.h"
@@ -19,15 +20,10 @@ namespace {
 
 using literal::Engine;
 using literal::Picture;
-using VFontEffect::VFBitmap;
 using VFontEffect::VFEffect;
-using VFontEffect::VFGlyph;
-using VFontEffect::VFGradient;
 
 constexpr int kWidth = 56;
 constexpr int kHeight = 44;
-constexpr int kGlyphX = 14;
-constexpr int kGlyphY = 10;
 
 /// A ring with a bar through it, soft at the edges: curves, straight edges, a hole.
 const literal::Mask& ring() {
@@ -45,26 +41,6 @@ const literal::Mask& ring() {
     return mask;
 }
 
-/// What differs between the two sets: the types of stops and patterns.
-template <class Set>
-struct Kit;
-
-template <>
-struct Kit<VFEffect> {
-    VFGradient stops[3] = {
-        {0xFFFFD000U, 1.0F, 0.0F}, {0xFFE02010U, 1.0F, 0.5F}, {0xFF2030C0U, 0.8F, 1.0F}};
-    VFBitmap tile{4, 4, 4};
-    unsigned char* tileBytes() { return tile.mData; }
-};
-
-template <>
-struct Kit<Engine> {
-    literal::Stop stops[3] = {
-        {0xFFFFD000U, 1.0F, 0.0F}, {0xFFE02010U, 1.0F, 0.5F}, {0xFF2030C0U, 0.8F, 1.0F}};
-    literal::Tile tile{4, 4, std::vector<uint8_t>(64)};
-    unsigned char* tileBytes() { return tile.bytes.data(); }
-};
-
 template <class Set>
 using Apply = std::function<void(Set&, Kit<Set>&)>;
 
@@ -80,8 +56,6 @@ template <class Describe>
 Scene scene(const char* name, Describe describe, float textOpacity = 1.0F) {
     return {name, describe, describe, textOpacity};
 }
-
-constexpr uint32_t kInk = 0x3060A0;
 
 const std::vector<Scene>& scenes() {
     static const std::vector<Scene> all = {
@@ -120,49 +94,22 @@ const std::vector<Scene>& scenes() {
     return all;
 }
 
-/// A 4 x 4 checker of an opaque and a translucent colour, in A, R, G, B.
-template <class Set>
-void fillTile(Kit<Set>& kit) {
-    const unsigned char pixels[2][4] = {{255, 240, 80, 40}, {160, 40, 80, 240}};
-    for (size_t i = 0; i < 16; ++i) {
-        for (size_t c = 0; c < 4; ++c)
-            kit.tileBytes()[4 * i + c] = pixels[(i % 4 / 2 + i / 8) % 2][c];
-    }
+constexpr Stage kStage = {kWidth, kHeight, 14, 10};
+
+template <class Set, class Apply>
+Picture painted(const Scene& scene, const Apply& apply) {
+    Kit<Set> kit;
+    Set set;
+    set.setTextOpacity(scene.textOpacity);
+    apply(set, kit);
+    return paintedRun(set, ring(), kStage);
 }
 
 Picture paintedByLibrary(const Scene& scene) {
-    Kit<VFEffect> kit;
-    fillTile(kit);
-    VFEffect set;
-    set.setTextOpacity(scene.textOpacity);
-    scene.library(set, kit);
-    delete[] set.getMapKey(kInk);
-    set.initEffect(kWidth, kHeight);
-    VFBitmap destination(kWidth, kHeight, 4);
-    set.setDstBitmap(&destination);
-    std::vector<uint8_t> coverage = ring().bytes;
-    VFGlyph glyph = {coverage.data(), static_cast<unsigned short>(ring().width),
-                     static_cast<unsigned short>(ring().height)};
-    set.renderEffectLayer(kGlyphX, kGlyphY, &glyph);
-    set.doEffectPostProcessing();
-    set.compositeLayers(&destination);
-    return {kWidth, kHeight, {destination.mData, destination.mData + size_t{4} * kWidth * kHeight}};
+    return painted<VFEffect>(scene, scene.library);
 }
-
 Picture paintedLiterally(const Scene& scene) {
-    Kit<Engine> kit;
-    fillTile(kit);
-    Engine set;
-    set.setTextOpacity(scene.textOpacity);
-    scene.literal(set, kit);
-    set.getMapKey(kInk);
-    set.initEffect(kWidth, kHeight);
-    Picture destination = {kWidth, kHeight, std::vector<uint8_t>(size_t{4} * kWidth * kHeight)};
-    set.setDstBitmap(&destination);
-    set.renderEffectLayer(kGlyphX, kGlyphY, &ring());
-    set.doEffectPostProcessing();
-    set.compositeLayers(destination);
-    return destination;
+    return painted<Engine>(scene, scene.literal);
 }
 
 class Golden : public ::testing::TestWithParam<size_t> {};

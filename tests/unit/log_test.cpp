@@ -58,9 +58,13 @@ class Log : public ::testing::Test {
     }
 };
 
-VFLogLevel level(int value) { return static_cast<VFLogLevel>(value); }
+VFLogLevel level(int value) {
+    return static_cast<VFLogLevel>(value);
+}
 
-TEST_F(Log, EverythingIsEnabledAtTheStart) { EXPECT_EQ(kMaskAtStart, 0xFF); }
+TEST_F(Log, EverythingIsEnabledAtTheStart) {
+    EXPECT_EQ(kMaskAtStart, 0xFF);
+}
 
 TEST_F(Log, Warning_PrintsTagAndMessage) {
     VFLog::printLog(VFLogWarning, "x", "n=%d", 3);
@@ -101,7 +105,8 @@ TEST_F(Log, Level_PrintsOnlyWhenItSharesABitWithTheMask) {
 
 TEST_F(Log, MaskZero_SilencesEverything) {
     VFLog::setPrintLogLevel(0);
-    for (const int value : {1, 2, 4, 8, 16}) VFLog::printLog(level(value), "tag", "message");
+    for (const int value : {1, 2, 4, 8, 16})
+        VFLog::printLog(level(value), "tag", "message");
     VFLog::printTime("tag", "label", 1500);
     VFLog::printTime("tag", "label", 1500, "%d", 1);
     EXPECT_TRUE(lines().empty());
@@ -201,7 +206,8 @@ TEST_F(Log, TimingAndInfoBits_PrintTimingAndInfoLinesOnly) {
     expectLine(4, "[x] [Time] blur 1.500ms \n");
     VFLog::printLog(VFLogInfo, "x", "info");
     expectLine(4, "[x] info \n");
-    for (const int value : {1, 4, 8}) VFLog::printLog(level(value), "x", "other");
+    for (const int value : {1, 4, 8})
+        VFLog::printLog(level(value), "x", "other");
     EXPECT_TRUE(lines().empty());
 }
 

@@ -11,9 +11,12 @@ using namespace vorel_test;
 
 namespace {
 
-const VFGradient kStops[] = {{0x11223344, 0.25F, 0.0F}, {0x55667788, 0.5F, 0.5F}, {0x99AABBCC, 1.5F, 1.0F}};
+const VFGradient kStops[] = {
+    {0x11223344, 0.25F, 0.0F}, {0x55667788, 0.5F, 0.5F}, {0x99AABBCC, 1.5F, 1.0F}};
 
-std::vector<VFGradient> threeStops() { return {std::begin(kStops), std::end(kStops)}; }
+std::vector<VFGradient> threeStops() {
+    return {std::begin(kStops), std::end(kStops)};
+}
 
 void expectThreeStops(const VFGradient* actual) {
     for (int i = 0; i < 3; ++i) {
@@ -31,11 +34,26 @@ struct AngleCase {
 };
 
 const AngleCase kAngles[] = {
-    {0, 0, 0},           {-30.7F, -30, -30}, {725, 5, 5},         {-725, -5, -5},      {359.9F, 359, 89},
-    {360, 0, 0},         {-360, 0, 0},       {100, 100, 10},      {-100, -100, -10},   {89.99F, 89, 89},
-    {90, 90, 0},         {-0.9F, 0, 0},      {1e9F, 280, 10},     {-1e9F, -280, -10},
+    {0, 0, 0},
+    {-30.7F, -30, -30},
+    {725, 5, 5},
+    {-725, -5, -5},
+    {359.9F, 359, 89},
+    {360, 0, 0},
+    {-360, 0, 0},
+    {100, 100, 10},
+    {-100, -100, -10},
+    {89.99F, 89, 89},
+    {90, 90, 0},
+    {-0.9F, 0, 0},
+    {1e9F, 280, 10},
+    {-1e9F, -280, -10},
     // Outside the range of an int the value saturates: 2147483647 and -2147483648.
-    {kInfinity, 127, 37}, {-kInfinity, -128, -38}, {3e9F, 127, 37}, {-1e30F, -128, -38}, {kNan, 0, 0},
+    {kInfinity, 127, 37},
+    {-kInfinity, -128, -38},
+    {3e9F, 127, 37},
+    {-1e30F, -128, -38},
+    {kNan, 0, 0},
 };
 
 TEST(Records, Text_KeepsColourAndOpacity) {
@@ -119,8 +137,8 @@ void expectGradientFields() {
     for (const AngleCase& angle : kAngles) {
         EXPECT_EQ(Record(angle.given, 1, 1, 0, nullptr).mAngle, angle.by360) << angle.given;
     }
-    const std::pair<float, float> scales[] = {{3.5F, 2}, {-1, 0},        {2, 2},          {0, 0},
-                                              {-0.0F, 0}, {0.05F, 0.05F}, {kInfinity, 2}, {-kInfinity, 0}};
+    const std::pair<float, float> scales[] = {
+        {3.5F, 2}, {-1, 0}, {2, 2}, {0, 0}, {-0.0F, 0}, {0.05F, 0.05F}, {kInfinity, 2}, {-kInfinity, 0}};
     for (const auto& [given, kept] : scales) {
         EXPECT_EQ(Record(0, given, 1, 0, nullptr).mScale, kept) << given;
     }
@@ -140,14 +158,17 @@ TEST(Records, Pattern_ClampsTheScaleAndKeepsThePointer) {
     EXPECT_EQ(record.mOpacity, 0.25F);
     EXPECT_EQ(record.mColor, 0U);
 
-    const std::pair<float, float> scales[] = {{-1, 0}, {10, 10}, {9.75F, 9.75F}, {kInfinity, 10}, {-kInfinity, 0}};
-    for (const auto& [given, kept] : scales) EXPECT_EQ(VFPatternProperty(&bitmap, given, 1).mScale, kept);
+    const std::pair<float, float> scales[] = {
+        {-1, 0}, {10, 10}, {9.75F, 9.75F}, {kInfinity, 10}, {-kInfinity, 0}};
+    for (const auto& [given, kept] : scales)
+        EXPECT_EQ(VFPatternProperty(&bitmap, given, 1).mScale, kept);
     EXPECT_TRUE(std::isnan(VFPatternProperty(&bitmap, kNan, 1).mScale));
 }
 
 template <class Record>
 void expectBevelFields() {
-    const Record record(1, 250.5F, 12, -2, 3, 20, 0.25F, 725.5F, 100, 0x11223344, 1.5F, 0x55667788, -0.5F);
+    const Record record(1, 250.5F, 12, -2, 3, 20, 0.25F, 725.5F, 100, 0x11223344, 1.5F, 0x55667788,
+                        -0.5F);
     EXPECT_EQ(record.mColor, 0U);
     EXPECT_EQ(record.mOpacity, 0.25F);
     EXPECT_EQ(record.mStyle, 1);
@@ -170,10 +191,14 @@ void expectBevelFields() {
         EXPECT_EQ(with(1, 0, angle.given, angle.given).mAngle, angle.by360) << angle.given;
         EXPECT_EQ(with(1, 0, angle.given, angle.given).mAltitude, angle.by90) << angle.given;
     }
-    const std::pair<float, float> depths[] = {{-1, 0}, {0.5F, 0.5F}, {10, 10}, {kInfinity, 10}, {-kInfinity, 0}};
-    for (const auto& [given, kept] : depths) EXPECT_EQ(with(given, 0, 0, 0).mDepth, kept) << given;
-    const std::pair<int, int> softens[] = {{-3, 0}, {0, 0}, {16, 16}, {17, 16}, {INT32_MIN, 0}, {INT32_MAX, 16}};
-    for (const auto& [given, kept] : softens) EXPECT_EQ(with(1, given, 0, 0).mSoften, kept) << given;
+    const std::pair<float, float> depths[] = {
+        {-1, 0}, {0.5F, 0.5F}, {10, 10}, {kInfinity, 10}, {-kInfinity, 0}};
+    for (const auto& [given, kept] : depths)
+        EXPECT_EQ(with(given, 0, 0, 0).mDepth, kept) << given;
+    const std::pair<int, int> softens[] = {{-3, 0},  {0, 0},         {16, 16},
+                                           {17, 16}, {INT32_MIN, 0}, {INT32_MAX, 16}};
+    for (const auto& [given, kept] : softens)
+        EXPECT_EQ(with(1, given, 0, 0).mSoften, kept) << given;
 }
 
 TEST(Records, BevelAndEmboss_ClampAndReduce) {
