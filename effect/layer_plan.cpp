@@ -27,6 +27,22 @@ bool needsOuterLayer(VFECore* core) {
     return type == kEmboss || (isStroke(type) && strokePosition(*core) == kStrokeCentre);
 }
 
+/// Puts the cores in paint order: over the text, the text fill, beneath the text. In layered mode only
+/// the text fill has a place of its own, the end.
+///
+/// Deliberate: the order is made by reversing the list as it stands, so a second ordering of the same
+/// list restores the earlier order within each group.
+template <class IsUnder>
+void reorder(std::vector<VFECore*>& cores, bool layered, IsUnder isUnder) {
+    const auto rank = [&](VFECore* core) {
+        if (core->getStyle() == kText) return 1;
+        return !layered && isUnder(core) ? 2 : 0;
+    };
+    std::reverse(cores.begin(), cores.end());
+    std::stable_sort(cores.begin(), cores.end(),
+                     [&](VFECore* a, VFECore* b) { return rank(a) < rank(b); });
+}
+
 template <class Query>
 int largestOffset(const std::vector<VFECore*>& cores, Query query) {
     int largest = 0;
@@ -49,25 +65,13 @@ void VFEffect::initEffect(int width, int height) {
         mOuterLayer = makeLayer(width, height, kColourBytes);
     }
 
-    if (!mOrdered) reorderEffects();
+    if (!mOrdered) reorder(mEffects, layered, [this](VFECore* core) { return isUnderEffect(core); });
     mOrdered = true;
 
     VFECore::ParamInit init = {width, height, mUseOuterLayer};
     for (VFECore* core : mEffects)
         core->initEffect(&init);
     mDstBitmap = nullptr;
-}
-
-// Deliberate: the order is made by reversing the list as it stands, so a second ordering of the same
-// list restores the earlier order within each group.
-void VFEffect::reorderEffects() {
-    const auto rank = [this](VFECore* core) {
-        if (core->getStyle() == kText) return 1;
-        return mUseOuterLayer != 1 && isUnderEffect(core) ? 2 : 0;
-    };
-    std::reverse(mEffects.begin(), mEffects.end());
-    std::stable_sort(mEffects.begin(), mEffects.end(),
-                     [&](VFECore* a, VFECore* b) { return rank(a) < rank(b); });
 }
 
 bool VFEffect::isUnderEffect(VFECore* core) {

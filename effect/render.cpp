@@ -25,6 +25,14 @@ void growTo(VFRect& box, const VFRect& other) {
     box.mBottom = std::max(box.mBottom, other.mBottom);
 }
 
+/// Points the parameters at the layers that a core paints into in layered mode.
+void route(VFECore& core, VFBitmap* destination, VFBitmap* outerLayer,
+           VFECore::ParamPostProcessing& params) {
+    const Target target = layeredTarget(core);
+    params.dstBitmap = target == Target::destination ? destination : outerLayer;
+    params.subDstBitmap = target == Target::both ? destination : nullptr;
+}
+
 void clampTo(VFRect& box, const VFBitmap& mask) {
     const int width = saturateToInt(mask.mWidth);
     const int height = saturateToInt(mask.mHeight);
@@ -61,17 +69,11 @@ void VFEffect::doEffectPostProcessing() {
                                                nullptr};
         for (VFECore* core : mEffects) {
             if (empty) break;
-            if (mUseOuterLayer == 1) routeLayered(core, &params);
+            if (mUseOuterLayer == 1) route(*core, mDstBitmap, mOuterLayer, params);
             core->doPostProcessing(&params);
         }
     }
     mResetTextRect = true;
-}
-
-void VFEffect::routeLayered(VFECore* core, VFECore::ParamPostProcessing* params) {
-    const Target target = layeredTarget(*core);
-    params->dstBitmap = target == Target::destination ? mDstBitmap : mOuterLayer;
-    params->subDstBitmap = target == Target::both ? mDstBitmap : nullptr;
 }
 
 }  // namespace VFontEffect

@@ -187,9 +187,6 @@ class VF_API VFEffect {
     char* getMapKey(unsigned int color);
 
   private:
-    void reorderEffects();
-    void routeLayered(VFECore* core, VFECore::ParamPostProcessing* params);
-
     std::vector<VFECore*> mEffects;
     VFBitmap* mSrcBitmap = nullptr;
     VFBitmap* mDstBitmap = nullptr;

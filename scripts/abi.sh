@@ -1,0 +1,39 @@
+#!/usr/bin/env bash
+# Checks what a built library shows to the linker: its exported symbols (tests/abi/symbols.txt), its
+# name, its needs, its alignment.
+#
+#     scripts/abi.sh [LIBRARY...]   the release and arm64 builds unless named
+#     scripts/abi.sh --update       writes the list of symbols anew from the release build
+set -euo pipefail
+cd "$(dirname "$0")/.."
+
+list=tests/abi/symbols.txt
+symbols() { nm -D --defined-only "$1" | awk '{print $3}' | LC_ALL=C sort; }
+
+if [[ ${1:-} == --update ]]; then
+    symbols build/release/libvoreleffect.so > "$list"
+    exit 0
+fi
+
+failed=0
+complain() {
+    echo "$library: $1" >&2
+    failed=1
+}
+
+libraries=("$@")
+[[ $# -gt 0 ]] || libraries=(build/release/libvoreleffect.so build/arm64/libvoreleffect.so)
+for library in "${libraries[@]}"; do
+    diff -u "$list" <(symbols "$library") || complain "exports other symbols than $list"
+    dynamic=$(readelf --wide -d "$library")
+    grep -q 'SONAME.*\[libvoreleffect\.so' <<< "$dynamic" || complain "has no SONAME"
+    ! grep -q TEXTREL <<< "$dynamic" || complain "has text relocations"
+    needed=$(sed -n 's/.*NEEDED.*\[\(.*\)\]/\1/p' <<< "$dynamic" |
+        grep -vE '^(libc|libm|libgcc_s|libstdc\+\+|libc\+\+|ld-linux-[a-z0-9-]+)\.so' || true)
+    [[ -z $needed ]] || complain "needs more than the C and C++ runtime: $needed"
+    for alignment in $(readelf --wide -l "$library" | awk '$1 == "LOAD" { print $NF }'); do
+        ((alignment >= 16384)) || complain "has a segment aligned to $alignment, less than 16 KB"
+    done
+    echo "$library: $(symbols "$library" | wc -l) symbols checked"
+done
+exit "$failed"
