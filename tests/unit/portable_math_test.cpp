@@ -9,7 +9,9 @@ namespace VFontEffect::internal {
 namespace {
 
 /// The float nearest to a value known to more than double precision.
-float nearest(long double value) { return static_cast<float>(value); }
+float nearest(long double value) {
+    return static_cast<float>(value);
+}
 
 /// Every angle that a whole number of degrees becomes in the shadows and in the linear gradient.
 template <class Visit>
