@@ -20,7 +20,6 @@ template <class V>
 struct Lane {
     V v;
 
-    Lane() = default;
     explicit Lane(V value) : v(value) {}
     explicit Lane(int value) : v(static_cast<V>(V{} + static_cast<uint16_t>(value))) {}
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <algorithm>
 #include <cstdint>
 
 #include "cores/covered_fill.h"
@@ -14,9 +15,7 @@ class GradientTable {
     GradientTable(const VFGradient* stops, int count);
 
     /// The colour of an index in 0..255; others are clamped to the ends.
-    uint32_t at(int64_t index) const {
-        return mColours[index < 0 ? 0 : index > kLastRead ? kLastRead : index];
-    }
+    uint32_t at(int64_t index) const { return mColours[std::clamp<int64_t>(index, 0, kLastRead)]; }
 
   private:
     static constexpr int64_t kLastRead = 255;

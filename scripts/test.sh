@@ -3,13 +3,13 @@
 # and UndefinedBehaviorSanitizer, and 64-bit ARM under qemu. Installs what it needs on Debian (as root).
 #
 #     scripts/test.sh              all three builds
-#     scripts/test.sh release      one of them: release, sanitize, arm64 or dev
+#     scripts/test.sh release      one of them: release, sanitize, arm64; dev, or libcxx (clang, libc++)
 set -euo pipefail
 cd "$(dirname "$0")/.."
 . scripts/packages.sh
 
 need_packages cmake ninja-build g++ clang-14 libclang-rt-14-dev pkg-config \
-    googletest libgtest-dev libbenchmark-dev libstb-dev android-liblog-dev \
+    libc++-14-dev libc++abi-14-dev googletest libgtest-dev libbenchmark-dev libstb-dev android-liblog-dev \
     libraqm-dev libfreetype-dev libfribidi-dev libharfbuzz-dev libfontconfig-dev libpng-dev \
     nlohmann-json3-dev libcli11-dev fontconfig fonts-dejavu-core \
     g++-aarch64-linux-gnu qemu-user-static

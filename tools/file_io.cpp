@@ -41,8 +41,9 @@ void fill(std::FILE* file, const std::string& name, const std::function<void(std
 /// A file under a passing name in the directory of its target; gone again unless renamed.
 class TemporaryFile {
   public:
-    explicit TemporaryFile(const fs::path& target) : mTarget(target) {
-        mName = (target.parent_path() / ("." + target.filename().string() + ".XXXXXX")).string();
+    explicit TemporaryFile(const fs::path& target)
+        : mTarget(target),
+          mName((target.parent_path() / ("." + target.filename().string() + ".XXXXXX")).string()) {
         const int descriptor = ::mkstemp(mName.data());
         if (descriptor < 0) failWithErrno("cannot write " + target.string());
         // mkstemp makes the file private; a new file has what the process's mask allows.
