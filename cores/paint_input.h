@@ -1,6 +1,5 @@
 #pragma once
 
-#include <cmath>
 #include <cstdint>
 
 #include "core/numeric.h"
@@ -14,7 +13,7 @@ namespace VFontEffect::internal {
 constexpr float kLargestSizePx = 1024.0F;
 
 inline bool isAbsurd(float sizePx) {
-    return sizePx > kLargestSizePx || std::isinf(sizePx);
+    return sizePx > kLargestSizePx;
 }
 
 /// A box of the mask that lies inside it and is not empty.

@@ -1,0 +1,22 @@
+#!/usr/bin/env bash
+# Runs the tests of separate threads under ThreadSanitizer.
+set -euo pipefail
+cd "$(dirname "$0")/.."
+. scripts/packages.sh
+
+need_packages cmake ninja-build g++ clang-14 libclang-rt-14-dev pkg-config googletest libgtest-dev \
+    libfreetype-dev fonts-dejavu-core android-liblog-dev
+
+# ThreadSanitizer maps fixed addresses: on kernels that spread mappings widely it needs them unspread.
+run=()
+if setarch --addr-no-randomize true 2> /dev/null; then run=(setarch --addr-no-randomize); fi
+
+build=build/thread
+cmake -S . -B "$build" -G Ninja -DCMAKE_BUILD_TYPE=RelWithDebInfo -DCMAKE_CXX_COMPILER=clang++-14 \
+    -DCMAKE_CXX_FLAGS='-fsanitize=thread -fno-omit-frame-pointer' \
+    -DVOREL_BUILD_TESTS=ON -DVOREL_WERROR=ON > /dev/null
+"${run[@]}" cmake --build "$build" --target reliability_threads_tests -- --quiet
+
+# A race shows only when both accesses are recent: the tests run several times.
+TSAN_OPTIONS='halt_on_error=1 history_size=7' \
+    "${run[@]}" "$build/tests/reliability/reliability_threads_tests" --gtest_repeat=3
