@@ -12,6 +12,9 @@ using namespace internal;
 
 namespace {
 
+/// A disc beyond this takes seconds and is no text effect: it counts as one that memory cannot hold.
+constexpr int64_t kLargestSide = 8192;
+
 /// 255 inside the radius, falling to 0 over the pixel outside of it.
 unsigned char discWeight(int64_t dx, int64_t dy, float radius) {
     const float distance = std::sqrt(static_cast<float>(dx * dx + dy * dy));
@@ -25,7 +28,7 @@ int makeCircleKernel(unsigned char** kernel, float radius) {
     const int64_t reach = toInt(radius + 0.5F);
     const int64_t side = 2 * reach + 1;
     if (side < 1 || side > std::numeric_limits<int32_t>::max() / side) return 0;
-    if (kernel != nullptr) {
+    if (kernel != nullptr && side <= kLargestSide) {
         auto* const disc = static_cast<unsigned char*>(std::malloc(static_cast<size_t>(side * side)));
         if (disc != nullptr) {
             *kernel = disc;

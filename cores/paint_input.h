@@ -9,8 +9,8 @@
 /// What a core paints from: checked once, then trusted.
 namespace VFontEffect::internal {
 
-/// Sizes beyond this many pixels are no text effect, and would cost gigabytes or minutes.
-constexpr float kLargestSizePx = 1024.0F;
+/// Sizes beyond this many pixels are no text effect, and would take gigabytes or minutes.
+constexpr float kLargestSizePx = 256.0F;
 
 inline bool isAbsurd(float sizePx) {
     return sizePx > kLargestSizePx;

@@ -88,7 +88,7 @@ class VF_API VFECoreBase : public VFECore {
 ///  - getProperty returns the stored record, owned by the core, or null before setProperty.
 ///  - doPostProcessing paints nothing when the parameters, the stored record or a bitmap or box that
 ///    it needs are missing, when the text box is empty or leaves the mask, when a size is out of all
-///    proportion (above 1024 pixels), or when memory for its working buffers runs out.
+///    proportion (above 256 pixels), or when memory for its working buffers runs out.
 
 /// Type 12: the plain colour fill of the glyphs. Outside layered mode it also clips everything
 /// painted before it to the glyph coverage.
@@ -109,8 +109,8 @@ class VF_API VFText : public VFECoreBase {
 /// falls linearly to 0 at d = radius + 1.
 ///
 /// Stores a buffer from malloc through `kernel` (release it with free) and returns D. When memory
-/// runs out, or `kernel` is null, nothing is stored; nothing is stored and 0 is returned when D is
-/// below 1 or D * D does not fit in 31 bits.
+/// runs out, D is above 8192, or `kernel` is null, nothing is stored; nothing is stored and 0 is
+/// returned when D is below 1 or D * D does not fit in 31 bits.
 VF_API int makeCircleKernel(unsigned char** kernel, float radius);
 
 /// Type 10: an outline, centred on the edge, outside or inside of it.

@@ -179,7 +179,8 @@ class VF_API VFEffect {
 
     /// The look as a zero-terminated string of bytes, for a cache of painted runs: equal for two
     /// sets built by the same calls in the same order. The caller releases it with delete[]; null
-    /// when memory runs out. It follows the order of the list, which initEffect changes, so compare
+    /// when memory runs out, or when records with absurd stop counts would make it longer than 2^28
+    /// bytes. It follows the order of the list, which initEffect changes, so compare
     /// keys taken at the same point of the cycle. A pattern leaves no trace in it.
     char* getMapKey();
 

@@ -359,11 +359,11 @@ TEST(LyingSizes, PatternsWhoseByteCountWraps_PaintNothing) {
 
 // --- Numbers that are none ---------------------------------------------------------------------------
 
-/// Sizes between the add-calls' limit of 100 and the cores' of 1024 pixels are honest, and slow.
+/// Sizes between the add-calls' limit of 100 and the cores' of 256 pixels are honest, and slow.
 const float kOddNumbers[] = {
     kNan,       kInfinite, -kInfinite, FLT_MAX,       -FLT_MAX,       FLT_MIN,       -FLT_MIN, kDenormal,
     -kDenormal, 0.0F,      -0.0F,      0.49999997F,   -0.49999997F,   -0.5F,         -1.0F,    -1.5F,
-    1025.0F,    1e9F,      -1e9F,      2147483648.0F, -2147483648.0F, 4294967296.0F, 1e20F};
+    257.0F,     1e9F,      -1e9F,      2147483648.0F, -2147483648.0F, 4294967296.0F, 1e20F};
 
 TEST(OddNumbers, InRecords_PaintLikeTheLiteralForm) {
     const Scene scene = everydayScene();

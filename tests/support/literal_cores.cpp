@@ -10,7 +10,7 @@ namespace vorel_test::literal {
 namespace {
 
 constexpr float kLn100 = 4.60517F;
-constexpr float kLargestSize = 1024.0F;
+constexpr float kLargestSize = 256.0F;
 constexpr int kTableSize = 257;
 constexpr int kUnder = 2;  // the blend mode that slides paint beneath the picture
 

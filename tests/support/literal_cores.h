@@ -9,7 +9,7 @@
 /// and coordinates are added in 64 bits. The library's cores must paint the same bytes.
 ///
 /// Angles, distances, sizes and scales are the numbers that the core's record holds. A box that is
-/// empty or leaves the mask, a size above 1024 pixels or one that makes a radius or a padding
+/// empty or leaves the mask, a size above 256 pixels or one that makes a radius or a padding
 /// negative paints nothing.
 namespace vorel_test::literal {
 

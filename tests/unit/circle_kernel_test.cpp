@@ -80,6 +80,12 @@ TEST(CircleKernel, RadiusWithoutASide_StoresNothing) {
     }
 }
 
+TEST(CircleKernel, RadiusOutOfProportion_HasASideButNoBuffer) {
+    unsigned char* weights = nullptr;
+    EXPECT_EQ(10001, VFontEffect::makeCircleKernel(&weights, 5000.0F));
+    EXPECT_EQ(nullptr, weights);
+}
+
 TEST(CircleKernel, NotANumber_IsOneEmptyCell) {
     const CircleKernel kernel = libraryKernel(std::nanf(""));
     EXPECT_EQ(1, kernel.side);

@@ -11,7 +11,7 @@ namespace {
 
 namespace internal = VFontEffect::internal;
 
-constexpr int kLargestRadius = 1024;
+constexpr int kLargestRadius = 256;
 
 template <class Weights>
 void expectWeights(const internal::BlurKernel& kernel, const Weights& expected, int radius) {

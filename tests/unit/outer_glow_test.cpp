@@ -223,7 +223,7 @@ TEST(OuterGlow, BrokenInput_PaintsNothing) {
 TEST(OuterGlow, SizesOutOfProportion_PaintNothing) {
     const Scene scene = sceneOf(filledMask(10, 10, 255));
     const float infinity = std::numeric_limits<float>::infinity();
-    for (float size : {-1.0F, -1.9F, -2.0F, -50.0F, -1e9F, 1024.5F, 1e9F, 3e38F, infinity, -infinity}) {
+    for (float size : {-1.0F, -1.9F, -2.0F, -50.0F, -1e9F, 256.5F, 1e9F, 3e38F, infinity, -infinity}) {
         EXPECT_TRUE(samePaint(scene, glowing(scene, size, kWhite))) << size;
     }
 }
