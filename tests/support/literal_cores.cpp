@@ -14,6 +14,26 @@ constexpr float kLargestSize = 256.0F;
 constexpr int kTableSize = 257;
 constexpr int kUnder = 2;  // the blend mode that slides paint beneath the picture
 
+// The float nearest to each function's value, by way of double precision: what single-precision C
+// libraries return may miss it by a unit in the last place. Angles beyond 100,000 radians are left to
+// them.
+
+float sine(float radians) {
+    return fabsf(radians) <= 1e5F ? static_cast<float>(std::sin(static_cast<double>(radians)))
+                                  : sinf(radians);
+}
+float cosine(float radians) {
+    return fabsf(radians) <= 1e5F ? static_cast<float>(std::cos(static_cast<double>(radians)))
+                                  : cosf(radians);
+}
+float tangent(float radians) {
+    return fabsf(radians) <= 1e5F ? static_cast<float>(std::tan(static_cast<double>(radians)))
+                                  : tanf(radians);
+}
+float exponential(float x) {
+    return static_cast<float>(std::exp(static_cast<double>(x)));
+}
+
 int64_t widthOf(Box box) {
     return int64_t{box.right} - box.left;
 }
@@ -187,8 +207,8 @@ std::vector<uint32_t> shadowKernel(int radius) {
     std::vector<uint32_t> kernel{100};
     const float d = static_cast<float>(radius) * static_cast<float>(radius) / kLn100;
     for (int i = 1; i <= radius; ++i) {
-        kernel.push_back(
-            static_cast<uint32_t>(truncated(expf(static_cast<float>(-(i * i)) / d) * 100.0F + 0.5F)));
+        kernel.push_back(static_cast<uint32_t>(
+            truncated(exponential(static_cast<float>(-(i * i)) / d) * 100.0F + 0.5F)));
     }
     return kernel;
 }
@@ -197,8 +217,8 @@ std::vector<int32_t> glowKernel(int radius) {
     std::vector<int32_t> kernel{128};
     const float d = static_cast<float>(radius * radius) / kLn100;
     for (int i = 1; i <= radius; ++i) {
-        kernel.push_back(
-            truncated(static_cast<double>(expf(static_cast<float>(-(i * i)) / d) * 128.0F) + 0.5));
+        kernel.push_back(truncated(
+            static_cast<double>(exponential(static_cast<float>(-(i * i)) / d) * 128.0F) + 0.5));
     }
     return kernel;
 }
@@ -285,8 +305,8 @@ void boxFilter(std::vector<uint8_t>& mask, int passes, int width, int height) {
 
 Offset shadowOffset(float angle, float distance) {
     const float radians = angle * 3.14159F / 180.0F;
-    const float h = cosf(radians) * distance;
-    const float v = sinf(radians) * distance;
+    const float h = cosine(radians) * distance;
+    const float v = sine(radians) * distance;
     return {truncated((h < -0.0F ? 0.5F : -0.5F) - h), truncated(v + (v > 0.0F ? 0.5F : -0.5F))};
 }
 
@@ -492,9 +512,9 @@ void paintLinearGradient(Picture& dst, const Mask& mask, Box text, float angle, 
     const auto w = static_cast<float>(widthOf(text));
     const auto h = static_cast<float>(heightOf(text));
     const float radians = angle * -0.01745328F;
-    const float c = cosf(radians);
-    const float s = sinf(radians);
-    const float length = fabsf(tanf(radians)) < h / w ? w / fabsf(c) : h / fabsf(s);
+    const float c = cosine(radians);
+    const float s = sine(radians);
+    const float length = fabsf(tangent(radians)) < h / w ? w / fabsf(c) : h / fabsf(s);
     const float kx = c * ((256.0F / scale) / length);
     const float ky = s * ((256.0F / scale) / length);
     const float cx = w * 0.5F;

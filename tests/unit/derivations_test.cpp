@@ -5,7 +5,7 @@
 #include "tests/support/literal_cores.h"
 
 /// Every integer that the library derives from a transcendental function, over its whole domain,
-/// against the literal form, which asks the C library.
+/// against the literal form, which asks the C library's double-precision functions.
 namespace vorel_test {
 namespace {
 
