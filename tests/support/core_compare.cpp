@@ -1,10 +1,10 @@
 #include "core_compare.h"
 
 #include <algorithm>
+#include <cmath>
 #include <limits>
 
 #include "compare.h"
-#include "mask_gallery.h"
 
 namespace vorel_test {
 
@@ -55,6 +55,11 @@ std::vector<Box> brokenBoxes(int width, int height) {
         {0, kMost - 5, 5, kMost},
         {kMost - 5, 0, kMost, 5},
     };
+}
+
+/// A disc in the middle of 20 x 20 pixels.
+Mask smallDisc() {
+    return discMask(20, 20, 10.0F, 10.0F, 6.0F, true);
 }
 
 }  // namespace
@@ -245,6 +250,16 @@ std::vector<int> alphaOf(const Picture& picture) {
     return channelOf(picture, 3);
 }
 
+std::vector<uint32_t> rowOf(const Picture& picture, int y) {
+    std::vector<uint32_t> row;
+    const size_t stride = static_cast<size_t>(picture.width) * 4;
+    for (size_t i = static_cast<size_t>(y) * stride; i < static_cast<size_t>(y + 1) * stride; i += 4) {
+        row.push_back(uint32_t{picture.bytes[i + 3]} << 24 | uint32_t{picture.bytes[i]} << 16 |
+                      uint32_t{picture.bytes[i + 1]} << 8 | picture.bytes[i + 2]);
+    }
+    return row;
+}
+
 std::string describe(const Scene& scene) {
     const auto text = [](int value) { return std::to_string(value); };
     return "mask " + text(scene.mask.width) + " x " + text(scene.mask.height) + ", box " +
@@ -282,6 +297,268 @@ void expectNothingFromBrokenInput(VFECore& core) {
         wrong.text = box;
         EXPECT_TRUE(paintsNothing(core, wrong));
     }
+}
+
+void expectNoReach(VFECore& core) {
+    EXPECT_EQ(0, core.getOffset());
+    EXPECT_EQ(0, core.getLeftOffset());
+    EXPECT_EQ(0, core.getRightOffset());
+    EXPECT_EQ(0, core.getTopOffset());
+    EXPECT_EQ(0, core.getBottomOffset());
+}
+
+void expectOpaqueDestinationUntouched(VFECore& core, Scene scene) {
+    scene.dst = filledPicture(scene.dst.width, scene.dst.height, 0xFF112233);
+    EXPECT_TRUE(paintsNothing(core, scene));
+}
+
+void expectLayersNotRead(VFECore& core) {
+    Scene scene = sceneOf(smallDisc());
+    const Scene plain = painted(core, scene);
+    scene.useOuterLayer = true;
+    scene.sub = filledPicture(20, 20, 0);
+    const Scene layered = painted(core, scene);
+    EXPECT_TRUE(samePicture(plain.dst, layered.dst));
+    EXPECT_TRUE(samePicture(*scene.sub, *layered.sub));
+}
+
+void expectCoverageGates(VFECore& core, const std::vector<uint8_t>& pixel) {
+    Scene scene = sceneOf(filledMask(3, 1, 0));
+    scene.mask.bytes = {1, 0, 255};
+    std::vector<uint8_t> expected = pixel;
+    expected.insert(expected.end(), 4, 0);
+    expected.insert(expected.end(), pixel.begin(), pixel.end());
+    EXPECT_EQ(expected, painted(core, scene).dst.bytes);
+}
+
+// --- Glows ------------------------------------------------------------------------------------------
+
+std::unique_ptr<VFECore> Glow::core(float size, uint32_t color, const Stops& stops) const {
+    std::vector<VFGradient> array = libraryStops(stops);
+    return makeCore(size, color, 1.0F, static_cast<int>(array.size()),
+                    array.empty() ? nullptr : array.data());
+}
+
+Scene Glow::painted(const Scene& scene, float size, uint32_t color, const Stops& stops) const {
+    return vorel_test::painted(*core(size, color, stops), scene);
+}
+
+::testing::AssertionResult Glow::matchesLiteral(const Scene& scene, float size, uint32_t color,
+                                                const Stops& stops) const {
+    auto same = paintsLike(*core(size, color, stops), scene, [&](Scene& expected) {
+        paintLiteral(expected.dst, expected.mask, expected.text, size, color, stops);
+    });
+    if (!same) same << "; size " << size << ", stops " << stops.size();
+    return same;
+}
+
+void Glow::expectNothingOfSizeZero() const {
+    const Scene scene = sceneOf(smallDisc());
+    EXPECT_TRUE(samePaint(scene, painted(scene, 0.0F, kWhite)));
+    EXPECT_TRUE(
+        samePaint(scene, painted(scene, 0.0F, kWhite, {{kRed, 1.0F, 0.0F}, {kBlue, 1.0F, 1.0F}})));
+}
+
+void Glow::expectNothingOfSizesOutOfProportion() const {
+    const Scene scene = sceneOf(filledMask(10, 10, 255));
+    const float infinity = std::numeric_limits<float>::infinity();
+    for (float size : {-1.0F, -1.9F, -2.0F, -50.0F, -1e9F, 256.5F, 1e9F, 3e38F, infinity, -infinity}) {
+        EXPECT_TRUE(samePaint(scene, painted(scene, size, kWhite))) << size;
+    }
+}
+
+void Glow::expectOpacityNotRead() const {
+    const Scene scene = sceneOf(smallDisc());
+    const auto faint = makeCore(5.0F, kRed, 0.25F, 0, nullptr);
+    EXPECT_TRUE(samePaint(painted(scene, 5.0F, kRed), vorel_test::painted(*faint, scene)));
+}
+
+void Glow::expectOneColourWithoutStops() const {
+    const Scene scene = sceneOf(smallDisc());
+    for (int count : {1, 2, 256, -4}) {
+        const auto counting = makeCore(5.0F, kRed, 1.0F, count, nullptr);
+        EXPECT_TRUE(samePaint(painted(scene, 5.0F, kRed), vorel_test::painted(*counting, scene)))
+            << count;
+    }
+}
+
+void Glow::expectLiteralFormOfSmallNegativeAndUnorderedSizes() const {
+    const Scene scene = sceneOf(discMask(14, 14, 7.0F, 7.0F, 4.0F, true));
+    for (float size : {-0.0F, -0.5F, -0.99F, std::nanf("")}) {
+        EXPECT_TRUE(matchesLiteral(scene, size, kRed));
+    }
+}
+
+void Glow::expectLiteralFormOfSmallScenes() const {
+    forSeeds(1000, 2200, [&](Random& random) {
+        const Scene scene = randomScene(random, 26);
+        const float size =
+            random.chance(50) ? static_cast<float>(random.between(0, 9)) : random.real(0.0F, 12.0F);
+        const int count = random.chance(30) ? 0 : random.between(1, 6);
+        EXPECT_TRUE(matchesLiteral(scene, size, randomStraight(random), randomStops(random, count)));
+    });
+}
+
+void Glow::expectLiteralFormOfEveryWholeSize() const {
+    const Stops stops{{kGreen, 1.0F, 0.0F}, {0x80FF0000, 1.0F, 0.4F}, {kBlue, 1.0F, 1.0F}};
+    const Scene scene = sceneOf(discMask(15, 9, 7.0F, 4.0F, 4.0F, true), {2, 1, 13, 8});
+    for (int size = 0; size <= 100; ++size) {
+        ASSERT_TRUE(matchesLiteral(scene, static_cast<float>(size), 0, stops));
+    }
+}
+
+void Glow::expectLiteralFormOfTheGallery() const {
+    forGallery([&](Random& random, const Mask& mask) {
+        for (float size : {1.0F, 4.0F, 13.0F}) {
+            const Scene scene = randomScene(random, mask);
+            ASSERT_TRUE(matchesLiteral(scene, size, randomStraight(random), randomStops(random, 3)));
+            ASSERT_TRUE(matchesLiteral(sceneOf(mask), size, kWhite));
+        }
+    });
+}
+
+void Glow::expectClippingToTheDestination() const {
+    forOtherDestinations(200, 16, 24, [&](Random& random, const Scene& scene) {
+        EXPECT_TRUE(matchesLiteral(scene, random.real(0.0F, 6.0F), randomStraight(random)));
+    });
+}
+
+// --- Shadows ----------------------------------------------------------------------------------------
+
+std::unique_ptr<VFECore> Shadow::core(float angle, float distance, float size, uint32_t color) const {
+    return makeCore(angle, distance, size, color, 1.0F);
+}
+
+Scene Shadow::painted(const Scene& scene, float angle, float distance, float size,
+                      uint32_t color) const {
+    return vorel_test::painted(*core(angle, distance, size, color), scene);
+}
+
+::testing::AssertionResult Shadow::matchesLiteral(const Scene& scene, float angle, float distance,
+                                                  float size, uint32_t color) const {
+    auto same = paintsLike(*core(angle, distance, size, color), scene, [&](Scene& expected) {
+        paintLiteral(expected.dst, expected.mask, expected.text, angle, distance, size, color);
+    });
+    if (!same) same << "; angle " << angle << ", distance " << distance << ", size " << size;
+    return same;
+}
+
+void Shadow::expectLiteralFormAroundTheEdges(uint8_t coverage, int angleStep, int farthest) const {
+    const Scene scene = sceneOf(filledMask(12, 9, coverage), {2, 3, 9, 7});
+    for (int angle = 0; angle < 360; angle += angleStep) {
+        for (int size = 0; size <= 4; ++size) {
+            for (int distance = 0; distance <= farthest; ++distance) {
+                ASSERT_TRUE(matchesLiteral(scene, static_cast<float>(angle),
+                                           static_cast<float>(distance), static_cast<float>(size)));
+            }
+        }
+    }
+}
+
+void Shadow::expectLiteralFormOfSmallScenes(int cases, float largestSize) const {
+    forSeeds(1000, cases, [&](Random& random) {
+        const Scene scene = randomScene(random, 32);
+        const float size = random.chance(50) ? static_cast<float>(random.between(0, 9))
+                                             : random.real(-1.0F, largestSize);
+        EXPECT_TRUE(matchesLiteral(scene, random.real(-400.0F, 400.0F), random.real(0.0F, 40.0F), size,
+                                   randomPremultiplied(random)));
+    });
+}
+
+void Shadow::expectLiteralFormOfLargeSizes(int cases, float farthest) const {
+    forSeeds(2000, cases, [&](Random& random) {
+        const Scene scene = randomScene(random, 40);
+        EXPECT_TRUE(matchesLiteral(scene, random.real(0.0F, 360.0F), random.real(0.0F, farthest),
+                                   random.real(12.0F, 100.0F), randomPremultiplied(random)));
+    });
+}
+
+void Shadow::expectLiteralFormOfTheGallery() const {
+    forGallery([&](Random& random, const Mask& mask) {
+        for (float size : {0.0F, 1.0F, 6.0F, 17.5F}) {
+            const Scene scene = randomScene(random, mask);
+            ASSERT_TRUE(matchesLiteral(scene, random.real(0.0F, 360.0F), random.real(0.0F, 20.0F), size,
+                                       randomPremultiplied(random)));
+            ASSERT_TRUE(matchesLiteral(sceneOf(mask), 120.0F, 5.0F, size));
+        }
+    });
+}
+
+void Shadow::expectClippingToTheDestination() const {
+    forOtherDestinations(300, 16, 24, [&](Random& random, const Scene& scene) {
+        EXPECT_TRUE(matchesLiteral(scene, random.real(0.0F, 360.0F), random.real(0.0F, 30.0F),
+                                   random.real(0.0F, 6.0F), randomPremultiplied(random)));
+    });
+}
+
+// --- Gradients --------------------------------------------------------------------------------------
+
+const Gradient::Stops& Gradient::ramp() {
+    static const Stops stops{{kBlack, 1.0F, 0.0F}, {kWhite, 1.0F, 1.0F}};
+    return stops;
+}
+
+std::unique_ptr<VFECore> Gradient::core(float angle, float scale, const Stops& stops) const {
+    std::vector<VFGradient> array = libraryStops(stops);
+    return makeCore(angle, scale, 1.0F, static_cast<int>(array.size()), array.data());
+}
+
+Scene Gradient::painted(const Scene& scene, float angle, float scale, const Stops& stops) const {
+    return vorel_test::painted(*core(angle, scale, stops), scene);
+}
+
+void Gradient::expectNothingWithoutStops() const {
+    const Scene scene = sceneOf(filledMask(8, 8, 255));
+    VFGradient stops[] = {{kRed, 1.0F, 0.0F}, {kBlue, 1.0F, 1.0F}};
+    for (int count : {0, -1, std::numeric_limits<int>::min()}) {
+        EXPECT_TRUE(paintsNothing(*makeCore(0.0F, 1.0F, 1.0F, count, stops), scene)) << count;
+    }
+    for (int count : {0, 1, 2, 256, -5}) {
+        EXPECT_TRUE(paintsNothing(*makeCore(0.0F, 1.0F, 1.0F, count, nullptr), scene)) << count;
+    }
+}
+
+void Gradient::expectOpacitiesNotRead(float angle) const {
+    const Scene scene = sceneOf(filledMask(20, 20, 255));
+    VFGradient faintRamp[] = {{kBlack, 0.1F, 0.0F}, {kWhite, 0.2F, 1.0F}};
+    const auto faint = makeCore(angle, 1.0F, 0.3F, 2, faintRamp);
+    EXPECT_TRUE(samePaint(painted(scene, angle, 1.0F, ramp()), vorel_test::painted(*faint, scene)));
+}
+
+void Gradient::expectLinearRampOfTwoStops(TableOf tableOf) {
+    const std::vector<uint32_t> table = tableOf(ramp());
+    for (uint32_t i = 0; i < 256; ++i) {
+        const uint32_t grey = i * 255 >> 8;
+        ASSERT_EQ(0xFF000000 | grey << 16 | grey << 8 | grey, table[i]) << i;
+    }
+}
+
+void Gradient::expectFirstColourBeforeTheFirstStop(TableOf tableOf) {
+    const std::vector<uint32_t> table = tableOf({{kBlack, 1.0F, 0.5F}, {kWhite, 1.0F, 1.0F}});
+    for (size_t i = 0; i <= 128; ++i)
+        ASSERT_EQ(kBlack, table[i]) << i;
+    EXPECT_EQ(0xFF7F7F7F, table[192]);  // half way: 128 * 255 >> 8
+}
+
+void Gradient::expectLastSegmentWhenStopsEndEarly(TableOf tableOf) {
+    const std::vector<uint32_t> table =
+        tableOf({{kBlack, 1.0F, 0.0F}, {kRed, 1.0F, 0.125F}, {kBlue, 1.0F, 0.25F}});
+    EXPECT_EQ(kRed, table[32]);
+    EXPECT_EQ(0xFF7F007F, table[48]);
+    for (size_t i = 64; i <= 255; ++i)
+        ASSERT_EQ(kBlue, table[i]) << i;
+}
+
+void Gradient::expectOneStopPassedPerEntry(TableOf tableOf) {
+    // i / 256 passes 0.1, 0.1001 and 0.1002 between entries 25 and 26.
+    const std::vector<uint32_t> table = tableOf({{kBlack, 1.0F, 0.0F},
+                                                 {kRed, 1.0F, 0.1F},
+                                                 {kGreen, 1.0F, 0.1001F},
+                                                 {kBlue, 1.0F, 0.1002F},
+                                                 {kBlack, 1.0F, 1.0F}});
+    EXPECT_EQ(kGreen, table[26]);
+    EXPECT_EQ(kBlue, table[27]);
+    EXPECT_EQ(0xFF0000FDU, table[28]);  // 2 of 256 towards black
 }
 
 }  // namespace vorel_test

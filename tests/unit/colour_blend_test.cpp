@@ -56,28 +56,46 @@ void drawByName(int mode, const Placement& p, const VFBitmap* dst, uint32_t* src
     if (mode == kDstOver) blender.blendDstOver32To32(p.x, p.y, dst, src, p.width, p.height, stride);
 }
 
-void drawLiteral(int mode, const Placement& p, uint8_t* dst, const uint32_t* src, int stride) {
-    literal::drawBitmapBlend32(p.x, p.y, dst, p.dstWidth, p.dstHeight, src, p.width, p.height, stride,
-                               mode);
+/// Draws words with the kernel of `mode` by the mode's number.
+void drawByMode(int mode, const Placement& p, const VFBitmap* dst, uint32_t* src, int stride) {
+    VFBlender().drawBitmapBlend32(p.x, p.y, dst, src, p.width, p.height, stride, mode);
 }
 
-void drawLiteralBytes(int order, const Placement& p, uint8_t* dst, const uint8_t* src, int stride) {
-    literal::drawBitmapBlend32(p.x, p.y, dst, p.dstWidth, p.dstHeight, src, p.width, p.height, stride,
-                               order);
+/// Draws bytes with the kernel that takes them, by its own name.
+void drawBytesByName(int order, const Placement& p, const VFBitmap* dst, uint8_t* src, int stride) {
+    VFBlender().blendDstOver32To32(p.x, p.y, dst, src, p.width, p.height, stride, order);
+}
+
+void drawBytesByOrder(int order, const Placement& p, const VFBitmap* dst, uint8_t* src, int stride) {
+    VFBlender().drawBitmapBlend32(p.x, p.y, dst, src, p.width, p.height, stride, order);
+}
+
+/// Draws with `draw` and compares the destination with the literal form: words in a mode or bytes in
+/// an order.
+template <class Unit>
+::testing::AssertionResult matchesLiteral(void (*draw)(int, const Placement&, const VFBitmap*, Unit*,
+                                                       int),
+                                          int modeOrOrder, const Placement& p, GuardedBitmap& dst,
+                                          Unit* src, int stride) {
+    std::vector<uint8_t> expected = bytesOf(dst.pixels());
+    const Unit* const source = src;
+    literal::drawBitmapBlend32(p.x, p.y, expected.data(), p.dstWidth, p.dstHeight, source, p.width,
+                               p.height, stride, modeOrOrder);
+    draw(modeOrOrder, p, dst.bitmap(), src, stride);
+    return sameBytes(expected.data(), dst.pixels().data(), p.dstWidth, p.dstHeight, 4);
 }
 
 /// Every kernel, by both of its names and from words and bytes, leaves `dst` as it is.
 void expectNothingDrawn(GuardedBitmap& dst, const Placement& p, uint32_t* words, int stride) {
     const std::vector<uint8_t> before = bytesOf(dst.pixels());
-    VFBlender blender;
     for (const int mode : kModes) {
         drawByName(mode, p, dst.bitmap(), words, stride);
-        blender.drawBitmapBlend32(p.x, p.y, dst.bitmap(), words, p.width, p.height, stride, mode);
+        drawByMode(mode, p, dst.bitmap(), words, stride);
     }
     auto* const bytes = reinterpret_cast<uint8_t*>(words);
     for (const int order : kOrders) {
-        blender.drawBitmapBlend32(p.x, p.y, dst.bitmap(), bytes, p.width, p.height, stride, order);
-        blender.blendDstOver32To32(p.x, p.y, dst.bitmap(), bytes, p.width, p.height, stride, order);
+        drawBytesByOrder(order, p, dst.bitmap(), bytes, stride);
+        drawBytesByName(order, p, dst.bitmap(), bytes, stride);
     }
     EXPECT_EQ(bytesOf(dst.pixels()), before) << "stride " << stride << ", " << p;
 }
@@ -172,10 +190,7 @@ TEST(ColourBlendSweep, AllPairsOfAlphasMatchTheLiteralForm) {
                 dst.pixels().data()[i * 4 + 3] = static_cast<uint8_t>(i / kSide);
                 wordsOf(source)[i] = i % kSide << 24 | (randomColor(random) & 0x00FFFFFF);
             }
-            std::vector<uint8_t> expected = bytesOf(dst.pixels());
-            drawLiteral(mode, whole, expected.data(), wordsOf(source), kSide);
-            drawByName(mode, whole, dst.bitmap(), wordsOf(source), kSide);
-            ASSERT_TRUE(sameBytes(expected.data(), dst.pixels().data(), kSide, kSide, 4));
+            ASSERT_TRUE(matchesLiteral(drawByName, mode, whole, dst, wordsOf(source), kSide));
         }
     }
 }
@@ -194,15 +209,8 @@ TEST(ColourBlendSweep, WordsMatchTheLiteralForm) {
             GuardedBuffer source(sourceBytes(p.height, stride * 4, p.width * 4), randomEdge(random));
             fillColour(random, source);
 
-            std::vector<uint8_t> expected = bytesOf(dst.pixels());
-            drawLiteral(mode, p, expected.data(), wordsOf(source), stride);
-            if (random.chance(50)) {
-                drawByName(mode, p, dst.bitmap(), wordsOf(source), stride);
-            } else {
-                VFBlender().drawBitmapBlend32(p.x, p.y, dst.bitmap(), wordsOf(source), p.width, p.height,
-                                              stride, mode);
-            }
-            ASSERT_TRUE(sameBytes(expected.data(), dst.pixels().data(), p.dstWidth, p.dstHeight, 4));
+            const auto draw = random.chance(50) ? drawByName : drawByMode;
+            ASSERT_TRUE(matchesLiteral(draw, mode, p, dst, wordsOf(source), stride));
         }
     }
 }
@@ -224,17 +232,8 @@ TEST(ColourBlendSweep, BytesMatchTheLiteralForm) {
                 fillColour(random, source.data() + row * stride, static_cast<size_t>(p.width),
                            order == kAlphaFirst ? 0 : 3);
 
-            std::vector<uint8_t> expected = bytesOf(dst.pixels());
-            drawLiteralBytes(order, p, expected.data(), source.data(), stride);
-            VFBlender blender;
-            if (random.chance(50)) {
-                blender.blendDstOver32To32(p.x, p.y, dst.bitmap(), source.data(), p.width, p.height,
-                                           stride, order);
-            } else {
-                blender.drawBitmapBlend32(p.x, p.y, dst.bitmap(), source.data(), p.width, p.height,
-                                          stride, order);
-            }
-            ASSERT_TRUE(sameBytes(expected.data(), dst.pixels().data(), p.dstWidth, p.dstHeight, 4));
+            const auto draw = random.chance(50) ? drawBytesByName : drawBytesByOrder;
+            ASSERT_TRUE(matchesLiteral(draw, order, p, dst, source.data(), stride));
         }
     }
 }
@@ -249,20 +248,13 @@ TEST(ColourBlendLimits, PlacementsAtTheEndsOfAnIntMatchTheLiteralForm) {
             SCOPED_TRACE(testing::Message() << "mode " << mode << ", " << p);
             GuardedBitmap dst(p.dstWidth, p.dstHeight, 4);
             fillColour(random, dst.pixels());
-            std::vector<uint8_t> expected = bytesOf(dst.pixels());
-            drawLiteral(mode, p, expected.data(), wordsOf(source), kStride);
-            drawByName(mode, p, dst.bitmap(), wordsOf(source), kStride);
-            ASSERT_TRUE(sameBytes(expected.data(), dst.pixels().data(), p.dstWidth, p.dstHeight, 4));
+            ASSERT_TRUE(matchesLiteral(drawByName, mode, p, dst, wordsOf(source), kStride));
         }
         for (const int order : kOrders) {
             SCOPED_TRACE(testing::Message() << "order " << order << ", " << p);
             GuardedBitmap dst(p.dstWidth, p.dstHeight, 4);
             fillColour(random, dst.pixels());
-            std::vector<uint8_t> expected = bytesOf(dst.pixels());
-            drawLiteralBytes(order, p, expected.data(), source.data(), kStride * 4);
-            VFBlender().blendDstOver32To32(p.x, p.y, dst.bitmap(), source.data(), p.width, p.height,
-                                           kStride * 4, order);
-            ASSERT_TRUE(sameBytes(expected.data(), dst.pixels().data(), p.dstWidth, p.dstHeight, 4));
+            ASSERT_TRUE(matchesLiteral(drawBytesByName, order, p, dst, source.data(), kStride * 4));
         }
     }
 }
@@ -275,15 +267,14 @@ TEST(ColourBlendLimits, NullArgumentsDrawNothing) {
     withoutPixels.mWidth = 3;
     withoutPixels.mHeight = 3;
     withoutPixels.mBytesPerPixel = 4;
-    VFBlender blender;
     for (const VFBitmap* dst : {static_cast<const VFBitmap*>(nullptr), &std::as_const(withoutPixels)}) {
         for (const int mode : kModes) {
             drawByName(mode, p, dst, words, 2);
-            blender.drawBitmapBlend32(0, 0, dst, words, 2, 2, 2, mode);
+            drawByMode(mode, p, dst, words, 2);
         }
         for (const int order : kOrders) {
-            blender.blendDstOver32To32(0, 0, dst, bytes, 2, 2, 8, order);
-            blender.drawBitmapBlend32(0, 0, dst, bytes, 2, 2, 8, order);
+            drawBytesByName(order, p, dst, bytes, 8);
+            drawBytesByOrder(order, p, dst, bytes, 8);
         }
     }
     EXPECT_EQ(withoutPixels.mData, nullptr);

@@ -14,28 +14,14 @@ using namespace vorel_test;
 using VFontEffect::VFInnerShadow;
 using VFontEffect::VFInnerShadowProperty;
 
-constexpr uint32_t kWhite = 0xFFFFFFFF;
-
-/// The scene after a shadow by the library.
-Scene shadowed(const Scene& scene, float angle, float distance, float size, uint32_t color = kWhite) {
-    VFInnerShadow core;
-    VFInnerShadowProperty record(angle, distance, size, color, 1.0F);
-    core.setProperty(&record);
-    return painted(core, scene);
+/// The literal form with the angle as the record reduces it.
+void paintLiteral(literal::Picture& dst, const literal::Mask& mask, literal::Box text, float angle,
+                  float distance, float size, uint32_t color) {
+    const VFInnerShadowProperty record(angle, distance, size, color, 1.0F);
+    literal::paintInnerShadow(dst, mask, text, record.mAngle, distance, size, color);
 }
 
-::testing::AssertionResult matchesLiteral(const Scene& scene, float angle, float distance, float size,
-                                          uint32_t color = kWhite) {
-    VFInnerShadow core;
-    VFInnerShadowProperty record(angle, distance, size, color, 1.0F);
-    core.setProperty(&record);
-    auto same = paintsLike(core, scene, [&](Scene& expected) {
-        literal::paintInnerShadow(expected.dst, expected.mask, expected.text, record.mAngle, distance,
-                                  size, color);
-    });
-    if (!same) same << "; angle " << angle << ", distance " << distance << ", size " << size;
-    return same;
-}
+const Shadow kShadow{coreOf<VFInnerShadow, VFInnerShadowProperty>, paintLiteral};
 
 // --- The core as an object ------------------------------------------------------------------------
 
@@ -64,45 +50,40 @@ TEST(InnerShadow, Record_ReducesTheAngle) {
 
 TEST(InnerShadow, FractionOfTheAngle_IsCut) {
     const Scene scene = sceneOf(discMask(30, 30, 15.0F, 14.0F, 9.0F, true));
-    EXPECT_TRUE(samePaint(shadowed(scene, -30.0F, 9.0F, 1.0F), shadowed(scene, -30.9F, 9.0F, 1.0F)));
-    EXPECT_FALSE(samePaint(shadowed(scene, -30.0F, 9.0F, 1.0F), shadowed(scene, -40.0F, 9.0F, 1.0F)));
+    EXPECT_TRUE(samePaint(kShadow.painted(scene, -30.0F, 9.0F, 1.0F),
+                          kShadow.painted(scene, -30.9F, 9.0F, 1.0F)));
+    EXPECT_FALSE(samePaint(kShadow.painted(scene, -30.0F, 9.0F, 1.0F),
+                           kShadow.painted(scene, -40.0F, 9.0F, 1.0F)));
 }
 
 TEST(InnerShadow, Offsets_StayZero) {
-    VFInnerShadow core;
-    VFInnerShadowProperty record(45.0F, 20.0F, 10.0F, kWhite, 1.0F);
-    core.setProperty(&record);
-    EXPECT_EQ(0, core.getOffset());
-    EXPECT_EQ(0, core.getLeftOffset());
-    EXPECT_EQ(0, core.getRightOffset());
-    EXPECT_EQ(0, core.getTopOffset());
-    EXPECT_EQ(0, core.getBottomOffset());
+    expectNoReach(*kShadow.core(45.0F, 20.0F, 10.0F));
 }
 
-// --- By hand: white over nothing shows the shadow plane
-// -------------------------------------------------
+// --- By hand: white over nothing shows the shadow plane --------------------------------------------
 
 TEST(InnerShadow, NoMoveAndNoSize_InvertsTheGlyph) {
     Scene scene = sceneOf(filledMask(4, 3, 77), {1, 0, 4, 2});
     scene.mask.bytes = {77, 0, 10, 255, 77, 254, 128, 1, 77, 77, 77, 77};
     EXPECT_EQ((std::vector<int>{0, 255, 245, 0, 0, 1, 127, 254, 0, 0, 0, 0}),
-              alphaOf(shadowed(scene, 0.0F, 0.0F, 0.0F).dst));
+              alphaOf(kShadow.painted(scene, 0.0F, 0.0F, 0.0F).dst));
 }
 
 TEST(InnerShadow, LightFromTheRight_ShadesTheRightEdges) {
     const Scene scene = sceneOf(filledMask(3, 2, 255));
-    EXPECT_EQ((std::vector<int>{0, 0, 255, 0, 0, 255}), alphaOf(shadowed(scene, 0.0F, 1.0F, 0.0F).dst));
+    EXPECT_EQ((std::vector<int>{0, 0, 255, 0, 0, 255}),
+              alphaOf(kShadow.painted(scene, 0.0F, 1.0F, 0.0F).dst));
     EXPECT_EQ((std::vector<int>{255, 0, 0, 255, 0, 0}),
-              alphaOf(shadowed(scene, 180.0F, 1.0F, 0.0F).dst));
+              alphaOf(kShadow.painted(scene, 180.0F, 1.0F, 0.0F).dst));
     EXPECT_EQ((std::vector<int>{255, 255, 255, 0, 0, 0}),
-              alphaOf(shadowed(scene, 90.0F, 1.0F, 0.0F).dst));
+              alphaOf(kShadow.painted(scene, 90.0F, 1.0F, 0.0F).dst));
     EXPECT_EQ((std::vector<int>{0, 0, 0, 255, 255, 255}),
-              alphaOf(shadowed(scene, 270.0F, 1.0F, 0.0F).dst));
+              alphaOf(kShadow.painted(scene, 270.0F, 1.0F, 0.0F).dst));
 }
 
 TEST(InnerShadow, DeepInsideAThickStroke_ThereIsNoShadow) {
     const Scene scene = sceneOf(filledMask(15, 15, 255));
-    const std::vector<int> alpha = alphaOf(shadowed(scene, 0.0F, 0.0F, 3.0F).dst);
+    const std::vector<int> alpha = alphaOf(kShadow.painted(scene, 0.0F, 0.0F, 3.0F).dst);
     EXPECT_EQ(0, alpha[7 * 15 + 7]);
     EXPECT_EQ(0, alpha[3 * 15 + 3]);
     EXPECT_LT(0, alpha[2 * 15 + 7]);
@@ -115,7 +96,7 @@ TEST(InnerShadow, RadiusOne_BlursTheInverseHorizontallyFirst) {
     // (26010 - 25755) / 102 = 2 at both ends and 0 between. Down a column of ends: 2 inside, with one
     // tap outside (2 * 101 + 255) / 102 = 4; of middles 0 inside, and 255 / 102 = 2.
     EXPECT_EQ((std::vector<int>{4, 2, 4, 2, 0, 2, 4, 2, 4}),
-              alphaOf(shadowed(scene, 0.0F, 0.0F, 1.0F).dst));
+              alphaOf(kShadow.painted(scene, 0.0F, 0.0F, 1.0F).dst));
 }
 
 TEST(InnerShadow, FarAwayGlyph_IsShadedWhole) {
@@ -123,7 +104,7 @@ TEST(InnerShadow, FarAwayGlyph_IsShadedWhole) {
     scene.mask.bytes = {0, 90, 255, 1};
     for (int angle = 0; angle < 360; angle += 45) {
         EXPECT_EQ((std::vector<int>{0, 90, 255, 1}),
-                  alphaOf(shadowed(scene, static_cast<float>(angle), 100.0F, 2.0F).dst));
+                  alphaOf(kShadow.painted(scene, static_cast<float>(angle), 100.0F, 2.0F).dst));
     }
 }
 
@@ -132,19 +113,19 @@ TEST(InnerShadow, ReachThatEndsOnTheLeftOrTopEdge_StillOverlaps) {
     const std::vector<int> full(16, 255);
     const std::vector<int> glyph(16, 77);
     // R = 3 and a box of 4: moved by 7 to the left or up the reach ends exactly on the edge.
-    EXPECT_EQ(full, alphaOf(shadowed(scene, 0.0F, 7.0F, 3.0F).dst));
-    EXPECT_EQ(full, alphaOf(shadowed(scene, 270.0F, 7.0F, 3.0F).dst));
-    EXPECT_EQ(glyph, alphaOf(shadowed(scene, 0.0F, 8.0F, 3.0F).dst));
-    EXPECT_EQ(glyph, alphaOf(shadowed(scene, 270.0F, 8.0F, 3.0F).dst));
+    EXPECT_EQ(full, alphaOf(kShadow.painted(scene, 0.0F, 7.0F, 3.0F).dst));
+    EXPECT_EQ(full, alphaOf(kShadow.painted(scene, 270.0F, 7.0F, 3.0F).dst));
+    EXPECT_EQ(glyph, alphaOf(kShadow.painted(scene, 0.0F, 8.0F, 3.0F).dst));
+    EXPECT_EQ(glyph, alphaOf(kShadow.painted(scene, 270.0F, 8.0F, 3.0F).dst));
 }
 
 TEST(InnerShadow, ReachThatStartsOnTheRightOrBottomEdge_DoesNotOverlap) {
     const Scene scene = sceneOf(filledMask(4, 4, 77));
     const std::vector<int> glyph(16, 77);
-    EXPECT_EQ(glyph, alphaOf(shadowed(scene, 180.0F, 7.0F, 3.0F).dst));
-    EXPECT_EQ(glyph, alphaOf(shadowed(scene, 90.0F, 7.0F, 3.0F).dst));
-    EXPECT_NE(glyph, alphaOf(shadowed(scene, 180.0F, 6.0F, 3.0F).dst));
-    EXPECT_NE(glyph, alphaOf(shadowed(scene, 90.0F, 6.0F, 3.0F).dst));
+    EXPECT_EQ(glyph, alphaOf(kShadow.painted(scene, 180.0F, 7.0F, 3.0F).dst));
+    EXPECT_EQ(glyph, alphaOf(kShadow.painted(scene, 90.0F, 7.0F, 3.0F).dst));
+    EXPECT_NE(glyph, alphaOf(kShadow.painted(scene, 180.0F, 6.0F, 3.0F).dst));
+    EXPECT_NE(glyph, alphaOf(kShadow.painted(scene, 90.0F, 6.0F, 3.0F).dst));
 }
 
 TEST(InnerShadow, LastColumnOfOverlap_IsBlurred) {
@@ -153,12 +134,12 @@ TEST(InnerShadow, LastColumnOfOverlap_IsBlurred) {
     // (255 * 248 - 255) / 248 = 253, and down the column values of 253 and 255 mix to 253.
     EXPECT_EQ((std::vector<int>{255, 255, 255, 253, 255, 255, 255, 253,  //
                                 255, 255, 255, 253, 255, 255, 255, 253}),
-              alphaOf(shadowed(scene, 180.0F, 6.0F, 3.0F).dst));
+              alphaOf(kShadow.painted(scene, 180.0F, 6.0F, 3.0F).dst));
 }
 
 TEST(InnerShadow, OnlyTheBox_IsPainted) {
     const Scene scene = sceneOf(filledMask(7, 6, 0), {2, 1, 5, 4});
-    const std::vector<int> alpha = alphaOf(shadowed(scene, 30.0F, 2.0F, 3.0F).dst);
+    const std::vector<int> alpha = alphaOf(kShadow.painted(scene, 30.0F, 2.0F, 3.0F).dst);
     for (int y = 0; y < 6; ++y) {
         for (int x = 0; x < 7; ++x) {
             const bool inside = x >= 2 && x < 5 && y >= 1 && y < 4;
@@ -168,45 +149,34 @@ TEST(InnerShadow, OnlyTheBox_IsPainted) {
 }
 
 TEST(InnerShadow, OpaqueDestination_IsUntouched) {
-    Scene scene = sceneOf(discMask(20, 20, 10.0F, 10.0F, 6.0F, true));
-    scene.dst = filledPicture(20, 20, 0xFF112233);
-    EXPECT_TRUE(samePaint(scene, shadowed(scene, 30.0F, 3.0F, 2.0F)));
-    EXPECT_TRUE(samePaint(scene, shadowed(scene, 30.0F, 300.0F, 2.0F)));
+    const Scene scene = sceneOf(discMask(20, 20, 10.0F, 10.0F, 6.0F, true));
+    expectOpaqueDestinationUntouched(*kShadow.core(30.0F, 3.0F, 2.0F), scene);
+    expectOpaqueDestinationUntouched(*kShadow.core(30.0F, 300.0F, 2.0F), scene);
 }
 
 TEST(InnerShadow, LayeredModeAndSecondDestination_AreNotRead) {
-    Scene scene = sceneOf(discMask(20, 20, 10.0F, 10.0F, 6.0F, true));
-    const Scene plain = shadowed(scene, 30.0F, 3.0F, 2.0F);
-    scene.useOuterLayer = true;
-    scene.sub = filledPicture(20, 20, 0);
-    const Scene layered = shadowed(scene, 30.0F, 3.0F, 2.0F);
-    EXPECT_TRUE(samePicture(plain.dst, layered.dst));
-    EXPECT_TRUE(samePicture(*scene.sub, *layered.sub));
+    expectLayersNotRead(*kShadow.core(30.0F, 3.0F, 2.0F));
 }
 
 // --- Hostile input ----------------------------------------------------------------------------------
 
 TEST(InnerShadow, BrokenInput_PaintsNothing) {
-    for (float distance : {1.0F, 500.0F}) {
-        VFInnerShadow core;
-        VFInnerShadowProperty record(0.0F, distance, 1.0F, kWhite, 1.0F);
-        core.setProperty(&record);
-        expectNothingFromBrokenInput(core);
-    }
+    for (float distance : {1.0F, 500.0F})
+        expectNothingFromBrokenInput(*kShadow.core(0.0F, distance, 1.0F));
 }
 
 TEST(InnerShadow, SizesOutOfProportion_PaintNothing) {
     const Scene scene = sceneOf(filledMask(10, 10, 255));
     for (float size : {256.5F, 5000.0F, 1e9F, 3e38F, std::numeric_limits<float>::infinity()}) {
-        EXPECT_TRUE(samePaint(scene, shadowed(scene, 0.0F, 0.0F, size))) << size;
-        EXPECT_TRUE(samePaint(scene, shadowed(scene, 0.0F, 1e6F, size))) << size;
+        EXPECT_TRUE(samePaint(scene, kShadow.painted(scene, 0.0F, 0.0F, size))) << size;
+        EXPECT_TRUE(samePaint(scene, kShadow.painted(scene, 0.0F, 1e6F, size))) << size;
     }
 }
 
 TEST(InnerShadow, LargestSize_MatchesTheLiteralForm) {
     const Scene scene = sceneOf(discMask(9, 8, 4.0F, 4.0F, 3.0F, true), {1, 1, 6, 7});
-    EXPECT_TRUE(matchesLiteral(scene, 60.0F, 3.0F, 256.0F));
-    EXPECT_TRUE(matchesLiteral(scene, 60.0F, 900.0F, 256.0F));
+    EXPECT_TRUE(kShadow.matchesLiteral(scene, 60.0F, 3.0F, 256.0F));
+    EXPECT_TRUE(kShadow.matchesLiteral(scene, 60.0F, 900.0F, 256.0F));
 }
 
 TEST(InnerShadow, DistancesOutOfProportion_ShadeTheWholeGlyph) {
@@ -215,7 +185,7 @@ TEST(InnerShadow, DistancesOutOfProportion_ShadeTheWholeGlyph) {
     const std::vector<int> glyph(scene.mask.bytes.begin(), scene.mask.bytes.end());
     for (float distance : {1e5F, 2147483648.0F, 1e10F, 3e38F, infinity, -1e5F, -1e10F, -infinity}) {
         for (float angle : {0.0F, 45.0F, 180.0F, 200.0F}) {
-            EXPECT_EQ(glyph, alphaOf(shadowed(scene, angle, distance, 3.0F).dst))
+            EXPECT_EQ(glyph, alphaOf(kShadow.painted(scene, angle, distance, 3.0F).dst))
                 << distance << " " << angle;
         }
     }
@@ -224,9 +194,12 @@ TEST(InnerShadow, DistancesOutOfProportion_ShadeTheWholeGlyph) {
 TEST(InnerShadow, NotANumber_CountsAsZero) {
     const Scene scene = sceneOf(discMask(14, 14, 7.0F, 7.0F, 4.0F, true));
     const float nan = std::nanf("");
-    EXPECT_TRUE(samePaint(shadowed(scene, 0.0F, 3.0F, 1.0F), shadowed(scene, nan, 3.0F, 1.0F)));
-    EXPECT_TRUE(samePaint(shadowed(scene, 0.0F, 0.0F, 1.0F), shadowed(scene, 10.0F, nan, 1.0F)));
-    EXPECT_TRUE(samePaint(shadowed(scene, 0.0F, 2.0F, 0.0F), shadowed(scene, 0.0F, 2.0F, nan)));
+    EXPECT_TRUE(
+        samePaint(kShadow.painted(scene, 0.0F, 3.0F, 1.0F), kShadow.painted(scene, nan, 3.0F, 1.0F)));
+    EXPECT_TRUE(
+        samePaint(kShadow.painted(scene, 0.0F, 0.0F, 1.0F), kShadow.painted(scene, 10.0F, nan, 1.0F)));
+    EXPECT_TRUE(
+        samePaint(kShadow.painted(scene, 0.0F, 2.0F, 0.0F), kShadow.painted(scene, 0.0F, 2.0F, nan)));
 }
 
 // --- Against the literal form -----------------------------------------------------------------------
@@ -234,60 +207,28 @@ TEST(InnerShadow, NotANumber_CountsAsZero) {
 TEST(InnerShadow, EveryWholeAngle_MatchesTheLiteralForm) {
     const Scene scene = sceneOf(discMask(24, 22, 11.0F, 12.0F, 8.0F, true), {3, 4, 19, 20});
     for (int angle = -359; angle < 360; ++angle) {
-        ASSERT_TRUE(matchesLiteral(scene, static_cast<float>(angle), 5.5F, 2.0F, 0xC0604020));
+        ASSERT_TRUE(kShadow.matchesLiteral(scene, static_cast<float>(angle), 5.5F, 2.0F, 0xC0604020));
     }
 }
 
 TEST(InnerShadow, DistancesAroundTheEdges_MatchTheLiteralForm) {
-    for (int angle = 0; angle < 360; angle += 45) {
-        for (int size = 0; size <= 4; ++size) {
-            for (int distance = 0; distance <= 24; ++distance) {
-                const Scene scene = sceneOf(filledMask(12, 9, 200), {2, 3, 9, 7});
-                ASSERT_TRUE(matchesLiteral(scene, static_cast<float>(angle),
-                                           static_cast<float>(distance), static_cast<float>(size)));
-            }
-        }
-    }
+    kShadow.expectLiteralFormAroundTheEdges(200, 45, 24);
 }
 
 TEST(InnerShadow, SmallScenes_MatchTheLiteralForm) {
-    forSeeds(1000, 4000, [](Random& random) {
-        const Scene scene = randomScene(random, 32);
-        const float size =
-            random.chance(50) ? static_cast<float>(random.between(0, 9)) : random.real(-1.0F, 14.0F);
-        EXPECT_TRUE(matchesLiteral(scene, random.real(-400.0F, 400.0F), random.real(0.0F, 40.0F), size,
-                                   randomPremultiplied(random)));
-    });
+    kShadow.expectLiteralFormOfSmallScenes(4000, 14.0F);
 }
 
 TEST(InnerShadow, LargeSizes_MatchTheLiteralForm) {
-    forSeeds(2000, 120, [](Random& random) {
-        const Scene scene = randomScene(random, 40);
-        EXPECT_TRUE(matchesLiteral(scene, random.real(0.0F, 360.0F), random.real(0.0F, 140.0F),
-                                   random.real(12.0F, 100.0F), randomPremultiplied(random)));
-    });
+    kShadow.expectLiteralFormOfLargeSizes(120, 140.0F);
 }
 
 TEST(InnerShadow, EveryMaskOfTheGallery_MatchesTheLiteralForm) {
-    for (const NamedMask& named : maskGallery()) {
-        SCOPED_TRACE(named.name);
-        Random random(99);
-        for (float size : {0.0F, 1.0F, 6.0F, 17.5F}) {
-            const Scene scene = randomScene(random, named.mask);
-            ASSERT_TRUE(matchesLiteral(scene, random.real(0.0F, 360.0F), random.real(0.0F, 20.0F), size,
-                                       randomPremultiplied(random)));
-            ASSERT_TRUE(matchesLiteral(sceneOf(named.mask), 120.0F, 5.0F, size));
-        }
-    }
+    kShadow.expectLiteralFormOfTheGallery();
 }
 
 TEST(InnerShadow, DestinationOfAnotherSize_IsClipped) {
-    forSeeds(3000, 300, [](Random& random) {
-        Scene scene = randomScene(random, 16);
-        scene.dst = randomPicture(random, random.between(1, 24), random.between(1, 24));
-        EXPECT_TRUE(matchesLiteral(scene, random.real(0.0F, 360.0F), random.real(0.0F, 30.0F),
-                                   random.real(0.0F, 6.0F), randomPremultiplied(random)));
-    });
+    kShadow.expectClippingToTheDestination();
 }
 
 }  // namespace

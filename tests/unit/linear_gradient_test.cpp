@@ -2,7 +2,6 @@
 
 #include <cmath>
 #include <limits>
-#include <memory>
 #include <vector>
 
 #include "../support/core_compare.h"
@@ -17,35 +16,16 @@ using VFontEffect::VFGradient;
 using VFontEffect::VFLinearGradient;
 using VFontEffect::VFLinearGradientProperty;
 
-constexpr uint32_t kBlack = 0xFF000000;
-constexpr uint32_t kWhite = 0xFFFFFFFF;
-constexpr uint32_t kRed = 0xFFFF0000;
-constexpr uint32_t kGreen = 0xFF00FF00;
-constexpr uint32_t kBlue = 0xFF0000FF;
-
-/// Black to white: entry i of the table is the grey i * 255 >> 8.
-const std::vector<Stop> kRamp{{kBlack, 1.0F, 0.0F}, {kWhite, 1.0F, 1.0F}};
+const Gradient kGradient{coreOf<VFLinearGradient, VFLinearGradientProperty>};
+const std::vector<Stop>& kRamp = Gradient::ramp();
 
 int greyOf(int entry) {
-    return entry * 255 >> 8;
-}
-
-/// The core with a record of these numbers; the record clamps and reduces them.
-std::unique_ptr<VFLinearGradient> coreWith(float angle, float scale, const std::vector<Stop>& stops) {
-    std::vector<VFGradient> array = libraryStops(stops);
-    VFLinearGradientProperty record(angle, scale, 1.0F, static_cast<int>(array.size()), array.data());
-    auto core = std::make_unique<VFLinearGradient>();
-    core->setProperty(&record);
-    return core;
-}
-
-Scene filled(const Scene& scene, float angle, float scale, const std::vector<Stop>& stops) {
-    return painted(*coreWith(angle, scale, stops), scene);
+    return Gradient::greyOf(entry);
 }
 
 ::testing::AssertionResult matchesLiteral(const Scene& scene, float angle, float scale,
                                           const std::vector<Stop>& stops) {
-    const auto core = coreWith(angle, scale, stops);
+    const auto core = kGradient.core(angle, scale, stops);
     const auto* record = static_cast<VFLinearGradientProperty*>(core->getProperty());
     auto same = paintsLike(*core, scene, [&](Scene& expected) {
         literal::paintLinearGradient(expected.dst, expected.mask, expected.text, record->mAngle,
@@ -57,13 +37,7 @@ Scene filled(const Scene& scene, float angle, float scale, const std::vector<Sto
 
 /// At angle 0 and scale 1 column x of a box 256 wide shows entry x of the table.
 std::vector<uint32_t> tableOf(const std::vector<Stop>& stops) {
-    const literal::Picture picture = filled(sceneOf(filledMask(256, 1, 255)), 0.0F, 1.0F, stops).dst;
-    std::vector<uint32_t> table;
-    for (size_t i = 0; i < picture.bytes.size(); i += 4) {
-        table.push_back(uint32_t{picture.bytes[i + 3]} << 24 | uint32_t{picture.bytes[i]} << 16 |
-                        uint32_t{picture.bytes[i + 1]} << 8 | picture.bytes[i + 2]);
-    }
-    return table;
+    return rowOf(kGradient.painted(sceneOf(filledMask(256, 1, 255)), 0.0F, 1.0F, stops).dst, 0);
 }
 
 std::vector<int> greys(std::initializer_list<int> entries) {
@@ -88,38 +62,19 @@ TEST(LinearGradient, Record_IsOwnedByTheCore) {
 }
 
 TEST(LinearGradient, Stops_AreCopied) {
-    const Scene scene = sceneOf(filledMask(20, 20, 255));
-    auto stops = std::make_unique<VFGradient[]>(2);
-    stops[0] = {kRed, 0.25F, 0.0F};
-    stops[1] = {kBlue, 0.75F, 0.5F};
-    VFLinearGradientProperty record(725.5F, 3.5F, 0.5F, 2, stops.get());
     VFLinearGradient core;
-    core.setProperty(&record);
-    const Scene before = painted(core, scene);
-    stops[0].mColor = kGreen;
-    stops[1].mLocation = 0.1F;
-    EXPECT_TRUE(samePaint(before, painted(core, scene)));
-    stops.reset();
-    EXPECT_TRUE(samePaint(before, painted(core, scene)));
-
+    expectCopiesItsStops(core, sceneOf(filledMask(20, 20, 255)), [](VFGradient* stops) {
+        return VFLinearGradientProperty(725.5F, 3.5F, 0.5F, 2, stops);
+    });
     const auto* stored = static_cast<VFLinearGradientProperty*>(core.getProperty());
     EXPECT_EQ(5.0F, stored->mAngle);
     EXPECT_EQ(2.0F, stored->mScale);
     EXPECT_EQ(0.5F, stored->mOpacity);
     EXPECT_EQ(0U, stored->mColor);
-    ASSERT_EQ(2, stored->mGradientCount);
-    EXPECT_EQ(kRed, stored->mGradient[0].mColor);
-    EXPECT_EQ(0.75F, stored->mGradient[1].mOpacity);
-    EXPECT_EQ(0.5F, stored->mGradient[1].mLocation);
 }
 
 TEST(LinearGradient, Offsets_StayZero) {
-    const auto core = coreWith(30.0F, 2.0F, kRamp);
-    EXPECT_EQ(0, core->getOffset());
-    EXPECT_EQ(0, core->getLeftOffset());
-    EXPECT_EQ(0, core->getRightOffset());
-    EXPECT_EQ(0, core->getTopOffset());
-    EXPECT_EQ(0, core->getBottomOffset());
+    expectNoReach(*kGradient.core(30.0F, 2.0F, kRamp));
 }
 
 // --- Direction and length by hand ---------------------------------------------------------------------
@@ -127,29 +82,29 @@ TEST(LinearGradient, Offsets_StayZero) {
 TEST(LinearGradient, AngleZero_RunsFromLeftToRight) {
     // (x - 2) * 64 + 128.
     EXPECT_EQ(greys({0, 64, 128, 192}),
-              channelOf(filled(sceneOf(filledMask(4, 1, 255)), 0.0F, 1.0F, kRamp).dst, 0));
+              channelOf(kGradient.painted(sceneOf(filledMask(4, 1, 255)), 0.0F, 1.0F, kRamp).dst, 0));
     // (x - 2.5) * 51.2, truncated towards zero, + 128: -128, -76.8, -25.6, 25.6, 76.8.
     EXPECT_EQ(greys({0, 52, 103, 153, 204}),
-              channelOf(filled(sceneOf(filledMask(5, 1, 255)), 0.0F, 1.0F, kRamp).dst, 0));
+              channelOf(kGradient.painted(sceneOf(filledMask(5, 1, 255)), 0.0F, 1.0F, kRamp).dst, 0));
 }
 
 TEST(LinearGradient, Angle90_RunsFromBottomToTop) {
     // The cosine of a hair less than a right angle adds -0.00004 half a pixel left of the centre: the
     // sums 127.99996, 63.99996, -0.00004 and -64.00004 are cut towards zero.
     EXPECT_EQ(greys({255, 191, 128, 64}),
-              channelOf(filled(sceneOf(filledMask(1, 4, 255)), 90.0F, 1.0F, kRamp).dst, 0));
+              channelOf(kGradient.painted(sceneOf(filledMask(1, 4, 255)), 90.0F, 1.0F, kRamp).dst, 0));
 }
 
 TEST(LinearGradient, Angle180_RunsFromRightToLeft) {
     const std::vector<int> red =
-        channelOf(filled(sceneOf(filledMask(64, 1, 255)), 180.0F, 1.0F, kRamp).dst, 0);
+        channelOf(kGradient.painted(sceneOf(filledMask(64, 1, 255)), 180.0F, 1.0F, kRamp).dst, 0);
     for (size_t x = 1; x < red.size(); ++x)
         ASSERT_LT(red[x], red[x - 1]) << x;
 }
 
 TEST(LinearGradient, PositiveAngle_TurnsCounterClockwise) {
     const std::vector<int> red =
-        channelOf(filled(sceneOf(filledMask(20, 20, 255)), 45.0F, 1.0F, kRamp).dst, 0);
+        channelOf(kGradient.painted(sceneOf(filledMask(20, 20, 255)), 45.0F, 1.0F, kRamp).dst, 0);
     const int topRight = red[19];
     const int bottomLeft = red[19 * 20];
     EXPECT_GT(topRight, 230);
@@ -162,46 +117,46 @@ TEST(LinearGradient, Length_FollowsTheSideThatTheLineLeavesBy) {
     // At 45 degrees in a box 40 x 10 the line leaves by the top: length 10 / sin 45 = 14.14. One pixel
     // to the right moves by cos 45 * 256 / 14.14 = 12.8 entries.
     const std::vector<int> red =
-        channelOf(filled(sceneOf(filledMask(40, 10, 255)), 45.0F, 1.0F, kRamp).dst, 0);
+        channelOf(kGradient.painted(sceneOf(filledMask(40, 10, 255)), 45.0F, 1.0F, kRamp).dst, 0);
     EXPECT_EQ(greyOf(128), red[5 * 40 + 20]);
     EXPECT_EQ(greyOf(128 + 12), red[5 * 40 + 21]);
     EXPECT_EQ(greyOf(128 + 25), red[5 * 40 + 22]);
     EXPECT_EQ(greyOf(128 - 12), red[5 * 40 + 19]);
     // In a box 10 x 40 it leaves by the side: the same length.
     const std::vector<int> tall =
-        channelOf(filled(sceneOf(filledMask(10, 40, 255)), 45.0F, 1.0F, kRamp).dst, 0);
+        channelOf(kGradient.painted(sceneOf(filledMask(10, 40, 255)), 45.0F, 1.0F, kRamp).dst, 0);
     EXPECT_EQ(greyOf(128 + 12), tall[20 * 10 + 6]);
     EXPECT_EQ(greyOf(128 + 25), tall[20 * 10 + 7]);
 }
 
 TEST(LinearGradient, Scale_StretchesOrCompressesTheRamp) {
     const Scene line = sceneOf(filledMask(4, 1, 255));
-    EXPECT_EQ(greys({64, 96, 128, 160}), channelOf(filled(line, 0.0F, 2.0F, kRamp).dst, 0));
+    EXPECT_EQ(greys({64, 96, 128, 160}), channelOf(kGradient.painted(line, 0.0F, 2.0F, kRamp).dst, 0));
     // Half the length: (x - 2) * 128 + 128, clamped to the table.
-    EXPECT_EQ(greys({0, 0, 128, 255}), channelOf(filled(line, 0.0F, 0.5F, kRamp).dst, 0));
-    EXPECT_EQ(greys({64, 96, 128, 160}), channelOf(filled(line, 0.0F, 9.0F, kRamp).dst, 0));
+    EXPECT_EQ(greys({0, 0, 128, 255}), channelOf(kGradient.painted(line, 0.0F, 0.5F, kRamp).dst, 0));
+    EXPECT_EQ(greys({64, 96, 128, 160}), channelOf(kGradient.painted(line, 0.0F, 9.0F, kRamp).dst, 0));
 }
 
 TEST(LinearGradient, ScaleBelowATenth_PaintsNothing) {
     const Scene scene = sceneOf(filledMask(8, 8, 255));
     for (float scale : {0.05F, 0.0999F, 0.0F, -1.0F, -std::numeric_limits<float>::infinity()}) {
-        EXPECT_TRUE(samePaint(scene, filled(scene, 0.0F, scale, kRamp))) << scale;
+        EXPECT_TRUE(samePaint(scene, kGradient.painted(scene, 0.0F, scale, kRamp))) << scale;
     }
-    EXPECT_FALSE(samePaint(scene, filled(scene, 0.0F, 0.1F, kRamp)));
+    EXPECT_FALSE(samePaint(scene, kGradient.painted(scene, 0.0F, 0.1F, kRamp)));
 }
 
 TEST(LinearGradient, ScaleThatIsNotANumber_PaintsTheMiddleEntry) {
     const std::vector<int> red =
-        channelOf(filled(sceneOf(filledMask(6, 2, 255)), 0.0F, std::nanf(""), kRamp).dst, 0);
+        channelOf(kGradient.painted(sceneOf(filledMask(6, 2, 255)), 0.0F, std::nanf(""), kRamp).dst, 0);
     EXPECT_EQ(std::vector<int>(12, greyOf(128)), red);
 }
 
 TEST(LinearGradient, Box_IsTheFrameOfTheRamp) {
     Scene scene = sceneOf(filledMask(9, 3, 255), {3, 1, 7, 2});
-    const std::vector<int> red = channelOf(filled(scene, 0.0F, 1.0F, kRamp).dst, 0);
+    const std::vector<int> red = channelOf(kGradient.painted(scene, 0.0F, 1.0F, kRamp).dst, 0);
     EXPECT_EQ(greys({0, 0, 0, 0, 64, 128, 192, 0, 0}),
               std::vector<int>(red.begin() + 9, red.begin() + 18));
-    const std::vector<int> alpha = alphaOf(filled(scene, 0.0F, 1.0F, kRamp).dst);
+    const std::vector<int> alpha = alphaOf(kGradient.painted(scene, 0.0F, 1.0F, kRamp).dst);
     EXPECT_EQ((std::vector<int>{0, 0, 0, 255, 255, 255, 255, 0, 0}),
               std::vector<int>(alpha.begin() + 9, alpha.begin() + 18));
     EXPECT_EQ(0, alpha[4]);
@@ -211,76 +166,47 @@ TEST(LinearGradient, Box_IsTheFrameOfTheRamp) {
 // --- Pixels -------------------------------------------------------------------------------------------
 
 TEST(LinearGradient, Coverage_GatesButDoesNotScale) {
-    Scene scene = sceneOf(filledMask(3, 1, 0));
-    scene.mask.bytes = {1, 0, 255};
-    const Scene result = filled(scene, 0.0F, 1.0F, {{0xFF203040, 1.0F, 0.0F}});
-    EXPECT_EQ((std::vector<uint8_t>{0x20, 0x30, 0x40, 0xFF, 0, 0, 0, 0, 0x20, 0x30, 0x40, 0xFF}),
-              result.dst.bytes);
+    expectCoverageGates(*kGradient.core(0.0F, 1.0F, {{0xFF203040, 1.0F, 0.0F}}),
+                        {0x20, 0x30, 0x40, 0xFF});
 }
 
 TEST(LinearGradient, SingleStop_FillsFlat) {
-    const Scene result = filled(sceneOf(filledMask(7, 5, 255)), 33.0F, 1.3F, {{0xFF203040, 1.0F, 0.6F}});
+    const Scene result =
+        kGradient.painted(sceneOf(filledMask(7, 5, 255)), 33.0F, 1.3F, {{0xFF203040, 1.0F, 0.6F}});
     EXPECT_TRUE(samePicture(filledPicture(7, 5, 0xFF203040), result.dst));
 }
 
 TEST(LinearGradient, StraightColours_ArePremultiplied) {
-    const Scene result = filled(sceneOf(filledMask(1, 1, 255)), 0.0F, 1.0F, {{0x80FF4020, 1.0F, 0.0F}});
+    const Scene result =
+        kGradient.painted(sceneOf(filledMask(1, 1, 255)), 0.0F, 1.0F, {{0x80FF4020, 1.0F, 0.0F}});
     // 256 * 128 >> 8, 65 * 128 >> 8, 33 * 128 >> 8.
     EXPECT_EQ((std::vector<uint8_t>{128, 32, 16, 128}), result.dst.bytes);
 }
 
 TEST(LinearGradient, OpaqueDestination_IsUntouched) {
-    Scene scene = sceneOf(filledMask(8, 8, 255));
-    scene.dst = filledPicture(8, 8, 0xFF112233);
-    EXPECT_TRUE(samePaint(scene, filled(scene, 0.0F, 1.0F, kRamp)));
+    expectOpaqueDestinationUntouched(*kGradient.core(0.0F, 1.0F, kRamp), sceneOf(filledMask(8, 8, 255)));
 }
 
 TEST(LinearGradient, OpacitiesOfRecordAndStops_AreNotRead) {
-    const Scene scene = sceneOf(filledMask(20, 20, 255));
-    VFGradient stops[] = {{kBlack, 0.1F, 0.0F}, {kWhite, 0.2F, 1.0F}};
-    VFLinearGradientProperty record(30.0F, 1.0F, 0.3F, 2, stops);
-    VFLinearGradient core;
-    core.setProperty(&record);
-    EXPECT_TRUE(samePaint(filled(scene, 30.0F, 1.0F, kRamp), painted(core, scene)));
+    kGradient.expectOpacitiesNotRead(30.0F);
 }
 
-// --- The colour table, seen through a box of 256 columns
-// -------------------------------------------------
+// --- The colour table, seen through a box of 256 columns -------------------------------------------
 
 TEST(LinearGradient, Table_OfTwoStopsIsALinearRamp) {
-    const std::vector<uint32_t> table = tableOf(kRamp);
-    for (uint32_t i = 0; i < 256; ++i) {
-        const uint32_t grey = i * 255 >> 8;
-        ASSERT_EQ(0xFF000000 | grey << 16 | grey << 8 | grey, table[i]) << i;
-    }
+    Gradient::expectLinearRampOfTwoStops(tableOf);
 }
 
 TEST(LinearGradient, Table_BeforeTheFirstStopHasItsColour) {
-    const std::vector<uint32_t> table = tableOf({{kBlack, 1.0F, 0.5F}, {kWhite, 1.0F, 1.0F}});
-    for (size_t i = 0; i <= 128; ++i)
-        ASSERT_EQ(kBlack, table[i]) << i;
-    EXPECT_EQ(0xFF7F7F7F, table[192]);  // half way: 128 * 255 >> 8
+    Gradient::expectFirstColourBeforeTheFirstStop(tableOf);
 }
 
 TEST(LinearGradient, Table_KeepsTheLastSegmentWhenStopsEndEarly) {
-    const std::vector<uint32_t> table =
-        tableOf({{kBlack, 1.0F, 0.0F}, {kRed, 1.0F, 0.125F}, {kBlue, 1.0F, 0.25F}});
-    EXPECT_EQ(kRed, table[32]);
-    EXPECT_EQ(0xFF7F007F, table[48]);
-    for (size_t i = 64; i <= 255; ++i)
-        ASSERT_EQ(kBlue, table[i]) << i;
+    Gradient::expectLastSegmentWhenStopsEndEarly(tableOf);
 }
 
 TEST(LinearGradient, Table_PassesOneStopPerEntry) {
-    // i / 256 passes 0.1, 0.1001 and 0.1002 between entries 25 and 26.
-    const std::vector<uint32_t> table = tableOf({{kBlack, 1.0F, 0.0F},
-                                                 {kRed, 1.0F, 0.1F},
-                                                 {kGreen, 1.0F, 0.1001F},
-                                                 {kBlue, 1.0F, 0.1002F},
-                                                 {kBlack, 1.0F, 1.0F}});
-    EXPECT_EQ(kGreen, table[26]);
-    EXPECT_EQ(kBlue, table[27]);
-    EXPECT_EQ(0xFF0000FDU, table[28]);  // 2 of 256 towards black
+    Gradient::expectOneStopPassedPerEntry(tableOf);
 }
 
 TEST(LinearGradient, Table_PassesAStopOnlyBeyondIt) {
@@ -320,25 +246,11 @@ TEST(LinearGradient, Table_OfUnsortedStopsMatchesTheLiteralForm) {
 // --- Hostile input ----------------------------------------------------------------------------------
 
 TEST(LinearGradient, BrokenInput_PaintsNothing) {
-    const auto core = coreWith(30.0F, 1.0F, kRamp);
-    expectNothingFromBrokenInput(*core);
+    expectNothingFromBrokenInput(*kGradient.core(30.0F, 1.0F, kRamp));
 }
 
 TEST(LinearGradient, NoStops_PaintNothing) {
-    const Scene scene = sceneOf(filledMask(8, 8, 255));
-    VFGradient stops[] = {{kRed, 1.0F, 0.0F}, {kBlue, 1.0F, 1.0F}};
-    for (int count : {0, -1, -2147483647 - 1}) {
-        VFLinearGradientProperty record(0.0F, 1.0F, 1.0F, count, stops);
-        VFLinearGradient core;
-        core.setProperty(&record);
-        EXPECT_TRUE(paintsNothing(core, scene)) << count;
-    }
-    for (int count : {0, 1, 2, 256, -5}) {
-        VFLinearGradientProperty record(0.0F, 1.0F, 1.0F, count, nullptr);
-        VFLinearGradient core;
-        core.setProperty(&record);
-        EXPECT_TRUE(paintsNothing(core, scene)) << count;
-    }
+    kGradient.expectNothingWithoutStops();
 }
 
 // --- Against the literal form -----------------------------------------------------------------------
@@ -366,21 +278,17 @@ TEST(LinearGradient, RandomScenes_MatchTheLiteralForm) {
 }
 
 TEST(LinearGradient, EveryMaskOfTheGallery_MatchesTheLiteralForm) {
-    for (const NamedMask& named : maskGallery()) {
-        SCOPED_TRACE(named.name);
-        Random random(99);
+    forGallery([](Random& random, const literal::Mask& mask) {
         for (int i = 0; i < 12; ++i) {
-            const Scene scene = randomScene(random, named.mask);
+            const Scene scene = randomScene(random, mask);
             ASSERT_TRUE(matchesLiteral(scene, random.real(0.0F, 360.0F), random.real(0.1F, 2.0F),
                                        randomStops(random, 4)));
         }
-    }
+    });
 }
 
 TEST(LinearGradient, DestinationOfAnotherSize_IsClipped) {
-    forSeeds(3000, 300, [](Random& random) {
-        Scene scene = randomScene(random, 16);
-        scene.dst = randomPicture(random, random.between(1, 24), random.between(1, 24));
+    forOtherDestinations(300, 16, 24, [](Random& random, const Scene& scene) {
         EXPECT_TRUE(matchesLiteral(scene, random.real(0.0F, 360.0F), 1.0F, randomStops(random, 3)));
     });
 }

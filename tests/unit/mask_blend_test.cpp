@@ -60,6 +60,17 @@ void drawLiteral(int mode, const Placement& p, uint8_t* dst, const uint8_t* mask
                               color, mode);
 }
 
+using Draw = decltype(&drawByName);
+
+/// Draws with `draw`, by name or by mode, and compares the destination with the literal form.
+::testing::AssertionResult matchesLiteral(Draw draw, int mode, const Placement& p, GuardedBitmap& dst,
+                                          uint8_t* mask, int stride, uint32_t color) {
+    std::vector<uint8_t> expected = bytesOf(dst.pixels());
+    drawLiteral(mode, p, expected.data(), mask, stride, color);
+    draw(mode, p, dst.bitmap(), mask, stride, color);
+    return sameBytes(expected.data(), dst.pixels().data(), p.dstWidth, p.dstHeight, 4);
+}
+
 /// Every kernel, by both of its names, leaves `dst` as it is.
 void expectNothingDrawn(GuardedBitmap& dst, const Placement& p, uint8_t* mask, int stride) {
     const std::vector<uint8_t> before = bytesOf(dst.pixels());
@@ -175,10 +186,7 @@ TEST(MaskBlendSweep, AllCoveragesOverAllAlphasMatchTheLiteralForm) {
             for (size_t i = 0; i < mask.size(); ++i)
                 dst.pixels().data()[i * 4 + 3] = static_cast<uint8_t>(i / kSide);
             const Placement whole{kSide, kSide, 0, 0, kSide, kSide};
-            std::vector<uint8_t> expected = bytesOf(dst.pixels());
-            drawLiteral(mode, whole, expected.data(), mask.data(), kSide, color);
-            drawByMode(mode, whole, dst.bitmap(), mask.data(), kSide, color);
-            ASSERT_TRUE(sameBytes(expected.data(), dst.pixels().data(), kSide, kSide, 4));
+            ASSERT_TRUE(matchesLiteral(drawByMode, mode, whole, dst, mask.data(), kSide, color));
         }
     }
 }
@@ -198,13 +206,8 @@ TEST(MaskBlendSweep, MatchesTheLiteralForm) {
             fillMask(random, mask.data(), mask.size());
             const uint32_t color = randomColor(random);
 
-            std::vector<uint8_t> expected = bytesOf(dst.pixels());
-            drawLiteral(mode, p, expected.data(), mask.data(), stride, color);
-            if (random.chance(50))
-                drawByName(mode, p, dst.bitmap(), mask.data(), stride, color);
-            else
-                drawByMode(mode, p, dst.bitmap(), mask.data(), stride, color);
-            ASSERT_TRUE(sameBytes(expected.data(), dst.pixels().data(), p.dstWidth, p.dstHeight, 4));
+            const auto draw = random.chance(50) ? drawByName : drawByMode;
+            ASSERT_TRUE(matchesLiteral(draw, mode, p, dst, mask.data(), stride, color));
         }
     }
 }
@@ -219,10 +222,7 @@ TEST(MaskBlendLimits, PlacementsAtTheEndsOfAnIntMatchTheLiteralForm) {
             SCOPED_TRACE(testing::Message() << "mode " << mode << ", " << p);
             GuardedBitmap dst(p.dstWidth, p.dstHeight, 4);
             fillColour(random, dst.pixels());
-            std::vector<uint8_t> expected = bytesOf(dst.pixels());
-            drawLiteral(mode, p, expected.data(), mask.data(), kStride, 0x80FF7F01);
-            drawByName(mode, p, dst.bitmap(), mask.data(), kStride, 0x80FF7F01);
-            ASSERT_TRUE(sameBytes(expected.data(), dst.pixels().data(), p.dstWidth, p.dstHeight, 4));
+            ASSERT_TRUE(matchesLiteral(drawByName, mode, p, dst, mask.data(), kStride, 0x80FF7F01));
         }
     }
 }
@@ -235,10 +235,7 @@ TEST(MaskBlendLimits, StrideOfZeroRepeatsTheRowAndANegativeOneDrawsNothing) {
     for (const int mode : kModes) {
         GuardedBitmap dst(8, 3, 4);
         fillColour(random, dst.pixels());
-        std::vector<uint8_t> expected = bytesOf(dst.pixels());
-        drawLiteral(mode, p, expected.data(), mask.data(), 0, 0xFF00FF7F);
-        drawByName(mode, p, dst.bitmap(), mask.data(), 0, 0xFF00FF7F);
-        ASSERT_TRUE(sameBytes(expected.data(), dst.pixels().data(), 8, 3, 4)) << mode;
+        ASSERT_TRUE(matchesLiteral(drawByName, mode, p, dst, mask.data(), 0, 0xFF00FF7F)) << mode;
     }
     GuardedBitmap dst(8, 3, 4);
     for (const int stride : {-1, -8, INT_MIN})

@@ -14,35 +14,13 @@ using namespace vorel_test;
 using VFontEffect::VFOuterShadow;
 using VFontEffect::VFOuterShadowProperty;
 
-constexpr uint32_t kWhite = 0xFFFFFFFF;
-
-/// The scene after a shadow by the library.
-Scene shadowed(const Scene& scene, float angle, float distance, float size, uint32_t color = kWhite) {
-    VFOuterShadow core;
-    VFOuterShadowProperty record(angle, distance, size, color, 1.0F);
-    core.setProperty(&record);
-    return painted(core, scene);
-}
-
-::testing::AssertionResult matchesLiteral(const Scene& scene, float angle, float distance, float size,
-                                          uint32_t color = kWhite) {
-    VFOuterShadow core;
-    VFOuterShadowProperty record(angle, distance, size, color, 1.0F);
-    core.setProperty(&record);
-    auto same = paintsLike(core, scene, [&](Scene& expected) {
-        literal::paintOuterShadow(expected.dst, expected.mask, expected.text, angle, distance, size,
-                                  color);
-    });
-    if (!same) same << "; angle " << angle << ", distance " << distance << ", size " << size;
-    return same;
-}
+const Shadow kShadow{coreOf<VFOuterShadow, VFOuterShadowProperty>, literal::paintOuterShadow};
 
 /// Left, top, right and bottom offset.
 std::vector<int> marginsOf(float angle, float distance, float size) {
-    VFOuterShadow core;
-    VFOuterShadowProperty record(angle, distance, size, kWhite, 1.0F);
-    core.setProperty(&record);
-    return {core.getLeftOffset(), core.getTopOffset(), core.getRightOffset(), core.getBottomOffset()};
+    const auto core = kShadow.core(angle, distance, size);
+    return {core->getLeftOffset(), core->getTopOffset(), core->getRightOffset(),
+            core->getBottomOffset()};
 }
 
 /// A shadow of size 0 moves the mask; returns where a single pixel goes.
@@ -50,7 +28,7 @@ literal::Offset moveOf(float angle, float distance) {
     constexpr int kSide = 61;
     Scene scene = sceneOf(filledMask(kSide, kSide, 0), {30, 30, 31, 31});
     scene.mask.bytes[30 * kSide + 30] = 255;
-    const std::vector<int> alpha = alphaOf(shadowed(scene, angle, distance, 0.0F).dst);
+    const std::vector<int> alpha = alphaOf(kShadow.painted(scene, angle, distance, 0.0F).dst);
     for (int y = 0; y < kSide; ++y) {
         for (int x = 0; x < kSide; ++x) {
             if (alpha[static_cast<size_t>(y * kSide + x)] == 255) return {x - 30, y - 30};
@@ -71,7 +49,7 @@ std::vector<int> columnResponse(float size, int reach) {
     Scene scene = sceneOf(filledMask(kSide, kSide, 0));
     for (size_t y = 0; y < kSide; ++y)
         scene.mask.bytes[y * kSide + 20] = 255;
-    const std::vector<int> alpha = alphaOf(shadowed(scene, 0.0F, 0.0F, size).dst);
+    const std::vector<int> alpha = alphaOf(kShadow.painted(scene, 0.0F, 0.0F, size).dst);
     std::vector<int> response;
     for (int k = 0; k <= reach; ++k) {
         const auto right = static_cast<size_t>(20 * kSide + 20 + k);
@@ -119,10 +97,7 @@ TEST(OuterShadow, NewRecord_MovesTheOffsets) {
 }
 
 TEST(OuterShadow, BaseOffset_StaysZero) {
-    VFOuterShadow core;
-    VFOuterShadowProperty record(0.0F, 10.0F, 10.0F, kWhite, 1.0F);
-    core.setProperty(&record);
-    EXPECT_EQ(0, core.getOffset());
+    EXPECT_EQ(0, kShadow.core(0.0F, 10.0F, 10.0F)->getOffset());
 }
 
 // --- Offsets --------------------------------------------------------------------------------------
@@ -181,10 +156,10 @@ TEST(OuterShadow, SizeZero_MovesTheMaskUnchanged) {
                         9, 9, 40, 50, 60, 9,  //
                         9, 9, 70, 80, 90, 9};
     // Two to the left; then one row down, where the last row leaves the picture.
-    Scene moved = shadowed(scene, 0.0F, 2.0F, 0.0F);
+    Scene moved = kShadow.painted(scene, 0.0F, 2.0F, 0.0F);
     EXPECT_EQ((std::vector<int>{10, 20, 30, 0, 0, 0, 40, 50, 60, 0, 0, 0, 70, 80, 90, 0, 0, 0}),
               alphaOf(moved.dst));
-    moved = shadowed(scene, 90.0F, 1.0F, 0.0F);
+    moved = kShadow.painted(scene, 90.0F, 1.0F, 0.0F);
     EXPECT_EQ((std::vector<int>{0, 0, 0, 0, 0, 0, 0, 0, 10, 20, 30, 0, 0, 0, 40, 50, 60, 0}),
               alphaOf(moved.dst));
 }
@@ -199,7 +174,7 @@ TEST(OuterShadow, RadiusOne_BlursVerticallyFirst) {
                                     0, 2, 245, 2, 0,  //
                                     0, 0, 1,   0, 0,  //
                                     0, 0, 0,   0, 0};
-    EXPECT_EQ(expected, alphaOf(shadowed(scene, 0.0F, 0.0F, 0.5F).dst));
+    EXPECT_EQ(expected, alphaOf(kShadow.painted(scene, 0.0F, 0.0F, 0.5F).dst));
 }
 
 TEST(OuterShadow, Size_RoundsToTheRadius) {
@@ -226,37 +201,30 @@ TEST(OuterShadow, LiteralKernel_HoldsTheWorkedWeights) {
 
 TEST(OuterShadow, CoverageOutsideTheBox_IsNotRead) {
     Scene scene = sceneOf(filledMask(9, 9, 255), {4, 4, 5, 5});
-    const std::vector<int> alpha = alphaOf(shadowed(scene, 0.0F, 0.0F, 0.5F).dst);
+    const std::vector<int> alpha = alphaOf(kShadow.painted(scene, 0.0F, 0.0F, 0.5F).dst);
     EXPECT_EQ(245, alpha[4 * 9 + 4]);
     EXPECT_EQ(0, alpha[0]);
 }
 
 TEST(OuterShadow, OpaqueDestination_IsUntouched) {
-    Scene scene = sceneOf(discMask(20, 20, 10.0F, 10.0F, 6.0F, true));
-    scene.dst = filledPicture(20, 20, 0xFF112233);
-    EXPECT_TRUE(samePaint(scene, shadowed(scene, 30.0F, 3.0F, 2.0F)));
+    const Scene scene = sceneOf(discMask(20, 20, 10.0F, 10.0F, 6.0F, true));
+    expectOpaqueDestinationUntouched(*kShadow.core(30.0F, 3.0F, 2.0F), scene);
 }
 
 TEST(OuterShadow, LayeredModeAndSecondDestination_AreNotRead) {
-    Scene scene = sceneOf(discMask(20, 20, 10.0F, 10.0F, 6.0F, true));
-    const Scene plain = shadowed(scene, 30.0F, 3.0F, 2.0F);
-    scene.useOuterLayer = true;
-    scene.sub = filledPicture(20, 20, 0);
-    const Scene layered = shadowed(scene, 30.0F, 3.0F, 2.0F);
-    EXPECT_TRUE(samePicture(plain.dst, layered.dst));
-    EXPECT_TRUE(samePicture(*scene.sub, *layered.sub));
+    expectLayersNotRead(*kShadow.core(30.0F, 3.0F, 2.0F));
 }
 
-// --- Shadows that leave the destination
-// -----------------------------------------------------------------
+// --- Shadows that leave the destination ------------------------------------------------------------
 
 TEST(OuterShadow, ShadowOutsideTheDestination_PaintsNothing) {
     const Scene scene = sceneOf(filledMask(10, 10, 255));
     for (float size : {0.0F, 3.0F}) {
         for (int angle = 0; angle < 360; angle += 90) {
+            EXPECT_TRUE(samePaint(
+                scene, kShadow.painted(scene, static_cast<float>(angle), 10.0F + 2.0F * size, size)));
             EXPECT_TRUE(
-                samePaint(scene, shadowed(scene, static_cast<float>(angle), 10.0F + 2.0F * size, size)));
-            EXPECT_TRUE(samePaint(scene, shadowed(scene, static_cast<float>(angle), 1000.0F, size)));
+                samePaint(scene, kShadow.painted(scene, static_cast<float>(angle), 1000.0F, size)));
         }
     }
 }
@@ -265,37 +233,26 @@ TEST(OuterShadow, LastColumnInside_IsStillPainted) {
     const Scene scene = sceneOf(filledMask(10, 1, 255));
     std::vector<int> expected(10, 0);
     expected[0] = 255;
-    EXPECT_EQ(expected, alphaOf(shadowed(scene, 0.0F, 9.0F, 0.0F).dst));
+    EXPECT_EQ(expected, alphaOf(kShadow.painted(scene, 0.0F, 9.0F, 0.0F).dst));
     expected = std::vector<int>(10, 0);
     expected[9] = 255;
-    EXPECT_EQ(expected, alphaOf(shadowed(scene, 180.0F, 9.0F, 0.0F).dst));
+    EXPECT_EQ(expected, alphaOf(kShadow.painted(scene, 180.0F, 9.0F, 0.0F).dst));
 }
 
 TEST(OuterShadow, DistancesAroundTheEdges_MatchTheLiteralForm) {
-    for (int angle = 0; angle < 360; angle += 90) {
-        for (int size = 0; size <= 4; ++size) {
-            for (int distance = 0; distance <= 32; ++distance) {
-                const Scene scene = sceneOf(filledMask(12, 9, 255), {2, 3, 9, 7});
-                ASSERT_TRUE(matchesLiteral(scene, static_cast<float>(angle),
-                                           static_cast<float>(distance), static_cast<float>(size)));
-            }
-        }
-    }
+    kShadow.expectLiteralFormAroundTheEdges(255, 90, 32);
 }
 
 // --- Hostile input ----------------------------------------------------------------------------------
 
 TEST(OuterShadow, BrokenInput_PaintsNothing) {
-    VFOuterShadow core;
-    VFOuterShadowProperty record(0.0F, 1.0F, 1.0F, kWhite, 1.0F);
-    core.setProperty(&record);
-    expectNothingFromBrokenInput(core);
+    expectNothingFromBrokenInput(*kShadow.core(0.0F, 1.0F, 1.0F));
 }
 
 TEST(OuterShadow, SizesOutOfProportion_PaintNothing) {
     const Scene scene = sceneOf(filledMask(10, 10, 255));
     for (float size : {256.5F, 5000.0F, 1e9F, 3e38F, std::numeric_limits<float>::infinity()}) {
-        EXPECT_TRUE(samePaint(scene, shadowed(scene, 0.0F, 0.0F, size))) << size;
+        EXPECT_TRUE(samePaint(scene, kShadow.painted(scene, 0.0F, 0.0F, size))) << size;
     }
 }
 
@@ -305,7 +262,7 @@ TEST(OuterShadow, DistancesOutOfProportion_PaintNothing) {
     for (float distance : {1e5F, 2147483648.0F, 1e10F, 3e38F, infinity, -1e5F, -1e10F, -infinity}) {
         for (float angle : {0.0F, 45.0F, 180.0F, 200.0F}) {
             for (float size : {0.0F, 5.0F}) {
-                EXPECT_TRUE(samePaint(scene, shadowed(scene, angle, distance, size)))
+                EXPECT_TRUE(samePaint(scene, kShadow.painted(scene, angle, distance, size)))
                     << distance << " " << angle;
             }
         }
@@ -315,10 +272,11 @@ TEST(OuterShadow, DistancesOutOfProportion_PaintNothing) {
 TEST(OuterShadow, NotANumber_CountsAsZero) {
     const Scene scene = sceneOf(discMask(14, 14, 7.0F, 7.0F, 4.0F, true));
     const float nan = std::nanf("");
-    const Scene unmoved = shadowed(scene, 0.0F, 0.0F, 1.0F);
-    EXPECT_TRUE(samePaint(unmoved, shadowed(scene, nan, 3.0F, 1.0F)));
-    EXPECT_TRUE(samePaint(unmoved, shadowed(scene, 10.0F, nan, 1.0F)));
-    EXPECT_TRUE(samePaint(shadowed(scene, 0.0F, 2.0F, 0.0F), shadowed(scene, 0.0F, 2.0F, nan)));
+    const Scene unmoved = kShadow.painted(scene, 0.0F, 0.0F, 1.0F);
+    EXPECT_TRUE(samePaint(unmoved, kShadow.painted(scene, nan, 3.0F, 1.0F)));
+    EXPECT_TRUE(samePaint(unmoved, kShadow.painted(scene, 10.0F, nan, 1.0F)));
+    EXPECT_TRUE(
+        samePaint(kShadow.painted(scene, 0.0F, 2.0F, 0.0F), kShadow.painted(scene, 0.0F, 2.0F, nan)));
     EXPECT_EQ((std::vector<int>{0, 0, 0, 0}), marginsOf(nan, nan, nan));
 }
 
@@ -327,48 +285,24 @@ TEST(OuterShadow, NotANumber_CountsAsZero) {
 TEST(OuterShadow, EveryWholeAngle_MatchesTheLiteralForm) {
     const Scene scene = sceneOf(discMask(24, 22, 11.0F, 12.0F, 6.0F, true), {3, 4, 19, 20});
     for (int angle = 0; angle < 360; ++angle) {
-        ASSERT_TRUE(matchesLiteral(scene, static_cast<float>(angle), 5.5F, 2.0F, 0xC0604020));
+        ASSERT_TRUE(kShadow.matchesLiteral(scene, static_cast<float>(angle), 5.5F, 2.0F, 0xC0604020));
     }
 }
 
 TEST(OuterShadow, SmallScenes_MatchTheLiteralForm) {
-    forSeeds(1000, 3000, [](Random& random) {
-        const Scene scene = randomScene(random, 32);
-        const float size =
-            random.chance(50) ? static_cast<float>(random.between(0, 9)) : random.real(-1.0F, 12.0F);
-        EXPECT_TRUE(matchesLiteral(scene, random.real(-400.0F, 400.0F), random.real(0.0F, 40.0F), size,
-                                   randomPremultiplied(random)));
-    });
+    kShadow.expectLiteralFormOfSmallScenes(3000, 12.0F);
 }
 
 TEST(OuterShadow, LargeSizes_MatchTheLiteralForm) {
-    forSeeds(2000, 60, [](Random& random) {
-        const Scene scene = randomScene(random, 40);
-        EXPECT_TRUE(matchesLiteral(scene, random.real(0.0F, 360.0F), random.real(0.0F, 100.0F),
-                                   random.real(12.0F, 100.0F), randomPremultiplied(random)));
-    });
+    kShadow.expectLiteralFormOfLargeSizes(60, 100.0F);
 }
 
 TEST(OuterShadow, EveryMaskOfTheGallery_MatchesTheLiteralForm) {
-    for (const NamedMask& named : maskGallery()) {
-        SCOPED_TRACE(named.name);
-        Random random(99);
-        for (float size : {0.0F, 1.0F, 6.0F, 17.5F}) {
-            const Scene scene = randomScene(random, named.mask);
-            ASSERT_TRUE(matchesLiteral(scene, random.real(0.0F, 360.0F), random.real(0.0F, 20.0F), size,
-                                       randomPremultiplied(random)));
-            ASSERT_TRUE(matchesLiteral(sceneOf(named.mask), 120.0F, 5.0F, size));
-        }
-    }
+    kShadow.expectLiteralFormOfTheGallery();
 }
 
 TEST(OuterShadow, DestinationOfAnotherSize_IsClipped) {
-    forSeeds(3000, 300, [](Random& random) {
-        Scene scene = randomScene(random, 16);
-        scene.dst = randomPicture(random, random.between(1, 24), random.between(1, 24));
-        EXPECT_TRUE(matchesLiteral(scene, random.real(0.0F, 360.0F), random.real(0.0F, 30.0F),
-                                   random.real(0.0F, 6.0F), randomPremultiplied(random)));
-    });
+    kShadow.expectClippingToTheDestination();
 }
 
 }  // namespace

@@ -13,6 +13,7 @@ namespace {
 
 using namespace vorel_test;
 using VFontEffect::VFBitmap;
+using VFontEffect::VFECore;
 using VFontEffect::VFPattern;
 using VFontEffect::VFPatternProperty;
 
@@ -52,12 +53,9 @@ VFBitmap bitmapOf(const Tile& tile) {
 }
 
 /// The core with a record of these numbers; the record clamps the scale.
-std::unique_ptr<VFPattern> coreWith(const Tile& tile, float scale, float opacity) {
+std::unique_ptr<VFECore> coreWith(const Tile& tile, float scale, float opacity) {
     VFBitmap bitmap = bitmapOf(tile);
-    VFPatternProperty record(&bitmap, scale, opacity);
-    auto core = std::make_unique<VFPattern>();
-    core->setProperty(&record);
-    return core;
+    return coreOf<VFPattern, VFPatternProperty>(&bitmap, scale, opacity);
 }
 
 Scene filled(const Scene& scene, const Tile& tile, float scale, float opacity = 1.0F) {
@@ -133,12 +131,7 @@ TEST(Pattern, Bitmap_IsCopied) {
 }
 
 TEST(Pattern, Offsets_StayZero) {
-    const auto core = coreWith(numberedTile(4, 4, 60, 60), 2.0F, 1.0F);
-    EXPECT_EQ(0, core->getOffset());
-    EXPECT_EQ(0, core->getLeftOffset());
-    EXPECT_EQ(0, core->getRightOffset());
-    EXPECT_EQ(0, core->getTopOffset());
-    EXPECT_EQ(0, core->getBottomOffset());
+    expectNoReach(*coreWith(numberedTile(4, 4, 60, 60), 2.0F, 1.0F));
 }
 
 // --- By hand ----------------------------------------------------------------------------------------
@@ -236,11 +229,8 @@ TEST(Pattern, Tiling_StartsAtTheBox) {
 }
 
 TEST(Pattern, Coverage_GatesButDoesNotScale) {
-    Scene scene = sceneOf(filledMask(3, 1, 0));
-    scene.mask.bytes = {1, 0, 255};
     const Tile white{1, 1, {255, 255, 255, 255}};
-    EXPECT_EQ((std::vector<uint8_t>{251, 251, 251, 253, 0, 0, 0, 0, 251, 251, 251, 253}),
-              filled(scene, white, 1.0F).dst.bytes);
+    expectCoverageGates(*coreWith(white, 1.0F, 1.0F), {251, 251, 251, 253});
 }
 
 TEST(Pattern, BoxLargerThanTheMask_IsCutToIt) {
@@ -280,16 +270,14 @@ TEST(Pattern, ScaleThatIsNotANumber_PaintsTheFirstPixel) {
 }
 
 TEST(Pattern, OpaqueDestination_IsUntouched) {
-    Scene scene = sceneOf(filledMask(8, 8, 255));
-    scene.dst = filledPicture(8, 8, 0xFF112233);
-    EXPECT_TRUE(samePaint(scene, filled(scene, numberedTile(3, 3, 60, 80), 1.0F)));
+    expectOpaqueDestinationUntouched(*coreWith(numberedTile(3, 3, 60, 80), 1.0F, 1.0F),
+                                     sceneOf(filledMask(8, 8, 255)));
 }
 
 // --- Hostile input ----------------------------------------------------------------------------------
 
 TEST(Pattern, BrokenInput_PaintsNothing) {
-    const auto core = coreWith(numberedTile(3, 3, 60, 80), 1.0F, 1.0F);
-    expectNothingFromBrokenInput(*core);
+    expectNothingFromBrokenInput(*coreWith(numberedTile(3, 3, 60, 80), 1.0F, 1.0F));
 }
 
 TEST(Pattern, BitmapsWithoutColourPixels_PaintNothing) {
@@ -305,15 +293,11 @@ TEST(Pattern, BitmapsWithoutColourPixels_PaintNothing) {
             bitmap->mData[i] = 255;
     }
     for (VFBitmap* bitmap : {&mask, &threeBytes, &none, &noWidth, &noHeight, &noPixels}) {
-        VFPatternProperty record(bitmap, 1.0F, 1.0F);
-        VFPattern core;
-        core.setProperty(&record);
-        EXPECT_TRUE(paintsNothing(core, scene));
+        const auto core = coreOf<VFPattern, VFPatternProperty>(bitmap, 1.0F, 1.0F);
+        EXPECT_TRUE(paintsNothing(*core, scene));
     }
-    VFPatternProperty record(nullptr, 1.0F, 1.0F);
-    VFPattern core;
-    core.setProperty(&record);
-    EXPECT_TRUE(paintsNothing(core, scene));
+    const auto core = coreOf<VFPattern, VFPatternProperty>(nullptr, 1.0F, 1.0F);
+    EXPECT_TRUE(paintsNothing(*core, scene));
 }
 
 TEST(Pattern, RecordWithoutABitmap_ReplacesOneWithABitmap) {
@@ -350,14 +334,12 @@ TEST(Pattern, RandomScenes_MatchTheLiteralForm) {
 }
 
 TEST(Pattern, EveryMaskOfTheGallery_MatchesTheLiteralForm) {
-    for (const NamedMask& named : maskGallery()) {
-        SCOPED_TRACE(named.name);
-        Random random(99);
+    forGallery([](Random& random, const literal::Mask& mask) {
         for (int i = 0; i < 12; ++i) {
-            const Scene scene = randomScene(random, named.mask);
+            const Scene scene = randomScene(random, mask);
             ASSERT_TRUE(matchesLiteral(scene, randomTile(random, 40), random.real(0.1F, 4.0F), 1.0F));
         }
-    }
+    });
 }
 
 TEST(Pattern, BoxesLargerThanTheMask_MatchTheLiteralForm) {
@@ -370,9 +352,7 @@ TEST(Pattern, BoxesLargerThanTheMask_MatchTheLiteralForm) {
 }
 
 TEST(Pattern, DestinationOfAnotherSize_IsClipped) {
-    forSeeds(3000, 300, [](Random& random) {
-        Scene scene = randomScene(random, 16);
-        scene.dst = randomPicture(random, random.between(1, 24), random.between(1, 24));
+    forOtherDestinations(300, 16, 24, [](Random& random, const Scene& scene) {
         EXPECT_TRUE(matchesLiteral(scene, randomTile(random, 6), random.real(0.1F, 3.0F), 1.0F));
     });
 }

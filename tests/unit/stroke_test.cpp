@@ -2,6 +2,7 @@
 
 #include <cmath>
 #include <limits>
+#include <memory>
 #include <utility>
 #include <vector>
 
@@ -12,28 +13,26 @@
 namespace {
 
 using namespace vorel_test;
+using VFontEffect::VFECore;
 using VFontEffect::VFStroke;
 using VFontEffect::VFStrokeProperty;
 using DilationWork = VFontEffect::VFStroke::DilationWork;
 
-constexpr uint32_t kWhite = 0xFFFFFFFF;
 constexpr int kCentre = 0;
 constexpr int kOutside = 1;
 constexpr int kInside = 2;
 
+std::unique_ptr<VFECore> coreWith(float size, uint32_t color, int position) {
+    return coreOf<VFStroke, VFStrokeProperty>(size, color, 1.0F, 0, position);
+}
+
 /// The scene after a stroke by the library.
 Scene stroked(const Scene& scene, float size, uint32_t color, int position) {
-    VFStroke core;
-    VFStrokeProperty record(size, color, 1.0F, 0, position);
-    core.setProperty(&record);
-    return painted(core, scene);
+    return painted(*coreWith(size, color, position), scene);
 }
 
 ::testing::AssertionResult matchesLiteral(const Scene& scene, float size, uint32_t color, int position) {
-    VFStroke core;
-    VFStrokeProperty record(size, color, 1.0F, 0, position);
-    core.setProperty(&record);
-    auto same = paintsLike(core, scene, [&](Scene& expected) {
+    auto same = paintsLike(*coreWith(size, color, position), scene, [&](Scene& expected) {
         literal::paintStroke(expected.dst, expected.sub ? &*expected.sub : nullptr, expected.mask,
                              expected.text, expected.useOuterLayer, size, color, position);
     });
@@ -42,14 +41,19 @@ Scene stroked(const Scene& scene, float size, uint32_t color, int position) {
 }
 
 int offsetOf(float size, int position) {
-    VFStroke core;
-    VFStrokeProperty record(size, kWhite, 1.0F, 0, position);
-    core.setProperty(&record);
-    EXPECT_EQ(core.getOffset(), core.getLeftOffset());
-    EXPECT_EQ(core.getOffset(), core.getRightOffset());
-    EXPECT_EQ(core.getOffset(), core.getTopOffset());
-    EXPECT_EQ(core.getOffset(), core.getBottomOffset());
-    return core.getOffset();
+    const auto core = coreWith(size, kWhite, position);
+    EXPECT_EQ(core->getOffset(), core->getLeftOffset());
+    EXPECT_EQ(core->getOffset(), core->getRightOffset());
+    EXPECT_EQ(core->getOffset(), core->getTopOffset());
+    EXPECT_EQ(core->getOffset(), core->getBottomOffset());
+    return core->getOffset();
+}
+
+/// One covered pixel in the middle of 5 x 5, alone in its box.
+Scene lonePixel(uint8_t coverage) {
+    Scene scene = sceneOf(filledMask(5, 5, 0), {2, 2, 3, 3});
+    scene.mask.bytes[12] = coverage;
+    return scene;
 }
 
 // --- The core as an object ------------------------------------------------------------------------
@@ -79,10 +83,8 @@ TEST(Stroke, Record_IsStoredFieldForField) {
 TEST(Stroke, StyleAndOpacity_DoNotChangeThePaint) {
     const Scene scene = sceneOf(discMask(30, 30, 15.0F, 14.0F, 8.0F, true));
     const Scene plain = stroked(scene, 3.0F, kWhite, kOutside);
-    VFStroke core;
-    VFStrokeProperty record(3.0F, kWhite, 0.25F, 9, kOutside);
-    core.setProperty(&record);
-    EXPECT_TRUE(samePaint(plain, painted(core, scene)));
+    const auto styled = coreOf<VFStroke, VFStrokeProperty>(3.0F, kWhite, 0.25F, 9, kOutside);
+    EXPECT_TRUE(samePaint(plain, painted(*styled, scene)));
 }
 
 TEST(Stroke, Offset_OfSizeSevenFollowsThePosition) {
@@ -114,8 +116,7 @@ TEST(Stroke, Offset_MatchesTheLiteralForm) {
 // --- Placements by hand: white over nothing shows the dilated plane ---------------------------------
 
 TEST(Stroke, Outside_StampsTheDiscAroundOnePixel) {
-    Scene scene = sceneOf(filledMask(5, 5, 0), {2, 2, 3, 3});
-    scene.mask.bytes[12] = 255;
+    const Scene scene = lonePixel(255);
     // The diagonal lies 1.414 away: 0.586 * 255 + 0.5 = 149.9.
     const std::vector<int> expected{0, 0,   0,   0,   0,  //
                                     0, 149, 255, 149, 0,  //
@@ -126,8 +127,7 @@ TEST(Stroke, Outside_StampsTheDiscAroundOnePixel) {
 }
 
 TEST(Stroke, Outside_LosesWhatTheKernelLacks) {
-    Scene scene = sceneOf(filledMask(5, 5, 0), {2, 2, 3, 3});
-    scene.mask.bytes[12] = 150;
+    const Scene scene = lonePixel(150);
     // Full cells hand on 150, the diagonal 150 - (255 - 149) = 44.
     const std::vector<int> expected{0, 0,   0,   0,   0,  //
                                     0, 44,  150, 44,  0,  //
@@ -250,15 +250,13 @@ TEST(Stroke, SecondDestination_GetsTheSamePaint) {
 
 TEST(Stroke, SecondDestinationWithoutPixels_LeavesTheFirstItsPaint) {
     const Scene scene = sceneOf(discMask(16, 16, 8.0F, 8.0F, 4.0F, true));
-    VFStroke core;
-    VFStrokeProperty record(3.0F, kWhite, 1.0F, 0, kOutside);
-    core.setProperty(&record);
+    const auto core = coreWith(3.0F, kWhite, kOutside);
     auto mask = bitmapOf(scene.mask);
     auto dst = bitmapOf(scene.dst);
     VFontEffect::VFBitmap noPixels;
     VFontEffect::VFRect text(0, 0, 16, 16);
     VFontEffect::VFECore::ParamPostProcessing params{&dst, &mask, &text, 0, &noPixels};
-    core.doPostProcessing(&params);
+    core->doPostProcessing(&params);
     const Scene expected = stroked(scene, 3.0F, kWhite, kOutside);
     EXPECT_EQ(expected.dst.bytes,
               std::vector<uint8_t>(dst.mData, dst.mData + expected.dst.bytes.size()));
@@ -267,26 +265,20 @@ TEST(Stroke, SecondDestinationWithoutPixels_LeavesTheFirstItsPaint) {
 
 TEST(Stroke, LayeredModeOtherThanOne_CountsAsOff) {
     const Scene scene = sceneOf(discMask(12, 12, 6.0F, 6.0F, 3.0F, true));
-    VFStroke core;
-    VFStrokeProperty record(2.0F, kWhite, 1.0F, 0, kCentre);
-    core.setProperty(&record);
+    const auto core = coreWith(2.0F, kWhite, kCentre);
     auto mask = bitmapOf(scene.mask);
     auto dst = bitmapOf(filledPicture(12, 12, 0xFF000000));
     VFontEffect::VFRect text(0, 0, 12, 12);
     VFontEffect::VFECore::ParamPostProcessing params{&dst, &mask, &text, 2, nullptr};
-    core.doPostProcessing(&params);
+    core->doPostProcessing(&params);
     EXPECT_EQ(255, dst.mData[(3 * 12 + 6) * 4]) << "source-over paints the opaque destination";
 }
 
 // --- Hostile input ----------------------------------------------------------------------------------
 
 TEST(Stroke, BrokenInput_PaintsNothing) {
-    for (int position : {kCentre, kOutside, kInside}) {
-        VFStroke core;
-        VFStrokeProperty record(2.0F, kWhite, 1.0F, 0, position);
-        core.setProperty(&record);
-        expectNothingFromBrokenInput(core);
-    }
+    for (int position : {kCentre, kOutside, kInside})
+        expectNothingFromBrokenInput(*coreWith(2.0F, kWhite, position));
 }
 
 TEST(Stroke, SizesOutOfProportion_PaintNothing) {
@@ -491,23 +483,19 @@ TEST(Stroke, LargeSizes_MatchTheLiteralForm) {
 }
 
 TEST(Stroke, EveryMaskOfTheGallery_MatchesTheLiteralForm) {
-    for (const NamedMask& named : maskGallery()) {
-        SCOPED_TRACE(named.name);
-        Random random(99);
+    forGallery([](Random& random, const literal::Mask& mask) {
         for (int position : {kCentre, kOutside, kInside}) {
-            const Scene scene = randomScene(random, named.mask);
+            const Scene scene = randomScene(random, mask);
             ASSERT_TRUE(matchesLiteral(scene, 0.0F, 0xFF102030, position));
             ASSERT_TRUE(matchesLiteral(scene, 2.6F, kWhite, position));
             ASSERT_TRUE(
                 matchesLiteral(scene, random.real(4.0F, 9.0F), randomPremultiplied(random), position));
         }
-    }
+    });
 }
 
 TEST(Stroke, DestinationOfAnotherSize_IsClipped) {
-    forSeeds(3000, 200, [](Random& random) {
-        Scene scene = randomScene(random, 14);
-        scene.dst = randomPicture(random, random.between(1, 20), random.between(1, 20));
+    forOtherDestinations(200, 14, 20, [](Random& random, const Scene& scene) {
         EXPECT_TRUE(matchesLiteral(scene, random.real(0.0F, 6.0F), randomPremultiplied(random),
                                    random.between(0, 2)));
     });
