@@ -1,5 +1,6 @@
 #!/usr/bin/env bash
-# Paints docs/gallery: every preset at 48 and 160 pixels, on a dark and on a light background.
+# Paints docs/gallery: every preset at 48 and 160 pixels, on a dark and on a light background; chalk,
+# which is made for boards, on a green one in place of the light one.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 
@@ -11,7 +12,9 @@ rm -f docs/gallery/*.png
 declare -A backgrounds=([dark]='#23272E' [light]='#F4F1EA')
 for preset in $("$paint" --list-presets | awk '{print $1}'); do
     for shade in dark light; do
-        common=(--preset "$preset" --background "${backgrounds[$shade]}")
+        background=${backgrounds[$shade]}
+        [[ $preset-$shade == chalk-light ]] && background='#2F4F3F'
+        common=(--preset "$preset" --background "$background")
         "$paint" "${common[@]}" --font 'DejaVu Sans:bold' --size 160 --padding 16 \
             -o "docs/gallery/$preset-160-$shade.png" "Type"
         "$paint" "${common[@]}" --font 'DejaVu Sans:bold' --size 48 --effect-scale 0.5 \

@@ -16,6 +16,8 @@ namespace {
 
 namespace fs = std::filesystem;
 
+constexpr int kMaxLinks = 40;
+
 struct Closer {
     void operator()(std::FILE* file) const {
         if (file != stdin) std::fclose(file);
@@ -25,6 +27,10 @@ using File = std::unique_ptr<std::FILE, Closer>;
 
 [[noreturn]] void failWithErrno(const std::string& what) {
     throw ToolError(what + ": " + std::strerror(errno));
+}
+
+std::string inQuotes(const fs::path& path) {
+    return "'" + path.string() + "'";
 }
 
 /// Writes through `write` and makes sure that every byte reached the system.
@@ -38,19 +44,31 @@ void fill(std::FILE* file, const std::string& name, const std::function<void(std
     if (std::fflush(file) != 0 || std::ferror(file) != 0) failWithErrno("cannot write " + name);
 }
 
+/// A replaced file's permissions stay; a new file has what the process's mask allows.
+mode_t modeFor(const fs::path& target) {
+    struct stat replaced {};
+    if (::stat(target.c_str(), &replaced) == 0) return replaced.st_mode & 07777;
+    const mode_t mask = ::umask(0);
+    ::umask(mask);
+    return 0666 & ~mask;
+}
+
 /// A file under a passing name in the directory of its target; gone again unless renamed.
 class TemporaryFile {
   public:
     explicit TemporaryFile(const fs::path& target)
-        : mTarget(target),
-          mName((target.parent_path() / ("." + target.filename().string() + ".XXXXXX")).string()) {
+        : mTarget(target), mName((target.parent_path() / ".vorelpaint.XXXXXX").string()) {
+        const mode_t mode = modeFor(target);
         const int descriptor = ::mkstemp(mName.data());
-        if (descriptor < 0) failWithErrno("cannot write " + target.string());
-        // mkstemp makes the file private; a new file has what the process's mask allows.
-        const mode_t mask = ::umask(0);
-        ::umask(mask);
-        ::fchmod(descriptor, 0666 & ~mask);
+        if (descriptor < 0) failWithErrno("cannot write " + inQuotes(target));
+        ::fchmod(descriptor, mode);  // mkstemp makes the file private
         mFile.reset(::fdopen(descriptor, "wb"));
+        if (mFile) return;
+        const int fault = errno;
+        ::close(descriptor);
+        ::unlink(mName.c_str());
+        errno = fault;
+        failWithErrno("cannot write " + inQuotes(target));
     }
 
     ~TemporaryFile() {
@@ -65,7 +83,7 @@ class TemporaryFile {
     void renameToTarget() {
         mFile.reset();
         if (std::rename(mName.c_str(), mTarget.c_str()) != 0) {
-            failWithErrno("cannot write " + mTarget.string());
+            failWithErrno("cannot write " + inQuotes(mTarget));
         }
         mRenamed = true;
     }
@@ -77,18 +95,23 @@ class TemporaryFile {
     bool mRenamed = false;
 };
 
-/// Where a path leads: the target of a symbolic link is replaced, not the link.
-fs::path followLinks(const std::string& path) {
+/// Where a path leads: the target of a symbolic link is made or replaced, not the link.
+fs::path followLinks(fs::path path) {
     std::error_code error;
-    fs::path target = fs::canonical(path, error);
-    return error ? fs::path(path) : target;
+    for (int links = 0; fs::is_symlink(fs::symlink_status(path, error)); ++links) {
+        if (links == kMaxLinks) throw ToolError("cannot write " + inQuotes(path) + ": too many links");
+        const fs::path target = fs::read_symlink(path, error);
+        if (error) throw ToolError("cannot write " + inQuotes(path) + ": " + error.message());
+        path = path.parent_path() / target;
+    }
+    return path;
 }
 
 }  // namespace
 
 std::string readFile(const std::string& path, size_t maxBytes) {
     const bool standard = path == "-";
-    const std::string name = standard ? "standard input" : "'" + path + "'";
+    const std::string name = standard ? "standard input" : inQuotes(path);
     const File file(standard ? stdin : std::fopen(path.c_str(), "rb"));
     if (!file) failWithErrno("cannot read " + name);
     std::string bytes(maxBytes + 1, '\0');
@@ -102,15 +125,14 @@ std::string readFile(const std::string& path, size_t maxBytes) {
 
 void writeFile(const std::string& path, const std::function<void(std::FILE*)>& write) {
     if (path == "-") return fill(stdout, "standard output", write);
-    const fs::path target = followLinks(path);
     std::error_code ignored;
-    if (fs::exists(target, ignored) && !fs::is_regular_file(target, ignored)) {
-        const File device(std::fopen(target.c_str(), "wb"));
-        if (!device) failWithErrno("cannot write " + path);
-        return fill(device.get(), path, write);
+    if (fs::exists(path, ignored) && !fs::is_regular_file(path, ignored)) {
+        const File device(std::fopen(path.c_str(), "wb"));
+        if (!device) failWithErrno("cannot write " + inQuotes(path));
+        return fill(device.get(), inQuotes(path), write);
     }
-    TemporaryFile temporary(target);
-    fill(temporary.get(), path, write);
+    TemporaryFile temporary(followLinks(path));
+    fill(temporary.get(), inQuotes(path), write);
     temporary.renameToTarget();
 }
 

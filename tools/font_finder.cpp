@@ -1,6 +1,8 @@
 #include "font_finder.h"
 
+#include <fcntl.h>
 #include <fontconfig/fontconfig.h>
+#include <unistd.h>
 
 #include <array>
 #include <filesystem>
@@ -21,6 +23,32 @@ struct Destroy {
 };
 using Config = std::unique_ptr<FcConfig, Destroy<FcConfigDestroy>>;
 using FontPattern = std::unique_ptr<FcPattern, Destroy<FcPatternDestroy>>;
+
+/// While it lives, what is written to standard error is lost.
+class SilentErrors {
+  public:
+    SilentErrors() : mSaved(::dup(STDERR_FILENO)) {
+        const int nowhere = ::open("/dev/null", O_WRONLY);
+        if (mSaved >= 0 && nowhere >= 0) ::dup2(nowhere, STDERR_FILENO);
+        if (nowhere >= 0) ::close(nowhere);
+    }
+    ~SilentErrors() {
+        if (mSaved < 0) return;
+        ::dup2(mSaved, STDERR_FILENO);
+        ::close(mSaved);
+    }
+    SilentErrors(const SilentErrors&) = delete;
+    SilentErrors& operator=(const SilentErrors&) = delete;
+
+  private:
+    int mSaved;
+};
+
+/// Without fontconfig's own complaints: what fails for want of fonts says so in the program's one line.
+Config loadConfig() {
+    const SilentErrors silence;
+    return Config(FcInitLoadConfigAndFonts());
+}
 
 /// Names that stand for whatever family the system prefers.
 constexpr std::array<std::string_view, 4> kGenericFamilies{"sans-serif", "sans", "serif", "monospace"};
@@ -44,7 +72,7 @@ bool hasFamily(const FcPattern* font, const FcChar8* family) {
 
 FontFile findFamily(const std::string& request) {
     const ToolError noSuchFont("no font file or family '" + request + "'");
-    const Config config(FcInitLoadConfigAndFonts());
+    const Config config = loadConfig();
     const FontPattern wanted(FcNameParse(reinterpret_cast<const FcChar8*>(request.c_str())));
     if (!config || !wanted) throw noSuchFont;
     FcChar8* found = nullptr;

@@ -6,32 +6,31 @@
 #include <sstream>
 
 #include "colour.h"
+#include "joined.h"
 #include "style.h"
 
 namespace vorelpaint {
 namespace {
 
 constexpr size_t kMaxQuoted = 40;
+constexpr size_t kMaxPath = 120;
 
-/// The value as JSON, in ASCII and short enough for a message.
-std::string quoted(const Json& value) {
-    std::string text = value.dump(-1, ' ', true);
-    if (text.size() > kMaxQuoted) text.replace(kMaxQuoted, std::string::npos, "...");
+/// Cut so that it fits into a message.
+std::string shortened(std::string text, size_t maxSize) {
+    if (text.size() > maxSize) text.replace(maxSize, std::string::npos, "...");
     return text;
 }
 
-/// A key from a file as it may stand in a message: like a quoted value, without the quotes.
+/// A key from a file as it may stand in a message: like a quoted value, without the quotes unless
+/// nothing stands between them.
 std::string escaped(const std::string& key) {
+    if (key.empty()) return "\"\"";
     const std::string text = Json(key).dump(-1, ' ', true);
     return text.substr(1, std::min(text.size() - 2, kMaxQuoted));
 }
 
-template <typename Names>
-std::string joined(const Names& names) {
-    std::string text;
-    for (const std::string_view name : names)
-        text.append(text.empty() ? "" : ", ").append(name);
-    return text;
+std::string under(const std::string& path, std::string_view key) {
+    return path + (path.empty() ? "" : ".") + std::string(key);
 }
 
 std::string withArticle(const Json& value) {
@@ -40,14 +39,19 @@ std::string withArticle(const Json& value) {
     return (type == "object" || type == "array" ? "an " : "a ") + type;
 }
 
-std::string wrongType(const char* expected, const Json& value) {
-    return std::string("must be ") + expected + ", not " + withArticle(value);
+std::string wrongType(const std::string& expected, const Json& value) {
+    return "must be " + expected + ", not " + withArticle(value);
+}
+
+/// "a number from 0 to 100" of the noun "a number from".
+std::string between(const char* noun, Range range) {
+    std::ostringstream text;
+    text << noun << ' ' << range.low << " to " << range.high;
+    return text.str();
 }
 
 std::string outOfRange(const Json& value, Range range) {
-    std::ostringstream text;
-    text << quoted(value) << " is out of range, " << range.low << " to " << range.high;
-    return text.str();
+    return quoted(value) + between(" is out of range,", range);
 }
 
 bool contains(Range range, double value) {
@@ -59,18 +63,58 @@ class DuplicateKeys {
   public:
     bool operator()(int depth, Json::parse_event_t event, const Json& parsed) {
         const auto level = static_cast<size_t>(depth);
-        if (event == Json::parse_event_t::object_start) {
-            mKeys.resize(std::max(mKeys.size(), level + 2));
-            mKeys[level + 1].clear();
-        } else if (event == Json::parse_event_t::key) {
-            const auto key = parsed.get<std::string>();
-            if (!mKeys[level].insert(key).second) throw StyleError(quoted(parsed) + ": key given twice");
+        switch (event) {
+            case Json::parse_event_t::object_start:
+            case Json::parse_event_t::array_start:
+                countElement(level);
+                mLevels.resize(std::max(mLevels.size(), level + 2));
+                mLevels[level + 1] = {};
+                break;
+            case Json::parse_event_t::value:
+                countElement(level);
+                break;
+            case Json::parse_event_t::key:
+                addKey(level, parsed.get<std::string>());
+                break;
+            default:
+                break;
         }
         return true;
     }
 
   private:
-    std::vector<std::set<std::string>> mKeys;  ///< by depth, of the object being read there
+    /// An object or array that is being read.
+    struct Level {
+        std::set<std::string> keys;
+        std::string key;      ///< the last one; arrays have none
+        size_t elements = 0;  ///< values begun so far
+    };
+
+    void countElement(size_t level) { ++mLevels[level].elements; }
+
+    void addKey(size_t level, const std::string& key) {
+        if (!mLevels[level].keys.insert(key).second) {
+            throw StyleError(shortened(under(pathTo(level), escaped(key)), kMaxPath) +
+                             ": key given twice");
+        }
+        mLevels[level].key = key;
+    }
+
+    /// The path of the object at this depth; the root, at depth 1, has none.
+    std::string pathTo(size_t level) const {
+        std::string path;
+        for (size_t i = 1; i < level && path.size() <= kMaxPath; ++i) {
+            const Level& around = mLevels[i];
+            if (around.keys.empty()) {
+                path.append("[").append(std::to_string(around.elements - 1)).append("]");
+            } else {
+                path = under(path, escaped(around.key));
+            }
+        }
+        return path;
+    }
+
+    std::vector<Level> mLevels = std::vector<Level>(1);  ///< by depth; the first holds the root
 };
 
 /// "[json.exception.parse_error.101] parse error at line 3, column 5: fault" without its preface.
@@ -82,6 +126,10 @@ std::string syntaxFault(const std::string& message) {
 }
 
 }  // namespace
+
+std::string quoted(const Json& value) {
+    return shortened(value.dump(-1, ' ', true), kMaxQuoted);
+}
 
 Json parseJson(std::string_view text) {
     try {
@@ -103,68 +151,66 @@ JsonObject::JsonObject(const Json& value, std::string path, const std::vector<st
 }
 
 std::string JsonObject::pathOf(std::string_view key) const {
-    return mPath + (mPath.empty() ? "" : ".") + std::string(key);
+    return under(mPath, key);
 }
 
 void JsonObject::fail(std::string_view key, const std::string& fault) const {
     throw StyleError(pathOf(key) + ": " + fault);
 }
 
-const Json* JsonObject::find(std::string_view key, bool optional) const {
+const Json* JsonObject::find(std::string_view key, bool optional, TypeTest hasType,
+                             const std::string& expected) const {
     const auto found = mObject.find(key);
-    if (found != mObject.end()) return &*found;
-    if (!optional) fail(key, "missing");
-    return nullptr;
+    if (found == mObject.end()) {
+        if (!optional) fail(key, "missing; " + expected);
+        return nullptr;
+    }
+    const Json& value = *found;
+    if (!(value.*hasType)()) fail(key, wrongType(expected, value));
+    return &value;
 }
 
 float JsonObject::number(std::string_view key, Range range, std::optional<float> fallback) const {
-    const Json* value = find(key, fallback.has_value());
+    const Json* value =
+        find(key, fallback.has_value(), &Json::is_number, between("a number from", range));
     if (value == nullptr) return *fallback;
-    if (!value->is_number()) fail(key, wrongType("a number", *value));
     if (!contains(range, value->get<double>())) fail(key, outOfRange(*value, range));
     return value->get<float>();
 }
 
 int JsonObject::integer(std::string_view key, Range range, std::optional<int> fallback) const {
-    const Json* value = find(key, fallback.has_value());
+    const std::string expected = between("a whole number from", range);
+    const Json* value = find(key, fallback.has_value(), &Json::is_number, expected);
     if (value == nullptr) return *fallback;
-    if (!value->is_number()) fail(key, wrongType("a whole number", *value));
     if (!contains(range, value->get<double>())) fail(key, outOfRange(*value, range));
-    if (!value->is_number_integer()) fail(key, quoted(*value) + " is no whole number");
+    if (!value->is_number_integer()) fail(key, "must be " + expected + ", not " + quoted(*value));
     return value->get<int>();
 }
 
 uint32_t JsonObject::color(std::string_view key, std::optional<uint32_t> fallback) const {
-    const Json* value = find(key, fallback.has_value());
+    const Json* value = find(key, fallback.has_value(), &Json::is_string, "a colour \"#RRGGBB\"");
     if (value == nullptr) return *fallback;
-    if (!value->is_string()) fail(key, wrongType("a colour \"#RRGGBB\"", *value));
     const std::optional<uint32_t> colour = parseColour(value->get_ref<const std::string&>());
     if (!colour) fail(key, quoted(*value) + " is no colour; write \"#RRGGBB\"");
     return *colour;
 }
 
 std::string JsonObject::string(std::string_view key) const {
-    const Json* value = find(key, false);
-    if (!value->is_string()) fail(key, wrongType("a string", *value));
-    return value->get<std::string>();
+    return find(key, false, &Json::is_string, "a string")->get<std::string>();
 }
 
 int JsonObject::choice(std::string_view key, std::initializer_list<std::string_view> names) const {
-    const Json* value = find(key, false);
-    if (!value->is_string()) fail(key, wrongType("a string", *value));
+    const Json* value = find(key, false, &Json::is_string, "one of " + joined(names));
     const auto* found = std::find(names.begin(), names.end(), value->get_ref<const std::string&>());
     if (found == names.end()) fail(key, quoted(*value) + " is none of " + joined(names));
     return static_cast<int>(found - names.begin());
 }
 
 const Json& JsonObject::array(std::string_view key, Range sizes) const {
-    const Json* value = find(key, false);
-    if (!value->is_array()) fail(key, wrongType("an array", *value));
+    const Json* value = find(key, false, &Json::is_array, between("an array of", sizes) + " elements");
     if (!contains(sizes, static_cast<double>(value->size()))) {
-        std::ostringstream fault;
-        fault << "has " << value->size() << " elements, " << sizes.low << " to " << sizes.high
-              << " are allowed";
-        fail(key, fault.str());
+        fail(key, "has " + std::to_string(value->size()) + " elements" + between(",", sizes) +
+                      " are allowed");
     }
     return *value;
 }

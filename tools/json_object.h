@@ -17,11 +17,16 @@ struct Range {
     double high;
 };
 
-/// Parses `text`, refusing a key that stands twice in one object. Throws StyleError with the line.
+/// Parses `text`. Throws StyleError with the line of a syntax error, or with the path of a key that
+/// stands twice in one object.
 Json parseJson(std::string_view text);
 
+/// The value as JSON, in ASCII and short enough for a message.
+std::string quoted(const Json& value);
+
 /// One object of a style file, read key by key. Every fault throws a StyleError that begins with
-/// the path of the key. A reader without a fallback refuses a missing key.
+/// the path of the key and says what may stand there. A reader without a fallback refuses a missing
+/// key.
 class JsonObject {
   public:
     /// Refuses a value that is not an object, and keys other than `known`.
@@ -43,7 +48,12 @@ class JsonObject {
     [[noreturn]] void fail(std::string_view key, const std::string& fault) const;
 
   private:
-    const Json* find(std::string_view key, bool optional) const;
+    /// A test of a value's type, such as &Json::is_number.
+    using TypeTest = bool (Json::*)() const noexcept;
+
+    /// The key's value, of the tested type; null when it is missing and may be.
+    const Json* find(std::string_view key, bool optional, TypeTest hasType,
+                     const std::string& expected) const;
 
     const Json& mObject;
     std::string mPath;

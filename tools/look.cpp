@@ -9,6 +9,7 @@
 #include <variant>
 
 #include "png_io.h"
+#include "style_file.h"
 
 namespace vorelpaint {
 namespace {
@@ -38,11 +39,11 @@ VFBitmap patternBitmap(Image image) {
             image.pixels.data(), 4};
 }
 
-Image readPattern(const std::filesystem::path& path) {
+Image readPattern(const Style& style, const Pattern& pattern) {
     try {
-        return readPng(path);
+        return readPng(style.baseDir / pattern.image);
     } catch (const ToolError& error) {
-        throw StyleError(std::string("pattern.image: ") + error.what());
+        throw StyleError(faultPrefix(style.file) + "pattern.image: " + error.what());
     }
 }
 
@@ -80,7 +81,7 @@ class AddCall {
         return mEffects.addStrokeText(e.size, e.color, e.opacity, e.strokeStyle, e.position);
     }
     unsigned int operator()(const Pattern& e) const {
-        VFBitmap bitmap = patternBitmap(readPattern(mStyle.baseDir / e.image));
+        VFBitmap bitmap = patternBitmap(readPattern(mStyle, e));
         return mEffects.addPatternText(&bitmap, e.scale, e.opacity);
     }
     unsigned int operator()(const TextFill& e) const {
@@ -142,15 +143,17 @@ Image Look::paint(const TextLayout& text, int padding) {
     checkSize(width, height);
 
     mEffects.initEffect(width, height);
+    const VFBitmap* mask = mEffects.getSrcBitmap();
+    if (mask == nullptr || mask->mData == nullptr) throw std::bad_alloc();
     VFBitmap picture(static_cast<unsigned int>(width), static_cast<unsigned int>(height), 4);
     if (picture.mData == nullptr) throw std::bad_alloc();
     mEffects.setDstBitmap(&picture);
     for (size_t i = 0; i < text.glyphCount(); ++i) {
-        GlyphMask mask = text.rasterise(i);
-        VFGlyph glyph{mask.coverage.data(), static_cast<unsigned short>(mask.box.width()),
-                      static_cast<unsigned short>(mask.box.height())};
-        mEffects.renderEffectLayer(mask.box.left - ink.left + space.left + padding,
-                                   mask.box.top - ink.top + space.top + padding, &glyph);
+        GlyphMask shape = text.rasterise(i);
+        VFGlyph glyph{shape.coverage.data(), static_cast<unsigned short>(shape.box.width()),
+                      static_cast<unsigned short>(shape.box.height())};
+        mEffects.renderEffectLayer(shape.box.left - ink.left + space.left + padding,
+                                   shape.box.top - ink.top + space.top + padding, &glyph);
     }
     mEffects.doEffectPostProcessing();
     mEffects.compositeLayers(&picture);

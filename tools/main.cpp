@@ -54,8 +54,8 @@ void printMargins(const Margins& margins) {
 }
 
 Style chosenStyle(const Options& options) {
-    if (!options.preset.empty()) return loadStyle(findPreset(options.preset));
-    if (!options.style.empty()) return loadStyle(options.style);
+    if (options.preset) return loadStyle(findPreset(*options.preset));
+    if (options.style) return loadStyle(*options.style);
     return {};
 }
 
@@ -70,7 +70,7 @@ uint32_t chosenFill(const Options& options, const Style& style) {
 
 std::string chosenText(const Options& options) {
     if (options.text) return *options.text;
-    std::string text = readFile(options.textFile, kMaxTextBytes);
+    std::string text = readFile(options.textFile.value(), kMaxTextBytes);
     if (!text.empty() && text.back() == '\n') text.pop_back();
     return text;
 }
@@ -84,7 +84,7 @@ void paint(const Options& options, Look& look) {
     }
     Image picture = look.paint(text, options.padding);
     layOn(picture, options.background);
-    writeFile(options.output, [&](std::FILE* file) { writePng(file, picture); });
+    writeFile(options.output.value(), [&](std::FILE* file) { writePng(file, picture); });
 }
 
 void run(const Options& options) {
@@ -97,7 +97,7 @@ void run(const Options& options) {
     }
     if (options.printKey) printKey(look.key());
     if (options.printMargins) printMargins(look.margins());
-    if (!options.output.empty()) paint(options, look);
+    if (options.output) paint(options, look);
 }
 
 int runProgram(int argc, const char* const* argv) {

@@ -12,17 +12,17 @@ namespace vorelpaint {
 /// What the command line asks for.
 struct Options {
     std::optional<std::string> text;
-    std::string textFile;
+    std::optional<std::string> textFile;
     std::string font = "DejaVu Sans";
     int size = 96;
     Align align = Align::left;
     std::optional<uint32_t> color;
     std::optional<float> opacity;
     float effectScale = 1;
-    std::string style;
-    std::string preset;
+    std::optional<std::string> style;
+    std::optional<std::string> preset;
     Background background;
-    std::string output;
+    std::optional<std::string> output;
     int padding = 8;
     bool listPresets = false;
     bool printKey = false;

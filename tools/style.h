@@ -100,6 +100,7 @@ struct Style {
     std::optional<float> textOpacity;  ///< the text's opacity, unless the caller chooses one
     std::vector<Effect> effects;       ///< in the order of the file: the last lies on top
     std::filesystem::path baseDir;
+    std::filesystem::path file;  ///< what it was read from; empty for a style made in memory
 };
 
 /// What is wrong in a style file: where in it (a path such as "outerShadow.size", or the line of a

@@ -4,6 +4,7 @@
 #include <array>
 
 #include "file_io.h"
+#include "joined.h"
 
 namespace vorelpaint {
 namespace {
@@ -26,22 +27,21 @@ fs::path presetDir() {
                     "'");
 }
 
-std::string joined(const std::vector<std::string>& names) {
-    std::string text;
-    for (const std::string& name : names)
-        text += (text.empty() ? "" : ", ") + name;
-    return text;
-}
-
 }  // namespace
 
 Style loadStyle(const fs::path& path) {
     const std::string text = readFile(path.string(), kMaxStyleBytes);
     try {
-        return parseStyle(text, path.parent_path());
+        Style style = parseStyle(text, path.parent_path());
+        style.file = path;
+        return style;
     } catch (const StyleError& error) {
-        throw ToolError("style '" + path.string() + "': " + error.what());
+        throw ToolError(faultPrefix(path) + error.what());
     }
+}
+
+std::string faultPrefix(const fs::path& file) {
+    return file.empty() ? "" : "style '" + file.string() + "': ";
 }
 
 std::vector<std::string> presetNames() {

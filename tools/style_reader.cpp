@@ -22,13 +22,16 @@ constexpr Range kSoften{0, 16};
 Stops readStops(const JsonObject& effect) {
     constexpr std::string_view kKey = "gradient";
     Stops stops;
+    std::string spelledBefore;
     for (const Json& element : effect.array(kKey, kStopCount)) {
         const std::string path = effect.pathOf(kKey) + "[" + std::to_string(stops.size()) + "]";
         const JsonObject stop(element, path, {"color", "opacity", "location"});
         const float location = stop.number("location", kUnit);
         if (!stops.empty() && location < stops.back().mLocation) {
-            stop.fail("location", "lies before the stop that precedes it");
+            stop.fail("location", quoted(element["location"]) + " lies before " + spelledBefore +
+                                      ", the location of the stop that precedes it");
         }
+        spelledBefore = quoted(element["location"]);
         stops.push_back({stop.color("color"), stop.number("opacity", kUnit, 1.0F), location});
     }
     return stops;
@@ -93,6 +96,7 @@ Effect readPattern(const Json& value, const char* name) {
     const JsonObject effect(value, name, {"image", "scale", "opacity"});
     const std::string image = effect.string("image");
     if (image.empty()) effect.fail("image", "must name a PNG file");
+    if (image.find('\0') != std::string::npos) effect.fail("image", "has a NUL character in its name");
     return Pattern{image, effect.number("scale", kPatternScale, 1.0F),
                    effect.number("opacity", kUnit, 1.0F)};
 }

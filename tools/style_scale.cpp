@@ -34,6 +34,7 @@ class Scale {
 }  // namespace
 
 Style scaledStyle(Style style, float factor) {
+    if (factor == 1.0F) return style;
     for (Effect& effect : style.effects)
         std::visit(Scale(factor), effect);
     return style;

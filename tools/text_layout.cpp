@@ -5,6 +5,7 @@
 #include <raqm.h>
 
 #include <algorithm>
+#include <cstdlib>
 #include <memory>
 #include <string>
 
@@ -27,8 +28,9 @@ int ceilToPixel(int64_t units) {
     return floorToPixel(units + kUnit - 1);
 }
 
+/// A font may step backwards as well as forwards.
 void checkSide(int64_t units) {
-    if (units <= TextLayout::kMaxSide * kUnit) return;
+    if (std::abs(units) <= TextLayout::kMaxSide * kUnit) return;
     throw ToolError("the text would be more than " + std::to_string(TextLayout::kMaxSide) +
                     " pixels wide or high");
 }
@@ -106,6 +108,8 @@ void TextLayout::placeLine(Line& line, int64_t shift, int64_t baseline) {
     for (Glyph& glyph : line.glyphs) {
         glyph.x += shift;
         glyph.y += baseline;
+        checkSide(glyph.x);
+        checkSide(glyph.y);
         if (glyph.index == 0) ++mMissingGlyphs;
         loadOutline(glyph);
         FT_BBox outline;

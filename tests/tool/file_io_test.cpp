@@ -48,6 +48,57 @@ TEST(FileIo, WriteFile_ThroughALinkReplacesItsTarget) {
     EXPECT_TRUE(std::filesystem::is_symlink(dir.file("link")));
 }
 
+TEST(FileIo, WriteFile_ThroughADanglingLinkMakesItsTarget) {
+    const TempDir dir;
+    std::filesystem::create_directory(dir.file("below"));
+    std::filesystem::create_symlink("below/second", dir.file("first"));
+    std::filesystem::create_symlink("target", dir.file("below/second"));
+    writeFile(dir.file("first"), writeNew);
+    EXPECT_EQ(readBytes(dir.file("below/target")), "new");
+    EXPECT_TRUE(std::filesystem::is_symlink(dir.file("first")));
+    EXPECT_TRUE(std::filesystem::is_symlink(dir.file("below/second")));
+}
+
+TEST(FileIo, WriteFile_ThroughALinkIntoNoDirectoryIsRefused) {
+    const TempDir dir;
+    std::filesystem::create_symlink("none/target", dir.file("link"));
+    EXPECT_THROW(writeFile(dir.file("link"), writeNew), ToolError);
+    EXPECT_TRUE(std::filesystem::is_symlink(dir.file("link")));
+    EXPECT_EQ(dir.list(), std::vector<std::string>{"link"});
+}
+
+TEST(FileIo, WriteFile_ThroughLinksInACircleIsRefused) {
+    const TempDir dir;
+    std::filesystem::create_symlink("b", dir.file("a"));
+    std::filesystem::create_symlink("a", dir.file("b"));
+    EXPECT_THROW(writeFile(dir.file("a"), writeNew), ToolError);
+    EXPECT_EQ(dir.list(), (std::vector<std::string>{"a", "b"}));
+}
+
+TEST(FileIo, WriteFile_KeepsThePermissionsOfTheOldFile) {
+    using std::filesystem::perms;
+    const TempDir dir;
+    const std::string path = dir.write("private", "old");
+    std::filesystem::permissions(path, perms::owner_read | perms::owner_write);
+    writeFile(path, writeNew);
+    EXPECT_EQ(std::filesystem::status(path).permissions(), perms::owner_read | perms::owner_write);
+}
+
+TEST(FileIo, WriteFile_NewFileHasThePermissionsOfAnyOther) {
+    const TempDir dir;
+    writeFile(dir.file("written"), writeNew);
+    const std::string other = dir.write("other", "");
+    EXPECT_EQ(std::filesystem::status(dir.file("written")).permissions(),
+              std::filesystem::status(other).permissions());
+}
+
+TEST(FileIo, WriteFile_NameMayBeAsLongAsTheSystemAllows) {
+    const TempDir dir;
+    const std::string name(250, 'n');
+    writeFile(dir.file(name), writeNew);
+    EXPECT_EQ(dir.list(), std::vector<std::string>{name});
+}
+
 TEST(FileIo, WriteFile_DeviceWithoutSpaceIsReported) {
     EXPECT_THROW(writeFile("/dev/full", writeNew), ToolError);
 }

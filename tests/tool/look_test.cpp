@@ -60,6 +60,17 @@ TEST(Look, EffectsWithoutACore_AreNamed) {
     EXPECT_EQ(look.unpainted(), (std::vector<std::string>{"bevel", "emboss"}));
 }
 
+TEST(Look, PatternFaults_NameTheStyleFile) {
+    Style style = styleOf(R"({"pattern": {"image": "none.png"}})");
+    style.file = "looks/a.json";
+    try {
+        const Look look(style, 0, 1);
+        FAIL() << "painted without its pattern";
+    } catch (const StyleError& error) {
+        EXPECT_EQ(std::string(error.what()).rfind("style 'looks/a.json': pattern.image: ", 0), 0U);
+    }
+}
+
 TEST(Look, PatternThatCannotBeRead_IsAStyleError) {
     EXPECT_THROW(Look(styleOf(R"({"pattern": {"image": "none.png"}})"), 0, 1), StyleError);
     EXPECT_THROW(Look(styleOf(R"({"pattern": {"image": "."}})"), 0, 1), StyleError);

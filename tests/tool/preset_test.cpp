@@ -17,7 +17,8 @@ TEST(Presets, TogetherShowEveryEffectAndStrokePosition) {
     std::set<std::string> effects;
     std::set<int> positions;
     for (const std::string& name : presetNames()) {
-        for (const Effect& effect : loadStyle(findPreset(name)).effects) {
+        const Style style = loadStyle(findPreset(name));
+        for (const Effect& effect : style.effects) {
             effects.emplace(effectName(effect));
             if (const auto* stroke = std::get_if<Stroke>(&effect)) positions.insert(stroke->position);
         }

@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <cstdlib>
 #include <filesystem>
 #include <string>
 #include <vector>
@@ -26,7 +27,7 @@ class Program : public ::testing::Test {
     /// Paints with these arguments into a file and reads it back.
     Image paint(Words arguments) {
         const std::string path = mDir.file("picture.png");
-        arguments.insert(arguments.end(), {"-o", path});
+        arguments.insert(arguments.begin(), {"-o", path});
         const Outcome outcome = runVorelpaint(arguments);
         EXPECT_EQ(outcome.exitCode, 0);
         EXPECT_EQ(outcome.err, "");
@@ -186,8 +187,9 @@ TEST_F(Program, EffectsWithoutACore_AreAWarningEach) {
 TEST_F(Program, PatternImage_IsFoundBesideTheStyle) {
     std::filesystem::copy_file(std::string(VORELPAINT_PRESETS) + "/tiles.png", mDir.file("tiles.png"));
     paint({"--style", writeStyle(R"({"pattern": {"image": "tiles.png"}})"), "Ag"});
-    expectFailure({"--style", writeStyle(R"({"pattern": {"image": "other.png"}})"), "Ag"},
-                  "pattern.image: '" + mDir.file("other.png") + "' does not exist");
+    const std::string style = writeStyle(R"({"pattern": {"image": "other.png"}})");
+    expectFailure({"--style", style, "Ag"}, "style '" + style + "': pattern.image: '" +
+                                                mDir.file("other.png") + "' does not exist");
 }
 
 TEST_F(Program, Help_ShowsExamples) {
@@ -219,6 +221,13 @@ TEST_F(Program, BadArguments_FailInOneLine) {
     expectFailure({"--style"}, "--style");
 }
 
+TEST_F(Program, EmptyNames_AreNoNames) {
+    expectFailure({"--style", "", "A"}, "cannot read ''");
+    expectFailure({"--preset", "", "A"}, "no preset ''");
+    expectFailure({"--text-file", ""}, "cannot read ''");
+    expectFailure({"-o", "", "A"}, "cannot write ''");
+}
+
 TEST_F(Program, ContradictoryArguments_FailInOneLine) {
     expectFailure({"--text-file", "-", "A"}, "--text-file");
     expectFailure({"--style", "a", "--preset", "gold", "A"}, "--preset");
@@ -244,6 +253,17 @@ TEST_F(Program, Fonts_ThatCannotBeUsedAreNamed) {
     const std::string noFont = mDir.write("font.ttf", "not a font");
     expectFailure({"--font", noFont, "A"}, "'" + noFont + "' is no font");
     expectFailure({"--font", "", "A"}, "no font file or family ''");
+}
+
+TEST_F(Program, FontsWithoutAConfiguration_AreNoReasonForASecondLine) {
+    ::setenv("FONTCONFIG_FILE", "/nonexistent", 1);
+    expectFailure({"--font", "No Such Family", "A"}, "no font file or family 'No Such Family'");
+    ::unsetenv("FONTCONFIG_FILE");
+}
+
+TEST_F(Program, TextThatBeginsWithADash_StandsBehindTwo) {
+    EXPECT_EQ(paint({"--", "-40"}).pixels, paint({"\xE2\x80\x8E-40"}).pixels)
+        << "a mark without ink makes it no option";
 }
 
 TEST_F(Program, Styles_ThatCannotBeReadAreNamed) {

@@ -91,7 +91,8 @@ TEST(StyleReader, GlowWithStops_NeedsNoColour) {
 }
 
 TEST(StyleReader, GlowWithNeither_IsRefused) {
-    EXPECT_EQ(faultOf(R"({"outerGlow": {"size": 9}})"), "outerGlow.color: missing");
+    EXPECT_EQ(faultOf(R"({"outerGlow": {"size": 9}})"),
+              "outerGlow.color: missing; a colour \"#RRGGBB\"");
 }
 
 TEST(StyleReader, Gradients_ReadAngleAndScale) {
@@ -122,6 +123,12 @@ TEST(StyleReader, Pattern_KeepsItsPathUnopened) {
     EXPECT_EQ(pattern.scale, 10.0F);
 }
 
+TEST(StyleReader, PatternWithoutAUsableName_IsRefused) {
+    EXPECT_EQ(faultOf(R"({"pattern": {"image": ""}})"), "pattern.image: must name a PNG file");
+    EXPECT_EQ(faultOf(R"({"pattern": {"image": "a\u0000b.png"}})"),
+              "pattern.image: has a NUL character in its name");
+}
+
 TEST(StyleReader, Relief_ReadsEveryArgument) {
     const auto emboss = only<Emboss>(
         R"({"emboss": {"style": 1, "size": 2, "depth": 3, "technique": 4, "direction": 5, "soften": 6,
@@ -150,6 +157,11 @@ TEST(StyleReader, UnknownKeyBeyondAscii_IsEscaped) {
     EXPECT_EQ(faultOf("{\"\xC3\xA9\\n\": 1}").rfind("\\u00e9\\n: unknown key", 0), 0U);
 }
 
+TEST(StyleReader, EmptyKey_IsShownInItsQuotes) {
+    EXPECT_EQ(faultOf(R"({"": 1})").rfind("\"\": unknown key; ", 0), 0U);
+    EXPECT_EQ(faultOf(R"({"text": {"": 1}})").rfind("text.\"\": unknown key; ", 0), 0U);
+}
+
 TEST(StyleReader, UnknownArgument_IsNamedBeforeAMissingOne) {
     EXPECT_EQ(faultOf(R"({"text": {"colour": "#000000"}})"),
               "text.colour: unknown key; known are color, opacity");
@@ -165,23 +177,30 @@ TEST(StyleReader, UnknownKeyOfAStop_IsNamedWithItsPlace) {
 
 TEST(StyleReader, MissingArgument_IsNamed) {
     EXPECT_EQ(faultOf(R"({"outerShadow": {"angle": 1, "distance": 1, "color": "#000000"}})"),
-              "outerShadow.size: missing");
-    EXPECT_EQ(faultOf(R"({"linearGradient": {"angle": 1}})"), "linearGradient.gradient: missing");
-    EXPECT_EQ(faultOf(R"({"stroke": {"size": 1, "color": "#000000"}})"), "stroke.position: missing");
+              "outerShadow.size: missing; a number from 0 to 100");
+    EXPECT_EQ(faultOf(R"({"linearGradient": {"angle": 1}})"),
+              "linearGradient.gradient: missing; an array of 1 to 256 elements");
+    EXPECT_EQ(faultOf(R"({"stroke": {"size": 1, "color": "#000000"}})"),
+              "stroke.position: missing; one of center, outside, inside");
 }
 
 TEST(StyleReader, WrongTypes_AreNamed) {
     EXPECT_EQ(faultOf("[]"), "style: must be an object, not an array");
     EXPECT_EQ(faultOf("null"), "style: must be an object, not null");
     EXPECT_EQ(faultOf(R"({"stroke": 3})"), "stroke: must be an object, not a number");
-    EXPECT_EQ(faultOf(R"({"textOpacity": "1"})"), "textOpacity: must be a number, not a string");
+    EXPECT_EQ(faultOf(R"({"textOpacity": "1"})"),
+              "textOpacity: must be a number from 0 to 1, not a string");
     EXPECT_EQ(faultOf(R"({"description": 1})"), "description: must be a string, not a number");
     EXPECT_EQ(faultOf(R"({"color": 255})"), "color: must be a colour \"#RRGGBB\", not a number");
     EXPECT_EQ(faultOf(R"({"outerGlow": {"size": 1, "gradient": {}}})"),
-              "outerGlow.gradient: must be an array, not an object");
+              "outerGlow.gradient: must be an array of 1 to 256 elements, not an object");
     EXPECT_EQ(faultOf(R"({"outerGlow": {"size": true, "color": "#000000"}})"),
-              "outerGlow.size: must be a number, not a boolean");
+              "outerGlow.size: must be a number from 0 to 100, not a boolean");
     EXPECT_EQ(faultOf(R"({"pattern": {"image": null}})"), "pattern.image: must be a string, not null");
+    EXPECT_EQ(faultOf(R"({"stroke": {"size": 1, "color": "#000000", "position": 1}})"),
+              "stroke.position: must be one of center, outside, inside, not a number");
+    EXPECT_EQ(faultOf(R"({"stroke": {"size": 1, "color": "#000000", "strokeStyle": []}})"),
+              "stroke.strokeStyle: must be a whole number from 0 to 255, not an array");
 }
 
 TEST(StyleReader, NumbersOutOfRange_AreNamedWithTheRange) {
@@ -199,7 +218,7 @@ TEST(StyleReader, NumbersOutOfRange_AreNamedWithTheRange) {
 
 TEST(StyleReader, WholeNumbers_RefuseFractions) {
     EXPECT_EQ(faultOf(R"({"stroke": {"size": 1, "color": "#000000", "strokeStyle": 1.5}})"),
-              "stroke.strokeStyle: 1.5 is no whole number");
+              "stroke.strokeStyle: must be a whole number from 0 to 255, not 1.5");
     EXPECT_EQ(faultOf(R"({"stroke": {"size": 1, "color": "#000000", "strokeStyle": 1e30}})"),
               "stroke.strokeStyle: 1e+30 is out of range, 0 to 255");
 }
@@ -218,7 +237,8 @@ TEST(StyleReader, StopCount_HasItsRange) {
 TEST(StyleReader, StopsThatStepBack_AreRefused) {
     EXPECT_EQ(faultOf(R"({"radialGradient": {"gradient": [{"color": "#000000", "location": 0.5},
                                                           {"color": "#000000", "location": 0.4}]}})"),
-              "radialGradient.gradient[1].location: lies before the stop that precedes it");
+              "radialGradient.gradient[1].location: 0.4 lies before 0.5, the location of the stop that "
+              "precedes it");
 }
 
 TEST(StyleReader, BadColours_AreQuoted) {
@@ -253,9 +273,14 @@ TEST(StyleReader, InvalidUtf8AndHugeNumbers_AreNoValidJson) {
 }
 
 TEST(StyleReader, KeyGivenTwice_IsRefused) {
-    EXPECT_EQ(faultOf(R"({"color": "#000000", "color": "#FFFFFF"})"), "\"color\": key given twice");
+    EXPECT_EQ(faultOf(R"({"color": "#000000", "color": "#FFFFFF"})"), "color: key given twice");
     EXPECT_EQ(faultOf(R"({"text": {"color": "#000000", "color": "#000000"}})"),
-              "\"color\": key given twice");
+              "text.color: key given twice");
+    EXPECT_EQ(faultOf(R"({"color": "#000000", "outerGlow": {"gradient": [{"location": 0}, 3, [{}],
+                          {"color": "#000000", "location": 0, "color": "#FFFFFF"}]}})"),
+              "outerGlow.gradient[3].color: key given twice");
+    const std::string deep = std::string(50000, '[') + R"({"a": 1, "a": 2})";
+    EXPECT_LT(faultOf(deep).size(), 200U);
 }
 
 TEST(StyleReader, SameKeyInTwoEffects_IsFine) {

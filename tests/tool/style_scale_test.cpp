@@ -32,6 +32,16 @@ TEST(StyleScale, Lengths_NeverVanishNorLeaveTheRange) {
     EXPECT_EQ(std::get<InnerShadow>(large.effects[1]).distance, 0.0F);
 }
 
+TEST(StyleScale, FactorOne_ChangesNothing) {
+    Style style = read(R"({"outerShadow": {"angle": 0, "distance": 0.4, "size": 2.7, "color": "#000000"},
+                           "pattern": {"image": "a.png", "scale": 0.15}})");
+    style = scaledStyle(style, 1.0F);
+    const auto& shadow = std::get<OuterShadow>(style.effects[0]);
+    EXPECT_EQ(shadow.size, 2.7F);
+    EXPECT_EQ(shadow.distance, 0.4F);
+    EXPECT_EQ(std::get<Pattern>(style.effects[1]).scale, 0.15F);
+}
+
 TEST(StyleScale, Patterns_ScaleAlong) {
     const char* json = R"({"pattern": {"image": "a.png", "scale": 1.5, "opacity": 1}})";
     EXPECT_EQ(std::get<Pattern>(scaledStyle(read(json), 2.0F).effects[0]).scale, 3.0F);

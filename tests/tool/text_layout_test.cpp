@@ -8,6 +8,7 @@
 
 #include "error.h"
 #include "font_finder.h"
+#include "program.h"
 #include "utf8.h"
 
 namespace vorelpaint {
@@ -112,6 +113,44 @@ TEST_F(TextLayoutTest, MissingCharacters_AreCounted) {
 TEST_F(TextLayoutTest, TextBeyondTheLimit_IsRefused) {
     EXPECT_THROW(layOut(std::string(2000, 'M')), ToolError);
     EXPECT_THROW(layOut(std::string(2000, '\n') + "M"), ToolError);
+}
+
+size_t bigEndian(const std::string& bytes, size_t at, size_t size) {
+    size_t number = 0;
+    for (size_t i = 0; i < size; ++i)
+        number = number << 8 | static_cast<uint8_t>(bytes.at(at + i));
+    return number;
+}
+
+/// The font with every kerning pair drawn together by 16 em. Without its GPOS table, that is what
+/// shapes it.
+std::string kernedBackwards(std::string font) {
+    constexpr size_t kOffsetInRecord = 8;
+    constexpr size_t kPairCount = 10;
+    constexpr size_t kFirstPair = 18;
+    constexpr size_t kPairSize = 6;
+    constexpr size_t kValueInPair = 4;
+    font.replace(font.find("GPOS"), 4, "GPOR");
+    const size_t table = bigEndian(font, font.find("kern") + kOffsetInRecord, 4);
+    const size_t pairs = bigEndian(font, table + kPairCount, 2);
+    for (size_t i = 0; i < pairs; ++i) {
+        font.replace(table + kFirstPair + i * kPairSize + kValueInPair, 2, std::string("\x80\0", 2));
+    }
+    return font;
+}
+
+TEST_F(TextLayoutTest, FontThatStepsBackwards_IsHeldToTheLimitToo) {
+    const vorel_test::TempDir dir;
+    const std::string bytes = vorel_test::readBytes(findFont("DejaVu Sans").path);
+    const Font font({dir.write("back.ttf", kernedBackwards(bytes)), 0}, 64);
+    const auto layOutPairs = [&](int count) {
+        std::string text;
+        for (int i = 0; i < count; ++i)
+            text += "AV";
+        return TextLayout(font, decodeUtf8(text), Align::left);
+    };
+    EXPECT_LT(layOutPairs(1).inkBox().left, -900) << "the second letter stands 1024 pixels back";
+    EXPECT_THROW(layOutPairs(20), ToolError);
 }
 
 }  // namespace
