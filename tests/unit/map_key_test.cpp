@@ -188,4 +188,15 @@ TEST(MapKey, RecordsWithCountsThatHoldNoStops_Survive) {
     EXPECT_EQ(keyOf(set).size(), 10U + 5U + 9U);
 }
 
+TEST(MapKey, CountsOutOfAllProportion_GiveNoKey) {
+    VFOuterGlowProperty claim(1, 0, 1, INT32_MAX, nullptr);
+    VFEffect set;
+    set.addEffect(kOuterGlow, &claim);
+    EXPECT_EQ(set.getMapKey(), nullptr);
+
+    claim.mGradientCount = 1000;
+    set.addEffect(kOuterGlow, &claim);
+    EXPECT_EQ(keyOf(set).size(), 10U);
+}
+
 }  // namespace
