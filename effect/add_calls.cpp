@@ -12,6 +12,12 @@ using namespace internal;
 
 namespace {
 
+/// Registers a record and gives its effect's id, -1 as 0xFFFFFFFF.
+template <class Record>
+unsigned int add(VFEffect& set, EffectType type, Record record) {
+    return static_cast<unsigned int>(set.addEffect(type, &record));
+}
+
 template <class Shadow>
 Shadow shadowRecord(float angle, float distance, float size, unsigned int color, float opacity) {
     const float o = clampedOpacity(opacity);
@@ -20,12 +26,12 @@ Shadow shadowRecord(float angle, float distance, float size, unsigned int color,
 }
 
 template <class Glow>
-unsigned int addGlow(VFEffect& set, int type, float size, unsigned int color, float opacity, int count,
-                     const VFGradient* gradient) {
+unsigned int addGlow(VFEffect& set, EffectType type, float size, unsigned int color, float opacity,
+                     int count, const VFGradient* gradient) {
     const float o = clampedOpacity(opacity);
     NormalisedStops stops(gradient, count, o);
-    Glow record(wholePixels(size), straightColour(color, o), o, stops.count(), stops.data());
-    return static_cast<unsigned int>(set.addEffect(type, &record));
+    return add(set, type,
+               Glow(wholePixels(size), straightColour(color, o), o, stops.count(), stops.data()));
 }
 
 /// Bevel and emboss: each colour carries the product of the effect's opacity and its own.
@@ -48,14 +54,14 @@ Relief reliefRecord(int style, float size, float depth, int technique, int direc
 
 unsigned int VFEffect::addOuterShadowText(float angle, float distance, float size, unsigned int color,
                                           float opacity) {
-    auto record = shadowRecord<VFOuterShadowProperty>(angle, distance, size, color, opacity);
-    return static_cast<unsigned int>(addEffect(kOuterShadow, &record));
+    return add(*this, kOuterShadow,
+               shadowRecord<VFOuterShadowProperty>(angle, distance, size, color, opacity));
 }
 
 unsigned int VFEffect::addInnerShadowText(float angle, float distance, float size, unsigned int color,
                                           float opacity) {
-    auto record = shadowRecord<VFInnerShadowProperty>(angle, distance, size, color, opacity);
-    return static_cast<unsigned int>(addEffect(kInnerShadow, &record));
+    return add(*this, kInnerShadow,
+               shadowRecord<VFInnerShadowProperty>(angle, distance, size, color, opacity));
 }
 
 unsigned int VFEffect::addOuterGlowText(float size, unsigned int color, float opacity, int count,
@@ -72,30 +78,30 @@ unsigned int VFEffect::addBevelText(int style, float size, float depth, int tech
                                     int soften, float opacity, float angle, float altitude,
                                     unsigned int highlightColor, float highlightOpacity,
                                     unsigned int shadowColor, float shadowOpacity) {
-    auto record = reliefRecord<VFBevelProperty>(style, size, depth, technique, direction, soften,
-                                                opacity, angle, altitude, highlightColor,
-                                                highlightOpacity, shadowColor, shadowOpacity);
-    return static_cast<unsigned int>(addEffect(kBevel, &record));
+    return add(*this, kBevel,
+               reliefRecord<VFBevelProperty>(style, size, depth, technique, direction, soften, opacity,
+                                             angle, altitude, highlightColor, highlightOpacity,
+                                             shadowColor, shadowOpacity));
 }
 
 unsigned int VFEffect::addEmbossText(int style, float size, float depth, int technique, int direction,
                                      int soften, float opacity, float angle, float altitude,
                                      unsigned int highlightColor, float highlightOpacity,
                                      unsigned int shadowColor, float shadowOpacity) {
-    auto record = reliefRecord<VFEmbossProperty>(style, size, depth, technique, direction, soften,
-                                                 opacity, angle, altitude, highlightColor,
-                                                 highlightOpacity, shadowColor, shadowOpacity);
-    return static_cast<unsigned int>(addEffect(kEmboss, &record));
+    return add(*this, kEmboss,
+               reliefRecord<VFEmbossProperty>(style, size, depth, technique, direction, soften, opacity,
+                                              angle, altitude, highlightColor, highlightOpacity,
+                                              shadowColor, shadowOpacity));
 }
 
 unsigned int VFEffect::addLinearGradientText(float angle, float scale, float opacity, int count,
                                              VFGradient* gradient) {
     const float o = clampedOpacity(opacity);
     NormalisedStops stops(gradient, count, o);
-    VFLinearGradientProperty record(static_cast<float>(wholeDegrees(angle, kTurn)),
-                                    clampOrLow(scale, 0.0F, kLargestGradientScale), o, stops.count(),
-                                    stops.data());
-    return static_cast<unsigned int>(addEffect(kLinearGradient, &record));
+    return add(*this, kLinearGradient,
+               VFLinearGradientProperty(static_cast<float>(wholeDegrees(angle, kTurn)),
+                                        clampOrLow(scale, 0.0F, kLargestGradientScale), o, stops.count(),
+                                        stops.data()));
 }
 
 unsigned int VFEffect::addRadialGradientText(float scale, float opacity, int count,
@@ -103,29 +109,29 @@ unsigned int VFEffect::addRadialGradientText(float scale, float opacity, int cou
     const float o = clampedOpacity(opacity);
     NormalisedStops stops(gradient, count, o);
     // Deliberate: the record has an angle, the call offers none.
-    VFRadialGradientProperty record(0.0F, clampOrLow(scale, 0.0F, kLargestGradientScale), o,
-                                    stops.count(), stops.data());
-    return static_cast<unsigned int>(addEffect(kRadialGradient, &record));
+    return add(*this, kRadialGradient,
+               VFRadialGradientProperty(0.0F, clampOrLow(scale, 0.0F, kLargestGradientScale), o,
+                                        stops.count(), stops.data()));
 }
 
 unsigned int VFEffect::addStrokeText(float size, unsigned int color, float opacity, int strokeStyle,
                                      int position) {
     const float o = clampedOpacity(opacity);
-    VFStrokeProperty record(wholePixels(size), premultipliedColour(color, o), o, strokeStyle, position);
-    return static_cast<unsigned int>(addEffect(kStroke, &record));
+    return add(
+        *this, kStroke,
+        VFStrokeProperty(wholePixels(size), premultipliedColour(color, o), o, strokeStyle, position));
 }
 
 unsigned int VFEffect::addPatternText(VFBitmap* pattern, float scale, float opacity) {
-    VFPatternProperty record(pattern, clampOrLow(scale, 0.0F, kLargestPatternScale),
-                             clampedOpacity(opacity));
-    return static_cast<unsigned int>(addEffect(kPattern, &record));
+    return add(*this, kPattern,
+               VFPatternProperty(pattern, clampOrLow(scale, 0.0F, kLargestPatternScale),
+                                 clampedOpacity(opacity)));
 }
 
 unsigned int VFEffect::addText(unsigned int color, float opacity) {
     mTextAlpha = static_cast<unsigned char>(color >> 24);
     const float o = clampedOpacity(opacity);
-    VFTextProperty record(premultipliedColour(color, o), o);
-    return static_cast<unsigned int>(addEffect(kText, &record));
+    return add(*this, kText, VFTextProperty(premultipliedColour(color, o), o));
 }
 
 }  // namespace VFontEffect

@@ -62,18 +62,16 @@ void VFEffect::renderEffectLayer(int x, int y, VFGlyph* glyph) {
 }
 
 void VFEffect::doEffectPostProcessing() {
-    if (mSrcBitmap != nullptr) {
-        clampTo(mTextRect, *mSrcBitmap);
-        const bool empty = mTextRect.mRight <= mTextRect.mLeft || mTextRect.mBottom <= mTextRect.mTop;
-        VFECore::ParamPostProcessing params = {mDstBitmap, mSrcBitmap, &mTextRect, mUseOuterLayer,
-                                               nullptr};
-        for (VFECore* core : mEffects) {
-            if (empty) break;
-            if (mUseOuterLayer == 1) route(*core, mDstBitmap, mOuterLayer, params);
-            core->doPostProcessing(&params);
-        }
-    }
     mResetTextRect = true;
+    if (mSrcBitmap == nullptr) return;
+    clampTo(mTextRect, *mSrcBitmap);
+    if (mTextRect.mRight <= mTextRect.mLeft || mTextRect.mBottom <= mTextRect.mTop) return;
+
+    VFECore::ParamPostProcessing params = {mDstBitmap, mSrcBitmap, &mTextRect, mUseOuterLayer, nullptr};
+    for (VFECore* core : mEffects) {
+        if (mUseOuterLayer == 1) route(*core, mDstBitmap, mOuterLayer, params);
+        core->doPostProcessing(&params);
+    }
 }
 
 }  // namespace VFontEffect

@@ -58,7 +58,8 @@ class SequentialWriter {
 
     /// Each stop is its colour and its position in hundredths. No array counts as no stops.
     SequentialWriter& stops(const VFGradient* gradient, int count) {
-        for (int i = 0; gradient != nullptr && i < keptStops(count); ++i) {
+        const int kept = gradient != nullptr ? keptStops(count) : 0;
+        for (int i = 0; i < kept; ++i) {
             word(gradient[i].mColor).small(gradient[i].mLocation * 100.0F);
         }
         return *this;

@@ -180,50 +180,51 @@ void paintText(Picture& dst, const Mask& mask, bool useOuterLayer, uint32_t colo
 
 // --- Add-calls ----------------------------------------------------------------------------------
 
-unsigned Engine::addOuterShadowText(float angle, float distance, float size, uint32_t color,
-                                    float opacity) {
+namespace {
+
+Effect shadow(int kind, float angle, float distance, float size, uint32_t color, float opacity) {
     Effect e;
-    e.kind = kOuterShadow;
+    e.kind = kind;
     e.opacity = clamped(opacity, 1.0F);
     e.angle = wholeDegrees(angle);
     e.distance = wholePixels(distance);
     e.size = wholePixels(size);
     e.color = premultiplied(color, e.opacity);
-    return static_cast<unsigned>(addEffect(-1, e));
+    return e;
+}
+
+Effect glow(int kind, float size, uint32_t color, float opacity, int count, const Stop* stops) {
+    Effect e;
+    e.kind = kind;
+    e.opacity = clamped(opacity, 1.0F);
+    e.size = wholePixels(size);
+    e.color = straight(color, e.opacity);
+    e.stops = copiedStops(count, stops, e.opacity);
+    return e;
+}
+
+}  // namespace
+
+unsigned Engine::addOuterShadowText(float angle, float distance, float size, uint32_t color,
+                                    float opacity) {
+    return static_cast<unsigned>(
+        addEffect(-1, shadow(kOuterShadow, angle, distance, size, color, opacity)));
 }
 
 unsigned Engine::addInnerShadowText(float angle, float distance, float size, uint32_t color,
                                     float opacity) {
-    Effect e;
-    e.kind = kInnerShadow;
-    e.opacity = clamped(opacity, 1.0F);
-    e.angle = wholeDegrees(angle);
-    e.distance = wholePixels(distance);
-    e.size = wholePixels(size);
-    e.color = premultiplied(color, e.opacity);
-    return static_cast<unsigned>(addEffect(-1, e));
+    return static_cast<unsigned>(
+        addEffect(-1, shadow(kInnerShadow, angle, distance, size, color, opacity)));
 }
 
 unsigned Engine::addOuterGlowText(float size, uint32_t color, float opacity, int count,
                                   const Stop* stops) {
-    Effect e;
-    e.kind = kOuterGlow;
-    e.opacity = clamped(opacity, 1.0F);
-    e.size = wholePixels(size);
-    e.color = straight(color, e.opacity);
-    e.stops = copiedStops(count, stops, e.opacity);
-    return static_cast<unsigned>(addEffect(-1, e));
+    return static_cast<unsigned>(addEffect(-1, glow(kOuterGlow, size, color, opacity, count, stops)));
 }
 
 unsigned Engine::addInnerGlowText(float size, uint32_t color, float opacity, int count,
                                   const Stop* stops) {
-    Effect e;
-    e.kind = kInnerGlow;
-    e.opacity = clamped(opacity, 1.0F);
-    e.size = wholePixels(size);
-    e.color = straight(color, e.opacity);
-    e.stops = copiedStops(count, stops, e.opacity);
-    return static_cast<unsigned>(addEffect(-1, e));
+    return static_cast<unsigned>(addEffect(-1, glow(kInnerGlow, size, color, opacity, count, stops)));
 }
 
 unsigned Engine::addLinearGradientText(float angle, float scale, float opacity, int count,
