@@ -1,149 +1,164 @@
 #pragma once
 
-#include <cstddef>
 #include <cstdint>
 #include <cstring>
 
-/// Lanes: unsigned 16-bit values that a per-pixel rule computes with, one value or a vector of them.
-/// A rule written once over a lane type runs on one pixel (Lane<uint16_t>) and on eight.
-///
-/// The two forms agree as long as no intermediate leaves 0..65535. Branches are `select`s over masks
-/// of all ones or all zeros. Loads and stores take the machine's bytes as little-endian.
-namespace VFontEffect::internal {
+#include "core/inline.h"
+
+#if !defined(VOREL_SCALAR) && defined(__x86_64__)
+#include <immintrin.h>
+#elif !defined(VOREL_SCALAR) && defined(__aarch64__)
+#include <arm_neon.h>
+#endif
+
+/// Lanes: vectors as wide as the registers of the level that a source of inner loops is compiled for,
+/// in that level's namespace. Arithmetic, comparisons and choices (`mask ? a : b`) are those of the
+/// compilers' vector types, which both g++ and clang turn into single instructions; here is what these
+/// do not express. The scalar level's vector is one 32-bit word, in plain C++ for any CPU.
+namespace VFontEffect::internal::VOREL_LEVEL {
 
 static_assert(__BYTE_ORDER__ == __ORDER_LITTLE_ENDIAN__, "pixels are loaded as little-endian words");
 
-using U16x8 = uint16_t __attribute__((vector_size(16)));
-using U8x8 = uint8_t __attribute__((vector_size(8)));
+#if defined(VOREL_SCALAR)
+constexpr int kBytes = 4;
+#elif defined(__AVX512BW__)
+constexpr int kBytes = 64;
+#elif defined(__AVX2__)
+constexpr int kBytes = 32;
+#else
+constexpr int kBytes = 16;
+#endif
+constexpr int kWords = kBytes / 4;
+
+using Bytes = uint8_t __attribute__((vector_size(kBytes)));
+using Halves = uint16_t __attribute__((vector_size(kBytes)));
+using Words = uint32_t __attribute__((vector_size(kBytes)));
+using Integers = int32_t __attribute__((vector_size(kBytes)));
+using Floats = float __attribute__((vector_size(kBytes)));
+
+/// One vector's bits as another type of lanes.
+template <class To, class From>
+VOREL_INLINE To as(From vector) {
+    return reinterpret_cast<To>(vector);
+}
+
+/// Vectors in memory, at any address.
+template <class V>
+VOREL_INLINE V load(const void* from) {
+    V vector;
+    std::memcpy(&vector, from, sizeof vector);
+    return vector;
+}
+template <class V>
+VOREL_INLINE void store(void* to, V vector) {
+    std::memcpy(to, &vector, sizeof vector);
+}
+
+/// `value` in every lane.
+template <class V, class T>
+VOREL_INLINE V spread(T value) {
+    return V{} + value;
+}
 
 template <class V>
-struct Lane {
-    V v;
-
-    explicit Lane(V value) : v(value) {}
-    explicit Lane(int value) : v(static_cast<V>(V{} + static_cast<uint16_t>(value))) {}
-
-    friend Lane operator+(Lane a, Lane b) { return Lane(static_cast<V>(a.v + b.v)); }
-    friend Lane operator-(Lane a, Lane b) { return Lane(static_cast<V>(a.v - b.v)); }
-    friend Lane operator*(Lane a, Lane b) { return Lane(static_cast<V>(a.v * b.v)); }
-    friend Lane operator&(Lane a, Lane b) { return Lane(static_cast<V>(a.v & b.v)); }
-    friend Lane operator|(Lane a, Lane b) { return Lane(static_cast<V>(a.v | b.v)); }
-    friend Lane operator>>(Lane a, int bits) { return Lane(static_cast<V>(a.v >> bits)); }
-    friend Lane operator<<(Lane a, int bits) { return Lane(static_cast<V>(a.v << bits)); }
-};
-
-using OneLane = Lane<uint16_t>;
-using EightLanes = Lane<U16x8>;
-
-template <class L>
-constexpr size_t kPixels = sizeof(L) / sizeof(uint16_t);
-
-/// All ones where a == b, else zeros.
-inline OneLane equal(OneLane a, OneLane b) {
-    return OneLane(static_cast<uint16_t>(a.v == b.v ? 0xFFFF : 0));
+VOREL_INLINE V larger(V a, V b) {
+    return a > b ? a : b;
 }
-inline EightLanes equal(EightLanes a, EightLanes b) {
-    return EightLanes(reinterpret_cast<U16x8>(a.v == b.v));
+template <class V>
+VOREL_INLINE V smaller(V a, V b) {
+    return a < b ? a : b;
 }
 
-/// All ones where a < b, else zeros.
-inline OneLane less(OneLane a, OneLane b) {
-    return OneLane(static_cast<uint16_t>(a.v < b.v ? 0xFFFF : 0));
+// Each level's own instructions:
+//   addSaturated   a + b, at most 255
+//   subSaturated   a - b, at least 0
+//   multiplyHigh   the upper 16 bits of 32-bit products
+//   allZero        whether no lane holds anything but 0
+//   fourthBytes    of each word its highest byte, in both halves of the word
+//   firstAndThirdSwapped   each word's bytes 0 1 2 3 as 2 1 0 3
+
+#if defined(VOREL_SCALAR)
+
+VOREL_INLINE Bytes addSaturated(Bytes a, Bytes b) {
+    const Bytes sum = a + b;
+    return sum | as<Bytes>(sum < a);
 }
-inline EightLanes less(EightLanes a, EightLanes b) {
-    return EightLanes(reinterpret_cast<U16x8>(a.v < b.v));
+VOREL_INLINE Bytes subSaturated(Bytes a, Bytes b) {
+    return (a - b) & as<Bytes>(a > b);
+}
+VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
+    const auto high = [](uint32_t x, uint32_t y) { return static_cast<uint16_t>((x * y) >> 16); };
+    return Halves{high(a[0], b[0]), high(a[1], b[1])};
+}
+VOREL_INLINE bool allZero(Bytes v) {
+    return as<Words>(v)[0] == 0;
 }
 
-/// `a` where the mask is all ones, `b` where it is zeros.
-template <class L>
-L select(L mask, L a, L b) {
-    return b - (mask & (b - a));
+#elif defined(__AVX512BW__)
+
+VOREL_INLINE Bytes addSaturated(Bytes a, Bytes b) {
+    return as<Bytes>(_mm512_adds_epu8(as<__m512i>(a), as<__m512i>(b)));
+}
+VOREL_INLINE Bytes subSaturated(Bytes a, Bytes b) {
+    return as<Bytes>(_mm512_subs_epu8(as<__m512i>(a), as<__m512i>(b)));
+}
+VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
+    return as<Halves>(_mm512_mulhi_epu16(as<__m512i>(a), as<__m512i>(b)));
+}
+VOREL_INLINE bool allZero(Bytes v) {
+    return _mm512_test_epi32_mask(as<__m512i>(v), as<__m512i>(v)) == 0;
+}
+/// Moves bytes within each 128 bits; an index of -1 gives 0.
+VOREL_INLINE Bytes shuffled(Bytes v, __m128i indices) {
+    return as<Bytes>(_mm512_shuffle_epi8(as<__m512i>(v), _mm512_broadcast_i32x4(indices)));
 }
 
-template <class L>
-L smaller(L a, L b) {
-    return select(less(a, b), a, b);
+#elif defined(__AVX2__)
+
+VOREL_INLINE Bytes addSaturated(Bytes a, Bytes b) {
+    return as<Bytes>(_mm256_adds_epu8(as<__m256i>(a), as<__m256i>(b)));
+}
+VOREL_INLINE Bytes subSaturated(Bytes a, Bytes b) {
+    return as<Bytes>(_mm256_subs_epu8(as<__m256i>(a), as<__m256i>(b)));
+}
+VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
+    return as<Halves>(_mm256_mulhi_epu16(as<__m256i>(a), as<__m256i>(b)));
+}
+VOREL_INLINE bool allZero(Bytes v) {
+    return _mm256_testz_si256(as<__m256i>(v), as<__m256i>(v)) != 0;
+}
+/// Moves bytes within each 128 bits; an index of -1 gives 0.
+VOREL_INLINE Bytes shuffled(Bytes v, __m128i indices) {
+    return as<Bytes>(_mm256_shuffle_epi8(as<__m256i>(v), _mm256_broadcastsi128_si256(indices)));
 }
 
-template <class L>
-L larger(L a, L b) {
-    return select(less(a, b), b, a);
+#elif defined(__x86_64__)
+
+VOREL_INLINE Bytes addSaturated(Bytes a, Bytes b) {
+    return as<Bytes>(_mm_adds_epu8(as<__m128i>(a), as<__m128i>(b)));
+}
+VOREL_INLINE Bytes subSaturated(Bytes a, Bytes b) {
+    return as<Bytes>(_mm_subs_epu8(as<__m128i>(a), as<__m128i>(b)));
+}
+VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
+    return as<Halves>(_mm_mulhi_epu16(as<__m128i>(a), as<__m128i>(b)));
+}
+VOREL_INLINE bool allZero(Bytes v) {
+    return _mm_movemask_epi8(_mm_cmpeq_epi8(as<__m128i>(v), _mm_setzero_si128())) == 0xFFFF;
 }
 
-/// Pixels of 8 bits.
-inline OneLane loadBytes(const unsigned char* from, OneLane*) {
-    return OneLane(static_cast<uint16_t>(*from));
+#else
+
+VOREL_INLINE Bytes addSaturated(Bytes a, Bytes b) {
+    return as<Bytes>(vqaddq_u8(as<uint8x16_t>(a), as<uint8x16_t>(b)));
 }
-inline EightLanes loadBytes(const unsigned char* from, EightLanes*) {
-    U8x8 bytes;
-    std::memcpy(&bytes, from, sizeof bytes);
-    return EightLanes(__builtin_convertvector(bytes, U16x8));
+VOREL_INLINE Bytes subSaturated(Bytes a, Bytes b) {
+    return as<Bytes>(vqsubq_u8(as<uint8x16_t>(a), as<uint8x16_t>(b)));
 }
-template <class L>
-L loadBytes(const unsigned char* from) {
-    return loadBytes(from, static_cast<L*>(nullptr));
+VOREL_INLINE bool allZero(Bytes v) {
+    return vmaxvq_u32(as<uint32x4_t>(v)) == 0;
 }
 
-inline void storeBytes(unsigned char* to, OneLane value) {
-    *to = static_cast<unsigned char>(value.v);
-}
-inline void storeBytes(unsigned char* to, EightLanes value) {
-    const U8x8 bytes = __builtin_convertvector(value.v, U8x8);
-    std::memcpy(to, &bytes, sizeof bytes);
-}
+#endif
 
-/// The two 16-bit halves of each 32-bit pixel: bytes 0 and 1, and bytes 2 and 3.
-template <class L>
-struct Halves {
-    L low;
-    L high;
-};
-
-inline Halves<OneLane> loadHalves(const unsigned char* from, OneLane*) {
-    uint16_t halves[2];
-    std::memcpy(halves, from, sizeof halves);
-    return {OneLane(halves[0]), OneLane(halves[1])};
-}
-inline Halves<EightLanes> loadHalves(const unsigned char* from, EightLanes*) {
-    U16x8 first;
-    U16x8 second;
-    std::memcpy(&first, from, sizeof first);
-    std::memcpy(&second, from + sizeof first, sizeof second);
-    return {EightLanes(__builtin_shufflevector(first, second, 0, 2, 4, 6, 8, 10, 12, 14)),
-            EightLanes(__builtin_shufflevector(first, second, 1, 3, 5, 7, 9, 11, 13, 15))};
-}
-
-inline void storeHalves(unsigned char* to, Halves<OneLane> halves) {
-    const uint16_t both[2] = {halves.low.v, halves.high.v};
-    std::memcpy(to, both, sizeof both);
-}
-inline void storeHalves(unsigned char* to, Halves<EightLanes> halves) {
-    const U16x8 first = __builtin_shufflevector(halves.low.v, halves.high.v, 0, 8, 1, 9, 2, 10, 3, 11);
-    const U16x8 second =
-        __builtin_shufflevector(halves.low.v, halves.high.v, 4, 12, 5, 13, 6, 14, 7, 15);
-    std::memcpy(to, &first, sizeof first);
-    std::memcpy(to + sizeof first, &second, sizeof second);
-}
-
-/// The four bytes of each 32-bit pixel, in memory order.
-template <class L>
-struct Quad {
-    L byte0;
-    L byte1;
-    L byte2;
-    L byte3;
-};
-
-template <class L>
-Quad<L> loadQuad(const unsigned char* from) {
-    const Halves<L> halves = loadHalves(from, static_cast<L*>(nullptr));
-    const L lowByte(0xFF);
-    return {halves.low & lowByte, halves.low >> 8, halves.high & lowByte, halves.high >> 8};
-}
-
-template <class L>
-void storeQuad(unsigned char* to, const Quad<L>& quad) {
-    storeHalves(to, {quad.byte0 | quad.byte1 << 8, quad.byte2 | quad.byte3 << 8});
-}
-
-}  // namespace VFontEffect::internal
+}  // namespace VFontEffect::internal::VOREL_LEVEL
