@@ -74,8 +74,9 @@ VOREL_INLINE V smaller(V a, V b) {
 //   subSaturated   a - b, at least 0
 //   multiplyHigh   the upper 16 bits of 32-bit products
 //   allZero        whether no lane holds anything but 0
-//   fourthBytes    of each word its highest byte, in both halves of the word
-//   firstAndThirdSwapped   each word's bytes 0 1 2 3 as 2 1 0 3
+//   loadInPairs    kWords bytes of memory, each in both halves of its word (not on NEON)
+//   highBytesInPairs   of each word its highest byte, in both halves of the word (not on NEON)
+//   endsSwapped    bytes 0 1 2 3 of each word as 2 1 0 3 (not on NEON)
 
 #if defined(VOREL_SCALAR)
 
@@ -92,6 +93,15 @@ VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
 }
 VOREL_INLINE bool allZero(Bytes v) {
     return as<Words>(v)[0] == 0;
+}
+VOREL_INLINE Halves loadInPairs(const uint8_t* from) {
+    return as<Halves>(Words{*from * 0x10001U});
+}
+VOREL_INLINE Halves highBytesInPairs(Bytes v) {
+    return as<Halves>((as<Words>(v) >> 24) * 0x10001U);
+}
+VOREL_INLINE Bytes endsSwapped(Bytes v) {
+    return Bytes{v[2], v[1], v[0], v[3]};
 }
 
 #elif defined(__AVX512BW__)
@@ -112,6 +122,18 @@ VOREL_INLINE bool allZero(Bytes v) {
 VOREL_INLINE Bytes shuffled(Bytes v, __m128i indices) {
     return as<Bytes>(_mm512_shuffle_epi8(as<__m512i>(v), _mm512_broadcast_i32x4(indices)));
 }
+VOREL_INLINE Halves loadInPairs(const uint8_t* from) {
+    const __m512i words = _mm512_cvtepu8_epi32(_mm_loadu_si128(reinterpret_cast<const __m128i*>(from)));
+    return as<Halves>(shuffled(as<Bytes>(words),
+                               _mm_setr_epi8(0, -1, 0, -1, 4, -1, 4, -1, 8, -1, 8, -1, 12, -1, 12, -1)));
+}
+VOREL_INLINE Halves highBytesInPairs(Bytes v) {
+    return as<Halves>(
+        shuffled(v, _mm_setr_epi8(3, -1, 3, -1, 7, -1, 7, -1, 11, -1, 11, -1, 15, -1, 15, -1)));
+}
+VOREL_INLINE Bytes endsSwapped(Bytes v) {
+    return shuffled(v, _mm_setr_epi8(2, 1, 0, 3, 6, 5, 4, 7, 10, 9, 8, 11, 14, 13, 12, 15));
+}
 
 #elif defined(__AVX2__)
 
@@ -131,6 +153,18 @@ VOREL_INLINE bool allZero(Bytes v) {
 VOREL_INLINE Bytes shuffled(Bytes v, __m128i indices) {
     return as<Bytes>(_mm256_shuffle_epi8(as<__m256i>(v), _mm256_broadcastsi128_si256(indices)));
 }
+VOREL_INLINE Halves loadInPairs(const uint8_t* from) {
+    const __m256i words = _mm256_cvtepu8_epi32(_mm_loadl_epi64(reinterpret_cast<const __m128i*>(from)));
+    return as<Halves>(shuffled(as<Bytes>(words),
+                               _mm_setr_epi8(0, -1, 0, -1, 4, -1, 4, -1, 8, -1, 8, -1, 12, -1, 12, -1)));
+}
+VOREL_INLINE Halves highBytesInPairs(Bytes v) {
+    return as<Halves>(
+        shuffled(v, _mm_setr_epi8(3, -1, 3, -1, 7, -1, 7, -1, 11, -1, 11, -1, 15, -1, 15, -1)));
+}
+VOREL_INLINE Bytes endsSwapped(Bytes v) {
+    return shuffled(v, _mm_setr_epi8(2, 1, 0, 3, 6, 5, 4, 7, 10, 9, 8, 11, 14, 13, 12, 15));
+}
 
 #elif defined(__x86_64__)
 
@@ -145,6 +179,22 @@ VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
 }
 VOREL_INLINE bool allZero(Bytes v) {
     return _mm_movemask_epi8(_mm_cmpeq_epi8(as<__m128i>(v), _mm_setzero_si128())) == 0xFFFF;
+}
+VOREL_INLINE Halves loadInPairs(const uint8_t* from) {
+    const __m128i halves = _mm_unpacklo_epi8(_mm_cvtsi32_si128(load<int>(from)), _mm_setzero_si128());
+    return as<Halves>(_mm_unpacklo_epi16(halves, halves));
+}
+/// Moves the halves of each word: both take the one that `selector` names for them.
+template <int kSelector>
+VOREL_INLINE Halves halvesMoved(Halves v) {
+    return as<Halves>(_mm_shufflehi_epi16(_mm_shufflelo_epi16(as<__m128i>(v), kSelector), kSelector));
+}
+VOREL_INLINE Halves highBytesInPairs(Bytes v) {
+    return halvesMoved<_MM_SHUFFLE(3, 3, 1, 1)>(as<Halves>(v) >> 8);
+}
+VOREL_INLINE Bytes endsSwapped(Bytes v) {
+    const Halves ends = as<Halves>(v) & 0x00FF;
+    return v ^ as<Bytes>(ends) ^ as<Bytes>(halvesMoved<_MM_SHUFFLE(2, 3, 0, 1)>(ends));
 }
 
 #else
