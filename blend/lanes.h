@@ -4,6 +4,7 @@
 #include <cstring>
 
 #include "core/inline.h"
+#include "core/numeric.h"
 
 #if !defined(VOREL_SCALAR) && defined(__x86_64__)
 #include <immintrin.h>
@@ -77,6 +78,16 @@ VOREL_INLINE V smaller(V a, V b) {
 //   loadInPairs    kWords bytes of memory, each in both halves of its word (not on NEON)
 //   highBytesInPairs   of each word its highest byte, in both halves of the word (not on NEON)
 //   endsSwapped    bytes 0 1 2 3 of each word as 2 1 0 3 (not on NEON)
+//   toInt          as core/numeric.h converts: toward zero, saturating, NaN to 0
+//   squareRoot     correctly rounded
+//   gathered       the words of a table at the given indices
+
+#if !defined(VOREL_SCALAR) && defined(__x86_64__)
+/// x86 converts what does not fit to the lowest integer: made the highest above the range, 0 for NaN.
+VOREL_INLINE Integers saturated(Floats value, Integers converted) {
+    return (converted ^ (value >= 2147483648.0F)) & (value == value);
+}
+#endif
 
 #if defined(VOREL_SCALAR)
 
@@ -102,6 +113,15 @@ VOREL_INLINE Halves highBytesInPairs(Bytes v) {
 }
 VOREL_INLINE Bytes endsSwapped(Bytes v) {
     return Bytes{v[2], v[1], v[0], v[3]};
+}
+VOREL_INLINE Integers toInt(Floats v) {
+    return Integers{internal::toInt(v[0])};
+}
+VOREL_INLINE Floats squareRoot(Floats v) {
+    return Floats{__builtin_sqrtf(v[0])};
+}
+VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
+    return Words{table[indices[0]]};
 }
 
 #elif defined(__AVX512BW__)
@@ -134,6 +154,15 @@ VOREL_INLINE Halves highBytesInPairs(Bytes v) {
 VOREL_INLINE Bytes endsSwapped(Bytes v) {
     return shuffled(v, _mm_setr_epi8(2, 1, 0, 3, 6, 5, 4, 7, 10, 9, 8, 11, 14, 13, 12, 15));
 }
+VOREL_INLINE Integers toInt(Floats v) {
+    return saturated(v, as<Integers>(_mm512_cvttps_epi32(as<__m512>(v))));
+}
+VOREL_INLINE Floats squareRoot(Floats v) {
+    return as<Floats>(_mm512_sqrt_ps(as<__m512>(v)));
+}
+VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
+    return as<Words>(_mm512_i32gather_epi32(as<__m512i>(indices), table, 4));
+}
 
 #elif defined(__AVX2__)
 
@@ -164,6 +193,16 @@ VOREL_INLINE Halves highBytesInPairs(Bytes v) {
 }
 VOREL_INLINE Bytes endsSwapped(Bytes v) {
     return shuffled(v, _mm_setr_epi8(2, 1, 0, 3, 6, 5, 4, 7, 10, 9, 8, 11, 14, 13, 12, 15));
+}
+VOREL_INLINE Integers toInt(Floats v) {
+    return saturated(v, as<Integers>(_mm256_cvttps_epi32(as<__m256>(v))));
+}
+VOREL_INLINE Floats squareRoot(Floats v) {
+    return as<Floats>(_mm256_sqrt_ps(as<__m256>(v)));
+}
+VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
+    return as<Words>(
+        _mm256_i32gather_epi32(reinterpret_cast<const int*>(table), as<__m256i>(indices), 4));
 }
 
 #elif defined(__x86_64__)
@@ -196,6 +235,15 @@ VOREL_INLINE Bytes endsSwapped(Bytes v) {
     const Halves ends = as<Halves>(v) & 0x00FF;
     return v ^ as<Bytes>(ends) ^ as<Bytes>(halvesMoved<_MM_SHUFFLE(2, 3, 0, 1)>(ends));
 }
+VOREL_INLINE Integers toInt(Floats v) {
+    return saturated(v, as<Integers>(_mm_cvttps_epi32(as<__m128>(v))));
+}
+VOREL_INLINE Floats squareRoot(Floats v) {
+    return as<Floats>(_mm_sqrt_ps(as<__m128>(v)));
+}
+VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
+    return Words{table[indices[0]], table[indices[1]], table[indices[2]], table[indices[3]]};
+}
 
 #else
 
@@ -207,6 +255,15 @@ VOREL_INLINE Bytes subSaturated(Bytes a, Bytes b) {
 }
 VOREL_INLINE bool allZero(Bytes v) {
     return vmaxvq_u32(as<uint32x4_t>(v)) == 0;
+}
+VOREL_INLINE Integers toInt(Floats v) {
+    return as<Integers>(vcvtq_s32_f32(as<float32x4_t>(v)));
+}
+VOREL_INLINE Floats squareRoot(Floats v) {
+    return as<Floats>(vsqrtq_f32(as<float32x4_t>(v)));
+}
+VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
+    return Words{table[indices[0]], table[indices[1]], table[indices[2]], table[indices[3]]};
 }
 
 #endif

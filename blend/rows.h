@@ -29,6 +29,11 @@ struct Place {
     VOREL_INLINE const uint8_t* mask() const { return row.maskStart + x; }
 };
 
+/// Whether the mask is 0 for kBytes pixels.
+VOREL_INLINE bool hasEmptyMask(const Place& place) {
+    return allZero(load<Bytes>(place.mask()));
+}
+
 /// Paints a whole stretch of kBytes pixels that is empty.
 VOREL_INLINE void paintEmpty(Empty what, const Place& place) {
     if (what == Empty::clears) std::memset(place.destination(), 0, 4 * kBytes);

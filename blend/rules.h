@@ -85,6 +85,15 @@ struct DstOver {
     }
 };
 
+/// Source under destination wherever the mask is not 0. Deliberate: the mask does not scale it.
+struct DstOverWhereCovered {
+    static constexpr Empty kEmpty = Empty::keeps;
+
+    static VOREL_INLINE Pixels apply(const Pixels& d, const Pixels& source, Amounts mask) {
+        return DstOver::apply(d, cleared(isZero(mask), source));
+    }
+};
+
 // --- Layers ---------------------------------------------------------------------------------------
 
 /// The destination where the glyph covers, the outer layer where it does not.

@@ -1,10 +1,11 @@
 #include <algorithm>
 #include <cmath>
 #include <cstdint>
+#include <cstring>
 
 #include "core/effect_types.h"
-#include "core/fixed_point.h"
 #include "core/numeric.h"
+#include "core/pixel_buffer.h"
 #include "cores/covered_fill.h"
 #include "cores/paint_input.h"
 #include "cores/property_copy.h"
@@ -15,14 +16,6 @@ namespace VFontEffect {
 using namespace internal;
 
 namespace {
-
-/// Two neighbouring pattern pixels on one axis and their weights, which add up to 255.
-struct Tap {
-    int64_t near;
-    int64_t far;
-    uint32_t nearWeight;
-    uint32_t farWeight;
-};
 
 /// One axis of the tiling: from an output coordinate to the pattern pixels that it is mixed from.
 class TileAxis {
@@ -39,8 +32,12 @@ class TileAxis {
         const auto farWeight =
             static_cast<uint32_t>(std::clamp(toInt((position - whole) * 255.0F), 0, 255));
         const int64_t near = std::clamp<int64_t>(toInt(whole), 0, mPatternSize - 1);
-        return {near, near + 1 < mPatternSize ? near + 1 : 0, 255 - farWeight, farWeight};
+        const int64_t far = near + 1 < mPatternSize ? near + 1 : 0;
+        return {static_cast<uint32_t>(near), static_cast<uint32_t>(far), 255 - farWeight, farWeight};
     }
+
+    /// Output pixels after which the taps repeat.
+    int64_t period() const { return mTileSize; }
 
   private:
     int64_t mPatternSize;
@@ -48,27 +45,85 @@ class TileAxis {
     int64_t mTileSize;
 };
 
-/// The mix of four bytes. Deliberate: weights of 255 and a shift by 16 sample an opaque pattern as 253.
-uint32_t mixed(uint32_t nearNear, uint32_t farNear, uint32_t nearFar, uint32_t farFar, const Tap& x,
-               const Tap& y) {
-    const uint32_t upper = nearNear * x.nearWeight + farNear * x.farWeight;
-    const uint32_t lower = nearFar * x.nearWeight + farFar * x.farWeight;
-    return ((upper * y.nearWeight + lower * y.farWeight) >> 16) & 0xFFU;
-}
+/// The pattern as it lies under the box, row by row. What repeats is sampled once: the columns' taps for
+/// all rows, and of each row one tile.
+///
+/// A pixel is the sum of four pattern pixels times both their weights. The sum is exact, so its rows are
+/// mixed first, once for all columns.
+class TiledRows {
+  public:
+    TiledRows(const ColourView& pattern, float scale, float opacity, int64_t width)
+        : mPattern(pattern),
+          mColumns(pattern.width, scale),
+          mRows(pattern.height, scale),
+          mWidth(width),
+          mSampled(std::min(width, mColumns.period())),
+          mTaps(PixelBuffer<Tap>::uninitialised(mSampled)),
+          mMixed(PixelBuffer<uint16_t>::uninitialised(pattern.width, kColourBytes)),
+          mRow(PixelBuffer<uint32_t>::zeroed(width)) {
+        if (!*this) return;
+        for (int64_t x = 0; x < mSampled; ++x)
+            mTaps[static_cast<size_t>(x)] = mColumns.at(x);
+        for (int alpha = 0; alpha < 256; ++alpha) {
+            mAlphas[alpha] = static_cast<uint8_t>(toInt(static_cast<float>(alpha) * opacity));
+        }
+    }
 
-/// The pattern sampled between four pixels, its alpha times the opacity, premultiplied.
-uint32_t sample(const ColourView& pattern, const Tap& x, const Tap& y, float opacity) {
-    const unsigned char* const nearNear = pattern.at(x.near, y.near);
-    const unsigned char* const farNear = pattern.at(x.far, y.near);
-    const unsigned char* const nearFar = pattern.at(x.near, y.far);
-    const unsigned char* const farFar = pattern.at(x.far, y.far);
-    // Deliberate: pattern pixels stand in memory as A, R, G, B, unlike the destination's.
-    const auto channel = [&](int k) {
-        return mixed(nearNear[k], farNear[k], nearFar[k], farFar[k], x, y);
-    };
-    const auto alpha = static_cast<uint32_t>(toInt(static_cast<float>(channel(0)) * opacity));
-    return premultiply(alpha << 24 | channel(1) << 16 | channel(2) << 8 | channel(3));
-}
+    /// False when memory ran out.
+    explicit operator bool() const { return mTaps && mMixed && mRow; }
+
+    /// The pixels of row y, right wherever the coverage of the row is not 0.
+    const uint32_t* at(int64_t y, const uint8_t* coverage) {
+        const Tap rows = mRows.at(y);
+        fillKernels().mixRows(mPattern.at(0, rows.near), mPattern.at(0, rows.far), rows,
+                              usedColumns() * kColourBytes, mMixed.data());
+        if (mSampled < mWidth) {
+            sample(0, mSampled);
+            repeat();
+        } else {
+            sampleCovered(coverage);
+        }
+        return mRow.data();
+    }
+
+  private:
+    int64_t usedColumns() const {
+        // The taps ascend within a tile; the last pixel of the pattern mixes with its first.
+        return std::min(mPattern.width, int64_t{mTaps.data()[mSampled - 1].near} + 2);
+    }
+
+    void sample(int64_t first, int64_t count) {
+        fillKernels().sampleRow(mMixed.data(), mTaps.data() + first, count, mAlphas,
+                                mRow.data() + first);
+    }
+
+    /// Copies the tile to the rest of the row, twice as much each time.
+    void repeat() {
+        for (int64_t done = mSampled; done < mWidth; done *= 2) {
+            const int64_t count = std::min(done, mWidth - done);
+            std::memcpy(mRow.data() + done, mRow.data(), static_cast<size_t>(count) * sizeof(uint32_t));
+        }
+    }
+
+    void sampleCovered(const uint8_t* coverage) {
+        constexpr int64_t kBlock = 16;
+        for (int64_t x = 0; x < mWidth; x += kBlock) {
+            const int64_t count = std::min(kBlock, mWidth - x);
+            const auto covered = [](uint8_t c) { return c != 0; };
+            if (std::any_of(coverage + x, coverage + x + count, covered)) sample(x, count);
+        }
+    }
+
+    ColourView mPattern;
+    TileAxis mColumns;
+    TileAxis mRows;
+    int64_t mWidth;
+    int64_t mSampled;
+    PixelBuffer<Tap> mTaps;
+    PixelBuffer<uint16_t> mMixed;
+    PixelBuffer<uint32_t> mRow;
+    uint8_t mAlphas[256];
+};
 
 /// The covered box. Unlike the other cores' boxes, one larger than the mask is first cut to the mask's
 /// size; unless it starts at the left or top edge it still leaves the mask then, and nothing is drawn.
@@ -105,13 +160,15 @@ void VFPattern::doPostProcessing(ParamPostProcessing* params) {
     const ColourView pattern = ColourView::of(mProperty->mPattern);
     if (!pattern || pattern.width == 0 || pattern.height == 0) return;
 
-    const TileAxis columns(pattern.width, mProperty->mScale);
-    const TileAxis rows(pattern.height, mProperty->mScale);
-    const float opacity = clampOrLow(mProperty->mOpacity, 0.0F, 1.0F);
-    fillCovered(box, params->dstBitmap, [&](int64_t y) {
-        return [&, rowTap = rows.at(y)](int64_t x) {
-            return sample(pattern, columns.at(x), rowTap, opacity);
-        };
+    TiledRows rows(pattern, mProperty->mScale, clampOrLow(mProperty->mOpacity, 0.0F, 1.0F), box.width);
+    if (!rows) return;
+    fillCovered(box, params->dstBitmap, [&](const FillJob& job) {
+        for (int64_t y = 0; y < job.blend.height; ++y) {
+            BlendJob row = rowOf(job.blend, y);
+            const uint32_t* const pixels = rows.at(job.top + y, row.mask - job.left);
+            row.image = reinterpret_cast<const uint8_t*>(pixels + job.left);
+            blendKernels().dstOverWhereCovered(row);
+        }
     });
 }
 
