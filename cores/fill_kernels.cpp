@@ -104,11 +104,13 @@ void mixRows(const uint8_t* near, const uint8_t* far, const Tap& weights, int64_
 
 /// The four channels of one pixel.
 using Channels = uint32_t __attribute__((vector_size(16)));
-using MixedPixel = uint16_t __attribute__((vector_size(8)));
 using PixelBytes = uint8_t __attribute__((vector_size(4)));
 
 VOREL_INLINE Channels channelsAt(const uint16_t* mixed, uint32_t column) {
-    return __builtin_convertvector(load<MixedPixel>(mixed + 4 * size_t{column}), Channels);
+    using Eight = uint16_t __attribute__((vector_size(16)));
+    using Two = uint64_t __attribute__((vector_size(16)));
+    const auto four = as<Eight>(Two{load<uint64_t>(mixed + 4 * size_t{column}), 0});
+    return as<Channels>(__builtin_shufflevector(four, Eight{}, 0, 8, 1, 9, 2, 10, 3, 11));
 }
 
 // Deliberate: weights of 255 and a shift by 16 sample an opaque pattern as 253. Pattern pixels stand in
