@@ -256,6 +256,12 @@ VOREL_INLINE Bytes subSaturated(Bytes a, Bytes b) {
 VOREL_INLINE bool allZero(Bytes v) {
     return vmaxvq_u32(as<uint32x4_t>(v)) == 0;
 }
+VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
+    const auto x = as<uint16x8_t>(a);
+    const auto y = as<uint16x8_t>(b);
+    const uint32x4_t low = vmull_u16(vget_low_u16(x), vget_low_u16(y));
+    return as<Halves>(vuzp2q_u16(as<uint16x8_t>(low), as<uint16x8_t>(vmull_high_u16(x, y))));
+}
 VOREL_INLINE Integers toInt(Floats v) {
     return as<Integers>(vcvtq_s32_f32(as<float32x4_t>(v)));
 }

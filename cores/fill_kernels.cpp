@@ -95,37 +95,55 @@ void fillRamp(const FillJob& job, const Ramp& ramp) {
     }
 }
 
-void mixRows(const uint8_t* near, const uint8_t* far, const Tap& weights, int64_t bytes, MixedRow out) {
-    const auto nearWeight = static_cast<uint16_t>(weights.nearWeight);
-    const auto farWeight = static_cast<uint16_t>(weights.farWeight);
-    for (int64_t i = 0; i < bytes; ++i)
-        out[i] = static_cast<uint16_t>(near[i] * nearWeight + far[i] * farWeight);
+constexpr uint32_t kEvenBytes = 0x00FF00FFU;
+
+/// Two bytes of each word times the weight in both of its halves: 255 * 255 fits in 16 bits.
+VOREL_INLINE Halves weighted(Words bytes, Words weight) {
+    return as<Halves>(bytes) * as<Halves>(weight);
 }
 
-/// The four channels of one pixel.
-using Channels = uint32_t __attribute__((vector_size(16)));
-using PixelBytes = uint8_t __attribute__((vector_size(4)));
-
-VOREL_INLINE Channels channelsAt(const uint16_t* mixed, uint32_t column) {
-    using Eight = uint16_t __attribute__((vector_size(16)));
-    using Two = uint64_t __attribute__((vector_size(16)));
-    const auto four = as<Eight>(Two{load<uint64_t>(mixed + 4 * size_t{column}), 0});
-    return as<Channels>(__builtin_shufflevector(four, Eight{}, 0, 8, 1, 9, 2, 10, 3, 11));
+// Deliberate: pattern pixels stand in memory as A, R, G, B, unlike the destination's.
+void mixColumns(const uint32_t* patternRow, const ColumnTaps& taps, int64_t count, const MixedRow& out) {
+    const auto pixelsAt = [patternRow](const int32_t* columns) {
+        const Words argb = gathered(patternRow, load<Integers>(columns));
+        return argb >> 8 | argb << 24;
+    };
+    for (int64_t x = 0; x < count; x += kWords) {
+        const Words near = pixelsAt(taps.near + x);
+        const Words far = pixelsAt(taps.far + x);
+        const auto nearWeight = load<Words>(taps.nearWeights + x);
+        const auto farWeight = load<Words>(taps.farWeights + x);
+        store(out.redBlue + x,
+              weighted(near & kEvenBytes, nearWeight) + weighted(far & kEvenBytes, farWeight));
+        store(out.greenAlpha + x,
+              weighted(near >> 8 & kEvenBytes, nearWeight) + weighted(far >> 8 & kEvenBytes, farWeight));
+    }
 }
 
-// Deliberate: weights of 255 and a shift by 16 sample an opaque pattern as 253. Pattern pixels stand in
-// memory as A, R, G, B, unlike the destination's.
-void sampleRow(const uint16_t* mixed, const Tap* taps, int64_t count, const uint8_t* alphas,
-               uint32_t* out) {
-    for (int64_t i = 0; i < count; ++i) {
-        const Tap& tap = taps[i];
-        const Channels sum =
-            channelsAt(mixed, tap.near) * tap.nearWeight + channelsAt(mixed, tap.far) * tap.farWeight;
-        const Channels straight = sum >> 16;
-        const uint32_t alpha = alphas[straight[0]];
-        const Channels colours = product(straight, spread<Channels>(alpha));
-        const Channels ordered = {colours[1], colours[2], colours[3], alpha};
-        store(out + i, __builtin_convertvector(ordered, PixelBytes));
+/// (near * nearWeight + far * farWeight) >> 16: the upper halves of both products, and the carry of the
+/// lower ones.
+VOREL_INLINE Halves mixed(const uint32_t* near, const uint32_t* far, Halves nearWeight,
+                          Halves farWeight) {
+    const auto n = load<Halves>(near);
+    const auto f = load<Halves>(far);
+    const Halves low = n * nearWeight;
+    const Halves carry = as<Halves>(low + f * farWeight < low);
+    return multiplyHigh(n, nearWeight) + multiplyHigh(f, farWeight) - carry;
+}
+
+// Deliberate: weights of 255 and a shift by 16 sample an opaque pattern as 253.
+void mixRows(const MixedRow& near, const MixedRow& far, uint32_t nearWeight, uint32_t farWeight,
+             float opacity, int64_t count, uint32_t* out) {
+    const auto n = spread<Halves>(static_cast<uint16_t>(nearWeight));
+    const auto f = spread<Halves>(static_cast<uint16_t>(farWeight));
+    for (int64_t x = 0; x < count; x += kWords) {
+        const Halves redBlue = mixed(near.redBlue + x, far.redBlue + x, n, f);
+        const Halves greenAlpha = mixed(near.greenAlpha + x, far.greenAlpha + x, n, f);
+        const auto straightAlpha = as<Integers>(as<Words>(greenAlpha) >> 16);
+        const auto alpha = as<Words>(toInt(__builtin_convertvector(straightAlpha, Floats) * opacity));
+        const auto factor = as<Halves>(alpha | alpha << 16);
+        const auto green = as<Words>(product(greenAlpha, factor)) & 0xFFFFU;
+        store(out + x, as<Words>(product(redBlue, factor)) | green << 8 | alpha << 24);
     }
 }
 
@@ -134,8 +152,8 @@ void sampleRow(const uint16_t* mixed, const Tap* taps, int64_t count, const uint
 extern const FillKernels kFillKernels = {
     fillRamp<LinearRow, LinearRamp>,
     fillRamp<RadialRow, RadialRamp>,
+    mixColumns,
     mixRows,
-    sampleRow,
 };
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

@@ -35,30 +35,36 @@ struct RadialRamp {
     float centreY;
 };
 
-/// Two neighbouring pattern pixels on one axis and their weights, which add up to 255.
-struct Tap {
-    uint32_t near;
-    uint32_t far;
-    uint32_t nearWeight;
-    uint32_t farWeight;
+/// Rows of a pattern's kernels may be read and written this many pixels past their count.
+constexpr int64_t kRowSlack = 16;
+
+/// Where each column of a row is sampled: two neighbouring pattern pixels and their weights, which add
+/// up to 255. A weight stands in both halves of its word.
+struct ColumnTaps {
+    const int32_t* near;
+    const int32_t* far;
+    const uint32_t* nearWeights;
+    const uint32_t* farWeights;
 };
 
-/// One row of the pattern between two of its rows, before the shift: 4 channels a pixel, A, R, G, B,
-/// each up to 255 * 255.
-using MixedRow = uint16_t*;
+/// A row of the pattern mixed along its columns, before any shift: red and blue of each pixel in one
+/// plane of words, green and alpha in the other, 16 bits each, up to 255 * 255.
+struct MixedRow {
+    uint32_t* redBlue;
+    uint32_t* greenAlpha;
+};
 
 struct FillKernels {
     void (*linear)(const FillJob& job, const LinearRamp& ramp);
     void (*radial)(const FillJob& job, const RadialRamp& ramp);
 
-    /// near * nearWeight + far * farWeight for each of `bytes` bytes.
-    void (*mixRows)(const uint8_t* near, const uint8_t* far, const Tap& weights, int64_t bytes,
-                    MixedRow out);
+    /// Mixes `count` columns of a pattern row of words (memory order A, R, G, B).
+    void (*mixColumns)(const uint32_t* patternRow, const ColumnTaps& taps, int64_t count,
+                       const MixedRow& out);
 
-    /// The pixels (R, G, B, A, premultiplied) of `count` taps along a mixed row; `alphas` gives each
-    /// alpha its value at the pattern's opacity.
-    void (*sampleRow)(const uint16_t* mixed, const Tap* taps, int64_t count, const uint8_t* alphas,
-                      uint32_t* out);
+    /// `count` pixels (R, G, B, A, premultiplied) between two mixed rows, their alpha times `opacity`.
+    void (*mixRows)(const MixedRow& near, const MixedRow& far, uint32_t nearWeight, uint32_t farWeight,
+                    float opacity, int64_t count, uint32_t* out);
 };
 
 /// The kernels of the chosen level.

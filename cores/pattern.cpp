@@ -17,6 +17,14 @@ using namespace internal;
 
 namespace {
 
+/// Two neighbouring pattern pixels on one axis and their weights, which add up to 255.
+struct Tap {
+    int32_t near;
+    int32_t far;
+    uint32_t nearWeight;
+    uint32_t farWeight;
+};
+
 /// One axis of the tiling: from an output coordinate to the pattern pixels that it is mixed from.
 class TileAxis {
   public:
@@ -33,7 +41,7 @@ class TileAxis {
             static_cast<uint32_t>(std::clamp(toInt((position - whole) * 255.0F), 0, 255));
         const int64_t near = std::clamp<int64_t>(toInt(whole), 0, mPatternSize - 1);
         const int64_t far = near + 1 < mPatternSize ? near + 1 : 0;
-        return {static_cast<uint32_t>(near), static_cast<uint32_t>(far), 255 - farWeight, farWeight};
+        return {static_cast<int32_t>(near), static_cast<int32_t>(far), 255 - farWeight, farWeight};
     }
 
     /// Output pixels after which the taps repeat.
@@ -45,56 +53,92 @@ class TileAxis {
     int64_t mTileSize;
 };
 
-/// The pattern as it lies under the box, row by row. What repeats is sampled once: the columns' taps for
-/// all rows, and of each row one tile.
+/// The taps of the first columns of a box.
+class TapRow {
+  public:
+    TapRow(const TileAxis& columns, int64_t count)
+        : mWords(PixelBuffer<uint32_t>::zeroed(count + kRowSlack, 4)), mLength(count + kRowSlack) {
+        if (!mWords) return;
+        for (int64_t x = 0; x < count; ++x) {
+            const Tap tap = columns.at(x);
+            plane(0)[x] = static_cast<uint32_t>(tap.near);
+            plane(1)[x] = static_cast<uint32_t>(tap.far);
+            plane(2)[x] = tap.nearWeight * kBothHalves;
+            plane(3)[x] = tap.farWeight * kBothHalves;
+        }
+    }
+
+    explicit operator bool() const { return static_cast<bool>(mWords); }
+    ColumnTaps taps() {
+        return {reinterpret_cast<const int32_t*>(plane(0)), reinterpret_cast<const int32_t*>(plane(1)),
+                plane(2), plane(3)};
+    }
+
+  private:
+    static constexpr uint32_t kBothHalves = 0x00010001U;
+
+    uint32_t* plane(int64_t index) { return mWords.data() + index * mLength; }
+
+    PixelBuffer<uint32_t> mWords;
+    int64_t mLength;
+};
+
+/// The pattern as it lies under the box, row by row; of what repeats along a row, one tile is sampled.
 ///
-/// A pixel is the sum of four pattern pixels times both their weights. The sum is exact, so its rows are
-/// mixed first, once for all columns.
+/// A pixel is the sum of four pattern pixels times both their weights. No step of it is rounded, so it
+/// may be mixed along the columns first, once for each row of the pattern, and the output rows between
+/// two pattern rows share these.
 class TiledRows {
   public:
     TiledRows(const ColourView& pattern, float scale, float opacity, int64_t width)
         : mPattern(pattern),
-          mColumns(pattern.width, scale),
           mRows(pattern.height, scale),
+          mOpacity(opacity),
           mWidth(width),
-          mSampled(std::min(width, mColumns.period())),
-          mTaps(PixelBuffer<Tap>::uninitialised(mSampled)),
-          mMixed(PixelBuffer<uint16_t>::uninitialised(pattern.width, kColourBytes)),
-          mRow(PixelBuffer<uint32_t>::zeroed(width)) {
-        if (!*this) return;
-        for (int64_t x = 0; x < mSampled; ++x)
-            mTaps[static_cast<size_t>(x)] = mColumns.at(x);
-        for (int alpha = 0; alpha < 256; ++alpha) {
-            mAlphas[alpha] = static_cast<uint8_t>(toInt(static_cast<float>(alpha) * opacity));
-        }
-    }
+          mSampled(std::min(width, TileAxis(pattern.width, scale).period())),
+          mTaps(TileAxis(pattern.width, scale), mSampled),
+          mMixed{KeptRow(mSampled), KeptRow(mSampled)},
+          mRow(PixelBuffer<uint32_t>::uninitialised(width + kRowSlack)) {}
 
     /// False when memory ran out.
-    explicit operator bool() const { return mTaps && mMixed && mRow; }
+    explicit operator bool() const { return mTaps && mMixed[0].planes && mMixed[1].planes && mRow; }
 
-    /// The pixels of row y, right wherever the coverage of the row is not 0.
-    const uint32_t* at(int64_t y, const uint8_t* coverage) {
+    const uint32_t* at(int64_t y) {
         const Tap rows = mRows.at(y);
-        fillKernels().mixRows(mPattern.at(0, rows.near), mPattern.at(0, rows.far), rows,
-                              usedColumns() * kColourBytes, mMixed.data());
-        if (mSampled < mWidth) {
-            sample(0, mSampled);
-            repeat();
-        } else {
-            sampleCovered(coverage);
-        }
+        const MixedRow near = mixedRow(rows.near, rows.far);
+        const MixedRow far = mixedRow(rows.far, rows.near);
+        fillKernels().mixRows(near, far, rows.nearWeight, rows.farWeight, mOpacity, mSampled,
+                              mRow.data());
+        repeat();
         return mRow.data();
     }
 
   private:
-    int64_t usedColumns() const {
-        // The taps ascend within a tile; the last pixel of the pattern mixes with its first.
-        return std::min(mPattern.width, int64_t{mTaps.data()[mSampled - 1].near} + 2);
-    }
+    static constexpr int32_t kNoRow = -1;
 
-    void sample(int64_t first, int64_t count) {
-        fillKernels().sampleRow(mMixed.data(), mTaps.data() + first, count, mAlphas,
-                                mRow.data() + first);
+    /// A pattern row mixed along its columns.
+    struct KeptRow {
+        explicit KeptRow(int64_t width)
+            : planes(PixelBuffer<uint32_t>::uninitialised(width + kRowSlack, 2)),
+              length(width + kRowSlack) {}
+
+        MixedRow mixed() { return {planes.data(), planes.data() + length}; }
+
+        PixelBuffer<uint32_t> planes;
+        int64_t length;
+        int32_t row = kNoRow;
+    };
+
+    /// The mixed row of the pattern, in the place of whichever kept one is not `other`.
+    MixedRow mixedRow(int32_t row, int32_t other) {
+        for (KeptRow& kept : mMixed) {
+            if (kept.row == row) return kept.mixed();
+        }
+        KeptRow& replaced = mMixed[0].row == other ? mMixed[1] : mMixed[0];
+        replaced.row = row;
+        const auto* const words = reinterpret_cast<const uint32_t*>(mPattern.at(0, row));
+        fillKernels().mixColumns(words, mTaps.taps(), mSampled, replaced.mixed());
+        return replaced.mixed();
     }
 
     /// Copies the tile to the rest of the row, twice as much each time.
@@ -105,24 +149,14 @@ class TiledRows {
         }
     }
 
-    void sampleCovered(const uint8_t* coverage) {
-        constexpr int64_t kBlock = 16;
-        for (int64_t x = 0; x < mWidth; x += kBlock) {
-            const int64_t count = std::min(kBlock, mWidth - x);
-            const auto covered = [](uint8_t c) { return c != 0; };
-            if (std::any_of(coverage + x, coverage + x + count, covered)) sample(x, count);
-        }
-    }
-
     ColourView mPattern;
-    TileAxis mColumns;
     TileAxis mRows;
+    float mOpacity;
     int64_t mWidth;
     int64_t mSampled;
-    PixelBuffer<Tap> mTaps;
-    PixelBuffer<uint16_t> mMixed;
+    TapRow mTaps;
+    KeptRow mMixed[2];
     PixelBuffer<uint32_t> mRow;
-    uint8_t mAlphas[256];
 };
 
 /// The covered box. Unlike the other cores' boxes, one larger than the mask is first cut to the mask's
@@ -165,8 +199,7 @@ void VFPattern::doPostProcessing(ParamPostProcessing* params) {
     fillCovered(box, params->dstBitmap, [&](const FillJob& job) {
         for (int64_t y = 0; y < job.blend.height; ++y) {
             BlendJob row = rowOf(job.blend, y);
-            const uint32_t* const pixels = rows.at(job.top + y, row.mask - job.left);
-            row.image = reinterpret_cast<const uint8_t*>(pixels + job.left);
+            row.image = reinterpret_cast<const uint8_t*>(rows.at(job.top + y) + job.left);
             blendKernels().dstOverWhereCovered(row);
         }
     });
