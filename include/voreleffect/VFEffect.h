@@ -37,7 +37,7 @@ namespace VFontEffect {
 class VF_API VFEffect {
   public:
     VFEffect();
-    explicit VFEffect(void* ignored);
+    explicit VFEffect(void* ignored);  ///< the same; the argument is not looked at
 
     /// Copies the look (each effect with its id and a deep copy of its record, the text opacity and
     /// colour, the id counter), not the bitmaps of a run.
@@ -113,7 +113,7 @@ class VF_API VFEffect {
     /// Returns the id of the core that holds it, or -1 when there is no core of that type or memory ran
     /// out.
     int addEffect(int id, int type, VFProperty* property);
-    int addEffect(int type, VFProperty* property);
+    int addEffect(int type, VFProperty* property);  ///< addEffect(-1, type, property)
 
     /// Makes a core that is not in the list; the caller owns it. Null for a type without a core, or when
     /// memory ran out.
@@ -130,7 +130,7 @@ class VF_API VFEffect {
     bool hasEffects();                  ///< any core, or a text opacity below 1
 
     void setTextOpacity(float opacity);  ///< clamped to 0..1; below 1 selects layered mode
-    float getTextOpacity();
+    float getTextOpacity();              ///< 0 to 1; 1 at the start
     void clearTextOpacity();  ///< 1 again; unlike setTextOpacity keeps the paint order as it is
 
     /// The glyph mask of the run, 1 byte per pixel, or null; owned by the set.
@@ -155,11 +155,10 @@ class VF_API VFEffect {
 
     bool isUnderEffect(VFECore* core);  ///< painted beneath the text; false for null
 
-    /// Pixels that the effects need on each side of the glyphs: leave them in the layer.
-    int getLeftOffset();
-    int getRightOffset();
-    int getTopOffset();
-    int getBottomOffset();
+    int getLeftOffset();    ///< pixels that the effects need left of the glyphs: leave them in the layer
+    int getRightOffset();   ///< the same on the right
+    int getTopOffset();     ///< the same above
+    int getBottomOffset();  ///< the same below
 
     VFRect* getTextRect();  ///< box of the glyphs of the run; owned by the set
 
