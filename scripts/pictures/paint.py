@@ -105,6 +105,7 @@ SHADE = {"angle": 135, "distance": 5, "size": 6, "color": "#000000", "opacity": 
 RAMP = {"angle": 90, "gradient": DUSK}
 ROOMY = {"color": "#F2C14E", "stroke": STROKE["stroke"],
          "outerShadow": {"angle": 135, "distance": 16, "size": 8, "color": "#000000", "opacity": 0.6}}
+FADED = {"color": "#3366CC", "stroke": {"size": 3, "color": "#2B3A67", "position": "outside"}}
 FAR_SHADOW = {"angle": 135, "distance": 14, "size": 0, "color": "#C8321E"}
 WIDE_STROKE = {"size": 8, "color": "#2B3A67", "position": "outside"}
 
@@ -128,6 +129,14 @@ GUIDE = [
            Cell("addText(colour, 0.5)",
                 {"text": {"color": "#3366CC", "opacity": 0.5}, "outerShadow": OUTER_SHADOW["outerShadow"]})],
           text="Type", ground="checks", columns=2),
+    Strip("guide-opacity-inside",
+          [Cell("fill 0.5", with_value(FADED, "textOpacity", 0.5)),
+           Cell("fill 0.5\ngradient 1", {**with_value(FADED, "textOpacity", 0.5), "linearGradient": RAMP}),
+           Cell("fill 0.5\ngradient 0.5", with_value({**with_value(FADED, "textOpacity", 0.5),
+                                                     "linearGradient": RAMP}, "linearGradient.opacity", 0.5)),
+           Cell("fill 0\ngradient 0.5", with_value({**with_value(FADED, "textOpacity", 0),
+                                                   "linearGradient": RAMP}, "linearGradient.opacity", 0.5))],
+          ground="checks", columns=4),
     Strip("guide-order-inside",
           [Cell("gradient first, then inner shadow", {"linearGradient": RAMP, "innerShadow": SHADE}),
            Cell("inner shadow first, then gradient", {"innerShadow": SHADE, "linearGradient": RAMP})],
