@@ -6,7 +6,7 @@ set -euo pipefail
 cd "$(dirname "$0")/.."
 . scripts/packages.sh
 . scripts/quietly.sh
-need_packages cmake ninja-build g++ pkg-config binutils
+need_packages cmake ninja-build g++ pkg-config binutils python3
 
 source=$PWD
 build=$source/build/install
@@ -89,6 +89,12 @@ for kind in shared static; do
     for way in add_subdirectory FetchContent; do
         by_cmake $way $kind -DTAKE=$way -DVOREL_SOURCE="$source" -DBUILD_SHARED_LIBS="${shared[$kind]}"
     done
+
+    # Neither package manager is at hand: stand-ins run the port and the recipe.
+    quietly cmake -DPORT_DIR="$source/packaging/vcpkg/ports/voreleffect" -DOUT="$outside/vcpkg-$kind" \
+        -DVERSION="$version" -DSHARED="${shared[$kind]}" -P tests/install/vcpkg_stand_in.cmake
+    quietly python3 tests/install/conan_stand_in.py packaging/conan "$outside/conan-$kind" $kind
+    echo "vcpkg port and Conan recipe, $kind: stand-ins run them"
 done
 
 # Another major number is refused.
