@@ -10,6 +10,7 @@
 
 #include "colour.h"
 #include "error.h"
+#include "voreleffect/VFVersion.h"
 
 namespace vorelpaint {
 namespace {
@@ -122,7 +123,7 @@ void addOutputOptions(CLI::App& app, Options& options) {
         ->default_str(std::to_string(options.padding));
     app.add_flag("--print-key", options.printKey, "Print the look's cache key in hexadecimal");
     app.add_flag("--print-margins", options.printMargins, "Print the pixels that the effects need");
-    app.set_version_flag("--version", "vorelpaint " VOREL_VERSION);
+    app.set_version_flag("--version", "vorelpaint " VOREL_VERSION_STRING);
 }
 
 void checkCombination(const Options& options) {
