@@ -1,6 +1,7 @@
 #include <cstdint>
 
-#include "blend/rows.h"
+#include "blend/clip.h"
+#include "blend/kernels.h"
 #include "core/numeric.h"
 #include "core/views.h"
 #include "voreleffect/VFBlender.h"
@@ -11,35 +12,15 @@ using namespace internal;
 
 namespace {
 
-/// The packed mask of a copy: first pixel of destination row y within the clip.
-const unsigned char* maskRow(const unsigned char* mask, int maskWidth, int x, int y, const Clip& clip,
-                             int64_t row) {
-    return mask + (row - y) * maskWidth + (clip.left - x);
+/// A job that copies the clipped part of a packed mask placed at (x, y).
+BlendJob copyJob(const unsigned char* mask, int maskWidth, int x, int y, const Clip& clip) {
+    BlendJob job = {};
+    job.mask = mask + (clip.top - y) * int64_t{maskWidth} + (clip.left - x);
+    job.maskStride = maskWidth;
+    job.width = clip.width();
+    job.height = clip.height();
+    return job;
 }
-
-struct CoverageRow {
-    unsigned char* destination;
-    const unsigned char* mask;
-
-    template <class L>
-    void paint(int64_t i) const {
-        storeBytes(destination + i,
-                   LargerCoverage::apply(loadBytes<L>(destination + i), loadBytes<L>(mask + i)));
-    }
-};
-
-struct SolidRow {
-    unsigned char* destination;
-    const unsigned char* mask;
-    uint32_t color;
-
-    template <class L>
-    void paint(int64_t i) const {
-        Pixel<L> pixel = spreadColour<L>(color);
-        pixel.alpha = product(pixel.alpha, loadBytes<L>(mask + i));
-        storePixel(destination + i * kColourBytes, pixel);
-    }
-};
 
 }  // namespace
 
@@ -67,9 +48,11 @@ void VFBlender::drawBitmap8To8(int x, int y, const VFBitmap* dst, unsigned char*
     const MaskView target = MaskView::of(dst);
     if (!target || mask == nullptr) return;
     const Clip clip = clipPlacement(x, y, maskWidth, maskHeight, target.width, target.height);
-    paintRows(clip, [&](int64_t row) {
-        return CoverageRow{target.at(clip.left, row), maskRow(mask, maskWidth, x, y, clip, row)};
-    });
+    if (clip.empty()) return;
+    BlendJob job = copyJob(mask, maskWidth, x, y, clip);
+    job.destination = target.at(clip.left, clip.top);
+    job.destinationStride = target.width;
+    blendKernels().largerCoverage(job);
 }
 
 void VFBlender::drawBitmap8To32(int x, int y, const VFBitmap* dst, unsigned char* mask, int maskWidth,
@@ -77,12 +60,14 @@ void VFBlender::drawBitmap8To32(int x, int y, const VFBitmap* dst, unsigned char
     const ColourView target = ColourView::of(dst);
     if (!target || mask == nullptr) return;
     const Clip clip = clipPlacement(x, y, maskWidth, maskHeight, target.width, target.height);
-    paintRows(clip, [&](int64_t row) {
-        // Deliberate: the run starts at a pixel count taken as bytes, so it lies in the first quarter
-        // of the image and rows overlap; its 4-byte steps end at most at width * (height + 3) bytes.
-        unsigned char* const runStart = target.data + target.width * row + clip.left;
-        return SolidRow{runStart, maskRow(mask, maskWidth, x, y, clip, row), color};
-    });
+    if (clip.empty()) return;
+    BlendJob job = copyJob(mask, maskWidth, x, y, clip);
+    // Deliberate: the run starts at a pixel count taken as bytes, so it lies in the first quarter of the
+    // image and rows overlap; its 4-byte steps end at most at width * (height + 3) bytes.
+    job.destination = target.data + target.width * clip.top + clip.left;
+    job.destinationStride = target.width;
+    job.color = color;
+    blendKernels().solidColour(job);
 }
 
 }  // namespace VFontEffect

@@ -1,149 +1,277 @@
 #pragma once
 
-#include <cstddef>
 #include <cstdint>
 #include <cstring>
 
-/// Lanes: unsigned 16-bit values that a per-pixel rule computes with, one value or a vector of them.
-/// A rule written once over a lane type runs on one pixel (Lane<uint16_t>) and on eight.
-///
-/// The two forms agree as long as no intermediate leaves 0..65535. Branches are `select`s over masks
-/// of all ones or all zeros. Loads and stores take the machine's bytes as little-endian.
-namespace VFontEffect::internal {
+#include "core/inline.h"
+#include "core/numeric.h"
+
+#if !defined(VOREL_SCALAR) && defined(__x86_64__)
+#include <immintrin.h>
+#elif !defined(VOREL_SCALAR) && defined(__aarch64__)
+#include <arm_neon.h>
+#endif
+
+/// Lanes: vectors as wide as the registers of the level that a source of inner loops is compiled for,
+/// in that level's namespace. Arithmetic, comparisons and choices (`mask ? a : b`) are those of the
+/// compilers' vector types, which both g++ and clang turn into single instructions; here is what these
+/// do not express. The scalar level's vector is one 32-bit word, in plain C++ for any CPU.
+namespace VFontEffect::internal::VOREL_LEVEL {
 
 static_assert(__BYTE_ORDER__ == __ORDER_LITTLE_ENDIAN__, "pixels are loaded as little-endian words");
 
-using U16x8 = uint16_t __attribute__((vector_size(16)));
-using U8x8 = uint8_t __attribute__((vector_size(8)));
+#if defined(VOREL_SCALAR)
+constexpr int kBytes = 4;
+#elif defined(__AVX512BW__)
+constexpr int kBytes = 64;
+#elif defined(__AVX2__)
+constexpr int kBytes = 32;
+#else
+constexpr int kBytes = 16;
+#endif
+constexpr int kWords = kBytes / 4;
+
+using Bytes = uint8_t __attribute__((vector_size(kBytes)));
+using Halves = uint16_t __attribute__((vector_size(kBytes)));
+using Words = uint32_t __attribute__((vector_size(kBytes)));
+using Integers = int32_t __attribute__((vector_size(kBytes)));
+using Floats = float __attribute__((vector_size(kBytes)));
+
+/// One vector's bits as another type of lanes.
+template <class To, class From>
+VOREL_INLINE To as(From vector) {
+    return reinterpret_cast<To>(vector);
+}
+
+/// Vectors in memory, at any address.
+template <class V>
+VOREL_INLINE V load(const void* from) {
+    V vector;
+    std::memcpy(&vector, from, sizeof vector);
+    return vector;
+}
+template <class V>
+VOREL_INLINE void store(void* to, V vector) {
+    std::memcpy(to, &vector, sizeof vector);
+}
+
+/// `value` in every lane.
+template <class V, class T>
+VOREL_INLINE V spread(T value) {
+    return V{} + value;
+}
 
 template <class V>
-struct Lane {
-    V v;
-
-    explicit Lane(V value) : v(value) {}
-    explicit Lane(int value) : v(static_cast<V>(V{} + static_cast<uint16_t>(value))) {}
-
-    friend Lane operator+(Lane a, Lane b) { return Lane(static_cast<V>(a.v + b.v)); }
-    friend Lane operator-(Lane a, Lane b) { return Lane(static_cast<V>(a.v - b.v)); }
-    friend Lane operator*(Lane a, Lane b) { return Lane(static_cast<V>(a.v * b.v)); }
-    friend Lane operator&(Lane a, Lane b) { return Lane(static_cast<V>(a.v & b.v)); }
-    friend Lane operator|(Lane a, Lane b) { return Lane(static_cast<V>(a.v | b.v)); }
-    friend Lane operator>>(Lane a, int bits) { return Lane(static_cast<V>(a.v >> bits)); }
-    friend Lane operator<<(Lane a, int bits) { return Lane(static_cast<V>(a.v << bits)); }
-};
-
-using OneLane = Lane<uint16_t>;
-using EightLanes = Lane<U16x8>;
-
-template <class L>
-constexpr size_t kPixels = sizeof(L) / sizeof(uint16_t);
-
-/// All ones where a == b, else zeros.
-inline OneLane equal(OneLane a, OneLane b) {
-    return OneLane(static_cast<uint16_t>(a.v == b.v ? 0xFFFF : 0));
+VOREL_INLINE V larger(V a, V b) {
+    return a > b ? a : b;
 }
-inline EightLanes equal(EightLanes a, EightLanes b) {
-    return EightLanes(reinterpret_cast<U16x8>(a.v == b.v));
+template <class V>
+VOREL_INLINE V smaller(V a, V b) {
+    return a < b ? a : b;
 }
 
-/// All ones where a < b, else zeros.
-inline OneLane less(OneLane a, OneLane b) {
-    return OneLane(static_cast<uint16_t>(a.v < b.v ? 0xFFFF : 0));
+// Each level's own instructions:
+//   addSaturated   a + b, at most 255
+//   subSaturated   a - b, at least 0
+//   multiplyHigh   the upper 16 bits of 32-bit products
+//   allZero        whether no lane holds anything but 0
+//   loadInPairs    kWords bytes of memory, each in both halves of its word (not on NEON)
+//   highBytesInPairs   of each word its highest byte, in both halves of the word (not on NEON)
+//   endsSwapped    bytes 0 1 2 3 of each word as 2 1 0 3 (not on NEON)
+//   toInt          as core/numeric.h converts: toward zero, saturating, NaN to 0
+//   squareRoot     correctly rounded
+//   gathered       the words of a table at the given indices
+
+#if !defined(VOREL_SCALAR) && defined(__x86_64__)
+/// x86 converts what does not fit to the lowest integer: made the highest above the range, 0 for NaN.
+VOREL_INLINE Integers saturated(Floats value, Integers converted) {
+    return (converted ^ (value >= 2147483648.0F)) & (value == value);
 }
-inline EightLanes less(EightLanes a, EightLanes b) {
-    return EightLanes(reinterpret_cast<U16x8>(a.v < b.v));
+#endif
+
+#if defined(VOREL_SCALAR)
+
+VOREL_INLINE Bytes addSaturated(Bytes a, Bytes b) {
+    const Bytes sum = a + b;
+    return sum | as<Bytes>(sum < a);
+}
+VOREL_INLINE Bytes subSaturated(Bytes a, Bytes b) {
+    return (a - b) & as<Bytes>(a > b);
+}
+VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
+    const auto high = [](uint32_t x, uint32_t y) { return static_cast<uint16_t>((x * y) >> 16); };
+    return Halves{high(a[0], b[0]), high(a[1], b[1])};
+}
+VOREL_INLINE bool allZero(Bytes v) {
+    return as<Words>(v)[0] == 0;
+}
+VOREL_INLINE Halves loadInPairs(const uint8_t* from) {
+    return as<Halves>(Words{*from * 0x10001U});
+}
+VOREL_INLINE Halves highBytesInPairs(Bytes v) {
+    return as<Halves>((as<Words>(v) >> 24) * 0x10001U);
+}
+VOREL_INLINE Bytes endsSwapped(Bytes v) {
+    return Bytes{v[2], v[1], v[0], v[3]};
+}
+VOREL_INLINE Integers toInt(Floats v) {
+    return Integers{internal::toInt(v[0])};
+}
+VOREL_INLINE Floats squareRoot(Floats v) {
+    return Floats{__builtin_sqrtf(v[0])};
+}
+VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
+    return Words{table[indices[0]]};
 }
 
-/// `a` where the mask is all ones, `b` where it is zeros.
-template <class L>
-L select(L mask, L a, L b) {
-    return b - (mask & (b - a));
+#elif defined(__AVX512BW__)
+
+VOREL_INLINE Bytes addSaturated(Bytes a, Bytes b) {
+    return as<Bytes>(_mm512_adds_epu8(as<__m512i>(a), as<__m512i>(b)));
+}
+VOREL_INLINE Bytes subSaturated(Bytes a, Bytes b) {
+    return as<Bytes>(_mm512_subs_epu8(as<__m512i>(a), as<__m512i>(b)));
+}
+VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
+    return as<Halves>(_mm512_mulhi_epu16(as<__m512i>(a), as<__m512i>(b)));
+}
+VOREL_INLINE bool allZero(Bytes v) {
+    return _mm512_test_epi32_mask(as<__m512i>(v), as<__m512i>(v)) == 0;
+}
+/// Moves bytes within each 128 bits; an index of -1 gives 0.
+VOREL_INLINE Bytes shuffled(Bytes v, __m128i indices) {
+    return as<Bytes>(_mm512_shuffle_epi8(as<__m512i>(v), _mm512_broadcast_i32x4(indices)));
+}
+VOREL_INLINE Halves loadInPairs(const uint8_t* from) {
+    const __m512i words = _mm512_cvtepu8_epi32(_mm_loadu_si128(reinterpret_cast<const __m128i*>(from)));
+    return as<Halves>(shuffled(as<Bytes>(words),
+                               _mm_setr_epi8(0, -1, 0, -1, 4, -1, 4, -1, 8, -1, 8, -1, 12, -1, 12, -1)));
+}
+VOREL_INLINE Halves highBytesInPairs(Bytes v) {
+    return as<Halves>(
+        shuffled(v, _mm_setr_epi8(3, -1, 3, -1, 7, -1, 7, -1, 11, -1, 11, -1, 15, -1, 15, -1)));
+}
+VOREL_INLINE Bytes endsSwapped(Bytes v) {
+    return shuffled(v, _mm_setr_epi8(2, 1, 0, 3, 6, 5, 4, 7, 10, 9, 8, 11, 14, 13, 12, 15));
+}
+VOREL_INLINE Integers toInt(Floats v) {
+    return saturated(v, as<Integers>(_mm512_cvttps_epi32(as<__m512>(v))));
+}
+VOREL_INLINE Floats squareRoot(Floats v) {
+    return as<Floats>(_mm512_sqrt_ps(as<__m512>(v)));
+}
+VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
+    return as<Words>(_mm512_i32gather_epi32(as<__m512i>(indices), table, 4));
 }
 
-template <class L>
-L smaller(L a, L b) {
-    return select(less(a, b), a, b);
+#elif defined(__AVX2__)
+
+VOREL_INLINE Bytes addSaturated(Bytes a, Bytes b) {
+    return as<Bytes>(_mm256_adds_epu8(as<__m256i>(a), as<__m256i>(b)));
+}
+VOREL_INLINE Bytes subSaturated(Bytes a, Bytes b) {
+    return as<Bytes>(_mm256_subs_epu8(as<__m256i>(a), as<__m256i>(b)));
+}
+VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
+    return as<Halves>(_mm256_mulhi_epu16(as<__m256i>(a), as<__m256i>(b)));
+}
+VOREL_INLINE bool allZero(Bytes v) {
+    return _mm256_testz_si256(as<__m256i>(v), as<__m256i>(v)) != 0;
+}
+/// Moves bytes within each 128 bits; an index of -1 gives 0.
+VOREL_INLINE Bytes shuffled(Bytes v, __m128i indices) {
+    return as<Bytes>(_mm256_shuffle_epi8(as<__m256i>(v), _mm256_broadcastsi128_si256(indices)));
+}
+VOREL_INLINE Halves loadInPairs(const uint8_t* from) {
+    const __m256i words = _mm256_cvtepu8_epi32(_mm_loadl_epi64(reinterpret_cast<const __m128i*>(from)));
+    return as<Halves>(shuffled(as<Bytes>(words),
+                               _mm_setr_epi8(0, -1, 0, -1, 4, -1, 4, -1, 8, -1, 8, -1, 12, -1, 12, -1)));
+}
+VOREL_INLINE Halves highBytesInPairs(Bytes v) {
+    return as<Halves>(
+        shuffled(v, _mm_setr_epi8(3, -1, 3, -1, 7, -1, 7, -1, 11, -1, 11, -1, 15, -1, 15, -1)));
+}
+VOREL_INLINE Bytes endsSwapped(Bytes v) {
+    return shuffled(v, _mm_setr_epi8(2, 1, 0, 3, 6, 5, 4, 7, 10, 9, 8, 11, 14, 13, 12, 15));
+}
+VOREL_INLINE Integers toInt(Floats v) {
+    return saturated(v, as<Integers>(_mm256_cvttps_epi32(as<__m256>(v))));
+}
+VOREL_INLINE Floats squareRoot(Floats v) {
+    return as<Floats>(_mm256_sqrt_ps(as<__m256>(v)));
+}
+VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
+    return as<Words>(
+        _mm256_i32gather_epi32(reinterpret_cast<const int*>(table), as<__m256i>(indices), 4));
 }
 
-template <class L>
-L larger(L a, L b) {
-    return select(less(a, b), b, a);
+#elif defined(__x86_64__)
+
+VOREL_INLINE Bytes addSaturated(Bytes a, Bytes b) {
+    return as<Bytes>(_mm_adds_epu8(as<__m128i>(a), as<__m128i>(b)));
+}
+VOREL_INLINE Bytes subSaturated(Bytes a, Bytes b) {
+    return as<Bytes>(_mm_subs_epu8(as<__m128i>(a), as<__m128i>(b)));
+}
+VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
+    return as<Halves>(_mm_mulhi_epu16(as<__m128i>(a), as<__m128i>(b)));
+}
+VOREL_INLINE bool allZero(Bytes v) {
+    return _mm_movemask_epi8(_mm_cmpeq_epi8(as<__m128i>(v), _mm_setzero_si128())) == 0xFFFF;
+}
+VOREL_INLINE Halves loadInPairs(const uint8_t* from) {
+    const __m128i halves = _mm_unpacklo_epi8(_mm_cvtsi32_si128(load<int>(from)), _mm_setzero_si128());
+    return as<Halves>(_mm_unpacklo_epi16(halves, halves));
+}
+/// Moves the halves of each word: both take the one that `selector` names for them.
+template <int kSelector>
+VOREL_INLINE Halves halvesMoved(Halves v) {
+    return as<Halves>(_mm_shufflehi_epi16(_mm_shufflelo_epi16(as<__m128i>(v), kSelector), kSelector));
+}
+VOREL_INLINE Halves highBytesInPairs(Bytes v) {
+    return halvesMoved<_MM_SHUFFLE(3, 3, 1, 1)>(as<Halves>(v) >> 8);
+}
+VOREL_INLINE Bytes endsSwapped(Bytes v) {
+    const Halves ends = as<Halves>(v) & 0x00FF;
+    return v ^ as<Bytes>(ends) ^ as<Bytes>(halvesMoved<_MM_SHUFFLE(2, 3, 0, 1)>(ends));
+}
+VOREL_INLINE Integers toInt(Floats v) {
+    return saturated(v, as<Integers>(_mm_cvttps_epi32(as<__m128>(v))));
+}
+VOREL_INLINE Floats squareRoot(Floats v) {
+    return as<Floats>(_mm_sqrt_ps(as<__m128>(v)));
+}
+VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
+    return Words{table[indices[0]], table[indices[1]], table[indices[2]], table[indices[3]]};
 }
 
-/// Pixels of 8 bits.
-inline OneLane loadBytes(const unsigned char* from, OneLane*) {
-    return OneLane(static_cast<uint16_t>(*from));
+#else
+
+VOREL_INLINE Bytes addSaturated(Bytes a, Bytes b) {
+    return as<Bytes>(vqaddq_u8(as<uint8x16_t>(a), as<uint8x16_t>(b)));
 }
-inline EightLanes loadBytes(const unsigned char* from, EightLanes*) {
-    U8x8 bytes;
-    std::memcpy(&bytes, from, sizeof bytes);
-    return EightLanes(__builtin_convertvector(bytes, U16x8));
+VOREL_INLINE Bytes subSaturated(Bytes a, Bytes b) {
+    return as<Bytes>(vqsubq_u8(as<uint8x16_t>(a), as<uint8x16_t>(b)));
 }
-template <class L>
-L loadBytes(const unsigned char* from) {
-    return loadBytes(from, static_cast<L*>(nullptr));
+VOREL_INLINE bool allZero(Bytes v) {
+    return vmaxvq_u32(as<uint32x4_t>(v)) == 0;
+}
+VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
+    const auto x = as<uint16x8_t>(a);
+    const auto y = as<uint16x8_t>(b);
+    const uint32x4_t low = vmull_u16(vget_low_u16(x), vget_low_u16(y));
+    return as<Halves>(vuzp2q_u16(as<uint16x8_t>(low), as<uint16x8_t>(vmull_high_u16(x, y))));
+}
+VOREL_INLINE Integers toInt(Floats v) {
+    return as<Integers>(vcvtq_s32_f32(as<float32x4_t>(v)));
+}
+VOREL_INLINE Floats squareRoot(Floats v) {
+    return as<Floats>(vsqrtq_f32(as<float32x4_t>(v)));
+}
+VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
+    return Words{table[indices[0]], table[indices[1]], table[indices[2]], table[indices[3]]};
 }
 
-inline void storeBytes(unsigned char* to, OneLane value) {
-    *to = static_cast<unsigned char>(value.v);
-}
-inline void storeBytes(unsigned char* to, EightLanes value) {
-    const U8x8 bytes = __builtin_convertvector(value.v, U8x8);
-    std::memcpy(to, &bytes, sizeof bytes);
-}
+#endif
 
-/// The two 16-bit halves of each 32-bit pixel: bytes 0 and 1, and bytes 2 and 3.
-template <class L>
-struct Halves {
-    L low;
-    L high;
-};
-
-inline Halves<OneLane> loadHalves(const unsigned char* from, OneLane*) {
-    uint16_t halves[2];
-    std::memcpy(halves, from, sizeof halves);
-    return {OneLane(halves[0]), OneLane(halves[1])};
-}
-inline Halves<EightLanes> loadHalves(const unsigned char* from, EightLanes*) {
-    U16x8 first;
-    U16x8 second;
-    std::memcpy(&first, from, sizeof first);
-    std::memcpy(&second, from + sizeof first, sizeof second);
-    return {EightLanes(__builtin_shufflevector(first, second, 0, 2, 4, 6, 8, 10, 12, 14)),
-            EightLanes(__builtin_shufflevector(first, second, 1, 3, 5, 7, 9, 11, 13, 15))};
-}
-
-inline void storeHalves(unsigned char* to, Halves<OneLane> halves) {
-    const uint16_t both[2] = {halves.low.v, halves.high.v};
-    std::memcpy(to, both, sizeof both);
-}
-inline void storeHalves(unsigned char* to, Halves<EightLanes> halves) {
-    const U16x8 first = __builtin_shufflevector(halves.low.v, halves.high.v, 0, 8, 1, 9, 2, 10, 3, 11);
-    const U16x8 second =
-        __builtin_shufflevector(halves.low.v, halves.high.v, 4, 12, 5, 13, 6, 14, 7, 15);
-    std::memcpy(to, &first, sizeof first);
-    std::memcpy(to + sizeof first, &second, sizeof second);
-}
-
-/// The four bytes of each 32-bit pixel, in memory order.
-template <class L>
-struct Quad {
-    L byte0;
-    L byte1;
-    L byte2;
-    L byte3;
-};
-
-template <class L>
-Quad<L> loadQuad(const unsigned char* from) {
-    const Halves<L> halves = loadHalves(from, static_cast<L*>(nullptr));
-    const L lowByte(0xFF);
-    return {halves.low & lowByte, halves.low >> 8, halves.high & lowByte, halves.high >> 8};
-}
-
-template <class L>
-void storeQuad(unsigned char* to, const Quad<L>& quad) {
-    storeHalves(to, {quad.byte0 | quad.byte1 << 8, quad.byte2 | quad.byte3 << 8});
-}
-
-}  // namespace VFontEffect::internal
+}  // namespace VFontEffect::internal::VOREL_LEVEL

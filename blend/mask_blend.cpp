@@ -1,6 +1,7 @@
 #include <cstdint>
 
-#include "blend/rows.h"
+#include "blend/job.h"
+#include "blend/kernels.h"
 #include "core/blend_modes.h"
 #include "core/views.h"
 #include "voreleffect/VFBlender.h"
@@ -11,30 +12,17 @@ using namespace internal;
 
 namespace {
 
-template <class Rule>
-struct MaskBlendRow {
-    unsigned char* destination;
-    const unsigned char* mask;
-    uint32_t color;
-
-    template <class L>
-    void paint(int64_t i) const {
-        unsigned char* const pixel = destination + i * kColourBytes;
-        storePixel(pixel,
-                   Rule::apply(loadPixel<L>(pixel), loadBytes<L>(mask + i), spreadColour<L>(color)));
-    }
-};
-
-template <class Rule>
-void blendMask(int x, int y, const VFBitmap* dst, const unsigned char* mask, int width, int height,
-               int maskStride, uint32_t color) {
+void blendMask(BlendKernel kernel, int x, int y, const VFBitmap* dst, const unsigned char* mask,
+               int width, int height, int maskStride, uint32_t color) {
     const ColourView target = ColourView::of(dst);
     if (!target || mask == nullptr || maskStride < 0) return;
     const Clip clip = clipPlacement(x, y, width, height, target.width, target.height);
-    paintRows(clip, [&](int64_t row) {
-        return MaskBlendRow<Rule>{target.at(clip.left, row),
-                                  mask + (row - y) * maskStride + (clip.left - x), color};
-    });
+    if (clip.empty()) return;
+    BlendJob job = jobOn(target, clip);
+    job.mask = mask + (clip.top - y) * maskStride + (clip.left - x);
+    job.maskStride = maskStride;
+    job.color = color;
+    kernel(job);
 }
 
 }  // namespace
@@ -57,22 +45,22 @@ void VFBlender::drawBitmapBlend8(int x, int y, const VFBitmap* dst, unsigned cha
 
 void VFBlender::blendSrcOver8To32(int x, int y, const VFBitmap* dst, unsigned char* mask, int width,
                                   int height, int maskStride, unsigned int color) {
-    blendMask<SrcOverMask>(x, y, dst, mask, width, height, maskStride, color);
+    blendMask(blendKernels().srcOverMask, x, y, dst, mask, width, height, maskStride, color);
 }
 
 void VFBlender::blendDstOver8To32(int x, int y, const VFBitmap* dst, unsigned char* mask, int width,
                                   int height, int maskStride, unsigned int color) {
-    blendMask<DstOverMask>(x, y, dst, mask, width, height, maskStride, color);
+    blendMask(blendKernels().dstOverMask, x, y, dst, mask, width, height, maskStride, color);
 }
 
 void VFBlender::blendDstOver8To32NSA(int x, int y, const VFBitmap* dst, unsigned char* mask, int width,
                                      int height, int maskStride, unsigned int color) {
-    blendMask<DstOverGate>(x, y, dst, mask, width, height, maskStride, color);
+    blendMask(blendKernels().dstOverGate, x, y, dst, mask, width, height, maskStride, color);
 }
 
 void VFBlender::blendDstOverSA8To32(int x, int y, const VFBitmap* dst, unsigned char* mask, int width,
                                     int height, int maskStride, unsigned int color) {
-    blendMask<DstOverClip>(x, y, dst, mask, width, height, maskStride, color);
+    blendMask(blendKernels().dstOverClip, x, y, dst, mask, width, height, maskStride, color);
 }
 
 }  // namespace VFontEffect

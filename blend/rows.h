@@ -1,68 +1,110 @@
 #pragma once
 
-#include <algorithm>
 #include <cstdint>
+#include <cstring>
 
-#include "blend/lanes.h"
+#include "blend/kernels.h"
 #include "blend/rules.h"
-#include "core/views.h"
 
-/// The row driver of all kernels: clipping, the loop over rows and pixels, and the tail.
-namespace VFontEffect::internal {
+/// The row driver of all blending kernels: the loop over rows and pixels, empty stretches, and the tail.
+///
+/// A painter gives the pixels that belong at a place of a row: `paint(place)`. It also tells what an
+/// empty stretch (`isEmpty(place)`, kBytes pixels long) leaves there, if it can tell at all.
+namespace VFontEffect::internal::VOREL_LEVEL {
 
-/// The part of a placed source that falls on the destination, half-open, in destination coordinates.
-struct Clip {
-    int64_t left;
-    int64_t top;
-    int64_t right;
-    int64_t bottom;
-
-    bool empty() const { return left >= right || top >= bottom; }
+/// The planes of one row; those that a kernel does not read may be null.
+struct Row {
+    uint8_t* destinationStart;
+    const uint8_t* imageStart;
+    const uint8_t* maskStart;
 };
 
-inline Clip clipPlacement(int x, int y, int64_t width, int64_t height, int64_t targetWidth,
-                          int64_t targetHeight) {
-    return {std::max<int64_t>(x, 0), std::max<int64_t>(y, 0), std::min(x + width, targetWidth),
-            std::min(y + height, targetHeight)};
+/// A pixel of a row.
+struct Place {
+    Row row;
+    int64_t x;
+
+    VOREL_INLINE uint8_t* destination() const { return row.destinationStart + 4 * x; }
+    VOREL_INLINE const uint8_t* image() const { return row.imageStart + 4 * x; }
+    VOREL_INLINE const uint8_t* mask() const { return row.maskStart + x; }
+};
+
+/// Whether the mask is 0 for kBytes pixels.
+VOREL_INLINE bool hasEmptyMask(const Place& place) {
+    return allZero(load<Bytes>(place.mask()));
 }
 
-/// Paints `count` pixels: eight at a time, the rest one by one. `Row::paint<L>(i)` paints the pixels
-/// from number i on.
-template <class Row>
-void paintRow(const Row& row, int64_t count) {
-    constexpr auto kStep = static_cast<int64_t>(kPixels<EightLanes>);
-    int64_t i = 0;
-    for (; i + kStep <= count; i += kStep)
-        row.template paint<EightLanes>(i);
-    for (; i < count; ++i)
-        row.template paint<OneLane>(i);
+/// Paints a whole stretch of kBytes pixels that is empty.
+VOREL_INLINE void paintEmpty(Empty what, const Place& place) {
+    if (what == Empty::clears) std::memset(place.destination(), 0, 4 * kBytes);
+    if (what == Empty::copiesImage) std::memcpy(place.destination(), place.image(), 4 * kBytes);
 }
 
-/// Paints the rows of a clip from top to bottom; `makeRow(y)` gives the row at destination row y.
-template <class MakeRow>
-void paintRows(const Clip& clip, MakeRow makeRow) {
-    if (clip.empty()) return;
-    for (int64_t y = clip.top; y < clip.bottom; ++y)
-        paintRow(makeRow(y), clip.right - clip.left);
+/// A row narrower than a vector goes through copies of a vector's length.
+template <class Painter>
+VOREL_INLINE void paintShortRow(const Painter& painter, const Row& row, int64_t count) {
+    uint8_t destination[4 * kPixels] = {};
+    uint8_t image[4 * kPixels] = {};
+    uint8_t mask[kPixels] = {};
+    const auto pixels = static_cast<size_t>(count);
+    std::memcpy(destination, row.destinationStart, 4 * pixels);
+    if (Painter::kReadsImage) std::memcpy(image, row.imageStart, 4 * pixels);
+    if (Painter::kReadsMask) std::memcpy(mask, row.maskStart, pixels);
+    storePixels(destination, painter.paint({{destination, image, mask}, 0}));
+    std::memcpy(row.destinationStart, destination, 4 * pixels);
 }
 
-/// A colour pixel in memory: R, G, B, A.
-template <class L>
-Pixel<L> loadPixel(const unsigned char* from) {
-    const Quad<L> quad = loadQuad<L>(from);
-    return {quad.byte0, quad.byte1, quad.byte2, quad.byte3};
+/// Pixels from `destination` to the next address where a vector lies within one line of the cache.
+VOREL_INLINE int64_t pixelsToAlignment(const uint8_t* destination) {
+    return static_cast<int64_t>((0 - reinterpret_cast<uintptr_t>(destination)) / 4 % kPixels);
 }
 
-template <class L>
-void storePixel(unsigned char* to, const Pixel<L>& pixel) {
-    storeQuad<L>(to, {pixel.red, pixel.green, pixel.blue, pixel.alpha});
+/// Paints pixels x to `end`, in whole vectors.
+template <class Painter>
+VOREL_INLINE void paintVectors(const Painter& painter, const Row& row, int64_t x, int64_t end) {
+    for (; x < end; x += kPixels) {
+        const Place place = {row, x};
+        storePixels(place.destination(), painter.paint(place));
+    }
 }
 
-/// A colour word 0xAARRGGBB in every lane.
-template <class L>
-Pixel<L> spreadColour(uint32_t color) {
-    const auto channel = [color](int shift) { return L(static_cast<int>((color >> shift) & 0xFFU)); };
-    return {channel(16), channel(8), channel(0), channel(24)};
+/// Paints from `x` on, in whole vectors, as far as `end`, and leaves empty stretches early.
+template <class Painter>
+VOREL_INLINE void paintStretches(const Painter& painter, const Row& row, int64_t x, int64_t end) {
+    for (; end - x >= kBytes; x += kBytes) {
+        if (painter.isEmpty({row, x})) {
+            paintEmpty(Painter::kEmpty, {row, x});
+        } else {
+            paintVectors(painter, row, x, x + kBytes);
+        }
+    }
+    paintVectors(painter, row, x, end);
 }
 
-}  // namespace VFontEffect::internal
+/// The first and the last vector begin and end with the row, and the loop between them keeps to whole
+/// lines of the cache: the three overlap. So the two are computed from what the row held before, and
+/// stored when the loop is done.
+template <class Painter>
+VOREL_INLINE void paintRow(const Painter& painter, const Row& row, int64_t count) {
+    if (kPixels > 1 && count < kPixels) return paintShortRow(painter, row, count);
+    const Place first = {row, 0};
+    const Place last = {row, count - kPixels};
+    const Pixels firstPixels = painter.paint(first);
+    const Pixels lastPixels = painter.paint(last);
+    paintStretches(painter, row, pixelsToAlignment(row.destinationStart), last.x);
+    storePixels(first.destination(), firstPixels);
+    storePixels(last.destination(), lastPixels);
+}
+
+template <class Painter>
+VOREL_INLINE void paintRows(const Painter& painter, const BlendJob& job) {
+    if (job.width <= 0) return;
+    for (int64_t y = 0; y < job.height; ++y) {
+        const Row row = {job.destination + y * job.destinationStride,
+                         Painter::kReadsImage ? job.image + y * job.imageStride : nullptr,
+                         Painter::kReadsMask ? job.mask + y * job.maskStride : nullptr};
+        paintRow(painter, row, job.width);
+    }
+}
+
+}  // namespace VFontEffect::internal::VOREL_LEVEL

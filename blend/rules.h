@@ -1,129 +1,70 @@
 #pragma once
 
-#include "blend/lanes.h"
-#include "core/fixed_point.h"
+#include "blend/pixels.h"
 
-/// Every per-pixel rule of the blending kernels, once, over a lane type L. Channels are 0..255 in
-/// 16-bit lanes; `product` is the fixed-point product of core/fixed_point.h.
-namespace VFontEffect::internal {
+/// Every per-pixel rule of the blending kernels, once, over vectors of pixels.
+///
+/// Branches that the arithmetic takes by itself are not spelled out: product(x, 0) = 0,
+/// product(x, 255) = x and product(0, y) = 0, so a factor of 0 or 255 needs no case of its own.
+namespace VFontEffect::internal::VOREL_LEVEL {
 
-template <class L>
-struct Pixel {
-    L red;
-    L green;
-    L blue;
-    L alpha;
-};
+/// What an empty mask, or an image of nothing but zeros, does to the destination.
+enum class Empty { keeps, clears, copiesImage };
 
-/// The same operation on two pixels, channel by channel.
-template <class L, class Operation>
-Pixel<L> perChannel(const Pixel<L>& a, const Pixel<L>& b, Operation operation) {
-    return {operation(a.red, b.red), operation(a.green, b.green), operation(a.blue, b.blue),
-            operation(a.alpha, b.alpha)};
+/// `source` under the destination, in the pixels that are `painted`; elsewhere source must be 0. Over a
+/// transparent destination it takes the pixel whole, whatever colour channels stood there.
+VOREL_INLINE Pixels under(const Pixels& d, const Pixels& source, Where painted) {
+    const Amounts alpha = alphaOf(d);
+    const Pixels base = cleared(isZero(alpha) & painted, d);
+    return added(base, scaled(source, inverse(alpha)));
 }
-
-template <class L>
-Pixel<L> select(L mask, const Pixel<L>& a, const Pixel<L>& b) {
-    return perChannel(a, b, [mask](L x, L y) { return select(mask, x, y); });
-}
-
-/// Each channel times `factor`.
-template <class L>
-Pixel<L> scaled(const Pixel<L>& pixel, L factor) {
-    return {product(pixel.red, factor), product(pixel.green, factor), product(pixel.blue, factor),
-            product(pixel.alpha, factor)};
-}
-
-/// min(x, 255).
-template <class L>
-L saturated(L x) {
-    return smaller(x, L(255));
-}
-
-/// Channel-wise a + b, saturated.
-template <class L>
-Pixel<L> added(const Pixel<L>& a, const Pixel<L>& b) {
-    return perChannel(a, b, [](L x, L y) { return saturated(x + y); });
-}
-
-/// product(x, y) for x up to 511, whose intermediate would need 17 bits: with x + 1 = 256 h + l the
-/// result is h * y + (l * y >> 8), exactly.
-template <class L>
-L wideProduct(L x, L y) {
-    const L grown = x + L(1);
-    return (grown >> 8) * y + (((grown & L(255)) * y) >> 8);
-}
-
-/// Larger coverage wins.
-struct LargerCoverage {
-    template <class L>
-    static L apply(L destination, L mask) {
-        return larger(destination, mask);
-    }
-};
 
 // --- One colour through a mask --------------------------------------------------------------------
 
 /// Colour times mask over the destination.
 struct SrcOverMask {
-    template <class L>
-    static Pixel<L> apply(const Pixel<L>& d, L mask, const Pixel<L>& colour) {
-        const Pixel<L> source = scaled(colour, mask);
-        const L inverse = L(255) - source.alpha;
-        const Pixel<L> over = added(scaled(d, inverse), source);
-        return select(equal(source.alpha, L(0)), d, select(equal(inverse, L(0)), colour, over));
+    static constexpr Empty kEmpty = Empty::keeps;
+
+    static VOREL_INLINE Pixels apply(const Pixels& d, Amounts mask, const Pixels& colour) {
+        const Pixels product = scaled(colour, mask);
+        // A colour channel above its alpha may outlast it; nothing of it is painted.
+        const Pixels source = cleared(isTransparent(product), product);
+        return added(scaled(d, inverse(alphaOf(source))), source);
     }
 };
 
 /// Colour times mask under the destination.
 struct DstOverMask {
-    template <class L>
-    static Pixel<L> apply(const Pixel<L>& d, L mask, const Pixel<L>& colour) {
-        const Pixel<L> source = scaled(colour, mask);
-        const Pixel<L> under = added(d, scaled(source, L(255) - d.alpha));
-        const L kept = equal(d.alpha, L(255)) | equal(mask, L(0));
-        return select(kept, d, select(equal(d.alpha, L(0)), source, under));
+    static constexpr Empty kEmpty = Empty::keeps;
+
+    static VOREL_INLINE Pixels apply(const Pixels& d, Amounts mask, const Pixels& colour) {
+        return under(d, scaled(colour, mask), ~isZero(mask));
     }
 };
 
 /// Colour under the destination wherever the mask is not 0. Deliberate: the mask does not scale it.
 struct DstOverGate {
-    template <class L>
-    static Pixel<L> apply(const Pixel<L>& d, L mask, const Pixel<L>& colour) {
-        const Pixel<L> under = added(d, scaled(colour, L(255) - d.alpha));
-        const L kept = equal(d.alpha, L(255)) | equal(mask, L(0));
-        return select(kept, d, select(equal(d.alpha, L(0)), colour, under));
+    static constexpr Empty kEmpty = Empty::keeps;
+
+    static VOREL_INLINE Pixels apply(const Pixels& d, Amounts mask, const Pixels& colour) {
+        const Where painted = ~isZero(mask);
+        return under(d, kept(painted, colour), painted);
     }
 };
 
 /// Colour under the destination, then the whole pixel times the mask. Deliberate: erases whatever lies
 /// where the mask is 0.
+///
+/// Colour and alpha are multiplied by the mask after the sum, which may reach 510. A transparent
+/// destination takes the colour times the mask once.
 struct DstOverClip {
-    template <class L>
-    static Pixel<L> apply(const Pixel<L>& d, L mask, const Pixel<L>& colour) {
-        const Pixel<L> source = scaled(colour, mask);
-        const L inverse = L(255) - d.alpha;
+    static constexpr Empty kEmpty = Empty::clears;
 
-        // Full coverage: a plain destination-over.
-        Pixel<L> full = added(d, scaled(colour, inverse));
-        full.alpha = saturated(d.alpha + product(source.alpha, inverse));
-
-        // Partial coverage. Colour and alpha are multiplied by the mask after the sum, which may
-        // reach 508; over an opaque destination the alpha is the mask itself.
-        const Pixel<L> sum = perChannel(d, scaled(source, inverse), [](L x, L y) { return x + y; });
-        const Pixel<L> clipped = {
-            saturated(wideProduct(sum.red, mask)), saturated(wideProduct(sum.green, mask)),
-            saturated(wideProduct(sum.blue, mask)), saturated(wideProduct(sum.alpha, mask))};
-
-        const L opaque = equal(d.alpha, L(255));
-        Pixel<L> partial =
-            select(opaque, perChannel(d, d, [mask](L x, L) { return product(x, mask); }), clipped);
-        partial.alpha = select(opaque, mask, clipped.alpha);
-
-        const Pixel<L> covered = select(equal(mask, L(255)), full, partial);
-        const Pixel<L> painted = select(equal(d.alpha, L(0)), source, covered);
-        const Pixel<L> cleared = {L(0), L(0), L(0), L(0)};
-        return select(equal(mask, L(0)), cleared, painted);
+    static VOREL_INLINE Pixels apply(const Pixels& d, Amounts mask, const Pixels& colour) {
+        const Amounts alpha = alphaOf(d);
+        const Where empty = isZero(alpha);
+        const Pixels beneath = scaled(scaled(colour, mask), inverse(alpha));
+        return scaledSum(cleared(empty, d), beneath, raisedToFull(empty, mask));
     }
 };
 
@@ -131,20 +72,25 @@ struct DstOverClip {
 
 /// Source over destination.
 struct SrcOver {
-    template <class L>
-    static Pixel<L> apply(const Pixel<L>& d, const Pixel<L>& source) {
-        const Pixel<L> over = added(source, scaled(d, L(255) - source.alpha));
-        return select(equal(source.alpha, L(255)), source, over);
+    static VOREL_INLINE Pixels apply(const Pixels& d, const Pixels& source) {
+        return added(source, scaled(d, inverse(alphaOf(source))));
     }
 };
 
 /// Source under destination.
 struct DstOver {
-    template <class L>
-    static Pixel<L> apply(const Pixel<L>& d, const Pixel<L>& source) {
-        const Pixel<L> under = added(d, scaled(source, L(255) - d.alpha));
-        const L kept = equal(d.alpha, L(255)) | equal(source.alpha, L(0));
-        return select(kept, d, select(equal(d.alpha, L(0)), source, under));
+    static VOREL_INLINE Pixels apply(const Pixels& d, const Pixels& source) {
+        const Where painted = ~isTransparent(source);
+        return under(d, kept(painted, source), painted);
+    }
+};
+
+/// Source under destination wherever the mask is not 0. Deliberate: the mask does not scale it.
+struct DstOverWhereCovered {
+    static constexpr Empty kEmpty = Empty::keeps;
+
+    static VOREL_INLINE Pixels apply(const Pixels& d, const Pixels& source, Amounts mask) {
+        return DstOver::apply(d, cleared(isZero(mask), source));
     }
 };
 
@@ -152,10 +98,20 @@ struct DstOver {
 
 /// The destination where the glyph covers, the outer layer where it does not.
 struct MixByCoverage {
-    template <class L>
-    static Pixel<L> apply(const Pixel<L>& d, const Pixel<L>& outer, L mask) {
-        return added(scaled(outer, L(255) - mask), scaled(d, mask));
+    static constexpr Empty kEmpty = Empty::copiesImage;
+
+    static VOREL_INLINE Pixels apply(const Pixels& d, const Pixels& outer, Amounts mask) {
+        return added(scaled(outer, inverse(mask)), scaled(d, mask));
     }
 };
 
-}  // namespace VFontEffect::internal
+// --- Copies ---------------------------------------------------------------------------------------
+
+/// The colour with its alpha times the mask.
+struct SolidColour {
+    static VOREL_INLINE Pixels apply(Amounts mask, const Pixels& colour) {
+        return withAlphaOf(colour, scaled(colour, mask));
+    }
+};
+
+}  // namespace VFontEffect::internal::VOREL_LEVEL

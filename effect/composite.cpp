@@ -1,6 +1,6 @@
 #include <cstdint>
 
-#include "blend/rows.h"
+#include "blend/kernels.h"
 #include "core/views.h"
 #include "voreleffect/VFEffect.h"
 
@@ -10,20 +10,6 @@ using namespace internal;
 
 namespace {
 
-struct LayerRow {
-    unsigned char* destination;
-    const unsigned char* outer;
-    const unsigned char* mask;
-
-    template <class L>
-    void paint(int64_t i) const {
-        unsigned char* const pixel = destination + i * kColourBytes;
-        storePixel(pixel,
-                   MixByCoverage::apply(loadPixel<L>(pixel), loadPixel<L>(outer + i * kColourBytes),
-                                        loadBytes<L>(mask + i)));
-    }
-};
-
 /// Merges the outer layer into the destination by the coverage; all three must have one size.
 void mergeLayers(const ColourView& destination, const ColourView& outer, const MaskView& mask) {
     if (!destination || !outer || !mask) return;
@@ -32,7 +18,13 @@ void mergeLayers(const ColourView& destination, const ColourView& outer, const M
     };
     if (!sameSize(outer) || !sameSize(mask)) return;
     // Packed rows of one size: the images are one long row each.
-    paintRow(LayerRow{destination.data, outer.data, mask.data}, destination.width * destination.height);
+    BlendJob job = {};
+    job.destination = destination.data;
+    job.image = outer.data;
+    job.mask = mask.data;
+    job.width = destination.width * destination.height;
+    job.height = 1;
+    blendKernels().mixByCoverage(job);
 }
 
 }  // namespace

@@ -1,5 +1,6 @@
 #include <cstdint>
 #include <cstdio>
+#include <cstdlib>
 #include <fstream>
 #include <functional>
 #include <iostream>
@@ -9,6 +10,7 @@
 #include <vector>
 
 #include "tests/support/both_sets.h"
+#include "tests/support/levels.h"
 #include "tests/support/mask_gallery.h"
 #include "tests/support/random.h"
 
@@ -17,8 +19,9 @@
 ///
 ///     voreleffect_hashes                  prints the table
 ///     voreleffect_hashes --literal        the same table, painted by the literal engine
-///     voreleffect_hashes --compare FILE   fails, naming them, when lines differ from the file's;
-///                                         --compare-literal FILE likewise
+///     voreleffect_hashes --compare FILE   at every level of the instruction set that this CPU has;
+///                                         fails, naming them, when lines differ from the file's
+///     voreleffect_hashes --compare-literal FILE   likewise, painted by the literal engine
 namespace {
 
 using namespace vorel_test;
@@ -143,36 +146,50 @@ std::string lines(const Table& table) {
     return text.str();
 }
 
-int compare(const Table& table, const char* path) {
+std::string textOf(const char* path) {
     std::ifstream file(path);
-    std::ostringstream committed;
-    committed << file.rdbuf();
-    if (!file) {
-        std::cerr << "cannot read " << path << '\n';
-        return 2;
-    }
+    std::ostringstream text;
+    text << file.rdbuf();
+    if (file) return text.str();
+    std::cerr << "cannot read " << path << '\n';
+    std::exit(2);
+}
+
+/// Whether the table, painted by `painter`, is that of the file; names the lines that differ.
+bool compare(const Table& table, const std::string& painter, const std::string& committed) {
     const std::string now = lines(table);
-    if (now == committed.str()) {
-        std::cout << table.size() << " hashes are equal\n";
-        return 0;
+    if (now == committed) {
+        std::cout << painter << ": " << table.size() << " hashes are equal\n";
+        return true;
     }
     std::istringstream actual(now);
     for (std::string line; std::getline(actual, line);) {
-        if (committed.str().find(line + '\n') == std::string::npos)
-            std::cerr << "differs: " << line << '\n';
+        if (committed.find(line + '\n') == std::string::npos)
+            std::cerr << painter << " differs: " << line << '\n';
     }
-    std::cerr << "the hashes differ from those of " << path << '\n';
-    return 1;
+    return false;
+}
+
+bool compareLevels(const std::string& committed) {
+    bool same = true;
+    for (const CpuLevel level : levelsHere()) {
+        useLevel(level);
+        same = compare(tableOf<VFEffect>(), nameOf(level), committed) && same;
+    }
+    return same;
 }
 
 }  // namespace
 
 int main(int argc, char** argv) {
     const std::string mode = argc > 1 ? argv[1] : "";
-    const bool literally = mode == "--literal" || mode == "--compare-literal";
-    const Table table = literally ? tableOf<Engine>() : tableOf<VFEffect>();
-    if (argc == 3 && (mode == "--compare" || mode == "--compare-literal"))
-        return compare(table, argv[2]);
-    std::cout << lines(table);
-    return 0;
+    bool same = true;
+    if (argc == 3 && mode == "--compare") {
+        same = compareLevels(textOf(argv[2]));
+    } else if (argc == 3 && mode == "--compare-literal") {
+        same = compare(tableOf<Engine>(), "the literal form", textOf(argv[2]));
+    } else {
+        std::cout << lines(mode == "--literal" ? tableOf<Engine>() : tableOf<VFEffect>());
+    }
+    return same ? 0 : 1;
 }

@@ -1,0 +1,120 @@
+#include <cstdint>
+
+#include "blend/kernels.h"
+#include "blend/rows.h"
+#include "blend/rules.h"
+
+namespace VFontEffect::internal::VOREL_LEVEL {
+namespace {
+
+/// Whether kBytes pixels of an image are nothing but zeros; the first of them mostly tell.
+VOREL_INLINE bool hasEmptyImage(const Place& place) {
+    Bytes pixels = load<Bytes>(place.image());
+    if (!allZero(pixels)) return false;
+    for (int i = 1; i < 4; ++i)
+        pixels |= load<Bytes>(place.image() + i * kBytes);
+    return allZero(pixels);
+}
+
+/// One colour through the mask.
+template <class Rule>
+struct MaskPainter {
+    static constexpr bool kReadsImage = false;
+    static constexpr bool kReadsMask = true;
+    static constexpr Empty kEmpty = Rule::kEmpty;
+    Pixels colour;
+
+    VOREL_INLINE bool isEmpty(const Place& place) const { return hasEmptyMask(place); }
+    VOREL_INLINE Pixels paint(const Place& place) const {
+        return Rule::apply(loadPixels(place.destination()), loadAmounts(place.mask()), colour);
+    }
+};
+
+struct SolidPainter {
+    static constexpr bool kReadsImage = false;
+    static constexpr bool kReadsMask = true;
+    static constexpr Empty kEmpty = Empty::keeps;
+    Pixels colour;
+
+    VOREL_INLINE bool isEmpty(const Place&) const { return false; }
+    VOREL_INLINE Pixels paint(const Place& place) const {
+        return SolidColour::apply(loadAmounts(place.mask()), colour);
+    }
+};
+
+/// The image, whose pixels `Load` reads.
+template <class Rule, Pixels (*Load)(const uint8_t*)>
+struct ImagePainter {
+    static constexpr bool kReadsImage = true;
+    static constexpr bool kReadsMask = false;
+    static constexpr Empty kEmpty = Empty::keeps;
+
+    VOREL_INLINE bool isEmpty(const Place& place) const { return hasEmptyImage(place); }
+    VOREL_INLINE Pixels paint(const Place& place) const {
+        return Rule::apply(loadPixels(place.destination()), Load(place.image()));
+    }
+};
+
+/// The image of bytes R, G, B, A and the mask.
+template <class Rule>
+struct MaskedImagePainter {
+    static constexpr bool kReadsImage = true;
+    static constexpr bool kReadsMask = true;
+    static constexpr Empty kEmpty = Rule::kEmpty;
+
+    VOREL_INLINE bool isEmpty(const Place& place) const { return hasEmptyMask(place); }
+    VOREL_INLINE Pixels paint(const Place& place) const {
+        return Rule::apply(loadPixels(place.destination()), loadPixels(place.image()),
+                           loadAmounts(place.mask()));
+    }
+};
+
+template <class Rule>
+void blendMask(const BlendJob& job) {
+    paintRows(MaskPainter<Rule>{spreadColour(job.color)}, job);
+}
+
+void solidColour(const BlendJob& job) {
+    paintRows(SolidPainter{spreadColour(job.color)}, job);
+}
+
+template <class Rule, Pixels (*Load)(const uint8_t*)>
+void blendImage(const BlendJob& job) {
+    paintRows(ImagePainter<Rule, Load>{}, job);
+}
+
+template <class Rule>
+void blendMaskedImage(const BlendJob& job) {
+    paintRows(MaskedImagePainter<Rule>{}, job);
+}
+
+void largerCoverage(const BlendJob& job) {
+    for (int64_t y = 0; y < job.height; ++y) {
+        uint8_t* const destination = job.destination + y * job.destinationStride;
+        const uint8_t* const mask = job.mask + y * job.maskStride;
+        int64_t x = 0;
+        for (; x + kBytes <= job.width; x += kBytes)
+            store(destination + x, larger(load<Bytes>(destination + x), load<Bytes>(mask + x)));
+        for (; x < job.width; ++x)
+            destination[x] = larger(destination[x], mask[x]);
+    }
+}
+
+}  // namespace
+
+extern const BlendKernels kBlendKernels = {
+    blendMask<SrcOverMask>,
+    blendMask<DstOverMask>,
+    blendMask<DstOverGate>,
+    blendMask<DstOverClip>,
+    solidColour,
+    blendImage<SrcOver, loadWords>,
+    blendImage<DstOver, loadWords>,
+    blendImage<DstOver, loadArgb>,
+    blendImage<DstOver, loadPixels>,
+    blendMaskedImage<DstOverWhereCovered>,
+    blendMaskedImage<MixByCoverage>,
+    largerCoverage,
+};
+
+}  // namespace VFontEffect::internal::VOREL_LEVEL

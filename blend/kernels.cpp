@@ -1,0 +1,9 @@
+#include "blend/kernels.h"
+
+#include "core/level_table.h"
+
+namespace VFontEffect::internal {
+
+VOREL_LEVEL_TABLE(blendKernels, BlendKernels, kBlendKernels)
+
+}  // namespace VFontEffect::internal

@@ -1,0 +1,26 @@
+# One object library of the inner loops for each level, from the plainest to the best: the names and
+# their order are those of core/cpu_level.h.
+if(CMAKE_SYSTEM_PROCESSOR MATCHES "^(x86_64|AMD64|amd64)$")
+  set(VOREL_LEVELS scalar sse2 avx2 avx512)
+elseif(CMAKE_SYSTEM_PROCESSOR MATCHES "^(aarch64|arm64)$")
+  set(VOREL_LEVELS scalar neon dotprod)
+else()
+  set(VOREL_LEVELS scalar)
+endif()
+
+set(VOREL_FLAGS_scalar -DVOREL_SCALAR)
+set(VOREL_FLAGS_avx2 -mavx2)
+set(VOREL_FLAGS_avx512 -mavx512f -mavx512bw -mavx512dq -mavx512vl -mavx512vnni)
+set(VOREL_FLAGS_dotprod -march=armv8-a+dotprod)
+
+foreach(level IN LISTS VOREL_LEVELS)
+  add_library(voreleffect_${level} OBJECT ${VOREL_LEVEL_SOURCES})
+  vorel_objects(voreleffect_${level})
+  target_compile_definitions(voreleffect_${level} PRIVATE VOREL_LEVEL=${level})
+  # Vectors are passed between functions that are always inlined; their calling convention is moot.
+  target_compile_options(voreleffect_${level} PRIVATE ${VOREL_FLAGS_${level}} -Wno-psabi)
+  if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
+    # Its own headers leave vectors uninitialised on purpose.
+    target_compile_options(voreleffect_${level} PRIVATE -Wno-maybe-uninitialized -Wno-uninitialized)
+  endif()
+endforeach()

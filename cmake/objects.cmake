@@ -1,0 +1,25 @@
+# How every source of the library is compiled.
+function(vorel_objects target)
+  target_include_directories(${target} PRIVATE
+    ${PROJECT_SOURCE_DIR} ${PROJECT_SOURCE_DIR}/include)
+  target_compile_features(${target} PRIVATE cxx_std_17)
+  # Without contraction no product and sum fuse into one rounding: every CPU paints the same bytes.
+  target_compile_options(${target} PRIVATE -fno-exceptions -ffp-contract=off)
+  vorel_warnings(${target})
+  set_target_properties(${target} PROPERTIES
+    CXX_EXTENSIONS OFF
+    CXX_VISIBILITY_PRESET hidden
+    VISIBILITY_INLINES_HIDDEN ON
+    POSITION_INDEPENDENT_CODE ON)
+endfunction()
+
+# Makes a library of all objects and of one more source: the choice of the level.
+function(vorel_library target choice)
+  target_sources(${target} PRIVATE ${choice} $<TARGET_OBJECTS:voreleffect_objects>)
+  foreach(level IN LISTS VOREL_LEVELS)
+    target_sources(${target} PRIVATE $<TARGET_OBJECTS:voreleffect_${level}>)
+  endforeach()
+  vorel_objects(${target})
+  target_include_directories(${target} PUBLIC $<BUILD_INTERFACE:${PROJECT_SOURCE_DIR}/include>)
+  target_compile_features(${target} PUBLIC cxx_std_17)
+endfunction()

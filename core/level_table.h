@@ -1,0 +1,21 @@
+#pragma once
+
+#include <cstddef>
+
+#include "core/cpu_level.h"
+
+#define VOREL_DECLARE_LEVEL_TABLE(level, Table, name) \
+    namespace level {                                 \
+    extern const Table name;                          \
+    }
+#define VOREL_LEVEL_TABLE_ADDRESS(level, Table, name) &level::name,
+
+/// Defines `const Table& accessor()`, the chosen level's table of inner loops, in the namespace that it
+/// stands in. Each level has defined `extern const Table name` in its own namespace therein.
+#define VOREL_LEVEL_TABLE(accessor, Table, name)                       \
+    VOREL_EACH_LEVEL(VOREL_DECLARE_LEVEL_TABLE, Table, name)           \
+    const Table& accessor() {                                          \
+        static constexpr const Table* kTables[] = {                    \
+            VOREL_EACH_LEVEL(VOREL_LEVEL_TABLE_ADDRESS, Table, name)}; \
+        return *kTables[static_cast<size_t>(chosenLevel())];           \
+    }
