@@ -31,3 +31,9 @@ foreach(component IN LISTS CPACK_COMPONENTS_ALL)
   file(CHMOD ${docs}/copyright ${docs}/changelog.gz
     PERMISSIONS OWNER_READ OWNER_WRITE GROUP_READ WORLD_READ)
 endforeach()
+
+# Debian keeps manual pages packed.
+file(GLOB pages ${CPACK_TEMPORARY_DIRECTORY}/*/usr/share/man/man*/*.[1-9])
+foreach(page IN LISTS pages)
+  execute_process(COMMAND gzip -9n ${page} COMMAND_ERROR_IS_FATAL ANY)
+endforeach()

@@ -7,10 +7,8 @@ elseif(NOT DEFINED BUILD_SHARED_LIBS)
 endif()
 
 if(NOT BUILD_SHARED_LIBS)
-  # Said for every target here, so that all parts of the library see the same headers. The code may
-  # end in somebody's shared library.
+  # Said for every target here, so that all parts of the library see the same headers.
   add_compile_definitions(VOREL_STATIC)
-  set(CMAKE_POSITION_INDEPENDENT_CODE ON)
 endif()
 
 # What the users of the library must be told, if it is static: a shared one names itself what it needs.
