@@ -86,7 +86,7 @@ VOREL_INLINE void paintStretches(const Painter& painter, const Row& row, int64_t
 /// stored when the loop is done.
 template <class Painter>
 VOREL_INLINE void paintRow(const Painter& painter, const Row& row, int64_t count) {
-    if (count < kPixels) return paintShortRow(painter, row, count);
+    if (kPixels > 1 && count < kPixels) return paintShortRow(painter, row, count);
     const Place first = {row, 0};
     const Place last = {row, count - kPixels};
     const Pixels firstPixels = painter.paint(first);
