@@ -4,7 +4,9 @@
 /// version builds with every later one of the same major number. Whether a compiled program still
 /// runs is told by the number in the library's file name (libvoreleffect.so.1), which counts apart.
 #define VOREL_VERSION_MAJOR 0
+/// The minor number: raised by what is added.
 #define VOREL_VERSION_MINOR 9
+/// The patch number: raised by what is mended.
 #define VOREL_VERSION_PATCH 0
 
 /// A version as one number, in the order of versions: 0.9.0 is 9000, 1.2.3 is 1002003.

@@ -2,6 +2,7 @@
 """Checks the Markdown pages and builds the site: build.py LIBRARY_FOLDER SITE_FOLDER."""
 
 import os
+import shutil
 import subprocess
 import sys
 from pathlib import Path
@@ -19,13 +20,15 @@ def fail_on(faults):
 
 
 def build_site(pages, folder):
-    """Doxygen's warnings, by which it fails."""
-    write_pages(pages, folder / "pages")
+    """Doxygen's warnings, by which it fails, else the links of the site that lead nowhere."""
+    pictures = write_pages(pages, folder / "pages")
     write_layout(pages, folder / "layout.xml")
     said = subprocess.run(["doxygen", "docs/Doxyfile"], cwd=ROOT, capture_output=True, text=True, check=False,
                           env={**os.environ, "SITE": str(folder)})
-    lines = (said.stdout + said.stderr).replace(f"{ROOT}/", "").strip().split("\n")
-    return lines if said.returncode else []
+    if said.returncode:
+        return (said.stdout + said.stderr).replace(f"{ROOT}/", "").strip().split("\n")
+    copy_pictures(pictures, folder / "html")
+    return site_faults(folder / "html")
 
 
 def main(library, folder):
@@ -33,9 +36,8 @@ def main(library, folder):
     fail_on(link_faults(pages))
     faults, blocks = code_faults(pages, library)
     fail_on(faults)
+    shutil.rmtree(folder / "html", ignore_errors=True)
     fail_on(build_site(pages, folder))
-    copy_pictures(folder / "html")
-    fail_on(site_faults(folder / "html"))
     print(f"{len(pages)} pages, {sum(len(page.links) for page in pages)} links, {blocks} blocks of C++; "
           f"site: {folder / 'html/index.html'}")
 

@@ -1,8 +1,8 @@
 """The C++ in the Markdown pages compiles.
 
-A block of `cpp` with a main is a program: it is compiled, linked and run. Any other is the inside of a
-function and may use the names that fragment.h declares. A block that includes Android's headers is left
-to scripts/android_test.sh.
+A block of `cpp` with a main is a program: it is compiled, linked and run. One that defines functions is a
+source file. Any other is the inside of a function and may use the names that fragment.h declares. A block
+that includes Android's headers is left to scripts/android_test.sh.
 """
 
 import os
@@ -16,9 +16,11 @@ from pages import ROOT
 
 COMPILER = os.environ.get("CXX", "g++")
 FLAGS = ["-std=c++17", "-Wall", "-Wextra", "-Wconversion", "-Werror", "-I", str(ROOT / "include")]
-FRAGMENT_FLAGS = ["-Wno-unused", "-I", str(Path(__file__).parent), "-fsyntax-only"]
+SOURCE_FLAGS = [*FLAGS, "-fsyntax-only", "-x", "c++", "-"]
+FRAGMENT_FLAGS = [*SOURCE_FLAGS, "-Wno-unused", "-I", str(Path(__file__).parent)]
 ELSEWHERE = re.compile(r"#include <(android/|jni\.h)")
 MAIN = re.compile(r"\bint main\(")
+FUNCTION = re.compile(r"^(?!for|if|while|switch|else)\w[\w:&*<>, ]* [\w:]+\([^;]*\) \{$", re.MULTILINE)
 
 
 def located(page, block, text):
@@ -53,17 +55,21 @@ def fragment_fault(page, block):
     inside = "\n".join("" if line.startswith("#include") else line for line in lines)
     source = (includes + '#include "fragment.h"\nvoid fragment();\nvoid fragment() {\n'
               + located(page, block, inside) + "}\n")
-    return fault_of([*FLAGS, *FRAGMENT_FLAGS, "-x", "c++", "-"], source)
+    return fault_of(FRAGMENT_FLAGS, source)
+
+
+def block_fault(page, block, library):
+    if MAIN.search(block.text):
+        return program_fault(page, block, library)
+    if FUNCTION.search(block.text):
+        return fault_of(SOURCE_FLAGS, located(page, block, block.text))
+    return fragment_fault(page, block)
 
 
 def code_faults(pages, library):
     """One line for each block that does not compile, or whose program fails; and the number of blocks."""
     blocks = [(page, block) for page in pages for block in page.blocks
               if block.language == "cpp" and not ELSEWHERE.search(block.text)]
-
-    def fault(page, block):
-        return program_fault(page, block, library) if MAIN.search(block.text) else fragment_fault(page, block)
-
     with ThreadPoolExecutor(2) as pool:
-        faults = list(pool.map(lambda both: fault(*both), blocks))
+        faults = list(pool.map(lambda both: block_fault(*both, library), blocks))
     return [fault for fault in faults if fault], len(blocks)

@@ -4,7 +4,6 @@ import re
 import shutil
 import subprocess
 from html import escape
-from pathlib import Path
 
 from pages import CODE_SPAN, ROOT, is_outside, target_of
 
@@ -18,14 +17,13 @@ NAVIGATION = [
                  "docs/effects/linear-gradient.md", "docs/effects/radial-gradient.md",
                  "docs/effects/pattern.md"]),
     ("Using it", ["docs/limits.md", "examples/README.md", "docs/android.md", "packaging/README.md",
-                  "docs/style-files.md"]),
+                  "docs/vorelpaint.md", "docs/style-files.md"]),
     ("How it works", ["docs/architecture.md", "docs/pixels.md", "docs/fixed-point.md", "docs/quirks.md",
                       "docs/determinism.md", "docs/reliability.md", "docs/benchmarks.md",
                       "docs/adding-a-core.md"]),
     ("Project", ["CHANGELOG.md", "CONTRIBUTING.md", "SECURITY.md"]),
 ]
 START = "README.md"
-PICTURES = ("docs/pictures", "docs/gallery")
 MARKDOWN_LINK = re.compile(r"(!?)\[((?:[^\[\]]|!?\[[^\]]*\]\([^)]*\))*)\]\(([^()\s]+)\)")
 IMAGE_SOURCE = re.compile(r"(<img\b[^>]*?\bsrc=\")([^\"]+)(\")")
 
@@ -42,6 +40,7 @@ class SitePage:
     def __init__(self, page, by_path):
         self.page = page
         self.by_path = by_path
+        self.pictures = {}  # file: its place in the site
         headings = {n for n, _ in page.headings}
         prose = {n for n, _ in page.prose}
         self.lines = []
@@ -62,10 +61,11 @@ class SitePage:
         for span in CODE_SPAN.finditer(line):
             parts += [line[at:span.start()], f"\0{len(parts)}\0"]
             at = span.end()
-        spans = [span[0] for span in CODE_SPAN.finditer(line)]
+        # Doxygen would end a span of single backticks at an apostrophe.
+        spans = [f"``{span[2]}``" if "'" in span[2] else span[0] for span in CODE_SPAN.finditer(line)]
         marked = "".join(parts) + line[at:]
-        marked = MARKDOWN_LINK.sub(self.link, marked)
         marked = IMAGE_SOURCE.sub(lambda m: m[1] + self.picture(m[2]) + m[3], marked)
+        marked = MARKDOWN_LINK.sub(self.link, marked)
         for span in spans:
             marked = re.sub(r"\0\d+\0", lambda _: span, marked, count=1)
         return marked
@@ -73,7 +73,8 @@ class SitePage:
     def picture(self, target):
         """Pictures stand beside the pages of the site, in folders of their last name."""
         path, _ = target_of(self.page, target)
-        return f"{path.parent.name}/{path.name}"
+        self.pictures[path] = f"{path.parent.name}/{path.name}"
+        return self.pictures[path]
 
     def link(self, match):
         bang, text, target = match.groups()
@@ -95,16 +96,19 @@ class SitePage:
 
 
 def write_pages(pages, folder):
-    """The pages as <label>.md, and a comment that makes a page of each header."""
+    """The pages as <label>.md, and a comment that makes a page of each header; returns their pictures."""
     shutil.rmtree(folder, ignore_errors=True)
     folder.mkdir(parents=True)
     by_path = {page.path: page for page in pages}
+    pictures = {}
     for page in pages:
         converted = SitePage(page, by_path)
         name = "start" if page.name == START else identity(page.name)
         (folder / f"{name}.md").write_text("\n".join(converted.lines))
+        pictures.update(converted.pictures)
     headers = sorted(path.name for path in (ROOT / "include/voreleffect").glob("*.h"))
     (folder / "headers.dox").write_text("".join(f"/** @file {name} */\n" for name in headers))
+    return pictures
 
 
 def tab(kind, title, url="", inside=""):
@@ -131,9 +135,10 @@ def write_layout(pages, path):
     path.write_text(layout)
 
 
-def copy_pictures(html):
-    for folder in PICTURES:
-        shutil.copytree(ROOT / folder, html / Path(folder).name, dirs_exist_ok=True)
+def copy_pictures(pictures, html):
+    for source, place in pictures.items():
+        (html / place).parent.mkdir(exist_ok=True)
+        shutil.copyfile(source, html / place)
 
 
 def site_faults(html):
