@@ -17,7 +17,7 @@ namespace VFontEffect {
 /// A box of whole pixels, half-open: mRight and mBottom are exclusive. Starts as all zeros.
 class VF_API VFRect {
   public:
-    VFRect();
+    VFRect();                                          ///< all zeros
     VFRect(int left, int top, int right, int bottom);  ///< stores the four numbers as they are
     VFRect(const VFRect&) = default;                   ///< copies the four numbers
     VFRect& operator=(const VFRect&) = default;        ///< copies the four numbers

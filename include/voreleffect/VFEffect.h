@@ -36,7 +36,7 @@ namespace VFontEffect {
 /// 13 none. Bevel, emboss and 9 have no core.
 class VF_API VFEffect {
   public:
-    VFEffect();
+    VFEffect();                        ///< without effects, at text opacity 1
     explicit VFEffect(void* ignored);  ///< the same; the argument is not looked at
 
     /// Copies the look (each effect with its id and a deep copy of its record, the text opacity and
@@ -45,12 +45,13 @@ class VF_API VFEffect {
     VFEffect& operator=(const VFEffect&) = delete;
     virtual ~VFEffect();
 
-    // --- Add-calls: one per effect kind ---------------------------------------------------------
-    // Each puts its effect into the set, or updates the one of its kind that is there, and returns
-    // the effect's id, or 0xFFFFFFFF when there is no core of that kind. No argument is refused:
-    // numbers are clamped to the ranges named here, a NaN to the lower end. Angles are cut to whole
-    // degrees and brought into 0..359, sizes and distances to whole pixels. The alpha byte of a
-    // colour is ignored; `opacity`, 0..1, takes its place. Arrays and bitmaps are copied.
+    /// @name Add-calls: one per effect kind
+    /// Each puts its effect into the set, or updates the one of its kind that is there, and returns
+    /// the effect's id, or 0xFFFFFFFF when there is no core of that kind. No argument is refused:
+    /// numbers are clamped to the ranges named here, a NaN to the lower end. Angles are cut to whole
+    /// degrees and brought into 0..359, sizes and distances to whole pixels. The alpha byte of a
+    /// colour is ignored; `opacity`, 0..1, takes its place. Arrays and bitmaps are copied.
+    /// @{
 
     /// A shadow behind the text. Angle: where the light comes from, 0 from the right, 90 from above.
     /// Distance and size (blur radius) 0..100.
@@ -106,7 +107,9 @@ class VF_API VFEffect {
     /// The plain fill. Also called by getMapKey(color) with the text opacity.
     unsigned int addText(unsigned int color, float opacity);
 
-    // --- Registry -------------------------------------------------------------------------------
+    /// @}
+    /// @name Registry
+    /// @{
 
     /// Gives `property` (copied; null leaves the core without a new record) to the core of that
     /// type, made with this id if there is none; a negative id asks for the next of the counter.
@@ -141,7 +144,9 @@ class VF_API VFEffect {
     VFBitmap* getDstBitmap();                  ///< the destination of the run, or null
     void setDstBitmap(VFBitmap* destination);  ///< not owned; must live until compositeLayers
 
-    // --- One run --------------------------------------------------------------------------------
+    /// @}
+    /// @name One run
+    /// @{
 
     /// Starts a run on layers of width x height pixels: chooses layered mode (text opacity below 1,
     /// or a centred stroke), makes the glyph mask and the outer layer, and puts the cores in paint
@@ -174,7 +179,9 @@ class VF_API VFEffect {
     /// pixel or of another size than the layers is left as it is.
     void compositeLayers(VFBitmap* destination);
 
-    // --- Cache key ------------------------------------------------------------------------------
+    /// @}
+    /// @name Cache key
+    /// @{
 
     /// The look as a zero-terminated string of bytes, for a cache of painted runs: equal for two
     /// sets built by the same calls in the same order. The caller releases it with delete[]; null
@@ -185,6 +192,7 @@ class VF_API VFEffect {
 
     /// Registers the text fill in `color` (0xRRGGBB) at the text opacity, then the key.
     char* getMapKey(unsigned int color);
+    /// @}
 
   private:
     std::vector<VFECore*> mEffects;

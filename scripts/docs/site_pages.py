@@ -45,14 +45,17 @@ class SitePage:
         prose = {n for n, _ in page.prose}
         self.lines = []
         for number, line in enumerate(page.lines, 1):
-            if number in headings:
+            # The start page's own headings would stand in the navigation.
+            if number in headings and (page.name != START or number == page.headings[0][0]):
                 line = f"{line} {{#{self.label(page, number)}}}"
             self.lines.append(self.converted(line) if number in prose else line)
 
     @staticmethod
     def label(page, number):
         first = page.headings[0][0]
-        name = "start" if page.name == START else identity(page.name)
+        if page.name == START:
+            return "start"
+        name = identity(page.name)
         return name if number == first else f"{name}_{page.anchors[number].replace('-', '_')}"
 
     def converted(self, line):
@@ -125,7 +128,8 @@ def write_layout(pages, path):
     groups[-1][1].extend(sorted(set(titles) - named))
     tabs = tab("mainpage", "Start")
     for title, names in groups:
-        entries = "".join(tab("user", titles[name], f"@ref {identity(name)}") for name in names)
+        entries = "".join(tab("user", "Overview" if titles[name] == title and len(names) > 1 else titles[name],
+                              f"@ref {identity(name)}") for name in names)
         tabs += tab("usergroup", title, inside=entries) if len(names) > 1 else entries
     tabs += tab("usergroup", "Reference", inside=tab("classlist", "Classes") + tab("classmembers", "Members")
                 + tab("namespacemembers", "Functions and enumerations") + tab("filelist", "Headers"))
