@@ -17,7 +17,8 @@ NAVIGATION = [
                  "docs/effects/linear-gradient.md", "docs/effects/radial-gradient.md",
                  "docs/effects/pattern.md"]),
     ("Using it", ["docs/limits.md", "examples/README.md", "docs/android.md", "packaging/README.md",
-                  "docs/vorelpaint.md", "docs/style-files.md"]),
+                  "docs/looks.md", "docs/vorelpaint.md",
+                  "docs/style-files.md"]),
     ("How it works", ["docs/architecture.md", "docs/pixels.md", "docs/fixed-point.md", "docs/quirks.md",
                       "docs/determinism.md", "docs/reliability.md", "docs/benchmarks.md",
                       "docs/adding-a-core.md"]),
@@ -25,6 +26,7 @@ NAVIGATION = [
 ]
 START = "README.md"
 MARKDOWN_LINK = re.compile(r"(!?)\[((?:[^\[\]]|!?\[[^\]]*\]\([^)]*\))*)\]\(([^()\s]+)\)")
+ASIDE = re.compile("\0(\\d+)\0")
 IMAGE_SOURCE = re.compile(r"(<img\b[^>]*?\bsrc=\")([^\"]+)(\")")
 
 
@@ -60,18 +62,17 @@ class SitePage:
 
     def converted(self, line):
         """Links and pictures of a line, its code left alone."""
-        parts, at = [], 0
-        for span in CODE_SPAN.finditer(line):
-            parts += [line[at:span.start()], f"\0{len(parts)}\0"]
-            at = span.end()
-        # Doxygen would end a span of single backticks at an apostrophe.
-        spans = [f"``{span[2]}``" if "'" in span[2] else span[0] for span in CODE_SPAN.finditer(line)]
-        marked = "".join(parts) + line[at:]
-        marked = IMAGE_SOURCE.sub(lambda m: m[1] + self.picture(m[2]) + m[3], marked)
-        marked = MARKDOWN_LINK.sub(self.link, marked)
-        for span in spans:
-            marked = re.sub(r"\0\d+\0", lambda _: span, marked, count=1)
-        return marked
+        self.code = []
+
+        def set_aside(span):
+            self.code.append(span[2].strip())
+            return f"\0{len(self.code) - 1}\0"
+
+        line = CODE_SPAN.sub(set_aside, line)
+        line = IMAGE_SOURCE.sub(lambda m: m[1] + self.picture(m[2]) + m[3], line)
+        line = MARKDOWN_LINK.sub(self.link, line)
+        # In double backticks: Doxygen would end a span of single ones at an apostrophe.
+        return ASIDE.sub(lambda m: f"``{self.code[int(m[1])]}``", line)
 
     def picture(self, target):
         """Pictures stand beside the pages of the site, in folders of their last name."""
@@ -83,7 +84,7 @@ class SitePage:
         bang, text, target = match.groups()
         if bang:
             return f'<img src="{self.picture(target)}" alt="{escape(text)}"/>'
-        text = MARKDOWN_LINK.sub(self.link, text)
+        text = ASIDE.sub(lambda m: self.code[int(m[1])], MARKDOWN_LINK.sub(self.link, text))
         if is_outside(target):
             return f"[{text}]({target})"
         path, anchor = target_of(self.page, target)
@@ -92,6 +93,8 @@ class SitePage:
         other = self.by_path.get(path)
         if other is None:
             return text  # a file of the repository that the site does not have
+        if "<img" in text:
+            return f'<a href="{identity(other.name)}.html">{text}</a>'
         if not anchor:
             return f"[{text}](@ref {self.label(other, other.headings[0][0])})"
         number = next(n for n, name in other.anchors.items() if name == anchor)
