@@ -45,6 +45,8 @@ void addGrowth(Cases& cases, const Workload& workload) {
     const int64_t pixels = workload.grownPixels(kGrowthMargin) * kPasses;
     cases.push_back(caseOf<GrowthJob>(row, kOurs, pixels, &workload, kGrowthMargin));
     cases.push_back(caseOf<LiteralGrowthJob>(row, kLiteral, pixels, &workload, kGrowthMargin));
+    const int64_t plane = workload.grownPixels(kGrowthMargin);
+    cases.push_back(copyCase(row, plane, plane));
 }
 
 void addGlow(Cases& cases, const Workload& workload, int radius) {

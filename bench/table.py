@@ -70,7 +70,6 @@ def print_table(title, head, lines):
 def print_subject(subject, rows, run, saved):
     makers = {maker for row in rows for maker in run.rows[row]}
     levels = [level for level in LEVELS if level in makers]
-    levels += sorted(m for m in makers if m not in LEVELS and m.startswith("level"))
     others = [maker for maker in OTHERS if maker in makers]
     peers = sorted(makers - set(levels) - set(OTHERS))
     head = [unit(rows[0])] + levels + ["median"] * bool(levels) + others + ["L/best"] * ("literal" in others)
