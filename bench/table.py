@@ -73,7 +73,7 @@ def print_subject(subject, rows, run, saved):
     others = [maker for maker in OTHERS if maker in makers]
     peers = sorted(makers - set(levels) - set(OTHERS))
     head = [unit(rows[0])] + levels + ["median"] * bool(levels) + others + ["L/best"] * ("literal" in others)
-    head += peers + ["change"] * bool(saved)
+    head += peers + [f"change of {level}" for level in levels if saved]
     lines = []
     for row in rows:
         line = [row.split("/", 1)[1]] + [number(run.figure(row, level)) for level in levels]
@@ -84,7 +84,7 @@ def print_subject(subject, rows, run, saved):
             line.append(ratio(run.fastest(row, "literal"), run.fastest(row, "best")))
         line += [number(run.figure(row, peer)) for peer in peers]
         if saved:
-            line.append(change(run.fastest(row, "best"), saved.fastest(row, "best")))
+            line += [change(run.fastest(row, level), saved.fastest(row, level)) for level in levels]
         lines.append(line)
     print_table(subject, head, lines)
 
