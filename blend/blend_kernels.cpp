@@ -11,7 +11,7 @@ namespace {
 VOREL_INLINE bool hasEmptyImage(const Place& place) {
     Bytes pixels = load<Bytes>(place.image());
     if (!allZero(pixels)) return false;
-    for (int i = 1; i < 4; ++i)
+    for (int64_t i = 1; i < 4; ++i)
         pixels |= load<Bytes>(place.image() + i * kBytes);
     return allZero(pixels);
 }
