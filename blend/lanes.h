@@ -74,8 +74,9 @@ VOREL_INLINE V smaller(V a, V b) {
 //   subSaturated   a - b, at least 0
 //   multiplyHigh   the upper 16 bits of 32-bit products
 //   allZero        whether no lane holds anything but 0
-//   fourthBytes    of each word its highest byte, in both halves of the word
-//   firstAndThirdSwapped   each word's bytes 0 1 2 3 as 2 1 0 3
+//   nonZeroLanes   kLaneBits ones for each lane that holds anything but 0, those of the first lane
+//   lowest fourthBytes    of each word its highest byte, in both halves of the word firstAndThirdSwapped
+//   each word's bytes 0 1 2 3 as 2 1 0 3
 
 #if defined(VOREL_SCALAR)
 
@@ -93,6 +94,10 @@ VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
 VOREL_INLINE bool allZero(Bytes v) {
     return as<Words>(v)[0] == 0;
 }
+constexpr int kLaneBits = 8;
+VOREL_INLINE uint64_t nonZeroLanes(Bytes v) {
+    return as<Words>(v != 0)[0];
+}
 
 #elif defined(__AVX512BW__)
 
@@ -107,6 +112,10 @@ VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
 }
 VOREL_INLINE bool allZero(Bytes v) {
     return _mm512_test_epi32_mask(as<__m512i>(v), as<__m512i>(v)) == 0;
+}
+constexpr int kLaneBits = 1;
+VOREL_INLINE uint64_t nonZeroLanes(Bytes v) {
+    return _mm512_test_epi8_mask(as<__m512i>(v), as<__m512i>(v));
 }
 /// Moves bytes within each 128 bits; an index of -1 gives 0.
 VOREL_INLINE Bytes shuffled(Bytes v, __m128i indices) {
@@ -127,6 +136,10 @@ VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
 VOREL_INLINE bool allZero(Bytes v) {
     return _mm256_testz_si256(as<__m256i>(v), as<__m256i>(v)) != 0;
 }
+constexpr int kLaneBits = 1;
+VOREL_INLINE uint64_t nonZeroLanes(Bytes v) {
+    return static_cast<uint32_t>(_mm256_movemask_epi8(as<__m256i>(v != 0)));
+}
 /// Moves bytes within each 128 bits; an index of -1 gives 0.
 VOREL_INLINE Bytes shuffled(Bytes v, __m128i indices) {
     return as<Bytes>(_mm256_shuffle_epi8(as<__m256i>(v), _mm256_broadcastsi128_si256(indices)));
@@ -146,6 +159,10 @@ VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
 VOREL_INLINE bool allZero(Bytes v) {
     return _mm_movemask_epi8(_mm_cmpeq_epi8(as<__m128i>(v), _mm_setzero_si128())) == 0xFFFF;
 }
+constexpr int kLaneBits = 1;
+VOREL_INLINE uint64_t nonZeroLanes(Bytes v) {
+    return static_cast<uint32_t>(_mm_movemask_epi8(as<__m128i>(v != 0)));
+}
 
 #else
 
@@ -157,6 +174,11 @@ VOREL_INLINE Bytes subSaturated(Bytes a, Bytes b) {
 }
 VOREL_INLINE bool allZero(Bytes v) {
     return vmaxvq_u32(as<uint32x4_t>(v)) == 0;
+}
+constexpr int kLaneBits = 4;
+VOREL_INLINE uint64_t nonZeroLanes(Bytes v) {
+    const uint16x8_t all = vreinterpretq_u16_u8(as<uint8x16_t>(v != 0));
+    return vget_lane_u64(vreinterpret_u64_u8(vshrn_n_u16(all, 4)), 0);
 }
 
 #endif
