@@ -35,14 +35,30 @@ using Reach = int16_t;  // rows; negative where nothing is reached
 using Reaches = int16_t __attribute__((vector_size(kBytes)));
 constexpr int64_t kReachLanes = kBytes / 2;
 
-/// Farther than any disc reaches.
-constexpr int32_t kFar = 1 << 20;
+/// Columns; beyond what any disc reaches only that it is beyond is told.
+using Distance = int16_t;
+using Distances = int16_t __attribute__((vector_size(kBytes)));
+constexpr int32_t kBeyond = 1024;
 
-/// The covered pixels of a tile of the source, and the nearest ones beside it.
-struct TileInk {
-    uint64_t lanes;  ///< kLaneBits ones for each covered pixel
-    int32_t before;  ///< columns of the nearest covered pixels to both sides
-    int32_t after;
+/// The covered pixels of the tiles in a row of the source, in one array for each number. A tile without
+/// any has its first one and its last one far to the right and to the left.
+struct InkRow {
+    Distance* first;  ///< column of the tile's first covered pixel
+    Distance* last;   ///< of its last one
+    Distance*
+        before;       ///< from the tile's first column back to the nearest covered pixel before the tile
+    Distance* after;  ///< from the tile's last column on to the nearest one behind it
+    Distance*
+        holes;  ///< columns from the first to the last one if there are any not covered between, or 0
+};
+
+/// What a row of the disc looks at.
+struct DiscRow {
+    int32_t firstTap;  ///< among the taps for its full cells, which come in twos
+    int32_t endTap;
+    int32_t firstRim;  ///< distance of the first rim cell
+    int32_t endRim;
+    const Tile* deficits;  ///< 255 - weight of the rim's cells, in all lanes
 };
 
 /// Where the method's working memory is.
@@ -57,9 +73,11 @@ struct TilePlanes {
     int64_t touchingStride;
 
     int64_t tiles;
-    Tile* rimDeficits;  ///< those of the disc, in all lanes
-    TileInk* ink;
-    TileInk* fullInk;
+    InkRow ink;
+    InkRow most;  ///< of the pixels with the largest coverage
+    Tile* rimDeficits;
+    int32_t* taps;  ///< distances from a pixel's own place to what is loaded
+    DiscRow* discRows;
     size_t bytes;
 };
 
@@ -68,6 +86,9 @@ VOREL_INLINE int64_t windowLength(const DiscShape& disc, int plane) {
     const int64_t shorter = disc.reach < 24 ? 4 : 16;
     return plane == 0 ? shorter : 4 * shorter;
 }
+
+/// The longest rows take 9 windows of 64.
+constexpr int64_t kMostTapsOfRow = 16;
 
 inline TilePlanes tilePlanes(const Dilation& dilation) {
     TilePlanes planes;
@@ -82,14 +103,24 @@ inline TilePlanes tilePlanes(const Dilation& dilation) {
     planes.reachStride = (planes.tiles + kReachLanes - 1) / kReachLanes * kReachLanes;
     planes.touchingStride = height + kBytes;
 
-    const int64_t inkBytes = planes.tiles * int64_t{sizeof(TileInk)};
-    planes.ink = reinterpret_cast<TileInk*>(take(inkBytes));
-    planes.fullInk = reinterpret_cast<TileInk*>(take(inkBytes));
+    const auto takeInk = [&] {
+        const auto takeDistances = [&] {
+            return reinterpret_cast<Distance*>(take(planes.reachStride * int64_t{sizeof(Distance)}));
+        };
+        return InkRow{takeDistances(), takeDistances(), takeDistances(), takeDistances(),
+                      takeDistances()};
+    };
+    planes.ink = takeInk();
+    planes.most = takeInk();
     const int64_t reachBytes = height * planes.reachStride * int64_t{sizeof(Reach)};
     planes.full = reinterpret_cast<Reach*>(take(reachBytes));
     planes.touched = reinterpret_cast<Reach*>(take(reachBytes));
     planes.touching = take(planes.tiles * planes.touchingStride);
+
+    const int64_t discRows = dilation.disc->reach + 1;
     planes.rimDeficits = reinterpret_cast<Tile*>(take(DiscShape::kMostRimCells * int64_t{sizeof(Tile)}));
+    planes.taps = reinterpret_cast<int32_t*>(take(discRows * kMostTapsOfRow * int64_t{sizeof(int32_t)}));
+    planes.discRows = reinterpret_cast<DiscRow*>(take(discRows * int64_t{sizeof(DiscRow)}));
     const auto takeRows = [&] {
         PaddedRows rows = paddedRowsOf(dilation);
         rows.start = take(height * rows.stride);
@@ -131,48 +162,33 @@ VOREL_INLINE int32_t lastLane(uint64_t lanes) {
     return (63 - __builtin_clzll(lanes)) / kLaneBits;
 }
 
-constexpr uint64_t kTileLanes = ~uint64_t{0} >> (64 - kTile * kLaneBits);
+constexpr int kTileBits = kTile * kLaneBits;
+constexpr uint64_t kTileLanes = ~uint64_t{0} >> (64 - kTileBits);
 
-/// Splits the lanes of a vector into those of its tiles.
-VOREL_INLINE void setLanes(TileInk* ink, uint64_t lanes, int64_t count) {
-    for (int i = 0; i < kBytes / kTile && i < count; ++i)
-        ink[i].lanes = lanes >> (i * kTile * kLaneBits % 64) & kTileLanes;
+/// Notes the covered pixels of a tile.
+VOREL_INLINE void noteInk(const InkRow& ink, int64_t tile, uint64_t lanes) {
+    const uint64_t bits = lanes & kTileLanes;
+    const int32_t first = bits != 0 ? firstLane(bits) : kBeyond;
+    const int32_t last = bits != 0 ? lastLane(bits) : -kBeyond;
+    // Adding one to solid ones carries through all of them.
+    const uint64_t solid = bits >> (first * kLaneBits & 63);
+    ink.first[tile] = static_cast<Distance>(first);
+    ink.last[tile] = static_cast<Distance>(last);
+    ink.holes[tile] = static_cast<Distance>((solid & (solid + 1)) == 0 ? 0 : last - first);
 }
 
 /// Finds the nearest covered pixels beside each tile.
-inline void findNeighbours(TileInk* ink, int64_t tiles) {
-    int32_t nearest = -kFar;
+inline void findNeighbours(const InkRow& ink, int64_t tiles) {
+    int32_t distance = kBeyond;
     for (int64_t i = 0; i < tiles; ++i) {
-        ink[i].before = nearest;
-        if (ink[i].lanes != 0) nearest = static_cast<int32_t>(i) * kTile + lastLane(ink[i].lanes);
+        ink.before[i] = static_cast<Distance>(distance);
+        distance = smaller(smaller(distance, kBeyond) + kTile, kTile - ink.last[i]);
     }
-    nearest = kFar;
+    distance = kBeyond;
     for (int64_t i = tiles; i-- > 0;) {
-        ink[i].after = nearest;
-        if (ink[i].lanes != 0) nearest = static_cast<int32_t>(i) * kTile + firstLane(ink[i].lanes);
+        ink.after[i] = static_cast<Distance>(distance);
+        distance = smaller(smaller(distance, kBeyond) + kTile, 1 + ink.first[i]);
     }
-}
-
-/// Distance of a covered pixel from the nearest pixel of the tile.
-VOREL_INLINE int32_t smallestDistance(const TileInk& ink, int32_t start) {
-    const int32_t beside = smaller(start - ink.before, ink.after - (start + kTile - 1));
-    return ink.lanes != 0 ? 0 : beside;
-}
-
-/// Not less than the distance of the nearest covered pixel from any pixel of the tile. Between two
-/// covered pixels the distance rises to half of theirs; holes among the tile's own are taken as one.
-VOREL_INLINE int32_t largestDistance(const TileInk& ink, int32_t start) {
-    const int32_t end = start + kTile - 1;
-    if (ink.lanes == 0) {
-        return smaller(smaller(end - ink.before, ink.after - start), (ink.after - ink.before) / 2);
-    }
-    const int32_t first = firstLane(ink.lanes);
-    const int32_t last = lastLane(ink.lanes);
-    const int32_t left = smaller(first, (start + first - ink.before) / 2);
-    const int32_t right = smaller(kTile - 1 - last, (ink.after - start - last) / 2);
-    const uint64_t solid = ink.lanes >> (first * kLaneBits);
-    const int32_t between = (solid & (solid + 1)) == 0 ? 0 : (last - first) / 2;
-    return larger(larger(left, right), between);
 }
 
 inline void findInk(const Dilation& dilation, const TilePlanes& planes, int64_t y) {
@@ -180,25 +196,59 @@ inline void findInk(const Dilation& dilation, const TilePlanes& planes, int64_t 
     const Bytes most = spread<Bytes>(dilation.largest);
     for (int64_t tile = 0; tile < planes.tiles; tile += kBytes / kTile) {
         const Bytes coverage = load<Bytes>(source + tile * kTile);
-        const Bytes isMost = as<Bytes>(coverage == most) & coverage;
-        setLanes(planes.ink + tile, nonZeroLanes(coverage), planes.tiles - tile);
-        setLanes(planes.fullInk + tile, nonZeroLanes(isMost), planes.tiles - tile);
+        const uint64_t ink = nonZeroLanes(coverage);
+        const uint64_t isMost = nonZeroLanes(as<Bytes>(coverage == most) & coverage);
+        for (int i = 0; i < kBytes / kTile; ++i) {
+            noteInk(planes.ink, tile + i, ink >> (i * kTileBits % 64));
+            noteInk(planes.most, tile + i, isMost >> (i * kTileBits % 64));
+        }
     }
     findNeighbours(planes.ink, planes.tiles);
-    findNeighbours(planes.fullInk, planes.tiles);
+    findNeighbours(planes.most, planes.tiles);
+}
+
+/// Distance of a covered pixel from the nearest pixel of each tile.
+VOREL_INLINE Distances smallestDistance(const InkRow& ink, int64_t tile) {
+    const Distances beside =
+        smaller(load<Distances>(ink.before + tile), load<Distances>(ink.after + tile));
+    return load<Distances>(ink.last + tile) < 0 ? beside : Distances{};
+}
+
+/// Not less than the distance of the nearest covered pixel from any pixel of the tile: before its first
+/// one, behind its last one, and between these. From one covered pixel to the next the distance rises to
+/// half of theirs. Holes among the tile's own are taken as one.
+VOREL_INLINE Distances largestDistance(const InkRow& ink, int64_t tile) {
+    const Distances before = load<Distances>(ink.before + tile);
+    const Distances after = load<Distances>(ink.after + tile);
+    const Distances first = load<Distances>(ink.first + tile);
+    const Distances last = load<Distances>(ink.last + tile);
+    constexpr int16_t kEnd = kTile - 1;
+    const Distances empty = smaller(smaller(before, after) + kEnd, (before + after + kEnd) >> 1);
+    const Distances toFirst = smaller(first, (before + first) >> 1);
+    const Distances fromLast = smaller(kEnd - last, (after + kEnd - last) >> 1);
+    const Distances between = load<Distances>(ink.holes + tile) >> 1;
+    return last < 0 ? empty : larger(larger(toFirst, fromLast), between);
 }
 
 inline void noteReaches(const Dilation& dilation, const TilePlanes& planes, const Reached& reached,
                         int64_t y) {
-    const int32_t beyond = dilation.disc->reach + 1;
+    const Distances beyond = spread<Distances>(static_cast<Distance>(dilation.disc->reach + 1));
     Reach* const full = planes.full + y * planes.reachStride;
     Reach* const touched = planes.touched + y * planes.reachStride;
-    for (int64_t tile = 0; tile < planes.tiles; ++tile) {
-        const int32_t start = static_cast<int32_t>(tile) * kTile;
-        full[tile] = reached.full[smaller(largestDistance(planes.fullInk[tile], start), beyond)];
-        touched[tile] = reached.touched[smaller(smallestDistance(planes.ink[tile], start), beyond)];
-        planes.touching[tile * planes.touchingStride + y] =
-            static_cast<uint8_t>(smaller<int>(touched[tile] + 1, 255));
+    uint8_t* touching = planes.touching + y;
+    for (int64_t tile = 0; tile < planes.tiles; tile += kReachLanes) {
+        store(full + tile, smaller(largestDistance(planes.most, tile), beyond));
+        store(touched + tile, smaller(smallestDistance(planes.ink, tile), beyond));
+    }
+    for (int64_t tile = 0; tile < planes.tiles; ++tile, touching += planes.touchingStride) {
+        full[tile] = reached.full[full[tile]];
+        touched[tile] = reached.touched[touched[tile]];
+        *touching = static_cast<uint8_t>(smaller<int>(touched[tile] + 1, 255));
+    }
+    // The lanes behind the last tile agree with any other.
+    for (int64_t tile = planes.tiles; tile < planes.reachStride; ++tile) {
+        full[tile] = kBeyond;
+        touched[tile] = -1;
     }
 }
 
@@ -227,11 +277,45 @@ inline uint8_t largestOf(const PaddedRows& rows, int64_t height) {
     return result;
 }
 
-inline void listRimDeficits(const DiscShape& disc, Tile* deficits) {
-    const int cells =
-        disc.rimStart[disc.reach] + disc.outerReach[disc.reach] - disc.flatReach[disc.reach];
-    for (int i = 0; i < cells; ++i)
-        deficits[i] = spread<Tile>(disc.rimDeficit[i]);
+// --- The disc
+// -------------------------------------------------------------------------------------------
+
+/// Covers the run of full cells in a row with windows, the last of which may lie over its predecessor.
+inline int32_t* listFlatTaps(const TilePlanes& planes, const DiscShape& disc, int64_t reach,
+                             int32_t* taps) {
+    const int64_t length = 2 * reach + 1;
+    const uint8_t* plane = planes.rows.start;
+    int64_t step = 1;
+    for (int i = 0; i < 2 && length >= windowLength(disc, i); ++i) {
+        plane = planes.windows[i].start;
+        step = windowLength(disc, i);
+    }
+    const int64_t last = reach + 1 - step;
+    const int32_t* const start = taps;
+    for (int64_t dx = -reach; dx < last; dx += step)
+        *taps++ = static_cast<int32_t>(plane - planes.rows.start + dx);
+    *taps++ = static_cast<int32_t>(plane - planes.rows.start + last);
+    if ((taps - start) % 2 != 0) {
+        *taps = taps[-1];
+        ++taps;
+    }
+    return taps;
+}
+
+inline void listDiscRows(const TilePlanes& planes, const DiscShape& disc) {
+    int32_t* tap = planes.taps;
+    Tile* deficit = planes.rimDeficits;
+    for (int64_t dy = 0; dy <= disc.reach; ++dy) {
+        DiscRow& row = planes.discRows[dy];
+        row.firstTap = static_cast<int32_t>(tap - planes.taps);
+        if (disc.flatReach[dy] >= 0) tap = listFlatTaps(planes, disc, disc.flatReach[dy], tap);
+        row.endTap = static_cast<int32_t>(tap - planes.taps);
+        row.firstRim = disc.flatReach[dy] + 1;
+        row.endRim = disc.outerReach[dy] + 1;
+        row.deficits = deficit;
+        for (int32_t i = 0; i < row.endRim - row.firstRim; ++i)
+            *deficit++ = spread<Tile>(disc.rimDeficit[disc.rimStart[dy] + i]);
+    }
 }
 
 inline void beginTiles(Dilation& dilation) {
@@ -245,7 +329,7 @@ inline void beginTiles(Dilation& dilation) {
         widenWindows(windows, planes.windows[1].wholeRow(y), shortWindow, planes.rows.stride);
     }
     dilation.largest = largestOf(planes.rows, dilation.height);
-    listRimDeficits(*dilation.disc, planes.rimDeficits);
+    listDiscRows(planes, *dilation.disc);
 
     Reached reached;
     listReached(*dilation.disc, reached);
@@ -275,32 +359,15 @@ struct RowDistances {
 };
 constexpr RowDistances kRowDistances;
 
-/// The largest coverage under the full cells of a row of the disc, which reach that far to both sides.
-VOREL_INLINE Tile flatMaximum(const TilePlanes& planes, const DiscShape& disc, int64_t y, int64_t x,
-                              int64_t reach) {
-    const int64_t length = 2 * reach + 1;
-    const uint8_t* source = planes.rows.at(y) + x;
-    int64_t step = 1;
-    for (int plane = 0; plane < 2 && length >= windowLength(disc, plane); ++plane) {
-        source = planes.windows[plane].at(y) + x;
-        step = windowLength(disc, plane);
-    }
-    const int64_t last = reach + 1 - step;
-    Tile largest = load<Tile>(source + last);
-    for (int64_t dx = -reach; dx < last; dx += step)
-        largest = larger(largest, load<Tile>(source + dx));
-    return largest;
-}
-
-/// What a source row, dy rows away, adds to the tile at column x.
-VOREL_INLINE Tile dilatedRow(const TilePlanes& planes, const DiscShape& disc, int64_t y, int64_t dy,
-                             int64_t x) {
-    const int64_t flat = disc.flatReach[dy];
+/// What a source row adds to the tile whose place in it is `source`.
+VOREL_INLINE Tile dilatedRow(const TilePlanes& planes, const DiscRow& row, const uint8_t* source) {
     Tile result = {};
-    if (flat >= 0) result = flatMaximum(planes, disc, y, x, flat);
-    const uint8_t* const source = planes.rows.at(y) + x;
-    const Tile* deficit = planes.rimDeficits + disc.rimStart[dy];
-    for (int64_t dx = flat + 1; dx <= disc.outerReach[dy]; ++dx, ++deficit) {
+    for (int32_t i = row.firstTap; i < row.endTap; i += 2) {
+        const int32_t* const tap = planes.taps + i;
+        result = larger(result, larger(load<Tile>(source + tap[0]), load<Tile>(source + tap[1])));
+    }
+    const Tile* deficit = row.deficits;
+    for (int64_t dx = row.firstRim; dx < row.endRim; ++dx, ++deficit) {
         const Tile coverage = larger(load<Tile>(source - dx), load<Tile>(source + dx));
         result = larger(result, larger(coverage, *deficit) - *deficit);
     }
@@ -320,7 +387,8 @@ inline Tile dilatedTile(const Dilation& dilation, const TilePlanes& planes, int6
             const int lane = firstLane(touch);
             const int64_t row = first + lane;
             if (row >= end) break;
-            result = larger(result, dilatedRow(planes, disc, row, row < y ? y - row : row - y, x));
+            const DiscRow& discRow = planes.discRows[row < y ? y - row : row - y];
+            result = larger(result, dilatedRow(planes, discRow, planes.rows.at(row) + x));
             touch &= ~(((uint64_t{1} << kLaneBits) - 1) << lane * kLaneBits);
         }
     }
@@ -330,17 +398,27 @@ inline Tile dilatedTile(const Dilation& dilation, const TilePlanes& planes, int6
 inline void dilateRowByTiles(const Dilation& dilation, const TilePlanes& planes, int64_t y,
                              uint8_t* results) {
     const int64_t nearest = smaller(larger<int64_t>(y, 0), dilation.height - 1);
-    const int64_t away = y < nearest ? nearest - y : y - nearest;
+    const auto away = static_cast<Reach>(y < nearest ? nearest - y : y - nearest);
     const Reach* const full = planes.full + nearest * planes.reachStride;
     const Reach* const touched = planes.touched + nearest * planes.reachStride;
     const Tile most = spread<Tile>(dilation.largest);
-    for (int64_t tile = 0; tile < planes.tiles; ++tile, results += kTile) {
-        if (full[tile] >= away) {
-            store(results, most);
-        } else if (touched[tile] < away) {
-            store(results, Tile{});
+    const auto fill = [&](int64_t tile, int64_t end, Tile value) {
+        for (; tile < end; ++tile)
+            store(results + tile * kTile, value);
+    };
+    for (int64_t tile = 0; tile < planes.tiles; tile += kReachLanes) {
+        const int64_t end = smaller(tile + kReachLanes, planes.tiles);
+        if (allZero(as<Bytes>(load<Reaches>(full + tile) < away))) {
+            fill(tile, end, most);
+        } else if (allZero(as<Bytes>(load<Reaches>(touched + tile) >= away))) {
+            fill(tile, end, Tile{});
         } else {
-            store(results, dilatedTile(dilation, planes, y, tile));
+            for (int64_t i = tile; i < end; ++i) {
+                const bool isFull = full[i] >= away;
+                const bool isKnown = isFull || touched[i] < away;
+                store(results + i * kTile,
+                      isKnown ? isFull ? most : Tile{} : dilatedTile(dilation, planes, y, i));
+            }
         }
     }
 }
