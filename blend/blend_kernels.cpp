@@ -7,12 +7,8 @@
 namespace VFontEffect::internal::VOREL_LEVEL {
 namespace {
 
-bool emptyMask(const Place& place) {
-    return allZero(load<Bytes>(place.mask()));
-}
-
 /// Whether kBytes pixels of an image are nothing but zeros; the first of them mostly tell.
-VOREL_INLINE bool emptyImage(const Place& place) {
+VOREL_INLINE bool hasEmptyImage(const Place& place) {
     Bytes pixels = load<Bytes>(place.image());
     if (!allZero(pixels)) return false;
     for (int i = 1; i < 4; ++i)
@@ -28,7 +24,7 @@ struct MaskPainter {
     static constexpr Empty kEmpty = Rule::kEmpty;
     Pixels colour;
 
-    VOREL_INLINE bool isEmpty(const Place& place) const { return emptyMask(place); }
+    VOREL_INLINE bool isEmpty(const Place& place) const { return hasEmptyMask(place); }
     VOREL_INLINE Pixels paint(const Place& place) const {
         return Rule::apply(loadPixels(place.destination()), loadAmounts(place.mask()), colour);
     }
@@ -53,21 +49,23 @@ struct ImagePainter {
     static constexpr bool kReadsMask = false;
     static constexpr Empty kEmpty = Empty::keeps;
 
-    VOREL_INLINE bool isEmpty(const Place& place) const { return emptyImage(place); }
+    VOREL_INLINE bool isEmpty(const Place& place) const { return hasEmptyImage(place); }
     VOREL_INLINE Pixels paint(const Place& place) const {
         return Rule::apply(loadPixels(place.destination()), Load(place.image()));
     }
 };
 
-struct MixPainter {
+/// The image of bytes R, G, B, A and the mask.
+template <class Rule>
+struct MaskedImagePainter {
     static constexpr bool kReadsImage = true;
     static constexpr bool kReadsMask = true;
-    static constexpr Empty kEmpty = MixByCoverage::kEmpty;
+    static constexpr Empty kEmpty = Rule::kEmpty;
 
-    VOREL_INLINE bool isEmpty(const Place& place) const { return emptyMask(place); }
+    VOREL_INLINE bool isEmpty(const Place& place) const { return hasEmptyMask(place); }
     VOREL_INLINE Pixels paint(const Place& place) const {
-        return MixByCoverage::apply(loadPixels(place.destination()), loadPixels(place.image()),
-                                    loadAmounts(place.mask()));
+        return Rule::apply(loadPixels(place.destination()), loadPixels(place.image()),
+                           loadAmounts(place.mask()));
     }
 };
 
@@ -85,8 +83,9 @@ void blendImage(const BlendJob& job) {
     paintRows(ImagePainter<Rule, Load>{}, job);
 }
 
-void mixByCoverage(const BlendJob& job) {
-    paintRows(MixPainter{}, job);
+template <class Rule>
+void blendMaskedImage(const BlendJob& job) {
+    paintRows(MaskedImagePainter<Rule>{}, job);
 }
 
 void largerCoverage(const BlendJob& job) {
@@ -113,7 +112,8 @@ extern const BlendKernels kBlendKernels = {
     blendImage<DstOver, loadWords>,
     blendImage<DstOver, loadArgb>,
     blendImage<DstOver, loadPixels>,
-    mixByCoverage,
+    blendMaskedImage<DstOverWhereCovered>,
+    blendMaskedImage<MixByCoverage>,
     largerCoverage,
 };
 

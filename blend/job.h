@@ -16,4 +16,13 @@ inline BlendJob jobOn(const ColourView& target, const Clip& clip) {
     return job;
 }
 
+/// Row y of a job's mask and destination.
+inline BlendJob rowOf(const BlendJob& job, int64_t y) {
+    BlendJob row = job;
+    row.destination += y * job.destinationStride;
+    row.mask += y * job.maskStride;
+    row.height = 1;
+    return row;
+}
+
 }  // namespace VFontEffect::internal

@@ -35,6 +35,7 @@ struct BlendKernels {
     BlendKernel dstOverArgb;
     BlendKernel dstOverRgba;
     // The image of bytes R, G, B, A and the mask.
+    BlendKernel dstOverWhereCovered;
     BlendKernel mixByCoverage;
     // The mask into a destination of 1 byte a pixel.
     BlendKernel largerCoverage;

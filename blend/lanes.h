@@ -4,6 +4,7 @@
 #include <cstring>
 
 #include "core/inline.h"
+#include "core/numeric.h"
 
 #if !defined(VOREL_SCALAR) && defined(__x86_64__)
 #include <immintrin.h>
@@ -74,9 +75,20 @@ VOREL_INLINE V smaller(V a, V b) {
 //   subSaturated   a - b, at least 0
 //   multiplyHigh   the upper 16 bits of 32-bit products
 //   allZero        whether no lane holds anything but 0
-//   nonZeroLanes   kLaneBits ones for each lane that holds anything but 0, those of the first lane
-//   lowest fourthBytes    of each word its highest byte, in both halves of the word firstAndThirdSwapped
-//   each word's bytes 0 1 2 3 as 2 1 0 3
+//   nonZeroLanes   kLaneBits ones for each lane that holds anything but 0, the first lane's lowest
+//   loadInPairs    kWords bytes of memory, each in both halves of its word (not on NEON)
+//   highBytesInPairs   of each word its highest byte, in both halves of the word (not on NEON)
+//   endsSwapped    bytes 0 1 2 3 of each word as 2 1 0 3 (not on NEON)
+//   toInt          as core/numeric.h converts: toward zero, saturating, NaN to 0
+//   squareRoot     correctly rounded
+//   gathered       the words of a table at the given indices
+
+#if !defined(VOREL_SCALAR) && defined(__x86_64__)
+/// x86 converts what does not fit to the lowest integer: made the highest above the range, 0 for NaN.
+VOREL_INLINE Integers saturated(Floats value, Integers converted) {
+    return (converted ^ (value >= 2147483648.0F)) & (value == value);
+}
+#endif
 
 #if defined(VOREL_SCALAR)
 
@@ -97,6 +109,24 @@ VOREL_INLINE bool allZero(Bytes v) {
 constexpr int kLaneBits = 8;
 VOREL_INLINE uint64_t nonZeroLanes(Bytes v) {
     return as<Words>(v != 0)[0];
+}
+VOREL_INLINE Halves loadInPairs(const uint8_t* from) {
+    return as<Halves>(Words{*from * 0x10001U});
+}
+VOREL_INLINE Halves highBytesInPairs(Bytes v) {
+    return as<Halves>((as<Words>(v) >> 24) * 0x10001U);
+}
+VOREL_INLINE Bytes endsSwapped(Bytes v) {
+    return Bytes{v[2], v[1], v[0], v[3]};
+}
+VOREL_INLINE Integers toInt(Floats v) {
+    return Integers{internal::toInt(v[0])};
+}
+VOREL_INLINE Floats squareRoot(Floats v) {
+    return Floats{__builtin_sqrtf(v[0])};
+}
+VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
+    return Words{table[indices[0]]};
 }
 
 #elif defined(__AVX512BW__)
@@ -121,6 +151,27 @@ VOREL_INLINE uint64_t nonZeroLanes(Bytes v) {
 VOREL_INLINE Bytes shuffled(Bytes v, __m128i indices) {
     return as<Bytes>(_mm512_shuffle_epi8(as<__m512i>(v), _mm512_broadcast_i32x4(indices)));
 }
+VOREL_INLINE Halves loadInPairs(const uint8_t* from) {
+    const __m512i words = _mm512_cvtepu8_epi32(_mm_loadu_si128(reinterpret_cast<const __m128i*>(from)));
+    return as<Halves>(shuffled(as<Bytes>(words),
+                               _mm_setr_epi8(0, -1, 0, -1, 4, -1, 4, -1, 8, -1, 8, -1, 12, -1, 12, -1)));
+}
+VOREL_INLINE Halves highBytesInPairs(Bytes v) {
+    return as<Halves>(
+        shuffled(v, _mm_setr_epi8(3, -1, 3, -1, 7, -1, 7, -1, 11, -1, 11, -1, 15, -1, 15, -1)));
+}
+VOREL_INLINE Bytes endsSwapped(Bytes v) {
+    return shuffled(v, _mm_setr_epi8(2, 1, 0, 3, 6, 5, 4, 7, 10, 9, 8, 11, 14, 13, 12, 15));
+}
+VOREL_INLINE Integers toInt(Floats v) {
+    return saturated(v, as<Integers>(_mm512_cvttps_epi32(as<__m512>(v))));
+}
+VOREL_INLINE Floats squareRoot(Floats v) {
+    return as<Floats>(_mm512_sqrt_ps(as<__m512>(v)));
+}
+VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
+    return as<Words>(_mm512_i32gather_epi32(as<__m512i>(indices), table, 4));
+}
 
 #elif defined(__AVX2__)
 
@@ -144,6 +195,28 @@ VOREL_INLINE uint64_t nonZeroLanes(Bytes v) {
 VOREL_INLINE Bytes shuffled(Bytes v, __m128i indices) {
     return as<Bytes>(_mm256_shuffle_epi8(as<__m256i>(v), _mm256_broadcastsi128_si256(indices)));
 }
+VOREL_INLINE Halves loadInPairs(const uint8_t* from) {
+    const __m256i words = _mm256_cvtepu8_epi32(_mm_loadl_epi64(reinterpret_cast<const __m128i*>(from)));
+    return as<Halves>(shuffled(as<Bytes>(words),
+                               _mm_setr_epi8(0, -1, 0, -1, 4, -1, 4, -1, 8, -1, 8, -1, 12, -1, 12, -1)));
+}
+VOREL_INLINE Halves highBytesInPairs(Bytes v) {
+    return as<Halves>(
+        shuffled(v, _mm_setr_epi8(3, -1, 3, -1, 7, -1, 7, -1, 11, -1, 11, -1, 15, -1, 15, -1)));
+}
+VOREL_INLINE Bytes endsSwapped(Bytes v) {
+    return shuffled(v, _mm_setr_epi8(2, 1, 0, 3, 6, 5, 4, 7, 10, 9, 8, 11, 14, 13, 12, 15));
+}
+VOREL_INLINE Integers toInt(Floats v) {
+    return saturated(v, as<Integers>(_mm256_cvttps_epi32(as<__m256>(v))));
+}
+VOREL_INLINE Floats squareRoot(Floats v) {
+    return as<Floats>(_mm256_sqrt_ps(as<__m256>(v)));
+}
+VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
+    return as<Words>(
+        _mm256_i32gather_epi32(reinterpret_cast<const int*>(table), as<__m256i>(indices), 4));
+}
 
 #elif defined(__x86_64__)
 
@@ -163,6 +236,31 @@ constexpr int kLaneBits = 1;
 VOREL_INLINE uint64_t nonZeroLanes(Bytes v) {
     return static_cast<uint32_t>(_mm_movemask_epi8(as<__m128i>(v != 0)));
 }
+VOREL_INLINE Halves loadInPairs(const uint8_t* from) {
+    const __m128i halves = _mm_unpacklo_epi8(_mm_cvtsi32_si128(load<int>(from)), _mm_setzero_si128());
+    return as<Halves>(_mm_unpacklo_epi16(halves, halves));
+}
+/// Moves the halves of each word: both take the one that `selector` names for them.
+template <int kSelector>
+VOREL_INLINE Halves halvesMoved(Halves v) {
+    return as<Halves>(_mm_shufflehi_epi16(_mm_shufflelo_epi16(as<__m128i>(v), kSelector), kSelector));
+}
+VOREL_INLINE Halves highBytesInPairs(Bytes v) {
+    return halvesMoved<_MM_SHUFFLE(3, 3, 1, 1)>(as<Halves>(v) >> 8);
+}
+VOREL_INLINE Bytes endsSwapped(Bytes v) {
+    const Halves ends = as<Halves>(v) & 0x00FF;
+    return v ^ as<Bytes>(ends) ^ as<Bytes>(halvesMoved<_MM_SHUFFLE(2, 3, 0, 1)>(ends));
+}
+VOREL_INLINE Integers toInt(Floats v) {
+    return saturated(v, as<Integers>(_mm_cvttps_epi32(as<__m128>(v))));
+}
+VOREL_INLINE Floats squareRoot(Floats v) {
+    return as<Floats>(_mm_sqrt_ps(as<__m128>(v)));
+}
+VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
+    return Words{table[indices[0]], table[indices[1]], table[indices[2]], table[indices[3]]};
+}
 
 #else
 
@@ -177,8 +275,23 @@ VOREL_INLINE bool allZero(Bytes v) {
 }
 constexpr int kLaneBits = 4;
 VOREL_INLINE uint64_t nonZeroLanes(Bytes v) {
-    const uint16x8_t all = vreinterpretq_u16_u8(as<uint8x16_t>(v != 0));
-    return vget_lane_u64(vreinterpret_u64_u8(vshrn_n_u16(all, 4)), 0);
+    const uint16x8_t nonZero = as<uint16x8_t>(v != 0);
+    return vget_lane_u64(vreinterpret_u64_u8(vshrn_n_u16(nonZero, 4)), 0);
+}
+VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
+    const auto x = as<uint16x8_t>(a);
+    const auto y = as<uint16x8_t>(b);
+    const uint32x4_t low = vmull_u16(vget_low_u16(x), vget_low_u16(y));
+    return as<Halves>(vuzp2q_u16(as<uint16x8_t>(low), as<uint16x8_t>(vmull_high_u16(x, y))));
+}
+VOREL_INLINE Integers toInt(Floats v) {
+    return as<Integers>(vcvtq_s32_f32(as<float32x4_t>(v)));
+}
+VOREL_INLINE Floats squareRoot(Floats v) {
+    return as<Floats>(vsqrtq_f32(as<float32x4_t>(v)));
+}
+VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
+    return Words{table[indices[0]], table[indices[1]], table[indices[2]], table[indices[3]]};
 }
 
 #endif

@@ -117,7 +117,6 @@ struct Pixels {
 struct Amounts {
     Halves halves;  // a pixel's amount in both halves of its word
 };
-using Where = Words;  // all ones or all zeros for each pixel
 
 constexpr uint16_t kEvenByte = 0x00FF;
 constexpr uint16_t kOddByte = 0xFF00;
@@ -132,14 +131,7 @@ VOREL_INLINE void storePixels(uint8_t* to, const Pixels& pixels) {
 
 /// From words 0xAARRGGBB: memory order B, G, R, A.
 VOREL_INLINE Pixels loadWords(const uint8_t* from) {
-#if !defined(VOREL_SCALAR) && defined(__AVX2__)
-    return {shuffled(load<Bytes>(from),
-                     _mm_setr_epi8(2, 1, 0, 3, 6, 5, 4, 7, 10, 9, 8, 11, 14, 13, 12, 15))};
-#else
-    const Words words = load<Words>(from);
-    const Words redAndBlue = words & 0x00FF00FFU;
-    return {as<Bytes>((words ^ redAndBlue) | redAndBlue << 16 | redAndBlue >> 16)};
-#endif
+    return {endsSwapped(load<Bytes>(from))};
 }
 /// From memory order A, R, G, B.
 VOREL_INLINE Pixels loadArgb(const uint8_t* from) {
@@ -147,9 +139,7 @@ VOREL_INLINE Pixels loadArgb(const uint8_t* from) {
     return {as<Bytes>(words >> 8 | words << 24)};
 }
 VOREL_INLINE Amounts loadAmounts(const uint8_t* from) {
-    using MaskBytes = uint8_t __attribute__((vector_size(kPixels)));
-    const Words amounts = __builtin_convertvector(load<MaskBytes>(from), Words);
-    return {as<Halves>(amounts | amounts << 16)};
+    return {loadInPairs(from)};
 }
 
 /// The same colour word 0xAARRGGBB in every pixel.
@@ -159,33 +149,55 @@ VOREL_INLINE Pixels spreadColour(uint32_t color) {
 }
 
 VOREL_INLINE Amounts alphaOf(const Pixels& p) {
-#if !defined(VOREL_SCALAR) && defined(__AVX2__)
-    return {as<Halves>(
-        shuffled(p.bytes, _mm_setr_epi8(3, -1, 3, -1, 7, -1, 7, -1, 11, -1, 11, -1, 15, -1, 15, -1)))};
-#else
-    const Words alpha = as<Words>(p.bytes) >> 24;
-    return {as<Halves>(alpha | alpha << 16)};
-#endif
+    return {highBytesInPairs(p.bytes)};
 }
 VOREL_INLINE Amounts inverse(Amounts a) {
     return {a.halves ^ kEvenByte};
 }
+
+#if !defined(VOREL_SCALAR) && defined(__AVX512BW__)
+
+using Where = __mmask16;  // one bit for each pixel
+
 VOREL_INLINE Where isZero(Amounts a) {
-    return as<Where>(as<Words>(a.halves) == 0);
+    return _mm512_testn_epi32_mask(as<__m512i>(a.halves), as<__m512i>(a.halves));
 }
 VOREL_INLINE Where isTransparent(const Pixels& p) {
-    return as<Where>((as<Words>(p.bytes) & kAlphaByte) == 0);
+    return _mm512_testn_epi32_mask(as<__m512i>(p.bytes), as<__m512i>(spread<Words>(kAlphaByte)));
+}
+VOREL_INLINE Amounts raisedToFull(Where where, Amounts a) {
+    return {as<Halves>(
+        _mm512_mask_mov_epi32(as<__m512i>(a.halves), where, as<__m512i>(spread<Halves>(kEvenByte))))};
+}
+VOREL_INLINE Pixels kept(Where where, const Pixels& p) {
+    return {as<Bytes>(_mm512_maskz_mov_epi32(where, as<__m512i>(p.bytes)))};
+}
+VOREL_INLINE Pixels cleared(Where where, const Pixels& p) {
+    return {as<Bytes>(_mm512_mask_mov_epi32(as<__m512i>(p.bytes), where, __m512i{}))};
+}
+
+#else
+
+using Where = Words;  // all ones or all zeros for each pixel
+
+VOREL_INLINE Where isZero(Amounts a) {
+    return as<Where>(a.halves == 0);
+}
+VOREL_INLINE Where isTransparent(const Pixels& p) {
+    return as<Where>(as<Words>(p.bytes) >> 24 == 0);
 }
 VOREL_INLINE Amounts raisedToFull(Where where, Amounts a) {
     return {a.halves | (as<Halves>(where) & kEvenByte)};
 }
-
 VOREL_INLINE Pixels kept(Where where, const Pixels& p) {
     return {p.bytes & as<Bytes>(where)};
 }
 VOREL_INLINE Pixels cleared(Where where, const Pixels& p) {
     return {p.bytes & as<Bytes>(~where)};
 }
+
+#endif
+
 VOREL_INLINE Pixels added(const Pixels& a, const Pixels& b) {
     return {addSaturated(a.bytes, b.bytes)};
 }

@@ -29,6 +29,11 @@ struct Place {
     VOREL_INLINE const uint8_t* mask() const { return row.maskStart + x; }
 };
 
+/// Whether the mask is 0 for kBytes pixels.
+VOREL_INLINE bool hasEmptyMask(const Place& place) {
+    return allZero(load<Bytes>(place.mask()));
+}
+
 /// Paints a whole stretch of kBytes pixels that is empty.
 VOREL_INLINE void paintEmpty(Empty what, const Place& place) {
     if (what == Empty::clears) std::memset(place.destination(), 0, 4 * kBytes);
@@ -49,29 +54,45 @@ VOREL_INLINE void paintShortRow(const Painter& painter, const Row& row, int64_t 
     std::memcpy(row.destinationStart, destination, 4 * pixels);
 }
 
-/// The last vector ends with the row, over pixels that the loop painted too: it is computed from what
-/// the row held before, and stored when the loop is done.
+/// Pixels from `destination` to the next address where a vector lies within one line of the cache.
+VOREL_INLINE int64_t pixelsToAlignment(const uint8_t* destination) {
+    return static_cast<int64_t>((0 - reinterpret_cast<uintptr_t>(destination)) / 4 % kPixels);
+}
+
+/// Paints pixels x to `end`, in whole vectors.
 template <class Painter>
-VOREL_INLINE void paintRow(const Painter& painter, const Row& row, int64_t count) {
-    if (count < kPixels) return paintShortRow(painter, row, count);
-    const Place last = {row, count - kPixels};
-    const Pixels lastPixels = painter.paint(last);
-    int64_t x = 0;
-    while (x < last.x) {
-        int64_t stretchEnd = last.x;
-        if (last.x - x >= kBytes) {
-            stretchEnd = x + kBytes;
-            if (painter.isEmpty({row, x})) {
-                paintEmpty(Painter::kEmpty, {row, x});
-                x = stretchEnd;
-                continue;
-            }
-        }
-        for (; x < stretchEnd; x += kPixels) {
-            const Place place = {row, x};
-            storePixels(place.destination(), painter.paint(place));
+VOREL_INLINE void paintVectors(const Painter& painter, const Row& row, int64_t x, int64_t end) {
+    for (; x < end; x += kPixels) {
+        const Place place = {row, x};
+        storePixels(place.destination(), painter.paint(place));
+    }
+}
+
+/// Paints from `x` on, in whole vectors, as far as `end`, and leaves empty stretches early.
+template <class Painter>
+VOREL_INLINE void paintStretches(const Painter& painter, const Row& row, int64_t x, int64_t end) {
+    for (; end - x >= kBytes; x += kBytes) {
+        if (painter.isEmpty({row, x})) {
+            paintEmpty(Painter::kEmpty, {row, x});
+        } else {
+            paintVectors(painter, row, x, x + kBytes);
         }
     }
+    paintVectors(painter, row, x, end);
+}
+
+/// The first and the last vector begin and end with the row, and the loop between them keeps to whole
+/// lines of the cache: the three overlap. So the two are computed from what the row held before, and
+/// stored when the loop is done.
+template <class Painter>
+VOREL_INLINE void paintRow(const Painter& painter, const Row& row, int64_t count) {
+    if (kPixels > 1 && count < kPixels) return paintShortRow(painter, row, count);
+    const Place first = {row, 0};
+    const Place last = {row, count - kPixels};
+    const Pixels firstPixels = painter.paint(first);
+    const Pixels lastPixels = painter.paint(last);
+    paintStretches(painter, row, pixelsToAlignment(row.destinationStart), last.x);
+    storePixels(first.destination(), firstPixels);
     storePixels(last.destination(), lastPixels);
 }
 

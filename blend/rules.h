@@ -14,8 +14,9 @@ enum class Empty { keeps, clears, copiesImage };
 /// `source` under the destination, in the pixels that are `painted`; elsewhere source must be 0. Over a
 /// transparent destination it takes the pixel whole, whatever colour channels stood there.
 VOREL_INLINE Pixels under(const Pixels& d, const Pixels& source, Where painted) {
-    const Pixels base = cleared(isTransparent(d) & painted, d);
-    return added(base, scaled(source, inverse(alphaOf(d))));
+    const Amounts alpha = alphaOf(d);
+    const Pixels base = cleared(isZero(alpha) & painted, d);
+    return added(base, scaled(source, inverse(alpha)));
 }
 
 // --- One colour through a mask --------------------------------------------------------------------
@@ -60,8 +61,9 @@ struct DstOverClip {
     static constexpr Empty kEmpty = Empty::clears;
 
     static VOREL_INLINE Pixels apply(const Pixels& d, Amounts mask, const Pixels& colour) {
-        const Where empty = isTransparent(d);
-        const Pixels beneath = scaled(scaled(colour, mask), inverse(alphaOf(d)));
+        const Amounts alpha = alphaOf(d);
+        const Where empty = isZero(alpha);
+        const Pixels beneath = scaled(scaled(colour, mask), inverse(alpha));
         return scaledSum(cleared(empty, d), beneath, raisedToFull(empty, mask));
     }
 };
@@ -80,6 +82,15 @@ struct DstOver {
     static VOREL_INLINE Pixels apply(const Pixels& d, const Pixels& source) {
         const Where painted = ~isTransparent(source);
         return under(d, kept(painted, source), painted);
+    }
+};
+
+/// Source under destination wherever the mask is not 0. Deliberate: the mask does not scale it.
+struct DstOverWhereCovered {
+    static constexpr Empty kEmpty = Empty::keeps;
+
+    static VOREL_INLINE Pixels apply(const Pixels& d, const Pixels& source, Amounts mask) {
+        return DstOver::apply(d, cleared(isZero(mask), source));
     }
 };
 

@@ -3,16 +3,18 @@
 #include <cstdint>
 #include <limits>
 
+#include "core/inline.h"
+
 namespace VFontEffect::internal {
 
 /// Every conversion from floating point to a signed integer goes through here: toward zero,
 /// saturating at the limits of 32 bits, NaN to 0, as 64-bit ARM converts. A plain cast would be
 /// undefined outside the range and differs between CPUs.
 template <class Real>
-inline int32_t toInt(Real value) {
+VOREL_INLINE int32_t toInt(Real value) {
     if (!(value == value)) return 0;
-    if (value >= static_cast<Real>(2147483648.0)) return std::numeric_limits<int32_t>::max();
-    if (value < static_cast<Real>(-2147483648.0)) return std::numeric_limits<int32_t>::min();
+    if (value >= static_cast<Real>(2147483648.0)) return INT32_MAX;
+    if (value < static_cast<Real>(-2147483648.0)) return INT32_MIN;
     return static_cast<int32_t>(value);
 }
 

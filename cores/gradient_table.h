@@ -1,6 +1,5 @@
 #pragma once
 
-#include <algorithm>
 #include <cstdint>
 
 #include "cores/covered_fill.h"
@@ -14,13 +13,10 @@ class GradientTable {
     /// `count` of 1 or more stops.
     GradientTable(const VFGradient* stops, int count);
 
-    /// The colour of an index in 0..255; others are clamped to the ends.
-    uint32_t at(int64_t index) const { return mColours[std::clamp<int64_t>(index, 0, kLastRead)]; }
+    RampPixels pixels() const { return mPixels; }
 
   private:
-    static constexpr int64_t kLastRead = 255;
-
-    uint32_t mColours[kTableSize];
+    uint32_t mPixels[kTableSize];
 };
 
 /// Whether a gradient record has what it takes to draw.

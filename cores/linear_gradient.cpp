@@ -20,8 +20,6 @@ namespace {
 /// seven digits, a little below pi / 180.
 constexpr float kRadiansPerDegree = -0.01745328F;
 
-constexpr int64_t kMiddleIndex = 128;
-
 /// The length of the line through the centre of a w x h box at an angle.
 float lengthAcross(float angle, float w, float h) {
     if (std::fabs(portableTan(angle)) < h / w) return w / std::fabs(portableCos(angle));
@@ -55,17 +53,9 @@ void VFLinearGradient::doPostProcessing(ParamPostProcessing* params) {
     const auto h = static_cast<float>(box.height);
     const float angle = mProperty->mAngle * kRadiansPerDegree;
     const float step = (256.0F / mProperty->mScale) / lengthAcross(angle, w, h);
-    const float stepX = portableCos(angle) * step;
-    const float stepY = portableSin(angle) * step;
-    const float centreX = w * 0.5F;
-    const float centreY = h * 0.5F;
-    fillCovered(box, params->dstBitmap, [&](int64_t y) {
-        const float rowTerm = stepY * (static_cast<float>(y) - centreY);
-        return [&table, rowTerm, stepX, centreX](int64_t x) {
-            const float t = rowTerm + stepX * (static_cast<float>(x) - centreX);
-            return table.at(int64_t{toInt(t)} + kMiddleIndex);
-        };
-    });
+    const LinearRamp ramp = {table.pixels(), portableCos(angle) * step, portableSin(angle) * step,
+                             w * 0.5F, h * 0.5F};
+    fillCovered(box, params->dstBitmap, [&](const FillJob& job) { fillKernels().linear(job, ramp); });
 }
 
 }  // namespace VFontEffect

@@ -1,10 +1,11 @@
 #include <algorithm>
 #include <cmath>
 #include <cstdint>
+#include <cstring>
 
 #include "core/effect_types.h"
-#include "core/fixed_point.h"
 #include "core/numeric.h"
+#include "core/pixel_buffer.h"
 #include "cores/covered_fill.h"
 #include "cores/paint_input.h"
 #include "cores/property_copy.h"
@@ -18,8 +19,8 @@ namespace {
 
 /// Two neighbouring pattern pixels on one axis and their weights, which add up to 255.
 struct Tap {
-    int64_t near;
-    int64_t far;
+    int32_t near;
+    int32_t far;
     uint32_t nearWeight;
     uint32_t farWeight;
 };
@@ -39,8 +40,12 @@ class TileAxis {
         const auto farWeight =
             static_cast<uint32_t>(std::clamp(toInt((position - whole) * 255.0F), 0, 255));
         const int64_t near = std::clamp<int64_t>(toInt(whole), 0, mPatternSize - 1);
-        return {near, near + 1 < mPatternSize ? near + 1 : 0, 255 - farWeight, farWeight};
+        const int64_t far = near + 1 < mPatternSize ? near + 1 : 0;
+        return {static_cast<int32_t>(near), static_cast<int32_t>(far), 255 - farWeight, farWeight};
     }
+
+    /// Output pixels after which the taps repeat.
+    int64_t period() const { return mTileSize; }
 
   private:
     int64_t mPatternSize;
@@ -48,27 +53,111 @@ class TileAxis {
     int64_t mTileSize;
 };
 
-/// The mix of four bytes. Deliberate: weights of 255 and a shift by 16 sample an opaque pattern as 253.
-uint32_t mixed(uint32_t nearNear, uint32_t farNear, uint32_t nearFar, uint32_t farFar, const Tap& x,
-               const Tap& y) {
-    const uint32_t upper = nearNear * x.nearWeight + farNear * x.farWeight;
-    const uint32_t lower = nearFar * x.nearWeight + farFar * x.farWeight;
-    return ((upper * y.nearWeight + lower * y.farWeight) >> 16) & 0xFFU;
-}
+/// The taps of the first columns of a box.
+class TapRow {
+  public:
+    TapRow(const TileAxis& columns, int64_t count)
+        : mWords(PixelBuffer<uint32_t>::zeroed(count + kRowSlack, 4)), mLength(count + kRowSlack) {
+        if (!mWords) return;
+        for (int64_t x = 0; x < count; ++x) {
+            const Tap tap = columns.at(x);
+            plane(0)[x] = static_cast<uint32_t>(tap.near);
+            plane(1)[x] = static_cast<uint32_t>(tap.far);
+            plane(2)[x] = tap.nearWeight * kBothHalves;
+            plane(3)[x] = tap.farWeight * kBothHalves;
+        }
+    }
 
-/// The pattern sampled between four pixels, its alpha times the opacity, premultiplied.
-uint32_t sample(const ColourView& pattern, const Tap& x, const Tap& y, float opacity) {
-    const unsigned char* const nearNear = pattern.at(x.near, y.near);
-    const unsigned char* const farNear = pattern.at(x.far, y.near);
-    const unsigned char* const nearFar = pattern.at(x.near, y.far);
-    const unsigned char* const farFar = pattern.at(x.far, y.far);
-    // Deliberate: pattern pixels stand in memory as A, R, G, B, unlike the destination's.
-    const auto channel = [&](int k) {
-        return mixed(nearNear[k], farNear[k], nearFar[k], farFar[k], x, y);
+    explicit operator bool() const { return static_cast<bool>(mWords); }
+    ColumnTaps taps() {
+        return {reinterpret_cast<const int32_t*>(plane(0)), reinterpret_cast<const int32_t*>(plane(1)),
+                plane(2), plane(3)};
+    }
+
+  private:
+    static constexpr uint32_t kBothHalves = 0x00010001U;
+
+    uint32_t* plane(int64_t index) { return mWords.data() + index * mLength; }
+
+    PixelBuffer<uint32_t> mWords;
+    int64_t mLength;
+};
+
+/// The pattern as it lies under the box, row by row; of what repeats along a row, one tile is sampled.
+///
+/// A pixel is the sum of four pattern pixels times both their weights. No step of it is rounded, so it
+/// may be mixed along the columns first, once for each row of the pattern, and the output rows between
+/// two pattern rows share these.
+class TiledRows {
+  public:
+    TiledRows(const ColourView& pattern, float scale, float opacity, int64_t width)
+        : mPattern(pattern),
+          mRows(pattern.height, scale),
+          mOpacity(opacity),
+          mWidth(width),
+          mSampled(std::min(width, TileAxis(pattern.width, scale).period())),
+          mTaps(TileAxis(pattern.width, scale), mSampled),
+          mMixed{KeptRow(mSampled), KeptRow(mSampled)},
+          mRow(PixelBuffer<uint32_t>::uninitialised(width + kRowSlack)) {}
+
+    /// False when memory ran out.
+    explicit operator bool() const { return mTaps && mMixed[0].planes && mMixed[1].planes && mRow; }
+
+    const uint32_t* at(int64_t y) {
+        const Tap rows = mRows.at(y);
+        const MixedRow near = mixedRow(rows.near, rows.far);
+        const MixedRow far = mixedRow(rows.far, rows.near);
+        fillKernels().mixRows(near, far, rows.nearWeight, rows.farWeight, mOpacity, mSampled,
+                              mRow.data());
+        repeat();
+        return mRow.data();
+    }
+
+  private:
+    static constexpr int32_t kNoRow = -1;
+
+    /// A pattern row mixed along its columns.
+    struct KeptRow {
+        explicit KeptRow(int64_t width)
+            : planes(PixelBuffer<uint32_t>::uninitialised(width + kRowSlack, 2)),
+              length(width + kRowSlack) {}
+
+        MixedRow mixed() { return {planes.data(), planes.data() + length}; }
+
+        PixelBuffer<uint32_t> planes;
+        int64_t length;
+        int32_t row = kNoRow;
     };
-    const auto alpha = static_cast<uint32_t>(toInt(static_cast<float>(channel(0)) * opacity));
-    return premultiply(alpha << 24 | channel(1) << 16 | channel(2) << 8 | channel(3));
-}
+
+    /// The mixed row of the pattern, in the place of whichever kept one is not `other`.
+    MixedRow mixedRow(int32_t row, int32_t other) {
+        for (KeptRow& kept : mMixed) {
+            if (kept.row == row) return kept.mixed();
+        }
+        KeptRow& replaced = mMixed[0].row == other ? mMixed[1] : mMixed[0];
+        replaced.row = row;
+        const auto* const words = reinterpret_cast<const uint32_t*>(mPattern.at(0, row));
+        fillKernels().mixColumns(words, mTaps.taps(), mSampled, replaced.mixed());
+        return replaced.mixed();
+    }
+
+    /// Copies the tile to the rest of the row, twice as much each time.
+    void repeat() {
+        for (int64_t done = mSampled; done < mWidth; done *= 2) {
+            const int64_t count = std::min(done, mWidth - done);
+            std::memcpy(mRow.data() + done, mRow.data(), static_cast<size_t>(count) * sizeof(uint32_t));
+        }
+    }
+
+    ColourView mPattern;
+    TileAxis mRows;
+    float mOpacity;
+    int64_t mWidth;
+    int64_t mSampled;
+    TapRow mTaps;
+    KeptRow mMixed[2];
+    PixelBuffer<uint32_t> mRow;
+};
 
 /// The covered box. Unlike the other cores' boxes, one larger than the mask is first cut to the mask's
 /// size; unless it starts at the left or top edge it still leaves the mask then, and nothing is drawn.
@@ -105,13 +194,14 @@ void VFPattern::doPostProcessing(ParamPostProcessing* params) {
     const ColourView pattern = ColourView::of(mProperty->mPattern);
     if (!pattern || pattern.width == 0 || pattern.height == 0) return;
 
-    const TileAxis columns(pattern.width, mProperty->mScale);
-    const TileAxis rows(pattern.height, mProperty->mScale);
-    const float opacity = clampOrLow(mProperty->mOpacity, 0.0F, 1.0F);
-    fillCovered(box, params->dstBitmap, [&](int64_t y) {
-        return [&, rowTap = rows.at(y)](int64_t x) {
-            return sample(pattern, columns.at(x), rowTap, opacity);
-        };
+    TiledRows rows(pattern, mProperty->mScale, clampOrLow(mProperty->mOpacity, 0.0F, 1.0F), box.width);
+    if (!rows) return;
+    fillCovered(box, params->dstBitmap, [&](const FillJob& job) {
+        for (int64_t y = 0; y < job.blend.height; ++y) {
+            BlendJob row = rowOf(job.blend, y);
+            row.image = reinterpret_cast<const uint8_t*>(rows.at(job.top + y) + job.left);
+            blendKernels().dstOverWhereCovered(row);
+        }
     });
 }
 

@@ -37,15 +37,8 @@ void VFRadialGradient::doPostProcessing(ParamPostProcessing* params) {
     // Deliberate: the radius is measured by the width alone, so a tall box ends in a plain colour.
     const auto w = static_cast<float>(box.width);
     const float step = (256.0F / w + 256.0F / w) / mProperty->mScale;
-    const float centreX = w * 0.5F;
-    const float centreY = static_cast<float>(box.height) * 0.5F;
-    fillCovered(box, params->dstBitmap, [&](int64_t y) {
-        const float down = static_cast<float>(y) - centreY;
-        return [&table, rowTerm = down * down, step, centreX](int64_t x) {
-            const float across = static_cast<float>(x) - centreX;
-            return table.at(toInt(step * std::sqrt(rowTerm + across * across)));
-        };
-    });
+    const RadialRamp ramp = {table.pixels(), step, w * 0.5F, static_cast<float>(box.height) * 0.5F};
+    fillCovered(box, params->dstBitmap, [&](const FillJob& job) { fillKernels().radial(job, ramp); });
 }
 
 }  // namespace VFontEffect

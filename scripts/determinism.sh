@@ -1,61 +1,57 @@
 #!/usr/bin/env bash
-# Builds the library and its table of hashes with every compiler, level and CPU at hand, and compares
-# each with tests/determinism/hashes.txt. Prints one line per build; fails when any differs.
+# Builds the library and its table of hashes with every compiler, optimisation and CPU at hand, paints
+# it at every level of the instruction set that the CPU has, and compares each with
+# tests/determinism/hashes.txt. Prints one line per build and level; fails when any differs.
 #
 #     scripts/determinism.sh            compares
 #     scripts/determinism.sh --update   writes the file anew, painted by the literal engine
 set -euo pipefail
 cd "$(dirname "$0")/.."
 . scripts/packages.sh
-need_packages g++ clang-14 libc++-14-dev libc++abi-14-dev g++-aarch64-linux-gnu qemu-user-static
+need_packages cmake ninja-build g++ clang-14 libc++-14-dev libc++abi-14-dev pkg-config googletest libgtest-dev \
+    libstb-dev android-liblog-dev libfreetype-dev fonts-dejavu-core g++-aarch64-linux-gnu qemu-user-static
 
 table=tests/determinism/hashes.txt
 out=build/determinism
-mkdir -p "$out"
-sources=(core/*.cpp property/*.cpp blend/*.cpp cores/*.cpp effect/*.cpp tests/determinism/hashes.cpp
-    tests/support/literal_{blend,cores,engine}.cpp tests/support/mask_gallery.cpp)
+failed=0
 
-# build NAME COMPILER FLAG...
+# build NAME COMPILER FLAGS [CMAKE_OPTION...]
 build() {
-    local name=$1
-    shift
-    "$@" -std=c++17 -ffp-contract=off -I. -Iinclude -DVOREL_GLYPH_MASKS='""' \
-        "${sources[@]}" -o "$out/$name" 2> "$out/$name.log" || { cat "$out/$name.log" >&2; return 1; }
+    local name=$1 compiler=$2 flags=$3
+    shift 3
+    cmake -S . -B "$out/$name" -G Ninja -DCMAKE_BUILD_TYPE=None -DVOREL_BUILD_TESTS=ON \
+        -DCMAKE_CXX_COMPILER="$compiler" -DCMAKE_CXX_FLAGS="$flags" "$@" > /dev/null &&
+        cmake --build "$out/$name" --target voreleffect_hashes -- --quiet
 }
 
-failed=0
-# check NAME RUNNER... : runs a build and prints its line
+# check COMPILER FLAGS [CMAKE_OPTION...]: builds, runs and prints the lines
 check() {
-    local name=$1 said
-    shift
-    if said=$("$@" "$out/$name" --compare "$table" 2>&1); then
-        printf '%-52s %s\n' "$name" "$said"
-    else
-        printf '%-52s DIFFERS\n%s\n' "$name" "$said"
-        failed=1
-    fi
+    local name="$1 $2" directory said
+    directory=${name//[^a-zA-Z0-9+-]/_}
+    build "$directory" "$@" || { failed=1; return; }
+    said=$(ctest --test-dir "$out/$directory" --verbose -R HashesAreThoseOfTheTable 2>&1) ||
+        { failed=1; printf '%-52s DIFFERS\n' "$name"; }
+    sed -n 's/^[0-9]*: \(.*hashes are equal\|.*differs.*\)$/\1/p' <<< "$said" |
+        while IFS= read -r line; do printf '%-52s %s\n' "$name" "$line"; done
 }
 
 if [[ ${1:-} == --update ]]; then
     build literal g++ -O2
-    "$out/literal" --literal > "$table"
+    "$out/literal/tests/voreleffect_hashes" --literal > "$table"
 fi
 
-x86=("g++ -O0" "g++ -O3" "clang++-14 -O0" "clang++-14 -O3" "clang++-14 -O2 -stdlib=libc++")
-wide=("g++ -O3 -march=x86-64-v3" "clang++-14 -O3 -march=x86-64-v3")
-arm=("aarch64-linux-gnu-g++ -O0" "aarch64-linux-gnu-g++ -O3"
-    "aarch64-linux-gnu-g++ -O3 -march=armv8.2-a+dotprod"
-    "clang++-14 --target=aarch64-linux-gnu -O3")
-
-[[ $(uname -m) != x86_64 ]] || grep -qw avx2 /proc/cpuinfo && x86+=("${wide[@]}")
-for flags in "${x86[@]}"; do
-    name=${flags//[^a-zA-Z0-9+-]/_}
-    read -ra command <<< "$flags"
-    build "$name" "${command[@]}" && check "$name" nice
+for flags in -O0 -O3; do
+    check g++ $flags
+    check clang++-14 $flags
 done
-for flags in "${arm[@]}"; do
-    name=${flags//[^a-zA-Z0-9+-]/_}
-    read -ra command <<< "$flags"
-    build "$name" "${command[@]}" && check "$name" qemu-aarch64-static -L /usr/aarch64-linux-gnu
-done
+check clang++-14 "-O2 -stdlib=libc++"
+if grep -qw avx2 /proc/cpuinfo 2> /dev/null; then
+    check g++ "-O3 -march=x86-64-v3"
+    check clang++-14 "-O3 -march=x86-64-v3"
+fi
+arm=(-DCMAKE_SYSTEM_NAME=Linux -DCMAKE_SYSTEM_PROCESSOR=aarch64
+    "-DCMAKE_CROSSCOMPILING_EMULATOR=qemu-aarch64-static;-L;/usr/aarch64-linux-gnu")
+check aarch64-linux-gnu-g++ -O0 "${arm[@]}"
+check aarch64-linux-gnu-g++ -O3 "${arm[@]}"
+check clang++-14 "--target=aarch64-linux-gnu -O3" "${arm[@]}"
 exit "$failed"

@@ -9,6 +9,7 @@
 #include <vector>
 
 #include "decoder.h"
+#include "level_of_input.h"
 #include "pixels.h"
 
 namespace {
@@ -213,6 +214,7 @@ void Caller::coverItself() {
 }  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
+    vorel_fuzz::useLevelOfInput(size);
     Caller(data, size).run();
     return 0;
 }

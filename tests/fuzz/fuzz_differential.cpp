@@ -17,6 +17,7 @@
 #include <vector>
 
 #include "decoder.h"
+#include "level_of_input.h"
 #include "paint_cost.h"
 #include "pixels.h"
 #include "tests/support/compare.h"
@@ -587,6 +588,7 @@ void Pair::run() {
 }  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
+    vorel_fuzz::useLevelOfInput(size);
     // The shared comparisons report some differences as test failures: they end the program, too.
     GTEST_FLAG_SET(break_on_failure, true);
     Decoder in(data, size);

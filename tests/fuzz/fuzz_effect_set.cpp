@@ -16,6 +16,7 @@
 #include <vector>
 
 #include "decoder.h"
+#include "level_of_input.h"
 #include "paint_cost.h"
 #include "pixels.h"
 #include "tests/support/literal_engine.h"
@@ -611,6 +612,7 @@ void Caller::run() {
 }  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
+    vorel_fuzz::useLevelOfInput(size);
     Caller(data, size).run();
     return 0;
 }

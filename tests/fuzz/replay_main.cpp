@@ -1,5 +1,6 @@
 /// Runs inputs through a fuzz target without a fuzzer: every file named on the command line and every
-/// file of a directory named there. Whatever stops the fuzzer stops this program.
+/// file of a directory named there, each at every level of the instruction set. Whatever stops the
+/// fuzzer stops this program.
 #include <algorithm>
 #include <chrono>
 #include <cstdint>
@@ -8,6 +9,8 @@
 #include <fstream>
 #include <iterator>
 #include <vector>
+
+#include "level_of_input.h"
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size);
 
@@ -35,7 +38,10 @@ double replay(const fs::path& path) {
                                   std::istreambuf_iterator<char>()};
     std::fprintf(stderr, "%s\n", path.c_str());
     const auto start = std::chrono::steady_clock::now();
-    LLVMFuzzerTestOneInput(reinterpret_cast<const uint8_t*>(bytes.data()), bytes.size());
+    for (size_t i = 0; i < vorel_test::levelsHere().size(); ++i) {
+        vorel_fuzz::levelOffset = i;
+        LLVMFuzzerTestOneInput(reinterpret_cast<const uint8_t*>(bytes.data()), bytes.size());
+    }
     const std::chrono::duration<double, std::milli> taken = std::chrono::steady_clock::now() - start;
     return taken.count();
 }

@@ -1,0 +1,73 @@
+#pragma once
+
+#include <cstdint>
+
+#include "blend/kernels.h"
+
+/// The inner loops of gradients and patterns, compiled once per level of the instruction set.
+namespace VFontEffect::internal {
+
+/// The clipped part of a covered box: the job's mask is its coverage, which gates the colour. `left` and
+/// `top` are the part's place in the box.
+struct FillJob {
+    BlendJob blend;
+    int64_t left;
+    int64_t top;
+};
+
+/// The colours of a gradient, entries 0..255, premultiplied, as pixels in memory: R, G, B, A.
+using RampPixels = const uint32_t*;
+
+/// Entry 128 + trunc(stepY * (y - centreY) + stepX * (x - centreX)), counted from the box's corner.
+struct LinearRamp {
+    RampPixels pixels;
+    float stepX;
+    float stepY;
+    float centreX;
+    float centreY;
+};
+
+/// Entry trunc(step * sqrt((y - centreY)^2 + (x - centreX)^2)).
+struct RadialRamp {
+    RampPixels pixels;
+    float step;
+    float centreX;
+    float centreY;
+};
+
+/// Rows of a pattern's kernels may be read and written this many pixels past their count.
+constexpr int64_t kRowSlack = 16;
+
+/// Where each column of a row is sampled: two neighbouring pattern pixels and their weights, which add
+/// up to 255. A weight stands in both halves of its word.
+struct ColumnTaps {
+    const int32_t* near;
+    const int32_t* far;
+    const uint32_t* nearWeights;
+    const uint32_t* farWeights;
+};
+
+/// A row of the pattern mixed along its columns, before any shift: red and blue of each pixel in one
+/// plane of words, green and alpha in the other, 16 bits each, up to 255 * 255.
+struct MixedRow {
+    uint32_t* redBlue;
+    uint32_t* greenAlpha;
+};
+
+struct FillKernels {
+    void (*linear)(const FillJob& job, const LinearRamp& ramp);
+    void (*radial)(const FillJob& job, const RadialRamp& ramp);
+
+    /// Mixes `count` columns of a pattern row of words (memory order A, R, G, B).
+    void (*mixColumns)(const uint32_t* patternRow, const ColumnTaps& taps, int64_t count,
+                       const MixedRow& out);
+
+    /// `count` pixels (R, G, B, A, premultiplied) between two mixed rows, their alpha times `opacity`.
+    void (*mixRows)(const MixedRow& near, const MixedRow& far, uint32_t nearWeight, uint32_t farWeight,
+                    float opacity, int64_t count, uint32_t* out);
+};
+
+/// The kernels of the chosen level.
+const FillKernels& fillKernels();
+
+}  // namespace VFontEffect::internal

@@ -1,0 +1,15 @@
+#!/usr/bin/env bash
+# Checks that the objects of one level of the instruction set share nothing with other code: an inline
+# function outside of the level's namespace would be merged with other copies by the linker, which might
+# keep the one with instructions that the CPU does not have.
+#
+#     objects.sh LEVEL OBJECT...
+set -euo pipefail
+level=$1
+shift
+shared=$(nm --defined-only --format=posix "$@" | awk '$2 ~ /^[WVu]$/ { print $1 }' |
+    grep -v "11VFontEffect8internal${#level}${level}" | sort -u || true)
+[[ -z $shared ]] && exit 0
+echo "objects of the level $level hold functions that other objects share:" >&2
+c++filt <<< "$shared" >&2
+exit 1
