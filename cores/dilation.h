@@ -33,7 +33,7 @@ VOREL_INLINE int64_t dilatedStride(const Dilation& dilation) {
 }
 
 /// Rows that are dilated in one go.
-constexpr int64_t kBandRows = 16;
+constexpr int64_t kBandRows = 32;
 
 /// One disc of any weights stamped around each pixel of some source rows, as VFStroke::DilationWork
 /// tells.

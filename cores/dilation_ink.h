@@ -41,6 +41,11 @@ VOREL_INLINE int lastLane(uint64_t lanes) {
     return (63 - __builtin_clzll(lanes)) / kLaneBits;
 }
 
+VOREL_INLINE uint64_t withoutFirst(uint64_t lanes) {
+    constexpr uint64_t kLane = ~uint64_t{0} >> (64 - kLaneBits);
+    return kLaneBits == 1 ? lanes & (lanes - 1) : lanes & ~(kLane << firstLane(lanes) * kLaneBits);
+}
+
 constexpr int kTileBits = kTile * kLaneBits;
 constexpr uint64_t kTileLanes = ~uint64_t{0} >> (64 - kTileBits);
 

@@ -1,30 +1,42 @@
+#include "cores/dilation_cells.h"
 #include "cores/dilation_taps.h"
 #include "cores/dilation_tiles.h"
 
 namespace VFontEffect::internal::VOREL_LEVEL {
 namespace {
 
-bool isTapped(const Dilation& dilation) {
-    return dilation.disc->reach <= kLongestTappedReach;
+enum class Way { cells, taps, tiles };
+
+Way wayOf(const Dilation& dilation) {
+    const int reach = dilation.disc->reach;
+    return reach <= kLongestCellReach     ? Way::cells
+           : reach <= kLongestTappedReach ? Way::taps
+                                          : Way::tiles;
 }
 
 size_t memoryBytes(const Dilation& dilation) {
-    return isTapped(dilation) ? tapPlanes(dilation).bytes : tilePlanes(dilation).bytes;
-}
-
-void begin(Dilation& dilation) {
-    if (isTapped(dilation)) {
-        listTaps(dilation);
-    } else {
-        beginTiles(dilation);
+    switch (wayOf(dilation)) {
+        case Way::cells:
+            return cellPlanes(dilation).bytes;
+        case Way::taps:
+            return tapPlanes(dilation).bytes;
+        default:
+            return tilePlanes(dilation).bytes;
     }
 }
 
+void begin(Dilation& dilation) {
+    const Way way = wayOf(dilation);
+    if (way == Way::taps) listTaps(dilation);
+    if (way == Way::tiles) beginTiles(dilation);
+}
+
 void dilateRows(const Dilation& dilation, int64_t y, int64_t count, uint8_t* results) {
-    if (isTapped(dilation)) return dilateRowsByTaps(dilation, y, count, results);
-    const TilePlanes planes = tilePlanes(dilation);
-    for (int64_t i = 0; i < count; ++i)
-        dilateRowByTiles(dilation, planes, y + i, results + i * dilatedStride(dilation));
+    if (dilation.disc->reach == 0) return dilateRowsByCells<CentreCell>(dilation, y, count, results);
+    if (dilation.disc->reach == 1) return dilateRowsByCells<NearCells>(dilation, y, count, results);
+    if (dilation.disc->reach == 2) return dilateRowsByCells<FarCells>(dilation, y, count, results);
+    if (wayOf(dilation) == Way::taps) return dilateRowsByTaps(dilation, y, count, results);
+    dilateRowsByTiles(dilation, y, count, results);
 }
 
 void keepSmaller(uint8_t* first, const uint8_t* second, int64_t count) {

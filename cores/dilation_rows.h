@@ -23,12 +23,12 @@ struct Arena {
     }
 };
 
-/// Columns to the right of what a disc can reach, for the ends of vectors and windows.
-constexpr int64_t kSlack = 256;
-
 constexpr int64_t kLongestWindow = 64;
 
-/// Rows with so many zeros to both sides that the disc around any pixel of the result lies in them.
+/// Columns for the ends of vectors and windows.
+constexpr int64_t kSlack = 256;
+
+/// Rows of the source with zeros to both sides, as far as any load goes.
 struct PaddedRows {
     uint8_t* start;
     int64_t stride;
@@ -39,15 +39,27 @@ struct PaddedRows {
     VOREL_INLINE uint8_t* at(int64_t row) const { return start + row * stride + lead; }
 };
 
-VOREL_INLINE PaddedRows takeRows(const Dilation& dilation, int64_t count, Arena& arena) {
-    const int64_t reach = dilation.disc->reach;
-    const int64_t lead = reach - dilation.left;
-    const int64_t stride = lead + dilation.right + reach + kSlack;
-    return {arena.take<uint8_t>(count * stride), stride, lead, dilation.width};
+/// Rows in which there are so many columns before and behind the source's.
+VOREL_INLINE PaddedRows takeRows(const Dilation& dilation, int64_t count, int64_t before, int64_t behind,
+                                 Arena& arena) {
+    const int64_t stride = before + dilation.width + behind + kSlack;
+    return {arena.take<uint8_t>(count * stride), stride, before, dilation.width};
 }
 
 VOREL_INLINE void setBytes(uint8_t* to, uint8_t value, int64_t count) {
     std::memset(to, value, static_cast<size_t>(count));
+}
+
+/// Copies `count` bytes, inverted where `flip` says so.
+inline void copyFlipped(const uint8_t* from, uint8_t* to, int64_t count, uint8_t flip) {
+    const auto copy = [=](int64_t x) { store(to + x, load<Bytes>(from + x) ^ flip); };
+    int64_t x = 0;
+    for (; x + kBytes <= count; x += kBytes)
+        copy(x);
+    // The last vector may lie over its predecessor.
+    if (x < count && count >= kBytes) return copy(count - kBytes);
+    for (; x < count; ++x)
+        to[x] = static_cast<uint8_t>(from[x] ^ flip);
 }
 
 /// Copies row y of the source, which may lie outside of it, with zeros around.
@@ -58,9 +70,7 @@ inline void fillRow(const Dilation& dilation, int64_t y, const PaddedRows& rows,
     setBytes(to + rows.width, 0, rows.stride - rows.lead - rows.width);
     if (y == 0 || y == dilation.height - 1) return setBytes(to, dilation.flip, rows.width);
     to[0] = to[rows.width - 1] = dilation.flip;
-    const uint8_t* const from = dilation.box + (y - 1) * dilation.boxStride;
-    for (int64_t x = 0; x < rows.width - 2; ++x)
-        to[x + 1] = static_cast<uint8_t>(from[x] ^ dilation.flip);
+    copyFlipped(dilation.box + (y - 1) * dilation.boxStride, to + 1, rows.width - 2, dilation.flip);
 }
 
 /// The largest of four that stand `step` apart, the first of them at the result's own place. Out of

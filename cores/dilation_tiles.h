@@ -32,20 +32,20 @@ namespace VFontEffect::internal::VOREL_LEVEL {
 
 using Reach = int16_t;  // rows, as many up as down; negative where nothing is reached
 
-/// What a row of the disc looks at in a source row.
+/// What a row of the disc looks at in a source row: 4 taps or more for its full cells, 2 cells of the
+/// rim or more. Almost all rows have just these, which leaves no branches to be guessed wrong.
 struct DiscRow {
-    int32_t firstTap;  ///< in the list of taps for the full cells, which come in twos
-    int32_t endTap;
-    int32_t firstRim;  ///< columns to the first cell of the rim
-    int32_t endRim;
+    const int32_t* taps;   ///< from a tile's first pixel to what is loaded; null without full cells
+    int32_t tapCount;      ///< even
+    int32_t rimCount;      ///< even
+    int64_t firstRim;      ///< columns to the first cell of the rim
     const Tile* deficits;  ///< 255 - weight of the rim's cells, in all lanes
 };
+constexpr int64_t kFewestTaps = 4;
+constexpr int64_t kFewestRimCells = 2;
 
 /// Rows before and behind the disc's that a vector may hang over.
 constexpr int64_t kOverhang = 64;
-
-/// The longest row of full cells takes nine windows of 64 pixels.
-constexpr int64_t kMostTapsOfRow = 10;
 
 /// The way's working memory.
 struct TilePlanes {
@@ -53,7 +53,8 @@ struct TilePlanes {
     // By row of the source.
     PaddedRows rows;
     PaddedRows windows[2];
-    Reach* full;  ///< first what each row reaches by itself, in the end what any row reaches
+    int64_t lengths[2];  ///< of the windows
+    Reach* full;         ///< first what each row reaches by itself, in the end what any row reaches
     Reach* touched;
     int64_t reachStride;
     // By tile, then by row of the source: distances, at most 255.
@@ -66,27 +67,31 @@ struct TilePlanes {
 
     // The disc.
     DiscRow* discRows;
-    int32_t* taps;  ///< from a tile's first pixel in `rows` to what is loaded
+    int32_t* taps;
     Tile* rimDeficits;
     uint8_t* outerReach;  ///< by dy, from the middle to both sides, at most 255
     size_t bytes;
 };
 
-/// The windows' lengths. They serve rows of full cells that are as long at least.
-VOREL_INLINE int64_t windowLength(const DiscShape& disc, int i) {
-    const int64_t shorter = disc.reach < 24 ? 4 : 16;
-    return i == 0 ? shorter : 4 * shorter;
-}
+/// Rows as long as they may be take nine windows of 64 pixels, rows shorter than 16 up to 15 single
+/// ones.
+constexpr int64_t kMostTaps = 16;
 
 inline TilePlanes tilePlanes(const Dilation& dilation) {
     const int64_t height = dilation.height;
-    const int64_t discRows = dilation.disc->reach + 1;
+    const int64_t reach = dilation.disc->reach;
     Arena arena = {dilation.memory};
     TilePlanes planes;
     planes.tiles = (dilation.right - dilation.left + kTile - 1) / kTile;
-    planes.rows = takeRows(dilation, height, arena);
-    planes.windows[0] = takeRows(dilation, height, arena);
-    planes.windows[1] = takeRows(dilation, height, arena);
+    const auto take = [&] {
+        return takeRows(dilation, height, reach + kFewestRimCells - dilation.left,
+                        dilation.right + reach - dilation.width, arena);
+    };
+    planes.rows = take();
+    planes.windows[0] = take();
+    planes.windows[1] = take();
+    planes.lengths[0] = reach < 24 ? 4 : 16;
+    planes.lengths[1] = 4 * planes.lengths[0];
     planes.reachStride = (planes.tiles + kDistances - 1) / kDistances * kDistances;
     planes.full = arena.take<Reach>(height * planes.reachStride);
     planes.touched = arena.take<Reach>(height * planes.reachStride);
@@ -95,51 +100,51 @@ inline TilePlanes tilePlanes(const Dilation& dilation) {
     planes.toLeft = arena.take<uint8_t>(planes.tiles * planes.columnStride);
     planes.ink = takeInk(planes.tiles, arena);
     planes.most = takeInk(planes.tiles, arena);
-    planes.discRows = arena.take<DiscRow>(discRows);
-    planes.taps = arena.take<int32_t>(discRows * kMostTapsOfRow);
-    planes.rimDeficits = arena.take<Tile>(DiscShape::kMostRimCells);
-    planes.outerReach = arena.take<uint8_t>(2 * (discRows + kOverhang));
+    planes.discRows = arena.take<DiscRow>(reach + 1);
+    planes.taps = arena.take<int32_t>((reach + 1) * kMostTaps);
+    planes.rimDeficits = arena.take<Tile>(DiscShape::kMostRimCells + (reach + 1) * kFewestRimCells);
+    planes.outerReach = arena.take<uint8_t>(2 * (reach + 1 + kOverhang));
     planes.bytes = arena.used;
     return planes;
 }
 
 // --- The disc ----------------------------------------------------------------------------------------
 
-/// Covers a run of full cells with windows, the last of which may lie over its predecessor.
-inline int32_t* listFlatTaps(const TilePlanes& planes, const DiscShape& disc, int64_t reach,
-                             int32_t* taps) {
+VOREL_INLINE int64_t evenAtLeast(int64_t count, int64_t fewest) {
+    return larger((count + 1) / 2 * 2, fewest);
+}
+
+/// Covers a run of full cells with the longest windows that are not too long. They lie over each other
+/// where there are more than it takes.
+inline int32_t listFlatTaps(const TilePlanes& planes, int64_t reach, int32_t* taps) {
     const int64_t length = 2 * reach + 1;
     int64_t plane = 0;
     int64_t step = 1;
-    for (int i = 0; i < 2 && length >= windowLength(disc, i); ++i) {
+    for (int i = 0; i < 2 && planes.lengths[i] <= length; ++i) {
         plane = planes.windows[i].start - planes.rows.start;
-        step = windowLength(disc, i);
+        step = planes.lengths[i];
     }
-    const int64_t last = reach + 1 - step;
-    const int32_t* const start = taps;
-    for (int64_t dx = -reach; dx < last; dx += step)
-        *taps++ = static_cast<int32_t>(plane + dx);
-    *taps++ = static_cast<int32_t>(plane + last);
-    if ((taps - start) % 2 != 0) {
-        *taps = taps[-1];
-        ++taps;
-    }
-    return taps;
+    const int64_t count = evenAtLeast((length + step - 1) / step, kFewestTaps);
+    for (int64_t i = 0; i < count; ++i)
+        taps[i] = static_cast<int32_t>(plane + smaller(i * step - reach, reach + 1 - step));
+    return static_cast<int32_t>(count);
 }
 
 inline void listDiscRows(const TilePlanes& planes, const DiscShape& disc) {
-    int32_t* tap = planes.taps;
-    Tile* deficit = planes.rimDeficits;
-    for (int64_t dy = 0; dy <= disc.reach; ++dy) {
+    int32_t* taps = planes.taps;
+    Tile* deficits = planes.rimDeficits;
+    for (int64_t dy = 0; dy <= disc.reach; ++dy, taps += kMostTaps) {
+        const int64_t flat = disc.flatReach[dy];
+        const int64_t cells = disc.outerReach[dy] - flat;
         DiscRow& row = planes.discRows[dy];
-        row.firstTap = static_cast<int32_t>(tap - planes.taps);
-        if (disc.flatReach[dy] >= 0) tap = listFlatTaps(planes, disc, disc.flatReach[dy], tap);
-        row.endTap = static_cast<int32_t>(tap - planes.taps);
-        row.firstRim = disc.flatReach[dy] + 1;
-        row.endRim = disc.outerReach[dy] + 1;
-        row.deficits = deficit;
-        for (int64_t i = 0; i < row.endRim - row.firstRim; ++i)
-            *deficit++ = spread<Tile>(disc.rimDeficit[disc.rimStart[dy] + i]);
+        row.taps = flat >= 0 ? taps : nullptr;
+        row.tapCount = flat >= 0 ? listFlatTaps(planes, flat, taps) : 0;
+        row.rimCount = static_cast<int32_t>(evenAtLeast(cells, kFewestRimCells));
+        row.firstRim = flat + 1;
+        row.deficits = deficits;
+        for (int64_t i = 0; i < row.rimCount; ++i)
+            *deficits++ =
+                spread<Tile>(i < cells ? disc.rimDeficit[disc.rimStart[dy] + i] : uint8_t{255});
     }
 }
 
@@ -174,13 +179,12 @@ inline void listReaches(const DiscShape& disc, DiscReaches& reaches) {
 
 /// Fills the rows of coverage and of windows.
 inline void fillRows(const Dilation& dilation, const TilePlanes& planes) {
-    const int64_t length = windowLength(*dilation.disc, 0);
     for (int64_t y = 0; y < dilation.height; ++y) {
         fillRow(dilation, y, planes.rows, y);
         uint8_t* const windows = planes.windows[0].at(y);
         widenWindows(planes.rows, planes.rows.at(y), windows, 1);
-        if (length > 4) widenWindows(planes.rows, windows, windows, 4);
-        widenWindows(planes.rows, windows, planes.windows[1].at(y), length);
+        if (planes.lengths[0] > 4) widenWindows(planes.rows, windows, windows, 4);
+        widenWindows(planes.rows, windows, planes.windows[1].at(y), planes.lengths[0]);
     }
 }
 
@@ -288,19 +292,28 @@ inline void beginTiles(Dilation& dilation) {
 
 // --- Evaluation --------------------------------------------------------------------------------------
 
+VOREL_INLINE Tile largerTap(const uint8_t* source, const int32_t* taps) {
+    return larger(load<Tile>(source + taps[0]), load<Tile>(source + taps[1]));
+}
+
+/// What two cells of the rim add, with their mirror images.
+VOREL_INLINE Tile rimPair(const uint8_t* source, int64_t dx, const Tile* deficits) {
+    const Tile inner = larger(load<Tile>(source - dx), load<Tile>(source + dx));
+    const Tile outer = larger(load<Tile>(source - dx - 1), load<Tile>(source + dx + 1));
+    // Differences that stay at 0.
+    return larger(larger(inner, deficits[0]) - deficits[0], larger(outer, deficits[1]) - deficits[1]);
+}
+
 /// What a source row adds to the tile whose place in it is `source`.
-VOREL_INLINE Tile dilatedRow(const int32_t* taps, const DiscRow& row, const uint8_t* source) {
-    Tile result = {};
-    for (int32_t i = row.firstTap; i < row.endTap; i += 2) {
-        const Tile coverage = larger(load<Tile>(source + taps[i]), load<Tile>(source + taps[i + 1]));
-        result = larger(result, coverage);
-    }
-    const Tile* deficit = row.deficits;
-    for (int64_t dx = row.firstRim; dx < row.endRim; ++dx, ++deficit) {
-        const Tile coverage = larger(load<Tile>(source - dx), load<Tile>(source + dx));
-        // A difference that stays at 0.
-        result = larger(result, larger(coverage, *deficit) - *deficit);
-    }
+VOREL_INLINE Tile dilatedRow(const DiscRow& row, const uint8_t* source) {
+    Tile result = rimPair(source, row.firstRim, row.deficits);
+    for (int32_t i = kFewestRimCells; i < row.rimCount; i += 2)
+        result = larger(result, rimPair(source, row.firstRim + i, row.deficits + i));
+    if (row.taps == nullptr) return result;
+    const Tile flat = larger(largerTap(source, row.taps), largerTap(source, row.taps + 2));
+    result = larger(result, flat);
+    for (int32_t i = kFewestTaps; i < row.tapCount; i += 2)
+        result = larger(result, largerTap(source, row.taps + i));
     return result;
 }
 
@@ -317,7 +330,7 @@ struct OpenTile {
     VOREL_INLINE void add(int64_t row) {
         const DiscRow& discRow = planes.discRows[row < y ? y - row : row - y];
         const uint8_t* const place = source + row * planes.rows.stride;
-        result = larger(result, dilatedRow(planes.taps, discRow, place));
+        result = larger(result, dilatedRow(discRow, place));
     }
 
     /// The rows, among kBytes, that touch any of the lanes from `first` to `last`. A row whose nearest
@@ -360,12 +373,10 @@ inline RowRange touchingRange(const OpenTile& tile, RowRange rows) {
 inline void addTouching(OpenTile& tile, RowRange rows, int firstOpen, int lastOpen) {
     for (int64_t row = rows.first; row <= rows.last; row += kBytes) {
         uint64_t lanes = tile.touching(row, firstOpen, lastOpen);
-        while (lanes != 0) {
-            const int lane = firstLane(lanes);
-            if (row + lane > rows.last) return;
-            tile.add(row + lane);
-            lanes &= ~(((uint64_t{1} << kLaneBits) - 1) << lane * kLaneBits);
-        }
+        const int64_t behind = row + kBytes - 1 - rows.last;
+        if (behind > 0) lanes &= ~uint64_t{0} >> ((64 - kBytes * kLaneBits) + behind * kLaneBits);
+        for (; lanes != 0; lanes = withoutFirst(lanes))
+            tile.add(row + firstLane(lanes));
     }
 }
 
@@ -409,6 +420,12 @@ inline void dilateRowByTiles(const Dilation& dilation, const TilePlanes& planes,
                                                          : Tile{});
         }
     }
+}
+
+inline void dilateRowsByTiles(const Dilation& dilation, int64_t y, int64_t count, uint8_t* results) {
+    const TilePlanes planes = tilePlanes(dilation);
+    for (int64_t i = 0; i < count; ++i, results += dilatedStride(dilation))
+        dilateRowByTiles(dilation, planes, y + i, results);
 }
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL
