@@ -1,4 +1,5 @@
 #include <cstdint>
+#include <cstring>
 
 #include "blend/kernels.h"
 #include "blend/rows.h"
@@ -7,13 +8,13 @@
 namespace VFontEffect::internal::VOREL_LEVEL {
 namespace {
 
-/// Whether kBytes pixels of an image are nothing but zeros; the first of them mostly tell.
-VOREL_INLINE bool hasEmptyImage(const Place& place) {
-    Bytes pixels = load<Bytes>(place.image());
-    if (!allZero(pixels)) return false;
+/// Whether kBytes pixels are nothing but zeros; the first of them mostly tell.
+VOREL_INLINE bool isClear(const uint8_t* pixels) {
+    Bytes all = load<Bytes>(pixels);
+    if (!allZero(all)) return false;
     for (int64_t i = 1; i < 4; ++i)
-        pixels |= load<Bytes>(place.image() + i * kBytes);
-    return allZero(pixels);
+        all |= load<Bytes>(pixels + i * kBytes);
+    return allZero(all);
 }
 
 /// One colour through the mask.
@@ -23,8 +24,15 @@ struct MaskPainter {
     static constexpr bool kReadsMask = true;
     static constexpr Empty kEmpty = Rule::kEmpty;
     Pixels colour;
+    Pixels fullOverNothing;  ///< what full coverage paints over transparent pixels
 
     VOREL_INLINE bool isEmpty(const Place& place) const { return hasEmptyMask(place); }
+    VOREL_INLINE bool paintWhole(const Place& place) const {
+        if (!hasFullMask(place) || !isClear(place.destination())) return false;
+        for (int64_t x = 0; x < kBytes; x += kPixels)
+            storePixels(place.destination() + 4 * x, fullOverNothing);
+        return true;
+    }
     VOREL_INLINE Pixels paint(const Place& place) const {
         return Rule::apply(loadPixels(place.destination()), loadAmounts(place.mask()), colour);
     }
@@ -37,6 +45,7 @@ struct SolidPainter {
     Pixels colour;
 
     VOREL_INLINE bool isEmpty(const Place&) const { return false; }
+    VOREL_INLINE bool paintWhole(const Place&) const { return false; }
     VOREL_INLINE Pixels paint(const Place& place) const {
         return SolidColour::apply(loadAmounts(place.mask()), colour);
     }
@@ -49,7 +58,8 @@ struct ImagePainter {
     static constexpr bool kReadsMask = false;
     static constexpr Empty kEmpty = Empty::keeps;
 
-    VOREL_INLINE bool isEmpty(const Place& place) const { return hasEmptyImage(place); }
+    VOREL_INLINE bool isEmpty(const Place& place) const { return isClear(place.image()); }
+    VOREL_INLINE bool paintWhole(const Place&) const { return false; }
     VOREL_INLINE Pixels paint(const Place& place) const {
         return Rule::apply(loadPixels(place.destination()), Load(place.image()));
     }
@@ -63,6 +73,7 @@ struct MaskedImagePainter {
     static constexpr Empty kEmpty = Rule::kEmpty;
 
     VOREL_INLINE bool isEmpty(const Place& place) const { return hasEmptyMask(place); }
+    VOREL_INLINE bool paintWhole(const Place&) const { return false; }
     VOREL_INLINE Pixels paint(const Place& place) const {
         return Rule::apply(loadPixels(place.destination()), loadPixels(place.image()),
                            loadAmounts(place.mask()));
@@ -71,7 +82,11 @@ struct MaskedImagePainter {
 
 template <class Rule>
 void blendMask(const BlendJob& job) {
-    paintRows(MaskPainter<Rule>{spreadColour(job.color)}, job);
+    const Pixels colour = spreadColour(job.color);
+    uint8_t full[kPixels];
+    std::memset(full, 255, sizeof full);
+    const Pixels fullOverNothing = Rule::apply(Pixels{}, loadAmounts(full), colour);
+    paintRows(MaskPainter<Rule>{colour, fullOverNothing}, job);
 }
 
 void solidColour(const BlendJob& job) {

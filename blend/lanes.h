@@ -75,6 +75,7 @@ VOREL_INLINE V smaller(V a, V b) {
 //   subSaturated   a - b, at least 0
 //   multiplyHigh   the upper 16 bits of 32-bit products
 //   allZero        whether no lane holds anything but 0
+//   nonZeroLanes   kLaneBits ones for each lane that holds anything but 0, the first lane's lowest
 //   loadInPairs    kWords bytes of memory, each in both halves of its word (not on NEON)
 //   highBytesInPairs   of each word its highest byte, in both halves of the word (not on NEON)
 //   endsSwapped    bytes 0 1 2 3 of each word as 2 1 0 3 (not on NEON)
@@ -104,6 +105,10 @@ VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
 }
 VOREL_INLINE bool allZero(Bytes v) {
     return as<Words>(v)[0] == 0;
+}
+constexpr int kLaneBits = 8;
+VOREL_INLINE uint64_t nonZeroLanes(Bytes v) {
+    return as<Words>(v != 0)[0];
 }
 VOREL_INLINE Halves loadInPairs(const uint8_t* from) {
     return as<Halves>(Words{*from * 0x10001U});
@@ -137,6 +142,10 @@ VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
 }
 VOREL_INLINE bool allZero(Bytes v) {
     return _mm512_test_epi32_mask(as<__m512i>(v), as<__m512i>(v)) == 0;
+}
+constexpr int kLaneBits = 1;
+VOREL_INLINE uint64_t nonZeroLanes(Bytes v) {
+    return _mm512_test_epi8_mask(as<__m512i>(v), as<__m512i>(v));
 }
 /// Moves bytes within each 128 bits; an index of -1 gives 0.
 VOREL_INLINE Bytes shuffled(Bytes v, __m128i indices) {
@@ -177,6 +186,10 @@ VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
 }
 VOREL_INLINE bool allZero(Bytes v) {
     return _mm256_testz_si256(as<__m256i>(v), as<__m256i>(v)) != 0;
+}
+constexpr int kLaneBits = 1;
+VOREL_INLINE uint64_t nonZeroLanes(Bytes v) {
+    return static_cast<uint32_t>(_mm256_movemask_epi8(as<__m256i>(v != 0)));
 }
 /// Moves bytes within each 128 bits; an index of -1 gives 0.
 VOREL_INLINE Bytes shuffled(Bytes v, __m128i indices) {
@@ -219,6 +232,10 @@ VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
 VOREL_INLINE bool allZero(Bytes v) {
     return _mm_movemask_epi8(_mm_cmpeq_epi8(as<__m128i>(v), _mm_setzero_si128())) == 0xFFFF;
 }
+constexpr int kLaneBits = 1;
+VOREL_INLINE uint64_t nonZeroLanes(Bytes v) {
+    return static_cast<uint32_t>(_mm_movemask_epi8(as<__m128i>(v != 0)));
+}
 VOREL_INLINE Halves loadInPairs(const uint8_t* from) {
     const __m128i halves = _mm_unpacklo_epi8(_mm_cvtsi32_si128(load<int>(from)), _mm_setzero_si128());
     return as<Halves>(_mm_unpacklo_epi16(halves, halves));
@@ -255,6 +272,11 @@ VOREL_INLINE Bytes subSaturated(Bytes a, Bytes b) {
 }
 VOREL_INLINE bool allZero(Bytes v) {
     return vmaxvq_u32(as<uint32x4_t>(v)) == 0;
+}
+constexpr int kLaneBits = 4;
+VOREL_INLINE uint64_t nonZeroLanes(Bytes v) {
+    const uint16x8_t nonZero = as<uint16x8_t>(v != 0);
+    return vget_lane_u64(vreinterpret_u64_u8(vshrn_n_u16(nonZero, 4)), 0);
 }
 VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
     const auto x = as<uint16x8_t>(a);

@@ -9,7 +9,9 @@
 /// The row driver of all blending kernels: the loop over rows and pixels, empty stretches, and the tail.
 ///
 /// A painter gives the pixels that belong at a place of a row: `paint(place)`. It also tells what an
-/// empty stretch (`isEmpty(place)`, kBytes pixels long) leaves there, if it can tell at all.
+/// empty stretch (`isEmpty(place)`, kBytes pixels long) leaves there, if it can tell at all, and may
+/// know stretches that it paints quicker as a whole (`paintWhole(place)`, which returns whether it has
+/// done so).
 namespace VFontEffect::internal::VOREL_LEVEL {
 
 /// The planes of one row; those that a kernel does not read may be null.
@@ -32,6 +34,11 @@ struct Place {
 /// Whether the mask is 0 for kBytes pixels.
 VOREL_INLINE bool hasEmptyMask(const Place& place) {
     return allZero(load<Bytes>(place.mask()));
+}
+
+/// Whether the mask is full for kBytes pixels.
+VOREL_INLINE bool hasFullMask(const Place& place) {
+    return allZero(~load<Bytes>(place.mask()));
 }
 
 /// Paints a whole stretch of kBytes pixels that is empty.
@@ -74,7 +81,7 @@ VOREL_INLINE void paintStretches(const Painter& painter, const Row& row, int64_t
     for (; end - x >= kBytes; x += kBytes) {
         if (painter.isEmpty({row, x})) {
             paintEmpty(Painter::kEmpty, {row, x});
-        } else {
+        } else if (!painter.paintWhole({row, x})) {
             paintVectors(painter, row, x, x + kBytes);
         }
     }

@@ -1,9 +1,9 @@
-#include <cmath>
 #include <cstdint>
 #include <cstdlib>
+#include <cstring>
 #include <limits>
 
-#include "core/numeric.h"
+#include "cores/disc_shape.h"
 #include "voreleffect/VFECore.h"
 
 namespace VFontEffect {
@@ -15,27 +15,31 @@ namespace {
 /// A disc beyond this takes seconds and is no text effect: it counts as one that memory cannot hold.
 constexpr int64_t kLargestSide = 8192;
 
-/// 255 inside the radius, falling to 0 over the pixel outside of it.
-unsigned char discWeight(int64_t dx, int64_t dy, float radius) {
-    const float distance = std::sqrt(static_cast<float>(dx * dx + dy * dy));
-    const float cover = clampOrLow(1.0F - (distance - radius), 0.0F, 1.0F);
-    return static_cast<unsigned char>(toInt(clampOrLow(cover * 255.0F + 0.5F, 0.0F, 255.0F)));
+/// The weights of the walk's row, `middle` being its cell in the disc's middle column.
+void fillRow(const RimWalk& walk, int64_t reach, unsigned char* middle) {
+    std::memset(middle - reach, 0, static_cast<size_t>(2 * reach + 1));
+    if (walk.flatReach >= 0)
+        std::memset(middle - walk.flatReach, 255, static_cast<size_t>(2 * walk.flatReach + 1));
+    for (int64_t dx = walk.flatReach + 1; dx <= walk.outerReach; ++dx)
+        middle[dx] = middle[-dx] = walk.weight(dx);
 }
 
 }  // namespace
 
 int makeCircleKernel(unsigned char** kernel, float radius) {
-    const int64_t reach = toInt(radius + 0.5F);
+    const int64_t reach = discReach(radius);
     const int64_t side = 2 * reach + 1;
     if (side < 1 || side > std::numeric_limits<int32_t>::max() / side) return 0;
     if (kernel != nullptr && side <= kLargestSide) {
-        auto* const disc = static_cast<unsigned char*>(std::malloc(static_cast<size_t>(side * side)));
+        const auto rowBytes = static_cast<size_t>(side);
+        auto* const disc = static_cast<unsigned char*>(std::malloc(rowBytes * rowBytes));
         if (disc != nullptr) {
             *kernel = disc;
-            for (int64_t y = -reach; y <= reach; ++y) {
-                for (int64_t x = -reach; x <= reach; ++x) {
-                    disc[(y + reach) * side + x + reach] = discWeight(x, y, radius);
-                }
+            for (RimWalk walk(reach, radius); !walk.done(); walk.nextRow()) {
+                unsigned char* const below = disc + (reach + walk.row()) * side;
+                unsigned char* const above = disc + (reach - walk.row()) * side;
+                fillRow(walk, reach, below + reach);
+                if (above != below) std::memcpy(above, below, rowBytes);
             }
         }
     }

@@ -74,6 +74,7 @@ struct RampPainter {
     int64_t left;
 
     VOREL_INLINE bool isEmpty(const Place& place) const { return hasEmptyMask(place); }
+    VOREL_INLINE bool paintWhole(const Place&) const { return false; }
     VOREL_INLINE Pixels paint(const Place& place) const {
         const Pixels destination = loadPixels(place.destination());
         if (isUncovered(place.mask())) return destination;

@@ -1,0 +1,66 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+
+#include "core/inline.h"
+#include "cores/disc_shape.h"
+
+/// The inner loops of the stroke, compiled once per level of the instruction set.
+namespace VFontEffect::internal {
+
+/// Grey-scale dilation of a box of coverage by a disc. The source is the box with a border of one empty
+/// pixel; all coordinates are the source's, the border's corner being (0, 0).
+///
+/// The result at p is the largest c - (255 - weight) over all source pixels of coverage c, with the
+/// weight that the disc around p has there; 0 where nothing is above 0.
+struct Dilation {
+    const uint8_t* box;  ///< the source without its border
+    int64_t boxStride;
+    int64_t width;   ///< of the source, border included
+    int64_t height;  ///< likewise
+    uint8_t flip;    ///< 0xFF grows the inverse of the source, the border then being full; else 0
+    const DiscShape* disc;
+    int64_t left;  ///< the columns that are wanted, the source's own among them
+    int64_t right;
+    uint8_t* memory;  ///< as many bytes as the kernel says; they need no values
+    uint8_t largest;  ///< for the kernels
+};
+
+/// Rows of results are so far apart.
+VOREL_INLINE int64_t dilatedStride(const Dilation& dilation) {
+    return (dilation.right - dilation.left + 63) / 64 * 64;
+}
+
+/// Rows that are dilated in one go.
+constexpr int64_t kBandRows = 32;
+
+/// One disc of any weights stamped around each pixel of some source rows, as VFStroke::DilationWork
+/// tells.
+struct Stamping {
+    const uint8_t* source;
+    int64_t sourceWidth;
+    int64_t firstRow;
+    int64_t endRow;
+    uint8_t flip;  ///< 0xFF stamps the inverse of the coverage, else 0
+    const uint8_t* weights;
+    int64_t side;
+    uint8_t* plane;
+    int64_t planeWidth;
+};
+
+struct DilationKernels {
+    size_t (*memoryBytes)(const Dilation& dilation);
+    /// Prepares the memory.
+    void (*begin)(Dilation& dilation);
+    /// `count` rows of results from row y on, at most kBandRows, first column `left`.
+    void (*dilateRows)(const Dilation& dilation, int64_t y, int64_t count, uint8_t* results);
+    /// first = min(first, second)
+    void (*keepSmaller)(uint8_t* first, const uint8_t* second, int64_t count);
+    void (*stamp)(const Stamping& stamping);
+};
+
+/// The kernels of the chosen level.
+const DilationKernels& dilationKernels();
+
+}  // namespace VFontEffect::internal

@@ -1,0 +1,84 @@
+#include "cores/dilation_cells.h"
+#include "cores/dilation_taps.h"
+#include "cores/dilation_tiles.h"
+
+namespace VFontEffect::internal::VOREL_LEVEL {
+namespace {
+
+enum class Way { cells, taps, tiles };
+
+Way wayOf(const Dilation& dilation) {
+    const int reach = dilation.disc->reach;
+    return reach <= kLongestCellReach     ? Way::cells
+           : reach <= kLongestTappedReach ? Way::taps
+                                          : Way::tiles;
+}
+
+size_t memoryBytes(const Dilation& dilation) {
+    switch (wayOf(dilation)) {
+        case Way::cells:
+            return cellPlanes(dilation).bytes;
+        case Way::taps:
+            return tapPlanes(dilation).bytes;
+        default:
+            return tilePlanes(dilation).bytes;
+    }
+}
+
+void begin(Dilation& dilation) {
+    const Way way = wayOf(dilation);
+    if (way == Way::taps) listTaps(dilation);
+    if (way == Way::tiles) beginTiles(dilation);
+}
+
+void dilateRows(const Dilation& dilation, int64_t y, int64_t count, uint8_t* results) {
+    if (dilation.disc->reach == 0) return dilateRowsByCells<CentreCell>(dilation, y, count, results);
+    if (dilation.disc->reach == 1) return dilateRowsByCells<NearCells>(dilation, y, count, results);
+    if (dilation.disc->reach == 2) return dilateRowsByCells<FarCells>(dilation, y, count, results);
+    if (wayOf(dilation) == Way::taps) return dilateRowsByTaps(dilation, y, count, results);
+    dilateRowsByTiles(dilation, y, count, results);
+}
+
+void keepSmaller(uint8_t* first, const uint8_t* second, int64_t count) {
+    for (int64_t i = 0; i < count; ++i)
+        first[i] = smaller(first[i], second[i]);
+}
+
+/// target = max(target, coverage - deficit), a row of the disc at a time.
+VOREL_INLINE void stampRow(const uint8_t* weights, uint8_t coverage, uint8_t* target, int64_t count) {
+    const auto raise = [=](int64_t x) {
+        const Bytes deficits = ~load<Bytes>(weights + x);
+        const Bytes stamped = subSaturated(spread<Bytes>(coverage), deficits);
+        store(target + x, larger(load<Bytes>(target + x), stamped));
+    };
+    int64_t x = 0;
+    for (; x + kBytes <= count; x += kBytes)
+        raise(x);
+    // The last vector may lie over its predecessor: raising twice changes nothing.
+    if (x < count && count >= kBytes) return raise(count - kBytes);
+    for (; x < count; ++x) {
+        const int raised = coverage - (255 - weights[x]);
+        target[x] = static_cast<uint8_t>(larger<int>(target[x], raised));
+    }
+}
+
+void stamp(const Stamping& stamping) {
+    for (int64_t y = stamping.firstRow; y < stamping.endRow; ++y) {
+        const uint8_t* const source = stamping.source + y * stamping.sourceWidth;
+        for (int64_t x = 0; x < stamping.sourceWidth; ++x) {
+            const auto coverage = static_cast<uint8_t>(source[x] ^ stamping.flip);
+            if (coverage == 0) continue;
+            // The disc's centre lies half its side further on both axes: its corner is at (x, y).
+            for (int64_t row = 0; row < stamping.side; ++row) {
+                stampRow(stamping.weights + row * stamping.side, coverage,
+                         stamping.plane + (y + row) * stamping.planeWidth + x, stamping.side);
+            }
+        }
+    }
+}
+
+}  // namespace
+
+extern const DilationKernels kDilationKernels = {memoryBytes, begin, dilateRows, keepSmaller, stamp};
+
+}  // namespace VFontEffect::internal::VOREL_LEVEL

@@ -1,0 +1,92 @@
+#pragma once
+
+#include <cstdint>
+#include <cstring>
+
+#include "blend/lanes.h"
+#include "cores/dilation.h"
+
+/// Rows of source pixels as both ways of dilation read them, and windowed maxima of them.
+namespace VFontEffect::internal::VOREL_LEVEL {
+
+/// Hands out working memory; without any it only counts.
+struct Arena {
+    uint8_t* memory;
+    size_t used = 0;
+
+    template <class T>
+    VOREL_INLINE T* take(int64_t count) {
+        constexpr size_t kAlignment = 64;
+        uint8_t* const taken = memory == nullptr ? nullptr : memory + used;
+        used += (static_cast<size_t>(count) * sizeof(T) + kAlignment - 1) / kAlignment * kAlignment;
+        return reinterpret_cast<T*>(taken);
+    }
+};
+
+constexpr int64_t kLongestWindow = 64;
+
+/// Columns for the ends of vectors and windows.
+constexpr int64_t kSlack = 256;
+
+/// Rows of the source with zeros to both sides, as far as any load goes.
+struct PaddedRows {
+    uint8_t* start;
+    int64_t stride;
+    int64_t lead;   ///< columns before column 0
+    int64_t width;  ///< of the source
+
+    /// Column 0 of a row.
+    VOREL_INLINE uint8_t* at(int64_t row) const { return start + row * stride + lead; }
+};
+
+/// Rows in which there are so many columns before and behind the source's.
+VOREL_INLINE PaddedRows takeRows(const Dilation& dilation, int64_t count, int64_t before, int64_t behind,
+                                 Arena& arena) {
+    const int64_t stride = before + dilation.width + behind + kSlack;
+    return {arena.take<uint8_t>(count * stride), stride, before, dilation.width};
+}
+
+VOREL_INLINE void setBytes(uint8_t* to, uint8_t value, int64_t count) {
+    std::memset(to, value, static_cast<size_t>(count));
+}
+
+/// Copies `count` bytes, inverted where `flip` says so.
+inline void copyFlipped(const uint8_t* from, uint8_t* to, int64_t count, uint8_t flip) {
+    const auto copy = [=](int64_t x) { store(to + x, load<Bytes>(from + x) ^ flip); };
+    int64_t x = 0;
+    for (; x + kBytes <= count; x += kBytes)
+        copy(x);
+    // The last vector may lie over its predecessor.
+    if (x < count && count >= kBytes) return copy(count - kBytes);
+    for (; x < count; ++x)
+        to[x] = static_cast<uint8_t>(from[x] ^ flip);
+}
+
+/// Copies row y of the source, which may lie outside of it, with zeros around.
+inline void fillRow(const Dilation& dilation, int64_t y, const PaddedRows& rows, int64_t row) {
+    uint8_t* const to = rows.at(row);
+    if (y < 0 || y >= dilation.height) return setBytes(to - rows.lead, 0, rows.stride);
+    setBytes(to - rows.lead, 0, rows.lead);
+    setBytes(to + rows.width, 0, rows.stride - rows.lead - rows.width);
+    if (y == 0 || y == dilation.height - 1) return setBytes(to, dilation.flip, rows.width);
+    to[0] = to[rows.width - 1] = dilation.flip;
+    copyFlipped(dilation.box + (y - 1) * dilation.boxStride, to + 1, rows.width - 2, dilation.flip);
+}
+
+/// The largest of four that stand `step` apart, the first of them at the result's own place. Out of
+/// windows of up to 3 * step pixels, each at the place of its first one, this makes longer ones. `to`
+/// may be `from`; both are column 0 of a row.
+inline void widenWindows(const PaddedRows& rows, const uint8_t* from, uint8_t* to, int64_t step) {
+    // Windows that start farther to the left, or behind the last column, are empty.
+    int64_t x = larger(-rows.lead, -kLongestWindow);
+    setBytes(to - rows.lead, 0, rows.lead + x);
+    for (; x < rows.width; x += kBytes) {
+        const uint8_t* const window = from + x;
+        const Bytes left = larger(load<Bytes>(window), load<Bytes>(window + step));
+        const Bytes right = larger(load<Bytes>(window + 2 * step), load<Bytes>(window + 3 * step));
+        store(to + x, larger(left, right));
+    }
+    setBytes(to + x, 0, rows.stride - rows.lead - x);
+}
+
+}  // namespace VFontEffect::internal::VOREL_LEVEL
