@@ -262,7 +262,7 @@ VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
     return Words{table[indices[0]], table[indices[1]], table[indices[2]], table[indices[3]]};
 }
 
-#else
+#elif defined(__aarch64__)
 
 VOREL_INLINE Bytes addSaturated(Bytes a, Bytes b) {
     return as<Bytes>(vqaddq_u8(as<uint8x16_t>(a), as<uint8x16_t>(b)));
@@ -294,6 +294,8 @@ VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
     return Words{table[indices[0]], table[indices[1]], table[indices[2]], table[indices[3]]};
 }
 
+#else
+#error "there is no such level on this machine"
 #endif
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL
