@@ -358,7 +358,7 @@ struct RowRange {
     int64_t last;
 };
 
-/// Cuts the rows off that touch none of the tile's pixels; if none does, the result is in the middle.
+/// Cuts the rows off that touch none of the tile's pixels. One does.
 inline RowRange touchingRange(const OpenTile& tile, RowRange rows) {
     RowRange touching = {rows.last + 1, rows.first - 1};
     for (int64_t row = rows.first; row <= rows.last; row += kBytes) {
@@ -390,7 +390,8 @@ inline Tile dilatedTile(const Dilation& dilation, const TilePlanes& planes, int6
                      Tile{}};
     const RowRange inReach = {larger<int64_t>(y - reach, 0), smaller(y + reach, dilation.height - 1)};
     const RowRange rows = touchingRange(open, inReach);
-    // Mostly the row in the middle settles all pixels that come out as M.
+    // The nearest row and the one in the middle mostly settle the pixels that come out as M.
+    open.add(smaller(larger(y, rows.first), rows.last));
     open.add((rows.first + rows.last) / 2);
     const uint64_t unsettled = open.unsettled(dilation.largest);
     if (unsettled != 0) addTouching(open, rows, firstLane(unsettled), lastLane(unsettled));
