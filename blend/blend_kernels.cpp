@@ -12,7 +12,7 @@ namespace {
 VOREL_INLINE bool isClear(const uint8_t* pixels) {
     Bytes all = load<Bytes>(pixels);
     if (!allZero(all)) return false;
-    for (int i = 1; i < 4; ++i)
+    for (int64_t i = 1; i < 4; ++i)
         all |= load<Bytes>(pixels + i * kBytes);
     return allZero(all);
 }

@@ -15,7 +15,8 @@ namespace {
 /// A job that copies the clipped part of a packed mask placed at (x, y).
 BlendJob copyJob(const unsigned char* mask, int maskWidth, int x, int y, const Clip& clip) {
     BlendJob job = {};
-    job.mask = mask + (clip.top - y) * int64_t{maskWidth} + (clip.left - x);
+    const int64_t skipped = (clip.top - y) * int64_t{maskWidth} + (clip.left - x);
+    job.mask = mask + skipped;
     job.maskStride = maskWidth;
     job.width = clip.width();
     job.height = clip.height();

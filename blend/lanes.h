@@ -21,15 +21,15 @@ namespace VFontEffect::internal::VOREL_LEVEL {
 static_assert(__BYTE_ORDER__ == __ORDER_LITTLE_ENDIAN__, "pixels are loaded as little-endian words");
 
 #if defined(VOREL_SCALAR)
-constexpr int kBytes = 4;
+constexpr int64_t kBytes = 4;
 #elif defined(__AVX512BW__)
-constexpr int kBytes = 64;
+constexpr int64_t kBytes = 64;
 #elif defined(__AVX2__)
-constexpr int kBytes = 32;
+constexpr int64_t kBytes = 32;
 #else
-constexpr int kBytes = 16;
+constexpr int64_t kBytes = 16;
 #endif
-constexpr int kWords = kBytes / 4;
+constexpr int64_t kWords = kBytes / 4;
 
 using Bytes = uint8_t __attribute__((vector_size(kBytes)));
 using Halves = uint16_t __attribute__((vector_size(kBytes)));

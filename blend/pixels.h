@@ -13,7 +13,7 @@ namespace VFontEffect::internal::VOREL_LEVEL {
 
 #if !defined(VOREL_SCALAR) && defined(__aarch64__)
 
-constexpr int kPixels = kBytes;
+constexpr int64_t kPixels = kBytes;
 
 struct Pixels {
     uint8x16x4_t channels;  // red, green, blue, alpha
@@ -26,6 +26,15 @@ VOREL_INLINE Pixels loadPixels(const uint8_t* from) {
 }
 VOREL_INLINE void storePixels(uint8_t* to, const Pixels& pixels) {
     vst4q_u8(to, pixels.channels);
+}
+/// Pixels in memory order from the words that `wordsAt(i)` gives for pixel i and the next ones.
+template <class WordsAt>
+VOREL_INLINE Pixels madeOfWords(WordsAt wordsAt) {
+    const uint8x16x4_t words = {{as<uint8x16_t>(wordsAt(0)), as<uint8x16_t>(wordsAt(4)),
+                                 as<uint8x16_t>(wordsAt(8)), as<uint8x16_t>(wordsAt(12))}};
+    uint8_t pixels[4 * kPixels] = {};
+    vst1q_u8_x4(pixels, words);
+    return loadPixels(pixels);
 }
 /// From words 0xAARRGGBB: memory order B, G, R, A.
 VOREL_INLINE Pixels loadWords(const uint8_t* from) {
@@ -109,7 +118,7 @@ VOREL_INLINE Pixels withAlphaOf(const Pixels& p, const Pixels& alpha) {
 
 #else
 
-constexpr int kPixels = kWords;
+constexpr int64_t kPixels = kWords;
 
 struct Pixels {
     Bytes bytes;
@@ -129,6 +138,11 @@ VOREL_INLINE void storePixels(uint8_t* to, const Pixels& pixels) {
     store(to, pixels.bytes);
 }
 
+/// Pixels in memory order from the words that `wordsAt(i)` gives for pixel i and the next ones.
+template <class WordsAt>
+VOREL_INLINE Pixels madeOfWords(WordsAt wordsAt) {
+    return {as<Bytes>(wordsAt(0))};
+}
 /// From words 0xAARRGGBB: memory order B, G, R, A.
 VOREL_INLINE Pixels loadWords(const uint8_t* from) {
     return {endsSwapped(load<Bytes>(from))};

@@ -20,12 +20,10 @@
 namespace VFontEffect::internal {
 
 #define VOREL_LEVEL_NAME(level, a, b) level,
-enum class CpuLevel { VOREL_EACH_LEVEL(VOREL_LEVEL_NAME, , ) };
+enum class CpuLevel { VOREL_EACH_LEVEL(VOREL_LEVEL_NAME, , ) count };
 #undef VOREL_LEVEL_NAME
 
-#define VOREL_COUNT_LEVEL(level, a, b) +1
-constexpr int kCpuLevels = 0 VOREL_EACH_LEVEL(VOREL_COUNT_LEVEL, , );
-#undef VOREL_COUNT_LEVEL
+constexpr int kCpuLevels = static_cast<int>(CpuLevel::count);
 
 /// Whether this CPU, and the system's kernel, have what the level's code needs.
 bool runsHere(CpuLevel level);

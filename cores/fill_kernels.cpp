@@ -17,7 +17,7 @@ constexpr int32_t kMiddleEntry = 128;
 /// 0, 1, 2, ... as whole numbers.
 VOREL_INLINE Integers ascending() {
     Integers lanes{};
-    for (int i = 0; i < kWords; ++i)
+    for (int32_t i = 0; i < kWords; ++i)
         lanes[i] = i;
     return lanes;
 }
@@ -78,17 +78,15 @@ struct RampPainter {
     VOREL_INLINE Pixels paint(const Place& place) const {
         const Pixels destination = loadPixels(place.destination());
         if (isUncovered(place.mask())) return destination;
-        uint8_t colours[4 * kPixels];
-        for (int i = 0; i < kPixels; i += kWords)
-            store(colours + 4 * i, gathered(row.pixels, row.entries(left + place.x + i)));
-        return DstOverWhereCovered::apply(destination, loadPixels(colours), loadAmounts(place.mask()));
+        const Pixels colours = madeOfWords(
+            [&](int64_t i) { return gathered(row.pixels, row.entries(left + place.x + i)); });
+        return DstOverWhereCovered::apply(destination, colours, loadAmounts(place.mask()));
     }
 
     /// Half of a text's vectors lie between its strokes: worth a look, as a vector costs much.
     static VOREL_INLINE bool isUncovered(const uint8_t* mask) {
-        using Coverage = uint8_t __attribute__((vector_size(kPixels)));
-        const Coverage none{};
-        return std::memcmp(mask, &none, kPixels) == 0;
+        const uint8_t none[kPixels] = {};
+        return std::memcmp(mask, none, sizeof none) == 0;
     }
 };
 

@@ -3,6 +3,7 @@
 set -euo pipefail
 cd "$(dirname "$0")/.."
 . scripts/packages.sh
+. scripts/quietly.sh
 
 text=${1:-Every letter wears its light}
 preset=${2:-gold}
@@ -13,11 +14,6 @@ need_packages cmake ninja-build g++ pkg-config fonts-dejavu-core \
     libraqm-dev libfreetype-dev libfribidi-dev libharfbuzz-dev libfontconfig-dev libpng-dev \
     nlohmann-json3-dev libcli11-dev
 
-# Shows what a step said only when it fails.
-quietly() {
-    local said
-    said=$("$@" 2>&1) || { printf '%s\n' "$said" >&2; return 1; }
-}
 quietly cmake -S . -B "$build" -G Ninja -DCMAKE_BUILD_TYPE=Release -DVOREL_BUILD_TOOLS=ON
 quietly cmake --build "$build" --target vorelpaint
 

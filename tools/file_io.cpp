@@ -10,6 +10,7 @@
 #include <memory>
 
 #include "error.h"
+#include "interrupt.h"
 
 namespace vorelpaint {
 namespace {
@@ -53,26 +54,26 @@ mode_t modeFor(const fs::path& target) {
     return 0666 & ~mask;
 }
 
-/// A file under a passing name in the directory of its target; gone again unless renamed.
+/// A file under a passing name in the directory of its target; gone again unless renamed, also when a
+/// signal ends the program.
 class TemporaryFile {
   public:
     explicit TemporaryFile(const fs::path& target)
         : mTarget(target), mName((target.parent_path() / ".vorelpaint.XXXXXX").string()) {
         const mode_t mode = modeFor(target);
-        const int descriptor = ::mkstemp(mName.data());
-        if (descriptor < 0) failWithErrno("cannot write " + inQuotes(target));
+        const int descriptor = make();
         ::fchmod(descriptor, mode);  // mkstemp makes the file private
         mFile.reset(::fdopen(descriptor, "wb"));
         if (mFile) return;
         const int fault = errno;
         ::close(descriptor);
-        ::unlink(mName.c_str());
+        remove();
         errno = fault;
         failWithErrno("cannot write " + inQuotes(target));
     }
 
     ~TemporaryFile() {
-        if (!mRenamed) ::unlink(mName.c_str());
+        if (!mRenamed) remove();
     }
 
     TemporaryFile(const TemporaryFile&) = delete;
@@ -82,13 +83,29 @@ class TemporaryFile {
 
     void renameToTarget() {
         mFile.reset();
+        const HeldSignals held;
         if (std::rename(mName.c_str(), mTarget.c_str()) != 0) {
             failWithErrno("cannot write " + inQuotes(mTarget));
         }
+        setUnfinishedFile("");
         mRenamed = true;
     }
 
   private:
+    int make() {
+        const HeldSignals held;
+        const int descriptor = ::mkstemp(mName.data());
+        if (descriptor < 0) failWithErrno("cannot write " + inQuotes(mTarget));
+        setUnfinishedFile(mName);
+        return descriptor;
+    }
+
+    void remove() const {
+        const HeldSignals held;
+        ::unlink(mName.c_str());
+        setUnfinishedFile("");
+    }
+
     fs::path mTarget;
     std::string mName;
     File mFile;

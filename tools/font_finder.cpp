@@ -50,6 +50,12 @@ Config loadConfig() {
     return Config(FcInitLoadConfigAndFonts());
 }
 
+/// Loaded once: the jobs of a batch share it. Null when it cannot be loaded.
+FcConfig* sharedConfig() {
+    static const Config config = loadConfig();
+    return config.get();
+}
+
 /// Names that stand for whatever family the system prefers.
 constexpr std::array<std::string_view, 4> kGenericFamilies{"sans-serif", "sans", "serif", "monospace"};
 
@@ -72,17 +78,17 @@ bool hasFamily(const FcPattern* font, const FcChar8* family) {
 
 FontFile findFamily(const std::string& request) {
     const ToolError noSuchFont("no font file or family '" + request + "'");
-    const Config config = loadConfig();
+    FcConfig* const config = sharedConfig();
     const FontPattern wanted(FcNameParse(reinterpret_cast<const FcChar8*>(request.c_str())));
-    if (!config || !wanted) throw noSuchFont;
+    if (config == nullptr || !wanted) throw noSuchFont;
     FcChar8* found = nullptr;
     if (FcPatternGetString(wanted.get(), FC_FAMILY, 0, &found) != FcResultMatch) throw noSuchFont;
     const std::string family = reinterpret_cast<const char*>(found);
 
-    FcConfigSubstitute(config.get(), wanted.get(), FcMatchPattern);
+    FcConfigSubstitute(config, wanted.get(), FcMatchPattern);
     FcDefaultSubstitute(wanted.get());
     FcResult result = FcResultNoMatch;
-    const FontPattern font(FcFontMatch(config.get(), wanted.get(), &result));
+    const FontPattern font(FcFontMatch(config, wanted.get(), &result));
     if (!font || !hasFamily(font.get(), reinterpret_cast<const FcChar8*>(family.c_str()))) {
         throw noSuchFont;
     }

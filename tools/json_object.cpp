@@ -142,7 +142,7 @@ Json parseJson(std::string_view text) {
 JsonObject::JsonObject(const Json& value, std::string path, const std::vector<std::string_view>& known)
     : mObject(value), mPath(std::move(path)) {
     if (!value.is_object()) {
-        throw StyleError((mPath.empty() ? "style" : mPath) + ": " + wrongType("an object", value));
+        throw StyleError((mPath.empty() ? "" : mPath + ": ") + wrongType("an object", value));
     }
     for (const auto& item : value.items()) {
         if (std::find(known.begin(), known.end(), item.key()) != known.end()) continue;
@@ -182,9 +182,11 @@ int JsonObject::integer(std::string_view key, Range range, std::optional<int> fa
     const std::string expected = between("a whole number from", range);
     const Json* value = find(key, fallback.has_value(), &Json::is_number, expected);
     if (value == nullptr) return *fallback;
-    if (!contains(range, value->get<double>())) fail(key, outOfRange(*value, range));
-    if (!value->is_number_integer()) fail(key, "must be " + expected + ", not " + quoted(*value));
-    return value->get<int>();
+    const auto number = value->get<double>();
+    if (!contains(range, number)) fail(key, outOfRange(*value, range));
+    // JSON knows one kind of number: 1.0 is as whole as 1.
+    if (number != std::trunc(number)) fail(key, "must be " + expected + ", not " + quoted(*value));
+    return static_cast<int>(number);
 }
 
 uint32_t JsonObject::color(std::string_view key, std::optional<uint32_t> fallback) const {
@@ -197,6 +199,10 @@ uint32_t JsonObject::color(std::string_view key, std::optional<uint32_t> fallbac
 
 std::string JsonObject::string(std::string_view key) const {
     return find(key, false, &Json::is_string, "a string")->get<std::string>();
+}
+
+std::string JsonObject::numeral(std::string_view key) const {
+    return find(key, false, &Json::is_number, "a number")->dump();
 }
 
 int JsonObject::choice(std::string_view key, std::initializer_list<std::string_view> names) const {

@@ -24,9 +24,9 @@ Json parseJson(std::string_view text);
 /// The value as JSON, in ASCII and short enough for a message.
 std::string quoted(const Json& value);
 
-/// One object of a style file, read key by key. Every fault throws a StyleError that begins with
-/// the path of the key and says what may stand there. A reader without a fallback refuses a missing
-/// key.
+/// One object of a style file or of a batch, read key by key. Every fault throws a StyleError that
+/// begins with the path of the key and says what may stand there. A reader without a fallback refuses a
+/// missing key.
 class JsonObject {
   public:
     /// Refuses a value that is not an object, and keys other than `known`.
@@ -37,6 +37,7 @@ class JsonObject {
     int integer(std::string_view key, Range range, std::optional<int> fallback = {}) const;
     uint32_t color(std::string_view key, std::optional<uint32_t> fallback = {}) const;
     std::string string(std::string_view key) const;
+    std::string numeral(std::string_view key) const;  ///< a number as JSON spells it
 
     /// The position of the key's value, a string, among `names`.
     int choice(std::string_view key, std::initializer_list<std::string_view> names) const;

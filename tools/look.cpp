@@ -16,7 +16,6 @@ namespace {
 
 using VFontEffect::VFBitmap;
 using VFontEffect::VFEffect;
-using VFontEffect::VFGlyph;
 using VFontEffect::VFGradient;
 
 constexpr unsigned int kNoCore = 0xFFFFFFFFU;
@@ -28,15 +27,6 @@ int countOf(const Stops& stops) {
 /// The library reads stops without changing them, but takes a pointer to mutable ones.
 VFGradient* dataOf(const Stops& stops) {
     return const_cast<VFGradient*>(stops.data());
-}
-
-/// The library's patterns are A, R, G, B in memory.
-VFBitmap patternBitmap(Image image) {
-    for (size_t at = 0; at < image.pixels.size(); at += 4) {
-        std::rotate(&image.pixels[at], &image.pixels[at + 3], &image.pixels[at] + 4);
-    }
-    return {static_cast<unsigned int>(image.width), static_cast<unsigned int>(image.height),
-            image.pixels.data(), 4};
 }
 
 Image readPattern(const Style& style, const Pattern& pattern) {
@@ -81,7 +71,9 @@ class AddCall {
         return mEffects.addStrokeText(e.size, e.color, e.opacity, e.strokeStyle, e.position);
     }
     unsigned int operator()(const Pattern& e) const {
-        VFBitmap bitmap = patternBitmap(readPattern(mStyle, e));
+        Image image = patternImage(mStyle, e);
+        VFBitmap bitmap(static_cast<unsigned int>(image.width), static_cast<unsigned int>(image.height),
+                        image.pixels.data(), 4);
         return mEffects.addPatternText(&bitmap, e.scale, e.opacity);
     }
     unsigned int operator()(const TextFill& e) const {
@@ -102,30 +94,29 @@ class AddCall {
     float mTextOpacity;
 };
 
-bool hasTextFill(const Style& style) {
-    return std::any_of(style.effects.begin(), style.effects.end(),
-                       [](const Effect& effect) { return std::holds_alternative<TextFill>(effect); });
-}
-
-void checkSize(int width, int height) {
-    const bool fits = width <= TextLayout::kMaxSide && height <= TextLayout::kMaxSide &&
-                      int64_t{width} * height <= Look::kMaxPixels;
-    if (fits) return;
-    throw ToolError("the picture would be " + std::to_string(width) + " x " + std::to_string(height) +
-                    " pixels; at most " + std::to_string(TextLayout::kMaxSide) + " on a side and " +
-                    std::to_string(Look::kMaxPixels) + " in all");
-}
-
 }  // namespace
+
+Image patternImage(const Style& style, const Pattern& pattern) {
+    Image image = readPattern(style, pattern);
+    for (size_t at = 0; at < image.pixels.size(); at += 4) {
+        std::rotate(&image.pixels[at], &image.pixels[at + 3], &image.pixels[at] + 4);
+    }
+    return image;
+}
 
 Look::Look(const Style& style, uint32_t fill, float textOpacity) {
     mEffects.setTextOpacity(textOpacity);
     const AddCall add(mEffects, style, fill, textOpacity);
     for (const Effect& effect : style.effects) {
-        if (std::visit(add, effect) == kNoCore) mUnpainted.emplace_back(effectName(effect));
+        if (std::visit(add, effect) == kNoCore) {
+            mUnpainted.emplace_back(effectName(effect));
+        } else {
+            mAdded.push_back(effectType(effect));
+        }
     }
-    const std::unique_ptr<char[]> key(hasTextFill(style) ? mEffects.getMapKey()
-                                                         : mEffects.getMapKey(fill));
+    const bool filled = hasTextFill(style);
+    if (!filled) mAdded.push_back(kTextType);
+    const std::unique_ptr<char[]> key(filled ? mEffects.getMapKey() : mEffects.getMapKey(fill));
     if (!key) throw std::bad_alloc();
     mKey = key.get();
 }
@@ -136,30 +127,13 @@ Margins Look::margins() {
 }
 
 Image Look::paint(const TextLayout& text, int padding) {
-    const Margins space = margins();
-    const Box& ink = text.inkBox();
-    const int width = ink.width() + space.left + space.right + 2 * padding;
-    const int height = ink.height() + space.top + space.bottom + 2 * padding;
-    checkSize(width, height);
-
-    mEffects.initEffect(width, height);
-    const VFBitmap* mask = mEffects.getSrcBitmap();
-    if (mask == nullptr || mask->mData == nullptr) throw std::bad_alloc();
-    VFBitmap picture(static_cast<unsigned int>(width), static_cast<unsigned int>(height), 4);
-    if (picture.mData == nullptr) throw std::bad_alloc();
-    mEffects.setDstBitmap(&picture);
-    for (size_t i = 0; i < text.glyphCount(); ++i) {
-        GlyphMask shape = text.rasterise(i);
-        VFGlyph glyph{shape.coverage.data(), static_cast<unsigned short>(shape.box.width()),
-                      static_cast<unsigned short>(shape.box.height())};
-        mEffects.renderEffectLayer(shape.box.left - ink.left + space.left + padding,
-                                   shape.box.top - ink.top + space.top + padding, &glyph);
-    }
+    Run run(mEffects, {text.inkBox(), margins(), padding});
+    run.begin();
+    for (size_t i = 0; i < text.glyphCount(); ++i)
+        run.draw(text.rasterise(i));
     mEffects.doEffectPostProcessing();
-    mEffects.compositeLayers(&picture);
-
-    const size_t bytes = static_cast<size_t>(width) * static_cast<size_t>(height) * 4;
-    return {width, height, std::vector<uint8_t>(picture.mData, picture.mData + bytes)};
+    run.merge();
+    return run.picture();
 }
 
 }  // namespace vorelpaint

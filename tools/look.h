@@ -7,17 +7,15 @@
 #include <vector>
 
 #include "image.h"
+#include "run.h"
 #include "style.h"
 #include "text_layout.h"
 
 namespace vorelpaint {
 
-struct Margins {
-    int left;
-    int top;
-    int right;
-    int bottom;
-};
+/// The pixels of a pattern in the library's order: A, R, G, B. Throws StyleError when its file cannot be
+/// read.
+Image patternImage(const Style& style, const Pattern& pattern);
 
 /// A style turned into a set of effects, ready to paint runs of text.
 class Look {
@@ -39,10 +37,15 @@ class Look {
     /// the margins and `padding` around it. Throws ToolError when the picture would be too large.
     Image paint(const TextLayout& text, int padding);
 
-    static constexpr int64_t kMaxPixels = int64_t{1} << 25;
+    /// The set itself, for a caller that drives it step by step. Not planned before the first picture.
+    const VFontEffect::VFEffect& effects() const { return mEffects; }
+
+    /// The types of its effects (VFEffect.h) in the order in which they were added.
+    const std::vector<int>& added() const { return mAdded; }
 
   private:
     VFontEffect::VFEffect mEffects;
+    std::vector<int> mAdded;
     std::string mKey;
     std::vector<std::string> mUnpainted;
 };

@@ -1,35 +1,32 @@
-#include <cstdio>
 #include <exception>
+#include <filesystem>
 #include <iostream>
 #include <new>
+#include <optional>
 #include <string>
 
-#include "background.h"
+#include "batch.h"
+#include "completion.h"
+#include "console.h"
 #include "error.h"
-#include "file_io.h"
+#include "explain.h"
 #include "font.h"
 #include "font_finder.h"
+#include "interrupt.h"
+#include "key_text.h"
 #include "look.h"
+#include "manual.h"
 #include "options.h"
-#include "png_io.h"
+#include "painting.h"
+#include "sheet.h"
 #include "style_file.h"
-#include "style_scale.h"
-#include "text_layout.h"
-#include "utf8.h"
+#include "voreleffect/VFVersion.h"
+#include "write_cpp.h"
 
 namespace vorelpaint {
 namespace {
 
 constexpr int kFailed = 2;
-constexpr size_t kMaxTextBytes = size_t{1} << 16;
-
-/// One line on standard error, whatever bytes a file name or a message brings along.
-void say(std::string line) {
-    for (char& c : line) {
-        if (static_cast<unsigned char>(c) < 0x20 || c == 0x7F) c = ' ';
-    }
-    std::cerr << "vorelpaint: " << line << '\n';
-}
 
 void printPresets() {
     for (const std::string& name : presetNames()) {
@@ -38,69 +35,62 @@ void printPresets() {
     }
 }
 
-void printKey(const std::string& key) {
-    constexpr const char* kDigits = "0123456789abcdef";
-    std::cout << "key ";
-    for (const char c : key) {
-        const auto byte = static_cast<unsigned char>(c);
-        std::cout << kDigits[byte >> 4] << kDigits[byte & 15];
-    }
-    std::cout << '\n';
-}
-
 void printMargins(const Margins& margins) {
     std::cout << "margins left " << margins.left << " top " << margins.top << " right " << margins.right
               << " bottom " << margins.bottom << '\n';
 }
 
-Style chosenStyle(const Options& options) {
-    if (options.preset) return loadStyle(findPreset(*options.preset));
-    if (options.style) return loadStyle(*options.style);
-    return {};
+void printCpp(const Options& options, const Style& style) {
+    const std::string name = options.preset.value_or(style.file.stem().string());
+    writeCpp(std::cout, functionName(name), style, chosenFill(options, style),
+             chosenOpacity(options, style));
 }
 
-/// The command line's colour, else the style's, else black.
-uint32_t chosenFill(const Options& options, const Style& style) {
-    if (options.color) return *options.color;
-    for (const Effect& effect : style.effects) {
-        if (const auto* text = std::get_if<TextFill>(&effect)) return text->color;
+/// What is printed about a look, and its picture.
+void present(const Options& options) {
+    const Style style = chosenStyle(options);
+    Look look = makeLook(options, style, say);
+    if (options.writeCpp) printCpp(options, style);
+    if (options.printKey) std::cout << "key " << hexadecimal(look.key()) << '\n';
+    if (options.printMargins) printMargins(look.margins());
+    if (!options.text && !options.textFile) {
+        if (options.explain) explain(std::cout, options, style, look, nullptr);
+        return;
     }
-    return style.color.value_or(0);
-}
-
-std::string chosenText(const Options& options) {
-    if (options.text) return *options.text;
-    std::string text = readFile(options.textFile.value(), kMaxTextBytes);
-    if (!text.empty() && text.back() == '\n') text.pop_back();
-    return text;
-}
-
-void paint(const Options& options, Look& look) {
+    if (!options.explain && !options.output) return;
     const Font font(findFont(options.font), options.size);
-    const TextLayout text(font, decodeUtf8(chosenText(options)), options.align);
-    if (text.glyphCount() == 0) throw ToolError("nothing to paint: the text has no visible character");
-    if (text.missingGlyphs() > 0) {
-        say("warning: characters missing from the font: " + std::to_string(text.missingGlyphs()));
-    }
-    Image picture = look.paint(text, options.padding);
-    layOn(picture, options.background);
-    writeFile(options.output.value(), [&](std::FILE* file) { writePng(file, picture); });
+    const TextLayout text = layOutText(options, font, say);
+    if (options.explain) explain(std::cout, options, style, look, &text);
+    if (options.output) writePicture(options, look.paint(text, options.padding));
+}
+
+void runBatch(const Options& options) {
+    const BatchResult result = paintBatch(options);
+    if (result.failed == 0) return;
+    throw ToolError(std::to_string(result.failed) + " of " + std::to_string(result.jobs) +
+                    " jobs failed");
 }
 
 void run(const Options& options) {
-    if (options.listPresets) return printPresets();
-    const Style style = scaledStyle(chosenStyle(options), options.effectScale);
-    const float opacity = options.opacity.value_or(style.textOpacity.value_or(1.0F));
-    Look look(style, chosenFill(options, style), opacity);
-    for (const std::string& effect : look.unpainted()) {
-        say("warning: the library has no core for " + effect + "; it is not painted");
+    if (options.version) {
+        std::cout << "vorelpaint " << VOREL_VERSION_STRING << '\n';
+    } else if (options.manual) {
+        std::cout << manualPage();
+    } else if (options.completion) {
+        std::cout << completionScript(*options.completion);
+    } else if (options.listPresets) {
+        printPresets();
+    } else if (options.batch) {
+        runBatch(options);
+    } else if (options.sheet) {
+        paintSheet(options, say);
+    } else {
+        present(options);
     }
-    if (options.printKey) printKey(look.key());
-    if (options.printMargins) printMargins(look.margins());
-    if (options.output) paint(options, look);
 }
 
 int runProgram(int argc, const char* const* argv) {
+    cleanUpOnSignals();
     try {
         const std::optional<Options> options = parseOptions(argc, argv);
         if (options) run(*options);

@@ -4,6 +4,7 @@
 
 #include <cstdint>
 #include <filesystem>
+#include <nlohmann/json_fwd.hpp>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -94,6 +95,15 @@ using Effect = std::variant<OuterShadow, InnerShadow, OuterGlow, InnerGlow, Beve
 /// The effect's key in a style file, such as "outerShadow".
 std::string_view effectName(const Effect& effect);
 
+/// The library's numbers of some kinds of effects (VFEffect.h).
+constexpr int kStrokeType = 10;
+constexpr int kPatternType = 11;
+constexpr int kTextType = 12;
+
+/// The number of the kind of effect, and the key of the kind of that number.
+int effectType(const Effect& effect);
+std::string_view effectName(int type);
+
 struct Style {
     std::string description;
     std::optional<uint32_t> color;     ///< the fill, unless the caller chooses one
@@ -102,6 +112,9 @@ struct Style {
     std::filesystem::path baseDir;
     std::filesystem::path file;  ///< what it was read from; empty for a style made in memory
 };
+
+/// Whether the text's fill is among the effects, with a place and an opacity of its own.
+bool hasTextFill(const Style& style);
 
 /// What is wrong in a style file: where in it (a path such as "outerShadow.size", or the line of a
 /// syntax error), then the fault and the range.
@@ -113,5 +126,8 @@ class StyleError : public ToolError {
 /// Reads a style file's text. Relative paths in it start from `baseDir`; no file is opened.
 /// Throws StyleError.
 Style parseStyle(std::string_view json, const std::filesystem::path& baseDir);
+
+/// The same of what parseJson (json_object.h) returned.
+Style readStyle(const nlohmann::ordered_json& json, const std::filesystem::path& baseDir);
 
 }  // namespace vorelpaint

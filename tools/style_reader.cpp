@@ -1,3 +1,4 @@
+#include <algorithm>
 #include <array>
 #include <utility>
 
@@ -113,37 +114,35 @@ Effect readAs(const Json& value, const char* name) {
 
 struct EffectKind {
     const char* name;
+    int type;
     Effect (*read)(const Json& value, const char* name);
 };
 
 /// The keys of a style file in the order of the alternatives of Effect.
 constexpr std::array<EffectKind, std::variant_size_v<Effect>> kEffectKinds{{
-    {"outerShadow", readAs<OuterShadow, readShadow>},
-    {"innerShadow", readAs<InnerShadow, readShadow>},
-    {"outerGlow", readAs<OuterGlow, readGlow>},
-    {"innerGlow", readAs<InnerGlow, readGlow>},
-    {"bevel", readAs<Bevel, readRelief>},
-    {"emboss", readAs<Emboss, readRelief>},
-    {"linearGradient", readLinearGradient},
-    {"radialGradient", readRadialGradient},
-    {"stroke", readStroke},
-    {"pattern", readPattern},
-    {"text", readTextFill},
+    {"outerShadow", 1, readAs<OuterShadow, readShadow>},
+    {"innerShadow", 2, readAs<InnerShadow, readShadow>},
+    {"outerGlow", 3, readAs<OuterGlow, readGlow>},
+    {"innerGlow", 4, readAs<InnerGlow, readGlow>},
+    {"bevel", 5, readAs<Bevel, readRelief>},
+    {"emboss", 6, readAs<Emboss, readRelief>},
+    {"linearGradient", 7, readLinearGradient},
+    {"radialGradient", 8, readRadialGradient},
+    {"stroke", kStrokeType, readStroke},
+    {"pattern", kPatternType, readPattern},
+    {"text", kTextType, readTextFill},
 }};
 
 std::vector<std::string_view> knownKeys() {
-    std::vector<std::string_view> keys{"description", "color", "textOpacity"};
+    std::vector<std::string_view> keys{"$schema", "description", "color", "textOpacity"};
     for (const EffectKind& kind : kEffectKinds)
         keys.emplace_back(kind.name);
     return keys;
 }
 
 void refuseSecondFill(const Style& style) {
-    if (!style.color) return;
-    for (const Effect& effect : style.effects) {
-        if (std::holds_alternative<TextFill>(effect)) {
-            throw StyleError("color: the fill has its colour in text.color already");
-        }
+    if (style.color && hasTextFill(style)) {
+        throw StyleError("color: the fill has its colour in text.color already");
     }
 }
 
@@ -153,11 +152,30 @@ std::string_view effectName(const Effect& effect) {
     return kEffectKinds[effect.index()].name;
 }
 
+int effectType(const Effect& effect) {
+    return kEffectKinds[effect.index()].type;
+}
+
+std::string_view effectName(int type) {
+    const auto* kind = std::find_if(kEffectKinds.begin(), kEffectKinds.end(),
+                                    [=](const EffectKind& each) { return each.type == type; });
+    return kind == kEffectKinds.end() ? "" : kind->name;
+}
+
+bool hasTextFill(const Style& style) {
+    return std::any_of(style.effects.begin(), style.effects.end(),
+                       [](const Effect& effect) { return std::holds_alternative<TextFill>(effect); });
+}
+
 Style parseStyle(std::string_view json, const std::filesystem::path& baseDir) {
-    const Json root = parseJson(json);
+    return readStyle(parseJson(json), baseDir);
+}
+
+Style readStyle(const Json& root, const std::filesystem::path& baseDir) {
     const JsonObject file(root, "", knownKeys());
     Style style;
     style.baseDir = baseDir;
+    if (file.has("$schema")) file.string("$schema");  // for editors
     if (file.has("description")) style.description = file.string("description");
     if (file.has("color")) style.color = file.color("color");
     if (file.has("textOpacity")) style.textOpacity = file.number("textOpacity", kUnit);

@@ -17,16 +17,16 @@ namespace VFontEffect {
 /// A box of whole pixels, half-open: mRight and mBottom are exclusive. Starts as all zeros.
 class VF_API VFRect {
   public:
-    VFRect();
-    VFRect(int left, int top, int right, int bottom);
-    VFRect(const VFRect&) = default;
-    VFRect& operator=(const VFRect&) = default;
+    VFRect();                                          ///< all zeros
+    VFRect(int left, int top, int right, int bottom);  ///< stores the four numbers as they are
+    VFRect(const VFRect&) = default;                   ///< copies the four numbers
+    VFRect& operator=(const VFRect&) = default;        ///< copies the four numbers
     virtual ~VFRect();
 
-    int mLeft;
-    int mTop;
-    int mRight;
-    int mBottom;
+    int mLeft;    ///< first column
+    int mTop;     ///< first row
+    int mRight;   ///< one past the last column
+    int mBottom;  ///< one past the last row
 };
 
 /// A pixel buffer that owns its pixels: an 8-bit coverage mask (1 byte per pixel) or a 32-bit colour

@@ -21,7 +21,8 @@ class VF_API VFBlender {
     VFBlender();
     ~VFBlender();
 
-    // --- Copies of a coverage mask ------------------------------------------------------------
+    /// @name Copies of a coverage mask
+    /// @{
 
     /// Copies the pixels of the mask `src` as the next operation does.
     void drawBitmap(int x, int y, const VFBitmap* dst, VFBitmap* src, unsigned int color);
@@ -43,7 +44,9 @@ class VF_API VFBlender {
     void drawBitmap8To32(int x, int y, const VFBitmap* dst, unsigned char* mask, int maskWidth,
                          int maskHeight, unsigned int color);
 
-    // --- One colour through a mask, into 32 bits ------------------------------------------------
+    /// @}
+    /// @name One colour through a mask, into 32 bits
+    /// @{
 
     /// Draws `color` (premultiplied 0xAARRGGBB) through `mask` with the kernel of `mode`:
     /// 1 blendSrcOver8To32, 2 blendDstOver8To32, 3 blendDstOver8To32NSA, 7 blendDstOverSA8To32.
@@ -68,7 +71,9 @@ class VF_API VFBlender {
     void blendDstOverSA8To32(int x, int y, const VFBitmap* dst, unsigned char* mask, int width,
                              int height, int maskStride, unsigned int color);
 
-    // --- A colour image into 32 bits ------------------------------------------------------------
+    /// @}
+    /// @name A colour image into 32 bits
+    /// @{
 
     /// Draws premultiplied 0xAARRGGBB words: mode 1 blendSrcOver32To32, mode 2 blendDstOver32To32,
     /// any other mode nothing. srcStride is in words.
@@ -94,6 +99,7 @@ class VF_API VFBlender {
     /// pixels. Required behaviour; the reads stay inside the source.
     void blendDstOver32To32(int x, int y, const VFBitmap* dst, unsigned char* src, int width, int height,
                             int srcStride, int order);
+    /// @}
 };
 
 }  // namespace VFontEffect

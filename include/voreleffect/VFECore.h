@@ -10,6 +10,10 @@
 namespace VFontEffect {
 
 /// The interface of an effect core. The virtual operations stand in slot order, the destructor first.
+///
+/// The cores of the library paint nothing when the parameters, the stored record or a bitmap or box
+/// that they need are missing, when the text box is empty or leaves the mask, when a size is out of
+/// all proportion (above 256 pixels), or when memory for their working buffers runs out.
 class VF_API VFECore {
   public:
     /// What a run looks like, handed to initEffect.
@@ -41,20 +45,32 @@ class VF_API VFECore {
     VFECore& operator=(const VFECore&) = delete;
     virtual ~VFECore();  // slots 0 and 1
 
-    virtual int initEffect(ParamInit* init) = 0;                     // slot 2
-    virtual int render(ParamRender* render) = 0;                     // slot 3
+    /// Called when a run starts. The result is not looked at.
+    virtual int initEffect(ParamInit* init) = 0;  // slot 2
+
+    /// Called after each glyph of the run. The result is not looked at.
+    virtual int render(ParamRender* render) = 0;  // slot 3
+
+    /// Paints the effect of the whole run from the mask into the target.
     virtual void doPostProcessing(ParamPostProcessing* params) = 0;  // slot 4
-    virtual void setProperty(VFProperty* property) = 0;              // slot 5
-    virtual VFProperty* getProperty() = 0;                           // slot 6
-    virtual float getOpacity() = 0;                                  // slot 7
-    virtual int getStyle() = 0;                                      // slot 8
-    virtual int getLeftOffset() = 0;                                 // slot 9
-    virtual int getRightOffset() = 0;                                // slot 10
-    virtual int getTopOffset() = 0;                                  // slot 11
-    virtual int getBottomOffset() = 0;                               // slot 12
-    virtual void setId(int id) = 0;                                  // slot 13
-    virtual int getId() = 0;                                         // slot 14
-    virtual int getOffset() = 0;                                     // slot 15
+
+    /// Replaces the stored record by a deep copy of `property`, which must be of the core's own record
+    /// class (nothing checks it) and stays the caller's. Null is ignored. If memory runs out the
+    /// stored record stays.
+    virtual void setProperty(VFProperty* property) = 0;  // slot 5
+
+    /// The stored record, owned by the core; null before setProperty.
+    virtual VFProperty* getProperty() = 0;  // slot 6
+
+    virtual float getOpacity() = 0;     ///< slot 7: 1 in every core, the opacity is in the record
+    virtual int getStyle() = 0;         ///< slot 8: the effect type number
+    virtual int getLeftOffset() = 0;    ///< slot 9: pixels painted left of the glyph box
+    virtual int getRightOffset() = 0;   ///< slot 10: pixels painted right of it
+    virtual int getTopOffset() = 0;     ///< slot 11: pixels painted above it
+    virtual int getBottomOffset() = 0;  ///< slot 12: pixels painted below it
+    virtual void setId(int id) = 0;     ///< slot 13: the effect set assigns it
+    virtual int getId() = 0;            ///< slot 14: -1 until one was assigned
+    virtual int getOffset() = 0;        ///< slot 15: pixels painted beyond the box on every side
 };
 
 /// Defaults of every operation but the two accessors of the record.
@@ -73,22 +89,13 @@ class VF_API VFECoreBase : public VFECore {
     int getTopOffset() override;                                  ///< getOffset()
     int getBottomOffset() override;                               ///< getOffset()
     void setId(int id) override;
-    int getId() override;      ///< -1 until the effect set assigned one
-    int getOffset() override;  ///< pixels painted beyond the glyph box on each side; 0
+    int getId() override;
+    int getOffset() override;  ///< 0
 
   protected:
-    int mEffectType;
-    int mId;
+    int mEffectType;  ///< 13, no effect; each core sets its own
+    int mId;          ///< -1 until the effect set assigned one
 };
-
-/// What all cores below have in common:
-///  - setProperty ignores null; otherwise it replaces the stored record by a deep copy of the given
-///    one, which must be of the core's own record class (nothing checks it) and stays the caller's.
-///    If memory runs out the stored record stays.
-///  - getProperty returns the stored record, owned by the core, or null before setProperty.
-///  - doPostProcessing paints nothing when the parameters, the stored record or a bitmap or box that
-///    it needs are missing, when the text box is empty or leaves the mask, when a size is out of all
-///    proportion (above 256 pixels), or when memory for its working buffers runs out.
 
 /// Type 12: the plain colour fill of the glyphs. Outside layered mode it also clips everything
 /// painted before it to the glyph coverage.
@@ -124,14 +131,14 @@ class VF_API VFStroke : public VFECoreBase {
         unsigned char* plane;         ///< planeWidth x planeHeight; starts as zeros; two for the centre
         const unsigned char* source;  ///< sourceWidth x sourceHeight coverage
         const unsigned char* kernel;  ///< kernelSide x kernelSide, from makeCircleKernel
-        int sourceWidth;
-        int sourceHeight;
-        int planeWidth;   ///< at least sourceWidth + 2 * radius
-        int planeHeight;  ///< at least sourceHeight + 2 * radius
-        int kernelSide;   ///< 2 * radius + 1
-        int firstRow;     ///< first source row to process
-        int endRow;       ///< one past the last source row to process
-        int radius;       ///< 0 or more
+        int sourceWidth;              ///< pixels per row of the source
+        int sourceHeight;             ///< rows of the source
+        int planeWidth;               ///< at least sourceWidth + 2 * radius
+        int planeHeight;              ///< at least sourceHeight + 2 * radius
+        int kernelSide;               ///< 2 * radius + 1
+        int firstRow;                 ///< first source row to process
+        int endRow;                   ///< one past the last source row to process
+        int radius;                   ///< 0 or more
     };
 
     VFStroke();

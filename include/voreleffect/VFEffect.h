@@ -36,8 +36,8 @@ namespace VFontEffect {
 /// 13 none. Bevel, emboss and 9 have no core.
 class VF_API VFEffect {
   public:
-    VFEffect();
-    explicit VFEffect(void* ignored);
+    VFEffect();                        ///< without effects, at text opacity 1
+    explicit VFEffect(void* ignored);  ///< the same; the argument is not looked at
 
     /// Copies the look (each effect with its id and a deep copy of its record, the text opacity and
     /// colour, the id counter), not the bitmaps of a run.
@@ -45,12 +45,13 @@ class VF_API VFEffect {
     VFEffect& operator=(const VFEffect&) = delete;
     virtual ~VFEffect();
 
-    // --- Add-calls: one per effect kind ---------------------------------------------------------
-    // Each puts its effect into the set, or updates the one of its kind that is there, and returns
-    // the effect's id, or 0xFFFFFFFF when there is no core of that kind. No argument is refused:
-    // numbers are clamped to the ranges named here, a NaN to the lower end. Angles are cut to whole
-    // degrees and brought into 0..359, sizes and distances to whole pixels. The alpha byte of a
-    // colour is ignored; `opacity`, 0..1, takes its place. Arrays and bitmaps are copied.
+    /// @name Add-calls: one per effect kind
+    /// Each puts its effect into the set, or updates the one of its kind that is there, and returns
+    /// the effect's id, or 0xFFFFFFFF when there is no core of that kind. No argument is refused:
+    /// numbers are clamped to the ranges named here, a NaN to the lower end. Angles are cut to whole
+    /// degrees and brought into 0..359, sizes and distances to whole pixels. The alpha byte of a
+    /// colour is ignored; `opacity`, 0..1, takes its place. Arrays and bitmaps are copied.
+    /// @{
 
     /// A shadow behind the text. Angle: where the light comes from, 0 from the right, 90 from above.
     /// Distance and size (blur radius) 0..100.
@@ -106,14 +107,16 @@ class VF_API VFEffect {
     /// The plain fill. Also called by getMapKey(color) with the text opacity.
     unsigned int addText(unsigned int color, float opacity);
 
-    // --- Registry -------------------------------------------------------------------------------
+    /// @}
+    /// @name Registry
+    /// @{
 
     /// Gives `property` (copied; null leaves the core without a new record) to the core of that
     /// type, made with this id if there is none; a negative id asks for the next of the counter.
     /// Returns the id of the core that holds it, or -1 when there is no core of that type or memory ran
     /// out.
     int addEffect(int id, int type, VFProperty* property);
-    int addEffect(int type, VFProperty* property);
+    int addEffect(int type, VFProperty* property);  ///< addEffect(-1, type, property)
 
     /// Makes a core that is not in the list; the caller owns it. Null for a type without a core, or when
     /// memory ran out.
@@ -130,7 +133,7 @@ class VF_API VFEffect {
     bool hasEffects();                  ///< any core, or a text opacity below 1
 
     void setTextOpacity(float opacity);  ///< clamped to 0..1; below 1 selects layered mode
-    float getTextOpacity();
+    float getTextOpacity();              ///< 0 to 1; 1 at the start
     void clearTextOpacity();  ///< 1 again; unlike setTextOpacity keeps the paint order as it is
 
     /// The glyph mask of the run, 1 byte per pixel, or null; owned by the set.
@@ -141,7 +144,9 @@ class VF_API VFEffect {
     VFBitmap* getDstBitmap();                  ///< the destination of the run, or null
     void setDstBitmap(VFBitmap* destination);  ///< not owned; must live until compositeLayers
 
-    // --- One run --------------------------------------------------------------------------------
+    /// @}
+    /// @name One run
+    /// @{
 
     /// Starts a run on layers of width x height pixels: chooses layered mode (text opacity below 1,
     /// or a centred stroke), makes the glyph mask and the outer layer, and puts the cores in paint
@@ -155,11 +160,10 @@ class VF_API VFEffect {
 
     bool isUnderEffect(VFECore* core);  ///< painted beneath the text; false for null
 
-    /// Pixels that the effects need on each side of the glyphs: leave them in the layer.
-    int getLeftOffset();
-    int getRightOffset();
-    int getTopOffset();
-    int getBottomOffset();
+    int getLeftOffset();    ///< pixels that the effects need left of the glyphs: leave them in the layer
+    int getRightOffset();   ///< the same on the right
+    int getTopOffset();     ///< the same above
+    int getBottomOffset();  ///< the same below
 
     VFRect* getTextRect();  ///< box of the glyphs of the run; owned by the set
 
@@ -175,7 +179,9 @@ class VF_API VFEffect {
     /// pixel or of another size than the layers is left as it is.
     void compositeLayers(VFBitmap* destination);
 
-    // --- Cache key ------------------------------------------------------------------------------
+    /// @}
+    /// @name Cache key
+    /// @{
 
     /// The look as a zero-terminated string of bytes, for a cache of painted runs: equal for two
     /// sets built by the same calls in the same order. The caller releases it with delete[]; null
@@ -186,6 +192,7 @@ class VF_API VFEffect {
 
     /// Registers the text fill in `color` (0xRRGGBB) at the text opacity, then the key.
     char* getMapKey(unsigned int color);
+    /// @}
 
   private:
     std::vector<VFECore*> mEffects;

@@ -16,9 +16,9 @@ namespace VFontEffect {
 /// Base of all records. The virtual operations stand in slot order.
 class VF_API VFProperty {
   public:
-    VFProperty(unsigned int color, float opacity);
-    VFProperty(const VFProperty&) = default;
-    VFProperty& operator=(const VFProperty&) = default;
+    VFProperty(unsigned int color, float opacity);       ///< stores both
+    VFProperty(const VFProperty&) = default;             ///< copies pointers, not what they point to
+    VFProperty& operator=(const VFProperty&) = default;  ///< copies pointers, not what they point to
     virtual ~VFProperty();
 
     /// How many characters toSequentialChar may write, its closing zero byte not counted. Glows and
@@ -38,7 +38,7 @@ class VF_API VFProperty {
 /// The plain fill of the text. Colour premultiplied.
 class VF_API VFTextProperty : public VFProperty {
   public:
-    VFTextProperty(unsigned int color, float opacity);
+    VFTextProperty(unsigned int color, float opacity);  ///< stores both
     int getSequentialCharLength() override;
     bool toSequentialChar(char** cursor) override;
 };
@@ -46,6 +46,7 @@ class VF_API VFTextProperty : public VFProperty {
 /// A shadow behind the text. The angle is stored as given. Colour premultiplied.
 class VF_API VFOuterShadowProperty : public VFProperty {
   public:
+    /// Stores its arguments.
     VFOuterShadowProperty(float angle, float distance, float size, unsigned int color, float opacity);
     int getSequentialCharLength() override;
     bool toSequentialChar(char** cursor) override;
@@ -71,6 +72,7 @@ class VF_API VFInnerShadowProperty : public VFProperty {
 /// An outline. Colour premultiplied.
 class VF_API VFStrokeProperty : public VFProperty {
   public:
+    /// Stores its arguments.
     VFStrokeProperty(float size, unsigned int color, float opacity, int strokeStyle, int position);
     int getSequentialCharLength() override;
     bool toSequentialChar(char** cursor) override;
@@ -83,6 +85,7 @@ class VF_API VFStrokeProperty : public VFProperty {
 /// A halo around the text. Colour straight.
 class VF_API VFOuterGlowProperty : public VFProperty {
   public:
+    /// Stores its arguments, the stops by their address.
     VFOuterGlowProperty(float size, unsigned int color, float opacity, int count, VFGradient* gradient);
     int getSequentialCharLength() override;
     bool toSequentialChar(char** cursor) override;
@@ -95,6 +98,7 @@ class VF_API VFOuterGlowProperty : public VFProperty {
 /// A glow that starts at the edges of the text and reaches inwards. Colour straight.
 class VF_API VFInnerGlowProperty : public VFProperty {
   public:
+    /// Stores its arguments, the stops by their address.
     VFInnerGlowProperty(float size, unsigned int color, float opacity, int count, VFGradient* gradient);
     int getSequentialCharLength() override;
     bool toSequentialChar(char** cursor) override;

@@ -7,3 +7,4 @@
 #include "VFEffect.h"
 #include "VFLog.h"
 #include "VFProperty.h"
+#include "VFVersion.h"

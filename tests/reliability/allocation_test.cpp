@@ -204,12 +204,14 @@ std::vector<CoreCase> coreCases() {
         cases.push_back(coreCase<VFInnerShadow>("InnerShadowWholeGlyph" + suffix,
                                                 Inner(180, 90, 3, 0x80202020, 0.5F),
                                                 Inner(30, 2, 0, 0xFFFFFFFF, 1), layered, 0, 1));
+        // Ramps are computed where they are painted.
         cases.push_back(coreCase<VFLinearGradient>("LinearGradient" + suffix, Linear(30, 1, 1, 3, stops),
-                                                   Linear(80, 2, 1, 2, stops), layered, 1, 2));
+                                                   Linear(80, 2, 1, 2, stops), layered, 0, 2));
         cases.push_back(coreCase<VFRadialGradient>("RadialGradient" + suffix, Radial(0, 1, 1, 3, stops),
-                                                   Radial(0, 2, 1, 2, stops), layered, 1, 2));
+                                                   Radial(0, 2, 1, 2, stops), layered, 0, 2));
+        // The columns' taps, two mixed rows of the pattern, one row of pixels.
         cases.push_back(coreCase<VFPattern>("Pattern" + suffix, VFPatternProperty(&tile(), 1.5F, 1),
-                                            VFPatternProperty(&tile(), 1, 0.5F), layered, 1, 3));
+                                            VFPatternProperty(&tile(), 1, 0.5F), layered, 4, 3));
     }
     return cases;
 }

@@ -1,5 +1,7 @@
 #include "allocation_watch.h"
 
+#include <malloc.h>
+
 #include <atomic>
 #include <cstddef>
 #include <cstdlib>
@@ -22,6 +24,8 @@ namespace {
 constexpr long kNever = -1;
 
 std::atomic<long> gLive{0};
+std::atomic<long> gBytes{0};
+std::atomic<long> gPeakBytes{0};
 std::atomic<long> gRequests{0};
 std::atomic<long> gFirstRefused{kNever};
 std::atomic<bool> gRefuseOn{false};
@@ -32,6 +36,14 @@ namespace vorel_test {
 
 long liveBlocks() {
     return gLive;
+}
+
+PeakMemory::PeakMemory() : mBefore(gBytes) {
+    gPeakBytes = mBefore;
+}
+
+long PeakMemory::bytes() const {
+    return gPeakBytes - mBefore;
 }
 
 RefusedMemory::RefusedMemory(long first, Refusal refusal) {
@@ -83,13 +95,27 @@ bool refuses() {
     return gRefuseOn ? first > 0 && number >= first : number == first;
 }
 
+/// A sanitizer cannot be asked before it is ready, but hands out memory: there all sizes count as 0.
+long sizeOf(void* block) {
+    return VOREL_TEST_SANITIZED ? 0 : static_cast<long>(malloc_usable_size(block));
+}
+
 void* counted(void* block) {
-    if (block != nullptr) ++gLive;
+    if (block == nullptr) return block;
+    ++gLive;
+    const long bytes = gBytes += sizeOf(block);
+    if (bytes > gPeakBytes) gPeakBytes = bytes;
     return block;
 }
 
+void forget(void* block) {
+    if (block == nullptr) return;
+    --gLive;
+    gBytes -= sizeOf(block);
+}
+
 void release(void* block) {
-    if (block != nullptr) --gLive;
+    forget(block);
     VOREL_RAW(free)(block);
 }
 
@@ -115,10 +141,12 @@ void* calloc(size_t count, size_t size) noexcept {
 }
 void* realloc(void* block, size_t size) noexcept {
     if (refuses()) return nullptr;
+    const long before = block != nullptr ? sizeOf(block) : 0;
     void* const moved = VOREL_RAW(realloc)(block, size);
-    if (block == nullptr) return counted(moved);
-    if (moved == nullptr && size == 0) --gLive;
-    return moved;
+    if (moved == nullptr && size > 0) return nullptr;
+    if (block != nullptr) --gLive;
+    gBytes -= before;
+    return counted(moved);
 }
 void free(void* block) noexcept {
     release(block);

@@ -10,6 +10,17 @@ bool canWatchMemory();
 /// Blocks handed out and not given back yet, buffers and objects alike.
 long liveBlocks();
 
+/// The most bytes that were held at one time since it was made, beyond those held then, as the allocator
+/// set them aside. One at a time; always 0 under a sanitizer.
+class PeakMemory {
+  public:
+    PeakMemory();
+    long bytes() const;
+
+  private:
+    long mBefore;
+};
+
 enum class Refusal { kOnce, kFromThenOn };
 
 /// While it lives, the request number `first` (from 1) for memory that may fail is refused, and with

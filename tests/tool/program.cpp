@@ -1,10 +1,14 @@
 #include "program.h"
 
 #include <fcntl.h>
+#include <pty.h>
+#include <sys/ioctl.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
 #include <algorithm>
+#include <array>
+#include <csignal>
 #include <cstdlib>
 #include <fstream>
 #include <iterator>
@@ -51,26 +55,43 @@ void redirect(int descriptor, const std::string& path, int flags) {
     ::close(file);
 }
 
-int runRedirected(const std::vector<std::string>& arguments, const std::string& in,
-                  const std::string& out, const std::string& err) {
+/// Becomes vorelpaint; does not return.
+[[noreturn]] void execVorelpaint(const std::vector<std::string>& arguments) {
     std::vector<std::string> words{VORELPAINT_BINARY};
     words.insert(words.end(), arguments.begin(), arguments.end());
     std::vector<char*> argv;
     for (std::string& word : words)
         argv.push_back(word.data());
     argv.push_back(nullptr);
+    ::execv(argv[0], argv.data());
+    ::_exit(127);
+}
 
+int exitCodeOf(pid_t child) {
+    int status = 0;
+    ::waitpid(child, &status, 0);
+    return WIFEXITED(status) ? WEXITSTATUS(status) : -1;
+}
+
+int runRedirected(const std::vector<std::string>& arguments, const std::string& in,
+                  const std::string& out, const std::string& err) {
     const pid_t child = ::fork();
     if (child == 0) {
         redirect(STDIN_FILENO, in, O_RDONLY);
         redirect(STDOUT_FILENO, out, O_WRONLY | O_CREAT);
         redirect(STDERR_FILENO, err, O_WRONLY | O_CREAT);
-        ::execv(argv[0], argv.data());
-        ::_exit(127);
+        execVorelpaint(arguments);
     }
-    int status = 0;
-    ::waitpid(child, &status, 0);
-    return WIFEXITED(status) ? WEXITSTATUS(status) : -1;
+    return exitCodeOf(child);
+}
+
+/// What is written to a terminal until its last user closes it.
+std::string readTerminal(int master) {
+    std::string text;
+    std::array<char, 4096> buffer{};
+    for (ssize_t count = 0; (count = ::read(master, buffer.data(), buffer.size())) > 0;)
+        text.append(buffer.data(), static_cast<size_t>(count));
+    return text;
 }
 
 }  // namespace
@@ -80,6 +101,51 @@ Outcome runVorelpaint(const std::vector<std::string>& arguments, const std::stri
     const int exitCode =
         runRedirected(arguments, dir.write("in", input), dir.file("out"), dir.file("err"));
     return {exitCode, readBytes(dir.file("out")), readBytes(dir.file("err"))};
+}
+
+Outcome runVorelpaintOnTerminal(const std::vector<std::string>& arguments, int columns) {
+    const TempDir dir;
+    winsize size{};
+    size.ws_row = 24;
+    size.ws_col = static_cast<unsigned short>(columns);
+    int master = -1;
+    const pid_t child = ::forkpty(&master, nullptr, nullptr, &size);
+    if (child == 0) {
+        redirect(STDIN_FILENO, "/dev/null", O_RDONLY);
+        redirect(STDOUT_FILENO, dir.file("out"), O_WRONLY | O_CREAT);
+        execVorelpaint(arguments);
+    }
+    const std::string drawn = readTerminal(master);
+    ::close(master);
+    const int exitCode = exitCodeOf(child);
+    return {exitCode, readBytes(dir.file("out")), drawn};
+}
+
+RunningVorelpaint::RunningVorelpaint(const std::vector<std::string>& arguments, int ignored)
+    : mChild(::fork()) {
+    if (mChild != 0) return;
+    redirect(STDIN_FILENO, "/dev/null", O_RDONLY);
+    redirect(STDOUT_FILENO, "/dev/null", O_WRONLY);
+    redirect(STDERR_FILENO, "/dev/null", O_WRONLY);
+    if (ignored != 0) std::signal(ignored, SIG_IGN);
+    execVorelpaint(arguments);
+}
+
+RunningVorelpaint::~RunningVorelpaint() {
+    if (mChild < 0) return;
+    ::kill(mChild, SIGKILL);
+    wait();
+}
+
+void RunningVorelpaint::send(int signal) const {
+    ::kill(mChild, signal);
+}
+
+int RunningVorelpaint::wait() {
+    int status = 0;
+    ::waitpid(mChild, &status, 0);
+    mChild = -1;
+    return status;
 }
 
 Outcome runVorelpaintInto(const std::string& outPath, const std::vector<std::string>& arguments) {

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <sys/types.h>
+
 #include <filesystem>
 #include <string>
 #include <vector>
@@ -33,6 +35,26 @@ struct Outcome {
 
 /// Runs vorelpaint with these arguments and this standard input to its end.
 Outcome runVorelpaint(const std::vector<std::string>& arguments, const std::string& input = "");
+
+/// The same with a terminal of `columns` columns for standard error; `err` is what was drawn there, with
+/// its control characters.
+Outcome runVorelpaintOnTerminal(const std::vector<std::string>& arguments, int columns);
+
+/// vorelpaint at work, with neither input nor output. Ended and waited for when it goes out of scope.
+class RunningVorelpaint {
+  public:
+    /// With `ignored` as a signal that it finds ignored, as under nohup; 0 for none.
+    explicit RunningVorelpaint(const std::vector<std::string>& arguments, int ignored = 0);
+    ~RunningVorelpaint();
+    RunningVorelpaint(const RunningVorelpaint&) = delete;
+    RunningVorelpaint& operator=(const RunningVorelpaint&) = delete;
+
+    void send(int signal) const;
+    int wait();  ///< the status as waitpid gives it
+
+  private:
+    pid_t mChild;
+};
 
 /// The same with standard output going to `outPath`.
 Outcome runVorelpaintInto(const std::string& outPath, const std::vector<std::string>& arguments);

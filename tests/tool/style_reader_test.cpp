@@ -185,8 +185,8 @@ TEST(StyleReader, MissingArgument_IsNamed) {
 }
 
 TEST(StyleReader, WrongTypes_AreNamed) {
-    EXPECT_EQ(faultOf("[]"), "style: must be an object, not an array");
-    EXPECT_EQ(faultOf("null"), "style: must be an object, not null");
+    EXPECT_EQ(faultOf("[]"), "must be an object, not an array");
+    EXPECT_EQ(faultOf("null"), "must be an object, not null");
     EXPECT_EQ(faultOf(R"({"stroke": 3})"), "stroke: must be an object, not a number");
     EXPECT_EQ(faultOf(R"({"textOpacity": "1"})"),
               "textOpacity: must be a number from 0 to 1, not a string");
@@ -214,6 +214,17 @@ TEST(StyleReader, NumbersOutOfRange_AreNamedWithTheRange) {
               "pattern.scale: 0.05 is out of range, 0.1 to 10");
     EXPECT_EQ(faultOf(R"({"radialGradient": {"scale": 2.5, "gradient": []}})"),
               "radialGradient.scale: 2.5 is out of range, 0.1 to 2");
+}
+
+TEST(StyleReader, WholeNumbers_MayBeSpelledWithAPoint) {
+    const Style style = parseStyle(
+        R"({"stroke": {"size": 1, "color": "#000000", "strokeStyle": 7.0, "position": "inside"}})", "");
+    EXPECT_EQ(std::get<Stroke>(style.effects.at(0)).strokeStyle, 7);
+}
+
+TEST(StyleReader, SchemaForEditors_IsReadPast) {
+    EXPECT_EQ(faultOf(R"({"$schema": "vorelpaint-style.schema.json"})"), "");
+    EXPECT_EQ(faultOf(R"({"$schema": 1})"), "$schema: must be a string, not a number");
 }
 
 TEST(StyleReader, WholeNumbers_RefuseFractions) {

@@ -1,0 +1,13 @@
+#include "peers.h"
+
+namespace vorel_bench {
+
+void addPeerCases(Cases& cases) {
+    addOpencvCases(cases);
+    addPixmanCases(cases);
+    addCairoCases(cases);
+    addLibassCases(cases);
+    addFreetypeCases(cases);
+}
+
+}  // namespace vorel_bench

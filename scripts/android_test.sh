@@ -1,0 +1,15 @@
+#!/usr/bin/env bash
+# Tests what is for Android on the build machine, without an NDK: the Java facade on the desktop's JDK, the
+# shape of the Android form, the archive, the code of docs/android.md. Installs what it needs on Debian
+# (as root).
+set -euo pipefail
+cd "$(dirname "$0")/.."
+. scripts/packages.sh
+need_packages cmake ninja-build g++ libgtest-dev python3 openjdk-17-jdk-headless \
+    clang-14 lld-14 llvm-14 libc++-14-dev g++-aarch64-linux-gnu qemu-user-static \
+    android-liblog-dev android-platform-frameworks-native-headers android-libnativehelper-dev
+
+build=build/android_tests
+cmake -S tests/android -B "$build" -G Ninja > /dev/null
+cmake --build "$build" --parallel 2 -- --quiet
+ctest --test-dir "$build" --parallel 2 --output-on-failure

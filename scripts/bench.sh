@@ -1,0 +1,95 @@
+#!/usr/bin/env bash
+# Builds the benchmarks with clang and prints what the library takes; docs/benchmarks.md explains it.
+#
+#     scripts/bench.sh [--peers] [--quick] [--filter REGEX] [--save FILE] [--compare FILE] [--counts]
+#     scripts/bench.sh --document
+#
+#     --peers          OpenCV, pixman, cairo, libass and FreeType's stroker on the same masks
+#     --quick          fewer and shorter repetitions
+#     --filter REGEX   only the rows that it finds; figures of a row end in its maker: /best, /literal ...
+#     --save FILE      keeps the run
+#     --compare FILE   adds the change against a kept run
+#     --counts         instructions instead of time, under callgrind
+#     --document       everything, into docs/benchmarks.md
+set -euo pipefail
+invoked=$PWD
+cd "$(dirname "$0")/.."
+. scripts/packages.sh
+
+peers=OFF times=yes counts='' document='' filter='' save='' compare=''
+sampling=(--benchmark_min_time=0.02 --benchmark_repetitions=15)
+while [[ $# -gt 0 ]]; do
+    case $1 in
+        --peers) peers=ON ;;
+        --quick) sampling=(--benchmark_min_time=0.01 --benchmark_repetitions=5) ;;
+        --counts) counts=yes times='' ;;
+        --filter) filter=$2; shift ;;
+        --save) save=$(cd "$invoked" && realpath -m "$2"); shift ;;
+        --compare) compare=$(cd "$invoked" && realpath -e "$2"); shift ;;
+        --document) document=docs/benchmarks.md peers=ON counts=yes ;;
+        *) sed -n '2,/^set/{/^#/p}' "scripts/${0##*/}" >&2; exit 2 ;;
+    esac
+    shift
+done
+
+need_packages cmake ninja-build clang-14 pkg-config libbenchmark-dev libfreetype-dev fonts-dejavu-core python3
+[[ -z $counts ]] || need_packages valgrind
+[[ $peers == OFF ]] ||
+    need_packages libopencv-core-dev libopencv-imgproc-dev libpixman-1-dev libcairo2-dev libass-dev
+
+build=build/bench
+cmake --preset bench -DVOREL_BENCH_PEERS="$peers" > /dev/null
+cmake --build --preset bench -- --quiet
+
+describe_run() {
+    local model cores
+    model=$(sed -n 's/^model name[^:]*: //p' /proc/cpuinfo | head -n 1)
+    cores=$(nproc)
+    echo "Commit $(git rev-parse --short HEAD), $(clang++-14 --version | head -n 1);" \
+        "$model, $cores cores, $(grep -om 1 -w -e avx512_vnni -e avx2 /proc/cpuinfo | sort -r | head -n 1)."
+}
+
+print_times() {
+    local run=$build/run.json
+    "$build/bench/voreleffect_bench" "${sampling[@]}" --benchmark_filter="${filter:-.}" \
+        --benchmark_enable_random_interleaving=true --benchmark_report_aggregates_only=true \
+        --benchmark_out="$run" --benchmark_out_format=json > "$build/run.log" 2>&1 ||
+        { tail "$build/run.log" >&2; return 1; }
+    [[ -z $save ]] || cp "$run" "$save"
+    python3 bench/table.py "$run" ${compare:+--compare "$compare"}
+    printf '\n### Peak working memory beside the layers (goal: at most 1.00 layers)\n\n'
+    "$build/bench/voreleffect_memory"
+}
+
+# One run of each row, in the function that does nothing else.
+print_counts() {
+    local row level pixels instructions
+    printf '\n### Instructions\n\n| %-36s | %-7s | %12s | %9s |\n' row level instructions 'per pixel'
+    echo '| ------------------------------------ | ------- | -----------: | --------: |'
+    "$build/bench/voreleffect_counts" --list "${filter:-TITLE160/R:(8|32|100)|growth|512x128|fill|look}" |
+        while read -r row level pixels; do
+            instructions=$(valgrind --tool=callgrind --callgrind-out-file=/dev/null \
+                --toggle-collect=vorelCountedCall "$build/bench/voreleffect_counts" "$row" "$level" 2>&1 |
+                sed -n 's/.*Collected : //p')
+            printf '| %-36s | %-7s | %12d | %9s |\n' "$row" "$level" "$instructions" \
+                "$(awk "BEGIN { printf \"%.2f\", $instructions / $pixels }")"
+        done
+}
+
+print_all() {
+    describe_run
+    [[ -z $times ]] || print_times
+    [[ -z $counts ]] || print_counts
+}
+
+if [[ -n $times ]]; then "$build/bench/voreleffect_bench" --check; fi
+if [[ -z $document ]]; then
+    print_all
+    exit
+fi
+
+# The figures stand between two marks of the page.
+print_all > "$build/figures.md"
+sed -i -e '/^<!-- figures -->$/,/^<!-- end of figures -->$/{//!d}' "$document"
+sed -i -e "/^<!-- figures -->\$/r $build/figures.md" "$document"
+echo "$document"

@@ -1,0 +1,21 @@
+#!/usr/bin/env bash
+# Builds the Debian packages libvoreleffect1, libvoreleffect-dev and vorelpaint; says where they are.
+set -euo pipefail
+cd "$(dirname "$0")/.."
+. scripts/packages.sh
+. scripts/quietly.sh
+
+need_packages cmake ninja-build g++ pkg-config dpkg-dev file gzip \
+    libraqm-dev libfreetype-dev libfontconfig-dev libpng-dev nlohmann-json3-dev libcli11-dev
+
+build=build/debian
+# In /usr the multiarch directories are chosen, and programs need no search path of their own. No path
+# of this machine gets into the packages.
+quietly cmake -S . -B "$build" -G Ninja -DCMAKE_BUILD_TYPE=Release -DCMAKE_INSTALL_PREFIX=/usr \
+    -DCMAKE_SKIP_INSTALL_RPATH=ON -DVOREL_BUILD_TOOLS=ON \
+    -DVOREL_PRESET_DIR=/usr/share/voreleffect/presets
+quietly cmake --build "$build"
+
+rm -rf "$build/packages"
+quietly cpack --config "$build/CPackConfig.cmake" -B "$build/packages"
+ls "$PWD/$build/packages"/*.deb

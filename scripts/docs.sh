@@ -1,0 +1,13 @@
+#!/usr/bin/env bash
+# Builds the site of the documents into build/docs/html. Fails, with a line for each fault, when
+#   - a relative link or an anchor of a Markdown page leads nowhere,
+#   - a block of C++ in one does not compile, or its program fails,
+#   - a public name is not documented, or Doxygen warns of anything else,
+#   - a link of the finished site leads nowhere.
+set -euo pipefail
+cd "$(dirname "$0")/.."
+. scripts/packages.sh
+
+need_packages doxygen g++ python3
+scripts/demo.sh > /dev/null # the library, with which the programs are linked
+python3 -B scripts/docs/build.py "$PWD/build/demo" "$PWD/build/docs"

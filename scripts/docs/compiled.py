@@ -1,0 +1,75 @@
+"""The C++ in the Markdown pages compiles.
+
+A block of `cpp` with a main is a program: it is compiled, linked and run. One that defines functions is a
+source file. Any other is the inside of a function and may use the names that fragment.h declares. A block
+that includes Android's headers is left to scripts/android_test.sh.
+"""
+
+import os
+import re
+import subprocess
+import tempfile
+from concurrent.futures import ThreadPoolExecutor
+from pathlib import Path
+
+from pages import ROOT
+
+COMPILER = os.environ.get("CXX", "g++")
+FLAGS = ["-std=c++17", "-Wall", "-Wextra", "-Wconversion", "-Werror", "-I", str(ROOT / "include")]
+SOURCE_FLAGS = [*FLAGS, "-fsyntax-only", "-x", "c++", "-"]
+FRAGMENT_FLAGS = [*SOURCE_FLAGS, "-Wno-unused", "-I", str(Path(__file__).parent)]
+ELSEWHERE = re.compile(r"#include <(android/|jni\.h)")
+MAIN = re.compile(r"\bint main\(")
+FUNCTION = re.compile(r"^(?!for|if|while|switch|else)\w[\w:&*<>, ]* [\w:]+\([^;]*\) \{$", re.MULTILINE)
+
+
+def located(page, block, text):
+    """The text, whose errors the compiler then reports at its place in the page."""
+    return f'#line {block.line} "{page.name}"\n{text}\n'
+
+
+def fault_of(arguments, source=None):
+    """The first error of the compiler, or None."""
+    said = subprocess.run([COMPILER, *arguments], input=source, text=True, capture_output=True, check=False)
+    if said.returncode == 0:
+        return None
+    lines = said.stderr.strip().split("\n")
+    return next((line for line in lines if "error" in line or "undefined reference" in line), lines[-1])
+
+
+def program_fault(page, block, library):
+    with tempfile.TemporaryDirectory() as folder:
+        source, program = Path(folder) / "program.cpp", Path(folder) / "program"
+        source.write_text(located(page, block, block.text))
+        fault = fault_of([*FLAGS, str(source), "-o", str(program), "-L", str(library), "-lvoreleffect",
+                          f"-Wl,-rpath,{library}"])
+        if fault:
+            return fault
+        result = subprocess.run([program], cwd=folder, capture_output=True, timeout=60, check=False).returncode
+        return f"{page.name}:{block.line}: the program ends with {result}" if result else None
+
+
+def fragment_fault(page, block):
+    lines = block.text.split("\n")
+    includes = "".join(line + "\n" for line in lines if line.startswith("#include"))
+    inside = "\n".join("" if line.startswith("#include") else line for line in lines)
+    source = (includes + '#include "fragment.h"\nvoid fragment();\nvoid fragment() {\n'
+              + located(page, block, inside) + "}\n")
+    return fault_of(FRAGMENT_FLAGS, source)
+
+
+def block_fault(page, block, library):
+    if MAIN.search(block.text):
+        return program_fault(page, block, library)
+    if FUNCTION.search(block.text):
+        return fault_of(SOURCE_FLAGS, located(page, block, block.text))
+    return fragment_fault(page, block)
+
+
+def code_faults(pages, library):
+    """One line for each block that does not compile, or whose program fails; and the number of blocks."""
+    blocks = [(page, block) for page in pages for block in page.blocks
+              if block.language == "cpp" and not ELSEWHERE.search(block.text)]
+    with ThreadPoolExecutor(2) as pool:
+        faults = list(pool.map(lambda both: block_fault(*both, library), blocks))
+    return [fault for fault in faults if fault], len(blocks)

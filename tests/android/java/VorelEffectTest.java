@@ -1,0 +1,560 @@
+import java.io.IOException;
+import java.lang.ref.WeakReference;
+import java.lang.reflect.InvocationTargetException;
+import java.lang.reflect.Method;
+import java.lang.reflect.Modifier;
+import java.nio.ByteBuffer;
+import java.nio.ByteOrder;
+import java.nio.file.Files;
+import java.nio.file.Path;
+import java.nio.file.Paths;
+import java.util.ArrayList;
+import java.util.Arrays;
+import java.util.LinkedHashMap;
+import java.util.List;
+import java.util.Map;
+import java.util.concurrent.atomic.AtomicReference;
+import java.util.function.Consumer;
+import org.voreleffect.VorelEffect;
+
+/**
+ * Tests of the Java facade: the same margins, keys and pixels as C++ (paint_runs.cpp wrote them), and
+ * what is refused. Each method whose name starts with "test" is a test; its name is a behaviour.
+ */
+public final class VorelEffectTest {
+    private static final int WIDTH = 67;
+    private static final int HEIGHT = 49;
+    private static final int TEXT_COLOR = 0x3366CC;
+
+    private static final int[] COLORS = {0xFF0000, 0x00FF80, 0x0000FF};
+    private static final float[] OPACITIES = {1, 0.75f, 0.5f};
+    private static final float[] LOCATIONS = {0, 0.4f, 1};
+    private static final int[] PATTERN = {
+        0xFFFF0000, 0x8000FF00, 0x400000FF, 0x12345678, 0xFFFFFFFF, 0xC0804020
+    };
+
+    private static final ByteBuffer RING = ring(31, 29);
+    private static final ByteBuffer BAR = bar(11, 25);
+
+    private final Path painted;
+
+    private VorelEffectTest(Path painted) {
+        this.painted = painted;
+    }
+
+    public static void main(String[] arguments) throws IllegalAccessException {
+        VorelEffectTest tests = new VorelEffectTest(Paths.get(arguments[0]));
+        int run = 0;
+        int failed = 0;
+        for (Method method : VorelEffectTest.class.getDeclaredMethods()) {
+            if (!method.getName().startsWith("test")) continue;
+            ++run;
+            try {
+                method.invoke(tests);
+            } catch (InvocationTargetException e) {
+                ++failed;
+                System.err.println("FAILED " + method.getName());
+                e.getCause().printStackTrace();
+            }
+        }
+        System.out.println(run + " tests, " + failed + " failed");
+        System.exit(run > 0 && failed == 0 ? 0 : 1);
+    }
+
+    // --- The same as C++ ------------------------------------------------------------------------
+
+    private static Map<String, Consumer<VorelEffect>> looks() {
+        Map<String, Consumer<VorelEffect>> looks = new LinkedHashMap<>();
+        looks.put("plain", look -> {});
+        looks.put("outer_shadow", look -> look.addOuterShadowText(120.5f, 5, 4, 0x102030, 0.7f));
+        looks.put("inner_shadow", look -> look.addInnerShadowText(-30.7f, 3, 2, 0xFFEEDD, 0.6f));
+        looks.put("outer_glow", look -> look.addOuterGlowText(6, 0xFFD700, 0.8f));
+        looks.put(
+                "outer_glow_stops",
+                look -> look.addOuterGlowText(7, 0x123456, 0.9f, COLORS, OPACITIES, LOCATIONS));
+        looks.put("inner_glow", look -> look.addInnerGlowText(4, 0x00FFFF, 0.5f));
+        looks.put(
+                "inner_glow_stops",
+                look -> look.addInnerGlowText(5, 0x654321, 1, COLORS, OPACITIES, LOCATIONS));
+        looks.put(
+                "linear",
+                look -> look.addLinearGradientText(60, 0.8f, 0.9f, COLORS, OPACITIES, LOCATIONS));
+        looks.put(
+                "radial",
+                look ->
+                        look.addRadialGradientText(
+                                1.2f,
+                                0.8f,
+                                Arrays.copyOf(COLORS, 2),
+                                Arrays.copyOf(OPACITIES, 2),
+                                Arrays.copyOf(LOCATIONS, 2)));
+        looks.put(
+                "stroke_centre",
+                look -> look.addStrokeText(3, 0xFFFFFF, 1, 7, VorelEffect.STROKE_CENTRE));
+        looks.put(
+                "stroke_outside",
+                look -> look.addStrokeText(4, 0x00AA00, 0.9f, 0, VorelEffect.STROKE_OUTSIDE));
+        looks.put(
+                "stroke_inside",
+                look -> look.addStrokeText(2, 0xAA0000, 0.4f, 0, VorelEffect.STROKE_INSIDE));
+        looks.put("pattern", look -> look.addPatternText(PATTERN, 3, 2, 1.5f, 0.9f));
+        looks.put("translucent", VorelEffectTest::describeTranslucent);
+        looks.put("everything", VorelEffectTest::describeEverything);
+        return looks;
+    }
+
+    private static void describeTranslucent(VorelEffect look) {
+        look.setTextOpacity(0.4f);
+        look.addOuterShadowText(315, 6, 3, 0x000000, 0.8f);
+        look.addStrokeText(2, 0xFF8800, 1, 0, VorelEffect.STROKE_OUTSIDE);
+    }
+
+    private static void describeEverything(VorelEffect look) {
+        look.addOuterShadowText(45, 4, 6, 0x202020, 0.5f);
+        look.addOuterGlowText(5, 0xFFFF00, 0.5f);
+        look.addStrokeText(2, 0x000080, 1, 0, VorelEffect.STROKE_OUTSIDE);
+        look.addLinearGradientText(90, 1, 1, COLORS, OPACITIES, LOCATIONS);
+        look.addInnerGlowText(3, 0xFFFFFF, 0.7f);
+        look.addInnerShadowText(270, 2, 2, 0x400040, 0.9f);
+    }
+
+    void testEveryLookHasTheMarginsKeyAndPixelsOfCpp() throws IOException {
+        Map<String, Consumer<VorelEffect>> looks = looks();
+        for (Map.Entry<String, Consumer<VorelEffect>> entry : looks.entrySet()) {
+            byte[] expected = Files.readAllBytes(painted.resolve(entry.getKey()));
+            byte[] actual = paint(entry.getValue());
+            check(Arrays.equals(expected, actual), entry.getKey() + " differs from C++");
+        }
+        check(painted.toFile().list().length == looks.size(), "C++ paints as many looks");
+    }
+
+    /** What paint_runs writes of a look. */
+    private static byte[] paint(Consumer<VorelEffect> describe) {
+        try (VorelEffect look = new VorelEffect()) {
+            describe.accept(look);
+            byte[] key = look.getMapKey(TEXT_COLOR);
+            int bytes = WIDTH * HEIGHT * 4;
+            ByteBuffer said = ByteBuffer.allocate(5 * 4 + key.length + 2 * bytes);
+            said.order(ByteOrder.LITTLE_ENDIAN);
+            said.putInt(look.getLeftOffset()).putInt(look.getTopOffset());
+            said.putInt(look.getRightOffset()).putInt(look.getBottomOffset());
+            said.putInt(key.length).put(key);
+            ByteBuffer picture = picture();
+            for (int run = 0; run < 2; ++run) {
+                paintRun(look, picture);
+                said.put(picture.duplicate());
+            }
+            return said.array();
+        }
+    }
+
+    // --- Buffers --------------------------------------------------------------------------------
+
+    void testRunUsesTheBytesFromThePositionsOnAndMovesNoPosition() {
+        ByteBuffer wide = ByteBuffer.allocateDirect(5 + WIDTH * HEIGHT * 4 + 7);
+        for (int i = 0; i < wide.capacity(); ++i) wide.put(i, (byte) (i < 5 ? 0x55 : 0));
+        for (int i = wide.capacity() - 7; i < wide.capacity(); ++i) wide.put(i, (byte) 0x55);
+        wide.position(5).limit(wide.capacity() - 7);
+
+        ByteBuffer atlas = ByteBuffer.allocateDirect(3 + RING.capacity() + BAR.capacity());
+        atlas.position(3);
+        atlas.put(RING.duplicate()).put(BAR.duplicate());
+        ByteBuffer ring = atlas.duplicate();
+        ring.position(3).limit(3 + RING.capacity());
+        ring = ring.slice();
+        ByteBuffer bar = atlas.duplicate();
+        bar.position(3 + RING.capacity());
+
+        try (VorelEffect look = everything()) {
+            look.begin(WIDTH, HEIGHT, wide);
+            look.glyph(8, 9, ring, 31, 29);
+            look.glyph(33, 11, bar, 11, 25);
+            look.glyph(60, -3, bar, 11, 25);
+            look.finish();
+        }
+        check(wide.position() == 5, "position of the destination");
+        check(bar.position() == 3 + RING.capacity(), "position of the coverage");
+        check(wide.slice().equals(everythingPainted()), "pixels");
+        for (int i = 0; i < 5; ++i) check(wide.get(i) == 0x55, "byte before the destination");
+        wide.clear();
+        for (int i = wide.capacity() - 7; i < wide.capacity(); ++i) {
+            check(wide.get(i) == 0x55, "byte after the destination");
+        }
+    }
+
+    void testDestinationStaysReachableWhileTheRunIsOpen() {
+        try (VorelEffect look = new VorelEffect()) {
+            WeakReference<ByteBuffer> destination = beginAndForget(look);
+            for (int i = 0; i < 3; ++i) System.gc();
+            check(destination.get() != null, "collected within the run");
+            look.finish();
+            for (int i = 0; i < 100 && destination.get() != null; ++i) System.gc();
+            check(destination.get() == null, "kept after the run");
+        }
+    }
+
+    private static WeakReference<ByteBuffer> beginAndForget(VorelEffect look) {
+        ByteBuffer destination = picture();
+        look.begin(WIDTH, HEIGHT, destination);
+        return new WeakReference<>(destination);
+    }
+
+    void testEmptyGlyphsNeedNoBytes() {
+        try (VorelEffect look = new VorelEffect()) {
+            look.begin(WIDTH, HEIGHT, picture());
+            look.glyph(0, 0, ByteBuffer.allocateDirect(0), 0, 0);
+            look.glyph(0, 0, ByteBuffer.allocateDirect(0), 0xFFFF, 0);
+            look.finish();
+        }
+    }
+
+    void testDestinationThatDoesNotFitIsRefused() {
+        try (VorelEffect look = everything()) {
+            int bytes = WIDTH * HEIGHT * 4;
+            refused(() -> look.begin(WIDTH, HEIGHT, null));
+            refused(() -> look.begin(WIDTH, HEIGHT, ByteBuffer.allocate(bytes)));
+            refused(() -> look.begin(WIDTH, HEIGHT, ByteBuffer.allocateDirect(bytes - 1)));
+            ByteBuffer moved = picture();
+            moved.position(1);
+            refused(() -> look.begin(WIDTH, HEIGHT, moved));
+            ByteBuffer limited = picture();
+            limited.limit(bytes - 1);
+            refused(() -> look.begin(WIDTH, HEIGHT, limited));
+            refused(() -> look.begin(WIDTH, HEIGHT, picture().asReadOnlyBuffer()));
+            refused(() -> look.begin(0, HEIGHT, picture()));
+            refused(() -> look.begin(WIDTH, 0, picture()));
+            refused(() -> look.begin(-WIDTH, -HEIGHT, picture()));
+            refused(() -> look.begin(1 << 16, 1 << 16, picture()));
+            refused(() -> look.begin(1 << 30, 1 << 30, picture()));
+            refused(() -> look.begin(Integer.MAX_VALUE, Integer.MAX_VALUE, picture()));
+            misplaced(look::finish);
+        }
+    }
+
+    void testGlyphThatDoesNotFitIsRefusedAndTheRunGoesOn() {
+        ByteBuffer picture = picture();
+        try (VorelEffect look = everything()) {
+            look.begin(WIDTH, HEIGHT, picture);
+            refused(() -> look.glyph(0, 0, null, 1, 1));
+            refused(() -> look.glyph(0, 0, ByteBuffer.allocate(100), 10, 10));
+            refused(() -> look.glyph(0, 0, ByteBuffer.allocateDirect(99), 10, 10));
+            ByteBuffer moved = ByteBuffer.allocateDirect(100);
+            moved.position(1);
+            refused(() -> look.glyph(0, 0, moved, 10, 10));
+            refused(() -> look.glyph(0, 0, RING, -1, 1));
+            refused(() -> look.glyph(0, 0, RING, 1, -1));
+            refused(() -> look.glyph(0, 0, RING, 1 << 16, 0));
+            refused(() -> look.glyph(0, 0, RING, 0, 1 << 16));
+            refused(() -> look.glyph(0, 0, RING, 0xFFFF, 0xFFFF));
+            glyphs(look);
+            look.finish();
+        }
+        check(picture.equals(everythingPainted()), "pixels");
+    }
+
+    // --- Arrays ---------------------------------------------------------------------------------
+
+    void testStopsThatDoNotFitAreRefused() {
+        float[] two = {0, 1};
+        try (VorelEffect look = new VorelEffect()) {
+            refused(() -> look.addOuterGlowText(1, 0, 1, null, OPACITIES, LOCATIONS));
+            refused(() -> look.addOuterGlowText(1, 0, 1, COLORS, two, LOCATIONS));
+            refused(() -> look.addInnerGlowText(1, 0, 1, COLORS, null, LOCATIONS));
+            refused(() -> look.addInnerGlowText(1, 0, 1, COLORS, OPACITIES, two));
+            refused(() -> look.addLinearGradientText(0, 1, 1, COLORS, OPACITIES, null));
+            refused(() -> look.addLinearGradientText(0, 1, 1, COLORS, OPACITIES, two));
+            refused(
+                    () ->
+                            look.addLinearGradientText(
+                                    0, 1, 1, new int[0], new float[0], new float[0]));
+            refused(() -> look.addRadialGradientText(1, 1, COLORS, two, LOCATIONS));
+            refused(
+                    () -> look.addRadialGradientText(1, 1, new int[0], new float[0], new float[0]));
+            check(look.getMapKey().length == 0, "an effect was added");
+        }
+    }
+
+    void testStopsAfterThe256thAreLeftOut() {
+        int[] colors = new int[300];
+        float[] opacities = new float[300];
+        float[] locations = new float[300];
+        for (int i = 0; i < 300; ++i) {
+            colors[i] = i * 0x010305;
+            opacities[i] = 1;
+            locations[i] = i / 300f;
+        }
+        try (VorelEffect all = new VorelEffect();
+                VorelEffect first = new VorelEffect()) {
+            all.addLinearGradientText(0, 1, 1, colors, opacities, locations);
+            first.addLinearGradientText(
+                    0,
+                    1,
+                    1,
+                    Arrays.copyOf(colors, 256),
+                    Arrays.copyOf(opacities, 256),
+                    Arrays.copyOf(locations, 256));
+            check(Arrays.equals(all.getMapKey(), first.getMapKey()), "keys");
+        }
+    }
+
+    void testGlowWithoutStopsIsThatOfOneColor() {
+        try (VorelEffect empty = new VorelEffect();
+                VorelEffect plain = new VorelEffect()) {
+            empty.addOuterGlowText(5, 0x808080, 1, new int[0], new float[0], new float[0]);
+            plain.addOuterGlowText(5, 0x808080, 1);
+            check(Arrays.equals(empty.getMapKey(), plain.getMapKey()), "keys");
+        }
+    }
+
+    void testPatternThatDoesNotFitIsRefused() {
+        try (VorelEffect look = new VorelEffect()) {
+            refused(() -> look.addPatternText(null, 1, 1, 1, 1));
+            refused(() -> look.addPatternText(PATTERN, 7, 1, 1, 1));
+            refused(() -> look.addPatternText(PATTERN, 0, 1, 1, 1));
+            refused(() -> look.addPatternText(PATTERN, 1, 0, 1, 1));
+            refused(() -> look.addPatternText(PATTERN, -3, -2, 1, 1));
+            refused(() -> look.addPatternText(PATTERN, 1 << 15, 1 << 15, 1, 1));
+            refused(() -> look.addPatternText(PATTERN, 1 << 16, 1 << 16, 1, 1));
+            check(look.addText(0, 1) == 0, "an effect was added");
+        }
+    }
+
+    // --- Order of calls -------------------------------------------------------------------------
+
+    void testClosedObjectRefusesEveryCall() throws IllegalAccessException {
+        VorelEffect look = new VorelEffect();
+        look.begin(WIDTH, HEIGHT, picture());
+        look.close();
+        int called = 0;
+        for (Method method : calls()) {
+            check(thrownBy(look, method) instanceof IllegalStateException, method + " on a closed");
+            ++called;
+        }
+        check(called >= 25, "methods called: " + called);
+        look.close();
+    }
+
+    void testLookDoesNotChangeWithinARun() throws IllegalAccessException {
+        try (VorelEffect look = everything()) {
+            ByteBuffer picture = picture();
+            look.begin(WIDTH, HEIGHT, picture);
+            int called = 0;
+            for (Method method : calls()) {
+                String name = method.getName();
+                boolean takesColor = method.getParameterCount() == 1;
+                if (name.startsWith("add")
+                        || name.equals("removeEffect")
+                        || name.equals("cleanAllEffect")
+                        || name.equals("setTextOpacity")
+                        || name.equals("getMapKey") && takesColor) {
+                    check(thrownBy(look, method) instanceof IllegalStateException, name);
+                    ++called;
+                }
+            }
+            check(called == 17, "methods called: " + called);
+            glyphs(look);
+            look.finish();
+            check(picture.equals(everythingPainted()), "pixels");
+        }
+    }
+
+    void testGlyphAndFinishNeedAnOpenRun() {
+        try (VorelEffect look = new VorelEffect()) {
+            misplaced(() -> look.glyph(0, 0, BAR, 11, 25));
+            misplaced(look::finish);
+            look.begin(WIDTH, HEIGHT, picture());
+            look.finish();
+            misplaced(() -> look.glyph(0, 0, BAR, 11, 25));
+            misplaced(look::finish);
+        }
+    }
+
+    void testRunThatIsBegunAnewForgetsTheFormerOne() {
+        ByteBuffer dropped = picture();
+        ByteBuffer picture = picture();
+        try (VorelEffect look = everything()) {
+            look.begin(WIDTH, HEIGHT, dropped);
+            look.glyph(0, 40, RING, 31, 29); // would stretch the gradient
+            look.begin(WIDTH, HEIGHT, picture);
+            glyphs(look);
+            look.finish();
+        }
+        check(dropped.equals(picture()), "the dropped run was painted");
+        check(picture.equals(everythingPainted()), "the dropped run left a trace");
+    }
+
+    void testClosingFromAnotherThreadEndsInARefusal() throws InterruptedException {
+        for (int round = 0; round < 50; ++round) {
+            VorelEffect look = everything();
+            AtomicReference<Throwable> thrown = new AtomicReference<>();
+            Thread painter =
+                    new Thread(
+                            () -> {
+                                try {
+                                    while (true) paintRun(look, picture());
+                                } catch (Throwable e) {
+                                    thrown.set(e);
+                                }
+                            });
+            painter.start();
+            Thread.sleep(round % 5);
+            look.close();
+            painter.join();
+            check(thrown.get() instanceof IllegalStateException, "thrown: " + thrown.get());
+        }
+    }
+
+    // --- The registry ---------------------------------------------------------------------------
+
+    void testIdsCountUpAndEffectsGo() {
+        try (VorelEffect look = new VorelEffect()) {
+            check(look.addStrokeText(4, 0, 1, 0, VorelEffect.STROKE_OUTSIDE) == 0, "first id");
+            check(look.addText(0, 1) == 1, "second id");
+            check(look.addStrokeText(8, 0, 1, 0, VorelEffect.STROKE_OUTSIDE) == 0, "updated id");
+            check(look.getLeftOffset() > 0, "margin of the stroke");
+            check(look.removeEffect(0), "removed");
+            check(!look.removeEffect(0), "removed twice");
+            check(look.getLeftOffset() == 0, "margin without the stroke");
+            look.cleanAllEffect();
+            check(look.getMapKey().length == 0, "key of no effects");
+            check(look.addText(0, 1) == 0, "ids start anew");
+        }
+    }
+
+    void testBevelAndEmbossAddNothing() {
+        try (VorelEffect look = new VorelEffect()) {
+            int bevel = look.addBevelText(0, 5, 1, 0, 0, 2, 1, 120, 30, 0xFFFFFF, 1, 0, 1);
+            int emboss = look.addEmbossText(0, 5, 1, 0, 0, 2, 1, 120, 30, 0xFFFFFF, 1, 0, 1);
+            check(bevel == VorelEffect.NO_EFFECT && emboss == VorelEffect.NO_EFFECT, "ids");
+            check(look.getMapKey().length == 0, "key");
+        }
+    }
+
+    void testTextOpacityIsClamped() {
+        try (VorelEffect look = new VorelEffect()) {
+            check(look.getTextOpacity() == 1, "at the start");
+            look.setTextOpacity(0.25f);
+            check(look.getTextOpacity() == 0.25f, "set");
+            look.setTextOpacity(7);
+            check(look.getTextOpacity() == 1, "above");
+            look.setTextOpacity(Float.NaN);
+            check(look.getTextOpacity() == 0, "NaN");
+        }
+    }
+
+    void testKeyTellsLooksApartAndHoldsNoZeroByte() {
+        try (VorelEffect look = everything();
+                VorelEffect same = everything();
+                VorelEffect other = everything()) {
+            other.addStrokeText(3, 0x000080, 1, 0, VorelEffect.STROKE_OUTSIDE);
+            byte[] key = look.getMapKey();
+            check(Arrays.equals(key, same.getMapKey()), "equal looks");
+            check(!Arrays.equals(key, other.getMapKey()), "different looks");
+            for (byte b : key) check(b != 0, "zero byte");
+        }
+    }
+
+    // --- Support --------------------------------------------------------------------------------
+
+    private static ByteBuffer ring(int width, int height) {
+        ByteBuffer coverage = ByteBuffer.allocateDirect(width * height);
+        for (int y = 0; y < height; ++y) {
+            for (int x = 0; x < width; ++x) {
+                int fromCentre = (x - 15) * (x - 15) + (y - 14) * (y - 14);
+                coverage.put((byte) Math.max(255 - Math.abs(fromCentre - 120) * 3, 0));
+            }
+        }
+        coverage.rewind();
+        return coverage;
+    }
+
+    private static ByteBuffer bar(int width, int height) {
+        ByteBuffer coverage = ByteBuffer.allocateDirect(width * height);
+        for (int i = 0; i < width * height; ++i) {
+            coverage.put((byte) (i % width == 0 || i % width == width - 1 ? 128 : 255));
+        }
+        coverage.rewind();
+        return coverage;
+    }
+
+    private static ByteBuffer picture() {
+        return ByteBuffer.allocateDirect(WIDTH * HEIGHT * 4);
+    }
+
+    private static void glyphs(VorelEffect look) {
+        look.glyph(8, 9, RING, 31, 29);
+        look.glyph(33, 11, BAR, 11, 25);
+        look.glyph(60, -3, BAR, 11, 25);
+    }
+
+    private static void paintRun(VorelEffect look, ByteBuffer picture) {
+        look.begin(WIDTH, HEIGHT, picture);
+        glyphs(look);
+        look.finish();
+    }
+
+    private static VorelEffect everything() {
+        VorelEffect look = new VorelEffect();
+        describeEverything(look);
+        look.getMapKey(TEXT_COLOR);
+        return look;
+    }
+
+    /** The pixels of the run that C++ painted as well. */
+    private static ByteBuffer everythingPainted() {
+        ByteBuffer picture = picture();
+        try (VorelEffect look = everything()) {
+            paintRun(look, picture);
+        }
+        return picture;
+    }
+
+    /** Every public method of an object but close. */
+    private static List<Method> calls() {
+        List<Method> calls = new ArrayList<>();
+        for (Method method : VorelEffect.class.getDeclaredMethods()) {
+            int modifiers = method.getModifiers();
+            boolean call = Modifier.isPublic(modifiers) && !Modifier.isStatic(modifiers);
+            if (call && !method.getName().equals("close")) calls.add(method);
+        }
+        return calls;
+    }
+
+    /** What a call with zeros and nulls throws; null if nothing. */
+    private static Throwable thrownBy(VorelEffect look, Method method) throws IllegalAccessException {
+        Object[] arguments = new Object[method.getParameterCount()];
+        for (int i = 0; i < arguments.length; ++i) {
+            Class<?> type = method.getParameterTypes()[i];
+            if (type == int.class) arguments[i] = 0;
+            if (type == float.class) arguments[i] = 0f;
+        }
+        try {
+            method.invoke(look, arguments);
+            return null;
+        } catch (InvocationTargetException e) {
+            return e.getCause();
+        }
+    }
+
+    private static void refused(Runnable call) {
+        expect(IllegalArgumentException.class, call);
+    }
+
+    private static void misplaced(Runnable call) {
+        expect(IllegalStateException.class, call);
+    }
+
+    private static void expect(Class<? extends Throwable> kind, Runnable call) {
+        try {
+            call.run();
+        } catch (RuntimeException e) {
+            check(e.getClass() == kind, kind.getSimpleName() + " expected, not " + e);
+            return;
+        }
+        throw new AssertionError(kind.getSimpleName() + " expected");
+    }
+
+    private static void check(boolean holds, String what) {
+        if (!holds) throw new AssertionError(what);
+    }
+}

@@ -1,0 +1,78 @@
+#!/usr/bin/env bash
+# Compiles and links the Android form without an NDK, for its shape alone: that the __ANDROID__ paths
+# compile, and that the library takes from outside exactly what it should. The C library, its maths,
+# liblog and the C++ runtime it is linked against are stubs (shape/stubs); nothing of this can run, and
+# nothing of it is packaged.
+#
+#     tests/android/shape.sh    checks; prints what is taken from which library
+set -euo pipefail
+cd "$(dirname "$0")/../.."
+
+build=build/android_shape
+stubs=$PWD/$build/stubs
+sources=tests/android/shape/stubs
+mkdir -p "$stubs"
+
+compile=(clang-14 --target=aarch64-linux-android24 -fPIC -fno-builtin -w)
+for name in c m log jnigraphics; do
+    "${compile[@]}" -shared -nostdlib -fuse-ld=lld -Wl,-soname,"lib$name.so" "$sources/$name.c" \
+        -o "$stubs/lib$name.so"
+done
+"${compile[@]}" -c "$sources/cxx_static.c" -o "$stubs/cxx_static.o"
+llvm-ar-14 crs "$stubs/libc++_static.a" "$stubs/cxx_static.o"
+
+VOREL_STUBS=$stubs cmake -S tests/android/shape -B "$build" -G Ninja \
+    -DCMAKE_BUILD_TYPE=Release -DCMAKE_TOOLCHAIN_FILE="$PWD/tests/android/shape/toolchain.cmake" > /dev/null
+cmake --build "$build" --parallel 2 -- --quiet
+ninja -C "$build" -t cleandead > /dev/null # objects of sources that have gone
+
+failed=0
+complain() {
+    echo "$1" >&2
+    failed=1
+}
+
+# names FILE NM_OPTION... : the symbols of a library or of object files, without a local one
+names() { llvm-nm-14 --format=just-symbols --extern-only "$@" | grep -v -e '^$' -e ':$' | LC_ALL=C sort -u; }
+# same WHAT EXPECTED ACTUAL : two lists of lines
+same() { diff -u --label expected --label actual <(echo "$2") <(echo "$3") || complain "$1 differ"; }
+dynamic() { readelf --wide -d "$1" | sed -n "s/.*($2).*\[\(.*\)\]/\1/p" | LC_ALL=C sort; }
+lines() { printf '%s\n' "$@" | LC_ALL=C sort; }
+
+# check_library FILE NEEDED... : its name, its needs, its alignment, no text relocations
+check_library() {
+    local library=$1 alignment
+    shift
+    same "$library: NEEDED" "$(lines "$@")" "$(dynamic "$library" NEEDED)"
+    same "$library: SONAME" "$(basename "$library")" "$(dynamic "$library" SONAME)"
+    ! readelf --wide -d "$library" | grep -q TEXTREL || complain "$library: has text relocations"
+    for alignment in $(readelf --wide -l "$library" | awk '$1 == "LOAD" { print $NF }'); do
+        ((alignment >= 16384)) || complain "$library: a segment is aligned to $alignment, less than 16 KB"
+    done
+}
+
+library=$build/voreleffect/libvoreleffect.so
+native=$build/voreleffect/android/libvoreleffect_jni.so
+check_library "$library" libc.so libm.so liblog.so
+check_library "$native" libvoreleffect.so libc.so
+recipe=$build/libbitmap_recipe.so
+same "$recipe: NEEDED" "$(lines libvoreleffect.so libjnigraphics.so libc.so)" "$(dynamic "$recipe" NEEDED)"
+# clang makes no constructor of a whole object for the abstract classes: nothing could call it.
+exported=$(grep -vE 'VFPropertyC1Ejf$|VFECoreBaseC1Ev$' tests/abi/symbols.txt)
+same "$library: exported symbols" "$exported" "$(names --dynamic --defined-only "$library")"
+
+# What the objects of the library leave undefined is, name by name, what the stubs have; what is left
+# when the C++ runtime is linked in is, name by name, what the three shared ones have.
+mapfile -t objects < <(find "$build/voreleffect/CMakeFiles" -name '*.o')
+outside=$(LC_ALL=C comm -23 <(names --undefined-only "${objects[@]}") <(names --defined-only "${objects[@]}"))
+shared=$(names --defined-only "$stubs"/lib{c,m,log}.so)
+runtime=$(names --defined-only "$stubs/cxx_static.o")
+same "$library: symbols from outside (see $sources)" "$(lines "$shared" "$runtime")" "$outside"
+same "$library: undefined symbols (see $sources)" "$shared" "$(names --dynamic --undefined-only "$library")"
+
+for name in c m log; do
+    echo "lib$name.so: $(names --defined-only "$stubs/lib$name.so" | paste -sd ' ')"
+done
+echo "C++ runtime, linked in: $(names --defined-only "$stubs/cxx_static.o" | llvm-cxxfilt-14 | paste -sd ';' | sed 's/;/; /g')"
+[[ $failed -eq 0 ]] && echo "the Android form has its shape"
+exit "$failed"

@@ -1,0 +1,12 @@
+#include "stub.h"
+
+FUNCTION(abort)
+FUNCTION(calloc)
+FUNCTION(free)
+FUNCTION(getauxval) /* the level of the instruction set */
+FUNCTION(malloc)
+FUNCTION(memcpy)
+FUNCTION(memmove)
+FUNCTION(memset)
+FUNCTION(strlen)
+FUNCTION(vsnprintf)

@@ -1,0 +1,3 @@
+#include "stub.h"
+
+FUNCTION(__android_log_print)

@@ -1,0 +1,6 @@
+#include "stub.h"
+
+FUNCTION(cosf)
+FUNCTION(ldexp)
+FUNCTION(sinf)
+FUNCTION(tanf)

@@ -1,0 +1,151 @@
+#include "batch.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+#include <variant>
+
+#include "error.h"
+
+namespace vorelpaint {
+namespace {
+
+const Options kCommon;
+
+Options jobOf(const std::string& members, const Options& common = kCommon) {
+    return parseJob(R"({"text": "A", "output": "a.png")" + (members.empty() ? "" : ", " + members) + "}",
+                    common);
+}
+
+std::string faultOf(const std::string& line) {
+    try {
+        parseJob(line, kCommon);
+        return "";
+    } catch (const ToolError& error) {
+        return error.what();
+    }
+}
+
+std::string faultOfMember(const std::string& member) {
+    return faultOf(R"({"text": "A", "output": "a.png", )" + member + "}");
+}
+
+TEST(Batch, EachKey_IsRead) {
+    const Options job = jobOf(
+        R"("font": "DejaVu Serif", "size": 12, "align": "right", "preset": "gold", "effect-scale": 2.5,
+           "color": "#010203", "opacity": 0.25, "background": "checkerboard", "padding": 0)");
+    EXPECT_EQ(job.text, "A");
+    EXPECT_EQ(job.output, "a.png");
+    EXPECT_EQ(job.font, "DejaVu Serif");
+    EXPECT_EQ(job.size, 12);
+    EXPECT_EQ(job.align, Align::right);
+    EXPECT_EQ(job.preset, "gold");
+    EXPECT_EQ(job.effectScale, 2.5F);
+    EXPECT_EQ(job.color, 0x010203U);
+    EXPECT_EQ(job.opacity, 0.25F);
+    EXPECT_EQ(job.background.kind, Background::Kind::checkerboard);
+    EXPECT_EQ(job.padding, 0);
+}
+
+TEST(Batch, Numbers_AreReadAsTheCommandLineReadsThem) {
+    EXPECT_EQ(jobOf(R"("opacity": 1e-1)").opacity, 0.1F);
+    EXPECT_EQ(jobOf(R"("effect-scale": 0.7)").effectScale, 0.7F);
+}
+
+TEST(Batch, Style_IsAFileOrAnObject) {
+    EXPECT_EQ(jobOf(R"("style": "look.json")").style, "look.json");
+    const Options job = jobOf(R"("style": {"outerGlow": {"size": 3, "color": "#0000FF"}})");
+    ASSERT_TRUE(job.inlineStyle);
+    ASSERT_EQ(job.inlineStyle->effects.size(), 1U);
+    EXPECT_EQ(std::get<OuterGlow>(job.inlineStyle->effects[0]).size, 3.0F);
+}
+
+TEST(Batch, WhatAJobDoesNotSay_IsTheCommandLines) {
+    Options common;
+    common.size = 33;
+    common.preset = "gold";
+    common.text = "common";
+    const Options job = parseJob(R"({"output": "a.png"})", common);
+    EXPECT_EQ(job.size, 33);
+    EXPECT_EQ(job.preset, "gold");
+    EXPECT_EQ(job.text, "common");
+}
+
+TEST(Batch, WhatAJobSays_ReplacesTheOtherOfThePair) {
+    Options common;
+    common.preset = "gold";
+    common.textFile = "words.txt";
+    const Options job = jobOf(R"("style": {})", common);
+    EXPECT_FALSE(job.preset);
+    EXPECT_FALSE(job.textFile);
+    EXPECT_EQ(job.text, "A");
+    EXPECT_FALSE(jobOf(R"("preset": "neon")", common).style);
+}
+
+TEST(Batch, UnknownKeys_AreRefusedWithTheKnownOnes) {
+    EXPECT_EQ(faultOfMember(R"("colour": "#000000")"),
+              "colour: unknown key; known are text, text-file, font, size, align, style, preset, "
+              "effect-scale, color, opacity, output, background, padding");
+    EXPECT_EQ(faultOfMember(R"("batch": "b.jsonl")").rfind("batch: unknown key", 0), 0U);
+    EXPECT_EQ(faultOfMember(R"("help": true)").rfind("help: unknown key", 0), 0U);
+}
+
+TEST(Batch, WrongTypes_AreNamed) {
+    EXPECT_EQ(faultOf("[]"), "must be an object, not an array");
+    EXPECT_EQ(faultOfMember(R"("size": "12")"), "size: must be a number, not a string");
+    EXPECT_EQ(faultOfMember(R"("align": 1)"), "align: must be a string, not a number");
+    EXPECT_EQ(faultOfMember(R"("style": 1)"), "style: must be a string, not a number");
+    EXPECT_EQ(faultOf(R"({"text": null, "output": "a.png"})"), "text: must be a string, not null");
+}
+
+TEST(Batch, WrongValues_AreNamedWithTheirRange) {
+    EXPECT_EQ(faultOfMember(R"("size": 0)"), "size: '0' is no whole number from 1 to 1000");
+    EXPECT_EQ(faultOfMember(R"("size": 12.5)"), "size: '12.5' is no whole number from 1 to 1000");
+    EXPECT_EQ(faultOfMember(R"("align": "middle")"), "align: 'middle' is none of left, center, right");
+    EXPECT_EQ(faultOfMember(R"("color": "red")"), "color: 'red' is no colour; write #RRGGBB");
+}
+
+TEST(Batch, FaultsOfAnInlineStyle_HaveTheirPath) {
+    EXPECT_EQ(faultOfMember(R"("style": {"stroke": {"size": 200}})"),
+              "style.stroke.size: 200 is out of range, 0 to 100");
+    EXPECT_EQ(faultOfMember(R"("style": {"stroke": {"size": 1, "size": 2}})"),
+              "style.stroke.size: key given twice");
+    EXPECT_EQ(faultOfMember(R"("style": {"glow": {}})").rfind("style.glow: unknown key", 0), 0U);
+}
+
+TEST(Batch, Pairs_AreRefused) {
+    EXPECT_EQ(faultOfMember(R"("text-file": "t")"), "text-file: stands beside text");
+    EXPECT_EQ(faultOfMember(R"("style": {}, "preset": "gold")"), "preset: stands beside style");
+}
+
+TEST(Batch, MissingOutputOrText_IsNamed) {
+    EXPECT_EQ(faultOf(R"({"text": "A"})"), "output: missing; the PNG file to write");
+    EXPECT_EQ(faultOf(R"({"output": "a.png"})"), "text: missing; a job has text or text-file");
+}
+
+TEST(Batch, StandardInputAndOutput_AreNotForJobs) {
+    const std::string refusal = "must name a file: jobs have no standard input or output";
+    EXPECT_EQ(faultOf(R"({"text": "A", "output": "-"})"), "output: " + refusal);
+    EXPECT_EQ(faultOf(R"({"text-file": "-", "output": "a.png"})"), "text-file: " + refusal);
+    EXPECT_EQ(faultOfMember(R"("style": "-")"), "style: " + refusal);
+    EXPECT_EQ(parseJob(R"({"text": "-", "output": "a.png"})", kCommon).text, "-");
+}
+
+TEST(Batch, NulInAName_IsRefused) {
+    EXPECT_EQ(faultOf(R"({"text": "A", "output": "a.png\u0000.txt"})"), "output: has a NUL character");
+}
+
+TEST(Batch, SyntaxErrors_NameTheColumn) {
+    EXPECT_EQ(faultOf(R"({"text": })").rfind("no valid JSON: column 10: ", 0), 0U)
+        << faultOf(R"({"text": })");
+    EXPECT_EQ(faultOf(R"({"text": "A"} {})").rfind("no valid JSON: column 15: ", 0), 0U)
+        << faultOf(R"({"text": "A"} {})");
+    EXPECT_EQ(faultOf(R"({"text": "A", "text": "B"})"), "text: key given twice");
+}
+
+TEST(Batch, OverlongLine_IsRefused) {
+    EXPECT_EQ(faultOf(std::string((1 << 18) + 1, ' ')), "longer than 262144 bytes");
+}
+
+}  // namespace
+}  // namespace vorelpaint

@@ -1,0 +1,19 @@
+#!/usr/bin/env bash
+# The manual page is well-formed and tells every option of the help: manual_test.sh VORELPAINT PAGE
+set -euo pipefail
+program=$1
+page=$2
+
+# A page without a date is built alike every day.
+findings=$(mandoc -T lint -W style "$page" | grep -v 'WARNING: missing date' || true)
+[[ -z $findings ]] || { printf '%s\n' "$findings" >&2; exit 1; }
+
+text=$(mandoc -T ascii -O width=100 "$page" | col -b)
+options=$("$program" --help | sed -n '/^Examples:/q; s/^ *\(-., *\)\?\(-.,\)\?\(--[a-z-]*\).*/\3/p')
+[[ $(wc -l <<< "$options") -ge 20 ]]
+for option in $options; do
+    grep -q -- "^  *\(-[a-z], \)\?$option\( \|$\)" <<< "$text" || { echo "no $option in the page" >&2; exit 1; }
+done
+for section in NAME SYNOPSIS DESCRIPTION OPTIONS 'EXIT CODES' EXAMPLES; do
+    grep -q "^$section$" <<< "$text" || { echo "no section $section" >&2; exit 1; }
+done

@@ -1,0 +1,89 @@
+#include "settings.h"
+
+#include <gtest/gtest.h>
+
+#include <set>
+#include <string>
+
+#include "completion.h"
+#include "help_text.h"
+#include "manual.h"
+
+namespace vorelpaint {
+namespace {
+
+TEST(Settings, Names_AreUniqueAndDescribed) {
+    std::set<std::string> names;
+    for (const Setting& setting : settings()) {
+        EXPECT_TRUE(names.insert(setting.name).second) << setting.name;
+        EXPECT_FALSE(setting.description.empty()) << setting.name;
+        EXPECT_NE(setting.description.back(), '.') << setting.name;
+        EXPECT_EQ(setting.value.empty(), setting.kind == Setting::Kind::flag) << setting.name;
+    }
+}
+
+TEST(Settings, Initial_IsWhatAFreshRequestHolds) {
+    for (const Setting& setting : settings()) {
+        if (setting.initial.empty()) continue;
+        Options options;
+        setting.read(options, setting.initial);
+        const Options fresh;
+        EXPECT_EQ(options.font, fresh.font) << setting.name;
+        EXPECT_EQ(options.size, fresh.size) << setting.name;
+        EXPECT_EQ(options.align, fresh.align) << setting.name;
+        EXPECT_EQ(options.effectScale, fresh.effectScale) << setting.name;
+        EXPECT_EQ(options.background.kind, fresh.background.kind) << setting.name;
+        EXPECT_EQ(options.padding, fresh.padding) << setting.name;
+    }
+}
+
+TEST(Settings, WordsOf_AreTheLiteralOnes) {
+    EXPECT_EQ(wordsOf(settingNamed("align")), (std::vector<std::string>{"left", "center", "right"}));
+    EXPECT_EQ(wordsOf(settingNamed("background")),
+              (std::vector<std::string>{"transparent", "checkerboard"}));
+    EXPECT_TRUE(wordsOf(settingNamed("size")).empty());
+    EXPECT_TRUE(wordsOf(settingNamed("sheet")).empty());
+}
+
+TEST(Settings, Words_AreAllAccepted) {
+    for (const Setting& setting : settings()) {
+        for (const std::string& word : wordsOf(setting)) {
+            Options options;
+            EXPECT_NO_THROW(setting.read(options, word)) << setting.name << " " << word;
+        }
+    }
+}
+
+/// As the manual page spells a name.
+std::string roffName(const Setting& setting) {
+    if (setting.isPositional) return "\\fI" + setting.value + "\\fR";
+    std::string name = "\\fB\\-\\-";
+    for (const char c : setting.name)
+        name += c == '-' ? std::string("\\-") : std::string(1, c);
+    return name + "\\fR";
+}
+
+TEST(Manual, EverySetting_HasItsPlace) {
+    const std::string page = manualPage();
+    for (const Setting& setting : settings())
+        EXPECT_NE(page.find(roffName(setting)), std::string::npos) << setting.name;
+    for (const std::string& command : exampleCommands()) {
+        const std::string words = command.substr(0, command.find('-'));
+        EXPECT_NE(page.find("\n" + words), std::string::npos) << command;
+    }
+}
+
+TEST(Completion, EveryOption_IsInEveryScript) {
+    for (const char* shell : {"bash", "zsh", "fish"}) {
+        const std::string script = completionScript(shell);
+        for (const Setting& setting : settings()) {
+            if (setting.isPositional) continue;
+            const std::string name =
+                std::string(shell) == "fish" ? "-l " + setting.name + " " : "--" + setting.name;
+            EXPECT_NE(script.find(name), std::string::npos) << shell << " " << setting.name;
+        }
+    }
+}
+
+}  // namespace
+}  // namespace vorelpaint

@@ -1,0 +1,73 @@
+/// The functions that vorelpaint --write-cpp wrote, compiled into this program, paint what it paints.
+#include <gtest/gtest.h>
+#include <voreleffect/voreleffect.h>
+
+#include <memory>
+#include <ostream>
+#include <string>
+
+#include "font_finder.h"
+#include "painting.h"
+#include "run.h"
+#include "utf8.h"
+
+#define VOREL_WRITTEN_LOOK(function, style) void function(VFontEffect::VFEffect& look);
+#include "written_looks.inc"
+#undef VOREL_WRITTEN_LOOK
+
+namespace vorelpaint {
+namespace {
+
+struct WrittenLook {
+    const char* name;
+    const char* style;
+    void (*add)(VFontEffect::VFEffect& look);
+};
+
+std::ostream& operator<<(std::ostream& out, const WrittenLook& look) {
+    return out << look.name;
+}
+
+constexpr WrittenLook kLooks[] = {
+#define VOREL_WRITTEN_LOOK(function, style) {#function, style, function},
+#include "written_looks.inc"
+#undef VOREL_WRITTEN_LOOK
+};
+
+class WrittenLooks : public ::testing::TestWithParam<WrittenLook> {};
+
+Image paintWith(VFontEffect::VFEffect& effects, const TextLayout& text) {
+    const Margins margins{effects.getLeftOffset(), effects.getTopOffset(), effects.getRightOffset(),
+                          effects.getBottomOffset()};
+    Run run(effects, {text.inkBox(), margins, 2});
+    run.begin();
+    for (size_t i = 0; i < text.glyphCount(); ++i)
+        run.draw(text.rasterise(i));
+    effects.doEffectPostProcessing();
+    run.merge();
+    return run.picture();
+}
+
+TEST_P(WrittenLooks, PaintTheSamePixels) {
+    Options options;
+    options.style = GetParam().style;
+    Look look = makeLook(options, chosenStyle(options), [](const std::string&) {});
+    VFontEffect::VFEffect written;
+    GetParam().add(written);
+    const std::unique_ptr<char[]> key(written.getMapKey());
+    EXPECT_EQ(look.key(), key.get());
+
+    const Font font(findFont("DejaVu Sans"), 64);
+    const TextLayout text(font, decodeUtf8("Quick\nfox"), Align::center);
+    const Image expected = look.paint(text, 2);
+    const Image painted = paintWith(written, text);
+    EXPECT_EQ(painted.width, expected.width);
+    EXPECT_EQ(painted.height, expected.height);
+    EXPECT_TRUE(painted.pixels == expected.pixels);
+}
+
+INSTANTIATE_TEST_SUITE_P(Styles, WrittenLooks, ::testing::ValuesIn(kLooks),
+                         [](const auto& look) { return std::string(look.param.name); });
+
+}  // namespace
+}  // namespace vorelpaint

@@ -1,0 +1,23 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+namespace vorelpaint {
+
+constexpr const char* kPurpose = "Paints text with effects into a PNG file.";
+
+/// What the help and the manual page say beside the settings.
+const std::vector<std::string>& exampleCommands();
+
+/// A paragraph under its heading.
+struct Note {
+    std::string heading;
+    std::string text;  ///< one line, to be wrapped
+};
+const std::vector<Note>& notes();
+
+/// Examples and notes as they end the help.
+std::string helpFooter();
+
+}  // namespace vorelpaint

@@ -1,0 +1,41 @@
+#pragma once
+
+#include <functional>
+#include <string>
+
+#include "font.h"
+#include "image.h"
+#include "look.h"
+#include "options.h"
+#include "text_layout.h"
+
+/// The steps from what is asked for to a picture in its file. Each throws ToolError.
+namespace vorelpaint {
+
+/// Takes a line that says what is odd, but no reason to stop.
+using Warn = std::function<void(const std::string& line)>;
+
+/// The style that is asked for, at its scale; an empty one when none is.
+Style chosenStyle(const Options& options);
+
+/// The fill that is asked for, else the style's, else black.
+uint32_t chosenFill(const Options& options, const Style& style);
+
+/// The opacity that is asked for, else the style's, else 1.
+float chosenOpacity(const Options& options, const Style& style);
+
+std::string chosenText(const Options& options);
+
+/// The look of a style with the fill and the opacity that are asked for.
+Look makeLook(const Options& options, const Style& style, const Warn& warn);
+
+/// The text in its font, which must outlive it. Refuses a text without ink.
+TextLayout layOutText(const Options& options, const Font& font, const Warn& warn);
+
+/// The picture on its background into its file.
+void writePicture(const Options& options, Image picture);
+
+/// All of these steps.
+void paintPicture(const Options& options, const Warn& warn);
+
+}  // namespace vorelpaint
