@@ -2,6 +2,7 @@
 
 #include <cstdint>
 
+#include "cores/dilation_ink.h"
 #include "cores/dilation_rows.h"
 
 /// Dilation by discs that are not large: all cells of the disc are looked at.
@@ -21,6 +22,11 @@ namespace VFontEffect::internal::VOREL_LEVEL {
 
 constexpr int kLongestTappedReach = 8;
 
+/// Windows of so many pixels serve rows of full cells that are as long at least.
+VOREL_INLINE int64_t windowHalf(const DiscShape& disc) {
+    return disc.reach < 5 ? 2 : 3;
+}
+
 /// Four loads and what is taken off the largest of them.
 struct TapQuad {
     int32_t taps[4];
@@ -36,28 +42,20 @@ struct Taps {
     int count;
 };
 
-/// The windows' lengths: the first has 4 pixels, the second is made of four of these.
-constexpr int64_t kShortWindow = 4;
-VOREL_INLINE int64_t secondStep(int64_t reach) {
-    return reach < 6 ? 1 : 2;
-}
-VOREL_INLINE int64_t windowLength(int64_t reach, int i) {
-    return i == 0 ? kShortWindow : kShortWindow + 3 * secondStep(reach);
-}
-
 /// The way's working memory.
 struct TapPlanes {
     Taps* taps;
-    PaddedRows rows;
-    int windows;  ///< planes of windows behind the plane of coverage, each as large
-    int64_t planeBytes;
-    // By row, then by vector of the result: 255 where the row
-    uint8_t* inked;   ///< holds covered pixels
-    uint8_t* filled;  ///< has only full windows of the longer kind in the middle of the disc
-    uint8_t* near;    ///< of one row of results: where any row in reach is inked
-    uint8_t* full;    ///< and where any row that is near enough is filled
-    int64_t vectors;
+    PaddedRows rows;     ///< coverage
+    PaddedRows windows;  ///< the largest coverage around each pixel
+    int64_t vectors;     ///< in a row of the result
+    int64_t margin;      ///< vectors before and behind these that the disc reaches
+    // By row, then by vector, the margin first: 255 where the row's windows
+    uint8_t* inked;   ///< are not all empty
+    uint8_t* filled;  ///< are all full
     int64_t flagStride;
+    // Flags of one row of results.
+    uint8_t* near;
+    uint8_t* full;
     size_t bytes;
 };
 
@@ -66,17 +64,19 @@ inline TapPlanes tapPlanes(const Dilation& dilation) {
     const int64_t rowCount = kBandRows + 2 * reach;
     Arena arena = {dilation.memory};
     TapPlanes planes;
-    planes.taps = arena.take<Taps>(1);
-    planes.windows = reach < 4 ? 1 : 2;
-    planes.rows = takeRows(dilation, (1 + planes.windows) * rowCount, reach - dilation.left,
-                           dilation.right + reach - dilation.width, arena);
-    planes.planeBytes = rowCount * planes.rows.stride;
     planes.vectors = (dilation.right - dilation.left + kBytes - 1) / kBytes;
-    planes.flagStride = (planes.vectors + kBytes - 1) / kBytes * kBytes;
+    planes.margin = (reach + kBytes - 1) / kBytes;
+    planes.taps = arena.take<Taps>(1);
+    const int64_t beside = planes.margin * kBytes + reach;
+    planes.rows = takeRows(dilation, rowCount, beside - dilation.left,
+                           beside + dilation.right - dilation.width, arena);
+    planes.windows = planes.rows;
+    planes.windows.start = arena.take<uint8_t>(rowCount * planes.windows.stride);
+    planes.flagStride = (planes.vectors + 2 * planes.margin + kBytes - 1) / kBytes * kBytes;
     planes.inked = arena.take<uint8_t>(rowCount * planes.flagStride);
     planes.filled = arena.take<uint8_t>(rowCount * planes.flagStride);
-    planes.near = arena.take<uint8_t>(planes.flagStride);
-    planes.full = arena.take<uint8_t>(planes.flagStride);
+    planes.near = arena.take<uint8_t>(planes.flagStride + kBytes);
+    planes.full = arena.take<uint8_t>(planes.flagStride + kBytes);
     planes.bytes = arena.used;
     return planes;
 }
@@ -105,27 +105,22 @@ class QuadWriter {
     int mCount;
 };
 
-/// The run of full cells in a row of the disc, covered by the longest windows that are not too long.
-inline void addFlatTaps(const TapPlanes& planes, int64_t discReach, int64_t dy, int64_t reach,
-                        QuadWriter& writer) {
-    const int64_t length = 2 * reach + 1;
-    int64_t row = dy * planes.rows.stride;
-    int64_t step = 1;
-    for (int i = 0; i < planes.windows && length >= windowLength(discReach, i); ++i) {
-        row += planes.planeBytes;
-        step = windowLength(discReach, i);
-    }
-    const int64_t last = reach + 1 - step;
-    for (int64_t dx = -reach; dx < last; dx += step)
+/// Covers a run of full cells with windows, or takes its pixels one by one.
+inline void addFlatTaps(const TapPlanes& planes, const DiscShape& disc, int64_t dy, QuadWriter& writer) {
+    const int64_t reach = disc.flatReach[dy < 0 ? -dy : dy];
+    const bool windowed = reach >= windowHalf(disc);
+    const int64_t half = windowed ? windowHalf(disc) : 0;
+    const int64_t plane = windowed ? planes.windows.start - planes.rows.start : 0;
+    const int64_t row = plane + dy * planes.rows.stride;
+    for (int64_t dx = half - reach; dx < reach - half; dx += 2 * half + 1)
         writer.add(row + dx);
-    writer.add(row + last);
+    writer.add(row + reach - half);
 }
 
 inline void listFlatTaps(const TapPlanes& planes, const DiscShape& disc) {
     QuadWriter writer(*planes.taps, 0);
-    for (int64_t dy = 0; dy <= disc.reach && disc.flatReach[dy] >= 0; ++dy) {
-        addFlatTaps(planes, disc.reach, dy, disc.flatReach[dy], writer);
-        if (dy != 0) addFlatTaps(planes, disc.reach, -dy, disc.flatReach[dy], writer);
+    for (int64_t dy = -disc.reach; dy <= disc.reach; ++dy) {
+        if (disc.flatReach[dy < 0 ? -dy : dy] >= 0) addFlatTaps(planes, disc, dy, writer);
     }
 }
 
@@ -151,20 +146,45 @@ inline void listTaps(const Dilation& dilation) {
     }
 }
 
-// --- Vectors that need no evaluation -----------------------------------------------------------------
+// --- Rows of the source ------------------------------------------------------------------------------
 
-/// Notes in which vectors a row is inked and filled.
-inline void noteFlags(const Dilation& dilation, const TapPlanes& planes, int64_t row) {
-    const uint8_t* const source = planes.rows.at(row) + dilation.left;
-    const int64_t length = windowLength(dilation.disc->reach, planes.windows - 1);
-    const uint8_t* const windows = source + planes.windows * planes.planeBytes - (length - 1) / 2;
+template <int kHalf>
+VOREL_INLINE Bytes windowAround(const uint8_t* pixel) {
+    Bytes largest = load<Bytes>(pixel);
+    for (int64_t dx = 1; dx <= kHalf; ++dx)
+        largest = larger(largest, larger(load<Bytes>(pixel - dx), load<Bytes>(pixel + dx)));
+    return largest;
+}
+
+/// Makes the windows of a row and their flags.
+template <int kHalf>
+inline void makeWindows(const Dilation& dilation, const TapPlanes& planes, int64_t row) {
+    const int64_t start = dilation.left - planes.margin * kBytes;
+    const uint8_t* const source = planes.rows.at(row) + start;
+    uint8_t* const windows = planes.windows.at(row) + start;
     uint8_t* const inked = planes.inked + row * planes.flagStride;
     uint8_t* const filled = planes.filled + row * planes.flagStride;
-    for (int64_t i = 0; i < planes.vectors; ++i) {
-        inked[i] = allZero(load<Bytes>(source + i * kBytes)) ? 0 : 255;
-        filled[i] = allZero(~load<Bytes>(windows + i * kBytes)) ? 255 : 0;
+    for (int64_t i = 0; i < planes.vectors + 2 * planes.margin; ++i) {
+        const Bytes window = windowAround<kHalf>(source + i * kBytes);
+        store(windows + i * kBytes, window);
+        inked[i] = allZero(window) ? 0 : 255;
+        filled[i] = allZero(~window) ? 255 : 0;
     }
 }
+
+inline void fillBand(const Dilation& dilation, const TapPlanes& planes, int64_t y, int64_t rowCount) {
+    const bool wide = windowHalf(*dilation.disc) == 3;
+    for (int64_t row = 0; row < rowCount; ++row) {
+        fillRow(dilation, y + row, planes.rows, row);
+        if (wide) {
+            makeWindows<3>(dilation, planes, row);
+        } else {
+            makeWindows<2>(dilation, planes, row);
+        }
+    }
+}
+
+// --- Rows of results ---------------------------------------------------------------------------------
 
 /// Gathers the flags of the rows around a row.
 inline void gatherFlags(const TapPlanes& planes, const uint8_t* flags, int64_t row, int64_t reach,
@@ -177,17 +197,13 @@ inline void gatherFlags(const TapPlanes& planes, const uint8_t* flags, int64_t r
     }
 }
 
-/// The last row of the disc whose full cells hold the windows of the longer kind in the middle; -1 for
-/// none.
-inline int64_t filledReach(const TapPlanes& planes, const DiscShape& disc) {
-    const int64_t half = windowLength(disc.reach, planes.windows - 1) / 2;
+/// The last row of the disc whose full cells hold a window in the middle; -1 for none.
+inline int64_t filledReach(const DiscShape& disc) {
     int64_t dy = disc.reach;
-    while (dy >= 0 && disc.flatReach[dy] < half)
+    while (dy >= 0 && disc.flatReach[dy] < windowHalf(disc))
         --dy;
     return dy;
 }
-
-// --- Evaluation --------------------------------------------------------------------------------------
 
 VOREL_INLINE Bytes dilatedVector(const Taps& taps, const uint8_t* source) {
     Bytes result = {};
@@ -201,44 +217,34 @@ VOREL_INLINE Bytes dilatedVector(const Taps& taps, const uint8_t* source) {
     return result;
 }
 
-/// Whether a vector, or one as near to it as the disc reaches, has an inked row.
-VOREL_INLINE bool isNear(const TapPlanes& planes, int64_t vector, int64_t reach) {
-    const int64_t spread = (reach + kBytes - 1) / kBytes;
-    const int64_t end = smaller(vector + spread + 1, planes.vectors);
-    for (int64_t i = larger<int64_t>(vector - spread, 0); i < end; ++i) {
-        if (planes.near[i] != 0) return true;
-    }
-    return false;
-}
-
-inline void fillBand(const Dilation& dilation, const TapPlanes& planes, int64_t y, int64_t rowCount) {
-    const int64_t reach = dilation.disc->reach;
-    for (int64_t row = 0; row < rowCount; ++row) {
-        fillRow(dilation, y + row, planes.rows, row);
-        uint8_t* const pixels = planes.rows.at(row);
-        uint8_t* const windows = pixels + planes.planeBytes;
-        widenWindows(planes.rows, pixels, windows, 1);
-        if (planes.windows > 1)
-            widenWindows(planes.rows, windows, windows + planes.planeBytes, secondStep(reach));
-        noteFlags(dilation, planes, row);
+/// Dilates a row from `source`, its place in the rows of the source, by the flags that were gathered for
+/// it.
+inline void dilateRow(const TapPlanes& planes, const uint8_t* source, uint8_t* results) {
+    const uint8_t* const full = planes.full + planes.margin;
+    for (int64_t i = 0; i < planes.vectors; ++i)
+        store(results + i * kBytes, spread<Bytes>(full[i]));
+    for (int64_t first = 0; first < planes.vectors; first += kBytes) {
+        Bytes near = {};
+        for (int64_t i = 0; i <= 2 * planes.margin; ++i)
+            near |= load<Bytes>(planes.near + first + i);
+        uint64_t open = nonZeroLanes(near & ~load<Bytes>(full + first));
+        for (; open != 0; open = withoutFirst(open)) {
+            const int64_t at = (first + firstLane(open)) * kBytes;
+            if (first + firstLane(open) >= planes.vectors) break;
+            store(results + at, dilatedVector(*planes.taps, source + at));
+        }
     }
 }
 
 inline void dilateRowsByTaps(const Dilation& dilation, int64_t y, int64_t count, uint8_t* results) {
     const TapPlanes planes = tapPlanes(dilation);
     const int64_t reach = dilation.disc->reach;
+    const int64_t fillingReach = filledReach(*dilation.disc);
     fillBand(dilation, planes, y - reach, count + 2 * reach);
-    const int64_t fillingReach = filledReach(planes, *dilation.disc);
     for (int64_t row = reach; row < reach + count; ++row, results += dilatedStride(dilation)) {
         gatherFlags(planes, planes.inked, row, reach, planes.near);
         gatherFlags(planes, planes.filled, row, fillingReach, planes.full);
-        const uint8_t* const source = planes.rows.at(row) + dilation.left;
-        for (int64_t i = 0; i < planes.vectors; ++i) {
-            Bytes result = spread<Bytes>(planes.full[i]);
-            if (planes.full[i] == 0 && isNear(planes, i, reach))
-                result = dilatedVector(*planes.taps, source + i * kBytes);
-            store(results + i * kBytes, result);
-        }
+        dilateRow(planes, planes.rows.at(row) + dilation.left, results);
     }
 }
 

@@ -9,24 +9,22 @@
 ///
 /// The result is cut into tiles. Let M be the largest coverage.
 ///  - A full tile has under the full cells of each pixel's disc a pixel of coverage M. It is M
-///  throughout:
-///    nothing is larger.
+///    throughout: nothing is larger.
 ///  - An untouched tile has no covered pixel under the disc of any of its pixels. It is 0.
 ///  - Any other is evaluated, a source row at a time: windowed maxima give the largest coverage under
-///  the
-///    row's full cells, each cell of the rim is looked at by itself. A row with no covered pixel under
-///    the disc of any pixel that is not M yet adds nothing and is left out; a few rows stay.
+///    the row's full cells, and each cell of the rim is looked at by itself. A row with no covered pixel
+///    under the disc of any pixel that is not M yet adds nothing and is left out.
 /// As evaluating gives the same in any tile, the first two need not all be recognised.
 ///
-/// Which tiles are full follows from the source rows one by one. Where the pixels of coverage M in a row
-/// are no farther than g columns from any pixel of a tile, the row fills the tile as far up and down as
-/// the disc has rows whose full cells reach g columns. So each row gives each column of tiles a reach,
-/// in rows; a pass down the rows and one up, in each of which a reach shrinks by one a row, tell what
-/// any row reaches. Likewise for touched tiles, with the smallest distance, any covered pixel and all
-/// cells of the disc.
+/// Which tiles are full follows from the source rows one by one. Where no pixel of a tile has more than
+/// g columns to a pixel of coverage M in a row, the row fills the tile as far up and down as the disc
+/// has rows whose full cells reach g columns. So each row gives each column of tiles a reach, in rows; a
+/// pass down the rows and one up, in each of which a reach shrinks by one a row, tell what any row
+/// reaches. Likewise for touched tiles, with the smallest distance, any covered pixel and all cells of
+/// the disc.
 ///
 /// Cost: some 60 instructions for each tile of the source, 3 for each tile of the result, and for each
-/// tile along the outline, on text, 6 to 8 rows of some 40. It grows with the outline, not with the
+/// tile along the outline, on text, some 10 rows of 40 each. It grows with the outline, not with the
 /// radius.
 namespace VFontEffect::internal::VOREL_LEVEL {
 
@@ -324,7 +322,7 @@ struct OpenTile {
     const uint8_t* source;   ///< the tile's place in the first row of the source
     const uint8_t* toRight;  ///< of the tile's column
     const uint8_t* toLeft;
-    const uint8_t* outerReach;  ///< of the disc around the tile, from the first row of the source on
+    const uint8_t* outerReach;  ///< of the disc's middle row
     Tile result;
 
     VOREL_INLINE void add(int64_t row) {
@@ -333,14 +331,17 @@ struct OpenTile {
         result = larger(result, dilatedRow(discRow, place));
     }
 
-    /// The rows, among kBytes, that touch any of the lanes from `first` to `last`. A row whose nearest
-    /// pixel lies between the tile's edge and these lanes counts among them.
-    VOREL_INLINE uint64_t touching(int64_t row, int first, int last) const {
+    /// The rows, of kBytes up to the last one, that touch any of the lanes from `first` to `last`. A row
+    /// whose nearest pixel lies between the tile's edge and these lanes counts among them.
+    VOREL_INLINE uint64_t touching(int64_t row, int64_t lastRow, int first, int last) const {
         const auto right = spread<Bytes>(static_cast<uint8_t>(last));
         const auto left = spread<Bytes>(static_cast<uint8_t>(kTileEnd - first));
         const Bytes distance = smaller(subSaturated(load<Bytes>(toRight + row), right),
                                        subSaturated(load<Bytes>(toLeft + row), left));
-        return nonZeroLanes(as<Bytes>(distance <= load<Bytes>(outerReach + row)));
+        const Bytes reached = load<Bytes>(outerReach + row - y);
+        const uint64_t lanes = nonZeroLanes(as<Bytes>(distance <= reached));
+        const int64_t behind = larger<int64_t>(row + kBytes - 1 - lastRow, 0);
+        return lanes & (~uint64_t{0} >> (64 - (kBytes - behind) * kLaneBits));
     }
 
     /// The lanes that are less than `most`.
@@ -357,14 +358,14 @@ struct RowRange {
     int64_t last;
 };
 
-/// Cuts the rows off that touch none of the tile's pixels. Nothing may be left.
+/// Cuts the rows off that touch none of the tile's pixels. One does.
 inline RowRange touchingRange(const OpenTile& tile, RowRange rows) {
     RowRange touching = {rows.last + 1, rows.first - 1};
     for (int64_t row = rows.first; row <= rows.last; row += kBytes) {
-        const uint64_t lanes = tile.touching(row, 0, kTileEnd);
+        const uint64_t lanes = tile.touching(row, rows.last, 0, kTileEnd);
         if (lanes == 0) continue;
         touching.first = smaller(touching.first, row + firstLane(lanes));
-        touching.last = smaller(row + lastLane(lanes), rows.last);
+        touching.last = row + lastLane(lanes);
     }
     return touching;
 }
@@ -372,9 +373,7 @@ inline RowRange touchingRange(const OpenTile& tile, RowRange rows) {
 /// Adds the rows that touch any of the given lanes.
 inline void addTouching(OpenTile& tile, RowRange rows, int firstOpen, int lastOpen) {
     for (int64_t row = rows.first; row <= rows.last; row += kBytes) {
-        uint64_t lanes = tile.touching(row, firstOpen, lastOpen);
-        const int64_t behind = row + kBytes - 1 - rows.last;
-        if (behind > 0) lanes &= ~uint64_t{0} >> ((64 - kBytes * kLaneBits) + behind * kLaneBits);
+        uint64_t lanes = tile.touching(row, rows.last, firstOpen, lastOpen);
         for (; lanes != 0; lanes = withoutFirst(lanes))
             tile.add(row + firstLane(lanes));
     }
@@ -387,11 +386,12 @@ inline Tile dilatedTile(const Dilation& dilation, const TilePlanes& planes, int6
                      planes.rows.at(0) + dilation.left + tile * kTile,
                      planes.toRight + tile * planes.columnStride,
                      planes.toLeft + tile * planes.columnStride,
-                     planes.outerReach + reach - y,
+                     planes.outerReach + reach,
                      Tile{}};
     const RowRange inReach = {larger<int64_t>(y - reach, 0), smaller(y + reach, dilation.height - 1)};
     const RowRange rows = touchingRange(open, inReach);
-    // Mostly the row in the middle settles all pixels that come out as M.
+    // The nearest row and the one in the middle mostly settle the pixels that come out as M.
+    open.add(smaller(larger(y, rows.first), rows.last));
     open.add((rows.first + rows.last) / 2);
     const uint64_t unsettled = open.unsettled(dilation.largest);
     if (unsettled != 0) addTouching(open, rows, firstLane(unsettled), lastLane(unsettled));
