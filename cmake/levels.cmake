@@ -14,7 +14,7 @@ endif()
 set(VOREL_FLAGS_scalar -DVOREL_SCALAR $<$<CONFIG:Release>:-Os>)
 set(VOREL_FLAGS_avx2 -mavx2)
 set(VOREL_FLAGS_avx512 -mavx512f -mavx512bw -mavx512dq -mavx512vl -mavx512vnni)
-set(VOREL_FLAGS_dotprod -march=armv8-a+dotprod)
+set(VOREL_FLAGS_dotprod -march=armv8.2-a+dotprod)
 
 foreach(level IN LISTS VOREL_LEVELS)
   add_library(voreleffect_${level} OBJECT ${VOREL_LEVEL_SOURCES})
