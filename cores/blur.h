@@ -90,7 +90,7 @@ class DownThenAcross {
                    const FullColumns& full);
 
     /// Whether there is memory for it.
-    explicit operator bool() const { return mWeights && mStrip && mMiddle && mOut; }
+    explicit operator bool() const { return mBlur && mStrip && mMiddle && mOut; }
 
     /// Calls paint(y, rows, values, stride) for up to kQuad rows of the window at a time; `inverted`
     /// gives 255 minus the mean in the second pass, rounded down as a whole.
@@ -130,7 +130,7 @@ class AcrossThenDown {
   public:
     AcrossThenDown(const BlurKernel& kernel, const BlurSource& source, const Window& window);
 
-    explicit operator bool() const { return mWeights && mStrip && mMiddle && mAcross && mOut; }
+    explicit operator bool() const { return mBlur && mStrip && mMiddle && mAcross && mOut; }
 
     /// Calls paint(y, rows, values, stride) for some rows of the window at a time.
     template <class Paint>

@@ -22,8 +22,10 @@ struct NarrowDivision {
     uint16_t shift;
 };
 
-/// A blur in the form in which a level's loops read it.
+/// A blur in the form in which a level's loops read it; without cells when memory ran out.
 struct PreparedBlur {
+    explicit operator bool() const { return cells != nullptr; }
+
     int radius;
     uint32_t total;
     float inverse;           // just above 1 / total
