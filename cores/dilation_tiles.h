@@ -231,9 +231,12 @@ inline void noteReaches(const Dilation& dilation, const TilePlanes& planes, cons
     storeBytes(planes.toRight + tile * planes.columnStride + y, toRight);
     storeBytes(planes.toLeft + tile * planes.columnStride + y, toLeft);
 
+    // Read back one by one, which compilers do badly with a vector.
+    Distance nearest[kDistances];
+    Distance farthest[kDistances];
     const Distances beyond = spread<Distances>(static_cast<Distance>(dilation.disc->reach + 1));
-    const Distances nearest = smaller(smallestDistance(toRight, toLeft), beyond);
-    const Distances farthest = smaller(largestDistance(planes.most, at), beyond);
+    store(nearest, smaller(smallestDistance(toRight, toLeft), beyond));
+    store(farthest, smaller(largestDistance(planes.most, at), beyond));
     const int64_t count = smaller(kDistances, dilation.height - y);
     int64_t target = y * planes.reachStride + tile;
     for (int64_t i = 0; i < count; ++i, target += planes.reachStride) {
