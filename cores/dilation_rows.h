@@ -23,11 +23,6 @@ struct Arena {
     }
 };
 
-constexpr int64_t kLongestWindow = 64;
-
-/// Columns for the ends of vectors and windows.
-constexpr int64_t kSlack = 256;
-
 /// Rows of the source with zeros to both sides, as far as any load goes.
 struct PaddedRows {
     uint8_t* start;
@@ -39,11 +34,12 @@ struct PaddedRows {
     VOREL_INLINE uint8_t* at(int64_t row) const { return start + row * stride + lead; }
 };
 
-/// Rows in which there are so many columns before and behind the source's.
+/// Rows in which there are so many columns before and behind those of the result that are wanted.
 VOREL_INLINE PaddedRows takeRows(const Dilation& dilation, int64_t count, int64_t before, int64_t behind,
                                  Arena& arena) {
-    const int64_t stride = before + dilation.width + behind + kSlack;
-    return {arena.take<uint8_t>(count * stride), stride, before, dilation.width};
+    const int64_t lead = before - dilation.left;
+    const int64_t stride = lead + dilation.right + behind;
+    return {arena.take<uint8_t>(count * stride), stride, lead, dilation.width};
 }
 
 VOREL_INLINE void setBytes(uint8_t* to, uint8_t value, int64_t count) {
@@ -62,31 +58,19 @@ inline void copyFlipped(const uint8_t* from, uint8_t* to, int64_t count, uint8_t
         to[x] = static_cast<uint8_t>(from[x] ^ flip);
 }
 
-/// Copies row y of the source, which may lie outside of it, with zeros around.
+VOREL_INLINE void clearRow(const PaddedRows& rows, int64_t row) {
+    setBytes(rows.at(row) - rows.lead, 0, rows.stride);
+}
+
+/// Copies row y of the source, with zeros around. Rows outside of the source are empty.
 inline void fillRow(const Dilation& dilation, int64_t y, const PaddedRows& rows, int64_t row) {
+    if (y < 0 || y >= dilation.height) return clearRow(rows, row);
     uint8_t* const to = rows.at(row);
-    if (y < 0 || y >= dilation.height) return setBytes(to - rows.lead, 0, rows.stride);
     setBytes(to - rows.lead, 0, rows.lead);
     setBytes(to + rows.width, 0, rows.stride - rows.lead - rows.width);
     if (y == 0 || y == dilation.height - 1) return setBytes(to, dilation.flip, rows.width);
     to[0] = to[rows.width - 1] = dilation.flip;
     copyFlipped(dilation.box + (y - 1) * dilation.boxStride, to + 1, rows.width - 2, dilation.flip);
-}
-
-/// The largest of four that stand `step` apart, the first of them at the result's own place. Out of
-/// windows of up to 3 * step pixels, each at the place of its first one, this makes longer ones. `to`
-/// may be `from`; both are column 0 of a row.
-inline void widenWindows(const PaddedRows& rows, const uint8_t* from, uint8_t* to, int64_t step) {
-    // Windows that start farther to the left, or behind the last column, are empty.
-    int64_t x = larger(-rows.lead, -kLongestWindow);
-    setBytes(to - rows.lead, 0, rows.lead + x);
-    for (; x < rows.width; x += kBytes) {
-        const uint8_t* const window = from + x;
-        const Bytes left = larger(load<Bytes>(window), load<Bytes>(window + step));
-        const Bytes right = larger(load<Bytes>(window + 2 * step), load<Bytes>(window + 3 * step));
-        store(to + x, larger(left, right));
-    }
-    setBytes(to + x, 0, rows.stride - rows.lead - x);
 }
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

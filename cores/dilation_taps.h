@@ -68,8 +68,7 @@ inline TapPlanes tapPlanes(const Dilation& dilation) {
     planes.margin = (reach + kBytes - 1) / kBytes;
     planes.taps = arena.take<TapList>(1);
     const int64_t beside = planes.margin * kBytes + reach;
-    planes.rows = takeRows(dilation, rowCount, beside - dilation.left,
-                           beside + dilation.right - dilation.width, arena);
+    planes.rows = takeRows(dilation, rowCount, beside, beside + kBytes, arena);
     planes.windows = planes.rows;
     planes.windows.start = arena.take<uint8_t>(rowCount * planes.windows.stride);
     planes.flagStride = (planes.vectors + 2 * planes.margin + kBytes - 1) / kBytes * kBytes;
@@ -176,7 +175,11 @@ inline void fillBand(const Dilation& dilation, const TapPlanes& planes, int64_t 
     const bool wide = windowHalf(*dilation.disc) == 3;
     for (int64_t row = 0; row < rowCount; ++row) {
         fillRow(dilation, y + row, planes.rows, row);
-        if (wide) {
+        if (y + row < 0 || y + row >= dilation.height) {
+            clearRow(planes.windows, row);
+            setBytes(planes.inked + row * planes.flagStride, 0, planes.flagStride);
+            setBytes(planes.filled + row * planes.flagStride, 0, planes.flagStride);
+        } else if (wide) {
             makeWindows<3>(dilation, planes, row);
         } else {
             makeWindows<2>(dilation, planes, row);

@@ -45,6 +45,11 @@ constexpr int64_t kFewestRimCells = 2;
 /// Rows before and behind the disc's that a vector may hang over.
 constexpr int64_t kOverhang = 64;
 
+constexpr int64_t kLongestWindow = 64;
+
+/// Columns for the windows and the vector that start last.
+constexpr int64_t kWindowSlack = kLongestWindow + 2 * kBytes;
+
 /// The way's working memory.
 struct TilePlanes {
     int64_t tiles;
@@ -82,8 +87,7 @@ inline TilePlanes tilePlanes(const Dilation& dilation) {
     TilePlanes planes;
     planes.tiles = (dilation.right - dilation.left + kTile - 1) / kTile;
     const auto take = [&] {
-        return takeRows(dilation, height, reach + kFewestRimCells - dilation.left,
-                        dilation.right + reach - dilation.width, arena);
+        return takeRows(dilation, height, reach + kFewestRimCells, reach + kWindowSlack, arena);
     };
     planes.rows = take();
     planes.windows[0] = take();
@@ -175,6 +179,22 @@ inline void listReaches(const DiscShape& disc, DiscReaches& reaches) {
     }
 }
 
+/// The largest of four that stand `step` apart, the first of them at the result's own place. Out of
+/// windows of `step` pixels, each at the place of its first one, this makes windows four times as long.
+/// `to` may be `from`; both are column 0 of a row.
+inline void widenWindows(const PaddedRows& rows, const uint8_t* from, uint8_t* to, int64_t step) {
+    // Windows that start farther to the left, or behind the last column, are empty.
+    int64_t x = larger(-rows.lead, -4 * step);
+    setBytes(to - rows.lead, 0, rows.lead + x);
+    for (; x < rows.width; x += kBytes) {
+        const uint8_t* const window = from + x;
+        const Bytes left = larger(load<Bytes>(window), load<Bytes>(window + step));
+        const Bytes right = larger(load<Bytes>(window + 2 * step), load<Bytes>(window + 3 * step));
+        store(to + x, larger(left, right));
+    }
+    setBytes(to + x, 0, rows.stride - rows.lead - x);
+}
+
 /// Fills the rows of coverage and of windows.
 inline void fillRows(const Dilation& dilation, const TilePlanes& planes) {
     for (int64_t y = 0; y < dilation.height; ++y) {
@@ -231,9 +251,12 @@ inline void noteReaches(const Dilation& dilation, const TilePlanes& planes, cons
     storeBytes(planes.toRight + tile * planes.columnStride + y, toRight);
     storeBytes(planes.toLeft + tile * planes.columnStride + y, toLeft);
 
+    // Read back one by one, which compilers do badly with a vector.
+    Distance nearest[kDistances];
+    Distance farthest[kDistances];
     const Distances beyond = spread<Distances>(static_cast<Distance>(dilation.disc->reach + 1));
-    const Distances nearest = smaller(smallestDistance(toRight, toLeft), beyond);
-    const Distances farthest = smaller(largestDistance(planes.most, at), beyond);
+    store(nearest, smaller(smallestDistance(toRight, toLeft), beyond));
+    store(farthest, smaller(largestDistance(planes.most, at), beyond));
     const int64_t count = smaller(kDistances, dilation.height - y);
     int64_t target = y * planes.reachStride + tile;
     for (int64_t i = 0; i < count; ++i, target += planes.reachStride) {

@@ -20,14 +20,13 @@ using namespace internal;
 
 namespace {
 
-/// The dilation takes its source with a border of one pixel: that is how far its corner (0, 0) lies
-/// outside of the text box.
+/// The dilation takes its source with a border of one pixel.
 constexpr int64_t kBorder = 1;
 
 constexpr uint8_t kCoverage = 0;
 constexpr uint8_t kInverse = 0xFF;
 
-/// What is to be seen of the outline, relative to the dilation's source.
+/// A part of the outline, in the coordinates of the bordered source.
 struct Area {
     int64_t left;
     int64_t top;
@@ -37,9 +36,8 @@ struct Area {
     bool empty() const { return left >= right || top >= bottom; }
 };
 
-/// The part of the outline that lies on one of the targets at least.
+/// The part that at least one of the targets shows.
 Area visibleArea(const CoverageBox& box, int64_t reach, const VFECore::ParamPostProcessing& params) {
-    Area outline = {-reach, -reach, box.width + 2 * kBorder + reach, box.height + 2 * kBorder + reach};
     int64_t targetWidth = 0;
     int64_t targetHeight = 0;
     for (const VFBitmap* target : {params.dstBitmap, params.subDstBitmap}) {
@@ -49,28 +47,25 @@ Area visibleArea(const CoverageBox& box, int64_t reach, const VFECore::ParamPost
     }
     const int64_t left = box.left - kBorder;
     const int64_t top = box.top - kBorder;
-    return {std::max(outline.left, -left), std::max(outline.top, -top),
-            std::min(outline.right, targetWidth - left), std::min(outline.bottom, targetHeight - top)};
+    const int64_t right = box.width + 2 * kBorder + reach;
+    const int64_t bottom = box.height + 2 * kBorder + reach;
+    return {std::max(-reach, -left), std::max(-reach, -top), std::min(right, targetWidth - left),
+            std::min(bottom, targetHeight - top)};
 }
 
-/// The coverage, or its inverse, grown by a disc. Needs memory, of which it may have got none.
+/// The coverage, or its inverse, grown by a disc; empty when memory ran out.
 class GrownCoverage {
   public:
     GrownCoverage(const CoverageBox& box, const DiscShape& disc, const Area& area, uint8_t flip)
-        : mKernels(dilationKernels()),
-          mDilation(dilationOf(box, disc, area, flip)),
-          mMemory(memoryFor()) {
+        : mDilation(dilationOf(box, disc, area, flip)), mMemory(memoryFor(mDilation)) {
         mDilation.memory = mMemory.data();
-        if (mMemory) mKernels.begin(mDilation);
+        if (mMemory) dilationKernels().begin(mDilation);
     }
-    explicit operator bool() const { return static_cast<bool>(mMemory); }
 
-    /// The first column that rows have, and how many bytes they are apart.
-    int64_t left() const { return mDilation.left; }
-    int64_t width() const { return mDilation.right - mDilation.left; }
-    int64_t stride() const { return dilatedStride(mDilation); }
+    explicit operator bool() const { return static_cast<bool>(mMemory); }
+    const Dilation& dilation() const { return mDilation; }
     void rows(int64_t y, int64_t count, uint8_t* results) const {
-        mKernels.dilateRows(mDilation, y, count, results);
+        dilationKernels().dilateRows(mDilation, y, count, results);
     }
 
   private:
@@ -87,14 +82,50 @@ class GrownCoverage {
         dilation.right = std::max(area.right, dilation.width);
         return dilation;
     }
-    PixelBuffer<uint8_t> memoryFor() const {
-        return PixelBuffer<uint8_t>::uninitialised(
-            static_cast<int64_t>(mKernels.memoryBytes(mDilation)));
+    static PixelBuffer<uint8_t> memoryFor(const Dilation& dilation) {
+        const size_t bytes = dilationKernels().memoryBytes(dilation);
+        return PixelBuffer<uint8_t>::uninitialised(static_cast<int64_t>(bytes));
     }
 
-    const DilationKernels& mKernels;
     Dilation mDilation;
     PixelBuffer<uint8_t> mMemory;
+};
+
+/// The outline's coverage, a band of rows at a time; empty when memory ran out. What is centred lies
+/// within the disc's radius of the edge on both sides of it.
+class Outline {
+  public:
+    Outline(const CoverageBox& box, const DiscShape& disc, const Area& area, int position)
+        : mGrown(box, disc, area, position == kStrokeInside ? kInverse : kCoverage),
+          mBandRows(std::min(kBandRows, area.bottom - area.top)),
+          mStride(dilatedStride(mGrown.dilation())),
+          mBand(PixelBuffer<uint8_t>::uninitialised(mStride * mBandRows,
+                                                    position == kStrokeCentre ? 2 : 1)) {
+        if (position == kStrokeCentre) mInverse.emplace(box, disc, area, kInverse);
+    }
+
+    explicit operator bool() const { return mGrown && (!mInverse || *mInverse) && mBand; }
+    int64_t left() const { return mGrown.dilation().left; }
+    int64_t width() const { return mGrown.dilation().right - left(); }
+    int64_t stride() const { return mStride; }
+    int64_t bandRows() const { return mBandRows; }
+
+    uint8_t* band(int64_t y, int64_t count) {
+        mGrown.rows(y, count, mBand.data());
+        if (mInverse) {
+            uint8_t* const second = mBand.data() + mStride * mBandRows;
+            mInverse->rows(y, count, second);
+            dilationKernels().keepSmaller(mBand.data(), second, mStride * count);
+        }
+        return mBand.data();
+    }
+
+  private:
+    GrownCoverage mGrown;
+    std::optional<GrownCoverage> mInverse;
+    int64_t mBandRows;
+    int64_t mStride;
+    PixelBuffer<uint8_t> mBand;
 };
 
 }  // namespace
@@ -121,62 +152,29 @@ int VFStroke::getOffset() {
     return mProperty->mPosition == kStrokeCentre ? toInt(mProperty->mSize * 0.5F + 0.5F) : 0;
 }
 
-namespace {
-
-/// Blends a band of the outline's rows.
-struct Brush {
-    const VFECore::ParamPostProcessing& params;
-    int64_t left;  ///< of the rows, in the target
-    int64_t width;
-    int64_t stride;
-    uint32_t color;
-    int mode;
-
-    void paint(int64_t top, int64_t count, uint8_t* rows) const {
-        for (const VFBitmap* target : {params.dstBitmap, params.subDstBitmap}) {
-            VFBlender().drawBitmapBlend8(saturateToInt(left), saturateToInt(top), target, rows,
-                                         saturateToInt(width), static_cast<int>(count),
-                                         saturateToInt(stride), color, mode);
-        }
-    }
-};
-
-}  // namespace
-
 void VFStroke::doPostProcessing(ParamPostProcessing* params) {
     const CoverageBox box = coverageOf(params);
     if (!box || mProperty == nullptr || isAbsurd(mProperty->mSize)) return;
     const bool centred = mProperty->mPosition == kStrokeCentre;
+    const bool outside = mProperty->mPosition == kStrokeOutside;
     const DiscShape disc(centred ? mProperty->mSize * 0.5F : mProperty->mSize);
     if (!disc) return;
     const Area area = visibleArea(box, disc.reach, *params);
     if (area.empty()) return;
+    Outline outline(box, disc, area, centred || outside ? mProperty->mPosition : kStrokeInside);
+    if (!outline) return;
 
-    // A centred stroke is what lies within the radius of the edge on both sides of it.
-    const bool outside = mProperty->mPosition == kStrokeOutside || centred;
-    const GrownCoverage grown(box, disc, area, outside ? kCoverage : kInverse);
-    if (!grown) return;
-    std::optional<GrownCoverage> inverse;
-    if (centred) {
-        inverse.emplace(box, disc, area, kInverse);
-        if (!*inverse) return;
-    }
-    const int64_t bandBytes = grown.stride() * kBandRows;
-    auto band = PixelBuffer<uint8_t>::uninitialised(bandBytes, centred ? 2 : 1);
-    if (!band) return;
-
-    const Brush brush = {
-        *params,           box.left - kBorder + grown.left(),
-        grown.width(),     grown.stride(),
-        mProperty->mColor, centred && params->useOuterLayer != 1 ? kModeSrcOver : kModeDstOver};
-    for (int64_t y = area.top; y < area.bottom; y += kBandRows) {
-        const int64_t count = std::min(kBandRows, area.bottom - y);
-        grown.rows(y, count, band.data());
-        if (inverse) {
-            inverse->rows(y, count, band.data() + bandBytes);
-            dilationKernels().keepSmaller(band.data(), band.data() + bandBytes, count * grown.stride());
+    const int left = saturateToInt(box.left - kBorder + outline.left());
+    const int width = saturateToInt(outline.width());
+    const int stride = saturateToInt(outline.stride());
+    const int mode = centred && params->useOuterLayer != 1 ? kModeSrcOver : kModeDstOver;
+    for (int64_t y = area.top; y < area.bottom; y += outline.bandRows()) {
+        const int64_t count = std::min(outline.bandRows(), area.bottom - y);
+        uint8_t* const band = outline.band(y, count);
+        for (const VFBitmap* target : {params->dstBitmap, params->subDstBitmap}) {
+            VFBlender().drawBitmapBlend8(left, saturateToInt(box.top - kBorder + y), target, band, width,
+                                         static_cast<int>(count), stride, mProperty->mColor, mode);
         }
-        brush.paint(box.top - kBorder + y, count, band.data());
     }
 }
 

@@ -161,7 +161,7 @@ std::vector<CoreCase> strokeCases() {
         for (const bool layered : {false, true}) {
             const VFStrokeProperty record(3, 0x80402010, 0.5F, 0, position);
             const VFStrokeProperty other(1, 0xFF00FF00, 1, 0, position);
-            // What a dilation works in, two for a centred stroke, and the band of its rows.
+            // What the dilation works in, twice for a centred stroke, and a band of the outline.
             cases.push_back(coreCase<VFStroke>(names[position] + (layered ? "Layered" : ""), record,
                                                other, layered, position == 0 ? 3 : 2, 1));
         }

@@ -1,12 +1,15 @@
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cmath>
 #include <limits>
 #include <memory>
+#include <string>
 #include <utility>
 #include <vector>
 
 #include "../support/core_compare.h"
+#include "../support/guarded.h"
 #include "../support/literal_cores.h"
 #include "../support/mask_gallery.h"
 
@@ -498,6 +501,175 @@ TEST(Stroke, DestinationOfAnotherSize_IsClipped) {
     forOtherDestinations(200, 14, 20, [](Random& random, const Scene& scene) {
         EXPECT_TRUE(matchesLiteral(scene, random.real(0.0F, 6.0F), randomPremultiplied(random),
                                    random.between(0, 2)));
+    });
+}
+
+// --- The ways of dilation, which go by the size, and where they end ---------------------------------
+
+/// The mask in the middle of an empty layer with room for an outline of that size.
+Scene sceneWithRoom(const literal::Mask& mask, float size) {
+    const int margin = literal::truncated(size) + 3;
+    literal::Mask layer = filledMask(mask.width + 2 * margin, mask.height + 2 * margin, 0);
+    for (int y = 0; y < mask.height; ++y) {
+        for (int x = 0; x < mask.width; ++x) {
+            layer.bytes[static_cast<size_t>((y + margin) * layer.width + x + margin)] =
+                mask.bytes[static_cast<size_t>(y * mask.width + x)];
+        }
+    }
+    return sceneOf(layer, {margin, margin, margin + mask.width, margin + mask.height});
+}
+
+void expectLiteralForm(const literal::Mask& mask, float size) {
+    const Scene scene = sceneWithRoom(mask, size);
+    for (int position : {kCentre, kOutside, kInside}) {
+        // Half of a centred stroke's size is its radius.
+        const float record = position == kCentre ? 2.0F * size : size;
+        if (record <= 256.0F) {
+            ASSERT_TRUE(matchesLiteral(scene, record, kWhite, position));
+        }
+    }
+}
+
+/// A mask whose coverage is nowhere more than `most`.
+literal::Mask faint(literal::Mask mask, int most) {
+    for (uint8_t& coverage : mask.bytes)
+        coverage = static_cast<uint8_t>(coverage * most / 255);
+    return mask;
+}
+
+TEST(StrokeWays, EveryRadius_MatchesTheLiteralForm) {
+    // Fractions change the rim; a reach of 2, 8 and 23 is the last of its way.
+    for (int eighth = 0; eighth <= 26 * 8; ++eighth) {
+        SCOPED_TRACE("radius in eighths " + std::to_string(eighth));
+        Random random(static_cast<uint64_t>(eighth) + 1);
+        expectLiteralForm(randomMask(random, random.between(1, 40), random.between(1, 14)),
+                          static_cast<float>(eighth) / 8.0F);
+        if (HasFatalFailure()) return;
+    }
+}
+
+TEST(StrokeWays, MasksOfAllWidths_MatchTheLiteralForm) {
+    // Narrower than any vector to wider than two of the widest.
+    for (int width = 1; width <= 140; ++width) {
+        SCOPED_TRACE("width " + std::to_string(width));
+        Random random(static_cast<uint64_t>(width) + 100);
+        expectLiteralForm(randomMask(random, width, random.between(1, 6)), random.real(0.0F, 14.0F));
+        if (HasFatalFailure()) return;
+    }
+}
+
+TEST(StrokeWays, TallMasks_MatchTheLiteralForm) {
+    // More rows than a band has, and than a vector of rows.
+    forSeeds(8000, 30, [](Random& random) {
+        expectLiteralForm(randomMask(random, random.between(1, 12), random.between(60, 150)),
+                          random.real(0.0F, 20.0F));
+    });
+}
+
+TEST(StrokeWays, FaintMasks_MatchTheLiteralForm) {
+    // Nothing is fully covered: the largest coverage takes the place of 255.
+    forSeeds(9000, 150, [](Random& random) {
+        const auto mask = randomMask(random, random.between(1, 40), random.between(1, 20));
+        expectLiteralForm(faint(mask, random.between(0, 254)), random.real(0.0F, 26.0F));
+    });
+}
+
+TEST(StrokeWays, HairlinesWithoutAFullPixel_MatchTheLiteralForm) {
+    forSeeds(10000, 60, [](Random& random) {
+        literal::Mask mask = filledMask(random.between(20, 60), random.between(20, 40), 0);
+        const int slope = random.between(0, 3);
+        for (int i = 0; i < 40; ++i) {
+            const int x = slope == 0 ? 7 : i;
+            const int y = slope == 0 ? i : 5 + i * (slope - 1) / 2;
+            if (x >= mask.width || y >= mask.height) continue;
+            mask.bytes[static_cast<size_t>(y * mask.width + x)] = static_cast<uint8_t>(90 + 4 * i);
+        }
+        expectLiteralForm(mask, random.real(0.0F, 30.0F));
+    });
+}
+
+TEST(StrokeWays, NoiseWithFewPixelsOfTheLargestCoverage_MatchesTheLiteralForm) {
+    forSeeds(11000, 60, [](Random& random) {
+        literal::Mask mask = faint(
+            noiseMask(random, random.between(20, 70), random.between(10, 20), random.between(0, 99)),
+            200);
+        for (int i = random.between(0, 3); i > 0; --i)
+            mask.bytes[static_cast<size_t>(random.between(0, mask.width * mask.height - 1))] = 255;
+        expectLiteralForm(mask, random.real(0.0F, 26.0F));
+    });
+}
+
+TEST(StrokeWays, HolesThatHardlyClose_MatchTheLiteralForm) {
+    for (int hole = 1; hole <= 40; ++hole) {
+        SCOPED_TRACE("hole of " + std::to_string(hole));
+        literal::Mask mask = filledMask(hole + 12, hole + 12, 255);
+        for (int y = 0; y < hole; ++y)
+            std::fill_n(mask.bytes.begin() + (y + 6) * mask.width + 6, hole, uint8_t{0});
+        for (float size : {0.3F, 0.5F, 0.6F, 0.71F, 0.75F})
+            expectLiteralForm(mask, static_cast<float>(hole) * size);
+        if (HasFatalFailure()) return;
+    }
+}
+
+TEST(StrokeWays, LargestRadii_MatchTheLiteralForm) {
+    // From a reach of 255 on, distances no longer fit in a byte.
+    for (float size : {127.9F, 128.0F, 253.5F, 254.0F, 254.4F, 254.5F, 255.0F, 255.5F, 255.9F, 256.0F}) {
+        SCOPED_TRACE(size);
+        Random random(static_cast<uint64_t>(size * 10.0F));
+        literal::Mask mask = filledMask(6, 3, 0);
+        mask.bytes[static_cast<size_t>(random.between(0, 17))] = 255;
+        mask.bytes[static_cast<size_t>(random.between(0, 17))] = random.byte();
+        expectLiteralForm(mask, size);
+        if (HasFatalFailure()) return;
+    }
+}
+
+TEST(StrokeWays, LinesOfText_MatchTheLiteralForm) {
+    const literal::Mask& line = glyphLine();
+    if (line.width == 0) GTEST_SKIP() << "there is no line of glyphs";
+    literal::Mask part = filledMask(150, line.height, 0);
+    for (int y = 0; y < line.height; ++y) {
+        std::copy_n(line.bytes.begin() + y * line.width, part.width,
+                    part.bytes.begin() + y * part.width);
+    }
+    for (float size : {1.0F, 2.0F, 3.5F, 5.0F, 7.25F, 8.0F, 9.0F, 16.0F, 24.0F, 33.0F})
+        expectLiteralForm(part, size);
+}
+
+TEST(StrokeWays, DestinationThatShowsAPart_GetsTheSameThere) {
+    forOtherDestinations(150, 40, 60, [](Random& random, const Scene& scene) {
+        EXPECT_TRUE(matchesLiteral(scene, random.real(0.0F, 40.0F), randomPremultiplied(random),
+                                   random.between(0, 2)));
+    });
+}
+
+TEST(StrokeWays, SecondDestinationLargerThanTheFirst_GetsAllOfTheOutline) {
+    for (float size : {1.0F, 5.0F, 12.0F}) {
+        Scene scene = sceneWithRoom(discMask(20, 14, 9.0F, 6.0F, 5.0F, true), size);
+        scene.sub = filledPicture(scene.dst.width, scene.dst.height, 0);
+        scene.dst = filledPicture(11, 9, 0);
+        EXPECT_TRUE(matchesLiteral(scene, size, kWhite, kOutside));
+    }
+}
+
+TEST(StrokeWays, NoByteOutsideTheBitmaps_IsTouched) {
+    forSeeds(12000, 300, [](Random& random) {
+        const int width = random.between(1, 90);
+        const int height = random.between(1, 12);
+        const Edge edge = random.chance(50) ? Edge::kStart : Edge::kEnd;
+        GuardedBitmap mask(width, height, 1, edge);
+        GuardedBitmap dst(width, height, 4, edge);
+        const auto pixels = randomMask(random, width, height);
+        std::copy(pixels.bytes.begin(), pixels.bytes.end(), mask.pixels().begin());
+        const int position = random.between(0, 2);
+        const float size = random.real(0.0F, 30.0F);
+        VFontEffect::VFRect text(0, 0, width, height);
+        VFECore::ParamPostProcessing params{dst.bitmap(), mask.bitmap(), &text, 0, nullptr};
+        coreWith(size, kWhite, position)->doPostProcessing(&params);
+
+        literal::Picture expected = filledPicture(width, height, 0);
+        literal::paintStroke(expected, nullptr, pixels, wholeBox(pixels), false, size, kWhite, position);
+        EXPECT_EQ(expected.bytes, std::vector<uint8_t>(dst.pixels().begin(), dst.pixels().end()));
     });
 }
 
