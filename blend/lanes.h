@@ -61,6 +61,21 @@ VOREL_INLINE V spread(T value) {
     return V{} + value;
 }
 
+/// All ones in the first `count` bytes, 0 to kBytes of them.
+VOREL_INLINE Bytes firstBytes(int64_t count) {
+    Bytes lanes;
+    for (int i = 0; i < kBytes; ++i)
+        lanes[i] = static_cast<uint8_t>(i);
+    return as<Bytes>(lanes < spread<Bytes>(static_cast<uint8_t>(count)));
+}
+
+/// The first `count` bytes of a vector, zeros after them.
+VOREL_INLINE Bytes loadCopied(const uint8_t* from, int64_t count) {
+    uint8_t bytes[kBytes] = {};
+    std::memcpy(bytes, from, static_cast<size_t>(count));
+    return load<Bytes>(bytes);
+}
+
 template <class V>
 VOREL_INLINE V larger(V a, V b) {
     return a > b ? a : b;
@@ -82,7 +97,8 @@ VOREL_INLINE V smaller(V a, V b) {
 //   toInt          as core/numeric.h converts: toward zero, saturating, NaN to 0
 //   squareRoot     correctly rounded
 //   gathered       the words of a table at the given indices, kWords of them, in a vector or in bytes
-//   widened        kBytes / 2 bytes of memory, each in a half
+//   loadFirst      1 to kBytes bytes of memory, zeros after them
+//   widenedLow, widenedHigh   the first and the second half of the bytes, each byte in a half
 //   narrowed       halves of at most 255 as bytes: those of the first vector, then of the second
 //   interleavedLow, interleavedHigh   the lanes of the two vectors in turn, from their lower and from
 //                  their upper ends; AVX does so in each 128 bits by itself
@@ -155,8 +171,14 @@ VOREL_INLINE Words gathered(const uint32_t* table, const uint8_t* indices) {
     return Words{table[*indices]};
 }
 
-VOREL_INLINE Halves widened(const uint8_t* from) {
-    return Halves{from[0], from[1]};
+VOREL_INLINE Bytes loadFirst(const uint8_t* from, int64_t count) {
+    return loadCopied(from, count);
+}
+VOREL_INLINE Halves widenedLow(Bytes v) {
+    return Halves{v[0], v[1]};
+}
+VOREL_INLINE Halves widenedHigh(Bytes v) {
+    return Halves{v[2], v[3]};
 }
 VOREL_INLINE Bytes narrowed(Halves a, Halves b) {
     return __builtin_convertvector(__builtin_shufflevector(a, b, 0, 1, 2, 3), Bytes);
@@ -255,8 +277,15 @@ VOREL_INLINE Words gathered(const uint32_t* table, const uint8_t* indices) {
     return gathered(table, as<Integers>(_mm512_cvtepu8_epi32(bytes)));
 }
 
-VOREL_INLINE Halves widened(const uint8_t* from) {
-    return as<Halves>(_mm512_cvtepu8_epi16(_mm256_loadu_si256(reinterpret_cast<const __m256i*>(from))));
+VOREL_INLINE Bytes loadFirst(const uint8_t* from, int64_t count) {
+    const uint64_t lanes = ~uint64_t{0} >> (64 - count);
+    return as<Bytes>(_mm512_maskz_loadu_epi8(lanes, from));
+}
+VOREL_INLINE Halves widenedLow(Bytes v) {
+    return as<Halves>(_mm512_cvtepu8_epi16(_mm512_castsi512_si256(as<__m512i>(v))));
+}
+VOREL_INLINE Halves widenedHigh(Bytes v) {
+    return as<Halves>(_mm512_cvtepu8_epi16(_mm512_extracti64x4_epi64(as<__m512i>(v), 1)));
 }
 VOREL_INLINE Bytes interleavedLow(Bytes a, Bytes b) {
     return as<Bytes>(_mm512_unpacklo_epi8(as<__m512i>(a), as<__m512i>(b)));
@@ -356,8 +385,14 @@ VOREL_INLINE Words gathered(const uint32_t* table, const uint8_t* indices) {
     return gathered(table, as<Integers>(_mm256_cvtepu8_epi32(bytes)));
 }
 
-VOREL_INLINE Halves widened(const uint8_t* from) {
-    return as<Halves>(_mm256_cvtepu8_epi16(_mm_loadu_si128(reinterpret_cast<const __m128i*>(from))));
+VOREL_INLINE Bytes loadFirst(const uint8_t* from, int64_t count) {
+    return loadCopied(from, count);
+}
+VOREL_INLINE Halves widenedLow(Bytes v) {
+    return as<Halves>(_mm256_cvtepu8_epi16(_mm256_castsi256_si128(as<__m256i>(v))));
+}
+VOREL_INLINE Halves widenedHigh(Bytes v) {
+    return as<Halves>(_mm256_cvtepu8_epi16(_mm256_extracti128_si256(as<__m256i>(v), 1)));
 }
 VOREL_INLINE Bytes interleavedLow(Bytes a, Bytes b) {
     return as<Bytes>(_mm256_unpacklo_epi8(as<__m256i>(a), as<__m256i>(b)));
@@ -456,9 +491,14 @@ VOREL_INLINE Words gathered(const uint32_t* table, const uint8_t* indices) {
     return Words{table[indices[0]], table[indices[1]], table[indices[2]], table[indices[3]]};
 }
 
-VOREL_INLINE Halves widened(const uint8_t* from) {
-    const __m128i bytes = _mm_loadl_epi64(reinterpret_cast<const __m128i*>(from));
-    return as<Halves>(_mm_unpacklo_epi8(bytes, _mm_setzero_si128()));
+VOREL_INLINE Bytes loadFirst(const uint8_t* from, int64_t count) {
+    return loadCopied(from, count);
+}
+VOREL_INLINE Halves widenedLow(Bytes v) {
+    return as<Halves>(_mm_unpacklo_epi8(as<__m128i>(v), _mm_setzero_si128()));
+}
+VOREL_INLINE Halves widenedHigh(Bytes v) {
+    return as<Halves>(_mm_unpackhi_epi8(as<__m128i>(v), _mm_setzero_si128()));
 }
 VOREL_INLINE Bytes interleavedLow(Bytes a, Bytes b) {
     return as<Bytes>(_mm_unpacklo_epi8(as<__m128i>(a), as<__m128i>(b)));
@@ -555,8 +595,14 @@ VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
     const uint32x4_t high = vmull_high_u16(as<uint16x8_t>(a), as<uint16x8_t>(b));
     return as<Halves>(vuzp2q_u16(vreinterpretq_u16_u32(low), vreinterpretq_u16_u32(high)));
 }
-VOREL_INLINE Halves widened(const uint8_t* from) {
-    return as<Halves>(vmovl_u8(vld1_u8(from)));
+VOREL_INLINE Bytes loadFirst(const uint8_t* from, int64_t count) {
+    return loadCopied(from, count);
+}
+VOREL_INLINE Halves widenedLow(Bytes v) {
+    return as<Halves>(vmovl_u8(vget_low_u8(as<uint8x16_t>(v))));
+}
+VOREL_INLINE Halves widenedHigh(Bytes v) {
+    return as<Halves>(vmovl_high_u8(as<uint8x16_t>(v)));
 }
 VOREL_INLINE Bytes interleavedLow(Bytes a, Bytes b) {
     return as<Bytes>(vzip1q_u8(as<uint8x16_t>(a), as<uint8x16_t>(b)));

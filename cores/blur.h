@@ -4,6 +4,7 @@
 #include <cstdint>
 
 #include "blend/clip.h"
+#include "core/line_buffer.h"
 #include "core/pixel_buffer.h"
 #include "cores/blur_kernels.h"
 #include "cores/paint_input.h"
@@ -38,15 +39,35 @@ BlurKernel glowKernel(int radius);
 /// half a step of single precision below n.
 float inverseAbove(uint32_t total);
 
-/// For sums up to 256 * divisor - 1, a divisor of 2 to 255.
+/// For sums up to 256 * divisor - 1, a divisor of 128 to 255.
 NarrowDivision narrowDivision(uint32_t divisor);
-
-/// The blur in the form of the chosen level's loops, which read from `room`.
-PreparedBlur prepareBlur(const BlurKernel& kernel, PixelBuffer<uint8_t>& room);
-PixelBuffer<uint8_t> roomForWeights(int radius);
 
 /// A part of a picture, in the coordinates of what is blurred.
 using Window = Clip;
+
+/// Columns before the one and from the other on count as 255 between the passes.
+struct FullColumns {
+    int64_t before;
+    int64_t from;
+};
+constexpr FullColumns kNoFullColumns = {INT64_MIN, INT64_MAX};
+
+/// A kernel in the form of the chosen level's loops.
+class BlurWeights {
+  public:
+    explicit BlurWeights(const BlurKernel& kernel);
+
+    explicit operator bool() const { return static_cast<bool>(mMemory); }
+    const PreparedBlur& operator*() const { return mBlur; }
+    const PreparedBlur* operator->() const { return &mBlur; }
+
+    /// Bytes of a pixel in a row between the passes.
+    int64_t pixelBytes() const { return mBlur.isNarrow ? kNarrowPixelBytes : 1; }
+
+  private:
+    PixelBuffer<uint8_t> mMemory;
+    PreparedBlur mBlur;
+};
 
 /// The coverage of a box.
 inline BlurSource sourceOf(const CoverageBox& box) {
@@ -62,102 +83,132 @@ struct ReachedSource {
     static ReachedSource of(const BlurSource& source, int64_t radius, const Window& window);
 };
 
-/// Columns before the one and from the other on count as 255 between the passes.
-struct FullColumns {
-    int64_t before;
-    int64_t from;
-};
-constexpr FullColumns kNoFullColumns = {INT64_MIN, INT64_MAX};
+/// Groups of four rows.
+struct GroupRange {
+    int64_t first;
+    int64_t end;
 
-/// Rows of the middle plane and their memory.
-struct MiddleBuffer {
-    PixelBuffer<uint8_t> pixels;
-    PixelBuffer<uint8_t> inked;
-    MiddlePlane plane;
-
-    explicit operator bool() const { return pixels && inked; }
-
-    /// For `rows` rows; the source's columns are those from `inkColumn` on.
-    static MiddleBuffer of(const PreparedBlur& blur, int64_t rows, int64_t inkColumn, int64_t columns,
-                           const FullColumns& full);
+    /// The groups that 4 * quads rows of results need of `height` rows. Group 0 begins with row
+    /// `firstRow`.
+    static GroupRange needed(const BlurWeights& weights, int64_t height, int64_t firstRow,
+                             int64_t quads);
 };
 
-/// Blurs the columns first and then the rows, each pass rounding down, a band of rows at a time: the
-/// working memory is that of a band. What lies around the source is 0, but for the full columns.
+/// The rows in reach of the pass down, which come in groups of four while the results go by.
+class TapGroups {
+  public:
+    /// For the groups of GroupRange::needed, of rows of `width` bytes.
+    TapGroups(const BlurWeights& weights, int64_t width, int64_t height, int64_t firstRow,
+              int64_t quads);
+
+    explicit operator bool() const { return mMemory && mInked; }
+    const TapColumns& columns() const { return mColumns; }
+
+    /// Calls feed(group) for each group that is still missing for a quad of results.
+    template <class Feed>
+    void complete(int64_t quad, Feed feed) {
+        const int64_t end = std::min(quad + mSteps, mMissing.end);
+        for (; mMissing.first < end; ++mMissing.first) {
+            if (mMissing.first == mColumns.firstGroup + mCapacity) forgetBefore(quad);
+            feed(mMissing.first);
+        }
+    }
+
+  private:
+    void forgetBefore(int64_t group);
+
+    /// More than any quad needs, so that groups rarely move.
+    static constexpr int64_t kSpareGroups = 16;
+
+    int64_t mSteps;
+    GroupRange mMissing;
+    int64_t mCapacity;
+    int64_t mStrips;
+    int64_t mGroupBytes;
+    LineBuffer mMemory;
+    PixelBuffer<int32_t> mInked;
+    TapColumns mColumns = {};
+};
+
+/// Four rows between the passes.
+class MiddleBuffer {
+  public:
+    MiddleBuffer(const BlurWeights& weights, int64_t inkColumn, int64_t columns,
+                 const FullColumns& full);
+
+    explicit operator bool() const { return mPixels && mInked; }
+    const MiddleRows& rows() const { return mRows; }
+
+  private:
+    LineBuffer mPixels;
+    PixelBuffer<uint8_t> mInked;
+    MiddleRows mRows = {};
+};
+
+/// Blurs the columns first and then the rows, each pass rounding down, four rows at a time. What lies
+/// around the source is 0, but for the full columns.
 class DownThenAcross {
   public:
     DownThenAcross(const BlurKernel& kernel, const BlurSource& source, const Window& window,
                    const FullColumns& full);
 
     /// Whether there is memory for it.
-    explicit operator bool() const { return mBlur && mStrip && mMiddle && mOut; }
+    explicit operator bool() const { return mWeights && mTaps && mMiddle && mOut; }
 
-    /// Calls paint(y, rows, values, stride) for up to kQuad rows of the window at a time; `inverted`
-    /// gives 255 minus the mean in the second pass, rounded down as a whole.
+    /// Calls paint(y, rows, values, stride) for up to kQuad rows of the window at a time. `inverted`
+    /// gives 255 minus the mean of the second pass, rounded down as a whole.
     template <class Paint>
     void run(bool inverted, Paint paint) {
-        for (int64_t top = mWindow.top; top < mWindow.bottom; top += kBandRows) {
-            const int64_t rows = std::min(kBandRows, mWindow.bottom - top);
-            blurBandDown(top, rows);
-            for (int64_t y = 0; y < rows; y += kQuad) {
-                blurQuadAcross(y / kQuad, inverted);
-                paint(top + y, std::min(kQuad, rows - y), mOut.data(), mOutStride);
-            }
+        for (int64_t y = 0; y < mWindow.height(); y += kQuad) {
+            blurQuad(y / kQuad, inverted);
+            paint(mWindow.top + y, std::min(kQuad, mWindow.height() - y), mOut.data(), mOutStride);
         }
     }
 
   private:
-    static constexpr int64_t kBandRows = 64;
-
     MiddleBuffer middleFor(const FullColumns& full);
-    void blurBandDown(int64_t top, int64_t rows);
-    void blurQuadAcross(int64_t quad, bool inverted);
+    void blurQuad(int64_t quad, bool inverted);
 
     Window mWindow;
-    PixelBuffer<uint8_t> mWeights;
-    PreparedBlur mBlur;
+    BlurWeights mWeights;
     ReachedSource mSource;
-    int64_t mMiddleLeft;  // column of the source that is column 0 of the middle plane
-    PixelBuffer<uint8_t> mStrip;
+    int64_t mFirstRow;  // of the source, the first of group 0
+    TapGroups mTaps;
+    int64_t mMiddleLeft;  // column of the source, column 0 between the passes
     MiddleBuffer mMiddle;
     int64_t mOutStride;
-    PixelBuffer<uint8_t> mOut;
+    LineBuffer mOut;
 };
 
-/// Blurs the rows of the source's inverse first and then the columns, each pass rounding down. What lies
-/// around the source is 255 in its inverse.
+/// Blurs the rows of the source's inverse first and then the columns, each pass rounding down, four rows
+/// at a time. What lies around the source is 255 in its inverse.
 class AcrossThenDown {
   public:
     AcrossThenDown(const BlurKernel& kernel, const BlurSource& source, const Window& window);
 
-    explicit operator bool() const { return mBlur && mStrip && mMiddle && mAcross && mOut; }
+    explicit operator bool() const { return mWeights && mMiddle && mAcross && mTaps && mOut; }
 
-    /// Calls paint(y, rows, values, stride) for some rows of the window at a time.
+    /// Calls paint(y, rows, values, stride) for up to kQuad rows of the window at a time.
     template <class Paint>
     void run(Paint paint) {
-        blurAcross();
-        for (int64_t top = mWindow.top; top < mWindow.bottom; top += kBandRows) {
-            const int64_t rows = std::min(kBandRows, mWindow.bottom - top);
-            blurBandDown(top, rows);
-            paint(top, rows, mOut.data(), mStride);
+        for (int64_t y = 0; y < mWindow.height(); y += kQuad) {
+            blurQuad(y / kQuad);
+            paint(mWindow.top + y, std::min(kQuad, mWindow.height() - y), mOut.data(), mStride);
         }
     }
 
   private:
-    static constexpr int64_t kBandRows = 64;
-
-    void blurAcross();
-    void blurBandDown(int64_t top, int64_t rows);
+    void blurQuad(int64_t quad);
 
     Window mWindow;
-    PixelBuffer<uint8_t> mWeights;
-    PreparedBlur mBlur;
+    BlurWeights mWeights;
     ReachedSource mSource;
-    PixelBuffer<uint8_t> mStrip;
+    int64_t mFirstRow;  // of the source, the first of group 0
     MiddleBuffer mMiddle;
     int64_t mStride;
-    PixelBuffer<uint8_t> mAcross;
-    PixelBuffer<uint8_t> mOut;
+    LineBuffer mAcross;
+    TapGroups mTaps;
+    LineBuffer mOut;
 };
 
 }  // namespace VFontEffect::internal

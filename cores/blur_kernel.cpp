@@ -1,3 +1,4 @@
+#include <algorithm>
 #include <cmath>
 #include <cstdint>
 
@@ -45,19 +46,16 @@ float inverseAbove(uint32_t total) {
     return static_cast<double>(nearest) * total >= 1.0 ? nearest : std::nextafter(nearest, 1.0F);
 }
 
-// With 2^s the largest power of two up to d: of the two whole numbers next to 2^(16 + s) / d one is
-// close enough. The larger one, m, if it is too large by at most 2^s / d: x * m / 2^(16 + s) then
-// exceeds x / d by less than 1 / d, as x is below 2^16. Else the smaller one, and x + 1 makes up for it.
+// Of the two whole numbers next to 2^23 / d one is close enough. The larger one, m, if it is too large
+// by at most 2^7 / d: x * m / 2^23 then exceeds x / d by less than 1 / d, as x is below 2^16. Else the
+// smaller one, and x + 1 makes up for it.
 NarrowDivision narrowDivision(uint32_t divisor) {
-    uint16_t shift = 0;
-    while (2U << shift <= divisor)
-        ++shift;
-    const uint32_t scale = 0x10000U << shift;
-    const uint32_t smaller = scale / divisor;
+    constexpr uint32_t kScale = 0x10000U << kNarrowShift;
+    const uint32_t smaller = kScale / divisor;
     const uint32_t larger = smaller + 1;
-    if (larger <= 0xFFFF && larger * divisor - scale <= 1U << shift)
-        return {0, static_cast<uint16_t>(larger), shift};
-    return {1, static_cast<uint16_t>(std::min(smaller, 0xFFFFU)), shift};
+    if (larger <= 0xFFFF && larger * divisor - kScale <= 1U << kNarrowShift)
+        return {0, static_cast<uint16_t>(larger)};
+    return {1, static_cast<uint16_t>(std::min(smaller, 0xFFFFU))};
 }
 
 }  // namespace VFontEffect::internal

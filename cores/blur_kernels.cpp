@@ -27,18 +27,22 @@
 namespace VFontEffect::internal::VOREL_LEVEL {
 namespace {
 
-#if defined(__AVX512BW__) || defined(__aarch64__)
-constexpr int kGridVectors = 4;  // of 32 registers half are sums
+// Of 32 registers half are sums. NEON picks four weights from a register that holds four times as many.
+#if defined(VOREL_SCALAR)
+constexpr int kGridVectors = 2;
+constexpr int kStepsAtOnce = 1;
+#elif defined(__aarch64__)
+constexpr int kGridVectors = 4;
+constexpr int kStepsAtOnce = 4;
+#elif defined(__AVX512BW__)
+constexpr int kGridVectors = 4;
+constexpr int kStepsAtOnce = 1;
 #else
 constexpr int kGridVectors = 2;
+constexpr int kStepsAtOnce = 1;
 #endif
 
 // --- Steps: which groups of four taps a stretch of results needs --------------------------------------
-
-/// Steps of four taps that together hold the taps of four neighbouring results.
-VOREL_INLINE int64_t stepsOf(int radius) {
-    return (2 * int64_t{radius} + kQuad + 3) / 4;
-}
 
 struct Range {
     int64_t first;
@@ -61,14 +65,6 @@ VOREL_INLINE int64_t wholeVectors(int64_t columns) {
 
 // --- Loading --------------------------------------------------------------------------------------
 
-/// The first `count` bytes of a vector, zeros after them.
-VOREL_INLINE Bytes loadPart(const uint8_t* from, int64_t count) {
-    if (count >= kBytes) return load<Bytes>(from);
-    uint8_t bytes[kBytes] = {};
-    std::memcpy(bytes, from, static_cast<size_t>(count));
-    return load<Bytes>(bytes);
-}
-
 /// A strip of the source: `count` columns from `x` on, as many as a vector holds at most.
 struct SourceStrip {
     const uint8_t* start;
@@ -80,15 +76,13 @@ struct SourceStrip {
     static SourceStrip of(const BlurSource& source, int64_t x) {
         const int64_t left = source.width - x;
         const int64_t count = left < kBytes ? left : int64_t{kBytes};
-        uint8_t flip[kBytes] = {};
-        std::memset(flip, source.flip, static_cast<size_t>(count));
-        return {source.start + x, source.stride, source.height, count, load<Bytes>(flip)};
+        return {source.start + x, source.stride, source.height, count,
+                spread<Bytes>(source.flip) & firstBytes(count)};
     }
 
-    VOREL_INLINE Bytes row(int64_t y) const {
-        if (y < 0 || y >= height) return Bytes{};
-        return loadPart(start + y * stride, count) ^ flip;
-    }
+    bool has(int64_t y) const { return y >= 0 && y < height; }
+    VOREL_INLINE Bytes whole(int64_t y) const { return load<Bytes>(start + y * stride) ^ flip; }
+    VOREL_INLINE Bytes part(int64_t y) const { return loadFirst(start + y * stride, count) ^ flip; }
 };
 
 /// Four rows of a strip.
@@ -96,7 +90,19 @@ struct Group {
     Bytes rows[kQuad];
 
     static VOREL_INLINE Group of(const SourceStrip& strip, int64_t y) {
-        return {{strip.row(y), strip.row(y + 1), strip.row(y + 2), strip.row(y + 3)}};
+        if (!strip.has(y) || !strip.has(y + kQuad - 1)) return atEdge(strip, y);
+        Group group;
+        unrolled<kQuad>([&](auto i) {
+            const int64_t row = y + i.value;
+            group.rows[i.value] = strip.count == kBytes ? strip.whole(row) : strip.part(row);
+        });
+        return group;
+    }
+    static __attribute__((noinline)) Group atEdge(const SourceStrip& strip, int64_t y) {
+        Group group;
+        for (int64_t i = 0; i < kQuad; ++i)
+            group.rows[i] = strip.has(y + i) ? strip.part(y + i) : Bytes{};
+        return group;
     }
     VOREL_INLINE bool isInked() const { return !allZero(rows[0] | rows[1] | rows[2] | rows[3]); }
 };
@@ -106,7 +112,7 @@ struct Group {
 
 /// Sums of 32 bits by dot products.
 struct DotMethod {
-    static constexpr int64_t kMiddleBytes = 1;
+    static constexpr int64_t kPixelBytes = 1;
     static constexpr int64_t kGroupBytes = kQuad * kBytes;
 
     const WeightCell* cells;
@@ -175,10 +181,11 @@ struct DotMethod {
             unrolled<kGridVectors>([&](auto v) { grid.sums[v.value][j.value] = begin; });
         });
         int64_t step = steps.first;
-        for (; step + 4 <= steps.end; step += 4) {
-            addSteps<4>(grid, from, cells + 4 * step);
-            from.start += 4 * from.step;
+        for (; step + kStepsAtOnce <= steps.end; step += kStepsAtOnce) {
+            addSteps<kStepsAtOnce>(grid, from, cells + 4 * step);
+            from.start += kStepsAtOnce * from.step;
         }
+        if (kStepsAtOnce == 1) return grid;
         for (; step < steps.end; ++step) {
             addSteps<1>(grid, from, cells + 4 * step);
             from.start += from.step;
@@ -237,25 +244,23 @@ struct DotMethod {
 
 /// Sums of 16 bits.
 struct NarrowMethod {
-    static constexpr int64_t kMiddleBytes = kNarrowMiddleBytes;
-    static constexpr int64_t kRowBytes = kMiddleBytes * kBytes;
+    static constexpr int64_t kPixelBytes = kNarrowPixelBytes;
+    static constexpr int64_t kRowBytes = kPixelBytes * kBytes;
     static constexpr int64_t kGroupBytes = kQuad * kRowBytes;
 
     int radius;
     Halves weights[kLargestNarrowRadius + 1];
     Halves start;
     Halves multiplier;
-    uint16_t shift;
 
     static NarrowMethod of(const PreparedBlur& blur, bool roundsUp) {
         NarrowMethod method;
         method.radius = blur.radius;
         for (int k = 0; k <= blur.radius; ++k)
             method.weights[k] = spread<Halves>(blur.weights[k]);
-        const uint32_t rounding = roundsUp ? blur.total - 1 : 0;
+        const uint32_t rounding = roundsUp ? blur.narrowTotal - 1 : 0;
         method.start = spread<Halves>(static_cast<uint16_t>(blur.division.start + rounding));
         method.multiplier = spread<Halves>(blur.division.multiplier);
-        method.shift = blur.division.shift;
         return method;
     }
 
@@ -263,11 +268,7 @@ struct NarrowMethod {
         Halves left;
         Halves right;
     };
-    static VOREL_INLINE Row rowOf(Bytes row) {
-        uint8_t bytes[kBytes];
-        store(bytes, row);
-        return {widened(bytes), widened(bytes + kBytes / 2)};
-    }
+    static VOREL_INLINE Row rowOf(Bytes row) { return {widenedLow(row), widenedHigh(row)}; }
     static VOREL_INLINE Bytes bytesOf(const Row& row) { return narrowed(row.left, row.right); }
     static VOREL_INLINE Row loadRow(const uint8_t* from) {
         return {load<Halves>(from), load<Halves>(from + kBytes)};
@@ -278,12 +279,12 @@ struct NarrowMethod {
     }
     static void fillMiddle(uint8_t* to, int64_t count, uint16_t value) {
         for (int64_t i = 0; i < count; ++i)
-            std::memcpy(to + i * kMiddleBytes, &value, sizeof value);
+            std::memcpy(to + i * kPixelBytes, &value, sizeof value);
     }
 
     static VOREL_INLINE void storeGroup(const Group& group, uint8_t* to) {
-        for (int i = 0; i < kQuad; ++i)
-            storeMiddle(rowOf(group.rows[i]), to + i * kRowBytes);
+        unrolled<kQuad>(
+            [&](auto i) { storeMiddle(rowOf(group.rows[i.value]), to + i.value * kRowBytes); });
     }
 
     /// The mean of the taps around `centre`, `step` bytes apart.
@@ -296,8 +297,8 @@ struct NarrowMethod {
             sums.left += (before.left + after.left) * weights[k];
             sums.right += (before.right + after.right) * weights[k];
         }
-        return {multiplyHigh(sums.left, multiplier) >> shift,
-                multiplyHigh(sums.right, multiplier) >> shift};
+        return {multiplyHigh(sums.left, multiplier) >> kNarrowShift,
+                multiplyHigh(sums.right, multiplier) >> kNarrowShift};
     }
 
     template <class GroupAt, class Store>
@@ -309,209 +310,156 @@ struct NarrowMethod {
     template <class Store>
     VOREL_INLINE void quadAcross(const Range&, const uint8_t* rows, int64_t stride, int64_t tapColumn,
                                  Store store) const {
-        const uint8_t* const centre = rows + (tapColumn + radius) * kMiddleBytes;
+        const uint8_t* const centre = rows + (tapColumn + radius) * kPixelBytes;
         for (int j = 0; j < kQuad; ++j)
-            store(j, bytesOf(mean(centre + j * stride, kMiddleBytes)));
+            store(j, bytesOf(mean(centre + j * stride, kPixelBytes)));
     }
 };
 
 // --- Down ---------------------------------------------------------------------------------------------
 
-/// The rows of a strip that the pass needs, as groups, with as many empty groups on both sides as a
-/// short blur may touch.
 template <class Method>
-class Strip {
-  public:
-    explicit Strip(const DownPass& pass)
-        : mSteps(stepsOf(pass.blur->radius)),
-          mFirstRow(pass.top - pass.blur->radius),
-          mSkipped(mFirstRow < 0 ? -mFirstRow / kQuad : 0) {
-        const int64_t rowEnd =
-            smallerOf(pass.source.height, mFirstRow + kQuad * (pass.quads - 1 + mSteps));
-        mCount = largerOf(0, (rowEnd - mFirstRow + kQuad - 1) / kQuad - mSkipped);
-        mGroups = pass.strip + kSpareGroups * Method::kGroupBytes;
-        mNextInked = reinterpret_cast<int32_t*>(mGroups + (mCount + kSpareGroups) * Method::kGroupBytes);
-        std::memset(pass.strip, 0, kSpareGroups * Method::kGroupBytes);
-        std::memset(group(mSkipped + mCount), 0, kSpareGroups * Method::kGroupBytes);
+VOREL_INLINE uint8_t* groupAt(const TapColumns& columns, int64_t strip, int64_t group) {
+    return columns.groups + strip * columns.stripStride +
+           (group - columns.firstGroup) * Method::kGroupBytes;
+}
+
+template <class Method>
+void feed(const PreparedBlur&, const BlurSource& source, int64_t row, const TapColumns& columns,
+          int64_t index) {
+    for (int64_t strip = 0; strip * kBytes < columns.width; ++strip) {
+        const Group group = Group::of(SourceStrip::of(source, strip * kBytes), row);
+        Method::storeGroup(group, groupAt<Method>(columns, strip, index));
+        if (!group.isInked()) continue;
+        const auto number = static_cast<int32_t>(index);
+        if (columns.lastInked[strip] < columns.firstInked[strip]) columns.firstInked[strip] = number;
+        columns.lastInked[strip] = number;
     }
+}
 
-    /// Reads the source's columns from `x` on.
-    void fill(const BlurSource& source, int64_t x) {
-        const SourceStrip strip = SourceStrip::of(source, x);
-        auto next = static_cast<int32_t>(mCount);
-        for (int64_t i = mCount - 1; i >= 0; --i) {
-            const Group rows = Group::of(strip, mFirstRow + kQuad * (mSkipped + i));
-            if (rows.isInked()) next = static_cast<int32_t>(i);
-            mNextInked[i] = next;
-            Method::storeGroup(rows, group(mSkipped + i));
-        }
-    }
+/// The steps of a quad of results that reach inked groups of a strip.
+VOREL_INLINE Range inkedSteps(const TapColumns& columns, int64_t strip, int64_t quad, int radius) {
+    return {largerOf(0, columns.firstInked[strip] - quad),
+            smallerOf(tapSteps(radius), columns.lastInked[strip] + 1 - quad)};
+}
 
-    /// The steps of a quad of results from its first inked group on, to the last group that exists.
-    Range steps(int64_t quad) const {
-        const int64_t shift = quad - mSkipped;
-        const int64_t first = largerOf(shift, 0);
-        const int64_t end = smallerOf(shift + mSteps, mCount);
-        if (first >= end) return {0, 0};
-        return {mNextInked[first] - shift, end - shift};
-    }
-
-    /// Groups are counted from that of step 0 of quad 0 on.
-    uint8_t* group(int64_t index) const { return mGroups + (index - mSkipped) * Method::kGroupBytes; }
-
-  private:
-    int64_t mSteps;
-    int64_t mFirstRow;  // of the step 0 of quad 0
-    int64_t mSkipped;   // groups from there on that lie above the source
-    int64_t mCount;
-    uint8_t* mGroups;
-    int32_t* mNextInked;
-};
-
-/// Calls storeRow(x, y, row) for each row of each strip, y from 0 on, and inked(x, quad, whether).
-template <class Method, class StoreRow, class NoteInk>
-VOREL_INLINE void passDown(const DownPass& pass, const Method& method, StoreRow storeRow,
-                           NoteInk noteInk) {
-    Strip<Method> strip(pass);
-    for (int64_t x = 0; x < pass.source.width; x += kBytes) {
-        strip.fill(pass.source, x);
-        for (int64_t quad = 0; quad < pass.quads; ++quad) {
-            const Range steps = strip.steps(quad);
-            noteInk(x, quad, !steps.empty());
-            if (steps.empty()) {
-                for (int64_t j = 0; j < kQuad; ++j)
-                    storeRow(x, kQuad * quad + j, typename Method::Row{});
-            } else {
-                method.quadDown(
-                    steps, [&](int64_t step) { return strip.group(quad + step); },
-                    [&](int j, const typename Method::Row& row) { storeRow(x, kQuad * quad + j, row); });
-            }
+/// Calls store(strip, j, row) for each of the four rows of each strip.
+template <class Method, class Store>
+VOREL_INLINE void quadDown(const Method& method, const TapColumns& columns, int64_t quad, int radius,
+                           Store store) {
+    for (int64_t strip = 0; strip * kBytes < columns.width; ++strip) {
+        const auto storeRow = [&](int j, const typename Method::Row& row) { store(strip, j, row); };
+        const Range steps = inkedSteps(columns, strip, quad, radius);
+        if (steps.empty()) {
+            for (int j = 0; j < kQuad; ++j)
+                storeRow(j, typename Method::Row{});
+        } else {
+            method.quadDown(
+                steps, [&](int64_t step) { return groupAt<Method>(columns, strip, quad + step); },
+                storeRow);
         }
     }
 }
 
 template <class Method>
-VOREL_INLINE uint8_t* middleAt(const MiddlePlane& middle, int64_t x, int64_t y) {
-    return middle.start + y * middle.strideBytes + x * Method::kMiddleBytes;
+VOREL_INLINE uint8_t* middleAt(const MiddleRows& middle, int64_t x, int64_t y) {
+    return middle.start + y * middle.strideBytes + x * Method::kPixelBytes;
 }
 
-/// Completes a row around `width` columns of ink.
 template <class Method>
-void fillAround(const MiddlePlane& middle, int64_t width, int64_t y) {
-    const auto fill = [&](int64_t from, int64_t end, uint8_t value) {
-        if (from < end) Method::fillMiddle(middleAt<Method>(middle, from, y), end - from, value);
-    };
-    fill(-kWidestVector, middle.inkColumn, 0);
-    fill(middle.inkColumn + wholeVectors(width), wholeVectors(middle.columns) + kWidestVector, 0);
-    fill(0, smallerOf(middle.fullBefore, middle.columns), 0xFF);
-    fill(largerOf(middle.fullFrom, 0), middle.columns, 0xFF);
+VOREL_INLINE void fillMiddle(const MiddleRows& middle, int64_t from, int64_t end, uint8_t value) {
+    for (int64_t y = 0; y < kQuad && from < end; ++y)
+        Method::fillMiddle(middleAt<Method>(middle, from, y), end - from, value);
 }
 
-/// Notes the vectors with full columns.
-void noteFullColumns(const MiddlePlane& middle, uint8_t* inked) {
+template <class Method>
+void clear(const PreparedBlur&, const MiddleRows& middle) {
+    fillMiddle<Method>(middle, -kWidestVector, wholeVectors(middle.columns) + kWidestVector, 0);
+}
+
+template <class Method>
+void fillFullColumns(const MiddleRows& middle) {
+    fillMiddle<Method>(middle, 0, smallerOf(middle.fullBefore, middle.columns), 0xFF);
+    fillMiddle<Method>(middle, largerOf(middle.fullFrom, 0), middle.columns, 0xFF);
     for (int64_t x = 0; x < middle.columns; x += kBytes) {
-        if (x < middle.fullBefore || x + kBytes > middle.fullFrom) inked[x / kBytes] = 1;
+        if (x < middle.fullBefore || x + kBytes > middle.fullFrom) middle.inked[x / kBytes] = 1;
     }
 }
 
 template <class Method>
-void down(const DownPass& pass, const MiddlePlane& middle) {
-    std::memset(middle.inked, 0, static_cast<size_t>(pass.quads * middle.inkedStride));
-    passDown(
-        pass, Method::of(*pass.blur, false),
-        [&](int64_t x, int64_t y, const typename Method::Row& row) {
-            Method::storeMiddle(row, middleAt<Method>(middle, middle.inkColumn + x, y));
-        },
-        [&](int64_t x, int64_t quad, bool inked) {
-            middle.inked[quad * middle.inkedStride + (middle.inkColumn + x) / kBytes] = inked;
-        });
-    for (int64_t y = 0; y < kQuad * pass.quads; ++y)
-        fillAround<Method>(middle, pass.source.width, y);
-    for (int64_t quad = 0; quad < pass.quads; ++quad)
-        noteFullColumns(middle, middle.inked + quad * middle.inkedStride);
+void down(const PreparedBlur& blur, const TapColumns& columns, int64_t quad, const MiddleRows& middle) {
+    std::memset(middle.inked, 0, static_cast<size_t>(wholeVectors(middle.columns) / kBytes));
+    const int64_t firstStrip = middle.inkColumn / kBytes;
+    for (int64_t strip = 0; strip * kBytes < columns.width; ++strip)
+        middle.inked[firstStrip + strip] = !inkedSteps(columns, strip, quad, blur.radius).empty();
+    quadDown(Method::of(blur, false), columns, quad, blur.radius,
+             [&](int64_t strip, int j, const typename Method::Row& row) {
+                 Method::storeMiddle(row, middleAt<Method>(middle, (firstStrip + strip) * kBytes, j));
+             });
+    if (middle.fullBefore > 0 || middle.fullFrom < middle.columns) fillFullColumns<Method>(middle);
 }
 
 template <class Method>
-void downToBytes(const DownPass& pass, const BlurEnding& ending, uint8_t* out, int64_t outStride) {
-    passDown(
-        pass, Method::of(*pass.blur, ending.roundsUp),
-        [&](int64_t x, int64_t y, const typename Method::Row& row) {
-            store(out + y * outStride + x, Method::bytesOf(row) ^ ending.flip);
-        },
-        [](int64_t, int64_t, bool) {});
+void downToBytes(const PreparedBlur& blur, const TapColumns& columns, int64_t quad,
+                 const BlurRows& out) {
+    quadDown(Method::of(blur, out.ending.roundsUp), columns, quad, blur.radius,
+             [&](int64_t strip, int j, const typename Method::Row& row) {
+                 store(out.start + j * out.stride + strip * kBytes,
+                       Method::bytesOf(row) ^ out.ending.flip);
+             });
 }
 
 template <class Method>
-void copyQuad(const DownPass& pass, const MiddlePlane& middle) {
-    for (int64_t y = 0; y < kQuad; ++y)
-        fillAround<Method>(middle, pass.source.width, y);
-    for (int64_t x = 0; x < pass.source.width; x += kBytes) {
-        const Group group = Group::of(SourceStrip::of(pass.source, x), pass.top);
+void copy(const PreparedBlur&, const BlurSource& source, int64_t row, const MiddleRows& middle) {
+    for (int64_t x = 0; x < source.width; x += kBytes) {
+        const Group group = Group::of(SourceStrip::of(source, x), row);
         middle.inked[x / kBytes] = group.isInked();
-        for (int i = 0; i < kQuad; ++i)
-            Method::storeMiddle(Method::rowOf(group.rows[i]), middleAt<Method>(middle, x, i));
+        for (int j = 0; j < kQuad; ++j)
+            Method::storeMiddle(Method::rowOf(group.rows[j]), middleAt<Method>(middle, x, j));
     }
 }
 
 // --- Across -------------------------------------------------------------------------------------------
 
 /// The steps of four taps, for a vector of results from column x on, that reach an inked vector.
-VOREL_INLINE Range inkedSteps(const MiddlePlane& middle, const uint8_t* inked, int64_t x, int radius) {
+VOREL_INLINE Range inkedSteps(const MiddleRows& middle, int64_t x, int radius) {
     const int64_t firstTap = x - radius;
+    const int64_t lastTap = smallerOf(x + kBytes - 1 + radius, middle.columns - 1);
+    if (lastTap < 0) return {0, 0};
     int64_t first = largerOf(firstTap, 0) / kBytes;
-    int64_t last = smallerOf(firstTap + 2 * radius + kBytes - 1, middle.columns - 1);
-    if (last < 0) return {0, 0};
-    last /= kBytes;
-    while (first <= last && inked[first] == 0)
+    int64_t last = lastTap / kBytes;
+    while (first <= last && middle.inked[first] == 0)
         ++first;
-    while (last >= first && inked[last] == 0)
+    while (last >= first && middle.inked[last] == 0)
         --last;
     if (first > last) return {0, 0};
     // Step s reads a vector from firstTap + 4 s on.
-    const int64_t reach = first * kBytes - kBytes - firstTap;
-    return {reach < 0 ? 0 : reach / 4 + 1,
-            smallerOf(stepsOf(radius), ((last + 1) * kBytes - 1 - firstTap) / 4 + 1)};
+    const int64_t before = (first - 1) * kBytes - firstTap;
+    return {before < 0 ? 0 : before / 4 + 1,
+            smallerOf(tapSteps(radius), ((last + 1) * kBytes - 1 - firstTap) / 4 + 1)};
 }
 
 template <class Method>
-void across(const AcrossPass& pass) {
-    const Method method = Method::of(*pass.blur, pass.ending.roundsUp);
-    const MiddlePlane& middle = pass.middle;
-    const int radius = pass.blur->radius;
-    const uint8_t* const inked = middle.inked + pass.quad * middle.inkedStride;
-    for (int64_t x = pass.left; x < pass.right; x += kBytes) {
-        uint8_t* const out = pass.out + (x - pass.left);
+void across(const PreparedBlur& blur, const MiddleRows& middle, int64_t left, int64_t right,
+            const BlurRows& out) {
+    const Method method = Method::of(blur, out.ending.roundsUp);
+    for (int64_t x = left; x < right; x += kBytes) {
         const auto storeRow = [&](int j, Bytes row) {
-            store(out + j * pass.outStride, row ^ pass.ending.flip);
+            store(out.start + j * out.stride + (x - left), row ^ out.ending.flip);
         };
-        const Range steps = inkedSteps(middle, inked, x, radius);
+        const Range steps = inkedSteps(middle, x, blur.radius);
         if (steps.empty()) {
             for (int j = 0; j < kQuad; ++j)
                 storeRow(j, Bytes{});
         } else {
-            method.quadAcross(steps, middleAt<Method>(middle, 0, kQuad * pass.quad), middle.strideBytes,
-                              x - radius, storeRow);
+            method.quadAcross(steps, middleAt<Method>(middle, 0, 0), middle.strideBytes, x - blur.radius,
+                              storeRow);
         }
     }
 }
 
-// --- The choice of the method
-// -----------------------------------------------------------------------------
-
-void blurDown(const DownPass& pass, const MiddlePlane& middle) {
-    return pass.blur->isNarrow ? down<NarrowMethod>(pass, middle) : down<DotMethod>(pass, middle);
-}
-void blurDownToBytes(const DownPass& pass, const BlurEnding& ending, uint8_t* out, int64_t outStride) {
-    return pass.blur->isNarrow ? downToBytes<NarrowMethod>(pass, ending, out, outStride)
-                               : downToBytes<DotMethod>(pass, ending, out, outStride);
-}
-void copyQuadToMiddle(const DownPass& pass, const MiddlePlane& middle) {
-    return pass.blur->isNarrow ? copyQuad<NarrowMethod>(pass, middle)
-                               : copyQuad<DotMethod>(pass, middle);
-}
-void blurAcross(const AcrossPass& pass) {
-    return pass.blur->isNarrow ? across<NarrowMethod>(pass) : across<DotMethod>(pass);
-}
+// --- The table
+// --------------------------------------------------------------------------------------------
 
 void fillCells(const uint32_t* weights, int radius, uint8_t* cells) {
     const auto weightAt = [&](int64_t distance) {
@@ -526,10 +474,24 @@ void fillCells(const uint32_t* weights, int radius, uint8_t* cells) {
     }
 }
 
+/// The form of a kernel that suits the blur.
+template <auto kNarrow, auto kWide, class... Arguments>
+void chosen(const PreparedBlur& blur, Arguments... arguments) {
+    blur.isNarrow ? kNarrow(blur, arguments...) : kWide(blur, arguments...);
+}
+
 }  // namespace
 
 extern const BlurKernels kBlurKernels = {
-    kBytes, sizeof(WeightCell), fillCells, blurDown, blurDownToBytes, copyQuadToMiddle, blurAcross,
+    kBytes,
+    sizeof(WeightCell),
+    fillCells,
+    chosen<clear<NarrowMethod>, clear<DotMethod>>,
+    chosen<feed<NarrowMethod>, feed<DotMethod>>,
+    chosen<down<NarrowMethod>, down<DotMethod>>,
+    chosen<downToBytes<NarrowMethod>, downToBytes<DotMethod>>,
+    chosen<copy<NarrowMethod>, copy<DotMethod>>,
+    chosen<across<NarrowMethod>, across<DotMethod>>,
 };
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

@@ -2,37 +2,41 @@
 
 #include <cstdint>
 
+#include "core/inline.h"
+
 /// The inner loops of the blur, compiled once per level of the instruction set: one pass down the
 /// columns and one across the rows, and between them a plane in a form of the level's own.
 namespace VFontEffect::internal {
 
-/// Rows are blurred four at a time.
+/// Rows are read and blurred four at a time.
 constexpr int64_t kQuad = 4;
-/// No level's vector is wider; planes have a margin of as many pixels on both sides.
+/// Steps of four taps that together hold the taps of four neighbouring results.
+VOREL_INLINE int64_t tapSteps(int radius) {
+    return (2 * int64_t{radius} + kQuad + 3) / 4;
+}
+
+/// No level's vector is wider; rows between the passes have a margin of as many pixels on both sides.
 constexpr int64_t kWidestVector = 64;
-/// Empty groups of four rows on both sides of a strip's.
-constexpr int64_t kSpareGroups = 3;
 /// Up to this radius, and a total that fits in a byte, sums fit in 16 bits.
 constexpr int kLargestNarrowRadius = 3;
 
-/// Division by a number of up to 255 as (x + start) * multiplier >> 16 >> shift, for 16-bit x.
+/// Division by a number of 128 to 255 as (x + start) * multiplier >> 16 >> kNarrowShift, for 16-bit x.
 struct NarrowDivision {
     uint16_t start;
     uint16_t multiplier;
-    uint16_t shift;
 };
+constexpr int kNarrowShift = 7;
 
-/// A blur in the form in which a level's loops read it; without cells when memory ran out.
+/// A blur in the form in which a level's loops read it.
 struct PreparedBlur {
-    explicit operator bool() const { return cells != nullptr; }
-
     int radius;
     uint32_t total;
     float inverse;           // just above 1 / total
     const void* cells;       // the weights as the level wants them, from distance -radius on
     const uint32_t* totals;  // of the weights before each of them
-    bool isNarrow;           // whether sums fit in 16 bits, and then:
+    bool isNarrow;  // whether sums fit in 16 bits, and then, all times 2 if the total is below 128:
     uint16_t weights[kLargestNarrowRadius + 1];
+    uint16_t narrowTotal;
     NarrowDivision division;
 };
 
@@ -40,20 +44,6 @@ struct PreparedBlur {
 struct BlurEnding {
     bool roundsUp;
     uint8_t flip;
-};
-
-/// Rows between two passes, `columns` wide; what lies beyond counts as 0. The columns from `inkColumn`
-/// on come from the source, the others are 0, or 255 before column `fullBefore` and from `fullFrom` on.
-/// For every four rows and every vector of columns `inked` tells whether there is anything but 0.
-struct MiddlePlane {
-    uint8_t* start;  // of row 0, column 0
-    int64_t strideBytes;
-    int64_t columns;
-    int64_t inkColumn;  // a multiple of kWidestVector
-    int64_t fullBefore;
-    int64_t fullFrom;
-    uint8_t* inked;
-    int64_t inkedStride;
 };
 
 /// `height` rows of `width` bytes, each taken as byte ^ flip. All around them is 0.
@@ -65,30 +55,39 @@ struct BlurSource {
     uint8_t flip;
 };
 
-/// Bytes of a pixel of the middle plane and of a strip, of a narrow blur; others have 1.
-constexpr int64_t kNarrowMiddleBytes = 2;
-
-/// The pass down makes 4 * quads rows from row `top` of the source on.
-struct DownPass {
-    const PreparedBlur* blur;
-    BlurSource source;
-    int64_t top;
-    int64_t quads;
-    uint8_t* strip;  // working memory: the groups of four rows in reach, 2 + 2 * kSpareGroups more,
-                     // each of a vector's width, and 4 bytes for each of them
+/// What the pass down reads: groups of four rows in a form of the level's own, strip by strip, each
+/// strip as wide as a vector. Groups are counted from that of the uppermost taps of the first results
+/// on.
+struct TapColumns {
+    uint8_t* groups;      // of strip 0, from group `firstGroup` on
+    int64_t stripStride;  // bytes
+    int64_t firstGroup;
+    int64_t width;
+    int32_t* firstInked;  // for each strip the first and the last group that has anything but 0
+    int32_t* lastInked;
 };
 
-/// The pass across makes the columns `left` to `right` - 1 of four rows of the middle plane, and writes
-/// whole vectors: up to kWidestVector - 1 bytes too many in each row.
-struct AcrossPass {
-    const PreparedBlur* blur;
-    MiddlePlane middle;
-    int64_t quad;
-    int64_t left;
-    int64_t right;
+/// Four rows between the passes, `columns` wide; what lies beyond counts as 0. The columns from
+/// `inkColumn` on are those of the pass before, the others are 0, or 255 before column `fullBefore` and
+/// from `fullFrom` on. For every vector of columns `inked` tells whether there is anything but 0.
+struct MiddleRows {
+    uint8_t* start;  // of row 0, column 0
+    int64_t strideBytes;
+    int64_t columns;
+    int64_t inkColumn;  // a multiple of kWidestVector
+    int64_t fullBefore;
+    int64_t fullFrom;
+    uint8_t* inked;
+};
+
+/// Bytes of a pixel in the taps of a narrow blur and between its passes; others have 1.
+constexpr int64_t kNarrowPixelBytes = 2;
+
+/// Plain rows of results. They are written in whole vectors: up to kWidestVector - 1 bytes too many.
+struct BlurRows {
+    uint8_t* start;
+    int64_t stride;
     BlurEnding ending;
-    uint8_t* out;
-    int64_t outStride;
 };
 
 /// Cells of zeros before and behind those of the weights.
@@ -101,13 +100,26 @@ struct BlurKernels {
     int64_t cellBytes;
     /// Makes the cells of the weights at distances 0 to radius and of the zeros around them.
     void (*fillCells)(const uint32_t* weights, int radius, uint8_t* cells);
-    /// From the source into the middle plane.
-    void (*down)(const DownPass& pass, const MiddlePlane& middle);
-    /// From the source, or back into it, as plain bytes; writes whole vectors like the pass across.
-    void (*downToBytes)(const DownPass& pass, const BlurEnding& ending, uint8_t* out, int64_t outStride);
-    /// The source's rows from `top` on as they are, into the four rows of the middle plane.
-    void (*copyQuad)(const DownPass& pass, const MiddlePlane& middle);
-    void (*across)(const AcrossPass& pass);
+
+    /// Fills rows between the passes, with their margins, with 0: once, before the first quad.
+    void (*clear)(const PreparedBlur& blur, const MiddleRows& middle);
+
+    /// Stores the source's rows from `row` on as a group.
+    void (*feed)(const PreparedBlur& blur, const BlurSource& source, int64_t row,
+                 const TapColumns& columns, int64_t group);
+    /// The pass down, for the four results whose uppermost taps are in the group `quad`: rounded down,
+    /// for the pass across, or as plain bytes.
+    void (*down)(const PreparedBlur& blur, const TapColumns& columns, int64_t quad,
+                 const MiddleRows& middle);
+    void (*downToBytes)(const PreparedBlur& blur, const TapColumns& columns, int64_t quad,
+                        const BlurRows& out);
+
+    /// The source's rows from `row` on as they are, for the pass across.
+    void (*copy)(const PreparedBlur& blur, const BlurSource& source, int64_t row,
+                 const MiddleRows& middle);
+    /// The pass across, for the columns `left` to `right` - 1.
+    void (*across)(const PreparedBlur& blur, const MiddleRows& middle, int64_t left, int64_t right,
+                   const BlurRows& out);
 };
 
 /// The kernels of the chosen level.

@@ -83,7 +83,7 @@ Growth::Growth(int64_t width, int64_t height)
       mHeight(height),
       mStride(kGrowthMargin + (width + kGrowthMargin - 1) / kGrowthMargin * kGrowthMargin),
       mPlaneBytes(mStride * (height + 2) + 2 * kGrowthMargin),
-      mPlanes(PixelBuffer<uint8_t>::uninitialised(mPlaneBytes, 2)),
+      mPlanes(mPlaneBytes, 2),
       mTiles(PixelBuffer<uint8_t>::uninitialised(growthTileBytes(width, height))) {}
 
 uint8_t* Growth::rowOf(int plane, int64_t y) {

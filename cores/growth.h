@@ -2,6 +2,7 @@
 
 #include <cstdint>
 
+#include "core/line_buffer.h"
 #include "core/pixel_buffer.h"
 #include "cores/blur_kernels.h"
 
@@ -34,7 +35,7 @@ class Growth {
     int64_t mHeight;
     int64_t mStride;
     int64_t mPlaneBytes;
-    PixelBuffer<uint8_t> mPlanes;
+    LineBuffer mPlanes;
     PixelBuffer<uint8_t> mTiles;
     int mCurrent = 0;
 };

@@ -111,14 +111,6 @@ class Tiles {
     uint8_t* mNext;
 };
 
-/// Bytes of all ones where a vector from column x on lies before column `end`.
-VOREL_INLINE Bytes insideOf(int64_t x, int64_t end) {
-    if (end - x >= kBytes) return ~Bytes{};
-    uint8_t ones[kBytes] = {};
-    std::memset(ones, 0xFF, static_cast<size_t>(end - x));
-    return load<Bytes>(ones);
-}
-
 /// Grows a tile by one pass and tells whether it changed.
 bool growTile(const GrowthJob& job, int from, int64_t left, int64_t top) {
     const int64_t right = left + kTileColumns < job.width ? left + kTileColumns : job.width;
@@ -126,7 +118,7 @@ bool growTile(const GrowthJob& job, int from, int64_t left, int64_t top) {
     Bytes changes = {};
     for (int64_t x = left; x < right; x += kBytes) {
         const int64_t at = top * job.stride + x;
-        const Bytes inside = insideOf(x, job.width);
+        const Bytes inside = firstBytes(job.width - x < kBytes ? job.width - x : int64_t{kBytes});
         Column column = {job.planes[from] + at, job.planes[1 - from] + at, job.stride, inside,
                          spread<Bytes>(job.behind) & ~inside};
         column.grow(rows);
