@@ -17,6 +17,17 @@ struct Clip {
     int64_t height() const { return bottom - top; }
 };
 
+inline Clip common(const Clip& a, const Clip& b) {
+    return {std::max(a.left, b.left), std::max(a.top, b.top), std::min(a.right, b.right),
+            std::min(a.bottom, b.bottom)};
+}
+inline Clip grown(const Clip& clip, int64_t pixels) {
+    return {clip.left - pixels, clip.top - pixels, clip.right + pixels, clip.bottom + pixels};
+}
+inline Clip moved(const Clip& clip, int64_t dx, int64_t dy) {
+    return {clip.left + dx, clip.top + dy, clip.right + dx, clip.bottom + dy};
+}
+
 inline Clip clipPlacement(int x, int y, int64_t width, int64_t height, int64_t targetWidth,
                           int64_t targetHeight) {
     return {std::max<int64_t>(x, 0), std::max<int64_t>(y, 0), std::min(x + width, targetWidth),

@@ -61,6 +61,21 @@ VOREL_INLINE V spread(T value) {
     return V{} + value;
 }
 
+/// All ones in the first `count` bytes, 0 to kBytes of them.
+VOREL_INLINE Bytes firstBytes(int64_t count) {
+    Bytes lanes;
+    for (int i = 0; i < kBytes; ++i)
+        lanes[i] = static_cast<uint8_t>(i);
+    return as<Bytes>(lanes < spread<Bytes>(static_cast<uint8_t>(count)));
+}
+
+/// The first `count` bytes of a vector, zeros after them.
+VOREL_INLINE Bytes loadCopied(const uint8_t* from, int64_t count) {
+    uint8_t bytes[kBytes] = {};
+    std::memcpy(bytes, from, static_cast<size_t>(count));
+    return load<Bytes>(bytes);
+}
+
 template <class V>
 VOREL_INLINE V larger(V a, V b) {
     return a > b ? a : b;
@@ -81,12 +96,36 @@ VOREL_INLINE V smaller(V a, V b) {
 //   endsSwapped    bytes 0 1 2 3 of each word as 2 1 0 3 (not on NEON)
 //   toInt          as core/numeric.h converts: toward zero, saturating, NaN to 0
 //   squareRoot     correctly rounded
-//   gathered       the words of a table at the given indices
+//   gathered       the words of a table at the given indices, kWords of them, in a vector or in bytes
+//   loadFirst      1 to kBytes bytes of memory, zeros after them
+//   widenedLow, widenedHigh   the first and the second half of the bytes, each byte in a half
+//   narrowed       halves of at most 255 as bytes: those of the first vector, then of the second
+//   interleavedLow, interleavedHigh   the lanes of the two vectors in turn, from their lower and from
+//                  their upper ends; AVX does so in each 128 bits by itself
+//   packed         lanes of at most 255 in half the width, as they were before interleaving
+//   pairSums       of each two neighbouring bytes
+//   quarters       a quarter of each half, at most 255, from the two vectors in turn
+//
+// and products of taps, four to a word. `addDots<i>(sums, taps, weights)` adds to each word its four
+// taps, each times its weight, the i-th four weights (0..3) of the string that `weights` were loaded
+// from. A string is an array of cells, one for each tap, which `cellOf` makes from the plain weights
+// (at most 128) from there on. Taps are stored as tap ^ kTapBias: the sum is then too small by
+// kTapBias times the total of the weights.
 
 #if !defined(VOREL_SCALAR) && defined(__x86_64__)
 /// x86 converts what does not fit to the lowest integer: made the highest above the range, 0 for NaN.
 VOREL_INLINE Integers saturated(Floats value, Integers converted) {
     return (converted ^ (value >= 2147483648.0F)) & (value == value);
+}
+#endif
+
+#if !defined(VOREL_SCALAR) && defined(__x86_64__)
+VOREL_INLINE Bytes quartersInTurn(Halves even, Halves odd) {
+    using SignedHalves = int16_t __attribute__((vector_size(kBytes)));
+    const auto most = spread<SignedHalves>(int16_t{1023});
+    const auto low = as<Halves>(smaller(as<SignedHalves>(even), most));
+    const auto high = as<Halves>(smaller(as<SignedHalves>(odd), most));
+    return as<Bytes>((low >> 2) | (high << 6 & 0xFF00));
 }
 #endif
 
@@ -127,6 +166,67 @@ VOREL_INLINE Floats squareRoot(Floats v) {
 }
 VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
     return Words{table[indices[0]]};
+}
+VOREL_INLINE Words gathered(const uint32_t* table, const uint8_t* indices) {
+    return Words{table[*indices]};
+}
+
+VOREL_INLINE Bytes loadFirst(const uint8_t* from, int64_t count) {
+    return loadCopied(from, count);
+}
+VOREL_INLINE Halves widenedLow(Bytes v) {
+    return Halves{v[0], v[1]};
+}
+VOREL_INLINE Halves widenedHigh(Bytes v) {
+    return Halves{v[2], v[3]};
+}
+VOREL_INLINE Bytes narrowed(Halves a, Halves b) {
+    return __builtin_convertvector(__builtin_shufflevector(a, b, 0, 1, 2, 3), Bytes);
+}
+VOREL_INLINE Bytes interleavedLow(Bytes a, Bytes b) {
+    return Bytes{a[0], b[0], a[1], b[1]};
+}
+VOREL_INLINE Bytes interleavedHigh(Bytes a, Bytes b) {
+    return Bytes{a[2], b[2], a[3], b[3]};
+}
+VOREL_INLINE Halves interleavedLow(Halves a, Halves b) {
+    return Halves{a[0], b[0]};
+}
+VOREL_INLINE Halves interleavedHigh(Halves a, Halves b) {
+    return Halves{a[1], b[1]};
+}
+VOREL_INLINE Halves packed(Words a, Words b) {
+    return as<Halves>(a | b << 16);
+}
+VOREL_INLINE Bytes packed(Halves a, Halves b) {
+    return narrowed(a, b);
+}
+VOREL_INLINE Halves pairSums(Bytes v) {
+    return (as<Halves>(v) & 0x00FF) + (as<Halves>(v) >> 8);
+}
+VOREL_INLINE Bytes quarters(Halves even, Halves odd) {
+    const auto quarter = [](uint32_t sum) { return static_cast<uint8_t>(sum > 1023 ? 255 : sum >> 2); };
+    return Bytes{quarter(even[0]), quarter(odd[0]), quarter(even[1]), quarter(odd[1])};
+}
+
+constexpr uint8_t kTapBias = 0;
+using Taps = Bytes;
+using WeightCell = uint8_t;
+using Weights = const WeightCell*;
+
+VOREL_INLINE Taps tapsOf(Bytes v) {
+    return v;
+}
+VOREL_INLINE WeightCell cellOf(const uint8_t* weights) {
+    return *weights;
+}
+VOREL_INLINE Weights weightsAt(const WeightCell* cells) {
+    return cells;
+}
+template <int kFour>
+VOREL_INLINE Words addDots(Words sums, Taps taps, Weights weights) {
+    const uint8_t* const w = weights + 4 * kFour;
+    return sums + (w[0] * taps[0] + w[1] * taps[1] + w[2] * taps[2] + w[3] * taps[3]);
 }
 
 #elif defined(__AVX512BW__)
@@ -171,6 +271,69 @@ VOREL_INLINE Floats squareRoot(Floats v) {
 }
 VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
     return as<Words>(_mm512_i32gather_epi32(as<__m512i>(indices), table, 4));
+}
+VOREL_INLINE Words gathered(const uint32_t* table, const uint8_t* indices) {
+    const __m128i bytes = _mm_loadu_si128(reinterpret_cast<const __m128i*>(indices));
+    return gathered(table, as<Integers>(_mm512_cvtepu8_epi32(bytes)));
+}
+
+VOREL_INLINE Bytes loadFirst(const uint8_t* from, int64_t count) {
+    const uint64_t lanes = ~uint64_t{0} >> (64 - count);
+    return as<Bytes>(_mm512_maskz_loadu_epi8(lanes, from));
+}
+VOREL_INLINE Halves widenedLow(Bytes v) {
+    return as<Halves>(_mm512_cvtepu8_epi16(_mm512_castsi512_si256(as<__m512i>(v))));
+}
+VOREL_INLINE Halves widenedHigh(Bytes v) {
+    return as<Halves>(_mm512_cvtepu8_epi16(_mm512_extracti64x4_epi64(as<__m512i>(v), 1)));
+}
+VOREL_INLINE Bytes interleavedLow(Bytes a, Bytes b) {
+    return as<Bytes>(_mm512_unpacklo_epi8(as<__m512i>(a), as<__m512i>(b)));
+}
+VOREL_INLINE Bytes interleavedHigh(Bytes a, Bytes b) {
+    return as<Bytes>(_mm512_unpackhi_epi8(as<__m512i>(a), as<__m512i>(b)));
+}
+VOREL_INLINE Halves interleavedLow(Halves a, Halves b) {
+    return as<Halves>(_mm512_unpacklo_epi16(as<__m512i>(a), as<__m512i>(b)));
+}
+VOREL_INLINE Halves interleavedHigh(Halves a, Halves b) {
+    return as<Halves>(_mm512_unpackhi_epi16(as<__m512i>(a), as<__m512i>(b)));
+}
+VOREL_INLINE Halves packed(Words a, Words b) {
+    return as<Halves>(_mm512_packs_epi32(as<__m512i>(a), as<__m512i>(b)));
+}
+VOREL_INLINE Bytes packed(Halves a, Halves b) {
+    return as<Bytes>(_mm512_packus_epi16(as<__m512i>(a), as<__m512i>(b)));
+}
+VOREL_INLINE Bytes narrowed(Halves a, Halves b) {
+    return as<Bytes>(
+        _mm512_permutexvar_epi64(_mm512_setr_epi64(0, 2, 4, 6, 1, 3, 5, 7), as<__m512i>(packed(a, b))));
+}
+VOREL_INLINE Halves pairSums(Bytes v) {
+    return as<Halves>(_mm512_maddubs_epi16(as<__m512i>(v), _mm512_set1_epi8(1)));
+}
+VOREL_INLINE Bytes quarters(Halves even, Halves odd) {
+    return quartersInTurn(even, odd);
+}
+
+constexpr uint8_t kTapBias = 0x80;
+using Taps = Bytes;
+using WeightCell = uint8_t;
+using Weights = const WeightCell*;
+
+VOREL_INLINE Taps tapsOf(Bytes v) {
+    return v;
+}
+VOREL_INLINE WeightCell cellOf(const uint8_t* weights) {
+    return *weights;
+}
+VOREL_INLINE Weights weightsAt(const WeightCell* cells) {
+    return cells;
+}
+template <int kFour>
+VOREL_INLINE Words addDots(Words sums, Taps taps, Weights weights) {
+    const __m512i four = _mm512_set1_epi32(load<int>(weights + 4 * kFour));
+    return as<Words>(_mm512_dpbusd_epi32(as<__m512i>(sums), four, as<__m512i>(taps)));
 }
 
 #elif defined(__AVX2__)
@@ -217,6 +380,69 @@ VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
     return as<Words>(
         _mm256_i32gather_epi32(reinterpret_cast<const int*>(table), as<__m256i>(indices), 4));
 }
+VOREL_INLINE Words gathered(const uint32_t* table, const uint8_t* indices) {
+    const __m128i bytes = _mm_loadl_epi64(reinterpret_cast<const __m128i*>(indices));
+    return gathered(table, as<Integers>(_mm256_cvtepu8_epi32(bytes)));
+}
+
+VOREL_INLINE Bytes loadFirst(const uint8_t* from, int64_t count) {
+    return loadCopied(from, count);
+}
+VOREL_INLINE Halves widenedLow(Bytes v) {
+    return as<Halves>(_mm256_cvtepu8_epi16(_mm256_castsi256_si128(as<__m256i>(v))));
+}
+VOREL_INLINE Halves widenedHigh(Bytes v) {
+    return as<Halves>(_mm256_cvtepu8_epi16(_mm256_extracti128_si256(as<__m256i>(v), 1)));
+}
+VOREL_INLINE Bytes interleavedLow(Bytes a, Bytes b) {
+    return as<Bytes>(_mm256_unpacklo_epi8(as<__m256i>(a), as<__m256i>(b)));
+}
+VOREL_INLINE Bytes interleavedHigh(Bytes a, Bytes b) {
+    return as<Bytes>(_mm256_unpackhi_epi8(as<__m256i>(a), as<__m256i>(b)));
+}
+VOREL_INLINE Halves interleavedLow(Halves a, Halves b) {
+    return as<Halves>(_mm256_unpacklo_epi16(as<__m256i>(a), as<__m256i>(b)));
+}
+VOREL_INLINE Halves interleavedHigh(Halves a, Halves b) {
+    return as<Halves>(_mm256_unpackhi_epi16(as<__m256i>(a), as<__m256i>(b)));
+}
+VOREL_INLINE Halves packed(Words a, Words b) {
+    return as<Halves>(_mm256_packs_epi32(as<__m256i>(a), as<__m256i>(b)));
+}
+VOREL_INLINE Bytes packed(Halves a, Halves b) {
+    return as<Bytes>(_mm256_packus_epi16(as<__m256i>(a), as<__m256i>(b)));
+}
+VOREL_INLINE Bytes narrowed(Halves a, Halves b) {
+    return as<Bytes>(_mm256_permute4x64_epi64(as<__m256i>(packed(a, b)), _MM_SHUFFLE(3, 1, 2, 0)));
+}
+VOREL_INLINE Halves pairSums(Bytes v) {
+    return as<Halves>(_mm256_maddubs_epi16(as<__m256i>(v), _mm256_set1_epi8(1)));
+}
+VOREL_INLINE Bytes quarters(Halves even, Halves odd) {
+    return quartersInTurn(even, odd);
+}
+
+constexpr uint8_t kTapBias = 0x80;
+using Taps = Bytes;
+using WeightCell = uint8_t;
+using Weights = const WeightCell*;
+
+VOREL_INLINE Taps tapsOf(Bytes v) {
+    return v;
+}
+VOREL_INLINE WeightCell cellOf(const uint8_t* weights) {
+    return *weights;
+}
+VOREL_INLINE Weights weightsAt(const WeightCell* cells) {
+    return cells;
+}
+/// The sums of two products, each up to 256 * -128 or 256 * 127, just fit in 16 bits.
+template <int kFour>
+VOREL_INLINE Words addDots(Words sums, Taps taps, Weights weights) {
+    const __m256i four = _mm256_set1_epi32(load<int>(weights + 4 * kFour));
+    const __m256i pairs = _mm256_maddubs_epi16(four, as<__m256i>(taps));
+    return sums + as<Words>(_mm256_madd_epi16(pairs, _mm256_set1_epi16(1)));
+}
 
 #elif defined(__x86_64__)
 
@@ -261,8 +487,75 @@ VOREL_INLINE Floats squareRoot(Floats v) {
 VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
     return Words{table[indices[0]], table[indices[1]], table[indices[2]], table[indices[3]]};
 }
+VOREL_INLINE Words gathered(const uint32_t* table, const uint8_t* indices) {
+    return Words{table[indices[0]], table[indices[1]], table[indices[2]], table[indices[3]]};
+}
 
-#else
+VOREL_INLINE Bytes loadFirst(const uint8_t* from, int64_t count) {
+    return loadCopied(from, count);
+}
+VOREL_INLINE Halves widenedLow(Bytes v) {
+    return as<Halves>(_mm_unpacklo_epi8(as<__m128i>(v), _mm_setzero_si128()));
+}
+VOREL_INLINE Halves widenedHigh(Bytes v) {
+    return as<Halves>(_mm_unpackhi_epi8(as<__m128i>(v), _mm_setzero_si128()));
+}
+VOREL_INLINE Bytes interleavedLow(Bytes a, Bytes b) {
+    return as<Bytes>(_mm_unpacklo_epi8(as<__m128i>(a), as<__m128i>(b)));
+}
+VOREL_INLINE Bytes interleavedHigh(Bytes a, Bytes b) {
+    return as<Bytes>(_mm_unpackhi_epi8(as<__m128i>(a), as<__m128i>(b)));
+}
+VOREL_INLINE Halves interleavedLow(Halves a, Halves b) {
+    return as<Halves>(_mm_unpacklo_epi16(as<__m128i>(a), as<__m128i>(b)));
+}
+VOREL_INLINE Halves interleavedHigh(Halves a, Halves b) {
+    return as<Halves>(_mm_unpackhi_epi16(as<__m128i>(a), as<__m128i>(b)));
+}
+VOREL_INLINE Halves packed(Words a, Words b) {
+    return as<Halves>(_mm_packs_epi32(as<__m128i>(a), as<__m128i>(b)));
+}
+VOREL_INLINE Bytes packed(Halves a, Halves b) {
+    return as<Bytes>(_mm_packus_epi16(as<__m128i>(a), as<__m128i>(b)));
+}
+VOREL_INLINE Bytes narrowed(Halves a, Halves b) {
+    return packed(a, b);
+}
+VOREL_INLINE Halves pairSums(Bytes v) {
+    return (as<Halves>(v) & 0x00FF) + (as<Halves>(v) >> 8);
+}
+VOREL_INLINE Bytes quarters(Halves even, Halves odd) {
+    return quartersInTurn(even, odd);
+}
+
+constexpr uint8_t kTapBias = 0;
+/// Taps 0 and 2 of each word, and taps 1 and 3. The cell of a tap holds its weight and that of the next
+/// but one.
+struct Taps {
+    Halves even;
+    Halves odd;
+};
+using WeightCell = Halves;
+using Weights = const WeightCell*;
+
+VOREL_INLINE Taps tapsOf(Bytes v) {
+    return {as<Halves>(v) & 0x00FF, as<Halves>(v) >> 8};
+}
+VOREL_INLINE WeightCell cellOf(const uint8_t* weights) {
+    return as<Halves>(spread<Words>(weights[0] | uint32_t{weights[2]} << 16));
+}
+VOREL_INLINE Weights weightsAt(const WeightCell* cells) {
+    return cells;
+}
+template <int kFour>
+VOREL_INLINE Words addDots(Words sums, Taps taps, Weights weights) {
+    const auto even = as<__m128i>(weights[4 * kFour]);
+    const auto odd = as<__m128i>(weights[4 * kFour + 1]);
+    return sums + as<Words>(_mm_madd_epi16(as<__m128i>(taps.even), even)) +
+           as<Words>(_mm_madd_epi16(as<__m128i>(taps.odd), odd));
+}
+
+#elif defined(__aarch64__)
 
 VOREL_INLINE Bytes addSaturated(Bytes a, Bytes b) {
     return as<Bytes>(vqaddq_u8(as<uint8x16_t>(a), as<uint8x16_t>(b)));
@@ -293,7 +586,87 @@ VOREL_INLINE Floats squareRoot(Floats v) {
 VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
     return Words{table[indices[0]], table[indices[1]], table[indices[2]], table[indices[3]]};
 }
+VOREL_INLINE Words gathered(const uint32_t* table, const uint8_t* indices) {
+    return Words{table[indices[0]], table[indices[1]], table[indices[2]], table[indices[3]]};
+}
 
+VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
+    const uint32x4_t low = vmull_u16(vget_low_u16(as<uint16x8_t>(a)), vget_low_u16(as<uint16x8_t>(b)));
+    const uint32x4_t high = vmull_high_u16(as<uint16x8_t>(a), as<uint16x8_t>(b));
+    return as<Halves>(vuzp2q_u16(vreinterpretq_u16_u32(low), vreinterpretq_u16_u32(high)));
+}
+VOREL_INLINE Bytes loadFirst(const uint8_t* from, int64_t count) {
+    return loadCopied(from, count);
+}
+VOREL_INLINE Halves widenedLow(Bytes v) {
+    return as<Halves>(vmovl_u8(vget_low_u8(as<uint8x16_t>(v))));
+}
+VOREL_INLINE Halves widenedHigh(Bytes v) {
+    return as<Halves>(vmovl_high_u8(as<uint8x16_t>(v)));
+}
+VOREL_INLINE Bytes interleavedLow(Bytes a, Bytes b) {
+    return as<Bytes>(vzip1q_u8(as<uint8x16_t>(a), as<uint8x16_t>(b)));
+}
+VOREL_INLINE Bytes interleavedHigh(Bytes a, Bytes b) {
+    return as<Bytes>(vzip2q_u8(as<uint8x16_t>(a), as<uint8x16_t>(b)));
+}
+VOREL_INLINE Halves interleavedLow(Halves a, Halves b) {
+    return as<Halves>(vzip1q_u16(as<uint16x8_t>(a), as<uint16x8_t>(b)));
+}
+VOREL_INLINE Halves interleavedHigh(Halves a, Halves b) {
+    return as<Halves>(vzip2q_u16(as<uint16x8_t>(a), as<uint16x8_t>(b)));
+}
+VOREL_INLINE Halves packed(Words a, Words b) {
+    return as<Halves>(vuzp1q_u16(as<uint16x8_t>(a), as<uint16x8_t>(b)));
+}
+VOREL_INLINE Bytes packed(Halves a, Halves b) {
+    return as<Bytes>(vuzp1q_u8(as<uint8x16_t>(a), as<uint8x16_t>(b)));
+}
+VOREL_INLINE Bytes narrowed(Halves a, Halves b) {
+    return packed(a, b);
+}
+VOREL_INLINE Halves pairSums(Bytes v) {
+    return as<Halves>(vpaddlq_u8(as<uint8x16_t>(v)));
+}
+VOREL_INLINE Bytes quarters(Halves even, Halves odd) {
+    const auto raised = [](Halves sums) {
+        return vreinterpretq_u8_u16(vqshlq_n_u16(as<uint16x8_t>(sums), 6));
+    };
+    return as<Bytes>(vtrn2q_u8(raised(even), raised(odd)));
+}
+
+constexpr uint8_t kTapBias = 0;
+using Taps = Bytes;
+using WeightCell = uint8_t;
+using Weights = uint8x16_t;
+
+VOREL_INLINE Taps tapsOf(Bytes v) {
+    return v;
+}
+VOREL_INLINE WeightCell cellOf(const uint8_t* weights) {
+    return *weights;
+}
+VOREL_INLINE Weights weightsAt(const WeightCell* cells) {
+    return vld1q_u8(cells);
+}
+#if defined(__ARM_FEATURE_DOTPROD)
+template <int kFour>
+VOREL_INLINE Words addDots(Words sums, Taps taps, Weights weights) {
+    return as<Words>(vdotq_laneq_u32(as<uint32x4_t>(sums), as<uint8x16_t>(taps), weights, kFour));
+}
+#else
+/// The sums of two products, of weights of 256 together, just fit in 16 bits.
+template <int kFour>
+VOREL_INLINE Words addDots(Words sums, Taps taps, Weights weights) {
+    const auto four = vreinterpretq_u8_u32(vdupq_laneq_u32(vreinterpretq_u32_u8(weights), kFour));
+    const uint16x8_t low = vmull_u8(vget_low_u8(as<uint8x16_t>(taps)), vget_low_u8(four));
+    const uint16x8_t high = vmull_high_u8(as<uint8x16_t>(taps), four);
+    return as<Words>(vpadalq_u16(as<uint32x4_t>(sums), vpaddq_u16(low, high)));
+}
+#endif
+
+#else
+#error "there is no such level on this machine"
 #endif
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

@@ -62,6 +62,11 @@ VOREL_INLINE Amounts alphaOf(const Pixels& p) {
 VOREL_INLINE Amounts inverse(Amounts a) {
     return vmvnq_u8(a);
 }
+/// Whether all pixels are zeros.
+VOREL_INLINE bool isClear(const Pixels& p) {
+    const uint8x16_t* const c = p.channels.val;
+    return allZero(as<Bytes>(vorrq_u8(vorrq_u8(c[0], c[1]), vorrq_u8(c[2], c[3]))));
+}
 VOREL_INLINE Where isZero(Amounts a) {
     return vceqzq_u8(a);
 }
@@ -167,6 +172,10 @@ VOREL_INLINE Amounts alphaOf(const Pixels& p) {
 }
 VOREL_INLINE Amounts inverse(Amounts a) {
     return {a.halves ^ kEvenByte};
+}
+/// Whether all pixels are zeros.
+VOREL_INLINE bool isClear(const Pixels& p) {
+    return allZero(p.bytes);
 }
 
 #if !defined(VOREL_SCALAR) && defined(__AVX512BW__)

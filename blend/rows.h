@@ -31,9 +31,17 @@ struct Place {
     VOREL_INLINE const uint8_t* mask() const { return row.maskStart + x; }
 };
 
+/// Whether `kCount` bytes are 0.
+template <int64_t kCount>
+VOREL_INLINE bool allZero(const uint8_t* bytes) {
+    if (kCount == kBytes) return allZero(load<Bytes>(bytes));
+    static constexpr uint8_t kNone[kCount] = {};
+    return std::memcmp(bytes, kNone, kCount) == 0;
+}
+
 /// Whether the mask is 0 for kBytes pixels.
 VOREL_INLINE bool hasEmptyMask(const Place& place) {
-    return allZero(load<Bytes>(place.mask()));
+    return allZero<kBytes>(place.mask());
 }
 
 /// Whether the mask is full for kBytes pixels.

@@ -14,6 +14,7 @@ enum class Empty { keeps, clears, copiesImage };
 /// `source` under the destination, in the pixels that are `painted`; elsewhere source must be 0. Over a
 /// transparent destination it takes the pixel whole, whatever colour channels stood there.
 VOREL_INLINE Pixels under(const Pixels& d, const Pixels& source, Where painted) {
+    if (isClear(d)) return source;
     const Amounts alpha = alphaOf(d);
     const Pixels base = cleared(isZero(alpha) & painted, d);
     return added(base, scaled(source, inverse(alpha)));

@@ -1,17 +1,20 @@
 # One object library of the inner loops for each level, from the plainest to the best: the names and
 # their order are those of core/cpu_level.h.
-if(CMAKE_SYSTEM_PROCESSOR MATCHES "^(x86_64|AMD64|amd64)$")
+check_cxx_symbol_exists(__x86_64__ cstddef VOREL_FOR_X86_64)
+check_cxx_symbol_exists(__aarch64__ cstddef VOREL_FOR_AARCH64)
+if(VOREL_FOR_X86_64)
   set(VOREL_LEVELS scalar sse2 avx2 avx512)
-elseif(CMAKE_SYSTEM_PROCESSOR MATCHES "^(aarch64|arm64)$")
+elseif(VOREL_FOR_AARCH64)
   set(VOREL_LEVELS scalar neon dotprod)
 else()
   set(VOREL_LEVELS scalar)
 endif()
 
-set(VOREL_FLAGS_scalar -DVOREL_SCALAR)
+# What no processor of today runs may be slow, but not large.
+set(VOREL_FLAGS_scalar -DVOREL_SCALAR $<$<CONFIG:Release>:-Os>)
 set(VOREL_FLAGS_avx2 -mavx2)
 set(VOREL_FLAGS_avx512 -mavx512f -mavx512bw -mavx512dq -mavx512vl -mavx512vnni)
-set(VOREL_FLAGS_dotprod -march=armv8-a+dotprod)
+set(VOREL_FLAGS_dotprod -march=armv8.2-a+dotprod)
 
 foreach(level IN LISTS VOREL_LEVELS)
   add_library(voreleffect_${level} OBJECT ${VOREL_LEVEL_SOURCES})

@@ -1,3 +1,6 @@
+include(CheckCXXSymbolExists)
+check_cxx_symbol_exists(__i386__ cstddef VOREL_FOR_I386)
+
 # How every source of the library is compiled.
 function(vorel_objects target)
   target_include_directories(${target} PRIVATE
@@ -5,6 +8,12 @@ function(vorel_objects target)
   target_compile_features(${target} PRIVATE cxx_std_17)
   # Without contraction no product and sum fuse into one rounding: every CPU paints the same bytes.
   target_compile_options(${target} PRIVATE -fno-exceptions -ffp-contract=off)
+  if(VOREL_FOR_I386)
+    # The old floating-point registers of 32-bit x86 would keep more than single precision.
+    target_compile_options(${target} PRIVATE -msse2 -mfpmath=sse)
+  endif()
+  # Beyond this level compilers unroll loops that are vectors already: half the size again, no speed.
+  target_compile_options(${target} PRIVATE $<$<CONFIG:Release>:-O2>)
   vorel_warnings(${target})
   set_target_properties(${target} PROPERTIES
     CXX_EXTENSIONS OFF

@@ -1,7 +1,5 @@
 #pragma once
 
-#include <cstddef>
-
 /// Levels of the instruction set. The sources of the inner loops are compiled once for each level of
 /// the machine's kind, each time in a namespace of the level's name (VOREL_LEVEL), and picked when the
 /// process runs. All levels give the same bytes.

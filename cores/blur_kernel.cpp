@@ -1,3 +1,5 @@
+#include <algorithm>
+#include <cmath>
 #include <cstdint>
 
 #include "core/numeric.h"
@@ -36,6 +38,24 @@ BlurKernel glowKernel(int radius) {
     return makeKernel(radius, kGlowScale, [](float tap) {
         return toInt(static_cast<double>(tap * static_cast<float>(kGlowScale)) + 0.5);
     });
+}
+
+float inverseAbove(uint32_t total) {
+    const float nearest = 1.0F / static_cast<float>(total);
+    // A float times a whole number of 16 bits is exact in double precision.
+    return static_cast<double>(nearest) * total >= 1.0 ? nearest : std::nextafter(nearest, 1.0F);
+}
+
+// Of the two whole numbers next to 2^23 / d one is close enough. The larger one, m, if it is too large
+// by at most 2^7 / d: x * m / 2^23 then exceeds x / d by less than 1 / d, as x is below 2^16. Else the
+// smaller one, and x + 1 makes up for it.
+NarrowDivision narrowDivision(uint32_t divisor) {
+    constexpr uint32_t kScale = 0x10000U << kNarrowShift;
+    const uint32_t smaller = kScale / divisor;
+    const uint32_t larger = smaller + 1;
+    if (larger <= 0xFFFF && larger * divisor - kScale <= 1U << kNarrowShift)
+        return {0, static_cast<uint16_t>(larger)};
+    return {1, static_cast<uint16_t>(std::min(smaller, 0xFFFFU))};
 }
 
 }  // namespace VFontEffect::internal

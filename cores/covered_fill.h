@@ -1,11 +1,9 @@
 #pragma once
 
-#include <algorithm>
 #include <cstdint>
 
 #include "blend/clip.h"
 #include "blend/job.h"
-#include "core/numeric.h"
 #include "cores/fill_kernels.h"
 #include "cores/paint_input.h"
 
@@ -15,18 +13,18 @@ namespace VFontEffect::internal {
 constexpr float kSmallestScale = 0.1F;
 
 /// Fills the covered pixels of a box, beneath what the destination holds: `fill(job)` paints the part of
-/// the box that lies on the destination, if any. Deliberate: coverage gates a pixel, it does not scale
-/// its colour.
+/// the box that lies on the destination, if any. That part starts at the box's corner, for a box lies
+/// inside its mask. Deliberate: coverage gates a pixel, it does not scale its colour.
 template <class Fill>
 void fillCovered(const CoverageBox& box, const VFBitmap* destination, Fill fill) {
     const ColourView target = ColourView::of(destination);
     if (!target) return;
-    const Clip clip = clipPlacement(saturateToInt(box.left), saturateToInt(box.top), box.width,
+    const Clip clip = clipPlacement(static_cast<int>(box.left), static_cast<int>(box.top), box.width,
                                     box.height, target.width, target.height);
     if (clip.empty()) return;
-    FillJob job = {jobOn(target, clip), clip.left - box.left, clip.top - box.top};
-    job.blend.mask = box.row(job.top) + job.left;
-    job.blend.maskStride = box.mask.width;
+    BlendJob job = jobOn(target, clip);
+    job.mask = box.row(0);
+    job.maskStride = box.mask.width;
     fill(job);
 }
 

@@ -9,7 +9,7 @@
 ///
 /// A vector of results is the maximum of loads at fixed distances from the vector's own place, its taps.
 /// A run of full cells takes few taps where rows of windowed maxima stand beside the rows of coverage.
-/// Taps come in fours of equal weight, which share one subtraction: a cell of the rim has its mirror
+/// TapList come in fours of equal weight, which share one subtraction: a cell of the rim has its mirror
 /// images, and a tap too many is one that was there already, as that changes no maximum.
 ///
 /// Vectors with nothing covered in the square around their discs are left out. So are those that a
@@ -34,7 +34,7 @@ struct TapQuad {
 };
 
 /// All taps of a disc.
-struct Taps {
+struct TapList {
     // 17 rows of at most 5 taps, and at most 4 * reach cells in a quarter of the rim.
     static constexpr int kMostQuads = 17 * 2 + 4 * kLongestTappedReach;
 
@@ -44,7 +44,7 @@ struct Taps {
 
 /// The way's working memory.
 struct TapPlanes {
-    Taps* taps;
+    TapList* taps;
     PaddedRows rows;     ///< coverage
     PaddedRows windows;  ///< the largest coverage around each pixel
     int64_t vectors;     ///< in a row of the result
@@ -66,7 +66,7 @@ inline TapPlanes tapPlanes(const Dilation& dilation) {
     TapPlanes planes;
     planes.vectors = (dilation.right - dilation.left + kBytes - 1) / kBytes;
     planes.margin = (reach + kBytes - 1) / kBytes;
-    planes.taps = arena.take<Taps>(1);
+    planes.taps = arena.take<TapList>(1);
     const int64_t beside = planes.margin * kBytes + reach;
     planes.rows = takeRows(dilation, rowCount, beside, beside + kBytes, arena);
     planes.windows = planes.rows;
@@ -85,7 +85,7 @@ inline TapPlanes tapPlanes(const Dilation& dilation) {
 /// Gathers taps of one weight in fours.
 class QuadWriter {
   public:
-    QuadWriter(Taps& taps, uint8_t deficit) : mTaps(taps), mDeficit(deficit), mCount(0) {}
+    QuadWriter(TapList& taps, uint8_t deficit) : mTaps(taps), mDeficit(deficit), mCount(0) {}
     ~QuadWriter() {
         while (mCount % 4 != 0)
             add(mTaps.quads[mTaps.count - 1].taps[0]);
@@ -99,7 +99,7 @@ class QuadWriter {
     }
 
   private:
-    Taps& mTaps;
+    TapList& mTaps;
     uint8_t mDeficit;
     int mCount;
 };
@@ -208,7 +208,7 @@ inline int64_t filledReach(const DiscShape& disc) {
     return dy;
 }
 
-VOREL_INLINE Bytes dilatedVector(const Taps& taps, const uint8_t* source) {
+VOREL_INLINE Bytes dilatedVector(const TapList& taps, const uint8_t* source) {
     Bytes result = {};
     for (const TapQuad* quad = taps.quads; quad < taps.quads + taps.count; ++quad) {
         const Bytes left =

@@ -22,6 +22,10 @@ VOREL_INLINE Integers ascending() {
     return lanes;
 }
 
+VOREL_INLINE Integers clamped(Integers value, int32_t low, int32_t high) {
+    return larger(smaller(value, spread<Integers>(high)), spread<Integers>(low));
+}
+
 /// x - centre for the columns x, x + 1, ...
 VOREL_INLINE Floats columnsFrom(int64_t x, float centre) {
     return __builtin_convertvector(ascending() + static_cast<int32_t>(x), Floats) - centre;
@@ -42,8 +46,7 @@ struct LinearRow {
     /// middle afterwards cannot overflow.
     VOREL_INLINE Integers entries(int64_t x) const {
         const Integers place = toInt(rowTerm + stepX * columnsFrom(x, centreX));
-        const Integers below = smaller(place, spread<Integers>(kLastEntry - kMiddleEntry));
-        return larger(below, spread<Integers>(-kMiddleEntry)) + kMiddleEntry;
+        return clamped(place, -kMiddleEntry, kLastEntry - kMiddleEntry) + kMiddleEntry;
     }
 };
 
@@ -60,8 +63,7 @@ struct RadialRow {
 
     VOREL_INLINE Integers entries(int64_t x) const {
         const Floats across = columnsFrom(x, centreX);
-        const Integers place = toInt(step * squareRoot(rowTerm + across * across));
-        return larger(smaller(place, spread<Integers>(kLastEntry)), Integers{});
+        return clamped(toInt(step * squareRoot(rowTerm + across * across)), 0, kLastEntry);
     }
 };
 
@@ -71,34 +73,26 @@ struct RampPainter {
     static constexpr bool kReadsMask = true;
     static constexpr Empty kEmpty = DstOverWhereCovered::kEmpty;
     RampRow row;
-    int64_t left;
 
     VOREL_INLINE bool isEmpty(const Place& place) const { return hasEmptyMask(place); }
     VOREL_INLINE bool paintWhole(const Place&) const { return false; }
     VOREL_INLINE Pixels paint(const Place& place) const {
         const Pixels destination = loadPixels(place.destination());
-        if (isUncovered(place.mask())) return destination;
-        const Pixels colours = madeOfWords(
-            [&](int64_t i) { return gathered(row.pixels, row.entries(left + place.x + i)); });
+        // Half of a text's vectors lie between its strokes: worth a look, as a vector costs much.
+        if (allZero<kPixels>(place.mask())) return destination;
+        const Pixels colours =
+            madeOfWords([&](int64_t i) { return gathered(row.pixels, row.entries(place.x + i)); });
         return DstOverWhereCovered::apply(destination, colours, loadAmounts(place.mask()));
-    }
-
-    /// Half of a text's vectors lie between its strokes: worth a look, as a vector costs much.
-    static VOREL_INLINE bool isUncovered(const uint8_t* mask) {
-        const uint8_t none[kPixels] = {};
-        return std::memcmp(mask, none, sizeof none) == 0;
     }
 };
 
 template <class RampRow, class Ramp>
-void fillRamp(const FillJob& job, const Ramp& ramp) {
-    const BlendJob& blend = job.blend;
-    for (int64_t y = 0; y < blend.height; ++y) {
-        const RampPainter<RampRow> painter = {RampRow::of(ramp, job.top + y), job.left};
-        paintRow(painter,
-                 {blend.destination + y * blend.destinationStride, nullptr,
-                  blend.mask + y * blend.maskStride},
-                 blend.width);
+void fillRamp(const BlendJob& job, const Ramp& ramp) {
+    for (int64_t y = 0; y < job.height; ++y) {
+        const RampPainter<RampRow> painter = {RampRow::of(ramp, y)};
+        const Row row = {job.destination + y * job.destinationStride, nullptr,
+                         job.mask + y * job.maskStride};
+        paintRow(painter, row, job.width);
     }
 }
 
@@ -147,7 +141,8 @@ void mixRows(const MixedRow& near, const MixedRow& far, uint32_t nearWeight, uin
         const Halves redBlue = mixed(near.redBlue + x, far.redBlue + x, n, f);
         const Halves greenAlpha = mixed(near.greenAlpha + x, far.greenAlpha + x, n, f);
         const auto straightAlpha = as<Integers>(as<Words>(greenAlpha) >> 16);
-        const auto alpha = as<Words>(toInt(__builtin_convertvector(straightAlpha, Floats) * opacity));
+        const Integers seenAlpha = toInt(__builtin_convertvector(straightAlpha, Floats) * opacity);
+        const auto alpha = as<Words>(clamped(seenAlpha, 0, 255));
         const auto factor = as<Halves>(alpha | alpha << 16);
         const auto green = as<Words>(product(greenAlpha, factor)) & 0xFFFFU;
         store(out + x, as<Words>(product(redBlue, factor)) | green << 8 | alpha << 24);

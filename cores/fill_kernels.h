@@ -7,14 +7,6 @@
 /// The inner loops of gradients and patterns, compiled once per level of the instruction set.
 namespace VFontEffect::internal {
 
-/// The clipped part of a covered box: the job's mask is its coverage, which gates the colour. `left` and
-/// `top` are the part's place in the box.
-struct FillJob {
-    BlendJob blend;
-    int64_t left;
-    int64_t top;
-};
-
 /// The colours of a gradient, entries 0..255, premultiplied, as pixels in memory: R, G, B, A.
 using RampPixels = const uint32_t*;
 
@@ -55,8 +47,9 @@ struct MixedRow {
 };
 
 struct FillKernels {
-    void (*linear)(const FillJob& job, const LinearRamp& ramp);
-    void (*radial)(const FillJob& job, const RadialRamp& ramp);
+    /// Fill a covered box from its corner on: the job's mask is its coverage, which gates the colour.
+    void (*linear)(const BlendJob& job, const LinearRamp& ramp);
+    void (*radial)(const BlendJob& job, const RadialRamp& ramp);
 
     /// Mixes `count` columns of a pattern row of words (memory order A, R, G, B).
     void (*mixColumns)(const uint32_t* patternRow, const ColumnTaps& taps, int64_t count,

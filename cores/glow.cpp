@@ -2,15 +2,18 @@
 
 #include <algorithm>
 #include <cstdint>
+#include <cstring>
 
-#include "core/blend_modes.h"
 #include "core/fixed_point.h"
 #include "core/numeric.h"
 #include "core/pixel_buffer.h"
 #include "cores/blur.h"
+#include "cores/covered_fill.h"
+#include "cores/growth.h"
+#include "cores/growth_kernels.h"
 #include "cores/paint_input.h"
+#include "cores/placed_target.h"
 #include "cores/stop_ramp.h"
-#include "voreleffect/VFBlender.h"
 
 namespace VFontEffect::internal {
 namespace {
@@ -27,12 +30,111 @@ int blurRadius(int pad) {
     return toInt(static_cast<float>(pad) * 0.9F);
 }
 
-/// Words of the glow image outside the part that the blur reaches.
+/// What a glow of a size does around a box, in the coordinates of the box.
+struct Shape {
+    int passes;
+    int radius;
+    Window image;
+    Window blurred;  // the part of the image that is not its border
+
+    static Shape of(const CoverageBox& box, int pad) {
+        const int radius = blurRadius(pad);
+        const Window image = grown(wholeOf(box), 2 * int64_t{pad});
+        return {growthPasses(pad), radius, image, grown(image, -int64_t{radius})};
+    }
+};
+
+/// The colour of each blurred value, as the pixel in memory. Strong values lie near the text, at the
+/// start of the table. Deliberate: values end at 255, so entry 0 is never taken.
+struct ValuePixels {
+    uint32_t pixels[kTableLast];
+
+    explicit ValuePixels(const GlowRecord& record) {
+        unsigned int table[kTableSize];
+        fillGlowTable(record, kFadeStart, kCurve, table);
+        for (int value = 0; value < kTableLast; ++value)
+            pixels[value] = pixelOf(premultiply(table[kTableLast - value]));
+    }
+};
+
+/// The coverage, or its inverse, with a margin that is empty or full, and so is the frame.
+Growth coverageToGrow(const CoverageBox& box, uint8_t flip, int64_t margin) {
+    Growth growth(box.width + 2 * margin, box.height + 2 * margin);
+    if (!growth) return growth;
+    const auto side = static_cast<size_t>(margin + 1);
+    for (int64_t y = -1 - margin; y <= box.height + margin; ++y) {
+        uint8_t* const row = growth.row(y + margin) - 1;
+        if (y < 0 || y >= box.height) {
+            std::memset(row, flip, 2 * side + static_cast<size_t>(box.width));
+            continue;
+        }
+        const uint8_t* const source = box.row(y);
+        std::memset(row, flip, side);
+        std::transform(source, source + box.width, row + side,
+                       [flip](uint8_t coverage) { return static_cast<uint8_t>(coverage ^ flip); });
+        std::memset(row + side + box.width, flip, side);
+    }
+    return growth;
+}
+
+/// Grows, blurs and paints the part of the glow in the window. Returns false, with nothing painted, when
+/// memory ran out.
+bool paintBlurred(const CoverageBox& box, const Shape& shape, const PlacedTarget& target,
+                  const Window& window, const ValuePixels& values, Sense sense) {
+    const bool inverted = sense == Sense::inverted;
+    const uint8_t flip = inverted ? 0xFF : 0;
+    // Coverage spreads by a pixel a pass. Around its inverse everything is full, and stays so.
+    const int64_t margin = inverted ? 0 : shape.passes;
+    Growth growth = coverageToGrow(box, flip, margin);
+    if (!growth) return false;
+    growth.grow(shape.passes, flip);
+
+    // Deliberate: between the passes of an inner glow the columns that the first pass does not reach are
+    // full; with a radius of 0 those are that growth clears, the first one and the last.
+    const int64_t open = std::max(1, shape.radius);
+    const FullColumns full =
+        inverted ? FullColumns{shape.image.left + open, shape.image.right - open} : kNoFullColumns;
+    DownThenAcross blur(glowKernel(shape.radius), growth.source(flip), moved(window, margin, margin),
+                        full);
+    if (!blur) return false;
+    blur.run(inverted, [&](int64_t y, int64_t rows, const uint8_t* blurred, int64_t stride) {
+        const Window part = {window.left, y - margin, window.right, y - margin + rows};
+        glowKernels().paint({target.jobOn(part, blurred, stride), values.pixels});
+    });
+    return true;
+}
+
+/// Paints the border of an inner glow.
 ///
-/// Deliberate: around an inner glow they are opaque white, not transparent. They are painted, and the
-/// text fill or the composite clips them away.
-uint32_t borderWord(Sense sense) {
-    return sense == Sense::inverted ? 0xFFFFFFFFU : 0;
+/// Deliberate: around an inner glow the pixels that the blur does not reach are opaque white, not
+/// transparent. They are painted, and the text fill or the composite clips them away.
+void paintBorder(const Shape& shape, const PlacedTarget& target, const uint8_t* full) {
+    const Window& outside = shape.image;
+    const Window& inside = shape.blurred;
+    const Window sides[] = {{outside.left, outside.top, outside.right, inside.top},
+                            {outside.left, inside.bottom, outside.right, outside.bottom},
+                            {outside.left, inside.top, inside.left, inside.bottom},
+                            {inside.right, inside.top, outside.right, inside.bottom}};
+    for (const Window& side : sides) {
+        const Window seen = target.seen(side);
+        if (seen.empty()) continue;
+        BlendJob job = target.jobOn(seen, full, 0);
+        job.color = 0xFFFFFFFFU;
+        blendKernels().dstOverGate(job);
+    }
+}
+
+/// Paints the corners of an inner glow without a blur: growth clears the first and the last column but
+/// for their ends.
+void paintCorners(const Shape& shape, const PlacedTarget& target, const ValuePixels& values,
+                  const uint8_t* full) {
+    const Window& image = shape.image;
+    for (const int64_t x : {image.left, image.right - 1}) {
+        for (const int64_t y : {image.top, image.bottom - 1}) {
+            const Window seen = target.seen({x, y, x + 1, y + 1});
+            if (!seen.empty()) glowKernels().paint({target.jobOn(seen, full, 0), values.pixels});
+        }
+    }
 }
 
 }  // namespace
@@ -40,34 +142,25 @@ uint32_t borderWord(Sense sense) {
 void paintGlow(const VFECore::ParamPostProcessing* params, const GlowRecord& record, Sense sense) {
     const CoverageBox box = coverageOf(params);
     const int pad = saturateToInt(int64_t{toInt(record.sizePx)} + 1);
-    // With no padding at all (a size of -1) the image would be clear.
-    if (!box || isAbsurd(record.sizePx) || pad <= 0) return;
+    // With no padding at all (a size of -1) the image would be clear, as it is with a size of 0.
+    if (!box || isAbsurd(record.sizePx) || pad <= 0 || record.sizePx == 0.0F) return;
 
-    unsigned int table[kTableSize];
-    fillGlowTable(record, kFadeStart, kCurve, table);
-    std::transform(table, table + kTableSize, table, premultiply);
-
-    const int64_t margin = 2 * int64_t{pad};
-    Plane mask = paddedMask(box, margin, margin, sense);
-    const BlurKernel kernel = glowKernel(blurRadius(pad));
-    auto image = PixelBuffer<unsigned int>::uninitialised(mask.width, mask.height);
-    if (!mask || !kernel || !image) return;
-    const int width = saturateToInt(mask.width);
-    const int height = saturateToInt(mask.height);
-    if (!growByBoxFilter(mask.bytes.data(), growthPasses(pad), width, height)) return;
-
-    std::fill_n(image.data(), mask.width * mask.height, borderWord(sense));
-    const int64_t inner = mask.width - 2 * int64_t{kernel.radius};
-    const bool blurred = blurPlane(mask, kernel, sense, [&](int64_t y, const uint8_t* values) {
-        unsigned int* const row = image.data() + y * mask.width + kernel.radius;
-        // Strong values lie near the text, at the start of the table. Deliberate: values end at 255, so
-        // entry 0 is never taken.
-        for (int64_t x = 0; x < inner; ++x)
-            row[x] = table[kTableLast - values[x]];
-    });
-    if (!blurred) return;
-    VFBlender().drawBitmapBlend32(saturateToInt(box.left - margin), saturateToInt(box.top - margin),
-                                  params->dstBitmap, image.data(), width, height, width, kModeDstOver);
+    const Shape shape = Shape::of(box, pad);
+    const PlacedTarget target(params->dstBitmap, box.left, box.top);
+    const Window seen = target.seen(shape.image);
+    if (seen.empty()) return;
+    const Window window = target.seen(shape.blurred);
+    const ValuePixels values(record);
+    if (sense == Sense::plain) {
+        if (!window.empty()) paintBlurred(box, shape, target, window, values, sense);
+        return;
+    }
+    auto full = PixelBuffer<uint8_t>::uninitialised(seen.width());
+    if (!full) return;
+    std::memset(full.data(), 0xFF, static_cast<size_t>(seen.width()));
+    if (!window.empty() && !paintBlurred(box, shape, target, window, values, sense)) return;
+    paintBorder(shape, target, full.data());
+    if (shape.radius == 0) paintCorners(shape, target, values, full.data());
 }
 
 }  // namespace VFontEffect::internal

@@ -29,9 +29,6 @@ int glowReach(const GlowRecord& record);
 /// The colours from the text outwards, straight; see VFOuterGlow::makeColorLUT.
 void fillGlowTable(const GlowRecord& record, float fadeStart, int curve, unsigned int* table);
 
-/// Grows coverage in place; see VFOuterGlow::increaseByBoxFilter. False when memory ran out.
-bool growByBoxFilter(unsigned char* mask, int passes, int width, int height);
-
 /// Paints a glow around the coverage (plain) or around its inverse (inverted).
 void paintGlow(const VFECore::ParamPostProcessing* params, const GlowRecord& record, Sense sense);
 

@@ -1,10 +1,8 @@
 #include <algorithm>
 #include <cmath>
 #include <cstdint>
-#include <cstring>
 
 #include "core/numeric.h"
-#include "core/pixel_buffer.h"
 #include "cores/glow.h"
 #include "cores/stop_ramp.h"
 
@@ -46,10 +44,6 @@ void fadeOut(float fadeStart, unsigned int* table) {
     table[kTableLast] = 0;
 }
 
-uint32_t columnSum(const uint8_t* above, const uint8_t* row, const uint8_t* below, int x) {
-    return uint32_t{above[x]} + row[x] + below[x];
-}
-
 }  // namespace
 
 int glowReach(const GlowRecord& record) {
@@ -64,32 +58,6 @@ void fillGlowTable(const GlowRecord& record, float fadeStart, int curve, unsigne
     }
     fillRamp(record, curve, table);
     fadeOut(fadeStart, table);
-}
-
-// Deliberate: the sum of nine is divided by 4, so every pass brightens as well as spreads.
-bool growByBoxFilter(unsigned char* mask, int passes, int width, int height) {
-    if (mask == nullptr || passes < 1 || width < 1 || height <= 2) return true;
-    auto above = PixelBuffer<uint8_t>::uninitialised(width);
-    auto grown = PixelBuffer<uint8_t>::zeroed(width);
-    if (!above || !grown) return false;
-    const auto rowBytes = static_cast<size_t>(width);
-    for (int pass = 0; pass < passes; ++pass) {
-        // A row is replaced only after its old values were saved for the row below it.
-        std::memcpy(above.data(), mask, rowBytes);
-        for (int y = 1; y < height - 1; ++y) {
-            unsigned char* const row = mask + static_cast<size_t>(y) * rowBytes;
-            const unsigned char* const below = row + rowBytes;
-            for (int x = 1; x < width - 1; ++x) {
-                const uint32_t sum = columnSum(above.data(), row, below, x - 1) +
-                                     columnSum(above.data(), row, below, x) +
-                                     columnSum(above.data(), row, below, x + 1);
-                grown[static_cast<size_t>(x)] = static_cast<uint8_t>(std::min(sum >> 2, 255U));
-            }
-            std::memcpy(above.data(), row, rowBytes);
-            std::memcpy(row, grown.data(), rowBytes);
-        }
-    }
-    return true;
 }
 
 }  // namespace VFontEffect::internal

@@ -16,7 +16,7 @@ class GradientTable {
     RampPixels pixels() const { return mPixels; }
 
   private:
-    uint32_t mPixels[kTableSize];
+    uint32_t mPixels[kTableLast];
 };
 
 /// Whether a gradient record has what it takes to draw.

@@ -1,8 +1,6 @@
 #include <cmath>
-#include <cstdint>
 
 #include "core/effect_types.h"
-#include "core/numeric.h"
 #include "core/portable_math.h"
 #include "cores/covered_fill.h"
 #include "cores/gradient_table.h"
@@ -55,7 +53,7 @@ void VFLinearGradient::doPostProcessing(ParamPostProcessing* params) {
     const float step = (256.0F / mProperty->mScale) / lengthAcross(angle, w, h);
     const LinearRamp ramp = {table.pixels(), portableCos(angle) * step, portableSin(angle) * step,
                              w * 0.5F, h * 0.5F};
-    fillCovered(box, params->dstBitmap, [&](const FillJob& job) { fillKernels().linear(job, ramp); });
+    fillCovered(box, params->dstBitmap, [&](const BlendJob& job) { fillKernels().linear(job, ramp); });
 }
 
 }  // namespace VFontEffect

@@ -1,5 +1,6 @@
 #include "core/effect_types.h"
 #include "cores/glow.h"
+#include "cores/growth.h"
 #include "cores/property_copy.h"
 #include "voreleffect/VFECore.h"
 

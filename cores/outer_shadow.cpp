@@ -1,15 +1,14 @@
 #include <algorithm>
 #include <cstdint>
-#include <cstring>
 
-#include "core/blend_modes.h"
+#include "blend/kernels.h"
 #include "core/effect_types.h"
 #include "core/numeric.h"
 #include "cores/blur.h"
 #include "cores/paint_input.h"
+#include "cores/placed_target.h"
 #include "cores/property_copy.h"
 #include "cores/shadow_offset.h"
-#include "voreleffect/VFBlender.h"
 #include "voreleffect/VFECore.h"
 
 namespace VFontEffect {
@@ -23,20 +22,6 @@ int reach(const VFOuterShadowProperty* record, int64_t shift) {
     if (record == nullptr) return 0;
     return saturateToInt(std::max<int64_t>(0, toInt(record->mSize + 0.5F) + shift));
 }
-
-/// The picture's place in the destination.
-struct Placement {
-    int64_t left;
-    int64_t top;
-    int64_t width;
-    int64_t height;
-
-    /// A picture that ends right at the left or top edge still counts.
-    bool touches(const VFBitmap& destination) const {
-        return left + width >= 0 && left < destination.mWidth && top + height >= 0 &&
-               top < destination.mHeight;
-    }
-};
 
 }  // namespace
 
@@ -76,27 +61,23 @@ void VFOuterShadow::doPostProcessing(ParamPostProcessing* params) {
     const CoverageBox box = coverageOf(params);
     if (!box || mProperty == nullptr || isAbsurd(mProperty->mSize)) return;
 
-    // Deliberate: a margin of twice the blur's reach: every tap of every pixel that is not 0 lies
-    // inside.
+    const PlacedTarget target(params->dstBitmap, box.left + mOffsetX, box.top + mOffsetY);
     const int radius = shadowRadius(mProperty->mSize);
-    const int64_t margin = 2 * int64_t{radius};
-    const Placement place = {box.left - margin + mOffsetX, box.top - margin + mOffsetY,
-                             box.width + 2 * margin, box.height + 2 * margin};
-    if (!place.touches(*params->dstBitmap)) return;
+    const Window window = target.seen(grown(wholeOf(box), radius));
+    if (window.empty()) return;
+    const auto paint = [&](const Window& part, const uint8_t* shadow, int64_t stride) {
+        BlendJob job = target.jobOn(part, shadow, stride);
+        job.color = mProperty->mColor;
+        blendKernels().dstOverMask(job);
+    };
+    // Without blur the coverage itself is the shadow.
+    if (radius == 0) return paint(window, box.row(window.top) + window.left, box.mask.width);
 
-    const Plane mask = paddedMask(box, margin, margin);
-    Plane shadow = Plane::filled(place.width, place.height, 0);
-    const BlurKernel kernel = shadowKernel(radius);
-    if (!mask || !shadow || !kernel) return;
-    const bool blurred = blurPlane(mask, kernel, Sense::plain, [&](int64_t y, const uint8_t* values) {
-        std::memcpy(shadow.row(y) + radius, values, static_cast<size_t>(place.width - margin));
+    DownThenAcross blur(shadowKernel(radius), sourceOf(box), window, kNoFullColumns);
+    if (!blur) return;
+    blur.run(false, [&](int64_t y, int64_t rows, const uint8_t* values, int64_t stride) {
+        paint({window.left, y, window.right, y + rows}, values, stride);
     });
-    if (!blurred) return;
-
-    const int width = saturateToInt(place.width);
-    VFBlender().drawBitmapBlend8(saturateToInt(place.left), saturateToInt(place.top), params->dstBitmap,
-                                 shadow.bytes.data(), width, saturateToInt(place.height), width,
-                                 mProperty->mColor, kModeDstOver);
 }
 
 }  // namespace VFontEffect

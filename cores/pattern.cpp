@@ -194,12 +194,12 @@ void VFPattern::doPostProcessing(ParamPostProcessing* params) {
     const ColourView pattern = ColourView::of(mProperty->mPattern);
     if (!pattern || pattern.width == 0 || pattern.height == 0) return;
 
-    TiledRows rows(pattern, mProperty->mScale, clampOrLow(mProperty->mOpacity, 0.0F, 1.0F), box.width);
+    TiledRows rows(pattern, mProperty->mScale, mProperty->mOpacity, box.width);
     if (!rows) return;
-    fillCovered(box, params->dstBitmap, [&](const FillJob& job) {
-        for (int64_t y = 0; y < job.blend.height; ++y) {
-            BlendJob row = rowOf(job.blend, y);
-            row.image = reinterpret_cast<const uint8_t*>(rows.at(job.top + y) + job.left);
+    fillCovered(box, params->dstBitmap, [&](const BlendJob& job) {
+        for (int64_t y = 0; y < job.height; ++y) {
+            BlendJob row = rowOf(job, y);
+            row.image = reinterpret_cast<const uint8_t*>(rows.at(y));
             blendKernels().dstOverWhereCovered(row);
         }
     });

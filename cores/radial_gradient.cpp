@@ -1,8 +1,5 @@
-#include <cmath>
-#include <cstdint>
 
 #include "core/effect_types.h"
-#include "core/numeric.h"
 #include "cores/covered_fill.h"
 #include "cores/gradient_table.h"
 #include "cores/paint_input.h"
@@ -38,7 +35,7 @@ void VFRadialGradient::doPostProcessing(ParamPostProcessing* params) {
     const auto w = static_cast<float>(box.width);
     const float step = (256.0F / w + 256.0F / w) / mProperty->mScale;
     const RadialRamp ramp = {table.pixels(), step, w * 0.5F, static_cast<float>(box.height) * 0.5F};
-    fillCovered(box, params->dstBitmap, [&](const FillJob& job) { fillKernels().radial(job, ramp); });
+    fillCovered(box, params->dstBitmap, [&](const BlendJob& job) { fillKernels().radial(job, ramp); });
 }
 
 }  // namespace VFontEffect

@@ -359,7 +359,7 @@ void comparePattern(Decoder& in) {
     literal::Tile tile = decodeTile(in);
     VFBitmap bitmap = bitmapOf(tile);
     const float scale = in.wildFloat(-0.5F, 11.0F);
-    VFPatternProperty record(&bitmap, scale, in.real(0.0F, 1.0F));
+    VFPatternProperty record(&bitmap, scale, in.wildFloat(-0.2F, 2.0F));
     compareCore<VFPattern>(named("pattern", {scale, record.mOpacity}), record, decodeScene(in),
                            [&](Scene& s, const VFPatternProperty& r) {
                                literal::paintPattern(s.dst, s.mask, s.text, r.mOpacity, r.mScale,

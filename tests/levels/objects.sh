@@ -7,8 +7,10 @@
 set -euo pipefail
 level=$1
 shift
-shared=$(nm --defined-only --format=posix "$@" | awk '$2 ~ /^[WVu]$/ { print $1 }' |
-    grep -v "11VFontEffect8internal${#level}${level}" | sort -u || true)
+own="11VFontEffect8internal${#level}${level}"
+symbols=$(nm --defined-only --format=posix "$@")
+grep -q "$own" <<< "$symbols" || { echo "no code of the level $level in: $*" >&2; exit 1; }
+shared=$(awk '$2 ~ /^[WVu]$/ { print $1 }' <<< "$symbols" | { grep -v "$own" || true; } | sort -u)
 [[ -z $shared ]] && exit 0
 echo "objects of the level $level hold functions that other objects share:" >&2
 c++filt <<< "$shared" >&2

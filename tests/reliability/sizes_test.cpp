@@ -155,14 +155,12 @@ VFBitmap tile() {
     return pixels;
 }
 
-/// An opacity outside of 0 to 1 counts as the nearer end, one that is no number as 0.
 Painter pattern(float scale, float opacity) {
     VFBitmap given = tile();
     const std::vector<uint8_t> bytes = bytesOf(given);
-    const float share = opacity > 0.0F ? std::min(opacity, 1.0F) : 0.0F;
     return painter<VFPattern>(
-        "pattern", VFPatternProperty(&given, scale, opacity), [bytes, share](Scene& s, const auto& r) {
-            literal::paintPattern(s.dst, s.mask, s.text, share, r.mScale, 5, 4, bytes);
+        "pattern", VFPatternProperty(&given, scale, opacity), [bytes](Scene& s, const auto& r) {
+            literal::paintPattern(s.dst, s.mask, s.text, r.mOpacity, r.mScale, 5, 4, bytes);
         });
 }
 

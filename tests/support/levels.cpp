@@ -32,6 +32,7 @@ std::string nameOf(CpuLevel level) {
     static const char* const names[] = {VOREL_EACH_LEVEL(VOREL_LEVEL_TEXT, , )};
     return names[static_cast<int>(level)];
 }
+#undef VOREL_LEVEL_TEXT
 
 }  // namespace vorel_test
 

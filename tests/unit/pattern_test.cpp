@@ -185,6 +185,13 @@ TEST(Pattern, OpacityBeyondItsRange_NeverWrapsTheAlpha) {
     }
 }
 
+TEST(Pattern, OpacityAboveOne_RaisesTheSampledAlpha) {
+    const Tile tile{1, 1, {200, 200, 200, 200}};
+    const Scene result = filled(sceneOf(filledMask(1, 1, 255)), tile, 1.0F, 1.2F);
+    // Sampled: 200 * 255 * 255 >> 16 = 198. Alpha: 198 * 1.2 = 237.6. Colours: 199 * 237 >> 8 = 184.
+    EXPECT_EQ((std::vector<uint8_t>{184, 184, 184, 237}), result.dst.bytes);
+}
+
 TEST(Pattern, ScaleTwo_InterpolatesBetweenColumnsAndWraps) {
     const Scene result = filled(sceneOf(filledMask(16, 1, 255)), numberedTile(4, 4, 80, 0), 2.0F);
     // Odd columns lie half way: weights 128 and 127, times 255. Column 7 mixes the last with the first.

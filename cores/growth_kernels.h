@@ -1,0 +1,50 @@
+#pragma once
+
+#include <cstdint>
+
+#include "blend/kernels.h"
+
+/// The inner loops of the glows, compiled once per level of the instruction set.
+namespace VFontEffect::internal {
+
+/// Coverage that grows, in two planes of the same shape that take turns: `height` rows of `width` bytes
+/// and a frame of one byte around them, which stays as it is. Rows are read and written in whole
+/// vectors, up to kGrowthMargin bytes too far on both sides; behind a row, where the frame is `behind`,
+/// they are written as that.
+struct GrowthJob {
+    uint8_t* planes[2];  // of row 0, column 0
+    int64_t stride;
+    int64_t width;
+    int64_t height;
+    uint8_t behind;
+    int passes;
+    uint8_t* tiles;  // working memory of growthTileBytes(width, height)
+};
+
+constexpr int64_t kGrowthMargin = 64;
+
+/// What is skipped where nothing changes any more: squares of 16 pixels, or wider at some levels.
+constexpr int64_t kGrowthTile = 16;
+
+inline int64_t growthTileBytes(int64_t width, int64_t height) {
+    return 2 * (width / kGrowthTile + 3) * (height / kGrowthTile + 3);
+}
+
+/// The job's mask is blurred coverage, and `pixels` has the colour of each value as the pixel in memory:
+/// R, G, B, A.
+struct GlowJob {
+    BlendJob blend;
+    const uint32_t* pixels;
+};
+
+struct GlowKernels {
+    /// Grows plane 0 by turns; the result is in plane `passes` % 2.
+    void (*grow)(const GrowthJob& job);
+    /// The values' colours beneath the destination. That of 0 must be transparent.
+    void (*paint)(const GlowJob& job);
+};
+
+/// The kernels of the chosen level.
+const GlowKernels& glowKernels();
+
+}  // namespace VFontEffect::internal

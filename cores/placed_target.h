@@ -1,0 +1,46 @@
+#pragma once
+
+#include <cstdint>
+
+#include "blend/clip.h"
+#include "blend/job.h"
+#include "core/views.h"
+#include "cores/paint_input.h"
+
+namespace VFontEffect::internal {
+
+/// A colour destination in the coordinates of a picture that lies on it.
+class PlacedTarget {
+  public:
+    /// The picture's origin lies at (left, top) of the destination.
+    PlacedTarget(const VFBitmap* destination, int64_t left, int64_t top)
+        : mPixels(ColourView::of(destination)), mLeft(left), mTop(top) {}
+
+    /// The part of the picture that lies on the destination; empty for one that cannot be trusted.
+    Clip seen(const Clip& part) const {
+        return common(part, moved({0, 0, mPixels.width, mPixels.height}, -mLeft, -mTop));
+    }
+
+    /// A job on a part that is seen, with nothing to paint yet.
+    BlendJob jobOn(const Clip& part) const { return internal::jobOn(mPixels, moved(part, mLeft, mTop)); }
+
+    /// A job that paints through a mask of the part's size.
+    BlendJob jobOn(const Clip& part, const uint8_t* mask, int64_t stride) const {
+        BlendJob job = jobOn(part);
+        job.mask = mask;
+        job.maskStride = stride;
+        return job;
+    }
+
+  private:
+    ColourView mPixels;
+    int64_t mLeft;
+    int64_t mTop;
+};
+
+/// The whole of a box, in its own coordinates.
+inline Clip wholeOf(const CoverageBox& box) {
+    return {0, 0, box.width, box.height};
+}
+
+}  // namespace VFontEffect::internal
