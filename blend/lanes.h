@@ -589,12 +589,6 @@ VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
 VOREL_INLINE Words gathered(const uint32_t* table, const uint8_t* indices) {
     return Words{table[indices[0]], table[indices[1]], table[indices[2]], table[indices[3]]};
 }
-
-VOREL_INLINE Halves multiplyHigh(Halves a, Halves b) {
-    const uint32x4_t low = vmull_u16(vget_low_u16(as<uint16x8_t>(a)), vget_low_u16(as<uint16x8_t>(b)));
-    const uint32x4_t high = vmull_high_u16(as<uint16x8_t>(a), as<uint16x8_t>(b));
-    return as<Halves>(vuzp2q_u16(vreinterpretq_u16_u32(low), vreinterpretq_u16_u32(high)));
-}
 VOREL_INLINE Bytes loadFirst(const uint8_t* from, int64_t count) {
     return loadCopied(from, count);
 }
