@@ -55,7 +55,7 @@ struct DilationKernels {
     void (*begin)(Dilation& dilation);
     /// `count` rows of results from row y on, at most kBandRows, first column `left`.
     void (*dilateRows)(const Dilation& dilation, int64_t y, int64_t count, uint8_t* results);
-    /// first = min(first, second)
+    /// first = min(first, second), whole rows of results
     void (*keepSmaller)(uint8_t* first, const uint8_t* second, int64_t count);
     void (*stamp)(const Stamping& stamping);
 };

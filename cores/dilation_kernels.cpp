@@ -40,8 +40,8 @@ void dilateRows(const Dilation& dilation, int64_t y, int64_t count, uint8_t* res
 }
 
 void keepSmaller(uint8_t* first, const uint8_t* second, int64_t count) {
-    for (int64_t i = 0; i < count; ++i)
-        first[i] = smaller(first[i], second[i]);
+    for (int64_t x = 0; x < count; x += kBytes)
+        store(first + x, smaller(load<Bytes>(first + x), load<Bytes>(second + x)));
 }
 
 /// target = max(target, coverage - deficit), a row of the disc at a time.

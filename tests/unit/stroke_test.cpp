@@ -611,6 +611,21 @@ TEST(StrokeWays, HolesThatHardlyClose_MatchTheLiteralForm) {
     }
 }
 
+TEST(StrokeWays, NotchBetweenTwoPixels_MatchesTheLiteralForm) {
+    // Anywhere in a vector, and nearly as far apart as their discs reach.
+    for (int left = 0; left < 16; ++left) {
+        for (int apart = 1; apart <= 26; ++apart) {
+            SCOPED_TRACE(std::to_string(apart) + " columns from " + std::to_string(left));
+            literal::Mask mask = filledMask(left + apart + 1, 1, 0);
+            mask.bytes[static_cast<size_t>(left)] = 255;
+            mask.bytes.back() = 255;
+            for (float size : {4.0F, 9.0F, 12.5F}) {
+                ASSERT_TRUE(matchesLiteral(sceneWithRoom(mask, size), size, kWhite, kOutside));
+            }
+        }
+    }
+}
+
 TEST(StrokeWays, LargestRadii_MatchTheLiteralForm) {
     // From a reach of 255 on, distances no longer fit in a byte.
     for (float size : {127.9F, 128.0F, 253.5F, 254.0F, 254.4F, 254.5F, 255.0F, 255.5F, 255.9F, 256.0F}) {
