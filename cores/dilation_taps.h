@@ -61,7 +61,7 @@ struct TapPlanes {
 
 inline TapPlanes tapPlanes(const Dilation& dilation) {
     const int64_t reach = dilation.disc->reach;
-    const int64_t rowCount = kBandRows + 2 * reach;
+    const int64_t rowCount = dilation.bandRows + 2 * reach;
     Arena arena = {dilation.memory};
     TapPlanes planes;
     planes.vectors = (dilation.right - dilation.left + kBytes - 1) / kBytes;
