@@ -4,6 +4,6 @@
 
 namespace VFontEffect::internal {
 
-VOREL_LEVEL_TABLE(blendKernels, BlendKernels, kBlendKernels)
+VOREL_LEVEL_TABLE(VOREL_EACH_DOTLESS_LEVEL, blendKernels, BlendKernels, kBlendKernels)
 
 }  // namespace VFontEffect::internal

@@ -549,10 +549,11 @@ VOREL_INLINE Weights weightsAt(const WeightCell* cells) {
 }
 template <int kFour>
 VOREL_INLINE Words addDots(Words sums, Taps taps, Weights weights) {
-    const auto even = as<__m128i>(weights[4 * kFour]);
-    const auto odd = as<__m128i>(weights[4 * kFour + 1]);
-    return sums + as<Words>(_mm_madd_epi16(as<__m128i>(taps.even), even)) +
-           as<Words>(_mm_madd_epi16(as<__m128i>(taps.odd), odd));
+    const __m128i even = _mm_madd_epi16(as<__m128i>(taps.even), as<__m128i>(weights[4 * kFour]));
+    const __m128i odd = _mm_madd_epi16(as<__m128i>(taps.odd), as<__m128i>(weights[4 * kFour + 1]));
+    Words sum = sums + as<Words>(even);
+    __asm__("" : "+x"(sum));
+    return sum + as<Words>(odd);
 }
 
 #elif defined(__aarch64__)

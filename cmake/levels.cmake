@@ -16,8 +16,17 @@ set(VOREL_FLAGS_avx2 -mavx2)
 set(VOREL_FLAGS_avx512 -mavx512f -mavx512bw -mavx512dq -mavx512vl -mavx512vnni)
 set(VOREL_FLAGS_dotprod -march=armv8.2-a+dotprod)
 
+# The plainest level of vectors runs on every CPU of its kind: the scalar one is for the tests then.
+set(VOREL_SHIPPED_LEVELS ${VOREL_LEVELS})
+if(VOREL_FOR_X86_64 OR VOREL_FOR_AARCH64)
+  list(REMOVE_ITEM VOREL_SHIPPED_LEVELS scalar)
+endif()
+
 foreach(level IN LISTS VOREL_LEVELS)
-  add_library(voreleffect_${level} OBJECT ${VOREL_LEVEL_SOURCES})
+  add_library(voreleffect_${level} OBJECT ${VOREL_DOT_SOURCES})
+  if(NOT level STREQUAL dotprod)
+    target_sources(voreleffect_${level} PRIVATE ${VOREL_LEVEL_SOURCES})
+  endif()
   vorel_objects(voreleffect_${level})
   target_compile_definitions(voreleffect_${level} PRIVATE VOREL_LEVEL=${level})
   # Vectors are passed between functions that are always inlined; their calling convention is moot.

@@ -22,12 +22,18 @@ function(vorel_objects target)
     POSITION_INDEPENDENT_CODE ON)
 endfunction()
 
-# Makes a library of all objects and of one more source: the choice of the level.
+# vorel_library(TARGET CHOICE LEVELS LEVEL...): makes a library of all objects, of the choice of the level,
+# and of the levels to choose from.
 function(vorel_library target choice)
-  target_sources(${target} PRIVATE ${choice} $<TARGET_OBJECTS:voreleffect_objects>)
-  foreach(level IN LISTS VOREL_LEVELS)
+  cmake_parse_arguments(PARSE_ARGV 2 arg "" "" "LEVELS")
+  target_sources(${target} PRIVATE
+    ${choice} blend/kernels.cpp cores/kernels.cpp $<TARGET_OBJECTS:voreleffect_objects>)
+  foreach(level IN LISTS arg_LEVELS)
     target_sources(${target} PRIVATE $<TARGET_OBJECTS:voreleffect_${level}>)
   endforeach()
+  if(NOT scalar IN_LIST arg_LEVELS)
+    target_compile_definitions(${target} PRIVATE VOREL_WITHOUT_SCALAR)
+  endif()
   vorel_objects(${target})
   target_include_directories(${target} PUBLIC $<BUILD_INTERFACE:${PROJECT_SOURCE_DIR}/include>)
   target_compile_features(${target} PUBLIC cxx_std_17)

@@ -6,7 +6,7 @@ namespace VFontEffect::internal {
 // a choice of their own in the place of this source.
 CpuLevel chosenLevel() {
     int level = kCpuLevels - 1;
-    while (level > 0 && !runsHere(static_cast<CpuLevel>(level)))
+    while (level > kPlainestLevel && !runsHere(static_cast<CpuLevel>(level)))
         --level;
     return static_cast<CpuLevel>(level);
 }

@@ -4,24 +4,34 @@
 /// the machine's kind, each time in a namespace of the level's name (VOREL_LEVEL), and picked when the
 /// process runs. All levels give the same bytes.
 ///
-/// VOREL_EACH_LEVEL applies a macro to the name of each level, from the plainest to the best, and to two
-/// arguments of the caller's.
+/// VOREL_EACH_VECTOR_LEVEL applies a macro to the name of each level but the scalar one, from the
+/// plainest to the best, and to two arguments of the caller's. The plainest runs on every CPU of its
+/// kind, so only the tests have the scalar level beside it, and VOREL_WITHOUT_SCALAR says that it is not
+/// there. VOREL_EACH_DOTLESS_LEVEL gives for each the level whose code does when it takes no dot
+/// products.
 #if defined(__x86_64__)
-#define VOREL_EACH_LEVEL(apply, a, b) \
-    apply(scalar, a, b) apply(sse2, a, b) apply(avx2, a, b) apply(avx512, a, b)
+#define VOREL_EACH_VECTOR_LEVEL(apply, a, b) apply(sse2, a, b) apply(avx2, a, b) apply(avx512, a, b)
+#define VOREL_EACH_DOTLESS_LEVEL(apply, a, b) VOREL_EACH_VECTOR_LEVEL(apply, a, b)
 #elif defined(__aarch64__)
-#define VOREL_EACH_LEVEL(apply, a, b) apply(scalar, a, b) apply(neon, a, b) apply(dotprod, a, b)
+#define VOREL_EACH_VECTOR_LEVEL(apply, a, b) apply(neon, a, b) apply(dotprod, a, b)
+#define VOREL_EACH_DOTLESS_LEVEL(apply, a, b) apply(neon, a, b) apply(neon, a, b)
 #else
-#define VOREL_EACH_LEVEL(apply, a, b) apply(scalar, a, b)
+#define VOREL_EACH_VECTOR_LEVEL(apply, a, b)
+#define VOREL_EACH_DOTLESS_LEVEL(apply, a, b)
 #endif
 
 namespace VFontEffect::internal {
 
 #define VOREL_LEVEL_NAME(level, a, b) level,
-enum class CpuLevel { VOREL_EACH_LEVEL(VOREL_LEVEL_NAME, , ) count };
+enum class CpuLevel { scalar, VOREL_EACH_VECTOR_LEVEL(VOREL_LEVEL_NAME, , ) count };
 #undef VOREL_LEVEL_NAME
 
 constexpr int kCpuLevels = static_cast<int>(CpuLevel::count);
+#if defined(VOREL_WITHOUT_SCALAR)
+constexpr int kPlainestLevel = 1;
+#else
+constexpr int kPlainestLevel = 0;
+#endif
 
 /// Whether this CPU, and the system's kernel, have what the level's code needs.
 bool runsHere(CpuLevel level);

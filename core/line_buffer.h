@@ -6,8 +6,8 @@
 
 namespace VFontEffect::internal {
 
-/// Working memory of bytes that begins with a line of the cache, so that no vector at a multiple of its own
-/// size crosses two lines. Empty when memory ran out.
+/// Working memory of bytes that begins with a line of the cache, so that no vector at a multiple of its
+/// own size crosses two lines. Empty when memory ran out.
 class LineBuffer {
   public:
     explicit LineBuffer(int64_t width, int64_t height = 1)

@@ -4,7 +4,6 @@
 #include <cstddef>
 #include <cstdint>
 
-#include "core/level_table.h"
 #include "voreleffect/VFECore.h"
 
 /// Grey-scale dilation by the anti-aliased disc, stamped: every source pixel of coverage c raises
@@ -16,11 +15,7 @@ namespace VFontEffect {
 
 using namespace internal;
 
-namespace internal {
-
-VOREL_LEVEL_TABLE(dilationKernels, DilationKernels, kDilationKernels)
-
-}  // namespace internal
+namespace internal {}  // namespace internal
 
 namespace {
 

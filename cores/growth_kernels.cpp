@@ -40,25 +40,28 @@ VOREL_INLINE Sums operator+(const Sums& a, const Sums& b) {
     return {a.even + b.even, a.odd + b.odd};
 }
 
-/// A column of vectors, from one plane to the other.
+/// A column of vectors, from one plane to the other. The last one of the rows ends behind them.
+template <bool kLast>
 struct Column {
     const uint8_t* from;
     uint8_t* to;
     int64_t stride;
-    Bytes inside;  // all ones where pixels are, not behind the row
-    Bytes behind;
+    Bytes inside;  // of the last column, all ones where there are pixels
+    Bytes behind;  // and what to write elsewhere
     Bytes changes = {};
 
     VOREL_INLINE void put(const Sums& sums) {
-        const Bytes grown = (quarters(sums.even, sums.odd) & inside) | behind;
-        changes |= (grown ^ load<Bytes>(from)) & inside;
+        Bytes grown = quarters(sums.even, sums.odd);
+        if (kLast) grown = (grown & inside) | behind;
+        const Bytes changed = grown ^ load<Bytes>(from);
+        changes |= kLast ? changed & inside : changed;
         store(to, grown);
         from += stride;
         to += stride;
     }
 
     /// Rows are made by twos: both share the sum of the two rows.
-    VOREL_INLINE void grow(int64_t rows) {
+    VOREL_INLINE Bytes grow(int64_t rows) {
         Sums above = Sums::ofRow(from - stride);
         Sums here = Sums::ofRow(from);
         for (; rows >= 2; rows -= 2) {
@@ -71,6 +74,7 @@ struct Column {
             here = farther;
         }
         if (rows != 0) put(above + here + Sums::ofRow(from + stride));
+        return changes;
     }
 };
 
@@ -115,14 +119,16 @@ class Tiles {
 bool growTile(const GrowthJob& job, int from, int64_t left, int64_t top) {
     const int64_t right = left + kTileColumns < job.width ? left + kTileColumns : job.width;
     const int64_t rows = job.height - top < kTileRows ? job.height - top : kTileRows;
+    const uint8_t* const source = job.planes[from] + top * job.stride;
+    uint8_t* const target = job.planes[1 - from] + top * job.stride;
     Bytes changes = {};
-    for (int64_t x = left; x < right; x += kBytes) {
-        const int64_t at = top * job.stride + x;
-        const Bytes inside = firstBytes(job.width - x < kBytes ? job.width - x : int64_t{kBytes});
-        Column column = {job.planes[from] + at, job.planes[1 - from] + at, job.stride, inside,
-                         spread<Bytes>(job.behind) & ~inside};
-        column.grow(rows);
-        changes |= column.changes;
+    int64_t x = left;
+    for (; x + kBytes <= right; x += kBytes)
+        changes |= Column<false>{source + x, target + x, job.stride, {}, {}}.grow(rows);
+    if (x < right) {
+        const Bytes inside = firstBytes(right - x);
+        const Bytes behind = spread<Bytes>(job.behind) & ~inside;
+        changes |= Column<true>{source + x, target + x, job.stride, inside, behind}.grow(rows);
     }
     return !allZero(changes);
 }

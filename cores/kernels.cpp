@@ -1,12 +1,14 @@
 #include "core/level_table.h"
 #include "cores/blur_kernels.h"
+#include "cores/dilation.h"
 #include "cores/fill_kernels.h"
 #include "cores/growth_kernels.h"
 
 namespace VFontEffect::internal {
 
-VOREL_LEVEL_TABLE(blurKernels, BlurKernels, kBlurKernels)
-VOREL_LEVEL_TABLE(fillKernels, FillKernels, kFillKernels)
-VOREL_LEVEL_TABLE(glowKernels, GlowKernels, kGlowKernels)
+VOREL_LEVEL_TABLE(VOREL_EACH_VECTOR_LEVEL, blurKernels, BlurKernels, kBlurKernels)
+VOREL_LEVEL_TABLE(VOREL_EACH_DOTLESS_LEVEL, dilationKernels, DilationKernels, kDilationKernels)
+VOREL_LEVEL_TABLE(VOREL_EACH_DOTLESS_LEVEL, fillKernels, FillKernels, kFillKernels)
+VOREL_LEVEL_TABLE(VOREL_EACH_DOTLESS_LEVEL, glowKernels, GlowKernels, kGlowKernels)
 
 }  // namespace VFontEffect::internal

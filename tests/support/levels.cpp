@@ -29,7 +29,7 @@ std::vector<CpuLevel> levelsHere() {
 
 #define VOREL_LEVEL_TEXT(level, a, b) #level,
 std::string nameOf(CpuLevel level) {
-    static const char* const names[] = {VOREL_EACH_LEVEL(VOREL_LEVEL_TEXT, , )};
+    static const char* const names[] = {"scalar", VOREL_EACH_VECTOR_LEVEL(VOREL_LEVEL_TEXT, , )};
     return names[static_cast<int>(level)];
 }
 #undef VOREL_LEVEL_TEXT
