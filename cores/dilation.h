@@ -23,17 +23,15 @@ struct Dilation {
     const DiscShape* disc;
     int64_t left;  ///< the columns that are wanted, the source's own among them
     int64_t right;
-    uint8_t* memory;  ///< as many bytes as the kernel says; they need no values
-    uint8_t largest;  ///< for the kernels
+    int64_t bandRows;  ///< rows of results that are asked for at once, at most
+    uint8_t* memory;   ///< as many bytes as the kernel says; they need no values
+    uint8_t largest;   ///< for the kernels
 };
 
 /// Rows of results are so far apart.
 VOREL_INLINE int64_t dilatedStride(const Dilation& dilation) {
     return (dilation.right - dilation.left + 63) / 64 * 64;
 }
-
-/// Rows that are dilated in one go.
-constexpr int64_t kBandRows = 32;
 
 /// One disc of any weights stamped around each pixel of some source rows, as VFStroke::DilationWork
 /// tells.
@@ -53,7 +51,7 @@ struct DilationKernels {
     size_t (*memoryBytes)(const Dilation& dilation);
     /// Prepares the memory.
     void (*begin)(Dilation& dilation);
-    /// `count` rows of results from row y on, at most kBandRows, first column `left`.
+    /// `count` rows of results from row y on, at most bandRows, first column `left`.
     void (*dilateRows)(const Dilation& dilation, int64_t y, int64_t count, uint8_t* results);
     /// first = min(first, second), whole rows of results
     void (*keepSmaller)(uint8_t* first, const uint8_t* second, int64_t count);

@@ -21,7 +21,7 @@ inline CellPlanes cellPlanes(const Dilation& dilation) {
     const int64_t reach = dilation.disc->reach;
     Arena arena = {dilation.memory};
     CellPlanes planes;
-    planes.rows = takeRows(dilation, kBandRows + 2 * reach, reach, reach + kBytes, arena);
+    planes.rows = takeRows(dilation, dilation.bandRows + 2 * reach, reach, reach + kBytes, arena);
     planes.bytes = arena.used;
     return planes;
 }

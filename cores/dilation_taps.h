@@ -8,21 +8,21 @@
 /// Dilation by discs that are not large: all cells of the disc are looked at.
 ///
 /// A vector of results is the maximum of loads at fixed distances from the vector's own place, its taps.
-/// A run of full cells takes few taps where rows of windowed maxima stand beside the rows of coverage.
-/// TapList come in fours of equal weight, which share one subtraction: a cell of the rim has its mirror
-/// images, and a tap too many is one that was there already, as that changes no maximum.
+/// A run of full cells takes few taps, as rows of windowed maxima stand beside the rows of coverage.
+/// Taps come in fours of equal weight, which share one subtraction: a cell of the rim has its mirror
+/// images, and where a tap is missing another one stands twice, which changes no maximum.
 ///
-/// Vectors with nothing covered in the square around their discs are left out. So are those that a
-/// single row fills: one whose windows of the longer kind are all full, and not too far away for these
-/// windows.
+/// Vectors with nothing covered in the square around their discs are left out, and so are vectors that a
+/// single row fills: all its windows there are full, and the disc's full cells hold a window in that
+/// row.
 ///
-/// Cost: 36 taps for a disc of radius 4, 100 for 8, for each vector along the outline; 20 instructions
-/// for any other one.
+/// Cost: 36 taps for a disc of radius 4, 104 for 8, for each vector along the outline; some 20
+/// instructions for any other one.
 namespace VFontEffect::internal::VOREL_LEVEL {
 
 constexpr int kLongestTappedReach = 8;
 
-/// Windows of so many pixels serve rows of full cells that are as long at least.
+/// A window reaches that far to both sides. It serves rows of full cells that are as long at least.
 VOREL_INLINE int64_t windowHalf(const DiscShape& disc) {
     return disc.reach < 5 ? 2 : 3;
 }
@@ -35,8 +35,9 @@ struct TapQuad {
 
 /// All taps of a disc.
 struct TapList {
-    // 17 rows of at most 5 taps, and at most 4 * reach cells in a quarter of the rim.
-    static constexpr int kMostQuads = 17 * 2 + 4 * kLongestTappedReach;
+    // At most 5 taps for each row of full cells, and 4 * reach cells in a quarter of the rim.
+    static constexpr int kMostQuads =
+        (5 * (2 * kLongestTappedReach + 1) + 3) / 4 + 4 * kLongestTappedReach;
 
     TapQuad quads[kMostQuads];
     int count;
@@ -61,7 +62,7 @@ struct TapPlanes {
 
 inline TapPlanes tapPlanes(const Dilation& dilation) {
     const int64_t reach = dilation.disc->reach;
-    const int64_t rowCount = kBandRows + 2 * reach;
+    const int64_t rowCount = dilation.bandRows + 2 * reach;
     Arena arena = {dilation.memory};
     TapPlanes planes;
     planes.vectors = (dilation.right - dilation.left + kBytes - 1) / kBytes;

@@ -144,9 +144,10 @@ inline void listDiscRows(const TilePlanes& planes, const DiscShape& disc) {
         row.rimCount = static_cast<int32_t>(evenAtLeast(cells, kFewestRimCells));
         row.firstRim = flat + 1;
         row.deficits = deficits;
-        for (int64_t i = 0; i < row.rimCount; ++i)
-            *deficits++ =
-                spread<Tile>(i < cells ? disc.rimDeficit[disc.rimStart[dy] + i] : uint8_t{255});
+        for (int64_t i = 0; i < row.rimCount; ++i) {
+            const uint8_t deficit = i < cells ? disc.rimDeficit[disc.rimStart[dy] + i] : 255;
+            *deficits++ = spread<Tile>(deficit);
+        }
     }
 }
 

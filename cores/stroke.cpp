@@ -26,6 +26,12 @@ constexpr int64_t kBorder = 1;
 constexpr uint8_t kCoverage = 0;
 constexpr uint8_t kInverse = 0xFF;
 
+/// Rows that are dilated and blended at once: enough not to prepare too many twice, few enough to stay
+/// in the cache, and fewer where the columns around a narrow outline outweigh its own.
+constexpr int64_t kBandRows = 32;
+constexpr int64_t kNarrowBandRows = 16;
+constexpr int64_t kNarrow = 256;
+
 /// A part of the outline, in the coordinates of the bordered source.
 struct Area {
     int64_t left;
@@ -80,6 +86,8 @@ class GrownCoverage {
         dilation.disc = &disc;
         dilation.left = std::min<int64_t>(area.left, 0);
         dilation.right = std::max(area.right, dilation.width);
+        const bool narrow = dilation.right - dilation.left < kNarrow;
+        dilation.bandRows = std::min(narrow ? kNarrowBandRows : kBandRows, area.bottom - area.top);
         return dilation;
     }
     static PixelBuffer<uint8_t> memoryFor(const Dilation& dilation) {
@@ -97,9 +105,8 @@ class Outline {
   public:
     Outline(const CoverageBox& box, const DiscShape& disc, const Area& area, int position)
         : mGrown(box, disc, area, position == kStrokeInside ? kInverse : kCoverage),
-          mBandRows(std::min(kBandRows, area.bottom - area.top)),
           mStride(dilatedStride(mGrown.dilation())),
-          mBand(PixelBuffer<uint8_t>::uninitialised(mStride * mBandRows,
+          mBand(PixelBuffer<uint8_t>::uninitialised(mStride * bandRows(),
                                                     position == kStrokeCentre ? 2 : 1)) {
         if (position == kStrokeCentre) mInverse.emplace(box, disc, area, kInverse);
     }
@@ -108,12 +115,12 @@ class Outline {
     int64_t left() const { return mGrown.dilation().left; }
     int64_t width() const { return mGrown.dilation().right - left(); }
     int64_t stride() const { return mStride; }
-    int64_t bandRows() const { return mBandRows; }
+    int64_t bandRows() const { return mGrown.dilation().bandRows; }
 
     uint8_t* band(int64_t y, int64_t count) {
         mGrown.rows(y, count, mBand.data());
         if (mInverse) {
-            uint8_t* const second = mBand.data() + mStride * mBandRows;
+            uint8_t* const second = mBand.data() + mStride * bandRows();
             mInverse->rows(y, count, second);
             dilationKernels().keepSmaller(mBand.data(), second, mStride * count);
         }
@@ -123,7 +130,6 @@ class Outline {
   private:
     GrownCoverage mGrown;
     std::optional<GrownCoverage> mInverse;
-    int64_t mBandRows;
     int64_t mStride;
     PixelBuffer<uint8_t> mBand;
 };
