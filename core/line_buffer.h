@@ -14,6 +14,7 @@ class LineBuffer {
         : mBytes(PixelBuffer<uint8_t>::uninitialised(width * height + kLineBytes)) {}
 
     explicit operator bool() const { return static_cast<bool>(mBytes); }
+    void release() { mBytes.release(); }
     uint8_t* data() {
         const uintptr_t offset = 0 - reinterpret_cast<uintptr_t>(mBytes.data());
         return mBytes.data() + offset % kLineBytes;

@@ -21,9 +21,10 @@ class PixelBuffer {
 
     PixelBuffer(PixelBuffer&& other) noexcept : mData(std::exchange(other.mData, nullptr)) {}
     PixelBuffer& operator=(PixelBuffer&&) = delete;
-    ~PixelBuffer() { std::free(mData); }
+    ~PixelBuffer() { release(); }
 
     explicit operator bool() const { return mData != nullptr; }
+    void release() { std::free(std::exchange(mData, nullptr)); }
     T* data() { return mData; }
     const T* data() const { return mData; }
     T& operator[](size_t i) { return mData[i]; }

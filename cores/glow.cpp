@@ -88,6 +88,7 @@ bool paintBlurred(const CoverageBox& box, const Shape& shape, const PlacedTarget
     Growth growth = coverageToGrow(box, flip, margin);
     if (!growth) return false;
     growth.grow(shape.passes, flip);
+    growth.finish();
 
     // Deliberate: between the passes of an inner glow the columns that the first pass does not reach are
     // full; with a radius of 0 those are that growth clears, the first one and the last.

@@ -78,16 +78,28 @@ void clearEndColumns(const Picture& picture) {
 
 }  // namespace
 
+namespace {
+
+int64_t strideFor(int64_t width) {
+    return kGrowthMargin + (width + kGrowthMargin - 1) / kGrowthMargin * kGrowthMargin;
+}
+
+/// Rows, frame and margins.
+LineBuffer planeFor(int64_t width, int64_t height) {
+    return LineBuffer(strideFor(width) * (height + 2) + 2 * kGrowthMargin);
+}
+
+}  // namespace
+
 Growth::Growth(int64_t width, int64_t height)
     : mWidth(width),
       mHeight(height),
-      mStride(kGrowthMargin + (width + kGrowthMargin - 1) / kGrowthMargin * kGrowthMargin),
-      mPlaneBytes(mStride * (height + 2) + 2 * kGrowthMargin),
-      mPlanes(mPlaneBytes, 2),
+      mStride(strideFor(width)),
+      mPlanes{planeFor(width, height), planeFor(width, height)},
       mTiles(PixelBuffer<uint8_t>::uninitialised(growthTileBytes(width, height))) {}
 
 uint8_t* Growth::rowOf(int plane, int64_t y) {
-    return mPlanes.data() + plane * mPlaneBytes + kGrowthMargin + (y + 1) * mStride;
+    return mPlanes[plane].data() + kGrowthMargin + (y + 1) * mStride;
 }
 
 /// The other plane's frame: as it is in this one above and below, `beside` at the sides.
@@ -109,6 +121,11 @@ void Growth::grow(int passes, uint8_t beside) {
                         passes,
                         mTiles.data()});
     if (passes % 2 != 0) mCurrent = 1 - mCurrent;
+}
+
+void Growth::finish() {
+    mPlanes[1 - mCurrent].release();
+    mTiles.release();
 }
 
 // What is not 0 spreads by a pixel a pass: the part that changes lies within `passes` pixels of it.

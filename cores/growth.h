@@ -15,7 +15,7 @@ class Growth {
     Growth(int64_t width, int64_t height);
 
     /// Whether there is memory for it.
-    explicit operator bool() const { return mPlanes && mTiles; }
+    explicit operator bool() const { return mPlanes[0] && mPlanes[1] && mTiles; }
 
     /// The coverage of row 0 to height - 1, between the frame's pixels at -1 and width; row -1 and row
     /// `height` are the frame's.
@@ -23,6 +23,9 @@ class Growth {
 
     /// From the second pass on the frame beside the rows is `beside`; above and below it stays.
     void grow(int passes, uint8_t beside);
+
+    /// Gives back the memory that only growing takes.
+    void finish();
 
     /// The coverage, each byte ^ flip.
     BlurSource source(uint8_t flip) { return {row(0), mStride, mWidth, mHeight, flip}; }
@@ -34,8 +37,7 @@ class Growth {
     int64_t mWidth;
     int64_t mHeight;
     int64_t mStride;
-    int64_t mPlaneBytes;
-    LineBuffer mPlanes;
+    LineBuffer mPlanes[2];
     PixelBuffer<uint8_t> mTiles;
     int mCurrent = 0;
 };

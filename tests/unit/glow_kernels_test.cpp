@@ -385,6 +385,67 @@ TYPED_TEST(GlowKernels, Growth_OfRandomMasksMatchesTheLiteralForm) {
     });
 }
 
+TYPED_TEST(GlowKernels, Growth_OfManyPassesMatchesTheLiteralForm) {
+    // Several tiles in each direction, of which some stop changing and start again.
+    forSeeds(4000, 250, [&](Random& random) {
+        const int width = random.between(1, 210);
+        const int height = random.between(1, 90);
+        const bool isSparse = random.chance(50);
+        const auto mask =
+            isSparse ? noiseMask(random, width, height, 99) : randomMask(random, width, height);
+        const int passes = random.between(1, 60);
+        std::vector<uint8_t> expected = mask.bytes;
+        literal::boxFilter(expected, passes, width, height);
+        EXPECT_EQ(expected, this->grown(mask.bytes, passes, width, height))
+            << width << " x " << height << ", passes " << passes;
+    });
+}
+
+TYPED_TEST(GlowKernels, Growth_OfFaintPixelsDiesOutLikeTheLiteralForm) {
+    // Below 4 a lone pixel vanishes in one pass; small groups of them come and go.
+    forSeeds(5000, 300, [&](Random& random) {
+        auto mask = noiseMask(random, random.between(3, 140), random.between(3, 40), 70);
+        for (uint8_t& coverage : mask.bytes)
+            coverage = static_cast<uint8_t>(coverage % 4);
+        const int passes = random.between(1, 30);
+        std::vector<uint8_t> expected = mask.bytes;
+        literal::boxFilter(expected, passes, mask.width, mask.height);
+        EXPECT_EQ(expected, this->grown(mask.bytes, passes, mask.width, mask.height));
+    });
+}
+
+TYPED_TEST(GlowKernels, Growth_OfFullMasksMatchesTheLiteralForm) {
+    for (int width = 1; width <= 130; ++width) {
+        const int height = 3 + width % 40;
+        const auto pixels = static_cast<size_t>(width * height);
+        for (int passes : {1, 2, 5}) {
+            std::vector<uint8_t> expected(pixels, 255);
+            literal::boxFilter(expected, passes, width, height);
+            ASSERT_EQ(expected, this->grown(std::vector<uint8_t>(pixels, 255), passes, width, height))
+                << width << " x " << height << ", passes " << passes;
+        }
+    }
+}
+
+TYPED_TEST(GlowKernels, Growth_OfInkAtTheEdgesMatchesTheLiteralForm) {
+    forSeeds(6000, 400, [&](Random& random) {
+        const int width = random.between(1, 100);
+        const int height = random.between(3, 50);
+        std::vector<uint8_t> mask(static_cast<size_t>(width * height), 0);
+        for (int i = random.between(1, 6); i > 0; --i) {
+            const bool atSide = random.chance(50);
+            const int x = atSide ? (random.chance(50) ? 0 : width - 1) : random.between(0, width - 1);
+            const int y = atSide ? random.between(0, height - 1) : (random.chance(50) ? 0 : height - 1);
+            mask[static_cast<size_t>(y * width + x)] = random.byte();
+        }
+        const int passes = random.between(1, 20);
+        std::vector<uint8_t> expected = mask;
+        literal::boxFilter(expected, passes, width, height);
+        EXPECT_EQ(expected, this->grown(mask, passes, width, height))
+            << width << " x " << height << ", passes " << passes;
+    });
+}
+
 TYPED_TEST(GlowKernels, Growth_OfTheGalleryMatchesTheLiteralForm) {
     for (const NamedMask& named : maskGallery()) {
         for (int passes : {1, 2, 19}) {
