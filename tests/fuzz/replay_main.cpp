@@ -10,7 +10,9 @@
 #include <iterator>
 #include <vector>
 
+#if defined(VOREL_FUZZ_PAINTS)
 #include "level_of_input.h"
+#endif
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size);
 
@@ -29,6 +31,19 @@ std::vector<fs::path> filesOf(const fs::path& path) {
     return files;
 }
 
+/// Runs an input, at every level of the instruction set if it paints.
+void run(const std::vector<char>& bytes) {
+    const auto* const data = reinterpret_cast<const uint8_t*>(bytes.data());
+#if defined(VOREL_FUZZ_PAINTS)
+    for (size_t i = 0; i < vorel_test::levelsHere().size(); ++i) {
+        vorel_fuzz::levelOffset = i;
+        LLVMFuzzerTestOneInput(data, bytes.size());
+    }
+#else
+    LLVMFuzzerTestOneInput(data, bytes.size());
+#endif
+}
+
 /// Milliseconds that the input took; negative when it cannot be read. The name is printed first, for
 /// the input may end the program.
 double replay(const fs::path& path) {
@@ -38,10 +53,7 @@ double replay(const fs::path& path) {
                                   std::istreambuf_iterator<char>()};
     std::fprintf(stderr, "%s\n", path.c_str());
     const auto start = std::chrono::steady_clock::now();
-    for (size_t i = 0; i < vorel_test::levelsHere().size(); ++i) {
-        vorel_fuzz::levelOffset = i;
-        LLVMFuzzerTestOneInput(reinterpret_cast<const uint8_t*>(bytes.data()), bytes.size());
-    }
+    run(bytes);
     const std::chrono::duration<double, std::milli> taken = std::chrono::steady_clock::now() - start;
     return taken.count();
 }
