@@ -223,7 +223,7 @@ VOREL_INLINE WeightCell cellOf(const uint8_t* weights) {
 VOREL_INLINE Weights weightsAt(const WeightCell* cells) {
     return cells;
 }
-template <int kFour>
+template <int64_t kFour>
 VOREL_INLINE Words addDots(Words sums, Taps taps, Weights weights) {
     const uint8_t* const w = weights + 4 * kFour;
     return sums + (w[0] * taps[0] + w[1] * taps[1] + w[2] * taps[2] + w[3] * taps[3]);
@@ -330,7 +330,7 @@ VOREL_INLINE WeightCell cellOf(const uint8_t* weights) {
 VOREL_INLINE Weights weightsAt(const WeightCell* cells) {
     return cells;
 }
-template <int kFour>
+template <int64_t kFour>
 VOREL_INLINE Words addDots(Words sums, Taps taps, Weights weights) {
     const __m512i four = _mm512_set1_epi32(load<int>(weights + 4 * kFour));
     return as<Words>(_mm512_dpbusd_epi32(as<__m512i>(sums), four, as<__m512i>(taps)));
@@ -437,7 +437,7 @@ VOREL_INLINE Weights weightsAt(const WeightCell* cells) {
     return cells;
 }
 /// The sums of two products, each up to 256 * -128 or 256 * 127, just fit in 16 bits.
-template <int kFour>
+template <int64_t kFour>
 VOREL_INLINE Words addDots(Words sums, Taps taps, Weights weights) {
     const __m256i four = _mm256_set1_epi32(load<int>(weights + 4 * kFour));
     const __m256i pairs = _mm256_maddubs_epi16(four, as<__m256i>(taps));
@@ -547,7 +547,7 @@ VOREL_INLINE WeightCell cellOf(const uint8_t* weights) {
 VOREL_INLINE Weights weightsAt(const WeightCell* cells) {
     return cells;
 }
-template <int kFour>
+template <int64_t kFour>
 VOREL_INLINE Words addDots(Words sums, Taps taps, Weights weights) {
     const __m128i even = _mm_madd_epi16(as<__m128i>(taps.even), as<__m128i>(weights[4 * kFour]));
     const __m128i odd = _mm_madd_epi16(as<__m128i>(taps.odd), as<__m128i>(weights[4 * kFour + 1]));
@@ -645,13 +645,13 @@ VOREL_INLINE Weights weightsAt(const WeightCell* cells) {
     return vld1q_u8(cells);
 }
 #if defined(__ARM_FEATURE_DOTPROD)
-template <int kFour>
+template <int64_t kFour>
 VOREL_INLINE Words addDots(Words sums, Taps taps, Weights weights) {
     return as<Words>(vdotq_laneq_u32(as<uint32x4_t>(sums), as<uint8x16_t>(taps), weights, kFour));
 }
 #else
 /// The sums of two products, of weights of 256 together, just fit in 16 bits.
-template <int kFour>
+template <int64_t kFour>
 VOREL_INLINE Words addDots(Words sums, Taps taps, Weights weights) {
     const auto four = vreinterpretq_u8_u32(vdupq_laneq_u32(vreinterpretq_u32_u8(weights), kFour));
     const uint16x8_t low = vmull_u8(vget_low_u8(as<uint8x16_t>(taps)), vget_low_u8(four));

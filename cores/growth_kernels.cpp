@@ -165,10 +165,9 @@ struct GlowPainter {
     VOREL_INLINE bool isEmpty(const Place& place) const { return hasEmptyMask(place); }
     VOREL_INLINE bool paintWhole(const Place&) const { return false; }
     VOREL_INLINE Pixels paint(const Place& place) const {
-        uint8_t colours[4 * kPixels];
-        for (int i = 0; i < kPixels; i += kWords)
-            store(colours + 4 * i, gathered(pixels, place.mask() + i));
-        return DstOver::apply(loadPixels(place.destination()), loadPixels(colours));
+        const Pixels colours =
+            madeOfWords([&](int64_t i) { return gathered(pixels, place.mask() + i); });
+        return DstOver::apply(loadPixels(place.destination()), colours);
     }
 };
 
