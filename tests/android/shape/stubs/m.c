@@ -2,5 +2,6 @@
 
 FUNCTION(cosf)
 FUNCTION(ldexp)
+FUNCTION(nextafterf)
 FUNCTION(sinf)
 FUNCTION(tanf)
