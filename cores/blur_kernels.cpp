@@ -295,12 +295,14 @@ struct NarrowMethod {
     VOREL_INLINE Row mean(const uint8_t* centre, int64_t step) const {
         const Row middle = loadRow(centre);
         Row sums = {middle.left * weights[0] + start, middle.right * weights[0] + start};
-        for (int k = 1; k <= radius; ++k) {
+        unrolled<kLargestNarrowRadius>([&](auto i) VOREL_INLINE_LAMBDA {
+            constexpr int k = i.value + 1;
+            if (k > radius) return;
             const Row before = loadRow(centre - k * step);
             const Row after = loadRow(centre + k * step);
             sums.left += (before.left + after.left) * weights[k];
             sums.right += (before.right + after.right) * weights[k];
-        }
+        });
         return {multiplyHigh(sums.left, multiplier) >> kNarrowShift,
                 multiplyHigh(sums.right, multiplier) >> kNarrowShift};
     }
