@@ -4,3 +4,5 @@
 /// calling convention; outside of it, because a copy that the linker could share between levels would
 /// run one level's instructions at another.
 #define VOREL_INLINE inline __attribute__((always_inline))
+/// The same for a lambda, behind its parameters.
+#define VOREL_INLINE_LAMBDA __attribute__((always_inline))

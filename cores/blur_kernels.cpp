@@ -92,7 +92,7 @@ struct Group {
     static VOREL_INLINE Group of(const SourceStrip& strip, int64_t y) {
         if (!strip.has(y) || !strip.has(y + kQuad - 1)) return atEdge(strip, y);
         Group group;
-        unrolled<kQuad>([&](auto i) {
+        unrolled<kQuad>([&](auto i) VOREL_INLINE_LAMBDA {
             const int64_t row = y + i.value;
             group.rows[i.value] = strip.count == kBytes ? strip.whole(row) : strip.part(row);
         });
@@ -155,11 +155,11 @@ struct DotMethod {
     static VOREL_INLINE void addSteps(Grid& grid, const TapSource& from, const WeightCell* weights) {
         const Weights strings[kQuad] = {weightsAt(weights), weightsAt(weights - 1),
                                         weightsAt(weights - 2), weightsAt(weights - 3)};
-        unrolled<kSteps>([&](auto s) {
-            unrolled<kGridVectors>([&](auto v) {
+        unrolled<kSteps>([&](auto s) VOREL_INLINE_LAMBDA {
+            unrolled<kGridVectors>([&](auto v) VOREL_INLINE_LAMBDA {
                 const Taps taps =
                     tapsOf(load<Bytes>(from.start + s.value * from.step + v.value * from.vectorStride));
-                unrolled<kQuad>([&](auto j) {
+                unrolled<kQuad>([&](auto j) VOREL_INLINE_LAMBDA {
                     Words& sum = grid.sums[v.value][j.value];
                     sum = addDots<s.value>(sum, taps, strings[j.value]);
                 });
@@ -176,9 +176,10 @@ struct DotMethod {
     /// The sums over `steps` of the taps, the first of which are at `from`.
     VOREL_INLINE Grid sums(TapSource from, const Range& steps) const {
         Grid grid;
-        unrolled<kQuad>([&](auto j) {
+        unrolled<kQuad>([&](auto j) VOREL_INLINE_LAMBDA {
             const Words begin = start(steps, j.value);
-            unrolled<kGridVectors>([&](auto v) { grid.sums[v.value][j.value] = begin; });
+            unrolled<kGridVectors>([&](auto v)
+                                       VOREL_INLINE_LAMBDA { grid.sums[v.value][j.value] = begin; });
         });
         int64_t step = steps.first;
         for (; step + kStepsAtOnce <= steps.end; step += kStepsAtOnce) {
@@ -202,30 +203,32 @@ struct DotMethod {
     template <class GroupAt, class Store>
     VOREL_INLINE void quadDown(const Range& steps, GroupAt groupAt, Store store) const {
         Halves halves[2][kQuad];
-        unrolled<4 / kGridVectors>([&](auto part) {
+        unrolled<4 / kGridVectors>([&](auto part) VOREL_INLINE_LAMBDA {
             constexpr int kVector = part.value * kGridVectors;
             const uint8_t* const from = groupAt(steps.first) + kVector * kBytes;
             const Grid grid = sums({from, kBytes, kGroupBytes}, steps);
-            unrolled<kGridVectors / 2>([&](auto pair) {
+            unrolled<kGridVectors / 2>([&](auto pair) VOREL_INLINE_LAMBDA {
                 constexpr int kPair = pair.value * 2;
-                unrolled<kQuad>([&](auto j) {
+                unrolled<kQuad>([&](auto j) VOREL_INLINE_LAMBDA {
                     halves[(kVector + kPair) / 2][j.value] = packed(
                         quotient(grid.sums[kPair][j.value]), quotient(grid.sums[kPair + 1][j.value]));
                 });
             });
         });
-        unrolled<kQuad>([&](auto j) { store(j.value, packed(halves[0][j.value], halves[1][j.value])); });
+        unrolled<kQuad>([&](auto j) VOREL_INLINE_LAMBDA {
+            store(j.value, packed(halves[0][j.value], halves[1][j.value]));
+        });
     }
 
     /// A vector of results in each of four rows; the taps of step 0 are at column `tapColumn`.
     template <class Store>
     VOREL_INLINE void quadAcross(const Range& steps, const uint8_t* rows, int64_t stride,
                                  int64_t tapColumn, Store store) const {
-        unrolled<4 / kGridVectors>([&](auto part) {
+        unrolled<4 / kGridVectors>([&](auto part) VOREL_INLINE_LAMBDA {
             constexpr int kRow = part.value * kGridVectors;
             const uint8_t* const from = rows + kRow * stride + (tapColumn + 4 * steps.first);
             const Grid grid = sums({from, stride, 4}, steps);
-            unrolled<kGridVectors>([&](auto v) {
+            unrolled<kGridVectors>([&](auto v) VOREL_INLINE_LAMBDA {
                 const Words* const four = grid.sums[v.value];
                 store(kRow + v.value, as<Bytes>(quotient(four[0]) | quotient(four[1]) << 8 |
                                                 quotient(four[2]) << 16 | quotient(four[3]) << 24));
@@ -283,20 +286,23 @@ struct NarrowMethod {
     }
 
     static VOREL_INLINE void storeGroup(const Group& group, uint8_t* to) {
-        unrolled<kQuad>(
-            [&](auto i) { storeMiddle(rowOf(group.rows[i.value]), to + i.value * kRowBytes); });
+        unrolled<kQuad>([&](auto i) VOREL_INLINE_LAMBDA {
+            storeMiddle(rowOf(group.rows[i.value]), to + i.value * kRowBytes);
+        });
     }
 
     /// The mean of the taps around `centre`, `step` bytes apart.
     VOREL_INLINE Row mean(const uint8_t* centre, int64_t step) const {
         const Row middle = loadRow(centre);
         Row sums = {middle.left * weights[0] + start, middle.right * weights[0] + start};
-        for (int k = 1; k <= radius; ++k) {
+        unrolled<kLargestNarrowRadius>([&](auto i) VOREL_INLINE_LAMBDA {
+            constexpr int k = i.value + 1;
+            if (k > radius) return;
             const Row before = loadRow(centre - k * step);
             const Row after = loadRow(centre + k * step);
             sums.left += (before.left + after.left) * weights[k];
             sums.right += (before.right + after.right) * weights[k];
-        }
+        });
         return {multiplyHigh(sums.left, multiplier) >> kNarrowShift,
                 multiplyHigh(sums.right, multiplier) >> kNarrowShift};
     }
@@ -348,14 +354,17 @@ template <class Method, class Store>
 VOREL_INLINE void quadDown(const Method& method, const TapColumns& columns, int64_t quad, int radius,
                            Store store) {
     for (int64_t strip = 0; strip * kBytes < columns.width; ++strip) {
-        const auto storeRow = [&](int j, const typename Method::Row& row) { store(strip, j, row); };
+        const auto storeRow = [&](int j, const typename Method::Row& row)
+                                  VOREL_INLINE_LAMBDA { store(strip, j, row); };
         const Range steps = inkedSteps(columns, strip, quad, radius);
         if (steps.empty()) {
             for (int j = 0; j < kQuad; ++j)
                 storeRow(j, typename Method::Row{});
         } else {
             method.quadDown(
-                steps, [&](int64_t step) { return groupAt<Method>(columns, strip, quad + step); },
+                steps,
+                [&](int64_t step)
+                    VOREL_INLINE_LAMBDA { return groupAt<Method>(columns, strip, quad + step); },
                 storeRow);
         }
     }
@@ -393,7 +402,7 @@ void down(const PreparedBlur& blur, const TapColumns& columns, int64_t quad, con
     for (int64_t strip = 0; strip * kBytes < columns.width; ++strip)
         middle.inked[firstStrip + strip] = !inkedSteps(columns, strip, quad, blur.radius).empty();
     quadDown(Method::of(blur, false), columns, quad, blur.radius,
-             [&](int64_t strip, int j, const typename Method::Row& row) {
+             [&](int64_t strip, int j, const typename Method::Row& row) VOREL_INLINE_LAMBDA {
                  Method::storeMiddle(row, middleAt<Method>(middle, (firstStrip + strip) * kBytes, j));
              });
     if (middle.fullBefore > 0 || middle.fullFrom < middle.columns) fillFullColumns<Method>(middle);
@@ -403,7 +412,7 @@ template <class Method>
 void downToBytes(const PreparedBlur& blur, const TapColumns& columns, int64_t quad,
                  const BlurRows& out) {
     quadDown(Method::of(blur, out.ending.roundsUp), columns, quad, blur.radius,
-             [&](int64_t strip, int j, const typename Method::Row& row) {
+             [&](int64_t strip, int j, const typename Method::Row& row) VOREL_INLINE_LAMBDA {
                  store(out.start + j * out.stride + strip * kBytes,
                        Method::bytesOf(row) ^ out.ending.flip);
              });
@@ -444,7 +453,7 @@ void across(const PreparedBlur& blur, const MiddleRows& middle, int64_t left, in
             const BlurRows& out) {
     const Method method = Method::of(blur, out.ending.roundsUp);
     for (int64_t x = left; x < right; x += kBytes) {
-        const auto storeRow = [&](int j, Bytes row) {
+        const auto storeRow = [&](int j, Bytes row) VOREL_INLINE_LAMBDA {
             store(out.start + j * out.stride + (x - left), row ^ out.ending.flip);
         };
         const Range steps = inkedSteps(middle, x, blur.radius);
@@ -462,7 +471,7 @@ void across(const PreparedBlur& blur, const MiddleRows& middle, int64_t left, in
 // --------------------------------------------------------------------------------------------
 
 void fillCells(const uint32_t* weights, int radius, uint8_t* cells) {
-    const auto weightAt = [&](int64_t distance) {
+    const auto weightAt = [&](int64_t distance) VOREL_INLINE_LAMBDA {
         const int64_t k = distance < 0 ? -distance : distance;
         return static_cast<uint8_t>(k <= radius ? weights[k] : 0);
     };

@@ -68,10 +68,8 @@ Growth coverageToGrow(const CoverageBox& box, uint8_t flip, int64_t margin) {
             std::memset(row, flip, 2 * side + static_cast<size_t>(box.width));
             continue;
         }
-        const uint8_t* const source = box.row(y);
         std::memset(row, flip, side);
-        std::transform(source, source + box.width, row + side,
-                       [flip](uint8_t coverage) { return static_cast<uint8_t>(coverage ^ flip); });
+        glowKernels().copyFlipped(box.row(y), box.width, flip, row + side);
         std::memset(row + side + box.width, flip, side);
     }
     return growth;

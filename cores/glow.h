@@ -2,11 +2,13 @@
 
 #include <cstdint>
 
-#include "cores/padded_mask.h"
 #include "voreleffect/VFECore.h"
 
 /// The machinery of both glows.
 namespace VFontEffect::internal {
+
+/// Whether a glow lies around the coverage or around its inverse.
+enum class Sense { plain, inverted };
 
 /// What a glow reads from its record.
 struct GlowRecord {
@@ -29,7 +31,6 @@ int glowReach(const GlowRecord& record);
 /// The colours from the text outwards, straight; see VFOuterGlow::makeColorLUT.
 void fillGlowTable(const GlowRecord& record, float fadeStart, int curve, unsigned int* table);
 
-/// Paints a glow around the coverage (plain) or around its inverse (inverted).
 void paintGlow(const VFECore::ParamPostProcessing* params, const GlowRecord& record, Sense sense);
 
 }  // namespace VFontEffect::internal

@@ -148,6 +148,14 @@ bool growPass(const GrowthJob& job, int from, Tiles& tiles) {
     return changed;
 }
 
+void copyFlipped(const uint8_t* from, int64_t count, uint8_t flip, uint8_t* to) {
+    int64_t x = 0;
+    for (; x + kBytes <= count; x += kBytes)
+        store(to + x, load<Bytes>(from + x) ^ flip);
+    for (; x < count; ++x)
+        to[x] = from[x] ^ flip;
+}
+
 /// When nothing changes any more both planes are the same.
 void grow(const GrowthJob& job) {
     Tiles tiles(job);
@@ -177,6 +185,6 @@ void paint(const GlowJob& job) {
 
 }  // namespace
 
-extern const GlowKernels kGlowKernels = {grow, paint};
+extern const GlowKernels kGlowKernels = {copyFlipped, grow, paint};
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

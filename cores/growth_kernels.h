@@ -38,6 +38,8 @@ struct GlowJob {
 };
 
 struct GlowKernels {
+    /// Copies `count` bytes, each ^ flip.
+    void (*copyFlipped)(const uint8_t* from, int64_t count, uint8_t flip, uint8_t* to);
     /// Grows plane 0 by turns; the result is in plane `passes` % 2.
     void (*grow)(const GrowthJob& job);
     /// The values' colours beneath the destination. That of 0 must be transparent.
