@@ -43,7 +43,7 @@ cmake --build --preset bench -- --quiet
 
 describe_run() {
     local model cores
-    model=$(sed -n 's/^model name[^:]*: //p' /proc/cpuinfo | head -n 1)
+    model=$(sed -n '/^model name[^:]*: /{s///p;q}' /proc/cpuinfo)
     cores=$(nproc)
     echo "Commit $(git rev-parse --short HEAD), $(clang++-14 --version | head -n 1);" \
         "$model, $cores cores, $(grep -om 1 -w -e avx512_vnni -e avx2 /proc/cpuinfo | sort -r | head -n 1)."

@@ -33,7 +33,7 @@ paint() {
         { echo "$name: not built with the library in $prefix" >&2; return 1; }
     quietly cmake --build "$build/$name"
     (cd "$pictures" && "$build/$name/$name" "$@")
-    file -b "$pictures/$picture" | grep -q 'image data' || { echo "$name: no picture" >&2; return 1; }
+    [[ $(file -b "$pictures/$picture") == *"image data"* ]] || { echo "$name: no picture" >&2; return 1; }
     echo "$name: build/examples/pictures/$picture"
 }
 

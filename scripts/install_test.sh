@@ -11,7 +11,7 @@ need_packages cmake ninja-build g++ pkg-config binutils python3
 source=$PWD
 build=$source/build/install
 outside=$(mktemp -d)
-version=$(sed -n 's/^## \([0-9.]*\) .*/\1/p' CHANGELOG.md | head -n 1)
+version=$(sed -n '/^## \([0-9.]*\) .*/{s//\1/p;q}' CHANGELOG.md)
 packages=()
 clean_up() {
     rm -rf "$outside"
@@ -117,7 +117,7 @@ files=$(scripts/debian.sh)
 mapfile -t files <<< "$files"
 names=(libvoreleffect1 libvoreleffect-dev vorelpaint)
 for file in "${files[@]}"; do
-    [[ $file == */libvoreleffect1_* ]] || dpkg-deb --field "$file" Depends | grep -q 'libvoreleffect1 (' ||
+    [[ $file == */libvoreleffect1_* || $(dpkg-deb --field "$file" Depends) == *"libvoreleffect1 ("* ]] ||
         fail "$file does not depend on libvoreleffect1"
 done
 ! dpkg-query -W "${names[@]}" 2> /dev/null | grep . || fail "a package is installed already: not touched"
@@ -129,6 +129,8 @@ picture=$outside/picture.png
 (cd / && vorelpaint --preset gold -o "$picture" "Installed")
 [[ $(file -b "$picture") == PNG* ]] || fail "Debian: vorelpaint paints no picture"
 [[ $(vorelpaint --version) == "vorelpaint $version" ]] || fail "Debian: vorelpaint tells another version"
-ldd "$(command -v vorelpaint)" | grep -q '=> /lib.*libvoreleffect.so.1\|=> /usr/lib.*libvoreleffect.so.1' ||
+# Kept whole before it is searched: a search that ends at its first match would break ldd's pipe.
+taken=$(ldd "$(command -v vorelpaint)")
+grep -q '=> \(/usr\)\?/lib.*libvoreleffect.so.1' <<< "$taken" ||
     fail "Debian: vorelpaint does not take the library from its package"
 echo "Debian: vorelpaint paints"

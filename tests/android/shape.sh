@@ -45,7 +45,7 @@ check_library() {
     shift
     same "$library: NEEDED" "$(lines "$@")" "$(dynamic "$library" NEEDED)"
     same "$library: SONAME" "$(basename "$library")" "$(dynamic "$library" SONAME)"
-    ! readelf --wide -d "$library" | grep -q TEXTREL || complain "$library: has text relocations"
+    [[ $(readelf --wide -d "$library") != *TEXTREL* ]] || complain "$library: has text relocations"
     for alignment in $(readelf --wide -l "$library" | awk '$1 == "LOAD" { print $NF }'); do
         ((alignment >= 16384)) || complain "$library: a segment is aligned to $alignment, less than 16 KB"
     done
