@@ -29,7 +29,7 @@ VFBlender::VFBlender() = default;
 VFBlender::~VFBlender() = default;
 
 void VFBlender::drawBitmap(int x, int y, const VFBitmap* dst, VFBitmap* src, unsigned int color) {
-    const MaskView mask = MaskView::of(src);
+    const MaskView mask = MaskView::ofBytes(src);
     if (!mask) return;
     drawBitmap(x, y, dst, mask.data, saturateToInt(mask.width), saturateToInt(mask.height), color);
 }
@@ -46,7 +46,7 @@ void VFBlender::drawBitmap(int x, int y, const VFBitmap* dst, unsigned char* mas
 
 void VFBlender::drawBitmap8To8(int x, int y, const VFBitmap* dst, unsigned char* mask, int maskWidth,
                                int maskHeight) {
-    const MaskView target = MaskView::of(dst);
+    const MaskView target = MaskView::ofBytes(dst);
     if (!target || mask == nullptr) return;
     const Clip clip = clipPlacement(x, y, maskWidth, maskHeight, target.width, target.height);
     if (clip.empty()) return;

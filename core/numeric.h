@@ -41,6 +41,11 @@ inline int32_t wholeDegrees(float degrees, int32_t turn) {
     return reduced < 0 ? reduced + turn : reduced;
 }
 
+/// The smallest multiple that is not below `value`, of 0 or more.
+VOREL_INLINE int64_t roundedUp(int64_t value, int64_t multiple) {
+    return (value + multiple - 1) / multiple * multiple;
+}
+
 /// A 64-bit coordinate cut to the range of an int.
 inline int saturateToInt(int64_t value) {
     constexpr int64_t kLow = std::numeric_limits<int>::min();

@@ -27,8 +27,14 @@ struct PixelView {
     int64_t height = 0;
 
     static PixelView of(const VFBitmap* bitmap) {
-        if (bitmap == nullptr || bitmap->mData == nullptr || bitmap->mBytesPerPixel != BytesPerPixel ||
-            !fitsByteCount(bitmap->mWidth, bitmap->mHeight, BytesPerPixel)) {
+        return bitmap != nullptr && bitmap->mBytesPerPixel == BytesPerPixel ? ofBytes(bitmap)
+                                                                            : PixelView{};
+    }
+
+    /// Takes the bytes of a bitmap for such pixels, of which each must have as many or more.
+    static PixelView ofBytes(const VFBitmap* bitmap) {
+        if (bitmap == nullptr || bitmap->mData == nullptr || bitmap->mBytesPerPixel < BytesPerPixel ||
+            !fitsByteCount(bitmap->mWidth, bitmap->mHeight, bitmap->mBytesPerPixel)) {
             return {};
         }
         return {bitmap->mData, bitmap->mWidth, bitmap->mHeight};

@@ -24,7 +24,8 @@ class VF_API VFBlender {
     /// @name Copies of a coverage mask
     /// @{
 
-    /// Copies the pixels of the mask `src` as the next operation does.
+    /// Copies the pixels of the mask `src` as the next operation does. Of wider pixels the first
+    /// width * height bytes are taken.
     void drawBitmap(int x, int y, const VFBitmap* dst, VFBitmap* src, unsigned int color);
 
     /// drawBitmap8To32 into a destination of 4 bytes per pixel, drawBitmap8To8 into any other.
@@ -32,7 +33,8 @@ class VF_API VFBlender {
     void drawBitmap(int x, int y, const VFBitmap* dst, unsigned char* mask, int maskWidth,
                     int maskHeight, unsigned int color);
 
-    /// dst = max(dst, mask) into a destination of 1 byte per pixel. A mask over itself changes nothing.
+    /// dst = max(dst, mask) into a destination of 1 byte per pixel, or into the first width * height
+    /// bytes of a wider one. A mask over itself changes nothing.
     void drawBitmap8To8(int x, int y, const VFBitmap* dst, unsigned char* mask, int maskWidth,
                         int maskHeight);
 

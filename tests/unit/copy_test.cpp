@@ -237,17 +237,58 @@ TEST(CopyLimits, NullArgumentsDrawNothing) {
     }
 }
 
-TEST(CopyLimits, OtherBytesPerPixelDrawNothing) {
-    VFBlender blender;
+TEST(CopyLimits, OtherBytesPerPixelAreNotColour) {
     uint8_t mask[] = {255, 255, 255, 255};
-    for (const unsigned bytesPerPixel : {0U, 1U, 2U, 3U, 4U, 5U, 0xFFFFFFFFU}) {
+    for (const unsigned bytesPerPixel : {0U, 1U, 2U, 3U, 5U, 0xFFFFFFFFU}) {
         GuardedBitmap dst(4, 4, 5);
         dst.bitmap()->mBytesPerPixel = bytesPerPixel;
         const std::vector<uint8_t> before = bytesOf(dst.pixels());
-        if (bytesPerPixel != 1) blender.drawBitmap8To8(0, 0, dst.bitmap(), mask, 2, 2);
-        if (bytesPerPixel != 4) blender.drawBitmap8To32(0, 0, dst.bitmap(), mask, 2, 2, 0xFFFFFFFF);
-        if (bytesPerPixel != 1 && bytesPerPixel != 4)
-            blender.drawBitmap(0, 0, dst.bitmap(), mask, 2, 2, 0xFFFFFFFF);
+        VFBlender().drawBitmap8To32(0, 0, dst.bitmap(), mask, 2, 2, 0xFFFFFFFF);
+        EXPECT_EQ(bytesOf(dst.pixels()), before) << bytesPerPixel;
+    }
+}
+
+TEST(CopyLimits, AllButFourBytesPerPixelTakeCoverage) {
+    uint8_t mask[] = {10, 20, 30, 40};
+    for (const int bytesPerPixel : {1, 2, 3, 5}) {
+        GuardedBitmap dst(4, 2, bytesPerPixel);
+        std::fill(dst.pixels().begin(), dst.pixels().end(), uint8_t{15});
+        // Rows of the destination are as many bytes apart as it has columns.
+        std::vector<uint8_t> expected = bytesOf(dst.pixels());
+        expected[1] = 20;
+        expected[4] = 30;
+        expected[5] = 40;
+        VFBlender().drawBitmap(0, 0, dst.bitmap(), mask, 2, 2, 0xFFFFFFFF);
+        EXPECT_EQ(bytesOf(dst.pixels()), expected) << bytesPerPixel;
+    }
+}
+
+TEST(CopyLimits, CoverageIsMergedIntoColourTooWhenAskedFor) {
+    uint8_t mask[] = {10, 20, 30, 40};
+    GuardedBitmap dst(2, 2, 4);
+    std::fill(dst.pixels().begin(), dst.pixels().end(), uint8_t{15});
+    VFBlender().drawBitmap8To8(0, 0, dst.bitmap(), mask, 2, 2);
+    std::vector<uint8_t> expected(16, 15);
+    std::copy_n(std::begin({15, 20, 30, 40}), 4, expected.begin());
+    EXPECT_EQ(bytesOf(dst.pixels()), expected);
+}
+
+TEST(CopyLimits, MaskOfWidePixelsGivesItsFirstBytes) {
+    uint8_t bytes[] = {1, 2, 3, 4, 5, 6, 7, 8, 9, 10, 11, 12};
+    VFBitmap source(2, 2, bytes, 3);
+    GuardedBitmap dst(2, 2, 1);
+    VFBlender().drawBitmap(0, 0, dst.bitmap(), &source, 0);
+    EXPECT_EQ(bytesOf(dst.pixels()), (std::vector<uint8_t>{1, 2, 3, 4}));
+}
+
+TEST(CopyLimits, PixelsOfNoBytesOrTooManyAreNotTouched) {
+    uint8_t mask[] = {255, 255, 255, 255};
+    for (const unsigned bytesPerPixel : {0U, 0x10000000U, 0xFFFFFFFFU}) {
+        GuardedBitmap dst(4, 4, 1);
+        const std::vector<uint8_t> before = bytesOf(dst.pixels());
+        dst.bitmap()->mBytesPerPixel = bytesPerPixel;
+        VFBlender().drawBitmap(0, 0, dst.bitmap(), mask, 2, 2, 0xFFFFFFFF);
+        VFBlender().drawBitmap8To8(0, 0, dst.bitmap(), mask, 2, 2);
         EXPECT_EQ(bytesOf(dst.pixels()), before) << bytesPerPixel;
     }
 }

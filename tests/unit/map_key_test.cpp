@@ -119,6 +119,15 @@ TEST(MapKey, WithColour_UsesTheTextOpacityAndIgnoresTheCallersAlpha) {
     EXPECT_EQ(keyWith(set, 0x12FF8000), textFragment(0));
 }
 
+TEST(MapKey, TranslucentFills_ShareAKeyWhicheverOpacityMakesThem) {
+    VFEffect knockedOut;
+    knockedOut.setTextOpacity(0.5F);
+    VFEffect letThrough;
+    letThrough.addText(0xFF8000, 0.5F);
+    EXPECT_EQ(keyWith(knockedOut, 0xFF8000), textFragment(0x80804000));
+    EXPECT_EQ(keyOf(letThrough), textFragment(0x80804000));
+}
+
 TEST(MapKey, WithColour_ReArmsTheOrderAndWithoutItDoesNot) {
     VFEffect set;
     set.addOuterShadowText(0, 1, 1, 0, 1);
