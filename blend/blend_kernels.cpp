@@ -2,33 +2,29 @@
 #include <cstring>
 
 #include "blend/kernels.h"
+#include "blend/pieces.h"
 #include "blend/rows.h"
 #include "blend/rules.h"
 
 namespace VFontEffect::internal::VOREL_LEVEL {
 namespace {
 
-/// Whether kBytes pixels are nothing but zeros; the first of them mostly tell.
-VOREL_INLINE bool isClear(const uint8_t* pixels) {
-    Bytes all = load<Bytes>(pixels);
-    if (!allZero(all)) return false;
-    for (int64_t i = 1; i < 4; ++i)
-        all |= load<Bytes>(pixels + i * kBytes);
-    return allZero(all);
-}
-
 /// One colour through the mask.
 template <class Rule>
 struct MaskPainter {
     static constexpr bool kReadsImage = false;
     static constexpr bool kReadsMask = true;
+    static constexpr bool kIsSparse = Rule::kIsSparse;
     static constexpr Empty kEmpty = Rule::kEmpty;
     Pixels colour;
     Pixels fullOverNothing;  ///< what full coverage paints over transparent pixels
 
-    VOREL_INLINE bool isEmpty(const Place& place) const { return hasEmptyMask(place); }
+    template <int64_t kCount>
+    VOREL_INLINE bool isEmpty(const Place& place) const {
+        return hasEmptyMask<kCount>(place);
+    }
     VOREL_INLINE bool paintWhole(const Place& place) const {
-        if (!hasFullMask(place) || !isClear(place.destination())) return false;
+        if (!hasFullMask(place) || !isClear<kBytes>(place.destination())) return false;
         for (int64_t x = 0; x < kBytes; x += kPixels)
             storePixels(place.destination() + 4 * x, fullOverNothing);
         return true;
@@ -41,10 +37,14 @@ struct MaskPainter {
 struct SolidPainter {
     static constexpr bool kReadsImage = false;
     static constexpr bool kReadsMask = true;
+    static constexpr bool kIsSparse = false;
     static constexpr Empty kEmpty = Empty::keeps;
     Pixels colour;
 
-    VOREL_INLINE bool isEmpty(const Place&) const { return false; }
+    template <int64_t>
+    VOREL_INLINE bool isEmpty(const Place&) const {
+        return false;
+    }
     VOREL_INLINE bool paintWhole(const Place&) const { return false; }
     VOREL_INLINE Pixels paint(const Place& place) const {
         return SolidColour::apply(loadAmounts(place.mask()), colour);
@@ -56,9 +56,13 @@ template <class Rule, Pixels (*Load)(const uint8_t*)>
 struct ImagePainter {
     static constexpr bool kReadsImage = true;
     static constexpr bool kReadsMask = false;
+    static constexpr bool kIsSparse = false;
     static constexpr Empty kEmpty = Empty::keeps;
 
-    VOREL_INLINE bool isEmpty(const Place& place) const { return isClear(place.image()); }
+    template <int64_t kCount>
+    VOREL_INLINE bool isEmpty(const Place& place) const {
+        return isClear<kCount>(place.image());
+    }
     VOREL_INLINE bool paintWhole(const Place&) const { return false; }
     VOREL_INLINE Pixels paint(const Place& place) const {
         return Rule::apply(loadPixels(place.destination()), Load(place.image()));
@@ -70,9 +74,13 @@ template <class Rule>
 struct MaskedImagePainter {
     static constexpr bool kReadsImage = true;
     static constexpr bool kReadsMask = true;
+    static constexpr bool kIsSparse = false;
     static constexpr Empty kEmpty = Rule::kEmpty;
 
-    VOREL_INLINE bool isEmpty(const Place& place) const { return hasEmptyMask(place); }
+    template <int64_t kCount>
+    VOREL_INLINE bool isEmpty(const Place& place) const {
+        return hasEmptyMask<kCount>(place);
+    }
     VOREL_INLINE bool paintWhole(const Place&) const { return false; }
     VOREL_INLINE Pixels paint(const Place& place) const {
         return Rule::apply(loadPixels(place.destination()), loadPixels(place.image()),
@@ -104,14 +112,19 @@ void blendMaskedImage(const BlendJob& job) {
 }
 
 void largerCoverage(const BlendJob& job) {
-    for (int64_t y = 0; y < job.height; ++y) {
-        uint8_t* const destination = job.destination + y * job.destinationStride;
-        const uint8_t* const mask = job.mask + y * job.maskStride;
-        int64_t x = 0;
-        for (; x + kBytes <= job.width; x += kBytes)
-            store(destination + x, larger(load<Bytes>(destination + x), load<Bytes>(mask + x)));
-        for (; x < job.width; ++x)
-            destination[x] = larger(destination[x], mask[x]);
+    // A column of vectors after the other, as glyphs are a few vectors wide; in bands that stay in the
+    // cache, as whole layers are not.
+    constexpr int64_t kBandRows = 64;
+    for (int64_t top = 0; top < job.height; top += kBandRows) {
+        const int64_t end = smaller(top + kBandRows, job.height);
+        forPieces(job.width, [&](auto v, int64_t x) VOREL_INLINE_LAMBDA {
+            using V = decltype(v);
+            for (int64_t y = top; y < end; ++y) {
+                uint8_t* const destination = job.destination + y * job.destinationStride + x;
+                const auto mask = load<V>(job.mask + y * job.maskStride + x);
+                store(destination, larger(load<V>(destination), mask));
+            }
+        });
     }
 }
 

@@ -21,6 +21,12 @@ inline Clip common(const Clip& a, const Clip& b) {
     return {std::max(a.left, b.left), std::max(a.top, b.top), std::min(a.right, b.right),
             std::min(a.bottom, b.bottom)};
 }
+/// The smallest that has both in it. Empty ones count for nothing.
+inline Clip enclosing(const Clip& a, const Clip& b) {
+    if (a.empty() || b.empty()) return a.empty() ? b : a;
+    return {std::min(a.left, b.left), std::min(a.top, b.top), std::max(a.right, b.right),
+            std::max(a.bottom, b.bottom)};
+}
 inline Clip grown(const Clip& clip, int64_t pixels) {
     return {clip.left - pixels, clip.top - pixels, clip.right + pixels, clip.bottom + pixels};
 }

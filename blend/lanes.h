@@ -2,14 +2,28 @@
 
 #include <cstdint>
 #include <cstring>
+#include <utility>
 
 #include "core/inline.h"
 #include "core/numeric.h"
 
-#if !defined(VOREL_SCALAR) && defined(__x86_64__)
-#include <immintrin.h>
-#elif !defined(VOREL_SCALAR) && defined(__aarch64__)
+#if defined(VOREL_SCALAR)
+#elif defined(__AVX512BW__)
+#define VOREL_AVX512
+#elif defined(__AVX2__)
+#define VOREL_AVX2
+#elif defined(__x86_64__)
+#define VOREL_SSE2
+#elif defined(__aarch64__)
+#define VOREL_NEON
+#else
+#error "there is no such level on this machine"
+#endif
+
+#if defined(VOREL_NEON)
 #include <arm_neon.h>
+#elif !defined(VOREL_SCALAR)
+#include <immintrin.h>
 #endif
 
 /// Lanes: vectors as wide as the registers of the level that a source of inner loops is compiled for,
@@ -22,13 +36,14 @@ static_assert(__BYTE_ORDER__ == __ORDER_LITTLE_ENDIAN__, "pixels are loaded as l
 
 #if defined(VOREL_SCALAR)
 constexpr int64_t kBytes = 4;
-#elif defined(__AVX512BW__)
+#elif defined(VOREL_AVX512)
 constexpr int64_t kBytes = 64;
-#elif defined(__AVX2__)
+#elif defined(VOREL_AVX2)
 constexpr int64_t kBytes = 32;
 #else
 constexpr int64_t kBytes = 16;
 #endif
+static_assert(kBytes == VOREL_VECTOR_BYTES, "the flags of a level give the vectors of its name");
 constexpr int64_t kWords = kBytes / 4;
 
 using Bytes = uint8_t __attribute__((vector_size(kBytes)));
@@ -61,19 +76,19 @@ VOREL_INLINE V spread(T value) {
     return V{} + value;
 }
 
-/// All ones in the first `count` bytes, 0 to kBytes of them.
-VOREL_INLINE Bytes firstBytes(int64_t count) {
-    Bytes lanes;
-    for (int i = 0; i < kBytes; ++i)
-        lanes[i] = static_cast<uint8_t>(i);
-    return as<Bytes>(lanes < spread<Bytes>(static_cast<uint8_t>(count)));
+/// 0, 1, 2, ... in the lanes. Listed, not counted: in a loop clang would insert lane after lane.
+template <class V, size_t... kLanes>
+VOREL_INLINE V ascending(std::index_sequence<kLanes...>) {
+    return V{kLanes...};
+}
+template <class V>
+VOREL_INLINE V ascending() {
+    return ascending<V>(std::make_index_sequence<sizeof(V) / sizeof(V{}[0])>());
 }
 
-/// The first `count` bytes of a vector, zeros after them.
-VOREL_INLINE Bytes loadCopied(const uint8_t* from, int64_t count) {
-    uint8_t bytes[kBytes] = {};
-    std::memcpy(bytes, from, static_cast<size_t>(count));
-    return load<Bytes>(bytes);
+/// All ones in the first `count` bytes, 0 to kBytes of them.
+VOREL_INLINE Bytes firstBytes(int64_t count) {
+    return as<Bytes>(ascending<Bytes>() < spread<Bytes>(static_cast<uint8_t>(count)));
 }
 
 template <class V>
@@ -96,6 +111,7 @@ VOREL_INLINE V smaller(V a, V b) {
 //   endsSwapped    bytes 0 1 2 3 of each word as 2 1 0 3 (not on NEON)
 //   toInt          as core/numeric.h converts: toward zero, saturating, NaN to 0
 //   squareRoot     correctly rounded
+//   multipliedSum  a * b + c, rounded once (on AVX-512)
 //   gathered       the words of a table at the given indices, kWords of them, in a vector or in bytes
 //   loadFirst      1 to kBytes bytes of memory, zeros after them
 //   widenedLow, widenedHigh   the first and the second half of the bytes, each byte in a half
@@ -112,14 +128,78 @@ VOREL_INLINE V smaller(V a, V b) {
 // (at most 128) from there on. Taps are stored as tap ^ kTapBias: the sum is then too small by
 // kTapBias times the total of the weights.
 
-#if !defined(VOREL_SCALAR) && defined(__x86_64__)
+// What several levels share.
+
+#if !defined(VOREL_AVX512)
+VOREL_INLINE Bytes loadFirst(const uint8_t* from, int64_t count) {
+    uint8_t bytes[kBytes] = {};
+    std::memcpy(bytes, from, static_cast<size_t>(count));
+    return load<Bytes>(bytes);
+}
+#endif
+
+#if defined(VOREL_SSE2) || defined(VOREL_NEON)
+VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
+    return Words{table[indices[0]], table[indices[1]], table[indices[2]], table[indices[3]]};
+}
+VOREL_INLINE Words gathered(const uint32_t* table, const uint8_t* indices) {
+    return Words{table[indices[0]], table[indices[1]], table[indices[2]], table[indices[3]]};
+}
+#endif
+
+#if defined(VOREL_SSE2)
+/// Taps 0 and 2 of each word, and taps 1 and 3. The cell of a tap holds its weight and that of the next
+/// but one.
+struct Taps {
+    Halves even;
+    Halves odd;
+};
+using WeightCell = Halves;
+
+VOREL_INLINE Taps tapsOf(Bytes v) {
+    return {as<Halves>(v) & 0x00FF, as<Halves>(v) >> 8};
+}
+VOREL_INLINE WeightCell cellOf(const uint8_t* weights) {
+    return as<Halves>(spread<Words>(weights[0] | uint32_t{weights[2]} << 16));
+}
+#else
+using Taps = Bytes;
+using WeightCell = uint8_t;
+
+VOREL_INLINE Taps tapsOf(Bytes v) {
+    return v;
+}
+VOREL_INLINE WeightCell cellOf(const uint8_t* weights) {
+    return *weights;
+}
+#endif
+
+/// Whether a dot product of bytes is an instruction.
+#if defined(VOREL_AVX512) || defined(__ARM_FEATURE_DOTPROD)
+constexpr bool kHasDotProducts = true;
+#else
+constexpr bool kHasDotProducts = false;
+#endif
+
+#if defined(VOREL_NEON)
+using Weights = uint8x16_t;
+
+VOREL_INLINE Weights weightsAt(const WeightCell* cells) {
+    return vld1q_u8(cells);
+}
+#else
+using Weights = const WeightCell*;
+
+VOREL_INLINE Weights weightsAt(const WeightCell* cells) {
+    return cells;
+}
+#endif
+
+#if !defined(VOREL_SCALAR) && !defined(VOREL_NEON)
 /// x86 converts what does not fit to the lowest integer: made the highest above the range, 0 for NaN.
 VOREL_INLINE Integers saturated(Floats value, Integers converted) {
     return (converted ^ (value >= 2147483648.0F)) & (value == value);
 }
-#endif
-
-#if !defined(VOREL_SCALAR) && defined(__x86_64__)
 VOREL_INLINE Bytes quartersInTurn(Halves even, Halves odd) {
     using SignedHalves = int16_t __attribute__((vector_size(kBytes)));
     const auto most = spread<SignedHalves>(int16_t{1023});
@@ -171,9 +251,6 @@ VOREL_INLINE Words gathered(const uint32_t* table, const uint8_t* indices) {
     return Words{table[*indices]};
 }
 
-VOREL_INLINE Bytes loadFirst(const uint8_t* from, int64_t count) {
-    return loadCopied(from, count);
-}
 VOREL_INLINE Halves widenedLow(Bytes v) {
     return Halves{v[0], v[1]};
 }
@@ -210,26 +287,13 @@ VOREL_INLINE Bytes quarters(Halves even, Halves odd) {
 }
 
 constexpr uint8_t kTapBias = 0;
-using Taps = Bytes;
-using WeightCell = uint8_t;
-using Weights = const WeightCell*;
-
-VOREL_INLINE Taps tapsOf(Bytes v) {
-    return v;
-}
-VOREL_INLINE WeightCell cellOf(const uint8_t* weights) {
-    return *weights;
-}
-VOREL_INLINE Weights weightsAt(const WeightCell* cells) {
-    return cells;
-}
 template <int64_t kFour>
 VOREL_INLINE Words addDots(Words sums, Taps taps, Weights weights) {
     const uint8_t* const w = weights + 4 * kFour;
     return sums + (w[0] * taps[0] + w[1] * taps[1] + w[2] * taps[2] + w[3] * taps[3]);
 }
 
-#elif defined(__AVX512BW__)
+#elif defined(VOREL_AVX512)
 
 VOREL_INLINE Bytes addSaturated(Bytes a, Bytes b) {
     return as<Bytes>(_mm512_adds_epu8(as<__m512i>(a), as<__m512i>(b)));
@@ -268,6 +332,9 @@ VOREL_INLINE Integers toInt(Floats v) {
 }
 VOREL_INLINE Floats squareRoot(Floats v) {
     return as<Floats>(_mm512_sqrt_ps(as<__m512>(v)));
+}
+VOREL_INLINE Floats multipliedSum(Floats a, Floats b, Floats c) {
+    return as<Floats>(_mm512_fmadd_ps(as<__m512>(a), as<__m512>(b), as<__m512>(c)));
 }
 VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
     return as<Words>(_mm512_i32gather_epi32(as<__m512i>(indices), table, 4));
@@ -317,26 +384,13 @@ VOREL_INLINE Bytes quarters(Halves even, Halves odd) {
 }
 
 constexpr uint8_t kTapBias = 0x80;
-using Taps = Bytes;
-using WeightCell = uint8_t;
-using Weights = const WeightCell*;
-
-VOREL_INLINE Taps tapsOf(Bytes v) {
-    return v;
-}
-VOREL_INLINE WeightCell cellOf(const uint8_t* weights) {
-    return *weights;
-}
-VOREL_INLINE Weights weightsAt(const WeightCell* cells) {
-    return cells;
-}
 template <int64_t kFour>
 VOREL_INLINE Words addDots(Words sums, Taps taps, Weights weights) {
     const __m512i four = _mm512_set1_epi32(load<int>(weights + 4 * kFour));
     return as<Words>(_mm512_dpbusd_epi32(as<__m512i>(sums), four, as<__m512i>(taps)));
 }
 
-#elif defined(__AVX2__)
+#elif defined(VOREL_AVX2)
 
 VOREL_INLINE Bytes addSaturated(Bytes a, Bytes b) {
     return as<Bytes>(_mm256_adds_epu8(as<__m256i>(a), as<__m256i>(b)));
@@ -385,9 +439,6 @@ VOREL_INLINE Words gathered(const uint32_t* table, const uint8_t* indices) {
     return gathered(table, as<Integers>(_mm256_cvtepu8_epi32(bytes)));
 }
 
-VOREL_INLINE Bytes loadFirst(const uint8_t* from, int64_t count) {
-    return loadCopied(from, count);
-}
 VOREL_INLINE Halves widenedLow(Bytes v) {
     return as<Halves>(_mm256_cvtepu8_epi16(_mm256_castsi256_si128(as<__m256i>(v))));
 }
@@ -423,19 +474,6 @@ VOREL_INLINE Bytes quarters(Halves even, Halves odd) {
 }
 
 constexpr uint8_t kTapBias = 0x80;
-using Taps = Bytes;
-using WeightCell = uint8_t;
-using Weights = const WeightCell*;
-
-VOREL_INLINE Taps tapsOf(Bytes v) {
-    return v;
-}
-VOREL_INLINE WeightCell cellOf(const uint8_t* weights) {
-    return *weights;
-}
-VOREL_INLINE Weights weightsAt(const WeightCell* cells) {
-    return cells;
-}
 /// The sums of two products, each up to 256 * -128 or 256 * 127, just fit in 16 bits.
 template <int64_t kFour>
 VOREL_INLINE Words addDots(Words sums, Taps taps, Weights weights) {
@@ -444,7 +482,7 @@ VOREL_INLINE Words addDots(Words sums, Taps taps, Weights weights) {
     return sums + as<Words>(_mm256_madd_epi16(pairs, _mm256_set1_epi16(1)));
 }
 
-#elif defined(__x86_64__)
+#elif defined(VOREL_SSE2)
 
 VOREL_INLINE Bytes addSaturated(Bytes a, Bytes b) {
     return as<Bytes>(_mm_adds_epu8(as<__m128i>(a), as<__m128i>(b)));
@@ -484,16 +522,7 @@ VOREL_INLINE Integers toInt(Floats v) {
 VOREL_INLINE Floats squareRoot(Floats v) {
     return as<Floats>(_mm_sqrt_ps(as<__m128>(v)));
 }
-VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
-    return Words{table[indices[0]], table[indices[1]], table[indices[2]], table[indices[3]]};
-}
-VOREL_INLINE Words gathered(const uint32_t* table, const uint8_t* indices) {
-    return Words{table[indices[0]], table[indices[1]], table[indices[2]], table[indices[3]]};
-}
 
-VOREL_INLINE Bytes loadFirst(const uint8_t* from, int64_t count) {
-    return loadCopied(from, count);
-}
 VOREL_INLINE Halves widenedLow(Bytes v) {
     return as<Halves>(_mm_unpacklo_epi8(as<__m128i>(v), _mm_setzero_si128()));
 }
@@ -529,34 +558,17 @@ VOREL_INLINE Bytes quarters(Halves even, Halves odd) {
 }
 
 constexpr uint8_t kTapBias = 0;
-/// Taps 0 and 2 of each word, and taps 1 and 3. The cell of a tap holds its weight and that of the next
-/// but one.
-struct Taps {
-    Halves even;
-    Halves odd;
-};
-using WeightCell = Halves;
-using Weights = const WeightCell*;
-
-VOREL_INLINE Taps tapsOf(Bytes v) {
-    return {as<Halves>(v) & 0x00FF, as<Halves>(v) >> 8};
-}
-VOREL_INLINE WeightCell cellOf(const uint8_t* weights) {
-    return as<Halves>(spread<Words>(weights[0] | uint32_t{weights[2]} << 16));
-}
-VOREL_INLINE Weights weightsAt(const WeightCell* cells) {
-    return cells;
-}
 template <int64_t kFour>
 VOREL_INLINE Words addDots(Words sums, Taps taps, Weights weights) {
     const __m128i even = _mm_madd_epi16(as<__m128i>(taps.even), as<__m128i>(weights[4 * kFour]));
     const __m128i odd = _mm_madd_epi16(as<__m128i>(taps.odd), as<__m128i>(weights[4 * kFour + 1]));
+    // In this order: compilers would rather make a tree of all the steps' products, and spill it.
     Words sum = sums + as<Words>(even);
     __asm__("" : "+x"(sum));
     return sum + as<Words>(odd);
 }
 
-#elif defined(__aarch64__)
+#elif defined(VOREL_NEON)
 
 VOREL_INLINE Bytes addSaturated(Bytes a, Bytes b) {
     return as<Bytes>(vqaddq_u8(as<uint8x16_t>(a), as<uint8x16_t>(b)));
@@ -583,15 +595,6 @@ VOREL_INLINE Integers toInt(Floats v) {
 }
 VOREL_INLINE Floats squareRoot(Floats v) {
     return as<Floats>(vsqrtq_f32(as<float32x4_t>(v)));
-}
-VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
-    return Words{table[indices[0]], table[indices[1]], table[indices[2]], table[indices[3]]};
-}
-VOREL_INLINE Words gathered(const uint32_t* table, const uint8_t* indices) {
-    return Words{table[indices[0]], table[indices[1]], table[indices[2]], table[indices[3]]};
-}
-VOREL_INLINE Bytes loadFirst(const uint8_t* from, int64_t count) {
-    return loadCopied(from, count);
 }
 VOREL_INLINE Halves widenedLow(Bytes v) {
     return as<Halves>(vmovl_u8(vget_low_u8(as<uint8x16_t>(v))));
@@ -631,19 +634,6 @@ VOREL_INLINE Bytes quarters(Halves even, Halves odd) {
 }
 
 constexpr uint8_t kTapBias = 0;
-using Taps = Bytes;
-using WeightCell = uint8_t;
-using Weights = uint8x16_t;
-
-VOREL_INLINE Taps tapsOf(Bytes v) {
-    return v;
-}
-VOREL_INLINE WeightCell cellOf(const uint8_t* weights) {
-    return *weights;
-}
-VOREL_INLINE Weights weightsAt(const WeightCell* cells) {
-    return vld1q_u8(cells);
-}
 #if defined(__ARM_FEATURE_DOTPROD)
 template <int64_t kFour>
 VOREL_INLINE Words addDots(Words sums, Taps taps, Weights weights) {
@@ -660,8 +650,6 @@ VOREL_INLINE Words addDots(Words sums, Taps taps, Weights weights) {
 }
 #endif
 
-#else
-#error "there is no such level on this machine"
 #endif
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

@@ -11,7 +11,7 @@
 /// channel, as NEON loads, multiplies and stores them.
 namespace VFontEffect::internal::VOREL_LEVEL {
 
-#if !defined(VOREL_SCALAR) && defined(__aarch64__)
+#if defined(VOREL_NEON)
 
 constexpr int64_t kPixels = kBytes;
 
@@ -178,7 +178,7 @@ VOREL_INLINE bool isClear(const Pixels& p) {
     return allZero(p.bytes);
 }
 
-#if !defined(VOREL_SCALAR) && defined(__AVX512BW__)
+#if defined(VOREL_AVX512)
 
 using Where = __mmask16;  // one bit for each pixel
 

@@ -8,9 +8,11 @@
 
 /// The row driver of all blending kernels: the loop over rows and pixels, empty stretches, and the tail.
 ///
-/// A painter gives the pixels that belong at a place of a row: `paint(place)`. It also tells what an
-/// empty stretch (`isEmpty(place)`, kBytes pixels long) leaves there, if it can tell at all, and may
-/// know stretches that it paints quicker as a whole (`paintWhole(place)`, which returns whether it has
+/// A painter gives the pixels that belong at a place of a row: `paint(place)`. It also tells empty
+/// stretches (`isEmpty<pixels>(place)`, kBytes or kPixels of them), which leave there what its kEmpty
+/// says. Where kIsSparse even vectors of other stretches are mostly empty: so it is between the strokes
+/// of glyphs, not in their shadows, where asking costs more than it saves. A painter may know stretches
+/// of kBytes pixels that it paints quicker as a whole (`paintWhole(place)`, which returns whether it has
 /// done so).
 namespace VFontEffect::internal::VOREL_LEVEL {
 
@@ -31,17 +33,12 @@ struct Place {
     VOREL_INLINE const uint8_t* mask() const { return row.maskStart + x; }
 };
 
-/// Whether `kCount` bytes are 0.
+/// Whether the mask is 0 for kCount pixels.
 template <int64_t kCount>
-VOREL_INLINE bool allZero(const uint8_t* bytes) {
-    if (kCount == kBytes) return allZero(load<Bytes>(bytes));
-    static constexpr uint8_t kNone[kCount] = {};
-    return std::memcmp(bytes, kNone, kCount) == 0;
-}
-
-/// Whether the mask is 0 for kBytes pixels.
 VOREL_INLINE bool hasEmptyMask(const Place& place) {
-    return allZero<kBytes>(place.mask());
+    if constexpr (kCount == kBytes) return allZero(load<Bytes>(place.mask()));
+    static constexpr uint8_t kNone[kCount] = {};
+    return std::memcmp(place.mask(), kNone, kCount) == 0;
 }
 
 /// Whether the mask is full for kBytes pixels.
@@ -49,9 +46,21 @@ VOREL_INLINE bool hasFullMask(const Place& place) {
     return allZero(~load<Bytes>(place.mask()));
 }
 
-/// Paints a whole stretch of kBytes pixels that is empty.
+/// Whether kCount pixels are nothing but zeros; the first of them mostly tell.
+template <int64_t kCount>
+VOREL_INLINE bool isClear(const uint8_t* pixels) {
+    Bytes all = load<Bytes>(pixels);
+    if (!allZero(all)) return false;
+    for (int64_t i = kBytes; i < 4 * kCount; i += kBytes)
+        all |= load<Bytes>(pixels + i);
+    return allZero(all);
+}
+
+/// Paints a whole stretch of kBytes pixels that is empty. What is clear already is not written: lines of
+/// the cache that stay as they are need not be written back.
 VOREL_INLINE void paintEmpty(Empty what, const Place& place) {
-    if (what == Empty::clears) std::memset(place.destination(), 0, 4 * kBytes);
+    if (what == Empty::clears && !isClear<kBytes>(place.destination()))
+        std::memset(place.destination(), 0, 4 * kBytes);
     if (what == Empty::copiesImage) std::memcpy(place.destination(), place.image(), 4 * kBytes);
 }
 
@@ -74,40 +83,53 @@ VOREL_INLINE int64_t pixelsToAlignment(const uint8_t* destination) {
     return static_cast<int64_t>((0 - reinterpret_cast<uintptr_t>(destination)) / 4 % kPixels);
 }
 
-/// Paints pixels x to `end`, in whole vectors.
+/// What belongs at a place where much is empty: worth a look.
 template <class Painter>
-VOREL_INLINE void paintVectors(const Painter& painter, const Row& row, int64_t x, int64_t end) {
-    for (; x < end; x += kPixels) {
-        const Place place = {row, x};
-        storePixels(place.destination(), painter.paint(place));
-    }
+VOREL_INLINE Pixels sparsePixels(const Painter& painter, const Place& place) {
+    if (!painter.template isEmpty<kPixels>(place)) return painter.paint(place);
+    if (Painter::kEmpty == Empty::clears) return Pixels{};
+    return loadPixels(Painter::kEmpty == Empty::copiesImage ? place.image() : place.destination());
 }
 
-/// Paints from `x` on, in whole vectors, as far as `end`, and leaves empty stretches early.
+/// Paints from `x` on, in whole vectors, as far as `end`, and leaves empty stretches early. The last
+/// vector may hang over the end, and so may a stretch that is no longer.
 template <class Painter>
 VOREL_INLINE void paintStretches(const Painter& painter, const Row& row, int64_t x, int64_t end) {
-    for (; end - x >= kBytes; x += kBytes) {
-        if (painter.isEmpty({row, x})) {
+    constexpr int64_t kFewest = kPixels < kBytes ? kBytes : 1;
+    for (; end - x >= kFewest; x += kBytes) {
+        if (painter.template isEmpty<kBytes>({row, x})) {
             paintEmpty(Painter::kEmpty, {row, x});
         } else if (!painter.paintWhole({row, x})) {
-            paintVectors(painter, row, x, x + kBytes);
+            for (int64_t at = x; at < x + kBytes; at += kPixels) {
+                const Place place = {row, at};
+                storePixels(place.destination(),
+                            Painter::kIsSparse ? sparsePixels(painter, place) : painter.paint(place));
+            }
         }
     }
-    paintVectors(painter, row, x, end);
+    for (; x < end; x += kPixels)
+        storePixels(Place{row, x}.destination(), sparsePixels(painter, {row, x}));
 }
 
-/// The first and the last vector begin and end with the row, and the loop between them keeps to whole
+/// Whether the loop keeps to whole lines of the cache. Planar pixels are taken apart and put together as
+/// they are loaded and stored, which hides where they lie.
+constexpr bool kKeepsToLines = kPixels > 1 && kPixels < kBytes;
+
+/// The first and the last vector begin and end with the row, and the loop between them may keep to whole
 /// lines of the cache: the three overlap. So the two are computed from what the row held before, and
 /// stored when the loop is done.
 template <class Painter>
 VOREL_INLINE void paintRow(const Painter& painter, const Row& row, int64_t count) {
     if (kPixels > 1 && count < kPixels) return paintShortRow(painter, row, count);
-    const Place first = {row, 0};
     const Place last = {row, count - kPixels};
-    const Pixels firstPixels = painter.paint(first);
-    const Pixels lastPixels = painter.paint(last);
-    paintStretches(painter, row, pixelsToAlignment(row.destinationStart), last.x);
-    storePixels(first.destination(), firstPixels);
+    const Pixels lastPixels = sparsePixels(painter, last);
+    if constexpr (kKeepsToLines) {
+        const Pixels firstPixels = sparsePixels(painter, {row, 0});
+        paintStretches(painter, row, pixelsToAlignment(row.destinationStart), last.x);
+        storePixels(row.destinationStart, firstPixels);
+    } else {
+        paintStretches(painter, row, 0, last.x);
+    }
     storePixels(last.destination(), lastPixels);
 }
 

@@ -25,6 +25,7 @@ VOREL_INLINE Pixels under(const Pixels& d, const Pixels& source, Where painted) 
 /// Colour times mask over the destination.
 struct SrcOverMask {
     static constexpr Empty kEmpty = Empty::keeps;
+    static constexpr bool kIsSparse = false;
 
     static VOREL_INLINE Pixels apply(const Pixels& d, Amounts mask, const Pixels& colour) {
         const Pixels product = scaled(colour, mask);
@@ -37,6 +38,7 @@ struct SrcOverMask {
 /// Colour times mask under the destination.
 struct DstOverMask {
     static constexpr Empty kEmpty = Empty::keeps;
+    static constexpr bool kIsSparse = false;
 
     static VOREL_INLINE Pixels apply(const Pixels& d, Amounts mask, const Pixels& colour) {
         return under(d, scaled(colour, mask), ~isZero(mask));
@@ -46,6 +48,7 @@ struct DstOverMask {
 /// Colour under the destination wherever the mask is not 0. Deliberate: the mask does not scale it.
 struct DstOverGate {
     static constexpr Empty kEmpty = Empty::keeps;
+    static constexpr bool kIsSparse = true;
 
     static VOREL_INLINE Pixels apply(const Pixels& d, Amounts mask, const Pixels& colour) {
         const Where painted = ~isZero(mask);
@@ -60,6 +63,7 @@ struct DstOverGate {
 /// destination takes the colour times the mask once.
 struct DstOverClip {
     static constexpr Empty kEmpty = Empty::clears;
+    static constexpr bool kIsSparse = true;
 
     static VOREL_INLINE Pixels apply(const Pixels& d, Amounts mask, const Pixels& colour) {
         const Amounts alpha = alphaOf(d);

@@ -10,16 +10,24 @@ else()
   set(VOREL_LEVELS scalar)
 endif()
 
-# What no processor of today runs may be slow, but not large.
-set(VOREL_FLAGS_scalar -DVOREL_SCALAR $<$<CONFIG:Release>:-Os>)
-set(VOREL_FLAGS_avx2 -mavx2)
+# On x86-64 a level has the instructions of its name and no better ones, whatever -march a build asks for.
+set(VOREL_FLAGS_scalar -DVOREL_SCALAR)
+set(VOREL_FLAGS_sse2 -mno-avx)
+set(VOREL_FLAGS_avx2 -mavx2 -mno-avx512f)
 set(VOREL_FLAGS_avx512 -mavx512f -mavx512bw -mavx512dq -mavx512vl -mavx512vnni)
 set(VOREL_FLAGS_dotprod -march=armv8.2-a+dotprod)
+set(VOREL_BYTES_scalar 4)
+set(VOREL_BYTES_sse2 16)
+set(VOREL_BYTES_avx2 32)
+set(VOREL_BYTES_avx512 64)
+set(VOREL_BYTES_neon 16)
+set(VOREL_BYTES_dotprod 16)
 
 # The plainest level of vectors runs on every CPU of its kind: the scalar one is for the tests then.
 set(VOREL_SHIPPED_LEVELS ${VOREL_LEVELS})
 if(VOREL_FOR_X86_64 OR VOREL_FOR_AARCH64)
   list(REMOVE_ITEM VOREL_SHIPPED_LEVELS scalar)
+  list(APPEND VOREL_FLAGS_scalar $<$<CONFIG:Release>:-Os>)
 endif()
 
 foreach(level IN LISTS VOREL_LEVELS)
@@ -28,8 +36,9 @@ foreach(level IN LISTS VOREL_LEVELS)
     target_sources(voreleffect_${level} PRIVATE ${VOREL_LEVEL_SOURCES})
   endif()
   vorel_objects(voreleffect_${level})
-  target_compile_definitions(voreleffect_${level} PRIVATE VOREL_LEVEL=${level})
-  # Vectors are passed between functions that are always inlined; their calling convention is moot.
+  target_compile_definitions(voreleffect_${level} PRIVATE
+    VOREL_LEVEL=${level} VOREL_VECTOR_BYTES=${VOREL_BYTES_${level}})
+  # Vectors are passed within a level's sources alone: their calling convention is moot.
   target_compile_options(voreleffect_${level} PRIVATE ${VOREL_FLAGS_${level}} -Wno-psabi)
   if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
     # Its own headers leave vectors uninitialised on purpose.

@@ -1,8 +1,20 @@
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 
 #include "core/pixel_buffer.h"
+
+#if defined(__SANITIZE_ADDRESS__)
+#define VOREL_ADDRESS_SANITIZER
+#elif defined(__has_feature)
+#if __has_feature(address_sanitizer)
+#define VOREL_ADDRESS_SANITIZER
+#endif
+#endif
+#if defined(VOREL_ADDRESS_SANITIZER)
+#include <sanitizer/asan_interface.h>
+#endif
 
 namespace VFontEffect::internal {
 
@@ -11,7 +23,12 @@ namespace VFontEffect::internal {
 class LineBuffer {
   public:
     explicit LineBuffer(int64_t width, int64_t height = 1)
-        : mBytes(PixelBuffer<uint8_t>::uninitialised(width * height + kLineBytes)) {}
+        : mBytes(PixelBuffer<uint8_t>::uninitialised(width * height + kLineBytes)) {
+        if (!mBytes) return;
+        const int64_t before = data() - mBytes.data();
+        forbid(mBytes.data(), before);
+        forbid(data() + width * height, kLineBytes - before);
+    }
 
     explicit operator bool() const { return static_cast<bool>(mBytes); }
     void release() { mBytes.release(); }
@@ -22,6 +39,13 @@ class LineBuffer {
 
   private:
     static constexpr int64_t kLineBytes = 64;
+
+    /// What is there for alignment only is nobody's: the address sanitizer reports any use of it.
+    static void forbid([[maybe_unused]] const void* start, [[maybe_unused]] int64_t bytes) {
+#if defined(VOREL_ADDRESS_SANITIZER)
+        __asan_poison_memory_region(start, static_cast<size_t>(bytes));
+#endif
+    }
 
     PixelBuffer<uint8_t> mBytes;
 };

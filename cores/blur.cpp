@@ -5,12 +5,10 @@
 #include <cstdlib>
 #include <cstring>
 
+#include "core/numeric.h"
+
 namespace VFontEffect::internal {
 namespace {
-
-int64_t roundedUp(int64_t value, int64_t multiple) {
-    return (value + multiple - 1) / multiple * multiple;
-}
 
 /// Bytes of a row that whole vectors are written to.
 int64_t strideFor(int64_t width) {
@@ -55,7 +53,7 @@ BlurWeights::BlurWeights(const BlurKernel& kernel)
     mBlur.cells = mMemory.data() + kCellsBefore * loops.cellBytes;
     mBlur.totals = totals + kCellsBefore;
     mBlur.inverse = inverseAbove(kernel.total);
-    mBlur.isNarrow = kernel.radius <= kLargestNarrowRadius && kernel.total <= 0xFF;
+    mBlur.isNarrow = loops.hasNarrow && kernel.radius <= kLargestNarrowRadius && kernel.total <= 0xFF;
     if (!mBlur.isNarrow) return;
     const uint32_t scale = kernel.total < 128 ? 2 : 1;
     for (int k = 0; k <= kernel.radius; ++k)
@@ -119,12 +117,12 @@ void TapGroups::forgetBefore(int64_t group) {
 
 MiddleBuffer::MiddleBuffer(const BlurWeights& weights, int64_t inkColumn, int64_t columns,
                            const FullColumns& full)
-    : mPixels((strideFor(columns) + 2 * kWidestVector) * weights.pixelBytes(), kQuad),
+    : mStrideBytes((strideFor(columns) + 2 * kMiddleMargin) * weights.pixelBytes()),
+      mPixels(mStrideBytes, kQuad),
       mInked(PixelBuffer<uint8_t>::zeroed(strideFor(columns) / blurKernels().vectorBytes)) {
     if (!*this || !weights) return;
-    const int64_t strideBytes = (strideFor(columns) + 2 * kWidestVector) * weights.pixelBytes();
-    uint8_t* const start = mPixels.data() + kWidestVector * weights.pixelBytes();
-    mRows = {start, strideBytes, columns, inkColumn, full.before, full.from, mInked.data()};
+    uint8_t* const start = mPixels.data() + kMiddleMargin * weights.pixelBytes();
+    mRows = {start, mStrideBytes, columns, inkColumn, full.before, full.from, mInked.data()};
     blurKernels().clear(*weights, mRows);
 }
 

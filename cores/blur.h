@@ -140,6 +140,7 @@ class MiddleBuffer {
     const MiddleRows& rows() const { return mRows; }
 
   private:
+    int64_t mStrideBytes;
     LineBuffer mPixels;
     PixelBuffer<uint8_t> mInked;
     MiddleRows mRows = {};

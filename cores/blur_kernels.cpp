@@ -15,12 +15,13 @@
 /// Down, the four results are four rows; across, they are the four bytes of a word. So every vector of
 /// taps that is loaded feeds four sums, and every four weights feed several vectors.
 ///
-/// Up to a radius of 3 sums fit in 16 bits: there taps are widened to halves, those at +k and -k are
-/// added before the product, and the division is one by multiplication in 16 bits.
+/// Up to a radius of 3 sums fit in 16 bits. Where no instruction makes a dot product of bytes, taps are
+/// widened to halves there, those at +k and -k are added before the product, and the division is one by
+/// multiplication in 16 bits.
 ///
 /// Exactness: sums are whole numbers and wrap nowhere: 255 times the total stays below 2^23. As floats
 /// they are exact; with an inverse just above 1 / total the rounded product reaches n exactly when the
-/// sum reaches n * total, as long as the total is below 26,000 (blur.h).
+/// sum reaches n * total, as long as the total is at most 26,000 (blur.h).
 ///
 /// Cost: (2R + 1) / (taps in a vector) instructions a pixel and pass, over the rows and columns only
 /// that hold ink; what lies beyond them is neither read nor stored.
@@ -31,10 +32,10 @@ namespace {
 #if defined(VOREL_SCALAR)
 constexpr int kGridVectors = 2;
 constexpr int kStepsAtOnce = 1;
-#elif defined(__aarch64__)
+#elif defined(VOREL_NEON)
 constexpr int kGridVectors = 4;
 constexpr int kStepsAtOnce = 4;
-#elif defined(__AVX512BW__)
+#elif defined(VOREL_AVX512)
 constexpr int kGridVectors = 4;
 constexpr int kStepsAtOnce = 1;
 #else
@@ -51,16 +52,9 @@ struct Range {
     bool empty() const { return first >= end; }
 };
 
-VOREL_INLINE int64_t smallerOf(int64_t a, int64_t b) {
-    return a < b ? a : b;
-}
-VOREL_INLINE int64_t largerOf(int64_t a, int64_t b) {
-    return a > b ? a : b;
-}
-
 /// So many columns as the vectors have that hold `columns` of them.
 VOREL_INLINE int64_t wholeVectors(int64_t columns) {
-    return (columns + kBytes - 1) / kBytes * kBytes;
+    return roundedUp(columns, kBytes);
 }
 
 // --- Loading --------------------------------------------------------------------------------------
@@ -107,8 +101,22 @@ struct Group {
     VOREL_INLINE bool isInked() const { return !allZero(rows[0] | rows[1] | rows[2] | rows[3]); }
 };
 
-// --- The two methods: how groups are stored, summed and divided
-// ------------------------------------------
+// --- The two methods: how groups are stored, summed and divided ---------------------------------------
+
+#if defined(VOREL_AVX512)
+/// The bits of 2^23 as a float: with them before it a sum is the float 2^23 + sum, unconverted. The
+/// fused product takes 2^23 * inverse away again, exactly, and so rounds sum * inverse once, as any
+/// other does.
+constexpr uint32_t kSumStart = 0x4B000000;
+VOREL_INLINE Floats timesInverse(Words sum, Floats inverse) {
+    return multipliedSum(as<Floats>(sum), inverse, inverse * -8388608.0F);
+}
+#else
+constexpr uint32_t kSumStart = 0;
+VOREL_INLINE Floats timesInverse(Words sum, Floats inverse) {
+    return __builtin_convertvector(as<Integers>(sum), Floats) * inverse;
+}
+#endif
 
 /// Sums of 32 bits by dot products.
 struct DotMethod {
@@ -170,7 +178,7 @@ struct DotMethod {
     /// What a sum begins with: what rounds up, and what the bias of the taps takes away.
     VOREL_INLINE Words start(const Range& steps, int result) const {
         const uint32_t weights = totals[4 * steps.end - result] - totals[4 * steps.first - result];
-        return spread<Words>(rounding + kTapBias * weights);
+        return spread<Words>(kSumStart + rounding + kTapBias * weights);
     }
 
     /// The sums over `steps` of the taps, the first of which are at `from`.
@@ -195,8 +203,7 @@ struct DotMethod {
     }
 
     VOREL_INLINE Words quotient(Words sum) const {
-        const Floats mean = __builtin_convertvector(as<Integers>(sum), Floats) * inverse;
-        return as<Words>(__builtin_convertvector(mean, Integers));
+        return as<Words>(__builtin_convertvector(timesInverse(sum, inverse), Integers));
     }
 
     /// Four rows of results; `group(step)` is where the taps of a step are.
@@ -345,8 +352,8 @@ void feed(const PreparedBlur&, const BlurSource& source, int64_t row, const TapC
 
 /// The steps of a quad of results that reach inked groups of a strip.
 VOREL_INLINE Range inkedSteps(const TapColumns& columns, int64_t strip, int64_t quad, int radius) {
-    return {largerOf(0, columns.firstInked[strip] - quad),
-            smallerOf(tapSteps(radius), columns.lastInked[strip] + 1 - quad)};
+    return {larger<int64_t>(0, columns.firstInked[strip] - quad),
+            smaller<int64_t>(tapSteps(radius), columns.lastInked[strip] + 1 - quad)};
 }
 
 /// Calls store(strip, j, row) for each of the four rows of each strip.
@@ -383,13 +390,13 @@ VOREL_INLINE void fillMiddle(const MiddleRows& middle, int64_t from, int64_t end
 
 template <class Method>
 void clear(const PreparedBlur&, const MiddleRows& middle) {
-    fillMiddle<Method>(middle, -kWidestVector, wholeVectors(middle.columns) + kWidestVector, 0);
+    fillMiddle<Method>(middle, -kMiddleMargin, wholeVectors(middle.columns) + kMiddleMargin, 0);
 }
 
 template <class Method>
 void fillFullColumns(const MiddleRows& middle) {
-    fillMiddle<Method>(middle, 0, smallerOf(middle.fullBefore, middle.columns), 0xFF);
-    fillMiddle<Method>(middle, largerOf(middle.fullFrom, 0), middle.columns, 0xFF);
+    fillMiddle<Method>(middle, 0, smaller<int64_t>(middle.fullBefore, middle.columns), 0xFF);
+    fillMiddle<Method>(middle, larger<int64_t>(middle.fullFrom, 0), middle.columns, 0xFF);
     for (int64_t x = 0; x < middle.columns; x += kBytes) {
         if (x < middle.fullBefore || x + kBytes > middle.fullFrom) middle.inked[x / kBytes] = 1;
     }
@@ -433,9 +440,9 @@ void copy(const PreparedBlur&, const BlurSource& source, int64_t row, const Midd
 /// The steps of four taps, for a vector of results from column x on, that reach an inked vector.
 VOREL_INLINE Range inkedSteps(const MiddleRows& middle, int64_t x, int radius) {
     const int64_t firstTap = x - radius;
-    const int64_t lastTap = smallerOf(x + kBytes - 1 + radius, middle.columns - 1);
+    const int64_t lastTap = smaller<int64_t>(x + kBytes - 1 + radius, middle.columns - 1);
     if (lastTap < 0) return {0, 0};
-    int64_t first = largerOf(firstTap, 0) / kBytes;
+    int64_t first = larger<int64_t>(firstTap, 0) / kBytes;
     int64_t last = lastTap / kBytes;
     while (first <= last && middle.inked[first] == 0)
         ++first;
@@ -445,7 +452,7 @@ VOREL_INLINE Range inkedSteps(const MiddleRows& middle, int64_t x, int radius) {
     // Step s reads a vector from firstTap + 4 s on.
     const int64_t before = (first - 1) * kBytes - firstTap;
     return {before < 0 ? 0 : before / 4 + 1,
-            smallerOf(tapSteps(radius), ((last + 1) * kBytes - 1 - firstTap) / 4 + 1)};
+            smaller<int64_t>(tapSteps(radius), ((last + 1) * kBytes - 1 - firstTap) / 4 + 1)};
 }
 
 template <class Method>
@@ -467,8 +474,7 @@ void across(const PreparedBlur& blur, const MiddleRows& middle, int64_t left, in
     }
 }
 
-// --- The table
-// --------------------------------------------------------------------------------------------
+// --- The table ----------------------------------------------------------------------------------------
 
 void fillCells(const uint32_t* weights, int radius, uint8_t* cells) {
     const auto weightAt = [&](int64_t distance) VOREL_INLINE_LAMBDA {
@@ -483,16 +489,20 @@ void fillCells(const uint32_t* weights, int radius, uint8_t* cells) {
     }
 }
 
-/// The form of a kernel that suits the blur.
+/// The form of a kernel that suits the blur; where it sums in 32 bits always there is one only.
 template <auto kNarrow, auto kWide, class... Arguments>
 void chosen(const PreparedBlur& blur, Arguments... arguments) {
-    blur.isNarrow ? kNarrow(blur, arguments...) : kWide(blur, arguments...);
+    if constexpr (!kHasDotProducts) {
+        if (blur.isNarrow) return kNarrow(blur, arguments...);
+    }
+    kWide(blur, arguments...);
 }
 
 }  // namespace
 
 extern const BlurKernels kBlurKernels = {
     kBytes,
+    !kHasDotProducts,
     sizeof(WeightCell),
     fillCells,
     chosen<clear<NarrowMethod>, clear<DotMethod>>,

@@ -15,12 +15,19 @@ VOREL_INLINE int64_t tapSteps(int radius) {
     return (2 * int64_t{radius} + kQuad + 3) / 4;
 }
 
-/// No level's vector is wider; rows between the passes have a margin of as many pixels on both sides.
+/// No level's vector is wider.
 constexpr int64_t kWidestVector = 64;
 /// Up to this radius, and a total that fits in a byte, sums fit in 16 bits.
-constexpr int kLargestNarrowRadius = 3;
+constexpr int64_t kLargestNarrowRadius = 3;
 
-/// Division by a number of 128 to 255 as (x + start) * multiplier >> 16 >> kNarrowShift, for 16-bit x.
+/// Pixels on both sides of the rows between the passes. A vector of results of which one alone has a tap
+/// among the columns is computed as a whole, with the taps of all others.
+constexpr int64_t kMiddleMargin = 2 * kWidestVector;
+static_assert(kMiddleMargin >= kWidestVector - 1 + 2 * kLargestNarrowRadius,
+              "the farthest tap of a vector that meets the columns lies in the margin");
+
+/// Division by a number of 128 to 255 as (x + start) * multiplier >> 16 >> kNarrowShift, for sums up to
+/// 256 times the number.
 struct NarrowDivision {
     uint16_t start;
     uint16_t multiplier;
@@ -96,6 +103,8 @@ constexpr int64_t kCellsBehind = 20;
 
 struct BlurKernels {
     int64_t vectorBytes;
+    /// Whether the level sums in 16 bits where that suffices.
+    bool hasNarrow;
     /// Bytes of a weight's cell.
     int64_t cellBytes;
     /// Makes the cells of the weights at distances 0 to radius and of the zeros around them.

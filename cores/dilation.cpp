@@ -15,8 +15,6 @@ namespace VFontEffect {
 
 using namespace internal;
 
-namespace internal {}  // namespace internal
-
 namespace {
 
 using Work = VFStroke::DilationWork;
@@ -28,9 +26,6 @@ bool fitsTogether(const Work& work) {
            work.planeWidth >= work.sourceWidth + border &&
            work.planeHeight >= work.sourceHeight + border;
 }
-
-constexpr uint8_t kCoverage = 0;
-constexpr uint8_t kInverse = 0xFF;
 
 /// Stamps the band of rows into the plane. `flip` kInverse takes the inverse of the coverage.
 int stampBand(const Work& work, unsigned char* plane, uint8_t flip) {

@@ -14,7 +14,8 @@ constexpr int kLongestCellReach = 2;
 
 struct CellPlanes {
     PaddedRows rows;
-    size_t bytes;
+    uint8_t* results;  ///< of a band
+    int64_t bytes;
 };
 
 inline CellPlanes cellPlanes(const Dilation& dilation) {
@@ -22,12 +23,13 @@ inline CellPlanes cellPlanes(const Dilation& dilation) {
     Arena arena = {dilation.memory};
     CellPlanes planes;
     planes.rows = takeRows(dilation, dilation.bandRows + 2 * reach, reach, reach + kBytes, arena);
+    planes.results = arena.take<uint8_t>(dilation.bandRows * dilatedStride(dilation));
     planes.bytes = arena.used;
     return planes;
 }
 
 /// 255 - weight of the cells that lie that far aside.
-inline Bytes cellDeficit(const DiscShape& disc, int dx, int dy) {
+VOREL_INLINE Bytes cellDeficit(const DiscShape& disc, int dx, int dy) {
     uint8_t deficit = 255;
     if (dx <= disc.flatReach[dy]) {
         deficit = 0;
@@ -96,17 +98,19 @@ struct FarCells {
 };
 
 template <class Cells>
-void dilateRowsByCells(const Dilation& dilation, int64_t y, int64_t count, uint8_t* results) {
+uint8_t* dilateRowsByCells(const Dilation& dilation, int64_t y, int64_t count) {
     const CellPlanes planes = cellPlanes(dilation);
     for (int64_t row = 0; row < count + 2 * Cells::kReach; ++row)
         fillRow(dilation, y + row - Cells::kReach, planes.rows, row);
     const Cells cells(*dilation.disc);
     const int64_t width = dilation.right - dilation.left;
+    uint8_t* results = planes.results;
     for (int64_t row = 0; row < count; ++row, results += dilatedStride(dilation)) {
         const uint8_t* const source = planes.rows.at(row + Cells::kReach) + dilation.left;
         for (int64_t x = 0; x < width; x += kBytes)
             store(results + x, cells.dilated(source + x, planes.rows.stride));
     }
+    return planes.results;
 }
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

@@ -1,25 +1,25 @@
 #include "cores/dilation_cells.h"
-#include "cores/dilation_taps.h"
+#include "cores/dilation_spread.h"
 #include "cores/dilation_tiles.h"
 
 namespace VFontEffect::internal::VOREL_LEVEL {
 namespace {
 
-enum class Way { cells, taps, tiles };
+enum class Way { cells, spread, tiles };
 
 Way wayOf(const Dilation& dilation) {
     const int reach = dilation.disc->reach;
     return reach <= kLongestCellReach     ? Way::cells
-           : reach <= kLongestTappedReach ? Way::taps
+           : reach <= kLongestSpreadReach ? Way::spread
                                           : Way::tiles;
 }
 
-size_t memoryBytes(const Dilation& dilation) {
+int64_t memoryBytes(const Dilation& dilation) {
     switch (wayOf(dilation)) {
         case Way::cells:
             return cellPlanes(dilation).bytes;
-        case Way::taps:
-            return tapPlanes(dilation).bytes;
+        case Way::spread:
+            return spreadPlanes(dilation).bytes;
         default:
             return tilePlanes(dilation).bytes;
     }
@@ -27,16 +27,16 @@ size_t memoryBytes(const Dilation& dilation) {
 
 void begin(Dilation& dilation) {
     const Way way = wayOf(dilation);
-    if (way == Way::taps) listTaps(dilation);
+    if (way == Way::spread) listDeficits(dilation);
     if (way == Way::tiles) beginTiles(dilation);
 }
 
-void dilateRows(const Dilation& dilation, int64_t y, int64_t count, uint8_t* results) {
-    if (dilation.disc->reach == 0) return dilateRowsByCells<CentreCell>(dilation, y, count, results);
-    if (dilation.disc->reach == 1) return dilateRowsByCells<NearCells>(dilation, y, count, results);
-    if (dilation.disc->reach == 2) return dilateRowsByCells<FarCells>(dilation, y, count, results);
-    if (wayOf(dilation) == Way::taps) return dilateRowsByTaps(dilation, y, count, results);
-    dilateRowsByTiles(dilation, y, count, results);
+uint8_t* dilateRows(const Dilation& dilation, int64_t y, int64_t count) {
+    if (dilation.disc->reach == 0) return dilateRowsByCells<CentreCell>(dilation, y, count);
+    if (dilation.disc->reach == 1) return dilateRowsByCells<NearCells>(dilation, y, count);
+    if (dilation.disc->reach == 2) return dilateRowsByCells<FarCells>(dilation, y, count);
+    if (wayOf(dilation) == Way::spread) return dilateRowsBySpreading(dilation, y, count);
+    return dilateRowsByTiles(dilation, y, count);
 }
 
 void keepSmaller(uint8_t* first, const uint8_t* second, int64_t count) {

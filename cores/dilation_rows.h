@@ -3,22 +3,24 @@
 #include <cstdint>
 #include <cstring>
 
-#include "blend/lanes.h"
+#include "blend/pieces.h"
+#include "core/numeric.h"
 #include "cores/dilation.h"
 
-/// Rows of source pixels as both ways of dilation read them, and windowed maxima of them.
+/// Rows of source pixels as all ways of dilation read them, and windowed maxima of them.
 namespace VFontEffect::internal::VOREL_LEVEL {
 
-/// Hands out working memory; without any it only counts.
+constexpr int64_t kArenaAlignment = 64;
+
+/// Hands out working memory, which is aligned; without any it only counts.
 struct Arena {
     uint8_t* memory;
-    size_t used = 0;
+    int64_t used = 0;
 
     template <class T>
     VOREL_INLINE T* take(int64_t count) {
-        constexpr size_t kAlignment = 64;
         uint8_t* const taken = memory == nullptr ? nullptr : memory + used;
-        used += (static_cast<size_t>(count) * sizeof(T) + kAlignment - 1) / kAlignment * kAlignment;
+        used += roundedUp(count * static_cast<int64_t>(sizeof(T)), kArenaAlignment);
         return reinterpret_cast<T*>(taken);
     }
 };
@@ -46,18 +48,6 @@ VOREL_INLINE void setBytes(uint8_t* to, uint8_t value, int64_t count) {
     std::memset(to, value, static_cast<size_t>(count));
 }
 
-/// Copies `count` bytes, inverted where `flip` says so.
-inline void copyFlipped(const uint8_t* from, uint8_t* to, int64_t count, uint8_t flip) {
-    const auto copy = [=](int64_t x) { store(to + x, load<Bytes>(from + x) ^ flip); };
-    int64_t x = 0;
-    for (; x + kBytes <= count; x += kBytes)
-        copy(x);
-    // The last vector may lie over its predecessor.
-    if (x < count && count >= kBytes) return copy(count - kBytes);
-    for (; x < count; ++x)
-        to[x] = static_cast<uint8_t>(from[x] ^ flip);
-}
-
 VOREL_INLINE void clearRow(const PaddedRows& rows, int64_t row) {
     setBytes(rows.at(row) - rows.lead, 0, rows.stride);
 }
@@ -70,7 +60,7 @@ inline void fillRow(const Dilation& dilation, int64_t y, const PaddedRows& rows,
     setBytes(to + rows.width, 0, rows.stride - rows.lead - rows.width);
     if (y == 0 || y == dilation.height - 1) return setBytes(to, dilation.flip, rows.width);
     to[0] = to[rows.width - 1] = dilation.flip;
-    copyFlipped(dilation.box + (y - 1) * dilation.boxStride, to + 1, rows.width - 2, dilation.flip);
+    copyFlipped(dilation.box + (y - 1) * dilation.boxStride, rows.width - 2, dilation.flip, to + 1);
 }
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

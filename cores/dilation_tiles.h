@@ -42,7 +42,7 @@ struct DiscRow {
 constexpr int64_t kFewestTaps = 4;
 constexpr int64_t kFewestRimCells = 2;
 
-/// Rows before and behind the disc's that a vector may hang over.
+/// Rows behind the disc's last one that a vector may hang over.
 constexpr int64_t kOverhang = 64;
 
 constexpr int64_t kLongestWindow = 64;
@@ -72,8 +72,9 @@ struct TilePlanes {
     DiscRow* discRows;
     int32_t* taps;
     Tile* rimDeficits;
-    uint8_t* outerReach;  ///< by dy, from the middle to both sides, at most 255
-    size_t bytes;
+    uint8_t* outerReach;  ///< by dy, from -reach to reach, at most 255, then zeros
+    uint8_t* results;     ///< of a band
+    int64_t bytes;
 };
 
 /// Rows as long as they may be take nine windows of 64 pixels, rows shorter than 16 up to 15 single
@@ -105,7 +106,8 @@ inline TilePlanes tilePlanes(const Dilation& dilation) {
     planes.discRows = arena.take<DiscRow>(reach + 1);
     planes.taps = arena.take<int32_t>((reach + 1) * kMostTaps);
     planes.rimDeficits = arena.take<Tile>(DiscShape::kMostRimCells + (reach + 1) * kFewestRimCells);
-    planes.outerReach = arena.take<uint8_t>(2 * (reach + 1 + kOverhang));
+    planes.outerReach = arena.take<uint8_t>(2 * reach + 1 + kOverhang);
+    planes.results = arena.take<uint8_t>(dilation.bandRows * dilatedStride(dilation));
     planes.bytes = arena.used;
     return planes;
 }
@@ -152,7 +154,7 @@ inline void listDiscRows(const TilePlanes& planes, const DiscShape& disc) {
 }
 
 inline void listOuterReach(const TilePlanes& planes, const DiscShape& disc) {
-    setBytes(planes.outerReach, 0, 2 * (disc.reach + 1 + kOverhang));
+    setBytes(planes.outerReach, 0, 2 * disc.reach + 1 + kOverhang);
     for (int64_t dy = -disc.reach; dy <= disc.reach; ++dy) {
         const int reach = disc.outerReach[dy < 0 ? -dy : dy];
         planes.outerReach[disc.reach + dy] = static_cast<uint8_t>(smaller(reach, 255));
@@ -446,10 +448,11 @@ inline void dilateRowByTiles(const Dilation& dilation, const TilePlanes& planes,
     }
 }
 
-inline void dilateRowsByTiles(const Dilation& dilation, int64_t y, int64_t count, uint8_t* results) {
+inline uint8_t* dilateRowsByTiles(const Dilation& dilation, int64_t y, int64_t count) {
     const TilePlanes planes = tilePlanes(dilation);
-    for (int64_t i = 0; i < count; ++i, results += dilatedStride(dilation))
-        dilateRowByTiles(dilation, planes, y + i, results);
+    for (int64_t i = 0; i < count; ++i)
+        dilateRowByTiles(dilation, planes, y + i, planes.results + i * dilatedStride(dilation));
+    return planes.results;
 }
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

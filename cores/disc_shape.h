@@ -2,7 +2,7 @@
 
 #include <cstdint>
 
-#include "cores/paint_input.h"
+#include "core/size_limit.h"
 
 namespace VFontEffect::internal {
 

@@ -1,6 +1,7 @@
 #include "cores/fill_kernels.h"
 
 #include <cstdint>
+#include <cstring>
 
 #include "blend/rows.h"
 #include "blend/rules.h"
@@ -14,21 +15,13 @@ namespace {
 constexpr int32_t kLastEntry = 255;
 constexpr int32_t kMiddleEntry = 128;
 
-/// 0, 1, 2, ... as whole numbers.
-VOREL_INLINE Integers ascending() {
-    Integers lanes{};
-    for (int32_t i = 0; i < kWords; ++i)
-        lanes[i] = i;
-    return lanes;
-}
-
 VOREL_INLINE Integers clamped(Integers value, int32_t low, int32_t high) {
     return larger(smaller(value, spread<Integers>(high)), spread<Integers>(low));
 }
 
 /// x - centre for the columns x, x + 1, ...
 VOREL_INLINE Floats columnsFrom(int64_t x, float centre) {
-    return __builtin_convertvector(ascending() + static_cast<int32_t>(x), Floats) - centre;
+    return __builtin_convertvector(ascending<Integers>() + static_cast<int32_t>(x), Floats) - centre;
 }
 
 struct LinearRow {
@@ -71,15 +64,17 @@ template <class RampRow>
 struct RampPainter {
     static constexpr bool kReadsImage = false;
     static constexpr bool kReadsMask = true;
+    static constexpr bool kIsSparse = true;
     static constexpr Empty kEmpty = DstOverWhereCovered::kEmpty;
     RampRow row;
 
-    VOREL_INLINE bool isEmpty(const Place& place) const { return hasEmptyMask(place); }
+    template <int64_t kCount>
+    VOREL_INLINE bool isEmpty(const Place& place) const {
+        return hasEmptyMask<kCount>(place);
+    }
     VOREL_INLINE bool paintWhole(const Place&) const { return false; }
     VOREL_INLINE Pixels paint(const Place& place) const {
         const Pixels destination = loadPixels(place.destination());
-        // Half of a text's vectors lie between its strokes: worth a look, as a vector costs much.
-        if (allZero<kPixels>(place.mask())) return destination;
         const Pixels colours =
             madeOfWords([&](int64_t i) { return gathered(row.pixels, row.entries(place.x + i)); });
         return DstOverWhereCovered::apply(destination, colours, loadAmounts(place.mask()));
@@ -97,6 +92,32 @@ void fillRamp(const BlendJob& job, const Ramp& ramp) {
 }
 
 constexpr uint32_t kEvenBytes = 0x00FF00FFU;
+
+/// Weights of 256ths: the colours keep all four bytes alike, two of them at a time. Positions beyond a
+/// segment have the colour of its end.
+void mixStops(const RampSegment& segment, const float* positions, int64_t count, uint32_t* colours) {
+    const auto lowerEven = spread<Words>(segment.lower & kEvenBytes);
+    const auto lowerOdd = spread<Words>(segment.lower >> 8 & kEvenBytes);
+    const auto upperEven = spread<Words>(segment.upper & kEvenBytes);
+    const auto upperOdd = spread<Words>(segment.upper >> 8 & kEvenBytes);
+    for (int64_t i = 0; i < count; i += kWords) {
+        const Floats place = (load<Floats>(positions + i) - segment.start) / segment.span * 256.0F;
+        const auto weight = as<Words>(clamped(toInt(place), 0, 256));
+        const Words rest = 256 - weight;
+        const Words even = (weight * upperEven + rest * lowerEven) >> 8 & kEvenBytes;
+        const Words odd = (weight * upperOdd + rest * lowerOdd) & ~kEvenBytes;
+        const Words mixed = even | odd;
+        std::memcpy(colours + i, &mixed, static_cast<size_t>(4 * smaller(kWords, count - i)));
+    }
+}
+
+void premultiplied(const uint32_t* colours, int64_t count, uint32_t* pixels) {
+    for (int64_t i = 0; i < count; i += kPixels) {
+        const Pixels straight = loadWords(reinterpret_cast<const uint8_t*>(colours + i));
+        storePixels(reinterpret_cast<uint8_t*>(pixels + i),
+                    withAlphaOf(scaled(straight, alphaOf(straight)), straight));
+    }
+}
 
 /// Two bytes of each word times the weight in both of its halves: 255 * 255 fits in 16 bits.
 VOREL_INLINE Halves weighted(Words bytes, Words weight) {
@@ -154,6 +175,8 @@ void mixRows(const MixedRow& near, const MixedRow& far, uint32_t nearWeight, uin
 extern const FillKernels kFillKernels = {
     fillRamp<LinearRow, LinearRamp>,
     fillRamp<RadialRow, RadialRamp>,
+    mixStops,
+    premultiplied,
     mixColumns,
     mixRows,
 };

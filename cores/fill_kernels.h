@@ -27,8 +27,16 @@ struct RadialRamp {
     float centreY;
 };
 
-/// Rows of a pattern's kernels may be read and written this many pixels past their count.
+/// Rows may be read and written this many pixels past their count where a kernel says so.
 constexpr int64_t kRowSlack = 16;
+
+/// A stretch of a ramp between two stops with straight colours 0xAARRGGBB, from `start` on.
+struct RampSegment {
+    uint32_t lower;
+    uint32_t upper;
+    float start;
+    float span;
+};
 
 /// Where each column of a row is sampled: two neighbouring pattern pixels and their weights, which add
 /// up to 255. A weight stands in both halves of its word.
@@ -51,7 +59,16 @@ struct FillKernels {
     void (*linear)(const BlendJob& job, const LinearRamp& ramp);
     void (*radial)(const BlendJob& job, const RadialRamp& ramp);
 
-    /// Mixes `count` columns of a pattern row of words (memory order A, R, G, B).
+    /// The colours of a segment at `count` positions, which may be read past their count.
+    void (*mixStops)(const RampSegment& segment, const float* positions, int64_t count,
+                     uint32_t* colours);
+
+    /// Straight colours 0xAARRGGBB as premultiplied pixels in memory: R, G, B, A. Their count is a
+    /// multiple of kRowSlack.
+    void (*premultiplied)(const uint32_t* colours, int64_t count, uint32_t* pixels);
+
+    /// Mixes `count` columns of a pattern row of words (memory order A, R, G, B). Rows of a pattern are
+    /// read and written past their count.
     void (*mixColumns)(const uint32_t* patternRow, const ColumnTaps& taps, int64_t count,
                        const MixedRow& out);
 

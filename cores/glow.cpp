@@ -4,13 +4,13 @@
 #include <cstdint>
 #include <cstring>
 
-#include "core/fixed_point.h"
 #include "core/numeric.h"
 #include "core/pixel_buffer.h"
+#include "core/size_limit.h"
 #include "cores/blur.h"
-#include "cores/covered_fill.h"
+#include "cores/fill_kernels.h"
+#include "cores/glow_kernels.h"
 #include "cores/growth.h"
-#include "cores/growth_kernels.h"
 #include "cores/paint_input.h"
 #include "cores/placed_target.h"
 #include "cores/stop_ramp.h"
@@ -19,6 +19,8 @@ namespace VFontEffect::internal {
 namespace {
 
 constexpr float kFadeStart = 0.3F;
+static_assert(kFadedValues == 256 - static_cast<int>(double{kFadeStart} * 256.0),
+              "a glow of one colour fades as a table of colours does");
 constexpr int kCurve = 0;
 
 /// `pad`, the whole size + 1, is the unit of a glow: growth and blur are fractions of it, the margin is
@@ -44,17 +46,34 @@ struct Shape {
     }
 };
 
-/// The colour of each blurred value, as the pixel in memory. Strong values lie near the text, at the
-/// start of the table. Deliberate: values end at 255, so entry 0 is never taken.
-struct ValuePixels {
-    uint32_t pixels[kTableLast];
-
-    explicit ValuePixels(const GlowRecord& record) {
+/// The colours of the blurred values. Strong values lie near the text, at the start of the table.
+/// Deliberate: values end at 255, so entry 0 is never taken.
+class ValueColours {
+  public:
+    explicit ValueColours(const GlowRecord& record)
+        : mIsOne(record.hasOneColour()), mColor(record.oneColour()) {
+        if (mIsOne) return;
         unsigned int table[kTableSize];
         fillGlowTable(record, kFadeStart, kCurve, table);
-        for (int value = 0; value < kTableLast; ++value)
-            pixels[value] = pixelOf(premultiply(table[kTableLast - value]));
+        fillKernels().premultiplied(table + 1, kTableLast, mPixels);
+        std::reverse(mPixels, mPixels + kTableLast);
     }
+
+    /// Paints the job's mask, the values, beneath the destination, and may change it. A single colour
+    /// differs in its alpha only: the values become that, and the mask of the opaque colour, for
+    /// product(255, alpha) = alpha.
+    void paint(BlendJob job, uint8_t* values) const {
+        job.mask = values;
+        if (!mIsOne) return glowKernels().paint({job, mPixels});
+        glowKernels().fade(values, job.maskStride * (job.height - 1) + job.width, mColor >> 24);
+        job.color = mColor | 0xFF000000U;
+        blendKernels().dstOverMask(job);
+    }
+
+  private:
+    bool mIsOne;
+    uint32_t mColor;
+    uint32_t mPixels[kTableLast];  ///< by value, as in memory, if there are several
 };
 
 /// The coverage, or its inverse, with a margin that is empty or full, and so is the frame.
@@ -78,7 +97,7 @@ Growth coverageToGrow(const CoverageBox& box, uint8_t flip, int64_t margin) {
 /// Grows, blurs and paints the part of the glow in the window. Returns false, with nothing painted, when
 /// memory ran out.
 bool paintBlurred(const CoverageBox& box, const Shape& shape, const PlacedTarget& target,
-                  const Window& window, const ValuePixels& values, Sense sense) {
+                  const Window& window, const ValueColours& colours, Sense sense) {
     const bool inverted = sense == Sense::inverted;
     const uint8_t flip = inverted ? 0xFF : 0;
     // Coverage spreads by a pixel a pass. Around its inverse everything is full, and stays so.
@@ -89,16 +108,16 @@ bool paintBlurred(const CoverageBox& box, const Shape& shape, const PlacedTarget
     growth.finish();
 
     // Deliberate: between the passes of an inner glow the columns that the first pass does not reach are
-    // full; with a radius of 0 those are that growth clears, the first one and the last.
+    // full; with a radius of 0 those that growth clears, the first one and the last.
     const int64_t open = std::max(1, shape.radius);
     const FullColumns full =
         inverted ? FullColumns{shape.image.left + open, shape.image.right - open} : kNoFullColumns;
     DownThenAcross blur(glowKernel(shape.radius), growth.source(flip), moved(window, margin, margin),
                         full);
     if (!blur) return false;
-    blur.run(inverted, [&](int64_t y, int64_t rows, const uint8_t* blurred, int64_t stride) {
+    blur.run(inverted, [&](int64_t y, int64_t rows, uint8_t* values, int64_t stride) {
         const Window part = {window.left, y - margin, window.right, y - margin + rows};
-        glowKernels().paint({target.jobOn(part, blurred, stride), values.pixels});
+        colours.paint(target.jobOn(part, values, stride), values);
     });
     return true;
 }
@@ -125,13 +144,13 @@ void paintBorder(const Shape& shape, const PlacedTarget& target, const uint8_t* 
 
 /// Paints the corners of an inner glow without a blur: growth clears the first and the last column but
 /// for their ends.
-void paintCorners(const Shape& shape, const PlacedTarget& target, const ValuePixels& values,
-                  const uint8_t* full) {
+void paintCorners(const Shape& shape, const PlacedTarget& target, const ValueColours& colours) {
     const Window& image = shape.image;
     for (const int64_t x : {image.left, image.right - 1}) {
         for (const int64_t y : {image.top, image.bottom - 1}) {
             const Window seen = target.seen({x, y, x + 1, y + 1});
-            if (!seen.empty()) glowKernels().paint({target.jobOn(seen, full, 0), values.pixels});
+            uint8_t strongest = 255;
+            if (!seen.empty()) colours.paint(target.jobOn(seen, &strongest, 0), &strongest);
         }
     }
 }
@@ -149,17 +168,17 @@ void paintGlow(const VFECore::ParamPostProcessing* params, const GlowRecord& rec
     const Window seen = target.seen(shape.image);
     if (seen.empty()) return;
     const Window window = target.seen(shape.blurred);
-    const ValuePixels values(record);
+    const ValueColours colours(record);
     if (sense == Sense::plain) {
-        if (!window.empty()) paintBlurred(box, shape, target, window, values, sense);
+        if (!window.empty()) paintBlurred(box, shape, target, window, colours, sense);
         return;
     }
     auto full = PixelBuffer<uint8_t>::uninitialised(seen.width());
     if (!full) return;
     std::memset(full.data(), 0xFF, static_cast<size_t>(seen.width()));
-    if (!window.empty() && !paintBlurred(box, shape, target, window, values, sense)) return;
+    if (!window.empty() && !paintBlurred(box, shape, target, window, colours, sense)) return;
     paintBorder(shape, target, full.data());
-    if (shape.radius == 0) paintCorners(shape, target, values, full.data());
+    if (shape.radius == 0) paintCorners(shape, target, colours);
 }
 
 }  // namespace VFontEffect::internal

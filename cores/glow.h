@@ -17,6 +17,9 @@ struct GlowRecord {
     const VFGradient* stops;
     int count;
 
+    bool hasOneColour() const { return count < 2; }
+    uint32_t oneColour() const { return count == 1 ? stops[0].mColor : color; }
+
     /// A missing record is one of size 0; a missing array counts as no stops.
     template <class Property>
     static GlowRecord of(const Property* p) {

@@ -3,6 +3,7 @@
 #include <cstdint>
 
 #include "cores/covered_fill.h"
+#include "cores/fill_kernels.h"
 #include "cores/stop_ramp.h"
 
 namespace VFontEffect::internal {

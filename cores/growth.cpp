@@ -5,7 +5,8 @@
 #include <cstring>
 
 #include "blend/clip.h"
-#include "cores/growth_kernels.h"
+#include "core/numeric.h"
+#include "cores/glow_kernels.h"
 
 namespace VFontEffect::internal {
 namespace {
@@ -32,7 +33,7 @@ int64_t firstInked(const uint8_t* row, int64_t x, int64_t end) {
 }
 
 /// One place behind the last from `x` to `end` - 1 that is not 0, or x.
-int64_t lastInked(const uint8_t* row, int64_t x, int64_t end) {
+int64_t inkedEnd(const uint8_t* row, int64_t x, int64_t end) {
     uint64_t eight = 0;
     for (; x + 8 <= end; end -= 8) {
         std::memcpy(&eight, row + end - 8, sizeof eight);
@@ -51,7 +52,7 @@ Clip inkedPart(const Picture& picture) {
         const int64_t first = firstInked(row, 0, picture.width);
         if (first == picture.width) continue;
         inked = {std::min(inked.left, first), std::min(inked.top, y),
-                 std::max(inked.right, lastInked(row, first, picture.width)), y + 1};
+                 std::max(inked.right, inkedEnd(row, first, picture.width)), y + 1};
     }
     return inked;
 }
@@ -76,12 +77,8 @@ void clearEndColumns(const Picture& picture) {
         *picture.at(0, y) = *picture.at(picture.width - 1, y) = 0;
 }
 
-}  // namespace
-
-namespace {
-
 int64_t strideFor(int64_t width) {
-    return kGrowthMargin + (width + kGrowthMargin - 1) / kGrowthMargin * kGrowthMargin;
+    return kGrowthMargin + roundedUp(width, kGrowthMargin);
 }
 
 /// Rows, frame and margins.
@@ -129,23 +126,19 @@ void Growth::finish() {
 }
 
 // What is not 0 spreads by a pixel a pass: the part that changes lies within `passes` pixels of it.
-bool growByBoxFilter(unsigned char* mask, int passes, int width, int height) {
-    if (mask == nullptr || passes < 1 || width < 1 || height <= 2) return true;
+void growByBoxFilter(unsigned char* mask, int passes, int width, int height) {
+    if (mask == nullptr || passes < 1 || width < 1 || height <= 2) return;
     const Picture picture = {mask, width, height};
     const Clip inner = {1, 1, int64_t{width} - 1, int64_t{height} - 1};
     const Clip part = common(grown(inkedPart(picture), passes), inner);
-    if (part.empty()) {
-        clearEndColumns(picture);
-        return true;
-    }
+    if (part.empty()) return clearEndColumns(picture);
     Growth growth(part.width(), part.height());
-    if (!growth) return false;
+    if (!growth) return;
     copyIn(picture, part, growth);
     growth.grow(1, 0);
     growth.grow(passes - 1, 0);
     copyOut(growth, part, picture);
     clearEndColumns(picture);
-    return true;
 }
 
 }  // namespace VFontEffect::internal

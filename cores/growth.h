@@ -42,8 +42,8 @@ class Growth {
     int mCurrent = 0;
 };
 
-/// Grows the coverage of a whole picture in place; see VFOuterGlow::increaseByBoxFilter. False when
-/// memory ran out.
-bool growByBoxFilter(unsigned char* mask, int passes, int width, int height);
+/// Grows the coverage of a whole picture in place; see VFOuterGlow::increaseByBoxFilter. When memory
+/// runs out it stays as it was.
+void growByBoxFilter(unsigned char* mask, int passes, int width, int height);
 
 }  // namespace VFontEffect::internal

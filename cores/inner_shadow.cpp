@@ -1,7 +1,7 @@
 #include <cstdint>
 
-#include "blend/kernels.h"
 #include "core/effect_types.h"
+#include "core/size_limit.h"
 #include "cores/blur.h"
 #include "cores/paint_input.h"
 #include "cores/placed_target.h"
@@ -57,16 +57,12 @@ void VFInnerShadow::doPostProcessing(ParamPostProcessing* params) {
     const PlacedTarget target(params->dstBitmap, box.left, box.top);
     const Window window = target.seen(wholeOf(box));
     if (window.empty()) return;
-    const auto paint = [&](const Window& part, const uint8_t* shadow, int64_t stride) {
-        BlendJob job = target.jobOn(part, shadow, stride);
-        job.color = mProperty->mColor;
-        blendKernels().dstOverMask(job);
-    };
+    const uint32_t color = mProperty->mColor;
     const int radius = shadowRadius(mProperty->mSize);
     const ShadowOffset offset = shadowOffset(mProperty->mAngle, mProperty->mDistance);
     if (!meetsItself(box, radius, offset.x, offset.y)) {
         // The glyph moved clear of itself: all of it lies in shadow, by its own coverage.
-        return paint(window, box.row(window.top) + window.left, box.mask.width);
+        return target.paintBeneath(window, box.row(window.top) + window.left, box.mask.width, color);
     }
 
     const Window unmoved = moved(window, -int64_t{offset.x}, -int64_t{offset.y});
@@ -74,7 +70,7 @@ void VFInnerShadow::doPostProcessing(ParamPostProcessing* params) {
     if (!blur) return;
     blur.run([&](int64_t y, int64_t rows, const uint8_t* values, int64_t stride) {
         const int64_t top = y + offset.y;
-        paint({window.left, top, window.right, top + rows}, values, stride);
+        target.paintBeneath({window.left, top, window.right, top + rows}, values, stride, color);
     });
 }
 

@@ -2,7 +2,7 @@
 #include "cores/blur_kernels.h"
 #include "cores/dilation.h"
 #include "cores/fill_kernels.h"
-#include "cores/growth_kernels.h"
+#include "cores/glow_kernels.h"
 
 namespace VFontEffect::internal {
 

@@ -3,6 +3,7 @@
 #include "core/effect_types.h"
 #include "core/portable_math.h"
 #include "cores/covered_fill.h"
+#include "cores/fill_kernels.h"
 #include "cores/gradient_table.h"
 #include "cores/paint_input.h"
 #include "cores/property_copy.h"

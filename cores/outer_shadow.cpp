@@ -1,9 +1,9 @@
 #include <algorithm>
 #include <cstdint>
 
-#include "blend/kernels.h"
 #include "core/effect_types.h"
 #include "core/numeric.h"
+#include "core/size_limit.h"
 #include "cores/blur.h"
 #include "cores/paint_input.h"
 #include "cores/placed_target.h"
@@ -65,18 +65,16 @@ void VFOuterShadow::doPostProcessing(ParamPostProcessing* params) {
     const int radius = shadowRadius(mProperty->mSize);
     const Window window = target.seen(grown(wholeOf(box), radius));
     if (window.empty()) return;
-    const auto paint = [&](const Window& part, const uint8_t* shadow, int64_t stride) {
-        BlendJob job = target.jobOn(part, shadow, stride);
-        job.color = mProperty->mColor;
-        blendKernels().dstOverMask(job);
-    };
     // Without blur the coverage itself is the shadow.
-    if (radius == 0) return paint(window, box.row(window.top) + window.left, box.mask.width);
+    const uint32_t color = mProperty->mColor;
+    if (radius == 0) {
+        return target.paintBeneath(window, box.row(window.top) + window.left, box.mask.width, color);
+    }
 
     DownThenAcross blur(shadowKernel(radius), sourceOf(box), window, kNoFullColumns);
     if (!blur) return;
     blur.run(false, [&](int64_t y, int64_t rows, const uint8_t* values, int64_t stride) {
-        paint({window.left, y, window.right, y + rows}, values, stride);
+        target.paintBeneath({window.left, y, window.right, y + rows}, values, stride, color);
     });
 }
 

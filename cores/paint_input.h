@@ -9,13 +9,6 @@
 /// What a core paints from: checked once, then trusted.
 namespace VFontEffect::internal {
 
-/// Sizes beyond this many pixels are no text effect, and would take gigabytes or minutes.
-constexpr float kLargestSizePx = 256.0F;
-
-inline bool isAbsurd(float sizePx) {
-    return sizePx > kLargestSizePx;
-}
-
 /// A box of the mask that lies inside it and is not empty.
 struct CoverageBox {
     MaskView mask;

@@ -7,6 +7,7 @@
 #include "core/numeric.h"
 #include "core/pixel_buffer.h"
 #include "cores/covered_fill.h"
+#include "cores/fill_kernels.h"
 #include "cores/paint_input.h"
 #include "cores/property_copy.h"
 #include "voreleffect/VFECore.h"
@@ -57,27 +58,31 @@ class TileAxis {
 class TapRow {
   public:
     TapRow(const TileAxis& columns, int64_t count)
-        : mWords(PixelBuffer<uint32_t>::zeroed(count + kRowSlack, 4)), mLength(count + kRowSlack) {
+        : mWords(PixelBuffer<uint32_t>::uninitialised(count + kRowSlack, 4)),
+          mLength(count + kRowSlack) {
         if (!mWords) return;
+        // Pixels are looked up for the columns behind the last one too.
+        for (int64_t plane = 0; plane < 4; ++plane)
+            std::fill_n(at(plane) + count, kRowSlack, 0U);
         for (int64_t x = 0; x < count; ++x) {
             const Tap tap = columns.at(x);
-            plane(0)[x] = static_cast<uint32_t>(tap.near);
-            plane(1)[x] = static_cast<uint32_t>(tap.far);
-            plane(2)[x] = tap.nearWeight * kBothHalves;
-            plane(3)[x] = tap.farWeight * kBothHalves;
+            at(0)[x] = static_cast<uint32_t>(tap.near);
+            at(1)[x] = static_cast<uint32_t>(tap.far);
+            at(2)[x] = tap.nearWeight * kBothHalves;
+            at(3)[x] = tap.farWeight * kBothHalves;
         }
     }
 
     explicit operator bool() const { return static_cast<bool>(mWords); }
     ColumnTaps taps() {
-        return {reinterpret_cast<const int32_t*>(plane(0)), reinterpret_cast<const int32_t*>(plane(1)),
-                plane(2), plane(3)};
+        return {reinterpret_cast<const int32_t*>(at(0)), reinterpret_cast<const int32_t*>(at(1)), at(2),
+                at(3)};
     }
 
   private:
     static constexpr uint32_t kBothHalves = 0x00010001U;
 
-    uint32_t* plane(int64_t index) { return mWords.data() + index * mLength; }
+    uint32_t* at(int64_t plane) { return mWords.data() + plane * mLength; }
 
     PixelBuffer<uint32_t> mWords;
     int64_t mLength;
@@ -92,11 +97,12 @@ class TiledRows {
   public:
     TiledRows(const ColourView& pattern, float scale, float opacity, int64_t width)
         : mPattern(pattern),
+          mColumns(pattern.width, scale),
           mRows(pattern.height, scale),
           mOpacity(opacity),
           mWidth(width),
-          mSampled(std::min(width, TileAxis(pattern.width, scale).period())),
-          mTaps(TileAxis(pattern.width, scale), mSampled),
+          mSampled(std::min(width, mColumns.period())),
+          mTaps(mColumns, mSampled),
           mMixed{KeptRow(mSampled), KeptRow(mSampled)},
           mRow(PixelBuffer<uint32_t>::uninitialised(width + kRowSlack)) {}
 
@@ -150,6 +156,7 @@ class TiledRows {
     }
 
     ColourView mPattern;
+    TileAxis mColumns;
     TileAxis mRows;
     float mOpacity;
     int64_t mWidth;

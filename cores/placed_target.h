@@ -4,6 +4,7 @@
 
 #include "blend/clip.h"
 #include "blend/job.h"
+#include "blend/kernels.h"
 #include "core/views.h"
 #include "cores/paint_input.h"
 
@@ -30,6 +31,13 @@ class PlacedTarget {
         job.mask = mask;
         job.maskStride = stride;
         return job;
+    }
+
+    /// Paints one colour through a mask of the part's size beneath what is there.
+    void paintBeneath(const Clip& part, const uint8_t* mask, int64_t stride, uint32_t color) const {
+        BlendJob job = jobOn(part, mask, stride);
+        job.color = color;
+        blendKernels().dstOverMask(job);
     }
 
   private:

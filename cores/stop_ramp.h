@@ -2,7 +2,7 @@
 
 #include <cstdint>
 
-#include "core/numeric.h"
+#include "cores/fill_kernels.h"
 #include "voreleffect/VFBitmap.h"
 
 namespace VFontEffect::internal {
@@ -11,62 +11,24 @@ namespace VFontEffect::internal {
 constexpr int kTableSize = 257;
 constexpr int kTableLast = kTableSize - 1;
 
-inline float tablePosition(int entry) {
-    return static_cast<float>(entry) * 0.00390625F;
-}
+/// The places on a ramp of a table's entries, which ascend, and of some more.
+struct TablePositions {
+    static constexpr int kCount = kTableLast + static_cast<int>(kRowSlack);
+    float of[kCount];
 
-/// The mix of two straight colours, all four bytes alike, two of them at a time; weight 0..256.
-inline uint32_t mixedColours(uint32_t lower, uint32_t upper, uint32_t weight) {
-    constexpr uint32_t kEven = 0x00FF00FFU;
-    const uint32_t rest = 256 - weight;
-    const uint32_t low = ((weight * (upper & kEven) + rest * (lower & kEven)) >> 8) & kEven;
-    const uint32_t high = (weight * ((upper >> 8) & kEven) + rest * ((lower >> 8) & kEven)) & ~kEven;
-    return low | high;
-}
-
-/// Walks the segments between stops as a table is filled from its start.
-///
-/// Deliberate: a call moves on by one segment at most, even when the position has passed several
-/// stops, so stops closer together than a table entry take effect one entry late. When no stop is
-/// left the last segment stays.
-class StopRamp {
-  public:
-    /// `count` of 2 or more; the first segment runs from `start` to the position of stop 1.
-    StopRamp(const VFGradient* stops, int count, float start)
-        : mStops(stops),
-          mCount(count),
-          mLower(stops[0].mColor),
-          mUpper(stops[1].mColor),
-          mStart(start),
-          mEnd(stops[1].mLocation),
-          mSpan(mEnd - start) {}
-
-    /// The colour at a position; positions of successive calls ascend.
-    uint32_t colourAt(float position) {
-        if (mEnd < position && mNext < mCount) moveOn();
-        const int32_t weight = toInt((position - mStart) / mSpan * 256.0F);
-        if (weight < 1) return mLower;
-        return weight >= 256 ? mUpper : mixedColours(mLower, mUpper, static_cast<uint32_t>(weight));
+    TablePositions() {
+        for (int i = 0; i < kCount; ++i)
+            of[i] = static_cast<float>(i) * 0.00390625F;
     }
-
-  private:
-    void moveOn() {
-        const VFGradient& next = mStops[mNext++];
-        mStart = mEnd;
-        mLower = mUpper;
-        mSpan = next.mLocation - mEnd;
-        mEnd = next.mLocation;
-        mUpper = next.mColor;
-    }
-
-    const VFGradient* mStops;
-    int mCount;
-    int mNext = 2;
-    uint32_t mLower;
-    uint32_t mUpper;
-    float mStart;
-    float mEnd;
-    float mSpan;
 };
+
+/// Gives the entries 1 to 255 of a table the straight colours along `count` stops, 2 or more. The first
+/// segment runs from `start` to the position of stop 1.
+///
+/// Deliberate: an entry moves on by one segment at most, even when it has passed several stops, so stops
+/// closer together than a table entry take effect one entry late. When no stop is left the last segment
+/// stays.
+void fillBetweenStops(const VFGradient* stops, int count, float start, const TablePositions& positions,
+                      uint32_t* table);
 
 }  // namespace VFontEffect::internal

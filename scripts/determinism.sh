@@ -49,6 +49,9 @@ if grep -qw avx2 /proc/cpuinfo 2> /dev/null; then
     check g++ "-O3 -march=x86-64-v3"
     check clang++-14 "-O3 -march=x86-64-v3"
 fi
+if grep -qw avx512vl /proc/cpuinfo 2> /dev/null; then
+    check g++ "-O3 -march=x86-64-v4"
+fi
 arm=(-DCMAKE_SYSTEM_NAME=Linux -DCMAKE_SYSTEM_PROCESSOR=aarch64
     "-DCMAKE_CROSSCOMPILING_EMULATOR=qemu-aarch64-static;-L;/usr/aarch64-linux-gnu")
 check aarch64-linux-gnu-g++ -O0 "${arm[@]}"

@@ -17,9 +17,10 @@ namespace {
 using VFontEffect::VFBitmap;
 using VFontEffect::VFBlender;
 using vorel_fuzz::Decoder;
-using vorel_fuzz::kLongestSide;
 using vorel_fuzz::Size;
 
+/// Several stretches of the widest vectors, and rows around them.
+constexpr int kLongestSide = 160;
 constexpr Size kLargestTarget = {kLongestSide, 12};
 constexpr int kMostCalls = 12;
 constexpr double kMostSourceBytes = 1 << 16;

@@ -38,7 +38,10 @@ using vorel_fuzz::WorkBudget;
 using vorel_test::libraryStops;
 using vorel_test::Scene;
 
-constexpr int kLongestMaskSide = 40;
+/// Columns for two of the widest vectors and what lies around them.
+constexpr int kLongestRow = 200;
+constexpr int kLongestMaskWidth = 160;
+constexpr int kLongestMaskHeight = 40;
 constexpr double kMostSteps = 2e6;
 
 /// The name of the comparison, for the message of a failure.
@@ -82,9 +85,9 @@ void compareKernel(const std::string& name, const vorel_test::Placement& p, int 
 
 vorel_test::Placement decodePlacement(Decoder& in) {
     vorel_test::Placement p{};
-    p.dstWidth = in.between(1, 67);
+    p.dstWidth = in.between(1, kLongestRow);
     p.dstHeight = in.between(1, 6);
-    p.width = in.between(0, 67);
+    p.width = in.between(0, kLongestRow);
     p.height = in.between(0, 6);
     p.x = in.wildInt(-p.width - 2, p.dstWidth + 2);
     p.y = in.wildInt(-p.height - 2, p.dstHeight + 2);
@@ -173,11 +176,11 @@ void compareKernels(Decoder& in) {
 
 // --- Arguments of the cores -------------------------------------------------------------------------
 
-/// Sides up to `kLongestMaskSide`; a box inside the mask, or anywhere.
+/// With a box inside the mask, or anywhere.
 Scene decodeScene(Decoder& in) {
     Scene scene;
-    const int width = in.between(1, kLongestMaskSide);
-    const int height = in.between(1, kLongestMaskSide);
+    const int width = in.between(1, kLongestMaskWidth);
+    const int height = in.between(1, kLongestMaskHeight);
     scene.mask = Mask{width, height, vorel_fuzz::decodeCoverage(in, width, height)};
     scene.dst = Picture{width, height, vorel_fuzz::decodeColours(in, width, height, 3)};
     if (in.oneIn(4)) {
@@ -379,8 +382,8 @@ void comparePieces(Decoder& in) {
             weights == nullptr ? 0 : static_cast<size_t>(side) * static_cast<size_t>(side);
         requireEqual(expected.weights, std::vector<uint8_t>(weights, weights + count), "circle kernel");
     }
-    const int width = in.between(0, kLongestMaskSide);
-    const int height = in.between(0, kLongestMaskSide);
+    const int width = in.between(0, kLongestMaskWidth);
+    const int height = in.between(0, kLongestMaskHeight);
     const int passes = in.between(0, 12);
     std::vector<uint8_t> expected = vorel_fuzz::decodeCoverage(in, width, height);
     std::vector<uint8_t> actual = expected;
@@ -580,8 +583,8 @@ void Pair::run() {
         for (int left = mIn.between(0, 3); left > 0; --left)
             add();
         compareKeys();
-        const int width = mIn.between(1, kLongestMaskSide);
-        paint(width, mIn.between(1, kLongestMaskSide));
+        const int width = mIn.between(1, kLongestMaskWidth);
+        paint(width, mIn.between(1, kLongestMaskHeight));
     }
 }
 

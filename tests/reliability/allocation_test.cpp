@@ -154,17 +154,24 @@ CoreCase coreCase(std::string name, Record record, Record other, bool layered, l
             copyRequests};
 }
 
+CoreCase strokeCase(const std::string& name, float radius, int position, bool layered) {
+    const bool centred = position == 0;
+    const VFStrokeProperty record(centred ? 2 * radius : radius, 0x80402010, 0.5F, 0, position);
+    const VFStrokeProperty other(1, 0xFF00FF00, 1, 0, position);
+    // What the dilation works in, twice for a centred stroke.
+    return coreCase<VFStroke>(name, record, other, layered, centred ? 2 : 1, 1);
+}
+
 std::vector<CoreCase> strokeCases() {
     std::vector<CoreCase> cases;
     const std::string names[] = {"StrokeCentre", "StrokeOutside", "StrokeInside"};
     for (int position = 0; position < 3; ++position) {
-        for (const bool layered : {false, true}) {
-            const VFStrokeProperty record(3, 0x80402010, 0.5F, 0, position);
-            const VFStrokeProperty other(1, 0xFF00FF00, 1, 0, position);
-            // What the dilation works in, twice for a centred stroke, and a band of the outline.
-            cases.push_back(coreCase<VFStroke>(names[position] + (layered ? "Layered" : ""), record,
-                                               other, layered, position == 0 ? 3 : 2, 1));
-        }
+        // Larger discs and the smallest ones are dilated by in ways of their own.
+        for (const bool layered : {false, true})
+            cases.push_back(
+                strokeCase(names[position] + (layered ? "Layered" : ""), 3, position, layered));
+        cases.push_back(strokeCase("Thin" + names[position], 1.5F, position, false));
+        cases.push_back(strokeCase("Wide" + names[position], 20, position, false));
     }
     return cases;
 }
@@ -195,12 +202,16 @@ std::vector<CoreCase> coreCases() {
         using Radial = VFRadialGradientProperty;
         cases.push_back(coreCase<VFText>("Text" + suffix, VFTextProperty(0x80808080, 0.5F),
                                          VFTextProperty(0xFF204060, 1), layered, 0, 1));
-        cases.push_back(coreCase<VFOuterShadow>("OuterShadow" + suffix,
-                                                Outer(120, 4, 3, 0x80202020, 0.5F),
-                                                Outer(30, 2, 0, 0xFFFFFFFF, 1), layered, 7, 1));
-        cases.push_back(coreCase<VFInnerShadow>("InnerShadow" + suffix,
-                                                Inner(120, 4, 3, 0x80202020, 0.5F),
-                                                Inner(30, 2, 0, 0xFFFFFFFF, 1), layered, 8, 1));
+        // Sums of the wide ones take 32 bits.
+        for (const float size : {3.0F, 20.0F}) {
+            const std::string kind = size > 3 ? "Wide" : "";
+            cases.push_back(coreCase<VFOuterShadow>(kind + "OuterShadow" + suffix,
+                                                    Outer(120, 4, size, 0x80202020, 0.5F),
+                                                    Outer(30, 2, 0, 0xFFFFFFFF, 1), layered, 7, 1));
+            cases.push_back(coreCase<VFInnerShadow>(kind + "InnerShadow" + suffix,
+                                                    Inner(120, 4, size, 0x80202020, 0.5F),
+                                                    Inner(30, 2, 0, 0xFFFFFFFF, 1), layered, 8, 1));
+        }
         // Moved clear of itself the glyph is drawn by its own coverage, which takes no memory.
         cases.push_back(coreCase<VFInnerShadow>("InnerShadowWholeGlyph" + suffix,
                                                 Inner(180, 90, 3, 0x80202020, 0.5F),

@@ -30,11 +30,16 @@ inline uint32_t randomColor(Random& random) {
     return color;
 }
 
-/// Coverage in runs of up to 24 pixels that are empty, full, at the boundary values or arbitrary.
+/// A run of pixels of one kind: short ones mostly, but also some longer than any vector.
+inline int randomRun(Random& random) {
+    return random.chance(10) ? random.between(30, 150) : random.between(1, 24);
+}
+
+/// Coverage in runs that are empty, full, at the boundary values or arbitrary.
 inline void fillMask(Random& random, uint8_t* mask, size_t size) {
     for (size_t i = 0; i < size;) {
         const int style = random.between(0, 3);
-        for (int run = random.between(1, 24); run > 0 && i < size; --run, ++i) {
+        for (int run = randomRun(random); run > 0 && i < size; --run, ++i) {
             if (style == 0) mask[i] = 0;
             if (style == 1) mask[i] = 255;
             if (style == 2) mask[i] = boundaryByte(random);
@@ -90,12 +95,17 @@ inline int randomStart(Random& random, int room, int length) {
     return random.between(-length - 2, room + 2);
 }
 
-/// Widths 1 to 67, heights 1 to 5.
+/// Mostly up to 67 pixels, now and then enough for several of the longest stretches.
+inline int randomWidth(Random& random) {
+    return random.chance(15) ? random.between(68, 300) : random.between(1, 67);
+}
+
+/// Heights 1 to 5.
 inline Placement randomPlacement(Random& random) {
     Placement p{};
-    p.dstWidth = random.between(1, 67);
+    p.dstWidth = randomWidth(random);
     p.dstHeight = random.between(1, 5);
-    p.width = random.between(1, 67);
+    p.width = randomWidth(random);
     p.height = random.between(1, 5);
     p.x = randomStart(random, p.dstWidth, p.width);
     p.y = randomStart(random, p.dstHeight, p.height);

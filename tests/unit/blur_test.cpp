@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <cmath>
 #include <cstdint>
 #include <utility>
 #include <vector>
@@ -249,6 +250,50 @@ TEST(Blur, OfTallAndWideMasks_IsTheDefinedOne) {
 
 // --- Whole cores ------------------------------------------------------------------------------------
 
+/// Both shadows of a scene, and what the literal form makes of them.
+void expectShadowsLikeTheLiteralForm(const Scene& scene, float angle, float distance, float size,
+                                     uint32_t color) {
+    EXPECT_TRUE(paintsLike(
+        *coreOf<VFOuterShadow, VFOuterShadowProperty>(angle, distance, size, color, 1.0F), scene,
+        [&](Scene& expected) {
+            literal::paintOuterShadow(expected.dst, expected.mask, expected.text, angle, distance, size,
+                                      color);
+        }))
+        << describe(scene) << ", angle " << angle << ", distance " << distance << ", size " << size;
+    const VFInnerShadowProperty reduced(angle, distance, size, color, 1.0F);
+    EXPECT_TRUE(paintsLike(
+        *coreOf<VFInnerShadow, VFInnerShadowProperty>(angle, distance, size, color, 1.0F), scene,
+        [&](Scene& expected) {
+            literal::paintInnerShadow(expected.dst, expected.mask, expected.text, reduced.mAngle,
+                                      distance, size, color);
+        }))
+        << describe(scene) << ", angle " << angle << ", distance " << distance << ", size " << size;
+}
+
+TEST(Blur, ShadowsMovedByEveryDistance_AreThoseOfTheLiteralForm) {
+    // Every place that a vector of results can have to the columns that hold ink.
+    Random random(7000);
+    for (const int length : {64, 100, 130, 200}) {
+        for (const bool wide : {true, false}) {
+            const Mask mask = randomMask(random, wide ? length : 8, wide ? 8 : length);
+            const Scene scene = sceneOf(mask);
+            for (int moved = -140; moved <= 140; ++moved) {
+                const float angle = (wide ? 0.0F : 90.0F) + (moved < 0 ? 0.0F : 180.0F);
+                expectShadowsLikeTheLiteralForm(scene, angle, std::abs(static_cast<float>(moved)),
+                                                static_cast<float>((moved + 140) % 5), kRed);
+                if (HasFailure()) return;
+            }
+        }
+    }
+}
+
+TEST(Blur, OfASolidSquare_ReachesTheLargestSumsInBothPasses) {
+    const Mask solid = filledMask(230, 230, 255);
+    const Scene scene = sceneOf(solid);
+    for (const float size : {35.0F, 64.0F, 100.0F})
+        expectShadowsLikeTheLiteralForm(scene, 0.0F, 0.0F, size, kRed);
+}
+
 TEST(Blur, ShadowsThatTheDestinationCuts_AreThoseOfTheLiteralForm) {
     forSeeds(5000, 250, [&](Random& random) {
         Scene scene = extremeScene(random, random.between(1, 90), random.between(1, 40));
@@ -257,19 +302,7 @@ TEST(Blur, ShadowsThatTheDestinationCuts_AreThoseOfTheLiteralForm) {
         const float distance = random.real(0, 60);
         const float size = random.real(0, 30);
         const uint32_t color = randomPremultiplied(random);
-        EXPECT_TRUE(
-            paintsLike(*coreOf<VFOuterShadow, VFOuterShadowProperty>(angle, distance, size, color, 1.0F),
-                       scene, [&](Scene& expected) {
-                           literal::paintOuterShadow(expected.dst, expected.mask, expected.text, angle,
-                                                     distance, size, color);
-                       }));
-        const VFInnerShadowProperty reduced(angle, distance, size, color, 1.0F);
-        EXPECT_TRUE(
-            paintsLike(*coreOf<VFInnerShadow, VFInnerShadowProperty>(angle, distance, size, color, 1.0F),
-                       scene, [&](Scene& expected) {
-                           literal::paintInnerShadow(expected.dst, expected.mask, expected.text,
-                                                     reduced.mAngle, distance, size, color);
-                       }));
+        expectShadowsLikeTheLiteralForm(scene, angle, distance, size, color);
     });
 }
 

@@ -179,6 +179,19 @@ TEST(OuterGlow, EveryWholeSize_MatchesTheLiteralForm) {
     kGlow.expectLiteralFormOfEveryWholeSize();
 }
 
+TEST(OuterGlow, EveryAlphaOfOneColour_MatchesTheLiteralForm) {
+    // Grown by one pass and not blurred, noise that grows stronger from row to row has all values.
+    Random random(300);
+    literal::Mask mask = noiseMask(random, 60, 40, 0);
+    for (int i = 0; i < 60 * 40; ++i) {
+        uint8_t& coverage = mask.bytes[static_cast<size_t>(i)];
+        coverage = static_cast<uint8_t>(coverage * (i / 60) / 40);
+    }
+    const Scene scene = sceneOf(mask);
+    for (uint32_t alpha = 0; alpha < 256; ++alpha)
+        ASSERT_TRUE(kGlow.matchesLiteral(scene, 0.5F, alpha << 24 | 0x30FF81)) << alpha;
+}
+
 TEST(OuterGlow, EveryMaskOfTheGallery_MatchesTheLiteralForm) {
     kGlow.expectLiteralFormOfTheGallery();
 }

@@ -538,7 +538,8 @@ literal::Mask faint(literal::Mask mask, int most) {
 }
 
 TEST(StrokeWays, EveryRadius_MatchesTheLiteralForm) {
-    // Fractions change the rim; a reach of 2, 8 and 23 is the last of its way.
+    // Fractions change the rim; a reach of 2 and, by the level, one of 8 to 16 is the last of its way,
+    // and from 24 on tiles have longer windows.
     for (int eighth = 0; eighth <= 26 * 8; ++eighth) {
         SCOPED_TRACE("radius in eighths " + std::to_string(eighth));
         Random random(static_cast<uint64_t>(eighth) + 1);
@@ -555,6 +556,39 @@ TEST(StrokeWays, MasksOfAllWidths_MatchTheLiteralForm) {
         Random random(static_cast<uint64_t>(width) + 100);
         expectLiteralForm(randomMask(random, width, random.between(1, 6)), random.real(0.0F, 14.0F));
         if (HasFatalFailure()) return;
+    }
+}
+
+/// Short strokes of ink far apart, some of them across the edges of 1024 pixels.
+literal::Mask sparseMask(Random& random, int width, int height) {
+    literal::Mask mask = filledMask(width, height, 0);
+    for (int x = random.between(0, 90); x < width; x += random.between(60, 400)) {
+        const int length = random.chance(50) ? 1 : random.between(2, 90);
+        for (int i = x; i < std::min(x + length, width); ++i) {
+            mask.bytes[static_cast<size_t>(random.between(0, height - 1) * width + i)] =
+                random.chance(60) ? 255 : random.byte();
+        }
+    }
+    return mask;
+}
+
+TEST(StrokeWays, RowsOfSeveralBlocks_MatchTheLiteralForm) {
+    // Flags and tiles are looked through by vectors, of 64 bytes and of 32 numbers at most: these rows
+    // have several of each.
+    forSeeds(8500, 3, [](Random& random) {
+        for (const float size : {3.0F, 5.25F, 8.0F})
+            expectLiteralForm(sparseMask(random, 4400, 2), size);
+        for (const float size : {9.0F, 23.0F, 30.0F})
+            expectLiteralForm(sparseMask(random, 2300, 2), size);
+    });
+}
+
+TEST(StrokeWays, SolidMasks_MatchTheLiteralForm) {
+    // Full vectors below full ones; fractions that end the disc with a row of its rim alone.
+    for (const int height : {2, 9, 40}) {
+        const literal::Mask solid = filledMask(200, height, 255);
+        for (const float size : {3.0F, 3.6F, 8.5F, 10.4F, 15.6F})
+            expectLiteralForm(solid, size);
     }
 }
 
@@ -669,7 +703,7 @@ TEST(StrokeWays, SecondDestinationLargerThanTheFirst_GetsAllOfTheOutline) {
 
 TEST(StrokeWays, NoByteOutsideTheBitmaps_IsTouched) {
     forSeeds(12000, 300, [](Random& random) {
-        const int width = random.between(1, 90);
+        const int width = random.chance(5) ? random.between(1000, 4400) : random.between(1, 90);
         const int height = random.between(1, 12);
         const Edge edge = random.chance(50) ? Edge::kStart : Edge::kEnd;
         GuardedBitmap mask(width, height, 1, edge);

@@ -484,9 +484,9 @@ public final class VorelEffect implements AutoCloseable {
     // --- One run --------------------------------------------------------------------------------
 
     /**
-     * Opens a run. Its pixels are written when {@link #finish} is called, over and under what the
-     * destination holds: a destination of zeros gives the text alone. A run that is still open is
-     * dropped; nothing of it is painted.
+     * Opens a run. Its pixels are written when {@link #finish} is called. Give it a destination of zeros:
+     * a text fill erases whatever lies around the glyphs. A run that is still open is dropped; nothing of
+     * it is painted.
      *
      * @param width pixels per row of the destination, at least 1
      * @param height rows of the destination, at least 1

@@ -9,8 +9,8 @@ namespace VFontEffect::internal {
 
 /// Coverage that grows, in two planes of the same shape that take turns: `height` rows of `width` bytes
 /// and a frame of one byte around them, which stays as it is. Rows are read and written in whole
-/// vectors, up to kGrowthMargin bytes too far on both sides; behind a row, where the frame is `behind`,
-/// they are written as that.
+/// vectors: from the frame's byte before a row to kGrowthMargin bytes behind it, where the frame is
+/// `behind` and they are written as that.
 struct GrowthJob {
     uint8_t* planes[2];  // of row 0, column 0
     int64_t stride;
@@ -37,11 +37,17 @@ struct GlowJob {
     const uint32_t* pixels;
 };
 
+/// Weaker values than this fade.
+constexpr uint32_t kFadedValues = 180;
+
 struct GlowKernels {
     /// Copies `count` bytes, each ^ flip.
     void (*copyFlipped)(const uint8_t* from, int64_t count, uint8_t flip, uint8_t* to);
     /// Grows plane 0 by turns; the result is in plane `passes` % 2.
     void (*grow)(const GrowthJob& job);
+    /// Makes blurred values the alphas of a glow of that alpha: (alpha * factor) >> 8, where the factor
+    /// is 256 * value / kFadedValues, rounded down, and 256 at most.
+    void (*fade)(uint8_t* values, int64_t count, uint32_t alpha);
     /// The values' colours beneath the destination. That of 0 must be transparent.
     void (*paint)(const GlowJob& job);
 };
