@@ -1,7 +1,7 @@
 #!/usr/bin/env python3
 """Counts what the inner loops cost on 64-bit ARM, where nothing is timed: instructions in the code of g++
 and clang, and llvm-mca's cycles on a Cortex-A76. Blends and growth are counted per pixel (and pass), the
-blur per result and 16 taps.
+blur per result and 16 taps, or by running sums per result and term.
 
     bench/arm64_loops.py        prints a table in Markdown
 """
@@ -56,6 +56,8 @@ LOOPS = (
     # A dot product adds 4 taps to 4 results.
     Loop("blur, down", "cores/blur_kernels.cpp", DOT_PRODUCTS, ("down",), "udot", 64, "", 64),
     Loop("blur, across", "cores/blur_kernels.cpp", DOT_PRODUCTS, ("across",), "udot", 64, "", 64),
+    # Four rows of results at a time, 16 of each.
+    Loop("running sums, a term", "cores/running_kernels.cpp", NEON, ("next",), "add\tv", 8, "", 64),
     # Two rows at a time, a pair sum in each.
     Loop("growth", "cores/glow_kernels.cpp", NEON, ("grow",), "uaddlp", 2, "st", 32),
 )

@@ -65,6 +65,11 @@ VOREL_INLINE V load(const void* from) {
     std::memcpy(&vector, from, sizeof vector);
     return vector;
 }
+/// At a multiple of its size, where an instruction can take it from memory.
+template <class V>
+VOREL_INLINE V loadAligned(const void* from) {
+    return load<V>(__builtin_assume_aligned(from, sizeof(V)));
+}
 template <class V>
 VOREL_INLINE void store(void* to, V vector) {
     std::memcpy(to, &vector, sizeof vector);

@@ -1,215 +1,44 @@
 #pragma once
 
-#include <algorithm>
-#include <cstdint>
+#include "cores/dot_blur.h"
+#include "cores/running_blur.h"
 
-#include "blend/clip.h"
-#include "core/line_buffer.h"
-#include "core/pixel_buffer.h"
-#include "cores/blur_kernels.h"
-#include "cores/paint_input.h"
-
-/// The separable integer Gaussian blur of shadows and glows.
-///
-/// A tap at distance k weighs weights[|k|]. The weight falls as exp(-k^2 / d), where d = R^2 / ln 100
-/// makes the weight at the radius one hundredth of the centre's. Each pass divides its sum by the
-/// total of all weights, truncating, so the order of the passes shows in single units and is fixed.
+/// The blur by the method that takes less.
 namespace VFontEffect::internal {
 
-constexpr int kShadowScale = 100;
-constexpr int kGlowScale = 128;
-
-struct BlurKernel {
-    PixelBuffer<uint32_t> weights;
-    int radius;
-    uint32_t total;
-
-    explicit operator bool() const { return static_cast<bool>(weights); }
-};
-
-/// Weights on a scale of 100, rounded in single precision.
-BlurKernel shadowKernel(int radius);
-
-/// Weights on a scale of 128, rounded in double precision.
-BlurKernel glowKernel(int radius);
-
-/// The smallest float that is not below 1 / total. With it the product in single precision of any sum up
-/// to 256 * total - 1, truncated, is the whole quotient, while total is at most 26,000: a sum of
-/// n * total gives n or more, and one less gives n - 1 / total plus at most 2^-15, which is more than
-/// half a step of single precision below n.
-float inverseAbove(uint32_t total);
-
-/// For sums up to 256 * divisor - 1, a divisor of 128 to 255.
-NarrowDivision narrowDivision(uint32_t divisor);
-
-/// A part of a picture, in the coordinates of what is blurred.
-using Window = Clip;
-
-/// Columns before the one and from the other on count as 255 between the passes.
-struct FullColumns {
-    int64_t before;
-    int64_t from;
-};
-constexpr FullColumns kNoFullColumns = {INT64_MIN, INT64_MAX};
-
-/// A kernel in the form of the chosen level's loops.
-class BlurWeights {
-  public:
-    explicit BlurWeights(const BlurKernel& kernel);
-
-    explicit operator bool() const { return static_cast<bool>(mMemory); }
-    const PreparedBlur& operator*() const { return mBlur; }
-    const PreparedBlur* operator->() const { return &mBlur; }
-
-    /// Bytes of a pixel in a row between the passes.
-    int64_t pixelBytes() const { return mBlur.isNarrow ? kNarrowPixelBytes : 1; }
-
-  private:
-    PixelBuffer<uint8_t> mMemory;
-    PreparedBlur mBlur;
-};
-
-/// The coverage of a box.
-inline BlurSource sourceOf(const CoverageBox& box) {
-    return {box.row(0), box.mask.width, box.width, box.height, 0};
+inline bool suitsRunningSums(const BlurKernel& kernel) {
+    return kernel.radius > blurKernels().largestDotRadius;
 }
 
-/// The part of a source that the results in a window depend on, and its place in the source.
-struct ReachedSource {
-    BlurSource part;
-    int64_t left;
-    int64_t top;
+/// Runs a blur, if there is memory for it.
+template <class Blur, class Run>
+bool runIfThere(Blur blur, Run run) {
+    if (!blur) return false;
+    run(blur);
+    return true;
+}
 
-    static ReachedSource of(const BlurSource& source, int64_t radius, const Window& window);
-};
+/// Blurs the columns of the source first and then its rows, each pass rounding down, and calls paint(y,
+/// rows, values, stride) for some rows of the window at a time. What lies around the source is 0, but
+/// for the full columns. `inverted` gives 255 minus the mean of the second pass, rounded down as a
+/// whole. Returns false, with nothing painted, when memory ran out.
+template <class Paint>
+bool blurDownThenAcross(const BlurKernel& kernel, const BlurSource& source, const Window& window,
+                        const FullColumns& full, bool inverted, Paint paint) {
+    const auto run = [&](auto& blur) { blur.run(inverted, paint); };
+    if (suitsRunningSums(kernel))
+        return runIfThere(RunningDownThenAcross(kernel, source, window, full), run);
+    return runIfThere(DownThenAcross(kernel, source, window, full), run);
+}
 
-/// Groups of four rows.
-struct GroupRange {
-    int64_t first;
-    int64_t end;
-
-    /// The groups that 4 * quads rows of results need of `height` rows. Group 0 begins with row
-    /// `firstRow`.
-    static GroupRange needed(const BlurWeights& weights, int64_t height, int64_t firstRow,
-                             int64_t quads);
-};
-
-/// The rows in reach of the pass down, which come in groups of four while the results go by.
-class TapGroups {
-  public:
-    /// For the groups of GroupRange::needed, of rows of `width` bytes.
-    TapGroups(const BlurWeights& weights, int64_t width, int64_t height, int64_t firstRow,
-              int64_t quads);
-
-    explicit operator bool() const { return mMemory && mInked; }
-    const TapColumns& columns() const { return mColumns; }
-
-    /// Calls feed(group) for each group that is still missing for a quad of results.
-    template <class Feed>
-    void complete(int64_t quad, Feed feed) {
-        const int64_t end = std::min(quad + mSteps, mMissing.end);
-        for (; mMissing.first < end; ++mMissing.first) {
-            if (mMissing.first == mColumns.firstGroup + mCapacity) forgetBefore(quad);
-            feed(mMissing.first);
-        }
-    }
-
-  private:
-    void forgetBefore(int64_t group);
-
-    /// More than any quad needs, so that groups rarely move.
-    static constexpr int64_t kSpareGroups = 16;
-
-    int64_t mSteps;
-    GroupRange mMissing;
-    int64_t mCapacity;
-    int64_t mStrips;
-    int64_t mGroupBytes;
-    LineBuffer mMemory;
-    PixelBuffer<int32_t> mInked;
-    TapColumns mColumns = {};
-};
-
-/// Four rows between the passes.
-class MiddleBuffer {
-  public:
-    MiddleBuffer(const BlurWeights& weights, int64_t inkColumn, int64_t columns,
-                 const FullColumns& full);
-
-    explicit operator bool() const { return mPixels && mInked; }
-    const MiddleRows& rows() const { return mRows; }
-
-  private:
-    int64_t mStrideBytes;
-    LineBuffer mPixels;
-    PixelBuffer<uint8_t> mInked;
-    MiddleRows mRows = {};
-};
-
-/// Blurs the columns first and then the rows, each pass rounding down, four rows at a time. What lies
-/// around the source is 0, but for the full columns.
-class DownThenAcross {
-  public:
-    DownThenAcross(const BlurKernel& kernel, const BlurSource& source, const Window& window,
-                   const FullColumns& full);
-
-    /// Whether there is memory for it.
-    explicit operator bool() const { return mWeights && mTaps && mMiddle && mOut; }
-
-    /// Calls paint(y, rows, values, stride) for up to kQuad rows of the window at a time. `inverted`
-    /// gives 255 minus the mean of the second pass, rounded down as a whole.
-    template <class Paint>
-    void run(bool inverted, Paint paint) {
-        for (int64_t y = 0; y < mWindow.height(); y += kQuad) {
-            blurQuad(y / kQuad, inverted);
-            paint(mWindow.top + y, std::min(kQuad, mWindow.height() - y), mOut.data(), mOutStride);
-        }
-    }
-
-  private:
-    MiddleBuffer middleFor(const FullColumns& full);
-    void blurQuad(int64_t quad, bool inverted);
-
-    Window mWindow;
-    BlurWeights mWeights;
-    ReachedSource mSource;
-    int64_t mFirstRow;  // of the source, the first of group 0
-    TapGroups mTaps;
-    int64_t mMiddleLeft;  // column of the source, column 0 between the passes
-    MiddleBuffer mMiddle;
-    int64_t mOutStride;
-    LineBuffer mOut;
-};
-
-/// Blurs the rows of the source's inverse first and then the columns, each pass rounding down, four rows
-/// at a time. What lies around the source is 255 in its inverse.
-class AcrossThenDown {
-  public:
-    AcrossThenDown(const BlurKernel& kernel, const BlurSource& source, const Window& window);
-
-    explicit operator bool() const { return mWeights && mMiddle && mAcross && mTaps && mOut; }
-
-    /// Calls paint(y, rows, values, stride) for up to kQuad rows of the window at a time.
-    template <class Paint>
-    void run(Paint paint) {
-        for (int64_t y = 0; y < mWindow.height(); y += kQuad) {
-            blurQuad(y / kQuad);
-            paint(mWindow.top + y, std::min(kQuad, mWindow.height() - y), mOut.data(), mStride);
-        }
-    }
-
-  private:
-    void blurQuad(int64_t quad);
-
-    Window mWindow;
-    BlurWeights mWeights;
-    ReachedSource mSource;
-    int64_t mFirstRow;  // of the source, the first of group 0
-    MiddleBuffer mMiddle;
-    int64_t mStride;
-    LineBuffer mAcross;
-    TapGroups mTaps;
-    LineBuffer mOut;
-};
+/// Blurs the rows of the source's inverse first and then its columns, each pass rounding down, and
+/// paints as above. What lies around the source is 255 in its inverse.
+template <class Paint>
+bool blurAcrossThenDown(const BlurKernel& kernel, const BlurSource& source, const Window& window,
+                        Paint paint) {
+    const auto run = [&](auto& blur) { blur.run(paint); };
+    if (suitsRunningSums(kernel)) return runIfThere(RunningAcrossThenDown(kernel, source, window), run);
+    return runIfThere(AcrossThenDown(kernel, source, window), run);
+}
 
 }  // namespace VFontEffect::internal

@@ -1,10 +1,11 @@
+#include "cores/blur_kernel.h"
+
 #include <algorithm>
 #include <cmath>
 #include <cstdint>
 
 #include "core/numeric.h"
 #include "core/portable_math.h"
-#include "cores/blur.h"
 
 namespace VFontEffect::internal {
 namespace {

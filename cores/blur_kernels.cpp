@@ -5,10 +5,12 @@
 
 #include "blend/lanes.h"
 #include "blend/unrolled.h"
+#include "cores/quotients.h"
+#include "cores/source_strip.h"
 
-/// The two passes of the blur.
+/// The two passes of the blur by dot products.
 ///
-/// Dot products: four neighbouring taps stand in the four bytes of a word, so that one instruction adds
+/// Four neighbouring taps stand in the four bytes of a word, so that one instruction adds
 /// four taps times their weights to each word of a vector. Down the columns the rows are interleaved by
 /// fours for that; across a row the bytes stand so already. The same four taps then serve four results,
 /// whose distances to them differ by one: the string of weights is read at four places one byte apart.
@@ -19,9 +21,8 @@
 /// widened to halves there, those at +k and -k are added before the product, and the division is one by
 /// multiplication in 16 bits.
 ///
-/// Exactness: sums are whole numbers and wrap nowhere: 255 times the total stays below 2^23. As floats
-/// they are exact; with an inverse just above 1 / total the rounded product reaches n exactly when the
-/// sum reaches n * total, as long as the total is at most 26,000 (blur.h).
+/// Exactness: sums are whole numbers and wrap nowhere: 255 times the total stays below 2^23. Their
+/// quotients are whole (quotients.h).
 ///
 /// Cost: (2R + 1) / (taps in a vector) instructions a pixel and pass, over the rows and columns only
 /// that hold ink; what lies beyond them is neither read nor stored.
@@ -43,6 +44,17 @@ constexpr int kGridVectors = 2;
 constexpr int kStepsAtOnce = 1;
 #endif
 
+// Where both take as long; running sums cost about the same whatever the radius.
+#if defined(VOREL_AVX512)
+constexpr int kLargestDotRadius = 72;
+#elif defined(__ARM_FEATURE_DOTPROD)
+constexpr int kLargestDotRadius = 90;
+#elif defined(VOREL_AVX2)
+constexpr int kLargestDotRadius = 20;
+#else
+constexpr int kLargestDotRadius = 12;
+#endif
+
 // --- Steps: which groups of four taps a stretch of results needs --------------------------------------
 
 struct Range {
@@ -59,26 +71,6 @@ VOREL_INLINE int64_t wholeVectors(int64_t columns) {
 
 // --- Loading --------------------------------------------------------------------------------------
 
-/// A strip of the source: `count` columns from `x` on, as many as a vector holds at most.
-struct SourceStrip {
-    const uint8_t* start;
-    int64_t stride;
-    int64_t height;
-    int64_t count;
-    Bytes flip;
-
-    static SourceStrip of(const BlurSource& source, int64_t x) {
-        const int64_t left = source.width - x;
-        const int64_t count = left < kBytes ? left : int64_t{kBytes};
-        return {source.start + x, source.stride, source.height, count,
-                spread<Bytes>(source.flip) & firstBytes(count)};
-    }
-
-    bool has(int64_t y) const { return y >= 0 && y < height; }
-    VOREL_INLINE Bytes whole(int64_t y) const { return load<Bytes>(start + y * stride) ^ flip; }
-    VOREL_INLINE Bytes part(int64_t y) const { return loadFirst(start + y * stride, count) ^ flip; }
-};
-
 /// Four rows of a strip.
 struct Group {
     Bytes rows[kQuad];
@@ -88,35 +80,20 @@ struct Group {
         Group group;
         unrolled<kQuad>([&](auto i) VOREL_INLINE_LAMBDA {
             const int64_t row = y + i.value;
-            group.rows[i.value] = strip.count == kBytes ? strip.whole(row) : strip.part(row);
+            group.rows[i.value] = strip.row(row);
         });
         return group;
     }
     static __attribute__((noinline)) Group atEdge(const SourceStrip& strip, int64_t y) {
         Group group;
         for (int64_t i = 0; i < kQuad; ++i)
-            group.rows[i] = strip.has(y + i) ? strip.part(y + i) : Bytes{};
+            group.rows[i] = strip.has(y + i) ? strip.row(y + i) : Bytes{};
         return group;
     }
     VOREL_INLINE bool isInked() const { return !allZero(rows[0] | rows[1] | rows[2] | rows[3]); }
 };
 
 // --- The two methods: how groups are stored, summed and divided ---------------------------------------
-
-#if defined(VOREL_AVX512)
-/// The bits of 2^23 as a float: with them before it a sum is the float 2^23 + sum, unconverted. The
-/// fused product takes 2^23 * inverse away again, exactly, and so rounds sum * inverse once, as any
-/// other does.
-constexpr uint32_t kSumStart = 0x4B000000;
-VOREL_INLINE Floats timesInverse(Words sum, Floats inverse) {
-    return multipliedSum(as<Floats>(sum), inverse, inverse * -8388608.0F);
-}
-#else
-constexpr uint32_t kSumStart = 0;
-VOREL_INLINE Floats timesInverse(Words sum, Floats inverse) {
-    return __builtin_convertvector(as<Integers>(sum), Floats) * inverse;
-}
-#endif
 
 /// Sums of 32 bits by dot products.
 struct DotMethod {
@@ -202,10 +179,6 @@ struct DotMethod {
         return grid;
     }
 
-    VOREL_INLINE Words quotient(Words sum) const {
-        return as<Words>(__builtin_convertvector(timesInverse(sum, inverse), Integers));
-    }
-
     /// Four rows of results; `group(step)` is where the taps of a step are.
     template <class GroupAt, class Store>
     VOREL_INLINE void quadDown(const Range& steps, GroupAt groupAt, Store store) const {
@@ -217,8 +190,9 @@ struct DotMethod {
             unrolled<kGridVectors / 2>([&](auto pair) VOREL_INLINE_LAMBDA {
                 constexpr int kPair = pair.value * 2;
                 unrolled<kQuad>([&](auto j) VOREL_INLINE_LAMBDA {
-                    halves[(kVector + kPair) / 2][j.value] = packed(
-                        quotient(grid.sums[kPair][j.value]), quotient(grid.sums[kPair + 1][j.value]));
+                    halves[(kVector + kPair) / 2][j.value] =
+                        packed(quotient(grid.sums[kPair][j.value], inverse),
+                               quotient(grid.sums[kPair + 1][j.value], inverse));
                 });
             });
         });
@@ -237,8 +211,9 @@ struct DotMethod {
             const Grid grid = sums({from, stride, 4}, steps);
             unrolled<kGridVectors>([&](auto v) VOREL_INLINE_LAMBDA {
                 const Words* const four = grid.sums[v.value];
-                store(kRow + v.value, as<Bytes>(quotient(four[0]) | quotient(four[1]) << 8 |
-                                                quotient(four[2]) << 16 | quotient(four[3]) << 24));
+                store(kRow + v.value,
+                      as<Bytes>(quotient(four[0], inverse) | quotient(four[1], inverse) << 8 |
+                                quotient(four[2], inverse) << 16 | quotient(four[3], inverse) << 24));
             });
         });
     }
@@ -502,6 +477,7 @@ void chosen(const PreparedBlur& blur, Arguments... arguments) {
 
 extern const BlurKernels kBlurKernels = {
     kBytes,
+    kLargestDotRadius,
     !kHasDotProducts,
     sizeof(WeightCell),
     fillCells,

@@ -103,6 +103,8 @@ constexpr int64_t kCellsBehind = 20;
 
 struct BlurKernels {
     int64_t vectorBytes;
+    /// Up to this radius dot products take fewer instructions than running sums.
+    int largestDotRadius;
     /// Whether the level sums in 16 bits where that suffices.
     bool hasNarrow;
     /// Bytes of a weight's cell.

@@ -112,14 +112,12 @@ bool paintBlurred(const CoverageBox& box, const Shape& shape, const PlacedTarget
     const int64_t open = std::max(1, shape.radius);
     const FullColumns full =
         inverted ? FullColumns{shape.image.left + open, shape.image.right - open} : kNoFullColumns;
-    DownThenAcross blur(glowKernel(shape.radius), growth.source(flip), moved(window, margin, margin),
-                        full);
-    if (!blur) return false;
-    blur.run(inverted, [&](int64_t y, int64_t rows, uint8_t* values, int64_t stride) {
-        const Window part = {window.left, y - margin, window.right, y - margin + rows};
-        colours.paint(target.jobOn(part, values, stride), values);
-    });
-    return true;
+    return blurDownThenAcross(
+        glowKernel(shape.radius), growth.source(flip), moved(window, margin, margin), full, inverted,
+        [&](int64_t y, int64_t rows, uint8_t* values, int64_t stride) {
+            const Window part = {window.left, y - margin, window.right, y - margin + rows};
+            colours.paint(target.jobOn(part, values, stride), values);
+        });
 }
 
 /// Paints the border of an inner glow.

@@ -66,12 +66,12 @@ void VFInnerShadow::doPostProcessing(ParamPostProcessing* params) {
     }
 
     const Window unmoved = moved(window, -int64_t{offset.x}, -int64_t{offset.y});
-    AcrossThenDown blur(shadowKernel(radius), sourceOf(box), unmoved);
-    if (!blur) return;
-    blur.run([&](int64_t y, int64_t rows, const uint8_t* values, int64_t stride) {
-        const int64_t top = y + offset.y;
-        target.paintBeneath({window.left, top, window.right, top + rows}, values, stride, color);
-    });
+    blurAcrossThenDown(
+        shadowKernel(radius), sourceOf(box), unmoved,
+        [&](int64_t y, int64_t rows, const uint8_t* values, int64_t stride) {
+            const int64_t top = y + offset.y;
+            target.paintBeneath({window.left, top, window.right, top + rows}, values, stride, color);
+        });
 }
 
 }  // namespace VFontEffect

@@ -71,11 +71,11 @@ void VFOuterShadow::doPostProcessing(ParamPostProcessing* params) {
         return target.paintBeneath(window, box.row(window.top) + window.left, box.mask.width, color);
     }
 
-    DownThenAcross blur(shadowKernel(radius), sourceOf(box), window, kNoFullColumns);
-    if (!blur) return;
-    blur.run(false, [&](int64_t y, int64_t rows, const uint8_t* values, int64_t stride) {
-        target.paintBeneath({window.left, y, window.right, y + rows}, values, stride, color);
-    });
+    blurDownThenAcross(
+        shadowKernel(radius), sourceOf(box), window, kNoFullColumns, false,
+        [&](int64_t y, int64_t rows, const uint8_t* values, int64_t stride) {
+            target.paintBeneath({window.left, y, window.right, y + rows}, values, stride, color);
+        });
 }
 
 }  // namespace VFontEffect

@@ -10,6 +10,7 @@
 #include <ostream>
 #include <set>
 #include <string>
+#include <tuple>
 #include <vector>
 
 #include "allocation_watch.h"
@@ -202,15 +203,16 @@ std::vector<CoreCase> coreCases() {
         using Radial = VFRadialGradientProperty;
         cases.push_back(coreCase<VFText>("Text" + suffix, VFTextProperty(0x80808080, 0.5F),
                                          VFTextProperty(0xFF204060, 1), layered, 0, 1));
-        // Sums of the wide ones take 32 bits.
-        for (const float size : {3.0F, 20.0F}) {
-            const std::string kind = size > 3 ? "Wide" : "";
-            cases.push_back(coreCase<VFOuterShadow>(kind + "OuterShadow" + suffix,
+        // Sums of the wide ones take 32 bits, those of the widest run on.
+        for (const auto& [kind, size, outer, inner] :
+             {std::tuple("", 3.0F, 7, 8), std::tuple("Wide", 10.0F, 7, 8),
+              std::tuple("Widest", 80.0F, 5, 6)}) {
+            cases.push_back(coreCase<VFOuterShadow>(kind + ("OuterShadow" + suffix),
                                                     Outer(120, 4, size, 0x80202020, 0.5F),
-                                                    Outer(30, 2, 0, 0xFFFFFFFF, 1), layered, 7, 1));
-            cases.push_back(coreCase<VFInnerShadow>(kind + "InnerShadow" + suffix,
+                                                    Outer(30, 2, 0, 0xFFFFFFFF, 1), layered, outer, 1));
+            cases.push_back(coreCase<VFInnerShadow>(kind + ("InnerShadow" + suffix),
                                                     Inner(120, 4, size, 0x80202020, 0.5F),
-                                                    Inner(30, 2, 0, 0xFFFFFFFF, 1), layered, 8, 1));
+                                                    Inner(30, 2, 0, 0xFFFFFFFF, 1), layered, inner, 1));
         }
         // Moved clear of itself the glyph is drawn by its own coverage, which takes no memory.
         cases.push_back(coreCase<VFInnerShadow>("InnerShadowWholeGlyph" + suffix,

@@ -1,4 +1,4 @@
-#include "cores/blur.h"
+#include "cores/dot_blur.h"
 
 #include <algorithm>
 #include <cstdint>
@@ -63,21 +63,6 @@ BlurWeights::BlurWeights(const BlurKernel& kernel)
 }
 
 // --- Working memory -------------------------------------------------------------------------------
-
-ReachedSource ReachedSource::of(const BlurSource& source, int64_t radius, const Window& window) {
-    const Window reach = common(grown(window, radius), {0, 0, source.width, source.height});
-    ReachedSource reached = {source, 0, 0};
-    if (reach.empty()) {
-        reached.part.width = reached.part.height = 0;
-        return reached;
-    }
-    reached.part.start += reach.top * source.stride + reach.left;
-    reached.part.width = reach.width();
-    reached.part.height = reach.height();
-    reached.left = reach.left;
-    reached.top = reach.top;
-    return reached;
-}
 
 // A narrow blur reads all the groups around its results. A wide one leaves out groups without ink, and
 // so there is no need to store those that lie wholly above or below the rows.

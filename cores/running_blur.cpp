@@ -1,0 +1,220 @@
+#include "cores/running_blur.h"
+
+#include <algorithm>
+#include <cstdint>
+#include <cstdlib>
+#include <cstring>
+
+#include "core/numeric.h"
+
+namespace VFontEffect::internal {
+namespace {
+
+// Which difference has the fewest terms, and which pairs take most of them together, was counted for
+// all radii from 10 to 100. While the radius is small the curve of the kernel makes the terms, later the
+// rounding of its weights does, which is pairs of opposite neighbours.
+constexpr int kLeastRadiusOfSecondDifferences = 18;
+constexpr int kLeastRadiusOfNoise = 41;
+
+int orderFor(int radius) {
+    return radius < kLeastRadiusOfSecondDifferences ? 3 : 2;
+}
+TapPairs pairsFor(int radius) {
+    return radius < kLeastRadiusOfNoise ? TapPairs{2, false} : TapPairs{1, true};
+}
+
+/// The weights rise and fall once, by 128 at most: a difference adds up to 256 in absolute terms, and
+/// each further one to twice as much at most.
+constexpr int64_t kMostTerms = 1024;
+
+/// Of the taps or pairs of a row.
+int32_t lineBytes() {
+    return static_cast<int32_t>(kRunningPixelBytes * blurKernels().vectorBytes);
+}
+
+int64_t cellsOf(int radius) {
+    return 2 * int64_t{radius} + 1 + orderFor(radius);
+}
+
+/// The difference as it applies to the taps from distance -radius - order on: what a running sum changes
+/// by, changes by.
+void fillDifference(const BlurKernel& kernel, int order, int32_t* cells) {
+    const int64_t count = cellsOf(kernel.radius);
+    for (int64_t i = 0; i < count; ++i) {
+        const int64_t distance = std::abs(i - order - kernel.radius);
+        cells[i] = distance > kernel.radius ? 0 : static_cast<int32_t>(kernel.weights.data()[distance]);
+    }
+    // A result takes the tap at distance k with the weight there, the one before with that at k + 1.
+    for (int n = 0; n < order; ++n) {
+        for (int64_t i = 0; i + 1 < count; ++i)
+            cells[i] -= cells[i + 1];
+    }
+}
+
+/// Takes the cells apart into single taps and pairs, the lowest first: `added` upwards from there on,
+/// `takenAway` downwards. Returns their numbers.
+struct TermCounts {
+    int64_t added;
+    int64_t takenAway;
+};
+TermCounts splitTerms(int radius, int order, const TapPairs& pairs, int32_t* cells, int32_t* added,
+                      int32_t* takenAwayEnd) {
+    TermCounts counts = {0, 0};
+    const int64_t count = cellsOf(radius);
+    for (int64_t i = 0; i < count; ++i) {
+        const auto line = static_cast<int32_t>((i - order - radius) * kLinesOfRow);
+        while (cells[i] != 0) {
+            const int32_t sign = cells[i] > 0 ? 1 : -1;
+            const int32_t other = pairs.areDifferences ? -sign : sign;
+            const int64_t partner = i + pairs.distance;
+            const bool isPair = partner < count && cells[partner] * other > 0;
+            cells[i] -= sign;
+            if (isPair) cells[partner] -= other;
+            const int32_t term = (line + static_cast<int32_t>(isPair)) * lineBytes();
+            if (sign > 0) {
+                added[counts.added++] = term;
+            } else {
+                *(takenAwayEnd - ++counts.takenAway) = term;
+            }
+        }
+    }
+    return counts;
+}
+
+}  // namespace
+
+// --- Terms ------------------------------------------------------------------------------------------
+
+KernelTerms::KernelTerms(const BlurKernel& kernel)
+    : mMemory(PixelBuffer<int32_t>::uninitialised(kernel ? kMostTerms + cellsOf(kernel.radius) : -1)),
+      mTerms{orderFor(kernel.radius), pairsFor(kernel.radius), {}, {}} {
+    if (!mMemory) return;
+    int32_t* const cells = mMemory.data() + kMostTerms;
+    fillDifference(kernel, mTerms.order, cells);
+    const TermCounts counts =
+        splitTerms(kernel.radius, mTerms.order, mTerms.pairs, cells, mMemory.data(), cells);
+    std::reverse(cells - counts.takenAway, cells);
+    mTerms.added = {mMemory.data(), counts.added};
+    mTerms.takenAway = {cells - counts.takenAway, counts.takenAway};
+}
+
+// --- Passes -----------------------------------------------------------------------------------------
+
+RunningPasses::RunningPasses(const BlurKernel& kernel, const BlurSource& source, const Window& window)
+    : mWindow(window),
+      mSource(ReachedSource::of(source, kernel.radius, window)),
+      mSide(blurKernels().vectorBytes),
+      mRadius(kernel.radius),
+      mTotal(kernel.total),
+      mTerms(kernel) {}
+
+LineBuffer RunningPasses::linesFor(int64_t rows) const {
+    return LineBuffer(kLinesOfRow * kRunningPixelBytes * mSide, rows + kRunningRowsAround);
+}
+
+void RunningPasses::blurStrip(const BlurEnding& ending, const BlurSource& source, int64_t x,
+                              LineBuffer& lines, int64_t first, int64_t count,
+                              const SquareRows& out) const {
+    const RunningSum sum = {*mTerms, mRadius, mTotal, inverseAbove(mTotal), ending};
+    runningKernels().blurStrip(sum, source, x, lines.data(), first, count, out);
+}
+
+// --- Down, then across ------------------------------------------------------------------------------
+
+RunningDownThenAcross::MiddleColumns RunningDownThenAcross::MiddleColumns::of(
+    const RunningPasses& passes, const FullColumns& full) {
+    const ReachedSource& source = passes.source();
+    const Window reach = grown(passes.window(), passes.radius());
+    const int64_t inked = passes.inSquares(source.part.width);
+    if (full.before <= reach.left && full.from >= reach.right)
+        return {source.left, source.part.width, inked};
+    const int64_t before = std::max<int64_t>(0, source.left - reach.left);
+    const int64_t left = source.left - before;
+    return {left, reach.right - left, std::max(reach.right - left, before + inked)};
+}
+
+RunningDownThenAcross::RunningDownThenAcross(const BlurKernel& kernel, const BlurSource& source,
+                                             const Window& window, const FullColumns& full)
+    : mPasses(kernel, source, window),
+      mFull(full),
+      mColumns(MiddleColumns::of(mPasses, full)),
+      mLines(mPasses.linesFor(std::max(mPasses.source().part.height, mColumns.count))),
+      mMiddle(mColumns.allocated, mPasses.inSquares(window.height())),
+      mOutStride(mPasses.inSquares(window.width())),
+      mOut(mOutStride, mPasses.side()) {}
+
+void RunningDownThenAcross::blurDown() {
+    const int64_t side = mPasses.side();
+    const ReachedSource& source = mPasses.source();
+    const int64_t height = mPasses.window().height();
+    uint8_t* const inked = mMiddle.data() + (source.left - mColumns.left) * side;
+    for (int64_t x = 0; x < source.part.width; x += side) {
+        mPasses.blurStrip({false, 0}, source.part, x, mLines, mPasses.window().top - source.top, height,
+                          {inked + x * side, mColumns.allocated * side, side, true});
+    }
+    for (int64_t y = 0; y < height; y += side)
+        fillAround(bandAt(y));
+}
+
+void RunningDownThenAcross::fillAround(uint8_t* band) {
+    const auto fill = [&](int64_t first, int64_t end, int value) {
+        first = std::max<int64_t>(first, 0);
+        const int64_t count = std::min(end, mColumns.count) - first;
+        if (count <= 0) return;
+        std::memset(band + first * mPasses.side(), value, static_cast<size_t>(count * mPasses.side()));
+    };
+    const int64_t inked = mPasses.source().left - mColumns.left;
+    fill(0, inked, 0);
+    fill(inked + mPasses.source().part.width, mColumns.count, 0);
+    fill(0, mFull.before - mColumns.left, 0xFF);
+    fill(mFull.from - mColumns.left, mColumns.count, 0xFF);
+}
+
+void RunningDownThenAcross::blurAcross(int64_t y, bool inverted) {
+    const int64_t side = mPasses.side();
+    const Window& window = mPasses.window();
+    const BlurEnding ending = {inverted, static_cast<uint8_t>(inverted ? 0xFF : 0)};
+    mPasses.blurStrip(ending, {bandAt(y), side, side, mColumns.count, 0}, 0, mLines,
+                      window.left - mColumns.left, window.width(),
+                      {mOut.data(), side, mOutStride, true});
+}
+
+// --- Across, then down ------------------------------------------------------------------------------
+
+// Both passes work on what is missing from 255 and round up, as those by dot products do (dot_blur.cpp).
+
+RunningAcrossThenDown::RunningAcrossThenDown(const BlurKernel& kernel, const BlurSource& source,
+                                             const Window& window)
+    : mPasses(kernel, source, window),
+      mLines(mPasses.linesFor(std::max(mPasses.source().part.height, mPasses.source().part.width))),
+      mTurned(mPasses.inSquares(mPasses.source().part.width), mPasses.side()),
+      mStripBytes(mPasses.inSquares(mPasses.source().part.height) * mPasses.side()),
+      mMiddle(mStripBytes, mPasses.inSquares(window.width()) / mPasses.side()),
+      mOutStride(mPasses.inSquares(window.width())),
+      mOut(mOutStride, mPasses.inSquares(window.height())) {}
+
+void RunningAcrossThenDown::blurAcross() {
+    const int64_t side = mPasses.side();
+    const ReachedSource& source = mPasses.source();
+    const Window& window = mPasses.window();
+    const BlurSource turned = {mTurned.data(), side, side, source.part.width, 0};
+    for (int64_t y = 0; y < source.part.height; y += side) {
+        runningKernels().turn(source.part, y, mTurned.data());
+        mPasses.blurStrip({true, 0}, turned, 0, mLines, window.left - source.left, window.width(),
+                          {mMiddle.data() + y * side, mStripBytes, side, true});
+    }
+}
+
+void RunningAcrossThenDown::blurDown() {
+    const int64_t side = mPasses.side();
+    const ReachedSource& source = mPasses.source();
+    const Window& window = mPasses.window();
+    for (int64_t x = 0; x < window.width(); x += side) {
+        const BlurSource strip = {mMiddle.data() + x / side * mStripBytes, side, side,
+                                  source.part.height, 0};
+        mPasses.blurStrip({true, 0xFF}, strip, 0, mLines, window.top - source.top, window.height(),
+                          {mOut.data() + x, side * mOutStride, mOutStride, false});
+    }
+}
+
+}  // namespace VFontEffect::internal

@@ -1,0 +1,308 @@
+#include "cores/running_kernels.h"
+
+#include <cstdint>
+#include <cstring>
+
+#include "blend/lanes.h"
+#include "blend/unrolled.h"
+#include "cores/quotients.h"
+#include "cores/source_strip.h"
+
+/// Wide blurs by running sums.
+///
+/// Between neighbouring results a sum changes by the first difference of the kernel over the taps, that
+/// one by the second difference, and so on. The weights are whole numbers that rise to 100 or 128 and
+/// fall again, whatever the radius: their second difference is hardly anything but -1, 0 and 1, and its
+/// absolute values add up to a fraction of the taps; for smaller radii so do those of the third. A
+/// result takes as many additions of 16 bits, and two or three more to add up the differences. Where two
+/// taps at a fixed distance have one sign, or opposite ones, a line of their sums, or differences, made
+/// once for all results, counts for both.
+///
+/// Exactness: all differences are whole numbers. The first one is at most 255 * 128 and fits in 16 bits
+/// with its sign, however the higher ones wrap; sums have 32 bits.
+///
+/// Cost: 25 to 30 additions a pixel and pass up to a radius of 40, 50 at 100. Lanes are columns. The
+/// results are turned in squares, so that lanes are rows then, and the pass across is this one again.
+namespace VFontEffect::internal::VOREL_LEVEL {
+namespace {
+
+constexpr int64_t kLineBytes = kRunningPixelBytes * kBytes;
+constexpr int64_t kRowBytes = kLinesOfRow * kLineBytes;
+
+/// The halves of a line.
+struct Line {
+    Halves left;
+    Halves right;
+
+    static VOREL_INLINE Line at(const uint8_t* line) {
+        return {loadAligned<Halves>(line), loadAligned<Halves>(line + kBytes)};
+    }
+    VOREL_INLINE void storeAt(uint8_t* line) const {
+        store(line, left);
+        store(line + kBytes, right);
+    }
+    VOREL_INLINE void add(const Line& other) {
+        left += other.left;
+        right += other.right;
+    }
+    VOREL_INLINE void subtract(const Line& other) {
+        left -= other.left;
+        right -= other.right;
+    }
+};
+
+// --- Lines ------------------------------------------------------------------------------------------
+
+/// The rows of the strip that hold anything but 0, from `first` to `end` - 1.
+struct Ink {
+    int64_t first;
+    int64_t end;
+
+    static Ink of(const SourceStrip& strip) {
+        Ink ink = {0, strip.height};
+        while (ink.first < ink.end && allZero(strip.row(ink.first)))
+            ++ink.first;
+        while (ink.end > ink.first && allZero(strip.row(ink.end - 1)))
+            --ink.end;
+        return ink;
+    }
+};
+
+void clearRows(uint8_t* from, int64_t rows) {
+    std::memset(from, 0, static_cast<size_t>(rows * kRowBytes));
+}
+
+/// Stores the ink's taps, and the pairs from `distance` rows before them on; around them zeros, as far
+/// as four results at a time reach. `row0` is where row 0 of the source would be.
+void fillLines(const SourceStrip& strip, const Ink& ink, const TapPairs& pairs, uint8_t* row0) {
+    const int64_t before = pairs.distance + kRunningRows - 1;
+    clearRows(row0 + (ink.first - before) * kRowBytes, before);
+    clearRows(row0 + ink.end * kRowBytes, kRunningRows - 1);
+    for (int64_t y = ink.first; y < ink.end; ++y) {
+        const Bytes row = strip.row(y);
+        const Line taps = {as<Halves>(interleavedLow(row, Bytes{})),
+                           as<Halves>(interleavedHigh(row, Bytes{}))};
+        uint8_t* const at = row0 + y * kRowBytes;
+        taps.storeAt(at);
+        uint8_t* const earlier = at - pairs.distance * kRowBytes;
+        Line pair = Line::at(earlier);
+        if (pairs.areDifferences) {
+            pair.subtract(taps);
+        } else {
+            pair.add(taps);
+        }
+        pair.storeAt(earlier + kLineBytes);
+    }
+    for (int64_t y = larger(ink.first, ink.end - pairs.distance); y < ink.end; ++y)
+        Line::at(row0 + y * kRowBytes).storeAt(row0 + y * kRowBytes + kLineBytes);
+}
+
+// --- Sums -------------------------------------------------------------------------------------------
+
+/// The terms of one sign that meet ink: as the results go by, the ones further and further up.
+class TermRange {
+  public:
+    explicit TermRange(const TermList& terms)
+        : mBegin(terms.offsets), mFirst(mBegin + terms.count), mEnd(mFirst) {}
+
+    /// Takes those at `lowest` to `end` - 1, both not above the ones before.
+    VOREL_INLINE void moveTo(int64_t lowest, int64_t end) {
+        while (mEnd > mBegin && mEnd[-1] >= end)
+            --mEnd;
+        while (mFirst > mBegin && mFirst[-1] >= lowest)
+            --mFirst;
+    }
+    VOREL_INLINE const int32_t* begin() const { return mFirst; }
+    VOREL_INLINE const int32_t* end() const { return mEnd; }
+
+  private:
+    const int32_t* mBegin;
+    const int32_t* mFirst;
+    const int32_t* mEnd;
+};
+
+/// Four rows of differences.
+struct FourLines {
+    Line lines[kRunningRows];
+
+    template <class Change>
+    VOREL_INLINE void apply(const TermRange& terms, const uint8_t* row, Change change) {
+        for (const int32_t* term = terms.begin(); term < terms.end(); ++term) {
+            const uint8_t* const from = row + *term;
+            unrolled<kRunningRows>([&](auto i) VOREL_INLINE_LAMBDA {
+                change(lines[i.value], Line::at(from + i.value * kRowBytes));
+            });
+        }
+    }
+    /// Differences of a lower order, of which `last` is the one before.
+    VOREL_INLINE void addUp(Line& last) {
+        unrolled<kRunningRows>([&](auto i) VOREL_INLINE_LAMBDA {
+            last.add(lines[i.value]);
+            lines[i.value] = last;
+        });
+    }
+};
+
+class StripSum {
+  public:
+    StripSum(const RunningSum& sum, const Ink& ink, const uint8_t* row0)
+        : mRow0(row0),
+          mOrder(sum.terms.order),
+          mLowest(ink.first - (sum.terms.pairs.distance + kRunningRows - 1)),
+          mEnd(ink.end),
+          mAdded(sum.terms.added),
+          mTakenAway(sum.terms.takenAway),
+          mSecond{},
+          mFirst{},
+          mInverse(spread<Floats>(sum.inverse)),
+          mFlip(spread<Bytes>(sum.ending.flip)) {
+        const uint32_t rounding = sum.ending.roundsUp ? sum.total - 1 : 0;
+        for (Words& words : mSums)
+            words = spread<Words>(kSumStart + rounding);
+    }
+
+    /// The next four rows of results, from row y on.
+    __attribute__((noinline)) void next(int64_t y, Bytes* rows) {
+        const int64_t lowest = (mLowest - y) * kRowBytes;
+        const int64_t end = (mEnd - y) * kRowBytes;
+        mAdded.moveTo(lowest, end);
+        mTakenAway.moveTo(lowest, end);
+        FourLines four = {};
+        const uint8_t* const row = mRow0 + y * kRowBytes;
+        four.apply(mAdded, row, [](Line& line, const Line& tap) VOREL_INLINE_LAMBDA { line.add(tap); });
+        four.apply(mTakenAway, row,
+                   [](Line& line, const Line& tap) VOREL_INLINE_LAMBDA { line.subtract(tap); });
+        if (mOrder == 3) four.addUp(mSecond);
+        four.addUp(mFirst);
+        unrolled<kRunningRows>(
+            [&](auto i) VOREL_INLINE_LAMBDA { rows[i.value] = quotients(four.lines[i.value]) ^ mFlip; });
+    }
+
+  private:
+    VOREL_INLINE Bytes quotients(const Line& line) {
+        return packed(quotients<0>(line.left), quotients<2>(line.right));
+    }
+    template <int kFirst>
+    VOREL_INLINE Halves quotients(Halves change) {
+        mSums[kFirst] += extended(interleavedLow(change, change));
+        mSums[kFirst + 1] += extended(interleavedHigh(change, change));
+        return packed(quotient(mSums[kFirst], mInverse), quotient(mSums[kFirst + 1], mInverse));
+    }
+    /// Halves that stand in both halves of their words, with their signs.
+    static VOREL_INLINE Words extended(Halves twice) { return as<Words>(as<Integers>(twice) >> 16); }
+
+    const uint8_t* mRow0;
+    int mOrder;
+    int64_t mLowest;  // rows of the lines that can hold anything but 0, from `mLowest` to `mEnd` - 1
+    int64_t mEnd;
+    TermRange mAdded;
+    TermRange mTakenAway;
+    Line mSecond;
+    Line mFirst;
+    Words mSums[4];
+    Floats mInverse;
+    Bytes mFlip;
+};
+
+// --- Squares ------------------------------------------------------------------------------------------
+
+constexpr int64_t kLaneBytes = kBytes < 16 ? kBytes : 16;
+
+/// Two of the steps that turn kLaneBytes rows of as many lanes, of each 128 bits by themselves. A step
+/// interleaves the upper half of the rows with the lower one and so moves the highest bit of a byte's
+/// row number to the end of its column number; as many steps as bits exchange the two.
+VOREL_INLINE void turnTwoBits(const Bytes* from, Bytes* to) {
+    constexpr int64_t kQuarter = kLaneBytes / 4;
+    for (int64_t i = 0; i < kQuarter; ++i) {
+        const Bytes low02 = interleavedLow(from[i], from[i + 2 * kQuarter]);
+        const Bytes high02 = interleavedHigh(from[i], from[i + 2 * kQuarter]);
+        const Bytes low13 = interleavedLow(from[i + kQuarter], from[i + 3 * kQuarter]);
+        const Bytes high13 = interleavedHigh(from[i + kQuarter], from[i + 3 * kQuarter]);
+        to[4 * i] = interleavedLow(low02, low13);
+        to[4 * i + 1] = interleavedHigh(low02, low13);
+        to[4 * i + 2] = interleavedLow(high02, high13);
+        to[4 * i + 3] = interleavedHigh(high02, high13);
+    }
+}
+VOREL_INLINE void turnRows(Bytes* rows) {
+    Bytes half[kLaneBytes];
+    turnTwoBits(rows, half);
+    if (kLaneBytes == 4) {
+        std::memcpy(rows, half, sizeof half);
+    } else {
+        turnTwoBits(half, rows);
+    }
+}
+
+void storeTurned(Bytes* rows, uint8_t* to, int64_t rowStride) {
+    for (int64_t group = 0; group < kBytes; group += kLaneBytes) {
+        turnRows(rows + group);
+        for (int64_t i = 0; i < kLaneBytes; ++i) {
+            uint8_t bytes[kBytes];
+            store(bytes, rows[group + i]);
+            for (int64_t lane = 0; lane < kBytes; lane += kLaneBytes)
+                std::memcpy(to + (lane + i) * rowStride + group, bytes + lane, kLaneBytes);
+        }
+    }
+}
+
+void storePlain(const Bytes* rows, uint8_t* to, int64_t rowStride) {
+    for (int64_t i = 0; i < kBytes; ++i)
+        store(to + i * rowStride, rows[i]);
+}
+
+void turn(const BlurSource& source, int64_t row, uint8_t* lines) {
+    for (int64_t x = 0; x < source.width; x += kBytes) {
+        const SourceStrip strip = SourceStrip::of(source, x);
+        Bytes rows[kBytes];
+        for (int64_t i = 0; i < kBytes; ++i)
+            rows[i] = strip.has(row + i) ? strip.row(row + i) : Bytes{};
+        storeTurned(rows, lines + x * kBytes, kBytes);
+    }
+}
+
+void fillSquare(uint8_t value, uint8_t* to, int64_t rowStride) {
+    for (int64_t i = 0; i < kBytes; ++i)
+        std::memset(to + i * rowStride, value, static_cast<size_t>(kBytes));
+}
+
+void blurStrip(const RunningSum& sum, const BlurSource& source, int64_t x, uint8_t* lines, int64_t first,
+               int64_t count, const SquareRows& out) {
+    const SourceStrip strip = SourceStrip::of(source, x);
+    const Ink ink = Ink::of(strip);
+    const TapPairs& pairs = sum.terms.pairs;
+    uint8_t* const row0 = lines + (pairs.distance + kRunningRows - 1 - ink.first) * kRowBytes;
+    if (ink.first < ink.end) fillLines(strip, ink, pairs, row0);
+
+    StripSum sums(sum, ink, row0);
+    const bool isEmpty = ink.first >= ink.end;
+    const int64_t begin = ink.first - sum.radius;
+    const int64_t end = ink.end + sum.radius;
+    Bytes rows[kBytes];
+    int64_t y = first;
+    // Results that nobody wants, but that the following ones build on.
+    if (begin < first && !isEmpty) {
+        for (y -= roundedUp(first - begin, kRunningRows); y < first; y += kRunningRows)
+            sums.next(y, rows);
+    }
+    for (uint8_t* square = out.start; y < first + count; square += out.squareStride) {
+        if (isEmpty || y + kBytes <= begin || y >= end) {
+            fillSquare(sum.ending.flip, square, out.rowStride);
+            y += kBytes;
+            continue;
+        }
+        for (int64_t i = 0; i < kBytes; i += kRunningRows, y += kRunningRows)
+            sums.next(y, rows + i);
+        if (out.areTurned) {
+            storeTurned(rows, square, out.rowStride);
+        } else {
+            storePlain(rows, square, out.rowStride);
+        }
+    }
+}
+
+}  // namespace
+
+extern const RunningKernels kRunningKernels = {turn, blurStrip};
+
+}  // namespace VFontEffect::internal::VOREL_LEVEL

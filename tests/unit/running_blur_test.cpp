@@ -1,0 +1,148 @@
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <cstddef>
+#include <cstdint>
+#include <cstdlib>
+#include <sstream>
+#include <string>
+#include <utility>
+#include <vector>
+
+#include "../support/blurs.h"
+#include "../support/core_compare.h"
+#include "../support/mask_gallery.h"
+
+/// The blur by running sums against the one by dot products, whichever of the two a level chooses, and
+/// the terms that it adds up against the kernel's differences.
+namespace {
+
+using namespace vorel_test;
+using literal::Mask;
+using VFontEffect::internal::BlurKernel;
+using VFontEffect::internal::FullColumns;
+using VFontEffect::internal::glowKernel;
+using VFontEffect::internal::kNoFullColumns;
+using VFontEffect::internal::shadowKernel;
+
+// The largest glow has a radius of 231.
+constexpr int kLargestShadow = 256;
+constexpr int kLargestGlow = 231;
+
+// --- Terms ------------------------------------------------------------------------------------------
+
+/// What the taps from distance -radius - order on weigh in a difference of the order: the binomials of
+/// 1 - z, times the weights.
+std::vector<int64_t> definedDifference(const BlurKernel& kernel, int order) {
+    const std::vector<int64_t> binomials =
+        order == 2 ? std::vector<int64_t>{1, -2, 1} : std::vector<int64_t>{1, -3, 3, -1};
+    std::vector<int64_t> difference;
+    for (int k = -kernel.radius - order; k <= kernel.radius; ++k) {
+        int64_t sum = 0;
+        for (size_t i = 0; i < binomials.size(); ++i) {
+            const int distance = std::abs(k + static_cast<int>(i));
+            if (distance <= kernel.radius) sum += binomials[i] * kernel.weights.data()[distance];
+        }
+        difference.push_back(sum);
+    }
+    return difference;
+}
+
+void expectTermsOf(const BlurKernel& kernel) {
+    SCOPED_TRACE(kernel.radius);
+    const TermsOfKernel split = termsOf(kernel);
+    ASSERT_TRUE(split.order == 2 || split.order == 3);
+    std::vector<int64_t> sum(static_cast<size_t>(2 * kernel.radius + 1 + split.order), 0);
+    for (const Term& term : split.terms) {
+        const auto cell = static_cast<size_t>(term.row + kernel.radius + split.order);
+        sum.at(cell) += term.sign;
+        if (!term.isPair) continue;
+        sum.at(cell + static_cast<size_t>(split.pairDistance)) +=
+            split.pairsAreDifferences ? -term.sign : term.sign;
+    }
+    EXPECT_EQ(sum, definedDifference(kernel, split.order));
+    for (size_t i = 1; i < split.terms.size(); ++i) {
+        if (split.terms[i].sign != split.terms[i - 1].sign) continue;
+        EXPECT_LE(split.terms[i - 1].row, split.terms[i].row);
+    }
+}
+
+TEST(RunningBlur, TermsOfEveryKernel_AscendAndAddUpToItsDifference) {
+    for (int radius = 0; radius <= kLargestShadow; ++radius)
+        expectTermsOf(shadowKernel(radius));
+    for (int radius = 0; radius <= kLargestGlow; ++radius)
+        expectTermsOf(glowKernel(radius));
+}
+
+TEST(RunningBlur, TermsOfWideKernels_AreFarFewerThanTheTaps) {
+    for (int radius = 13; radius <= 100; ++radius) {
+        const size_t most = radius <= 40 ? 40 : 66;
+        EXPECT_LE(termsOf(shadowKernel(radius)).terms.size(), most) << radius;
+        EXPECT_LE(termsOf(glowKernel(radius)).terms.size(), most) << radius;
+    }
+}
+
+// --- Blurs ------------------------------------------------------------------------------------------
+
+/// Mostly from `first` to `end`, else from a place before that to one behind it.
+std::pair<int, int> randomRange(Random& random, int first, int end) {
+    if (random.chance(50)) return {first, end};
+    const int from = random.between(first - 9, end - 1);
+    return {from, random.between(from + 1, end + 9)};
+}
+
+Mask maskWithEmptyEdges(Random& random, int width, int height) {
+    Mask mask = randomMask(random, width, height);
+    const int top = random.between(0, height);
+    const int bottom = random.between(0, height);
+    for (int y = 0; y < height; ++y) {
+        const auto row = mask.bytes.begin() + static_cast<ptrdiff_t>(y) * width;
+        if (y < top || y >= bottom) std::fill_n(row, random.between(0, width), uint8_t{0});
+    }
+    return mask;
+}
+
+/// What a case says when it fails.
+std::string describe(const BlurCase& blur) {
+    std::ostringstream text;
+    text << blur.source.width << " x " << blur.source.height << ", radius " << blur.kernel.radius
+         << ", window " << blur.window.left << " " << blur.window.top << " " << blur.window.right << " "
+         << blur.window.bottom << ", full before " << blur.full.before << " and from " << blur.full.from;
+    return text.str();
+}
+
+void expectBothMethodsTheSame(Random& random, int radius) {
+    const bool glow = radius <= kLargestGlow && random.chance(50);
+    const BlurKernel kernel = glow ? glowKernel(radius) : shadowKernel(radius);
+    const int width = random.between(1, 150);
+    const int height = random.between(1, 90);
+    const Mask mask =
+        random.chance(10) ? filledMask(width, height, 255) : maskWithEmptyEdges(random, width, height);
+    const auto [left, right] = randomRange(random, -radius, width + radius);
+    const auto [top, bottom] = randomRange(random, -radius, height + radius);
+    FullColumns full = kNoFullColumns;
+    if (random.chance(30)) full.before = random.between(-radius, width);
+    if (random.chance(30)) full.from = random.between(0, width + radius);
+    const auto flip = static_cast<uint8_t>(random.chance(50) ? 0 : 0xFF);
+    const BlurCase blur = {kernel,
+                           {mask.bytes.data(), width, width, height, flip},
+                           {left, top, right, bottom},
+                           full,
+                           random.chance(50)};
+    const std::vector<uint8_t> expected = blurredByDots(blur);
+    ASSERT_FALSE(expected.empty());
+    ASSERT_EQ(blurredByRunningSums(blur), expected) << describe(blur);
+    const std::vector<uint8_t> inverse = inverseBlurredByDots(blur);
+    ASSERT_FALSE(inverse.empty());
+    ASSERT_EQ(inverseBlurredByRunningSums(blur), inverse) << describe(blur);
+}
+
+TEST(RunningBlur, OfEveryRadius_IsTheOneByDotProducts) {
+    for (int radius = 0; radius <= kLargestShadow; ++radius) {
+        forSeeds(static_cast<uint64_t>(radius) * 100, radius <= 100 ? 24 : 4,
+                 [&](Random& random) { expectBothMethodsTheSame(random, radius); });
+        if (HasFatalFailure()) return;
+    }
+}
+
+}  // namespace
