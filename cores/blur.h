@@ -1,13 +1,21 @@
 #pragma once
 
+#include <algorithm>
+#include <cstdint>
+
 #include "cores/dot_blur.h"
 #include "cores/running_blur.h"
 
 /// The blur by the method that takes less.
 namespace VFontEffect::internal {
 
-inline bool suitsRunningSums(const BlurKernel& kernel) {
-    return kernel.radius > blurKernels().largestDotRadius;
+/// Running sums keep up to 256 bytes for each row or column of a strip: no longer ones than this.
+constexpr int64_t kLongestRunningSide = 1 << 16;
+
+inline bool suitsRunningSums(const BlurKernel& kernel, const BlurSource& source, const Window& window) {
+    const int64_t longest =
+        std::max(std::max(source.width, source.height), std::max(window.width(), window.height()));
+    return kernel.radius > blurKernels().largestDotRadius && longest <= kLongestRunningSide;
 }
 
 /// Runs a blur, if there is memory for it.
@@ -26,7 +34,7 @@ template <class Paint>
 bool blurDownThenAcross(const BlurKernel& kernel, const BlurSource& source, const Window& window,
                         const FullColumns& full, bool inverted, Paint paint) {
     const auto run = [&](auto& blur) { blur.run(inverted, paint); };
-    if (suitsRunningSums(kernel))
+    if (suitsRunningSums(kernel, source, window))
         return runIfThere(RunningDownThenAcross(kernel, source, window, full), run);
     return runIfThere(DownThenAcross(kernel, source, window, full), run);
 }
@@ -37,7 +45,8 @@ template <class Paint>
 bool blurAcrossThenDown(const BlurKernel& kernel, const BlurSource& source, const Window& window,
                         Paint paint) {
     const auto run = [&](auto& blur) { blur.run(paint); };
-    if (suitsRunningSums(kernel)) return runIfThere(RunningAcrossThenDown(kernel, source, window), run);
+    if (suitsRunningSums(kernel, source, window))
+        return runIfThere(RunningAcrossThenDown(kernel, source, window), run);
     return runIfThere(AcrossThenDown(kernel, source, window), run);
 }
 

@@ -10,9 +10,9 @@
 namespace VFontEffect::internal {
 namespace {
 
-// Which difference has the fewest terms, and which pairs take most of them together, was counted for
-// all radii from 10 to 100. While the radius is small the curve of the kernel makes the terms, later the
-// rounding of its weights does, which is pairs of opposite neighbours.
+// What has the fewest terms, or few more, was counted for all radii from 10 to 100. While the radius is
+// small the curve of the kernel makes the terms, later the rounding of its weights does, which is pairs
+// of opposite neighbours.
 constexpr int kLeastRadiusOfSecondDifferences = 18;
 constexpr int kLeastRadiusOfNoise = 41;
 
@@ -128,9 +128,8 @@ RunningDownThenAcross::MiddleColumns RunningDownThenAcross::MiddleColumns::of(
     const int64_t inked = passes.inSquares(source.part.width);
     if (full.before <= reach.left && full.from >= reach.right)
         return {source.left, source.part.width, inked};
-    const int64_t before = std::max<int64_t>(0, source.left - reach.left);
-    const int64_t left = source.left - before;
-    return {left, reach.right - left, std::max(reach.right - left, before + inked)};
+    const int64_t before = inked > 0 ? source.left - reach.left : 0;
+    return {reach.left, reach.width(), std::max(reach.width(), before + inked)};
 }
 
 RunningDownThenAcross::RunningDownThenAcross(const BlurKernel& kernel, const BlurSource& source,

@@ -21,7 +21,7 @@
 /// Exactness: all differences are whole numbers. The first one is at most 255 * 128 and fits in 16 bits
 /// with its sign, however the higher ones wrap; sums have 32 bits.
 ///
-/// Cost: 25 to 30 additions a pixel and pass up to a radius of 40, 50 at 100. Lanes are columns. The
+/// Cost: 20 to 40 additions a pixel and pass up to a radius of 40, 60 at 100. Lanes are columns. The
 /// results are turned in squares, so that lanes are rows then, and the pass across is this one again.
 namespace VFontEffect::internal::VOREL_LEVEL {
 namespace {
@@ -68,23 +68,29 @@ struct Ink {
     }
 };
 
-void clearRows(uint8_t* from, int64_t rows) {
-    std::memset(from, 0, static_cast<size_t>(rows * kRowBytes));
-}
+/// The rows of taps and pairs from row `top` of the source on.
+struct Rows {
+    uint8_t* lines;
+    int64_t top;
+
+    VOREL_INLINE uint8_t* at(int64_t y) const { return lines + (y - top) * kRowBytes; }
+    void clear(int64_t first, int64_t end) const {
+        std::memset(at(first), 0, static_cast<size_t>((end - first) * kRowBytes));
+    }
+};
 
 /// Stores the ink's taps, and the pairs from `distance` rows before them on; around them zeros, as far
-/// as four results at a time reach. `row0` is where row 0 of the source would be.
-void fillLines(const SourceStrip& strip, const Ink& ink, const TapPairs& pairs, uint8_t* row0) {
-    const int64_t before = pairs.distance + kRunningRows - 1;
-    clearRows(row0 + (ink.first - before) * kRowBytes, before);
-    clearRows(row0 + ink.end * kRowBytes, kRunningRows - 1);
+/// as four results at a time reach.
+Rows filledRows(const SourceStrip& strip, const Ink& ink, const TapPairs& pairs, uint8_t* lines) {
+    const Rows rows = {lines, ink.first - (pairs.distance + kRunningRows - 1)};
+    rows.clear(rows.top, ink.first);
+    rows.clear(ink.end, ink.end + kRunningRows - 1);
     for (int64_t y = ink.first; y < ink.end; ++y) {
         const Bytes row = strip.row(y);
         const Line taps = {as<Halves>(interleavedLow(row, Bytes{})),
                            as<Halves>(interleavedHigh(row, Bytes{}))};
-        uint8_t* const at = row0 + y * kRowBytes;
-        taps.storeAt(at);
-        uint8_t* const earlier = at - pairs.distance * kRowBytes;
+        taps.storeAt(rows.at(y));
+        uint8_t* const earlier = rows.at(y - pairs.distance);
         Line pair = Line::at(earlier);
         if (pairs.areDifferences) {
             pair.subtract(taps);
@@ -93,8 +99,10 @@ void fillLines(const SourceStrip& strip, const Ink& ink, const TapPairs& pairs, 
         }
         pair.storeAt(earlier + kLineBytes);
     }
-    for (int64_t y = larger(ink.first, ink.end - pairs.distance); y < ink.end; ++y)
-        Line::at(row0 + y * kRowBytes).storeAt(row0 + y * kRowBytes + kLineBytes);
+    // The last taps have no partners.
+    for (int64_t y = ink.end - pairs.distance; y < ink.end; ++y)
+        Line::at(rows.at(y)).storeAt(rows.at(y) + kLineBytes);
+    return rows;
 }
 
 // --- Sums -------------------------------------------------------------------------------------------
@@ -105,7 +113,7 @@ class TermRange {
     explicit TermRange(const TermList& terms)
         : mBegin(terms.offsets), mFirst(mBegin + terms.count), mEnd(mFirst) {}
 
-    /// Takes those at `lowest` to `end` - 1, both not above the ones before.
+    /// Takes those at `lowest` to `end` - 1, both the starts of rows and not above the ones before.
     VOREL_INLINE void moveTo(int64_t lowest, int64_t end) {
         while (mEnd > mBegin && mEnd[-1] >= end)
             --mEnd;
@@ -126,9 +134,9 @@ struct FourLines {
     Line lines[kRunningRows];
 
     template <class Change>
-    VOREL_INLINE void apply(const TermRange& terms, const uint8_t* row, Change change) {
+    VOREL_INLINE void apply(const TermRange& terms, const uint8_t* memory, int64_t row, Change change) {
         for (const int32_t* term = terms.begin(); term < terms.end(); ++term) {
-            const uint8_t* const from = row + *term;
+            const uint8_t* const from = memory + (row + *term);
             unrolled<kRunningRows>([&](auto i) VOREL_INLINE_LAMBDA {
                 change(lines[i.value], Line::at(from + i.value * kRowBytes));
             });
@@ -145,11 +153,10 @@ struct FourLines {
 
 class StripSum {
   public:
-    StripSum(const RunningSum& sum, const Ink& ink, const uint8_t* row0)
-        : mRow0(row0),
+    StripSum(const RunningSum& sum, const Rows& rows, int64_t inkEnd)
+        : mRows(rows),
+          mInkEnd(inkEnd),
           mOrder(sum.terms.order),
-          mLowest(ink.first - (sum.terms.pairs.distance + kRunningRows - 1)),
-          mEnd(ink.end),
           mAdded(sum.terms.added),
           mTakenAway(sum.terms.takenAway),
           mSecond{},
@@ -163,14 +170,14 @@ class StripSum {
 
     /// The next four rows of results, from row y on.
     __attribute__((noinline)) void next(int64_t y, Bytes* rows) {
-        const int64_t lowest = (mLowest - y) * kRowBytes;
-        const int64_t end = (mEnd - y) * kRowBytes;
-        mAdded.moveTo(lowest, end);
-        mTakenAway.moveTo(lowest, end);
+        const int64_t row = (y - mRows.top) * kRowBytes;
+        const int64_t end = (mInkEnd - y) * kRowBytes;
+        mAdded.moveTo(-row, end);
+        mTakenAway.moveTo(-row, end);
         FourLines four = {};
-        const uint8_t* const row = mRow0 + y * kRowBytes;
-        four.apply(mAdded, row, [](Line& line, const Line& tap) VOREL_INLINE_LAMBDA { line.add(tap); });
-        four.apply(mTakenAway, row,
+        four.apply(mAdded, mRows.lines, row,
+                   [](Line& line, const Line& tap) VOREL_INLINE_LAMBDA { line.add(tap); });
+        four.apply(mTakenAway, mRows.lines, row,
                    [](Line& line, const Line& tap) VOREL_INLINE_LAMBDA { line.subtract(tap); });
         if (mOrder == 3) four.addUp(mSecond);
         four.addUp(mFirst);
@@ -191,10 +198,9 @@ class StripSum {
     /// Halves that stand in both halves of their words, with their signs.
     static VOREL_INLINE Words extended(Halves twice) { return as<Words>(as<Integers>(twice) >> 16); }
 
-    const uint8_t* mRow0;
+    Rows mRows;
+    int64_t mInkEnd;
     int mOrder;
-    int64_t mLowest;  // rows of the lines that can hold anything but 0, from `mLowest` to `mEnd` - 1
-    int64_t mEnd;
     TermRange mAdded;
     TermRange mTakenAway;
     Line mSecond;
@@ -270,12 +276,8 @@ void blurStrip(const RunningSum& sum, const BlurSource& source, int64_t x, uint8
                int64_t count, const SquareRows& out) {
     const SourceStrip strip = SourceStrip::of(source, x);
     const Ink ink = Ink::of(strip);
-    const TapPairs& pairs = sum.terms.pairs;
-    uint8_t* const row0 = lines + (pairs.distance + kRunningRows - 1 - ink.first) * kRowBytes;
-    if (ink.first < ink.end) fillLines(strip, ink, pairs, row0);
-
-    StripSum sums(sum, ink, row0);
     const bool isEmpty = ink.first >= ink.end;
+    StripSum sums(sum, isEmpty ? Rows{} : filledRows(strip, ink, sum.terms.pairs, lines), ink.end);
     const int64_t begin = ink.first - sum.radius;
     const int64_t end = ink.end + sum.radius;
     Bytes rows[kBytes];

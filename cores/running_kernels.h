@@ -18,7 +18,7 @@ struct TapPairs {
     bool areDifferences;
 };
 
-/// Lines by their ascending distances from a result's row, in bytes.
+/// Lines by their distances from a result's row, in bytes, in the order of their rows.
 struct TermList {
     const int32_t* offsets;
     int64_t count;

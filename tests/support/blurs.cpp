@@ -40,11 +40,14 @@ std::vector<uint8_t> inverseBlurredBy(const BlurCase& which) {
 }
 
 void append(const TermList& list, int sign, std::vector<Term>& terms) {
-    const int64_t rowBytes = kLinesOfRow * kRunningPixelBytes * blurKernels().vectorBytes;
+    const int64_t lineBytes = kRunningPixelBytes * blurKernels().vectorBytes;
+    const int64_t rowBytes = kLinesOfRow * lineBytes;
     for (int64_t i = 0; i < list.count; ++i) {
         const int64_t offset = list.offsets[i];
         const int64_t row = (offset < 0 ? offset - rowBytes + 1 : offset) / rowBytes;
-        terms.push_back({row, offset != row * rowBytes, sign});
+        const int64_t line = offset - row * rowBytes;
+        if (line != 0 && line != lineBytes) sign = 0;  // neither taps nor pairs: no term of any kernel
+        terms.push_back({row, line != 0, sign});
     }
 }
 

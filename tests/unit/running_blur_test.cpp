@@ -20,10 +20,12 @@ namespace {
 using namespace vorel_test;
 using literal::Mask;
 using VFontEffect::internal::BlurKernel;
+using VFontEffect::internal::BlurSource;
 using VFontEffect::internal::FullColumns;
 using VFontEffect::internal::glowKernel;
 using VFontEffect::internal::kNoFullColumns;
 using VFontEffect::internal::shadowKernel;
+using VFontEffect::internal::Window;
 
 // The largest glow has a radius of 231.
 constexpr int kLargestShadow = 256;
@@ -107,28 +109,13 @@ std::string describe(const BlurCase& blur) {
     std::ostringstream text;
     text << blur.source.width << " x " << blur.source.height << ", radius " << blur.kernel.radius
          << ", window " << blur.window.left << " " << blur.window.top << " " << blur.window.right << " "
-         << blur.window.bottom << ", full before " << blur.full.before << " and from " << blur.full.from;
+         << blur.window.bottom << ", full before " << blur.full.before << " and from " << blur.full.from
+         << ", centre " << blur.kernel.weights.data()[0] << ", flip " << int{blur.source.flip}
+         << ", inverted " << blur.inverted;
     return text.str();
 }
 
-void expectBothMethodsTheSame(Random& random, int radius) {
-    const bool glow = radius <= kLargestGlow && random.chance(50);
-    const BlurKernel kernel = glow ? glowKernel(radius) : shadowKernel(radius);
-    const int width = random.between(1, 150);
-    const int height = random.between(1, 90);
-    const Mask mask =
-        random.chance(10) ? filledMask(width, height, 255) : maskWithEmptyEdges(random, width, height);
-    const auto [left, right] = randomRange(random, -radius, width + radius);
-    const auto [top, bottom] = randomRange(random, -radius, height + radius);
-    FullColumns full = kNoFullColumns;
-    if (random.chance(30)) full.before = random.between(-radius, width);
-    if (random.chance(30)) full.from = random.between(0, width + radius);
-    const auto flip = static_cast<uint8_t>(random.chance(50) ? 0 : 0xFF);
-    const BlurCase blur = {kernel,
-                           {mask.bytes.data(), width, width, height, flip},
-                           {left, top, right, bottom},
-                           full,
-                           random.chance(50)};
+void expectBothMethodsTheSame(const BlurCase& blur) {
     const std::vector<uint8_t> expected = blurredByDots(blur);
     ASSERT_FALSE(expected.empty());
     ASSERT_EQ(blurredByRunningSums(blur), expected) << describe(blur);
@@ -137,11 +124,57 @@ void expectBothMethodsTheSame(Random& random, int radius) {
     ASSERT_EQ(inverseBlurredByRunningSums(blur), inverse) << describe(blur);
 }
 
+/// Near one of two columns, or anywhere between them.
+int64_t nearEither(Random& random, int64_t a, int64_t b) {
+    if (random.chance(40)) return random.between(static_cast<int>(a), static_cast<int>(b));
+    return (random.chance(50) ? a : b) + random.between(-2, 2);
+}
+
+void expectBothMethodsTheSame(Random& random, int radius) {
+    const bool glow = radius <= kLargestGlow && random.chance(50);
+    const BlurKernel kernel = glow ? glowKernel(radius) : shadowKernel(radius);
+    const int stride = random.between(1, 150);
+    const int width = random.chance(50) ? stride : random.between(1, stride);
+    const int height = random.between(1, 90);
+    const Mask mask =
+        random.chance(10) ? filledMask(stride, height, 255) : maskWithEmptyEdges(random, stride, height);
+    const auto [left, right] = randomRange(random, -radius, width + radius);
+    const auto [top, bottom] = randomRange(random, -radius, height + radius);
+    // Columns at and around the ends of what the window's taps reach, and those of the mask.
+    FullColumns full = kNoFullColumns;
+    if (random.chance(30)) full.before = nearEither(random, left - radius, width);
+    if (random.chance(30)) full.from = nearEither(random, 0, right + radius);
+    const auto flip = static_cast<uint8_t>(random.chance(50) ? 0 : 0xFF);
+    expectBothMethodsTheSame({kernel,
+                              {mask.bytes.data(), stride, width, height, flip},
+                              {left, top, right, bottom},
+                              full,
+                              random.chance(50)});
+}
+
 TEST(RunningBlur, OfEveryRadius_IsTheOneByDotProducts) {
     for (int radius = 0; radius <= kLargestShadow; ++radius) {
         forSeeds(static_cast<uint64_t>(radius) * 100, radius <= 100 ? 24 : 4,
                  [&](Random& random) { expectBothMethodsTheSame(random, radius); });
         if (HasFatalFailure()) return;
+    }
+}
+
+TEST(RunningBlur, OfSidesLongerThanTheKernel_ReachesTheLargestDifferences) {
+    for (const int radius : {13, 100, 150, 256}) {
+        const BlurKernel kernel = shadowKernel(radius);
+        const BlurKernel glow = glowKernel(std::min(radius, kLargestGlow));
+        const int length = 2 * radius + 60;
+        for (const bool wide : {true, false}) {
+            const int width = wide ? length : 5;
+            const int height = wide ? 5 : length;
+            const Mask mask = filledMask(width, height, 255);
+            const Window window = {-radius, -radius, width + radius, height + radius};
+            const BlurSource source = {mask.bytes.data(), width, width, height, 0};
+            expectBothMethodsTheSame({kernel, source, window, kNoFullColumns, false});
+            expectBothMethodsTheSame({glow, source, window, kNoFullColumns, true});
+            if (HasFatalFailure()) return;
+        }
     }
 }
 
