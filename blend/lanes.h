@@ -118,6 +118,8 @@ VOREL_INLINE V smaller(V a, V b) {
 //   squareRoot     correctly rounded
 //   multipliedSum  a * b + c, rounded once (on AVX-512)
 //   gathered       the words of a table at the given indices, kWords of them, in a vector or in bytes
+//   gatheredNear   the same from a table of `size` words, 32 at least, by indices that as a rule lie
+//                  close together: looked up in registers then
 //   loadFirst      1 to kBytes bytes of memory, zeros after them
 //   widenedLow, widenedHigh   the first and the second half of the bytes, each byte in a half
 //   narrowed       halves of at most 255 as bytes: those of the first vector, then of the second
@@ -211,6 +213,18 @@ VOREL_INLINE Bytes quartersInTurn(Halves even, Halves odd) {
     const auto low = as<Halves>(smaller(as<SignedHalves>(even), most));
     const auto high = as<Halves>(smaller(as<SignedHalves>(odd), most));
     return as<Bytes>((low >> 2) | (high << 6 & 0xFF00));
+}
+#endif
+
+#if defined(VOREL_AVX2) || defined(VOREL_AVX512)
+constexpr int32_t kNearEntries = 2 * kWords;
+/// The first of a table's kNearEntries entries that may hold all that the indices ask for: as a rule
+/// they ascend or descend.
+VOREL_INLINE int32_t firstNear(Integers indices, int32_t size) {
+    const int32_t one = indices[0];
+    const int32_t other = indices[kWords - 1];
+    const int32_t lower = one < other ? one : other;
+    return lower < size - kNearEntries ? lower : size - kNearEntries;
 }
 #endif
 
@@ -348,6 +362,14 @@ VOREL_INLINE Words gathered(const uint32_t* table, const uint8_t* indices) {
     const __m128i bytes = _mm_loadu_si128(reinterpret_cast<const __m128i*>(indices));
     return gathered(table, as<Integers>(_mm512_cvtepu8_epi32(bytes)));
 }
+VOREL_INLINE Words gatheredNear(const uint32_t* table, int32_t size, Integers indices) {
+    const int32_t first = firstNear(indices, size);
+    const auto offsets = as<__m512i>(indices - first);
+    if (_mm512_cmpge_epu32_mask(offsets, _mm512_set1_epi32(kNearEntries)) != 0)
+        return gathered(table, indices);
+    return as<Words>(_mm512_permutex2var_epi32(as<__m512i>(load<Words>(table + first)), offsets,
+                                               as<__m512i>(load<Words>(table + first + kWords))));
+}
 
 VOREL_INLINE Bytes loadFirst(const uint8_t* from, int64_t count) {
     const uint64_t lanes = ~uint64_t{0} >> (64 - count);
@@ -442,6 +464,17 @@ VOREL_INLINE Words gathered(const uint32_t* table, Integers indices) {
 VOREL_INLINE Words gathered(const uint32_t* table, const uint8_t* indices) {
     const __m128i bytes = _mm_loadl_epi64(reinterpret_cast<const __m128i*>(indices));
     return gathered(table, as<Integers>(_mm256_cvtepu8_epi32(bytes)));
+}
+VOREL_INLINE Words gatheredNear(const uint32_t* table, int32_t size, Integers indices) {
+    const int32_t first = firstNear(indices, size);
+    const Words offsets = as<Words>(indices - first);
+    if (!allZero(as<Bytes>(offsets & ~static_cast<uint32_t>(kNearEntries - 1))))
+        return gathered(table, indices);
+    const auto at = [offsets](const uint32_t* from) VOREL_INLINE_LAMBDA {
+        return as<Words>(
+            _mm256_permutevar8x32_epi32(as<__m256i>(load<Words>(from)), as<__m256i>(offsets)));
+    };
+    return offsets < kWords ? at(table + first) : at(table + first + kWords);
 }
 
 VOREL_INLINE Halves widenedLow(Bytes v) {
@@ -655,6 +688,12 @@ VOREL_INLINE Words addDots(Words sums, Taps taps, Weights weights) {
 }
 #endif
 
+#endif
+
+#if !defined(VOREL_AVX2) && !defined(VOREL_AVX512)
+VOREL_INLINE Words gatheredNear(const uint32_t* table, int32_t, Integers indices) {
+    return gathered(table, indices);
+}
 #endif
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

@@ -75,8 +75,9 @@ struct RampPainter {
     VOREL_INLINE bool paintWhole(const Place&) const { return false; }
     VOREL_INLINE Pixels paint(const Place& place) const {
         const Pixels destination = loadPixels(place.destination());
-        const Pixels colours =
-            madeOfWords([&](int64_t i) { return gathered(row.pixels, row.entries(place.x + i)); });
+        const Pixels colours = madeOfWords([&](int64_t i) {
+            return gatheredNear(row.pixels, kLastEntry + 1, row.entries(place.x + i));
+        });
         return DstOverWhereCovered::apply(destination, colours, loadAmounts(place.mask()));
     }
 };
