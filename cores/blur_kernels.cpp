@@ -29,18 +29,16 @@
 namespace VFontEffect::internal::VOREL_LEVEL {
 namespace {
 
-// Of 32 registers half are sums. NEON picks four weights from a register that holds four times as many.
-#if defined(VOREL_SCALAR)
-constexpr int kGridVectors = 2;
-constexpr int kStepsAtOnce = 1;
-#elif defined(VOREL_NEON)
+// Of 32 registers half are sums. An indexed dot product picks four weights from a register that holds
+// four times as many.
+#if defined(VOREL_AVX512) || defined(VOREL_NEON)
 constexpr int kGridVectors = 4;
-constexpr int kStepsAtOnce = 4;
-#elif defined(VOREL_AVX512)
-constexpr int kGridVectors = 4;
-constexpr int kStepsAtOnce = 1;
 #else
 constexpr int kGridVectors = 2;
+#endif
+#if defined(__ARM_FEATURE_DOTPROD)
+constexpr int kStepsAtOnce = 4;
+#else
 constexpr int kStepsAtOnce = 1;
 #endif
 
