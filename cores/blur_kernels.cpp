@@ -10,12 +10,12 @@
 
 /// The two passes of the blur by dot products.
 ///
-/// Four neighbouring taps stand in the four bytes of a word, so that one instruction adds
-/// four taps times their weights to each word of a vector. Down the columns the rows are interleaved by
-/// fours for that; across a row the bytes stand so already. The same four taps then serve four results,
-/// whose distances to them differ by one: the string of weights is read at four places one byte apart.
-/// Down, the four results are four rows; across, they are the four bytes of a word. So every vector of
-/// taps that is loaded feeds four sums, and every four weights feed several vectors.
+/// Four neighbouring taps stand in the four bytes of a word, so that one instruction adds four taps
+/// times their weights to each word of a vector. Down the columns the rows are interleaved by fours for
+/// that; across a row the bytes stand so already. The same four taps then serve four results, whose
+/// distances to them differ by one: the string of weights is read at four places one byte apart. Down,
+/// the four results are four rows; across, they are the four bytes of a word. So every vector of taps
+/// that is loaded feeds four sums, and every four weights feed several vectors.
 ///
 /// Up to a radius of 3 sums fit in 16 bits. Where no instruction makes a dot product of bytes, taps are
 /// widened to halves there, those at +k and -k are added before the product, and the division is one by

@@ -51,6 +51,9 @@ struct PreparedBlur {
 struct BlurEnding {
     bool roundsUp;
     uint8_t flip;
+
+    /// The mean rounded down, or 255 minus the mean rounded down as a whole.
+    static BlurEnding of(bool inverted) { return {inverted, static_cast<uint8_t>(inverted ? 0xFF : 0)}; }
 };
 
 /// `height` rows of `width` bytes, each taken as byte ^ flip. All around them is 0.

@@ -145,9 +145,8 @@ void DownThenAcross::blurQuad(int64_t quad, bool inverted) {
         loops.feed(*mWeights, mSource.part, mFirstRow + kQuad * group, mTaps.columns(), group);
     });
     loops.down(*mWeights, mTaps.columns(), quad, mMiddle.rows());
-    const BlurEnding ending = {inverted, static_cast<uint8_t>(inverted ? 0xFF : 0)};
     loops.across(*mWeights, mMiddle.rows(), mWindow.left - mMiddleLeft, mWindow.right - mMiddleLeft,
-                 {mOut.data(), mOutStride, ending});
+                 {mOut.data(), mOutStride, BlurEnding::of(inverted)});
 }
 
 // --- Across, then down ------------------------------------------------------------------------------

@@ -23,9 +23,10 @@ TapPairs pairsFor(int radius) {
     return radius < kLeastRadiusOfNoise ? TapPairs{2, false} : TapPairs{1, true};
 }
 
-/// The weights rise and fall once, by 128 at most: a difference adds up to 256 in absolute terms, and
-/// each further one to twice as much at most.
-constexpr int64_t kMostTerms = 1024;
+/// Of one sign. The weights rise and fall once, by 128 at most: the first difference adds up to 128
+/// above and to as much below zero, and each further one to twice as much at most. A term has a unit of
+/// its sign in it.
+constexpr int64_t kMostTerms = 512;
 
 /// Of the taps or pairs of a row.
 int32_t lineBytes() {
@@ -51,18 +52,17 @@ void fillDifference(const BlurKernel& kernel, int order, int32_t* cells) {
     }
 }
 
-/// Takes the cells apart into single taps and pairs, the lowest first: `added` upwards from there on,
-/// `takenAway` downwards. Returns their numbers.
-struct TermCounts {
-    int64_t added;
-    int64_t takenAway;
-};
-TermCounts splitTerms(int radius, int order, const TapPairs& pairs, int32_t* cells, int32_t* added,
-                      int32_t* takenAwayEnd) {
-    TermCounts counts = {0, 0};
+/// Takes the cells apart into single taps and pairs, the lowest first. There is room for kMostTerms of
+/// either sign in `memory`.
+void splitTerms(int radius, int32_t* cells, int32_t* memory, RunningTerms& terms) {
+    const TapPairs& pairs = terms.pairs;
+    int32_t* added = memory;
+    int32_t* takenAway = memory + kMostTerms;
+    terms.added.offsets = added;
+    terms.takenAway.offsets = takenAway;
     const int64_t count = cellsOf(radius);
     for (int64_t i = 0; i < count; ++i) {
-        const auto line = static_cast<int32_t>((i - order - radius) * kLinesOfRow);
+        const auto line = static_cast<int32_t>((i - terms.order - radius) * kLinesOfRow);
         while (cells[i] != 0) {
             const int32_t sign = cells[i] > 0 ? 1 : -1;
             const int32_t other = pairs.areDifferences ? -sign : sign;
@@ -70,15 +70,12 @@ TermCounts splitTerms(int radius, int order, const TapPairs& pairs, int32_t* cel
             const bool isPair = partner < count && cells[partner] * other > 0;
             cells[i] -= sign;
             if (isPair) cells[partner] -= other;
-            const int32_t term = (line + static_cast<int32_t>(isPair)) * lineBytes();
-            if (sign > 0) {
-                added[counts.added++] = term;
-            } else {
-                *(takenAwayEnd - ++counts.takenAway) = term;
-            }
+            int32_t*& end = sign > 0 ? added : takenAway;
+            *end++ = (line + static_cast<int32_t>(isPair)) * lineBytes();
         }
     }
-    return counts;
+    terms.added.count = added - terms.added.offsets;
+    terms.takenAway.count = takenAway - terms.takenAway.offsets;
 }
 
 }  // namespace
@@ -86,16 +83,13 @@ TermCounts splitTerms(int radius, int order, const TapPairs& pairs, int32_t* cel
 // --- Terms ------------------------------------------------------------------------------------------
 
 KernelTerms::KernelTerms(const BlurKernel& kernel)
-    : mMemory(PixelBuffer<int32_t>::uninitialised(kernel ? kMostTerms + cellsOf(kernel.radius) : -1)),
+    : mMemory(
+          PixelBuffer<int32_t>::uninitialised(kernel ? 2 * kMostTerms + cellsOf(kernel.radius) : -1)),
       mTerms{orderFor(kernel.radius), pairsFor(kernel.radius), {}, {}} {
     if (!mMemory) return;
-    int32_t* const cells = mMemory.data() + kMostTerms;
+    int32_t* const cells = mMemory.data() + 2 * kMostTerms;
     fillDifference(kernel, mTerms.order, cells);
-    const TermCounts counts =
-        splitTerms(kernel.radius, mTerms.order, mTerms.pairs, cells, mMemory.data(), cells);
-    std::reverse(cells - counts.takenAway, cells);
-    mTerms.added = {mMemory.data(), counts.added};
-    mTerms.takenAway = {cells - counts.takenAway, counts.takenAway};
+    splitTerms(kernel.radius, cells, mMemory.data(), mTerms);
 }
 
 // --- Passes -----------------------------------------------------------------------------------------
@@ -106,6 +100,7 @@ RunningPasses::RunningPasses(const BlurKernel& kernel, const BlurSource& source,
       mSide(blurKernels().vectorBytes),
       mRadius(kernel.radius),
       mTotal(kernel.total),
+      mInverse(inverseAbove(kernel.total)),
       mTerms(kernel) {}
 
 LineBuffer RunningPasses::linesFor(int64_t rows) const {
@@ -115,7 +110,7 @@ LineBuffer RunningPasses::linesFor(int64_t rows) const {
 void RunningPasses::blurStrip(const BlurEnding& ending, const BlurSource& source, int64_t x,
                               LineBuffer& lines, int64_t first, int64_t count,
                               const SquareRows& out) const {
-    const RunningSum sum = {*mTerms, mRadius, mTotal, inverseAbove(mTotal), ending};
+    const RunningSum sum = {*mTerms, mRadius, mTotal, mInverse, ending};
     runningKernels().blurStrip(sum, source, x, lines.data(), first, count, out);
 }
 
@@ -172,8 +167,7 @@ void RunningDownThenAcross::fillAround(uint8_t* band) {
 void RunningDownThenAcross::blurAcross(int64_t y, bool inverted) {
     const int64_t side = mPasses.side();
     const Window& window = mPasses.window();
-    const BlurEnding ending = {inverted, static_cast<uint8_t>(inverted ? 0xFF : 0)};
-    mPasses.blurStrip(ending, {bandAt(y), side, side, mColumns.count, 0}, 0, mLines,
+    mPasses.blurStrip(BlurEnding::of(inverted), {bandAt(y), side, side, mColumns.count, 0}, 0, mLines,
                       window.left - mColumns.left, window.width(),
                       {mOut.data(), side, mOutStride, true});
 }

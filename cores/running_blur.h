@@ -52,6 +52,7 @@ class RunningPasses {
     int64_t mSide;
     int mRadius;
     uint32_t mTotal;
+    float mInverse;
     KernelTerms mTerms;
 };
 
