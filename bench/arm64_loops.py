@@ -42,7 +42,7 @@ class Loop(NamedTuple):
 
 def blend(title, family, rule, products):
     """A step of 16 pixels has 8 multiplications for each product of pixels."""
-    return Loop(title, "blend/blend_kernels.cpp", NEON, (family + "<", "::" + rule), "umull", products, "st4", 16)
+    return Loop(title, "blend/blend_loops.cpp", NEON, (family + "<", "::" + rule), "umull", products, "st4", 16)
 
 
 LOOPS = (
@@ -54,12 +54,12 @@ LOOPS = (
     blend("mask mode 7", "blendMask", "DstOverClip", 24),
     blend("composite of layers", "blendMaskedImage", "MixByCoverage", 16),
     # A dot product adds 4 taps to 4 results.
-    Loop("blur, down", "cores/blur_kernels.cpp", DOT_PRODUCTS, ("down",), "udot", 64, "", 64),
-    Loop("blur, across", "cores/blur_kernels.cpp", DOT_PRODUCTS, ("across",), "udot", 64, "", 64),
+    Loop("blur, down", "ops/blur/dot_loops.cpp", DOT_PRODUCTS, ("down",), "udot", 64, "", 64),
+    Loop("blur, across", "ops/blur/dot_loops.cpp", DOT_PRODUCTS, ("across",), "udot", 64, "", 64),
     # Four rows of results at a time, 16 of each.
-    Loop("running sums, a term", "cores/running_kernels.cpp", NEON, ("next",), "add\tv", 8, "", 64),
+    Loop("running sums, a term", "ops/blur/difference_loops.cpp", NEON, ("next",), "add\tv", 8, "", 64),
     # Two rows at a time, a pair sum in each.
-    Loop("growth", "cores/glow_kernels.cpp", NEON, ("grow",), "uaddlp", 2, "st", 32),
+    Loop("growth", "ops/grow/growth_loops.cpp", NEON, ("grow",), "uaddlp", 2, "st", 32),
 )
 
 

@@ -1,7 +1,7 @@
 #include <cstdint>
 
+#include "blend/blend_loops.h"
 #include "blend/job.h"
-#include "blend/kernels.h"
 #include "core/blend_modes.h"
 #include "core/views.h"
 #include "voreleffect/VFBlender.h"
@@ -13,11 +13,11 @@ using namespace internal;
 namespace {
 
 /// `skipBytes` is what each source column left of the destination is skipped by.
-void blendColour(BlendKernel kernel, int x, int y, const VFBitmap* dst, const unsigned char* source,
+void blendColour(BlendLoop kernel, int x, int y, const VFBitmap* dst, const unsigned char* source,
                  int width, int height, int64_t strideBytes, int skipBytes) {
     const ColourView target = ColourView::of(dst);
     if (!target || source == nullptr || strideBytes < 0) return;
-    const Clip clip = clipPlacement(x, y, width, height, target.width, target.height);
+    const Box clip = clipPlacement(x, y, width, height, target.width, target.height);
     if (clip.empty()) return;
     BlendJob job = jobOn(target, clip);
     job.image = source + (clip.top - y) * strideBytes + (clip.left - x) * skipBytes;
@@ -25,7 +25,7 @@ void blendColour(BlendKernel kernel, int x, int y, const VFBitmap* dst, const un
     kernel(job);
 }
 
-void blendWords(BlendKernel kernel, int x, int y, const VFBitmap* dst, const unsigned int* source,
+void blendWords(BlendLoop kernel, int x, int y, const VFBitmap* dst, const unsigned int* source,
                 int width, int height, int strideWords) {
     blendColour(kernel, x, y, dst, reinterpret_cast<const unsigned char*>(source), width, height,
                 static_cast<int64_t>(strideWords) * kColourBytes, kColourBytes);
@@ -52,22 +52,20 @@ void VFBlender::drawBitmapBlend32(int x, int y, const VFBitmap* dst, unsigned ch
 
 void VFBlender::blendSrcOver32To32(int x, int y, const VFBitmap* dst, unsigned int* src, int width,
                                    int height, int srcStride) {
-    blendWords(blendKernels().srcOverWords, x, y, dst, src, width, height, srcStride);
+    blendWords(blendLoops().srcOverWords, x, y, dst, src, width, height, srcStride);
 }
 
 void VFBlender::blendDstOver32To32(int x, int y, const VFBitmap* dst, unsigned int* src, int width,
                                    int height, int srcStride) {
-    blendWords(blendKernels().dstOverWords, x, y, dst, src, width, height, srcStride);
+    blendWords(blendLoops().dstOverWords, x, y, dst, src, width, height, srcStride);
 }
 
 void VFBlender::blendDstOver32To32(int x, int y, const VFBitmap* dst, unsigned char* src, int width,
                                    int height, int srcStride, int order) {
     if (order == kOrderArgb) {
-        blendColour(blendKernels().dstOverArgb, x, y, dst, src, width, height, srcStride,
-                    kByteSourceSkip);
+        blendColour(blendLoops().dstOverArgb, x, y, dst, src, width, height, srcStride, kByteSourceSkip);
     } else if (order == kOrderRgba) {
-        blendColour(blendKernels().dstOverRgba, x, y, dst, src, width, height, srcStride,
-                    kByteSourceSkip);
+        blendColour(blendLoops().dstOverRgba, x, y, dst, src, width, height, srcStride, kByteSourceSkip);
     }
 }
 

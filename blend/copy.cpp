@@ -1,7 +1,7 @@
 #include <cstdint>
 
-#include "blend/clip.h"
-#include "blend/kernels.h"
+#include "blend/blend_loops.h"
+#include "core/box.h"
 #include "core/numeric.h"
 #include "core/views.h"
 #include "voreleffect/VFBlender.h"
@@ -13,7 +13,7 @@ using namespace internal;
 namespace {
 
 /// A job that copies the clipped part of a packed mask placed at (x, y).
-BlendJob copyJob(const unsigned char* mask, int maskWidth, int x, int y, const Clip& clip) {
+BlendJob copyJob(const unsigned char* mask, int maskWidth, int x, int y, const Box& clip) {
     BlendJob job = {};
     const int64_t skipped = (clip.top - y) * int64_t{maskWidth} + (clip.left - x);
     job.mask = mask + skipped;
@@ -48,19 +48,19 @@ void VFBlender::drawBitmap8To8(int x, int y, const VFBitmap* dst, unsigned char*
                                int maskHeight) {
     const MaskView target = MaskView::ofBytes(dst);
     if (!target || mask == nullptr) return;
-    const Clip clip = clipPlacement(x, y, maskWidth, maskHeight, target.width, target.height);
+    const Box clip = clipPlacement(x, y, maskWidth, maskHeight, target.width, target.height);
     if (clip.empty()) return;
     BlendJob job = copyJob(mask, maskWidth, x, y, clip);
     job.destination = target.at(clip.left, clip.top);
     job.destinationStride = target.width;
-    blendKernels().largerCoverage(job);
+    blendLoops().largerCoverage(job);
 }
 
 void VFBlender::drawBitmap8To32(int x, int y, const VFBitmap* dst, unsigned char* mask, int maskWidth,
                                 int maskHeight, unsigned int color) {
     const ColourView target = ColourView::of(dst);
     if (!target || mask == nullptr) return;
-    const Clip clip = clipPlacement(x, y, maskWidth, maskHeight, target.width, target.height);
+    const Box clip = clipPlacement(x, y, maskWidth, maskHeight, target.width, target.height);
     if (clip.empty()) return;
     BlendJob job = copyJob(mask, maskWidth, x, y, clip);
     // Deliberate: the run starts at a pixel count taken as bytes, so it lies in the first quarter of the
@@ -68,7 +68,7 @@ void VFBlender::drawBitmap8To32(int x, int y, const VFBitmap* dst, unsigned char
     job.destination = target.data + target.width * clip.top + clip.left;
     job.destinationStride = target.width;
     job.color = color;
-    blendKernels().solidColour(job);
+    blendLoops().solidColour(job);
 }
 
 }  // namespace VFontEffect

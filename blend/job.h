@@ -1,13 +1,13 @@
 #pragma once
 
-#include "blend/clip.h"
-#include "blend/kernels.h"
+#include "blend/blend_loops.h"
+#include "core/box.h"
 #include "core/views.h"
 
 namespace VFontEffect::internal {
 
 /// A job on the clipped part of a colour destination, with nothing to paint there yet.
-inline BlendJob jobOn(const ColourView& target, const Clip& clip) {
+inline BlendJob jobOn(const ColourView& target, const Box& clip) {
     BlendJob job = {};
     job.destination = target.at(clip.left, clip.top);
     job.destinationStride = target.width * kColourBytes;

@@ -1,7 +1,7 @@
 #include <cstdint>
 
+#include "blend/blend_loops.h"
 #include "blend/job.h"
-#include "blend/kernels.h"
 #include "core/blend_modes.h"
 #include "core/views.h"
 #include "voreleffect/VFBlender.h"
@@ -12,11 +12,11 @@ using namespace internal;
 
 namespace {
 
-void blendMask(BlendKernel kernel, int x, int y, const VFBitmap* dst, const unsigned char* mask,
-               int width, int height, int maskStride, uint32_t color) {
+void blendMask(BlendLoop kernel, int x, int y, const VFBitmap* dst, const unsigned char* mask, int width,
+               int height, int maskStride, uint32_t color) {
     const ColourView target = ColourView::of(dst);
     if (!target || mask == nullptr || maskStride < 0) return;
-    const Clip clip = clipPlacement(x, y, width, height, target.width, target.height);
+    const Box clip = clipPlacement(x, y, width, height, target.width, target.height);
     if (clip.empty()) return;
     BlendJob job = jobOn(target, clip);
     job.mask = mask + (clip.top - y) * maskStride + (clip.left - x);
@@ -45,22 +45,22 @@ void VFBlender::drawBitmapBlend8(int x, int y, const VFBitmap* dst, unsigned cha
 
 void VFBlender::blendSrcOver8To32(int x, int y, const VFBitmap* dst, unsigned char* mask, int width,
                                   int height, int maskStride, unsigned int color) {
-    blendMask(blendKernels().srcOverMask, x, y, dst, mask, width, height, maskStride, color);
+    blendMask(blendLoops().srcOverMask, x, y, dst, mask, width, height, maskStride, color);
 }
 
 void VFBlender::blendDstOver8To32(int x, int y, const VFBitmap* dst, unsigned char* mask, int width,
                                   int height, int maskStride, unsigned int color) {
-    blendMask(blendKernels().dstOverMask, x, y, dst, mask, width, height, maskStride, color);
+    blendMask(blendLoops().dstOverMask, x, y, dst, mask, width, height, maskStride, color);
 }
 
 void VFBlender::blendDstOver8To32NSA(int x, int y, const VFBitmap* dst, unsigned char* mask, int width,
                                      int height, int maskStride, unsigned int color) {
-    blendMask(blendKernels().dstOverGate, x, y, dst, mask, width, height, maskStride, color);
+    blendMask(blendLoops().dstOverGate, x, y, dst, mask, width, height, maskStride, color);
 }
 
 void VFBlender::blendDstOverSA8To32(int x, int y, const VFBitmap* dst, unsigned char* mask, int width,
                                     int height, int maskStride, unsigned int color) {
-    blendMask(blendKernels().dstOverClip, x, y, dst, mask, width, height, maskStride, color);
+    blendMask(blendLoops().dstOverClip, x, y, dst, mask, width, height, maskStride, color);
 }
 
 }  // namespace VFontEffect

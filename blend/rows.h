@@ -3,7 +3,7 @@
 #include <cstdint>
 #include <cstring>
 
-#include "blend/kernels.h"
+#include "blend/blend_loops.h"
 #include "blend/rules.h"
 
 /// The row driver of all blending kernels: the loop over rows and pixels, empty stretches, and the tail.
@@ -36,23 +36,23 @@ struct Place {
 /// Whether the mask is 0 for kCount pixels.
 template <int64_t kCount>
 VOREL_INLINE bool hasEmptyMask(const Place& place) {
-    if constexpr (kCount == kBytes) return allZero(load<Bytes>(place.mask()));
+    if constexpr (kCount == kBytes) return allZero(load<U8s>(place.mask()));
     static constexpr uint8_t kNone[kCount] = {};
     return std::memcmp(place.mask(), kNone, kCount) == 0;
 }
 
 /// Whether the mask is full for kBytes pixels.
 VOREL_INLINE bool hasFullMask(const Place& place) {
-    return allZero(~load<Bytes>(place.mask()));
+    return allZero(~load<U8s>(place.mask()));
 }
 
 /// Whether kCount pixels are nothing but zeros; the first of them mostly tell.
 template <int64_t kCount>
 VOREL_INLINE bool isClear(const uint8_t* pixels) {
-    Bytes all = load<Bytes>(pixels);
+    U8s all = load<U8s>(pixels);
     if (!allZero(all)) return false;
     for (int64_t i = kBytes; i < 4 * kCount; i += kBytes)
-        all |= load<Bytes>(pixels + i);
+        all |= load<U8s>(pixels + i);
     return allZero(all);
 }
 

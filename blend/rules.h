@@ -1,6 +1,6 @@
 #pragma once
 
-#include "blend/pixels.h"
+#include "simd/pixels.h"
 
 /// Every per-pixel rule of the blending kernels, once, over vectors of pixels.
 ///

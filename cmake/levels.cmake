@@ -1,5 +1,5 @@
 # One object library of the inner loops for each level, from the plainest to the best: the names and
-# their order are those of core/cpu_level.h.
+# their order are those of simd/cpu_level.h.
 check_cxx_symbol_exists(__x86_64__ cstddef VOREL_FOR_X86_64)
 check_cxx_symbol_exists(__aarch64__ cstddef VOREL_FOR_AARCH64)
 if(VOREL_FOR_X86_64)

@@ -5,7 +5,7 @@ namespace VFontEffect::internal {
 /// Sizes beyond this many pixels are no text effect, and would take gigabytes or minutes.
 constexpr float kLargestSizePx = 256.0F;
 
-inline bool isAbsurd(float sizePx) {
+inline bool exceedsSizeLimit(float sizePx) {
     return sizePx > kLargestSizePx;
 }
 

@@ -3,7 +3,7 @@
 #include <cstring>
 #include <limits>
 
-#include "cores/disc_shape.h"
+#include "ops/dilate/disc_shape.h"
 #include "voreleffect/VFECore.h"
 
 namespace VFontEffect {

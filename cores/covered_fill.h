@@ -16,7 +16,7 @@ constexpr float kSmallestScale = 0.1F;
 template <class Fill>
 void fillCovered(const CoverageBox& box, const VFBitmap* destination, Fill fill) {
     const PlacedTarget target(destination, box.left, box.top);
-    const Clip seen = target.seen(wholeOf(box));
+    const Box seen = target.seen(wholeOf(box));
     if (!seen.empty()) fill(target.jobOn(seen, box.row(0), box.mask.width));
 }
 

@@ -7,13 +7,13 @@
 #include "core/numeric.h"
 #include "core/pixel_buffer.h"
 #include "core/size_limit.h"
-#include "cores/blur.h"
-#include "cores/fill_kernels.h"
-#include "cores/glow_kernels.h"
-#include "cores/growth.h"
 #include "cores/paint_input.h"
 #include "cores/placed_target.h"
-#include "cores/stop_ramp.h"
+#include "ops/blur/blur_plan.h"
+#include "ops/grow/growth_loops.h"
+#include "ops/grow/growth_plan.h"
+#include "ops/ramp/ramp_loops.h"
+#include "ops/ramp/stop_ramp.h"
 
 namespace VFontEffect::internal {
 namespace {
@@ -36,13 +36,13 @@ int blurRadius(int pad) {
 struct Shape {
     int passes;
     int radius;
-    Window image;
-    Window blurred;  // the part of the image that is not its border
+    Box image;
+    Box blurred;  // the part of the image that is not its border
 
     static Shape of(const CoverageBox& box, int pad) {
         const int radius = blurRadius(pad);
-        const Window image = grown(wholeOf(box), 2 * int64_t{pad});
-        return {growthPasses(pad), radius, image, grown(image, -int64_t{radius})};
+        const Box image = expanded(wholeOf(box), 2 * int64_t{pad});
+        return {growthPasses(pad), radius, image, expanded(image, -int64_t{radius})};
     }
 };
 
@@ -55,7 +55,7 @@ class ValueColours {
         if (mIsOne) return;
         unsigned int table[kTableSize];
         fillGlowTable(record, kFadeStart, kCurve, table);
-        fillKernels().premultiplied(table + 1, kTableLast, mPixels);
+        rampLoops().premultiplied(table + 1, kTableLast, mPixels);
         std::reverse(mPixels, mPixels + kTableLast);
     }
 
@@ -64,10 +64,10 @@ class ValueColours {
     /// product(255, alpha) = alpha.
     void paint(BlendJob job, uint8_t* values) const {
         job.mask = values;
-        if (!mIsOne) return glowKernels().paint({job, mPixels});
-        glowKernels().fade(values, job.maskStride * (job.height - 1) + job.width, mColor >> 24);
+        if (!mIsOne) return growthLoops().paint({job, mPixels});
+        growthLoops().fade(values, job.maskStride * (job.height - 1) + job.width, mColor >> 24);
         job.color = mColor | 0xFF000000U;
-        blendKernels().dstOverMask(job);
+        blendLoops().dstOverMask(job);
     }
 
   private:
@@ -77,19 +77,19 @@ class ValueColours {
 };
 
 /// The coverage, or its inverse, with a margin that is empty or full, and so is the frame.
-Growth coverageToGrow(const CoverageBox& box, uint8_t flip, int64_t margin) {
+Growth coverageToGrow(const CoverageBox& box, uint8_t invertMask, int64_t margin) {
     Growth growth(box.width + 2 * margin, box.height + 2 * margin);
     if (!growth) return growth;
     const auto side = static_cast<size_t>(margin + 1);
     for (int64_t y = -1 - margin; y <= box.height + margin; ++y) {
         uint8_t* const row = growth.row(y + margin) - 1;
         if (y < 0 || y >= box.height) {
-            std::memset(row, flip, 2 * side + static_cast<size_t>(box.width));
+            std::memset(row, invertMask, 2 * side + static_cast<size_t>(box.width));
             continue;
         }
-        std::memset(row, flip, side);
-        glowKernels().copyFlipped(box.row(y), box.width, flip, row + side);
-        std::memset(row + side + box.width, flip, side);
+        std::memset(row, invertMask, side);
+        growthLoops().copyInverted(box.row(y), box.width, invertMask, row + side);
+        std::memset(row + side + box.width, invertMask, side);
     }
     return growth;
 }
@@ -97,14 +97,14 @@ Growth coverageToGrow(const CoverageBox& box, uint8_t flip, int64_t margin) {
 /// Grows, blurs and paints the part of the glow in the window. Returns false, with nothing painted, when
 /// memory ran out.
 bool paintBlurred(const CoverageBox& box, const Shape& shape, const PlacedTarget& target,
-                  const Window& window, const ValueColours& colours, Sense sense) {
-    const bool inverted = sense == Sense::inverted;
-    const uint8_t flip = inverted ? 0xFF : 0;
+                  const Box& window, const ValueColours& colours, GlowSide sense) {
+    const bool inverted = sense == GlowSide::inside;
+    const uint8_t invertMask = inverted ? 0xFF : 0;
     // Coverage spreads by a pixel a pass. Around its inverse everything is full, and stays so.
     const int64_t margin = inverted ? 0 : shape.passes;
-    Growth growth = coverageToGrow(box, flip, margin);
+    Growth growth = coverageToGrow(box, invertMask, margin);
     if (!growth) return false;
-    growth.grow(shape.passes, flip);
+    growth.grow(shape.passes, invertMask);
     growth.finish();
 
     // Deliberate: between the passes of an inner glow the columns that the first pass does not reach are
@@ -113,9 +113,9 @@ bool paintBlurred(const CoverageBox& box, const Shape& shape, const PlacedTarget
     const FullColumns full =
         inverted ? FullColumns{shape.image.left + open, shape.image.right - open} : kNoFullColumns;
     return blurDownThenAcross(
-        glowKernel(shape.radius), growth.source(flip), moved(window, margin, margin), full, inverted,
-        [&](int64_t y, int64_t rows, uint8_t* values, int64_t stride) {
-            const Window part = {window.left, y - margin, window.right, y - margin + rows};
+        glowWeights(shape.radius), growth.source(invertMask), translated(window, margin, margin), full,
+        inverted, [&](int64_t y, int64_t rows, uint8_t* values, int64_t stride) {
+            const Box part = {window.left, y - margin, window.right, y - margin + rows};
             colours.paint(target.jobOn(part, values, stride), values);
         });
 }
@@ -125,28 +125,28 @@ bool paintBlurred(const CoverageBox& box, const Shape& shape, const PlacedTarget
 /// Deliberate: around an inner glow the pixels that the blur does not reach are opaque white, not
 /// transparent. They are painted, and the text fill or the composite clips them away.
 void paintBorder(const Shape& shape, const PlacedTarget& target, const uint8_t* full) {
-    const Window& outside = shape.image;
-    const Window& inside = shape.blurred;
-    const Window sides[] = {{outside.left, outside.top, outside.right, inside.top},
-                            {outside.left, inside.bottom, outside.right, outside.bottom},
-                            {outside.left, inside.top, inside.left, inside.bottom},
-                            {inside.right, inside.top, outside.right, inside.bottom}};
-    for (const Window& side : sides) {
-        const Window seen = target.seen(side);
+    const Box& outside = shape.image;
+    const Box& inside = shape.blurred;
+    const Box sides[] = {{outside.left, outside.top, outside.right, inside.top},
+                         {outside.left, inside.bottom, outside.right, outside.bottom},
+                         {outside.left, inside.top, inside.left, inside.bottom},
+                         {inside.right, inside.top, outside.right, inside.bottom}};
+    for (const Box& side : sides) {
+        const Box seen = target.seen(side);
         if (seen.empty()) continue;
         BlendJob job = target.jobOn(seen, full, 0);
         job.color = 0xFFFFFFFFU;
-        blendKernels().dstOverGate(job);
+        blendLoops().dstOverGate(job);
     }
 }
 
 /// Paints the corners of an inner glow without a blur: growth clears the first and the last column but
 /// for their ends.
 void paintCorners(const Shape& shape, const PlacedTarget& target, const ValueColours& colours) {
-    const Window& image = shape.image;
+    const Box& image = shape.image;
     for (const int64_t x : {image.left, image.right - 1}) {
         for (const int64_t y : {image.top, image.bottom - 1}) {
-            const Window seen = target.seen({x, y, x + 1, y + 1});
+            const Box seen = target.seen({x, y, x + 1, y + 1});
             uint8_t strongest = 255;
             if (!seen.empty()) colours.paint(target.jobOn(seen, &strongest, 0), &strongest);
         }
@@ -155,19 +155,19 @@ void paintCorners(const Shape& shape, const PlacedTarget& target, const ValueCol
 
 }  // namespace
 
-void paintGlow(const VFECore::ParamPostProcessing* params, const GlowRecord& record, Sense sense) {
+void paintGlow(const VFECore::ParamPostProcessing* params, const GlowRecord& record, GlowSide sense) {
     const CoverageBox box = coverageOf(params);
     const int pad = saturateToInt(int64_t{toInt(record.sizePx)} + 1);
     // With no padding at all (a size of -1) the image would be clear, as it is with a size of 0.
-    if (!box || isAbsurd(record.sizePx) || pad <= 0 || record.sizePx == 0.0F) return;
+    if (!box || exceedsSizeLimit(record.sizePx) || pad <= 0 || record.sizePx == 0.0F) return;
 
     const Shape shape = Shape::of(box, pad);
     const PlacedTarget target(params->dstBitmap, box.left, box.top);
-    const Window seen = target.seen(shape.image);
+    const Box seen = target.seen(shape.image);
     if (seen.empty()) return;
-    const Window window = target.seen(shape.blurred);
+    const Box window = target.seen(shape.blurred);
     const ValueColours colours(record);
-    if (sense == Sense::plain) {
+    if (sense == GlowSide::outside) {
         if (!window.empty()) paintBlurred(box, shape, target, window, colours, sense);
         return;
     }

@@ -7,8 +7,8 @@
 /// The machinery of both glows.
 namespace VFontEffect::internal {
 
-/// Whether a glow lies around the coverage or around its inverse.
-enum class Sense { plain, inverted };
+/// Which side of the outline the glow lies on: around the coverage, or around its inverse.
+enum class GlowSide { outside, inside };
 
 /// What a glow reads from its record.
 struct GlowRecord {
@@ -34,6 +34,6 @@ int glowReach(const GlowRecord& record);
 /// The colours from the text outwards, straight; see VFOuterGlow::makeColorLUT.
 void fillGlowTable(const GlowRecord& record, float fadeStart, int curve, unsigned int* table);
 
-void paintGlow(const VFECore::ParamPostProcessing* params, const GlowRecord& record, Sense sense);
+void paintGlow(const VFECore::ParamPostProcessing* params, const GlowRecord& record, GlowSide sense);
 
 }  // namespace VFontEffect::internal

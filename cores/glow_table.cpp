@@ -4,7 +4,7 @@
 
 #include "core/numeric.h"
 #include "cores/glow.h"
-#include "cores/stop_ramp.h"
+#include "ops/ramp/stop_ramp.h"
 
 namespace VFontEffect::internal {
 namespace {

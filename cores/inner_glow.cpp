@@ -1,7 +1,7 @@
 #include "core/effect_types.h"
 #include "cores/glow.h"
-#include "cores/growth.h"
 #include "cores/property_copy.h"
+#include "ops/grow/growth_plan.h"
 #include "voreleffect/VFECore.h"
 
 namespace VFontEffect {
@@ -37,7 +37,7 @@ void VFInnerGlow::increaseByBoxFilter(unsigned char* mask, int passes, int width
 }
 
 void VFInnerGlow::doPostProcessing(ParamPostProcessing* params) {
-    if (mProperty != nullptr) paintGlow(params, GlowRecord::of(mProperty), Sense::inverted);
+    if (mProperty != nullptr) paintGlow(params, GlowRecord::of(mProperty), GlowSide::inside);
 }
 
 }  // namespace VFontEffect

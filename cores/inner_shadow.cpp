@@ -2,11 +2,11 @@
 
 #include "core/effect_types.h"
 #include "core/size_limit.h"
-#include "cores/blur.h"
 #include "cores/paint_input.h"
 #include "cores/placed_target.h"
 #include "cores/property_copy.h"
 #include "cores/shadow_offset.h"
+#include "ops/blur/blur_plan.h"
 #include "voreleffect/VFECore.h"
 
 namespace VFontEffect {
@@ -52,10 +52,10 @@ int VFInnerShadow::getOffset() {
 
 void VFInnerShadow::doPostProcessing(ParamPostProcessing* params) {
     const CoverageBox box = coverageOf(params);
-    if (!box || mProperty == nullptr || isAbsurd(mProperty->mSize)) return;
+    if (!box || mProperty == nullptr || exceedsSizeLimit(mProperty->mSize)) return;
 
     const PlacedTarget target(params->dstBitmap, box.left, box.top);
-    const Window window = target.seen(wholeOf(box));
+    const Box window = target.seen(wholeOf(box));
     if (window.empty()) return;
     const uint32_t color = mProperty->mColor;
     const int radius = shadowRadius(mProperty->mSize);
@@ -65,9 +65,9 @@ void VFInnerShadow::doPostProcessing(ParamPostProcessing* params) {
         return target.paintBeneath(window, box.row(window.top) + window.left, box.mask.width, color);
     }
 
-    const Window unmoved = moved(window, -int64_t{offset.x}, -int64_t{offset.y});
+    const Box unmoved = translated(window, -int64_t{offset.x}, -int64_t{offset.y});
     blurAcrossThenDown(
-        shadowKernel(radius), sourceOf(box), unmoved,
+        shadowWeights(radius), sourceOf(box), unmoved,
         [&](int64_t y, int64_t rows, const uint8_t* values, int64_t stride) {
             const int64_t top = y + offset.y;
             target.paintBeneath({window.left, top, window.right, top + rows}, values, stride, color);

@@ -3,10 +3,10 @@
 #include "core/effect_types.h"
 #include "core/portable_math.h"
 #include "cores/covered_fill.h"
-#include "cores/fill_kernels.h"
-#include "cores/gradient_table.h"
 #include "cores/paint_input.h"
 #include "cores/property_copy.h"
+#include "ops/ramp/gradient_table.h"
+#include "ops/ramp/ramp_loops.h"
 #include "voreleffect/VFECore.h"
 
 namespace VFontEffect {
@@ -54,7 +54,7 @@ void VFLinearGradient::doPostProcessing(ParamPostProcessing* params) {
     const float step = (256.0F / mProperty->mScale) / lengthAcross(angle, w, h);
     const LinearRamp ramp = {table.pixels(), portableCos(angle) * step, portableSin(angle) * step,
                              w * 0.5F, h * 0.5F};
-    fillCovered(box, params->dstBitmap, [&](const BlendJob& job) { fillKernels().linear(job, ramp); });
+    fillCovered(box, params->dstBitmap, [&](const BlendJob& job) { rampLoops().linear(job, ramp); });
 }
 
 }  // namespace VFontEffect

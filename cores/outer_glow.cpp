@@ -1,7 +1,7 @@
 #include "core/effect_types.h"
 #include "cores/glow.h"
-#include "cores/growth.h"
 #include "cores/property_copy.h"
+#include "ops/grow/growth_plan.h"
 #include "voreleffect/VFECore.h"
 
 namespace VFontEffect {
@@ -37,7 +37,7 @@ void VFOuterGlow::increaseByBoxFilter(unsigned char* mask, int passes, int width
 }
 
 void VFOuterGlow::doPostProcessing(ParamPostProcessing* params) {
-    if (mProperty != nullptr) paintGlow(params, GlowRecord::of(mProperty), Sense::plain);
+    if (mProperty != nullptr) paintGlow(params, GlowRecord::of(mProperty), GlowSide::outside);
 }
 
 }  // namespace VFontEffect

@@ -4,11 +4,11 @@
 #include "core/effect_types.h"
 #include "core/numeric.h"
 #include "core/size_limit.h"
-#include "cores/blur.h"
 #include "cores/paint_input.h"
 #include "cores/placed_target.h"
 #include "cores/property_copy.h"
 #include "cores/shadow_offset.h"
+#include "ops/blur/blur_plan.h"
 #include "voreleffect/VFECore.h"
 
 namespace VFontEffect {
@@ -59,11 +59,11 @@ int VFOuterShadow::getBottomOffset() {
 
 void VFOuterShadow::doPostProcessing(ParamPostProcessing* params) {
     const CoverageBox box = coverageOf(params);
-    if (!box || mProperty == nullptr || isAbsurd(mProperty->mSize)) return;
+    if (!box || mProperty == nullptr || exceedsSizeLimit(mProperty->mSize)) return;
 
     const PlacedTarget target(params->dstBitmap, box.left + mOffsetX, box.top + mOffsetY);
     const int radius = shadowRadius(mProperty->mSize);
-    const Window window = target.seen(grown(wholeOf(box), radius));
+    const Box window = target.seen(expanded(wholeOf(box), radius));
     if (window.empty()) return;
     // Without blur the coverage itself is the shadow.
     const uint32_t color = mProperty->mColor;
@@ -72,7 +72,7 @@ void VFOuterShadow::doPostProcessing(ParamPostProcessing* params) {
     }
 
     blurDownThenAcross(
-        shadowKernel(radius), sourceOf(box), window, kNoFullColumns, false,
+        shadowWeights(radius), sourceOf(box), window, kNoFullColumns, false,
         [&](int64_t y, int64_t rows, const uint8_t* values, int64_t stride) {
             target.paintBeneath({window.left, y, window.right, y + rows}, values, stride, color);
         });

@@ -7,9 +7,9 @@
 #include "core/numeric.h"
 #include "core/pixel_buffer.h"
 #include "cores/covered_fill.h"
-#include "cores/fill_kernels.h"
 #include "cores/paint_input.h"
 #include "cores/property_copy.h"
+#include "ops/ramp/ramp_loops.h"
 #include "voreleffect/VFECore.h"
 
 namespace VFontEffect {
@@ -113,8 +113,7 @@ class TiledRows {
         const Tap rows = mRows.at(y);
         const MixedRow near = mixedRow(rows.near, rows.far);
         const MixedRow far = mixedRow(rows.far, rows.near);
-        fillKernels().mixRows(near, far, rows.nearWeight, rows.farWeight, mOpacity, mSampled,
-                              mRow.data());
+        rampLoops().mixRows(near, far, rows.nearWeight, rows.farWeight, mOpacity, mSampled, mRow.data());
         repeat();
         return mRow.data();
     }
@@ -143,7 +142,7 @@ class TiledRows {
         KeptRow& replaced = mMixed[0].row == other ? mMixed[1] : mMixed[0];
         replaced.row = row;
         const auto* const words = reinterpret_cast<const uint32_t*>(mPattern.at(0, row));
-        fillKernels().mixColumns(words, mTaps.taps(), mSampled, replaced.mixed());
+        rampLoops().mixColumns(words, mTaps.taps(), mSampled, replaced.mixed());
         return replaced.mixed();
     }
 
@@ -207,7 +206,7 @@ void VFPattern::doPostProcessing(ParamPostProcessing* params) {
         for (int64_t y = 0; y < job.height; ++y) {
             BlendJob row = rowOf(job, y);
             row.image = reinterpret_cast<const uint8_t*>(rows.at(y));
-            blendKernels().dstOverWhereCovered(row);
+            blendLoops().dstOverWhereCovered(row);
         }
     });
 }

@@ -2,9 +2,9 @@
 
 #include <cstdint>
 
-#include "blend/clip.h"
+#include "blend/blend_loops.h"
 #include "blend/job.h"
-#include "blend/kernels.h"
+#include "core/box.h"
 #include "core/views.h"
 #include "cores/paint_input.h"
 
@@ -18,15 +18,17 @@ class PlacedTarget {
         : mPixels(ColourView::of(destination)), mLeft(left), mTop(top) {}
 
     /// The part of the picture that lies on the destination; empty for one that cannot be trusted.
-    Clip seen(const Clip& part) const {
-        return common(part, moved({0, 0, mPixels.width, mPixels.height}, -mLeft, -mTop));
+    Box seen(const Box& part) const {
+        return intersection(part, translated({0, 0, mPixels.width, mPixels.height}, -mLeft, -mTop));
     }
 
     /// A job on a part that is seen, with nothing to paint yet.
-    BlendJob jobOn(const Clip& part) const { return internal::jobOn(mPixels, moved(part, mLeft, mTop)); }
+    BlendJob jobOn(const Box& part) const {
+        return internal::jobOn(mPixels, translated(part, mLeft, mTop));
+    }
 
     /// A job that paints through a mask of the part's size.
-    BlendJob jobOn(const Clip& part, const uint8_t* mask, int64_t stride) const {
+    BlendJob jobOn(const Box& part, const uint8_t* mask, int64_t stride) const {
         BlendJob job = jobOn(part);
         job.mask = mask;
         job.maskStride = stride;
@@ -34,10 +36,10 @@ class PlacedTarget {
     }
 
     /// Paints one colour through a mask of the part's size beneath what is there.
-    void paintBeneath(const Clip& part, const uint8_t* mask, int64_t stride, uint32_t color) const {
+    void paintBeneath(const Box& part, const uint8_t* mask, int64_t stride, uint32_t color) const {
         BlendJob job = jobOn(part, mask, stride);
         job.color = color;
-        blendKernels().dstOverMask(job);
+        blendLoops().dstOverMask(job);
     }
 
   private:
@@ -47,7 +49,7 @@ class PlacedTarget {
 };
 
 /// The whole of a box, in its own coordinates.
-inline Clip wholeOf(const CoverageBox& box) {
+inline Box wholeOf(const CoverageBox& box) {
     return {0, 0, box.width, box.height};
 }
 

@@ -1,9 +1,9 @@
 #include "core/effect_types.h"
 #include "cores/covered_fill.h"
-#include "cores/fill_kernels.h"
-#include "cores/gradient_table.h"
 #include "cores/paint_input.h"
 #include "cores/property_copy.h"
+#include "ops/ramp/gradient_table.h"
+#include "ops/ramp/ramp_loops.h"
 #include "voreleffect/VFECore.h"
 
 namespace VFontEffect {
@@ -35,7 +35,7 @@ void VFRadialGradient::doPostProcessing(ParamPostProcessing* params) {
     const auto w = static_cast<float>(box.width);
     const float step = (256.0F / w + 256.0F / w) / mProperty->mScale;
     const RadialRamp ramp = {table.pixels(), step, w * 0.5F, static_cast<float>(box.height) * 0.5F};
-    fillCovered(box, params->dstBitmap, [&](const BlendJob& job) { fillKernels().radial(job, ramp); });
+    fillCovered(box, params->dstBitmap, [&](const BlendJob& job) { rampLoops().radial(job, ramp); });
 }
 
 }  // namespace VFontEffect

@@ -7,11 +7,11 @@
 #include "core/line_buffer.h"
 #include "core/numeric.h"
 #include "core/size_limit.h"
-#include "cores/dilation.h"
-#include "cores/disc_shape.h"
 #include "cores/paint_input.h"
 #include "cores/placed_target.h"
 #include "cores/property_copy.h"
+#include "ops/dilate/dilation_loops.h"
+#include "ops/dilate/disc_shape.h"
 #include "voreleffect/VFBlender.h"
 #include "voreleffect/VFECore.h"
 
@@ -29,12 +29,12 @@ constexpr int64_t kBandRows = 32;
 
 /// The part of an outline that at least one of the targets shows, in the coordinates of the bordered
 /// source.
-Clip visiblePart(const CoverageBox& box, int64_t reach, const VFECore::ParamPostProcessing& params) {
-    const Clip bordered = {0, 0, box.width + 2 * kBorder, box.height + 2 * kBorder};
-    Clip visible = {};
+Box visiblePart(const CoverageBox& box, int64_t reach, const VFECore::ParamPostProcessing& params) {
+    const Box bordered = {0, 0, box.width + 2 * kBorder, box.height + 2 * kBorder};
+    Box visible = {};
     for (const VFBitmap* target : {params.dstBitmap, params.subDstBitmap}) {
         const PlacedTarget placed(target, box.left - kBorder, box.top - kBorder);
-        visible = enclosing(visible, placed.seen(grown(bordered, reach)));
+        visible = boundingBox(visible, placed.seen(expanded(bordered, reach)));
     }
     return visible;
 }
@@ -42,28 +42,28 @@ Clip visiblePart(const CoverageBox& box, int64_t reach, const VFECore::ParamPost
 /// The coverage, or its inverse, grown by a disc; empty when memory ran out.
 class GrownCoverage {
   public:
-    GrownCoverage(const CoverageBox& box, const DiscShape& disc, const Clip& part, uint8_t flip)
-        : mDilation(dilationOf(box, disc, part, flip)),
-          mMemory(dilationKernels().memoryBytes(mDilation)) {
+    GrownCoverage(const CoverageBox& box, const DiscShape& disc, const Box& part, uint8_t invertMask)
+        : mDilation(dilationOf(box, disc, part, invertMask)),
+          mMemory(dilationLoops().memoryBytes(mDilation)) {
         mDilation.memory = mMemory.data();
-        if (mMemory) dilationKernels().begin(mDilation);
+        if (mMemory) dilationLoops().begin(mDilation);
     }
 
     explicit operator bool() const { return static_cast<bool>(mMemory); }
     const Dilation& dilation() const { return mDilation; }
     uint8_t* rows(int64_t y, int64_t count) const {
-        return dilationKernels().dilateRows(mDilation, y, count);
+        return dilationLoops().dilateRows(mDilation, y, count);
     }
 
   private:
-    static Dilation dilationOf(const CoverageBox& box, const DiscShape& disc, const Clip& part,
-                               uint8_t flip) {
+    static Dilation dilationOf(const CoverageBox& box, const DiscShape& disc, const Box& part,
+                               uint8_t invertMask) {
         Dilation dilation = {};
         dilation.box = box.row(0);
         dilation.boxStride = box.mask.width;
         dilation.width = box.width + 2 * kBorder;
         dilation.height = box.height + 2 * kBorder;
-        dilation.flip = flip;
+        dilation.invertMask = invertMask;
         dilation.disc = &disc;
         dilation.left = std::min<int64_t>(part.left, 0);
         dilation.right = std::max(part.right, dilation.width);
@@ -80,7 +80,7 @@ class GrownCoverage {
 /// within the disc's radius of the edge on both sides of it.
 class Outline {
   public:
-    Outline(const CoverageBox& box, const DiscShape& disc, const Clip& part, int position)
+    Outline(const CoverageBox& box, const DiscShape& disc, const Box& part, int position)
         : mGrown(box, disc, part, position == kStrokeInside ? kInverse : kCoverage) {
         if (position == kStrokeCentre) mInverse.emplace(box, disc, part, kInverse);
     }
@@ -93,7 +93,7 @@ class Outline {
 
     uint8_t* band(int64_t y, int64_t count) {
         uint8_t* const band = mGrown.rows(y, count);
-        if (mInverse) dilationKernels().keepSmaller(band, mInverse->rows(y, count), stride() * count);
+        if (mInverse) dilationLoops().keepSmaller(band, mInverse->rows(y, count), stride() * count);
         return band;
     }
 
@@ -128,12 +128,12 @@ int VFStroke::getOffset() {
 
 void VFStroke::doPostProcessing(ParamPostProcessing* params) {
     const CoverageBox box = coverageOf(params);
-    if (!box || mProperty == nullptr || isAbsurd(mProperty->mSize)) return;
+    if (!box || mProperty == nullptr || exceedsSizeLimit(mProperty->mSize)) return;
     const bool centred = mProperty->mPosition == kStrokeCentre;
     const bool outside = mProperty->mPosition == kStrokeOutside;
     const DiscShape disc(centred ? mProperty->mSize * 0.5F : mProperty->mSize);
     if (!disc) return;
-    const Clip visible = visiblePart(box, disc.reach, *params);
+    const Box visible = visiblePart(box, disc.reach, *params);
     if (visible.empty()) return;
     Outline outline(box, disc, visible, centred || outside ? mProperty->mPosition : kStrokeInside);
     if (!outline) return;

@@ -1,6 +1,6 @@
 #include <cstdint>
 
-#include "blend/kernels.h"
+#include "blend/blend_loops.h"
 #include "core/views.h"
 #include "voreleffect/VFEffect.h"
 
@@ -24,7 +24,7 @@ void mergeLayers(const ColourView& destination, const ColourView& outer, const M
     job.mask = mask.data;
     job.width = destination.width * destination.height;
     job.height = 1;
-    blendKernels().mixByCoverage(job);
+    blendLoops().mixByCoverage(job);
 }
 
 }  // namespace

@@ -3,8 +3,8 @@
 #include <algorithm>
 #include <cstddef>
 
-#include "cores/dot_blur.h"
-#include "cores/running_blur.h"
+#include "ops/blur/difference_blur.h"
+#include "ops/blur/dot_blur.h"
 
 namespace vorel_test {
 namespace {
@@ -40,7 +40,7 @@ std::vector<uint8_t> inverseBlurredBy(const BlurCase& which) {
 }
 
 void append(const TermList& list, int sign, std::vector<Term>& terms) {
-    const int64_t lineBytes = kRunningPixelBytes * blurKernels().vectorBytes;
+    const int64_t lineBytes = kDifferencePixelBytes * dotLoops().vectorBytes;
     const int64_t rowBytes = kLinesOfRow * lineBytes;
     for (int64_t i = 0; i < list.count; ++i) {
         const int64_t offset = list.offsets[i];
@@ -58,7 +58,7 @@ std::vector<uint8_t> blurredByDots(const BlurCase& blur) {
 }
 
 std::vector<uint8_t> blurredByRunningSums(const BlurCase& blur) {
-    return blurredBy<RunningDownThenAcross>(blur);
+    return blurredBy<DifferenceDownThenAcross>(blur);
 }
 
 std::vector<uint8_t> inverseBlurredByDots(const BlurCase& blur) {
@@ -66,13 +66,13 @@ std::vector<uint8_t> inverseBlurredByDots(const BlurCase& blur) {
 }
 
 std::vector<uint8_t> inverseBlurredByRunningSums(const BlurCase& blur) {
-    return inverseBlurredBy<RunningAcrossThenDown>(blur);
+    return inverseBlurredBy<DifferenceAcrossThenDown>(blur);
 }
 
-TermsOfKernel termsOf(const BlurKernel& kernel) {
+TermsOfKernel termsOf(const BlurWeights& kernel) {
     const KernelTerms memory(kernel);
     if (!memory) return {};
-    const RunningTerms& terms = *memory;
+    const DifferenceTerms& terms = *memory;
     TermsOfKernel result = {terms.order, terms.pairs.distance, terms.pairs.areDifferences, {}};
     append(terms.added, 1, result.terms);
     append(terms.takenAway, -1, result.terms);

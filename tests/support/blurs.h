@@ -3,17 +3,17 @@
 #include <cstdint>
 #include <vector>
 
-#include "cores/blur_kernel.h"
-#include "cores/blur_window.h"
+#include "ops/blur/blur_weights.h"
+#include "ops/blur/reached_source.h"
 #include "voreleffect/VFExport.h"
 
 /// The two methods of the blur, each by itself: the library chooses one by the radius and the level.
 namespace vorel_test {
 
 struct BlurCase {
-    const VFontEffect::internal::BlurKernel& kernel;
+    const VFontEffect::internal::BlurWeights& kernel;
     VFontEffect::internal::BlurSource source;
-    VFontEffect::internal::Window window;
+    VFontEffect::internal::Box window;
     VFontEffect::internal::FullColumns full;
     bool inverted;
 };
@@ -40,6 +40,6 @@ struct TermsOfKernel {
     bool pairsAreDifferences;
     std::vector<Term> terms;
 };
-VF_API TermsOfKernel termsOf(const VFontEffect::internal::BlurKernel& kernel);
+VF_API TermsOfKernel termsOf(const VFontEffect::internal::BlurWeights& kernel);
 
 }  // namespace vorel_test

@@ -36,7 +36,7 @@ std::string nameOf(CpuLevel level) {
 
 }  // namespace vorel_test
 
-// In the place of core/chosen_level.cpp.
+// In the place of simd/chosen_level.cpp.
 namespace VFontEffect::internal {
 
 CpuLevel chosenLevel() {

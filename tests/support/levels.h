@@ -3,7 +3,7 @@
 #include <string>
 #include <vector>
 
-#include "core/cpu_level.h"
+#include "simd/cpu_level.h"
 #include "voreleffect/VFExport.h"
 
 /// The tests run on a library whose level of the instruction set is set from here, so that one process

@@ -203,7 +203,7 @@ std::vector<uint8_t> dilated(const std::vector<uint8_t>& source, int width, int 
     return plane.values;
 }
 
-std::vector<uint32_t> shadowKernel(int radius) {
+std::vector<uint32_t> shadowWeights(int radius) {
     std::vector<uint32_t> kernel{100};
     const float d = static_cast<float>(radius) * static_cast<float>(radius) / kLn100;
     for (int i = 1; i <= radius; ++i) {
@@ -213,7 +213,7 @@ std::vector<uint32_t> shadowKernel(int radius) {
     return kernel;
 }
 
-std::vector<int32_t> glowKernel(int radius) {
+std::vector<int32_t> glowWeights(int radius) {
     std::vector<int32_t> kernel{128};
     const float d = static_cast<float>(radius * radius) / kLn100;
     for (int i = 1; i <= radius; ++i) {
@@ -375,7 +375,7 @@ void paintOuterShadow(Picture& dst, const Mask& mask, Box text, float angle, flo
     if (text.right + 2 * r + move.x < 0 || text.left - 2 * r + move.x >= dst.width) return;
     if (text.bottom + 2 * r + move.y < 0 || text.top - 2 * r + move.y >= dst.height) return;
 
-    const std::vector<uint32_t> kernel = shadowKernel(static_cast<int>(r));
+    const std::vector<uint32_t> kernel = shadowWeights(static_cast<int>(r));
     const int64_t sum = totalOf(kernel);
     const Plane<uint8_t> mid = padded(mask, text, 2 * r, 2 * r, 0, false);
     Plane<uint8_t> shadow(mid.width, mid.height);
@@ -415,7 +415,7 @@ void paintInnerShadow(Picture& dst, const Mask& mask, Box text, float angle, flo
         return;
     }
 
-    const std::vector<uint32_t> kernel = shadowKernel(static_cast<int>(r));
+    const std::vector<uint32_t> kernel = shadowWeights(static_cast<int>(r));
     const int64_t sum = totalOf(kernel);
     const Plane<uint8_t> wide = padded(mask, text, r, 0, 0, false);
     Plane<uint8_t> inverse(wide.width, wide.height);
@@ -463,7 +463,7 @@ void paintGlow(Picture& dst, const Mask& mask, Box text, float size, uint32_t co
     boxFilter(grown.values, passes, static_cast<int>(grown.width), static_cast<int>(grown.height));
 
     const int64_t r = truncated(static_cast<float>(pad) * 0.9F);
-    const std::vector<int32_t> kernel = glowKernel(static_cast<int>(r));
+    const std::vector<int32_t> kernel = glowWeights(static_cast<int>(r));
     const int64_t total = totalOf(kernel);
     const auto normalised = [&](int64_t weighted) {
         return inner ? (255 * total - weighted) / total : weighted / total;

@@ -69,10 +69,10 @@ std::vector<uint8_t> dilated(const std::vector<uint8_t>& source, int width, int 
                              const CircleKernel& kernel, bool inverse, int firstRow, int endRow);
 
 /// Gaussian weights 0 to R on a scale of 100.
-std::vector<uint32_t> shadowKernel(int radius);
+std::vector<uint32_t> shadowWeights(int radius);
 
 /// Gaussian weights 0 to r on a scale of 128.
-std::vector<int32_t> glowKernel(int radius);
+std::vector<int32_t> glowWeights(int radius);
 
 /// The 257 straight colours of a glow, from the text (0) to the end of the glow (256).
 std::vector<uint32_t> glowColours(float size, uint32_t color, const std::vector<Stop>& stops,

@@ -1,0 +1,312 @@
+#include "ops/blur/difference_loops.h"
+
+#include <cstdint>
+#include <cstring>
+
+#include "ops/blur/quotients.h"
+#include "ops/blur/source_strip.h"
+#include "simd/lanes.h"
+#include "simd/unrolled.h"
+
+/// Wide blurs by running sums.
+///
+/// Between neighbouring results a sum changes by the first difference of the kernel over the taps, that
+/// one by the second difference, and so on. The weights are whole numbers that rise to 100 or 128 and
+/// fall again, whatever the radius: their second difference is hardly anything but -1, 0 and 1, and its
+/// absolute values add up to a fraction of the taps; for smaller radii so do those of the third. A
+/// result takes as many additions of 16 bits, and two or three more to add up the differences. Where two
+/// taps at a fixed distance have one sign, or opposite ones, a line of their sums, or differences, made
+/// once for all results, counts for both.
+///
+/// Exactness: all differences are whole numbers. The first one is at most 255 * 128 and fits in 16 bits
+/// with its sign, however the higher ones wrap; sums have 32 bits.
+///
+/// Cost: 20 to 40 additions a pixel and pass up to a radius of 40, 60 at 100. Lanes are columns. The
+/// results are transposed in squares, so that lanes are rows then, and the pass across is this one
+/// again.
+namespace VFontEffect::internal::VOREL_LEVEL {
+namespace {
+
+constexpr int64_t kLineBytes = kDifferencePixelBytes * kBytes;
+constexpr int64_t kRowBytes = kLinesOfRow * kLineBytes;
+
+/// The halves of a line.
+struct Line {
+    U16s left;
+    U16s right;
+
+    static VOREL_INLINE Line at(const uint8_t* line) {
+        return {loadAligned<U16s>(line), loadAligned<U16s>(line + kBytes)};
+    }
+    VOREL_INLINE void storeAt(uint8_t* line) const {
+        store(line, left);
+        store(line + kBytes, right);
+    }
+    VOREL_INLINE void add(const Line& other) {
+        left += other.left;
+        right += other.right;
+    }
+    VOREL_INLINE void subtract(const Line& other) {
+        left -= other.left;
+        right -= other.right;
+    }
+};
+
+// --- Lines ------------------------------------------------------------------------------------------
+
+/// The rows of the strip that hold anything but 0, from `first` to `end` - 1.
+struct RowExtent {
+    int64_t first;
+    int64_t end;
+
+    static RowExtent of(const SourceStrip& strip) {
+        RowExtent ink = {0, strip.height};
+        while (ink.first < ink.end && allZero(strip.row(ink.first)))
+            ++ink.first;
+        while (ink.end > ink.first && allZero(strip.row(ink.end - 1)))
+            --ink.end;
+        return ink;
+    }
+};
+
+/// The rows of taps and pairs from row `top` of the source on.
+struct Rows {
+    uint8_t* lines;
+    int64_t top;
+
+    VOREL_INLINE uint8_t* at(int64_t y) const { return lines + (y - top) * kRowBytes; }
+    void clear(int64_t first, int64_t end) const {
+        std::memset(at(first), 0, static_cast<size_t>((end - first) * kRowBytes));
+    }
+};
+
+/// Stores the ink's taps, and the pairs from `distance` rows before them on; around them zeros, as far
+/// as four results at a time reach.
+Rows filledRows(const SourceStrip& strip, const RowExtent& ink, const TapPairs& pairs, uint8_t* lines) {
+    const Rows rows = {lines, ink.first - (pairs.distance + kDifferenceRows - 1)};
+    rows.clear(rows.top, ink.first);
+    rows.clear(ink.end, ink.end + kDifferenceRows - 1);
+    for (int64_t y = ink.first; y < ink.end; ++y) {
+        const U8s row = strip.row(y);
+        const Line taps = {bitCast<U16s>(interleaveLow(row, U8s{})),
+                           bitCast<U16s>(interleaveHigh(row, U8s{}))};
+        taps.storeAt(rows.at(y));
+        uint8_t* const earlier = rows.at(y - pairs.distance);
+        Line pair = Line::at(earlier);
+        if (pairs.areDifferences) {
+            pair.subtract(taps);
+        } else {
+            pair.add(taps);
+        }
+        pair.storeAt(earlier + kLineBytes);
+    }
+    // The last taps have no partners.
+    for (int64_t y = ink.end - pairs.distance; y < ink.end; ++y)
+        Line::at(rows.at(y)).storeAt(rows.at(y) + kLineBytes);
+    return rows;
+}
+
+// --- Sums -------------------------------------------------------------------------------------------
+
+/// The terms of one sign that meet ink: as the results go by, the ones further and further up.
+class TermRange {
+  public:
+    explicit TermRange(const TermList& terms)
+        : mBegin(terms.offsets), mFirst(mBegin + terms.count), mEnd(mFirst) {}
+
+    /// Takes those at `lowest` to `end` - 1, both the starts of rows and not above the ones before.
+    VOREL_INLINE void moveTo(int64_t lowest, int64_t end) {
+        while (mEnd > mBegin && mEnd[-1] >= end)
+            --mEnd;
+        while (mFirst > mBegin && mFirst[-1] >= lowest)
+            --mFirst;
+    }
+    VOREL_INLINE const int32_t* begin() const { return mFirst; }
+    VOREL_INLINE const int32_t* end() const { return mEnd; }
+
+  private:
+    const int32_t* mBegin;
+    const int32_t* mFirst;
+    const int32_t* mEnd;
+};
+
+/// Four rows of differences.
+struct FourLines {
+    Line lines[kDifferenceRows];
+
+    template <class Change>
+    VOREL_INLINE void apply(const TermRange& terms, const uint8_t* memory, int64_t row, Change change) {
+        for (const int32_t* term = terms.begin(); term < terms.end(); ++term) {
+            const uint8_t* const from = memory + (row + *term);
+            unrolled<kDifferenceRows>([&](auto i) VOREL_INLINE_LAMBDA {
+                change(lines[i.value], Line::at(from + i.value * kRowBytes));
+            });
+        }
+    }
+    /// Differences of a lower order, of which `last` is the one before.
+    VOREL_INLINE void addUp(Line& last) {
+        unrolled<kDifferenceRows>([&](auto i) VOREL_INLINE_LAMBDA {
+            last.add(lines[i.value]);
+            lines[i.value] = last;
+        });
+    }
+};
+
+class StripSum {
+  public:
+    StripSum(const DifferenceSum& sum, const Rows& rows, int64_t inkEnd)
+        : mRows(rows),
+          mInkEnd(inkEnd),
+          mOrder(sum.terms.order),
+          mAdded(sum.terms.added),
+          mTakenAway(sum.terms.takenAway),
+          mSecond{},
+          mFirst{},
+          mInverse(splat<F32s>(sum.inverse)),
+          mInvertMask(splat<U8s>(sum.ending.invertMask)) {
+        const uint32_t rounding = sum.ending.roundsUp ? sum.total - 1 : 0;
+        for (U32s& words : mSums)
+            words = splat<U32s>(kNumberBias + rounding);
+    }
+
+    /// The next four rows of results, from row y on.
+    __attribute__((noinline)) void next(int64_t y, U8s* rows) {
+        const int64_t row = (y - mRows.top) * kRowBytes;
+        const int64_t end = (mInkEnd - y) * kRowBytes;
+        mAdded.moveTo(-row, end);
+        mTakenAway.moveTo(-row, end);
+        FourLines four = {};
+        four.apply(mAdded, mRows.lines, row,
+                   [](Line& line, const Line& tap) VOREL_INLINE_LAMBDA { line.add(tap); });
+        four.apply(mTakenAway, mRows.lines, row,
+                   [](Line& line, const Line& tap) VOREL_INLINE_LAMBDA { line.subtract(tap); });
+        if (mOrder == 3) four.addUp(mSecond);
+        four.addUp(mFirst);
+        unrolled<kDifferenceRows>([&](auto i) VOREL_INLINE_LAMBDA {
+            rows[i.value] = quotients(four.lines[i.value]) ^ mInvertMask;
+        });
+    }
+
+  private:
+    VOREL_INLINE U8s quotients(const Line& line) {
+        return pack(quotients<0>(line.left), quotients<2>(line.right));
+    }
+    template <int kFirst>
+    VOREL_INLINE U16s quotients(U16s change) {
+        mSums[kFirst] += extended(interleaveLow(change, change));
+        mSums[kFirst + 1] += extended(interleaveHigh(change, change));
+        return pack(quotient(mSums[kFirst], mInverse), quotient(mSums[kFirst + 1], mInverse));
+    }
+    /// U16s that stand in both halves of their words, with their signs.
+    static VOREL_INLINE U32s extended(U16s twice) { return bitCast<U32s>(bitCast<I32s>(twice) >> 16); }
+
+    Rows mRows;
+    int64_t mInkEnd;
+    int mOrder;
+    TermRange mAdded;
+    TermRange mTakenAway;
+    Line mSecond;
+    Line mFirst;
+    U32s mSums[4];
+    F32s mInverse;
+    U8s mInvertMask;
+};
+
+// --- Squares ------------------------------------------------------------------------------------------
+
+constexpr int64_t kLaneBytes = kBytes < 16 ? kBytes : 16;
+
+/// Two of the steps that transpose kLaneBytes rows of as many lanes, of each 128 bits by themselves. A
+/// step interleaves the upper half of the rows with the lower one and so moves the highest bit of a
+/// byte's row number to the end of its column number; as many steps as bits exchange the two.
+VOREL_INLINE void transposeTwoBits(const U8s* from, U8s* to) {
+    constexpr int64_t kQuarter = kLaneBytes / 4;
+    for (int64_t i = 0; i < kQuarter; ++i) {
+        const U8s low02 = interleaveLow(from[i], from[i + 2 * kQuarter]);
+        const U8s high02 = interleaveHigh(from[i], from[i + 2 * kQuarter]);
+        const U8s low13 = interleaveLow(from[i + kQuarter], from[i + 3 * kQuarter]);
+        const U8s high13 = interleaveHigh(from[i + kQuarter], from[i + 3 * kQuarter]);
+        to[4 * i] = interleaveLow(low02, low13);
+        to[4 * i + 1] = interleaveHigh(low02, low13);
+        to[4 * i + 2] = interleaveLow(high02, high13);
+        to[4 * i + 3] = interleaveHigh(high02, high13);
+    }
+}
+VOREL_INLINE void transposeRows(U8s* rows) {
+    U8s half[kLaneBytes];
+    transposeTwoBits(rows, half);
+    if (kLaneBytes == 4) {
+        std::memcpy(rows, half, sizeof half);
+    } else {
+        transposeTwoBits(half, rows);
+    }
+}
+
+void storeTransposed(U8s* rows, uint8_t* to, int64_t rowStride) {
+    for (int64_t group = 0; group < kBytes; group += kLaneBytes) {
+        transposeRows(rows + group);
+        for (int64_t i = 0; i < kLaneBytes; ++i) {
+            uint8_t bytes[kBytes];
+            store(bytes, rows[group + i]);
+            for (int64_t lane = 0; lane < kBytes; lane += kLaneBytes)
+                std::memcpy(to + (lane + i) * rowStride + group, bytes + lane, kLaneBytes);
+        }
+    }
+}
+
+void storePlain(const U8s* rows, uint8_t* to, int64_t rowStride) {
+    for (int64_t i = 0; i < kBytes; ++i)
+        store(to + i * rowStride, rows[i]);
+}
+
+void transpose(const BlurSource& source, int64_t row, uint8_t* lines) {
+    for (int64_t x = 0; x < source.width; x += kBytes) {
+        const SourceStrip strip = SourceStrip::of(source, x);
+        U8s rows[kBytes];
+        for (int64_t i = 0; i < kBytes; ++i)
+            rows[i] = strip.has(row + i) ? strip.row(row + i) : U8s{};
+        storeTransposed(rows, lines + x * kBytes, kBytes);
+    }
+}
+
+void fillSquare(uint8_t value, uint8_t* to, int64_t rowStride) {
+    for (int64_t i = 0; i < kBytes; ++i)
+        std::memset(to + i * rowStride, value, static_cast<size_t>(kBytes));
+}
+
+void blurStrip(const DifferenceSum& sum, const BlurSource& source, int64_t x, uint8_t* lines,
+               int64_t first, int64_t count, const SquareRows& out) {
+    const SourceStrip strip = SourceStrip::of(source, x);
+    const RowExtent ink = RowExtent::of(strip);
+    const bool isEmpty = ink.first >= ink.end;
+    StripSum sums(sum, isEmpty ? Rows{} : filledRows(strip, ink, sum.terms.pairs, lines), ink.end);
+    const int64_t begin = ink.first - sum.radius;
+    const int64_t end = ink.end + sum.radius;
+    U8s rows[kBytes];
+    int64_t y = first;
+    // Results that nobody wants, but that the following ones build on.
+    if (begin < first && !isEmpty) {
+        for (y -= roundedUp(first - begin, kDifferenceRows); y < first; y += kDifferenceRows)
+            sums.next(y, rows);
+    }
+    for (uint8_t* square = out.start; y < first + count; square += out.squareStride) {
+        if (isEmpty || y + kBytes <= begin || y >= end) {
+            fillSquare(sum.ending.invertMask, square, out.rowStride);
+            y += kBytes;
+            continue;
+        }
+        for (int64_t i = 0; i < kBytes; i += kDifferenceRows, y += kDifferenceRows)
+            sums.next(y, rows + i);
+        if (out.areTransposed) {
+            storeTransposed(rows, square, out.rowStride);
+        } else {
+            storePlain(rows, square, out.rowStride);
+        }
+    }
+}
+
+}  // namespace
+
+extern const DifferenceLoops kDifferenceLoops = {transpose, blurStrip};
+
+}  // namespace VFontEffect::internal::VOREL_LEVEL

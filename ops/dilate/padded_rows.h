@@ -1,0 +1,67 @@
+#pragma once
+
+#include <cstdint>
+#include <cstring>
+
+#include "core/numeric.h"
+#include "ops/dilate/dilation_loops.h"
+#include "simd/pieces.h"
+
+/// Rows of source pixels as all ways of dilation read them, and windowed maxima of them.
+namespace VFontEffect::internal::VOREL_LEVEL {
+
+constexpr int64_t kArenaAlignment = 64;
+
+/// Hands out working memory, which is aligned; without any it only counts.
+struct Arena {
+    uint8_t* memory;
+    int64_t used = 0;
+
+    template <class T>
+    VOREL_INLINE T* take(int64_t count) {
+        uint8_t* const taken = memory == nullptr ? nullptr : memory + used;
+        used += roundedUp(count * static_cast<int64_t>(sizeof(T)), kArenaAlignment);
+        return reinterpret_cast<T*>(taken);
+    }
+};
+
+/// Rows of the source with zeros to both sides, as far as any load goes.
+struct PaddedRows {
+    uint8_t* start;
+    int64_t stride;
+    int64_t lead;   ///< columns before column 0
+    int64_t width;  ///< of the source
+
+    /// Column 0 of a row.
+    VOREL_INLINE uint8_t* at(int64_t row) const { return start + row * stride + lead; }
+};
+
+/// Rows in which there are so many columns before and behind those of the result that are wanted.
+VOREL_INLINE PaddedRows takeRows(const Dilation& dilation, int64_t count, int64_t before, int64_t behind,
+                                 Arena& arena) {
+    const int64_t lead = before - dilation.left;
+    const int64_t stride = lead + dilation.right + behind;
+    return {arena.take<uint8_t>(count * stride), stride, lead, dilation.width};
+}
+
+VOREL_INLINE void setBytes(uint8_t* to, uint8_t value, int64_t count) {
+    std::memset(to, value, static_cast<size_t>(count));
+}
+
+VOREL_INLINE void clearRow(const PaddedRows& rows, int64_t row) {
+    setBytes(rows.at(row) - rows.lead, 0, rows.stride);
+}
+
+/// Copies row y of the source, with zeros around. Rows outside of the source are empty.
+inline void fillRow(const Dilation& dilation, int64_t y, const PaddedRows& rows, int64_t row) {
+    if (y < 0 || y >= dilation.height) return clearRow(rows, row);
+    uint8_t* const to = rows.at(row);
+    setBytes(to - rows.lead, 0, rows.lead);
+    setBytes(to + rows.width, 0, rows.stride - rows.lead - rows.width);
+    if (y == 0 || y == dilation.height - 1) return setBytes(to, dilation.invertMask, rows.width);
+    to[0] = to[rows.width - 1] = dilation.invertMask;
+    copyInverted(dilation.box + (y - 1) * dilation.boxStride, rows.width - 2, dilation.invertMask,
+                 to + 1);
+}
+
+}  // namespace VFontEffect::internal::VOREL_LEVEL

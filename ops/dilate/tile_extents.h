@@ -1,0 +1,109 @@
+#pragma once
+
+#include <cstdint>
+
+#include "ops/dilate/padded_rows.h"
+
+/// Where the covered pixels of a row are, seen from tiles: pieces of a row of one short vector.
+namespace VFontEffect::internal::VOREL_LEVEL {
+
+constexpr int kTile = kBytes < 16 ? kBytes : 16;
+using Tile = uint8_t __attribute__((vector_size(kTile)));
+
+/// Columns. Beyond what any disc reaches they need not be exact.
+using Distance = int16_t;
+using Distances = int16_t __attribute__((vector_size(kBytes)));
+constexpr int64_t kDistances = kBytes / 2;
+constexpr Distance kBeyond = 1024;
+constexpr Distance kTileEnd = kTile - 1;
+
+/// The covered pixels of kDistances rows: for each number an array, by tile and then by row, so that
+/// vectors hold rows. A tile without any has its first and its last one far to the right and to the
+/// left.
+struct TileExtents {
+    Distance* first;  ///< from the tile's first column to its first covered pixel
+    Distance* last;   ///< from the tile's first column to its last one
+    Distance* holes;  ///< from the first to the last one if any between is not covered, else 0
+    Distance*
+        before;       ///< from the tile's first column back to the nearest covered pixel before the tile
+    Distance* after;  ///< from the tile's last column on to the nearest one behind it
+};
+
+inline TileExtents takeExtents(int64_t tiles, Arena& arena) {
+    const auto take = [&] { return arena.take<Distance>(tiles * kDistances); };
+    return {take(), take(), take(), take(), take()};
+}
+
+VOREL_INLINE int firstLane(uint64_t lanes) {
+    return __builtin_ctzll(lanes) / kLaneBits;
+}
+VOREL_INLINE int lastLane(uint64_t lanes) {
+    return (63 - __builtin_clzll(lanes)) / kLaneBits;
+}
+
+VOREL_INLINE uint64_t withoutFirst(uint64_t lanes) {
+    constexpr uint64_t kLane = ~uint64_t{0} >> (64 - kLaneBits);
+    return kLaneBits == 1 ? lanes & (lanes - 1) : lanes & ~(kLane << firstLane(lanes) * kLaneBits);
+}
+
+constexpr int kTileBits = kTile * kLaneBits;
+constexpr uint64_t kTileLanes = ~uint64_t{0} >> (64 - kTileBits);
+
+/// Notes the covered pixels of a tile, given as lanes.
+VOREL_INLINE void noteTile(const TileExtents& ink, int64_t at, uint64_t lanes) {
+    const uint64_t bits = lanes & kTileLanes;
+    const int first = bits != 0 ? firstLane(bits) : kBeyond;
+    const int last = bits != 0 ? lastLane(bits) : -kBeyond;
+    // Adding its lowest bit to a single run of ones carries out of it, and leaves nothing there.
+    const bool solid = ((bits + (bits & (0 - bits))) & bits) == 0;
+    ink.first[at] = static_cast<Distance>(first);
+    ink.last[at] = static_cast<Distance>(last);
+    ink.holes[at] = static_cast<Distance>(solid ? 0 : last - first);
+}
+
+/// Finds the nearest covered pixels beside each tile.
+inline void findNeighbours(const TileExtents& ink, int64_t tiles) {
+    const Distances beyond = splat<Distances>(kBeyond);
+    Distances distance = beyond;
+    for (int64_t at = 0; at < tiles * kDistances; at += kDistances) {
+        store(ink.before + at, distance);
+        distance = min(min(distance, beyond) + kTile, kTile - load<Distances>(ink.last + at));
+    }
+    distance = beyond;
+    for (int64_t at = (tiles - 1) * kDistances; at >= 0; at -= kDistances) {
+        store(ink.after + at, distance);
+        distance = min(min(distance, beyond) + kTile, 1 + load<Distances>(ink.first + at));
+    }
+}
+
+/// From a tile's first column to the nearest covered pixel that is not to the left of it.
+VOREL_INLINE Distances toTheRight(const TileExtents& ink, int64_t at) {
+    return min(load<Distances>(ink.first + at), load<Distances>(ink.after + at) + kTileEnd);
+}
+
+/// From a tile's last column to the nearest covered pixel that is not to the right of it.
+VOREL_INLINE Distances toTheLeft(const TileExtents& ink, int64_t at) {
+    return min(kTileEnd - load<Distances>(ink.last + at), load<Distances>(ink.before + at) + kTileEnd);
+}
+
+/// Of the tile's pixels the one next to a covered one has it that far away.
+VOREL_INLINE Distances smallestDistance(Distances toRight, Distances toLeft) {
+    return max(min(toRight, toLeft) - kTileEnd, Distances{});
+}
+
+/// None of the tile's pixels is farther from a covered one: not the tile's pixels before its first
+/// covered one, behind its last one, or between these. From one covered pixel to the next the distance
+/// rises to half of theirs. Holes are taken as one.
+VOREL_INLINE Distances largestDistance(const TileExtents& ink, int64_t at) {
+    const Distances before = load<Distances>(ink.before + at);
+    const Distances after = load<Distances>(ink.after + at);
+    const Distances first = load<Distances>(ink.first + at);
+    const Distances last = load<Distances>(ink.last + at);
+    const Distances ofEmpty = min(min(before, after) + kTileEnd, (before + after + kTileEnd) >> 1);
+    const Distances toFirst = min(first, (before + first) >> 1);
+    const Distances fromLast = min(kTileEnd - last, (after + kTileEnd - last) >> 1);
+    const Distances between = load<Distances>(ink.holes + at) >> 1;
+    return last < 0 ? ofEmpty : max(max(toFirst, fromLast), between);
+}
+
+}  // namespace VFontEffect::internal::VOREL_LEVEL

@@ -1,0 +1,16 @@
+#include "ops/blur/difference_loops.h"
+#include "ops/blur/dot_loops.h"
+#include "ops/dilate/dilation_loops.h"
+#include "ops/grow/growth_loops.h"
+#include "ops/ramp/ramp_loops.h"
+#include "simd/level_table.h"
+
+namespace VFontEffect::internal {
+
+VOREL_LEVEL_TABLE(VOREL_EACH_VECTOR_LEVEL, dotLoops, DotLoops, kDotLoops)
+VOREL_LEVEL_TABLE(VOREL_EACH_DOTLESS_LEVEL, dilationLoops, DilationLoops, kDilationLoops)
+VOREL_LEVEL_TABLE(VOREL_EACH_DOTLESS_LEVEL, rampLoops, RampLoops, kRampLoops)
+VOREL_LEVEL_TABLE(VOREL_EACH_DOTLESS_LEVEL, growthLoops, GrowthLoops, kGrowthLoops)
+VOREL_LEVEL_TABLE(VOREL_EACH_DOTLESS_LEVEL, differenceLoops, DifferenceLoops, kDifferenceLoops)
+
+}  // namespace VFontEffect::internal

@@ -1,0 +1,13 @@
+#include "ops/ramp/gradient_table.h"
+
+#include <algorithm>
+
+namespace VFontEffect::internal {
+
+GradientTable::GradientTable(const VFGradient* stops, int count) {
+    std::fill_n(mPixels, kTableLast, stops[0].mColor);
+    if (count > 1) fillBetweenStops(stops, count, stops[0].mLocation, TablePositions(), mPixels);
+    rampLoops().premultiplied(mPixels, kTableLast, mPixels);
+}
+
+}  // namespace VFontEffect::internal

@@ -1,0 +1,25 @@
+#include "ops/ramp/stop_ramp.h"
+
+namespace VFontEffect::internal {
+
+void fillBetweenStops(const VFGradient* stops, int count, float start, const TablePositions& positions,
+                      uint32_t* table) {
+    float end = stops[1].mLocation;
+    RampSegment segment = {stops[0].mColor, stops[1].mColor, start, end - start};
+    int next = 2;
+    const auto movesOn = [&](int entry) { return end < positions.of[entry] && next < count; };
+    for (int first = 1; first < kTableLast;) {
+        if (movesOn(first)) {
+            const VFGradient& stop = stops[next++];
+            segment = {segment.upper, stop.mColor, end, stop.mLocation - end};
+            end = stop.mLocation;
+        }
+        int behind = first + 1;
+        while (behind < kTableLast && !movesOn(behind))
+            ++behind;
+        rampLoops().mixStops(segment, positions.of + first, behind - first, table + first);
+        first = behind;
+    }
+}
+
+}  // namespace VFontEffect::internal

@@ -1,0 +1,34 @@
+#pragma once
+
+#include <cstdint>
+
+#include "ops/ramp/ramp_loops.h"
+#include "voreleffect/VFBitmap.h"
+
+namespace VFontEffect::internal {
+
+/// Tables of colours along a ramp have 257 entries; entry i stands at position i / 256.
+constexpr int kTableSize = 257;
+constexpr int kTableLast = kTableSize - 1;
+
+/// The places on a ramp of a table's entries, which ascend, and of some more.
+struct TablePositions {
+    static constexpr int kCount = kTableLast + static_cast<int>(kRowSlack);
+    float of[kCount];
+
+    TablePositions() {
+        for (int i = 0; i < kCount; ++i)
+            of[i] = static_cast<float>(i) * 0.00390625F;
+    }
+};
+
+/// Gives the entries 1 to 255 of a table the straight colours along `count` stops, 2 or more. The first
+/// segment runs from `start` to the position of stop 1.
+///
+/// Deliberate: an entry moves on by one segment at most, even when it has passed several stops, so stops
+/// closer together than a table entry take effect one entry late. When no stop is left the last segment
+/// stays.
+void fillBetweenStops(const VFGradient* stops, int count, float start, const TablePositions& positions,
+                      uint32_t* table);
+
+}  // namespace VFontEffect::internal

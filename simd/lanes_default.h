@@ -1,0 +1,69 @@
+#pragma once
+
+#include "simd/vectors.h"
+
+/// What a level has from here unless its file says VOREL_NATIVE_... of it.
+namespace VFontEffect::internal::VOREL_LEVEL {
+
+#if !defined(VOREL_NATIVE_LOAD_FIRST)
+VOREL_INLINE U8s loadFirst(const uint8_t* from, int64_t count) {
+    uint8_t bytes[kBytes] = {};
+    std::memcpy(bytes, from, static_cast<size_t>(count));
+    return load<U8s>(bytes);
+}
+#endif
+
+#if !defined(VOREL_NATIVE_GATHER)
+template <class Index, size_t... kLanes>
+VOREL_INLINE U32s gather(const uint32_t* table, const Index& indices, std::index_sequence<kLanes...>) {
+    return U32s{table[indices[kLanes]]...};
+}
+VOREL_INLINE U32s gather(const uint32_t* table, I32s indices) {
+    return gather(table, indices, std::make_index_sequence<kU32Lanes>());
+}
+VOREL_INLINE U32s gather(const uint32_t* table, const uint8_t* indices) {
+    return gather(table, indices, std::make_index_sequence<kU32Lanes>());
+}
+#endif
+
+#if !defined(VOREL_NATIVE_GATHER_NEAR)
+VOREL_INLINE U32s gatherNear(const uint32_t* table, int32_t, I32s indices) {
+    return gather(table, indices);
+}
+#endif
+
+#if !defined(VOREL_NATIVE_TIMES_FACTOR)
+constexpr uint32_t kNumberBias = 0;
+VOREL_INLINE F32s timesFactor(U32s number, F32s factor) {
+    return __builtin_convertvector(bitCast<I32s>(number), F32s) * factor;
+}
+#endif
+
+#if !defined(VOREL_NATIVE_TAPS)
+using Taps = U8s;
+using WeightCell = uint8_t;
+
+VOREL_INLINE Taps tapsOf(U8s v) {
+    return v;
+}
+VOREL_INLINE WeightCell cellOf(const uint8_t* weights) {
+    return *weights;
+}
+#endif
+
+#if !defined(VOREL_NATIVE_WEIGHTS)
+using Weights = const WeightCell*;
+
+VOREL_INLINE Weights weightsAt(const WeightCell* cells) {
+    return cells;
+}
+#endif
+
+/// Whether a dot product of bytes is an instruction.
+#if defined(VOREL_DOT_PRODUCTS)
+constexpr bool kHasDotProducts = true;
+#else
+constexpr bool kHasDotProducts = false;
+#endif
+
+}  // namespace VFontEffect::internal::VOREL_LEVEL

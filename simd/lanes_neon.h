@@ -1,0 +1,102 @@
+#pragma once
+
+#include <arm_neon.h>
+
+#include "simd/vectors.h"
+
+/// NEON, which every 64-bit ARM has: 16 bytes. The level dotprod is the same with dot products.
+#define VOREL_PLANAR_PIXELS
+namespace VFontEffect::internal::VOREL_LEVEL {
+
+VOREL_INLINE U8s addSaturated(U8s a, U8s b) {
+    return bitCast<U8s>(vqaddq_u8(bitCast<uint8x16_t>(a), bitCast<uint8x16_t>(b)));
+}
+VOREL_INLINE U8s subSaturated(U8s a, U8s b) {
+    return bitCast<U8s>(vqsubq_u8(bitCast<uint8x16_t>(a), bitCast<uint8x16_t>(b)));
+}
+VOREL_INLINE bool allZero(U8s v) {
+    return vmaxvq_u32(bitCast<uint32x4_t>(v)) == 0;
+}
+constexpr int kLaneBits = 4;
+VOREL_INLINE uint64_t nonZeroLanes(U8s v) {
+    const uint16x8_t nonZero = bitCast<uint16x8_t>(v != 0);
+    return vget_lane_u64(vreinterpret_u64_u8(vshrn_n_u16(nonZero, 4)), 0);
+}
+VOREL_INLINE U16s multiplyHigh(U16s a, U16s b) {
+    const auto x = bitCast<uint16x8_t>(a);
+    const auto y = bitCast<uint16x8_t>(b);
+    const uint32x4_t low = vmull_u16(vget_low_u16(x), vget_low_u16(y));
+    return bitCast<U16s>(
+        vuzp2q_u16(bitCast<uint16x8_t>(low), bitCast<uint16x8_t>(vmull_high_u16(x, y))));
+}
+VOREL_INLINE I32s toInt(F32s v) {
+    return bitCast<I32s>(vcvtq_s32_f32(bitCast<float32x4_t>(v)));
+}
+VOREL_INLINE F32s squareRoot(F32s v) {
+    return bitCast<F32s>(vsqrtq_f32(bitCast<float32x4_t>(v)));
+}
+VOREL_INLINE U16s widenLow(U8s v) {
+    return bitCast<U16s>(vmovl_u8(vget_low_u8(bitCast<uint8x16_t>(v))));
+}
+VOREL_INLINE U16s widenHigh(U8s v) {
+    return bitCast<U16s>(vmovl_high_u8(bitCast<uint8x16_t>(v)));
+}
+VOREL_INLINE U8s interleaveLow(U8s a, U8s b) {
+    return bitCast<U8s>(vzip1q_u8(bitCast<uint8x16_t>(a), bitCast<uint8x16_t>(b)));
+}
+VOREL_INLINE U8s interleaveHigh(U8s a, U8s b) {
+    return bitCast<U8s>(vzip2q_u8(bitCast<uint8x16_t>(a), bitCast<uint8x16_t>(b)));
+}
+VOREL_INLINE U16s interleaveLow(U16s a, U16s b) {
+    return bitCast<U16s>(vzip1q_u16(bitCast<uint16x8_t>(a), bitCast<uint16x8_t>(b)));
+}
+VOREL_INLINE U16s interleaveHigh(U16s a, U16s b) {
+    return bitCast<U16s>(vzip2q_u16(bitCast<uint16x8_t>(a), bitCast<uint16x8_t>(b)));
+}
+VOREL_INLINE U16s pack(U32s a, U32s b) {
+    return bitCast<U16s>(vuzp1q_u16(bitCast<uint16x8_t>(a), bitCast<uint16x8_t>(b)));
+}
+VOREL_INLINE U8s pack(U16s a, U16s b) {
+    return bitCast<U8s>(vuzp1q_u8(bitCast<uint8x16_t>(a), bitCast<uint8x16_t>(b)));
+}
+VOREL_INLINE U8s narrow(U16s a, U16s b) {
+    return pack(a, b);
+}
+VOREL_INLINE U16s pairSums(U8s v) {
+    return bitCast<U16s>(vpaddlq_u8(bitCast<uint8x16_t>(v)));
+}
+VOREL_INLINE U8s quarters(U16s even, U16s odd) {
+    const auto raised = [](U16s sums) {
+        return vreinterpretq_u8_u16(vqshlq_n_u16(bitCast<uint16x8_t>(sums), 6));
+    };
+    return bitCast<U8s>(vtrn2q_u8(raised(even), raised(odd)));
+}
+
+#define VOREL_NATIVE_WEIGHTS
+/// A string's first sixteen weights.
+using Weights = uint8x16_t;
+
+VOREL_INLINE Weights weightsAt(const uint8_t* cells) {
+    return vld1q_u8(cells);
+}
+
+constexpr uint8_t kTapBias = 0;
+#if defined(__ARM_FEATURE_DOTPROD)
+#define VOREL_DOT_PRODUCTS
+template <int64_t kFour>
+VOREL_INLINE U32s addDots(U32s sums, U8s taps, Weights weights) {
+    return bitCast<U32s>(
+        vdotq_laneq_u32(bitCast<uint32x4_t>(sums), bitCast<uint8x16_t>(taps), weights, kFour));
+}
+#else
+/// The sums of two products, of weights of 256 together, just fit in 16 bits.
+template <int64_t kFour>
+VOREL_INLINE U32s addDots(U32s sums, U8s taps, Weights weights) {
+    const auto four = vreinterpretq_u8_u32(vdupq_laneq_u32(vreinterpretq_u32_u8(weights), kFour));
+    const uint16x8_t low = vmull_u8(vget_low_u8(bitCast<uint8x16_t>(taps)), vget_low_u8(four));
+    const uint16x8_t high = vmull_high_u8(bitCast<uint8x16_t>(taps), four);
+    return bitCast<U32s>(vpadalq_u16(bitCast<uint32x4_t>(sums), vpaddq_u16(low, high)));
+}
+#endif
+
+}  // namespace VFontEffect::internal::VOREL_LEVEL

@@ -1,0 +1,86 @@
+#pragma once
+
+#include <immintrin.h>
+
+#include "simd/vectors.h"
+
+#if !defined(__SSE2__) || defined(__AVX__)
+#error "the level sse2 is compiled with the flags of its name"
+#endif
+
+/// SSE2, which every x86-64 has: 16 bytes.
+namespace VFontEffect::internal::VOREL_LEVEL {
+
+using X86Ints = __m128i;
+using X86Floats = __m128;
+#define VOREL_X86(name) _mm_##name
+}  // namespace VFontEffect::internal::VOREL_LEVEL
+
+#include "simd/lanes_x86.h"
+
+namespace VFontEffect::internal::VOREL_LEVEL {
+
+VOREL_INLINE bool allZero(U8s v) {
+    return _mm_movemask_epi8(_mm_cmpeq_epi8(ints(v), _mm_setzero_si128())) == 0xFFFF;
+}
+constexpr int kLaneBits = 1;
+VOREL_INLINE uint64_t nonZeroLanes(U8s v) {
+    return static_cast<uint32_t>(_mm_movemask_epi8(ints(v != 0)));
+}
+VOREL_INLINE U16s loadInPairs(const uint8_t* from) {
+    const __m128i halves = _mm_unpacklo_epi8(_mm_cvtsi32_si128(load<int>(from)), _mm_setzero_si128());
+    return bitCast<U16s>(_mm_unpacklo_epi16(halves, halves));
+}
+/// Moves the halves of each word: both take the one that `selector` names for them.
+template <int kSelector>
+VOREL_INLINE U16s halvesMoved(U16s v) {
+    return bitCast<U16s>(_mm_shufflehi_epi16(_mm_shufflelo_epi16(ints(v), kSelector), kSelector));
+}
+VOREL_INLINE U16s highBytesInPairs(U8s v) {
+    return halvesMoved<_MM_SHUFFLE(3, 3, 1, 1)>(bitCast<U16s>(v) >> 8);
+}
+VOREL_INLINE U8s swapRedBlue(U8s v) {
+    const U16s ends = bitCast<U16s>(v) & 0x00FF;
+    return v ^ bitCast<U8s>(ends) ^ bitCast<U8s>(halvesMoved<_MM_SHUFFLE(2, 3, 0, 1)>(ends));
+}
+VOREL_INLINE U16s widenLow(U8s v) {
+    return bitCast<U16s>(_mm_unpacklo_epi8(ints(v), _mm_setzero_si128()));
+}
+VOREL_INLINE U16s widenHigh(U8s v) {
+    return bitCast<U16s>(_mm_unpackhi_epi8(ints(v), _mm_setzero_si128()));
+}
+VOREL_INLINE U8s narrow(U16s a, U16s b) {
+    return pack(a, b);
+}
+VOREL_INLINE U16s pairSums(U8s v) {
+    return (bitCast<U16s>(v) & 0x00FF) + (bitCast<U16s>(v) >> 8);
+}
+
+#define VOREL_NATIVE_TAPS
+/// Taps 0 and 2 of each word, and taps 1 and 3. The cell of a tap holds its weight and that of the next
+/// but one.
+struct Taps {
+    U16s even;
+    U16s odd;
+};
+using WeightCell = U16s;
+
+VOREL_INLINE Taps tapsOf(U8s v) {
+    return {bitCast<U16s>(v) & 0x00FF, bitCast<U16s>(v) >> 8};
+}
+VOREL_INLINE WeightCell cellOf(const uint8_t* weights) {
+    return bitCast<U16s>(splat<U32s>(weights[0] | uint32_t{weights[2]} << 16));
+}
+
+constexpr uint8_t kTapBias = 0;
+template <int64_t kFour>
+VOREL_INLINE U32s addDots(U32s sums, Taps taps, const WeightCell* weights) {
+    const __m128i even = _mm_madd_epi16(ints(taps.even), ints(weights[4 * kFour]));
+    const __m128i odd = _mm_madd_epi16(ints(taps.odd), ints(weights[4 * kFour + 1]));
+    // In this order: compilers would rather make a tree of all the steps' products, and spill it.
+    U32s sum = sums + bitCast<U32s>(even);
+    __asm__("" : "+x"(sum));
+    return sum + bitCast<U32s>(odd);
+}
+
+}  // namespace VFontEffect::internal::VOREL_LEVEL

@@ -1,0 +1,117 @@
+#pragma once
+
+#include "core/fixed_point.h"
+#include "simd/lanes.h"
+
+/// Planar pixels: one vector a channel, as NEON loads, multiplies and stores them.
+namespace VFontEffect::internal::VOREL_LEVEL {
+
+constexpr int64_t kPixels = kBytes;
+
+struct Pixels {
+    uint8x16x4_t channels;  // red, green, blue, alpha
+};
+using Amounts = uint8x16_t;
+using Where = uint8x16_t;  // all ones or all zeros for each pixel
+
+VOREL_INLINE Pixels loadPixels(const uint8_t* from) {
+    return {vld4q_u8(from)};
+}
+VOREL_INLINE void storePixels(uint8_t* to, const Pixels& pixels) {
+    vst4q_u8(to, pixels.channels);
+}
+/// Pixels in memory order from the words that `wordsAt(i)` gives for pixel i and the next ones.
+template <class WordsAt>
+VOREL_INLINE Pixels madeOfWords(WordsAt wordsAt) {
+    const uint8x16x4_t words = {{bitCast<uint8x16_t>(wordsAt(0)), bitCast<uint8x16_t>(wordsAt(4)),
+                                 bitCast<uint8x16_t>(wordsAt(8)), bitCast<uint8x16_t>(wordsAt(12))}};
+    uint8_t pixels[4 * kPixels] = {};
+    vst1q_u8_x4(pixels, words);
+    return loadPixels(pixels);
+}
+/// From words 0xAARRGGBB: memory order B, G, R, A.
+VOREL_INLINE Pixels loadWords(const uint8_t* from) {
+    const uint8x16x4_t p = vld4q_u8(from);
+    return {{{p.val[2], p.val[1], p.val[0], p.val[3]}}};
+}
+/// From memory order A, R, G, B.
+VOREL_INLINE Pixels loadArgb(const uint8_t* from) {
+    const uint8x16x4_t p = vld4q_u8(from);
+    return {{{p.val[1], p.val[2], p.val[3], p.val[0]}}};
+}
+VOREL_INLINE Amounts loadAmounts(const uint8_t* from) {
+    return vld1q_u8(from);
+}
+
+/// The same colour word 0xAARRGGBB in every pixel.
+VOREL_INLINE Pixels splatColour(uint32_t color) {
+    const auto channel = [color](int shift) { return vdupq_n_u8(static_cast<uint8_t>(color >> shift)); };
+    return {{{channel(16), channel(8), channel(0), channel(24)}}};
+}
+
+VOREL_INLINE Amounts alphaOf(const Pixels& p) {
+    return p.channels.val[3];
+}
+VOREL_INLINE Amounts inverse(Amounts a) {
+    return vmvnq_u8(a);
+}
+/// Whether all pixels are zeros.
+VOREL_INLINE bool isClear(const Pixels& p) {
+    const uint8x16_t* const c = p.channels.val;
+    return allZero(bitCast<U8s>(vorrq_u8(vorrq_u8(c[0], c[1]), vorrq_u8(c[2], c[3]))));
+}
+VOREL_INLINE Where isZero(Amounts a) {
+    return vceqzq_u8(a);
+}
+VOREL_INLINE Where isTransparent(const Pixels& p) {
+    return isZero(alphaOf(p));
+}
+VOREL_INLINE Amounts raisedToFull(Where where, Amounts a) {
+    return vorrq_u8(a, where);
+}
+
+template <class Operation>
+VOREL_INLINE Pixels perChannel(const Pixels& a, const Pixels& b, Operation operation) {
+    const uint8x16_t* const x = a.channels.val;
+    const uint8x16_t* const y = b.channels.val;
+    return {
+        {{operation(x[0], y[0]), operation(x[1], y[1]), operation(x[2], y[2]), operation(x[3], y[3])}}};
+}
+
+VOREL_INLINE Pixels kept(Where where, const Pixels& p) {
+    return perChannel(p, p, [where](uint8x16_t x, uint8x16_t) { return vandq_u8(x, where); });
+}
+VOREL_INLINE Pixels cleared(Where where, const Pixels& p) {
+    return perChannel(p, p, [where](uint8x16_t x, uint8x16_t) { return vbicq_u8(x, where); });
+}
+VOREL_INLINE Pixels added(const Pixels& a, const Pixels& b) {
+    return perChannel(a, b, [](uint8x16_t x, uint8x16_t y) { return vqaddq_u8(x, y); });
+}
+
+/// (x * y + y) >> 8, the sum and its upper half in one instruction.
+VOREL_INLINE uint8x16_t productOf(uint8x16_t x, uint8x16_t y) {
+    const uint8x8_t low = vaddhn_u16(vmull_u8(vget_low_u8(x), vget_low_u8(y)), vmovl_u8(vget_low_u8(y)));
+    return vaddhn_high_u16(low, vmull_high_u8(x, y), vmovl_high_u8(y));
+}
+VOREL_INLINE Pixels scaled(const Pixels& p, Amounts amounts) {
+    return perChannel(p, p, [amounts](uint8x16_t x, uint8x16_t) { return productOf(x, amounts); });
+}
+
+/// min(product(a + b, amount), 255), where a + b may reach 510. With a + b + 1 = 256 h + l it is
+/// h * amount + (l * amount >> 8).
+VOREL_INLINE Pixels scaledSum(const Pixels& a, const Pixels& b, Amounts amounts) {
+    return perChannel(a, b, [amounts](uint8x16_t x, uint8x16_t y) {
+        const uint8x16_t low = vsubq_u8(vaddq_u8(x, y), vdupq_n_u8(255));
+        const uint8x16_t carry = vcgeq_u8(y, vmvnq_u8(x));
+        const uint8x8_t near = vshrn_n_u16(vmull_u8(vget_low_u8(low), vget_low_u8(amounts)), 8);
+        const uint8x16_t scaledLow = vshrn_high_n_u16(near, vmull_high_u8(low, amounts), 8);
+        return vqaddq_u8(scaledLow, vandq_u8(carry, amounts));
+    });
+}
+
+/// The colours of `p` with the alpha of `alpha`.
+VOREL_INLINE Pixels withAlphaOf(const Pixels& p, const Pixels& alpha) {
+    return {{{p.channels.val[0], p.channels.val[1], p.channels.val[2], alpha.channels.val[3]}}};
+}
+
+}  // namespace VFontEffect::internal::VOREL_LEVEL
