@@ -2,11 +2,13 @@
 
 #include <cstdint>
 
+#include "simd/cpu_level.h"
+
 /// The inner loops of blending, compiled once per level of the instruction set.
 namespace VFontEffect::internal {
 
 /// A rectangle of a destination and what is painted there, all clipped: no check is made. Strides are in
-/// bytes, counts in pixels. Destination and image have 4 bytes a pixel, the mask has 1. A kernel reads
+/// bytes, counts in pixels. Destination and image have 4 bytes a pixel, the mask has 1. A loop reads
 /// what its name says and leaves the rest alone.
 struct BlendJob {
     uint8_t* destination;
@@ -41,7 +43,7 @@ struct BlendLoops {
     BlendLoop largerCoverage;
 };
 
-/// The kernels of the chosen level.
-const BlendLoops& blendLoops();
+/// The loops of a level.
+const BlendLoops& blendLoops(CpuLevel level);
 
 }  // namespace VFontEffect::internal

@@ -13,21 +13,21 @@ using namespace internal;
 namespace {
 
 /// `skipBytes` is what each source column left of the destination is skipped by.
-void blendColour(BlendLoop kernel, int x, int y, const VFBitmap* dst, const unsigned char* source,
+void blendColour(BlendLoop loop, int x, int y, const VFBitmap* dst, const unsigned char* source,
                  int width, int height, int64_t strideBytes, int skipBytes) {
     const ColourView target = ColourView::of(dst);
     if (!target || source == nullptr || strideBytes < 0) return;
-    const Box clip = clipPlacement(x, y, width, height, target.width, target.height);
+    const Box clip = placement(x, y, width, height, target.width, target.height);
     if (clip.empty()) return;
     BlendJob job = jobOn(target, clip);
     job.image = source + (clip.top - y) * strideBytes + (clip.left - x) * skipBytes;
     job.imageStride = strideBytes;
-    kernel(job);
+    loop(job);
 }
 
-void blendWords(BlendLoop kernel, int x, int y, const VFBitmap* dst, const unsigned int* source,
-                int width, int height, int strideWords) {
-    blendColour(kernel, x, y, dst, reinterpret_cast<const unsigned char*>(source), width, height,
+void blendWords(BlendLoop loop, int x, int y, const VFBitmap* dst, const unsigned int* source, int width,
+                int height, int strideWords) {
+    blendColour(loop, x, y, dst, reinterpret_cast<const unsigned char*>(source), width, height,
                 static_cast<int64_t>(strideWords) * kColourBytes, kColourBytes);
 }
 
@@ -52,20 +52,22 @@ void VFBlender::drawBitmapBlend32(int x, int y, const VFBitmap* dst, unsigned ch
 
 void VFBlender::blendSrcOver32To32(int x, int y, const VFBitmap* dst, unsigned int* src, int width,
                                    int height, int srcStride) {
-    blendWords(blendLoops().srcOverWords, x, y, dst, src, width, height, srcStride);
+    blendWords(blendLoops(chosenLevel()).srcOverWords, x, y, dst, src, width, height, srcStride);
 }
 
 void VFBlender::blendDstOver32To32(int x, int y, const VFBitmap* dst, unsigned int* src, int width,
                                    int height, int srcStride) {
-    blendWords(blendLoops().dstOverWords, x, y, dst, src, width, height, srcStride);
+    blendWords(blendLoops(chosenLevel()).dstOverWords, x, y, dst, src, width, height, srcStride);
 }
 
 void VFBlender::blendDstOver32To32(int x, int y, const VFBitmap* dst, unsigned char* src, int width,
                                    int height, int srcStride, int order) {
     if (order == kOrderArgb) {
-        blendColour(blendLoops().dstOverArgb, x, y, dst, src, width, height, srcStride, kByteSourceSkip);
+        blendColour(blendLoops(chosenLevel()).dstOverArgb, x, y, dst, src, width, height, srcStride,
+                    kByteSourceSkip);
     } else if (order == kOrderRgba) {
-        blendColour(blendLoops().dstOverRgba, x, y, dst, src, width, height, srcStride, kByteSourceSkip);
+        blendColour(blendLoops(chosenLevel()).dstOverRgba, x, y, dst, src, width, height, srcStride,
+                    kByteSourceSkip);
     }
 }
 

@@ -1,7 +1,7 @@
 #include <cstdint>
 
 #include "blend/blend_loops.h"
-#include "core/box.h"
+#include "blend/job.h"
 #include "core/numeric.h"
 #include "core/views.h"
 #include "voreleffect/VFBlender.h"
@@ -48,19 +48,19 @@ void VFBlender::drawBitmap8To8(int x, int y, const VFBitmap* dst, unsigned char*
                                int maskHeight) {
     const MaskView target = MaskView::ofBytes(dst);
     if (!target || mask == nullptr) return;
-    const Box clip = clipPlacement(x, y, maskWidth, maskHeight, target.width, target.height);
+    const Box clip = placement(x, y, maskWidth, maskHeight, target.width, target.height);
     if (clip.empty()) return;
     BlendJob job = copyJob(mask, maskWidth, x, y, clip);
     job.destination = target.at(clip.left, clip.top);
     job.destinationStride = target.width;
-    blendLoops().largerCoverage(job);
+    blendLoops(chosenLevel()).largerCoverage(job);
 }
 
 void VFBlender::drawBitmap8To32(int x, int y, const VFBitmap* dst, unsigned char* mask, int maskWidth,
                                 int maskHeight, unsigned int color) {
     const ColourView target = ColourView::of(dst);
     if (!target || mask == nullptr) return;
-    const Box clip = clipPlacement(x, y, maskWidth, maskHeight, target.width, target.height);
+    const Box clip = placement(x, y, maskWidth, maskHeight, target.width, target.height);
     if (clip.empty()) return;
     BlendJob job = copyJob(mask, maskWidth, x, y, clip);
     // Deliberate: the run starts at a pixel count taken as bytes, so it lies in the first quarter of the
@@ -68,7 +68,7 @@ void VFBlender::drawBitmap8To32(int x, int y, const VFBitmap* dst, unsigned char
     job.destination = target.data + target.width * clip.top + clip.left;
     job.destinationStride = target.width;
     job.color = color;
-    blendLoops().solidColour(job);
+    blendLoops(chosenLevel()).solidColour(job);
 }
 
 }  // namespace VFontEffect

@@ -6,6 +6,12 @@
 
 namespace VFontEffect::internal {
 
+/// The part of a picture placed at (x, y) that falls on the target, in the target's coordinates.
+inline Box placement(int x, int y, int64_t width, int64_t height, int64_t targetWidth,
+                     int64_t targetHeight) {
+    return intersection({x, y, x + width, y + height}, {0, 0, targetWidth, targetHeight});
+}
+
 /// A job on the clipped part of a colour destination, with nothing to paint there yet.
 inline BlendJob jobOn(const ColourView& target, const Box& clip) {
     BlendJob job = {};

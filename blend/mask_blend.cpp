@@ -12,17 +12,17 @@ using namespace internal;
 
 namespace {
 
-void blendMask(BlendLoop kernel, int x, int y, const VFBitmap* dst, const unsigned char* mask, int width,
+void blendMask(BlendLoop loop, int x, int y, const VFBitmap* dst, const unsigned char* mask, int width,
                int height, int maskStride, uint32_t color) {
     const ColourView target = ColourView::of(dst);
     if (!target || mask == nullptr || maskStride < 0) return;
-    const Box clip = clipPlacement(x, y, width, height, target.width, target.height);
+    const Box clip = placement(x, y, width, height, target.width, target.height);
     if (clip.empty()) return;
     BlendJob job = jobOn(target, clip);
     job.mask = mask + (clip.top - y) * maskStride + (clip.left - x);
     job.maskStride = maskStride;
     job.color = color;
-    kernel(job);
+    loop(job);
 }
 
 }  // namespace
@@ -45,22 +45,22 @@ void VFBlender::drawBitmapBlend8(int x, int y, const VFBitmap* dst, unsigned cha
 
 void VFBlender::blendSrcOver8To32(int x, int y, const VFBitmap* dst, unsigned char* mask, int width,
                                   int height, int maskStride, unsigned int color) {
-    blendMask(blendLoops().srcOverMask, x, y, dst, mask, width, height, maskStride, color);
+    blendMask(blendLoops(chosenLevel()).srcOverMask, x, y, dst, mask, width, height, maskStride, color);
 }
 
 void VFBlender::blendDstOver8To32(int x, int y, const VFBitmap* dst, unsigned char* mask, int width,
                                   int height, int maskStride, unsigned int color) {
-    blendMask(blendLoops().dstOverMask, x, y, dst, mask, width, height, maskStride, color);
+    blendMask(blendLoops(chosenLevel()).dstOverMask, x, y, dst, mask, width, height, maskStride, color);
 }
 
 void VFBlender::blendDstOver8To32NSA(int x, int y, const VFBitmap* dst, unsigned char* mask, int width,
                                      int height, int maskStride, unsigned int color) {
-    blendMask(blendLoops().dstOverGate, x, y, dst, mask, width, height, maskStride, color);
+    blendMask(blendLoops(chosenLevel()).dstOverGate, x, y, dst, mask, width, height, maskStride, color);
 }
 
 void VFBlender::blendDstOverSA8To32(int x, int y, const VFBitmap* dst, unsigned char* mask, int width,
                                     int height, int maskStride, unsigned int color) {
-    blendMask(blendLoops().dstOverClip, x, y, dst, mask, width, height, maskStride, color);
+    blendMask(blendLoops(chosenLevel()).dstOverClip, x, y, dst, mask, width, height, maskStride, color);
 }
 
 }  // namespace VFontEffect

@@ -5,7 +5,7 @@
 
 namespace VFontEffect::internal {
 
-/// The part of a placed source that falls on the destination, half-open, in destination coordinates.
+/// A half-open rectangle of pixels.
 struct Box {
     int64_t left;
     int64_t top;
@@ -15,6 +15,9 @@ struct Box {
     bool empty() const { return left >= right || top >= bottom; }
     int64_t width() const { return right - left; }
     int64_t height() const { return bottom - top; }
+    bool operator==(const Box& other) const {
+        return left == other.left && top == other.top && right == other.right && bottom == other.bottom;
+    }
 };
 
 inline Box intersection(const Box& a, const Box& b) {
@@ -27,17 +30,11 @@ inline Box boundingBox(const Box& a, const Box& b) {
     return {std::min(a.left, b.left), std::min(a.top, b.top), std::max(a.right, b.right),
             std::max(a.bottom, b.bottom)};
 }
-inline Box expanded(const Box& clip, int64_t pixels) {
-    return {clip.left - pixels, clip.top - pixels, clip.right + pixels, clip.bottom + pixels};
+inline Box expanded(const Box& box, int64_t pixels) {
+    return {box.left - pixels, box.top - pixels, box.right + pixels, box.bottom + pixels};
 }
-inline Box translated(const Box& clip, int64_t dx, int64_t dy) {
-    return {clip.left + dx, clip.top + dy, clip.right + dx, clip.bottom + dy};
-}
-
-inline Box clipPlacement(int x, int y, int64_t width, int64_t height, int64_t targetWidth,
-                         int64_t targetHeight) {
-    return {std::max<int64_t>(x, 0), std::max<int64_t>(y, 0), std::min(x + width, targetWidth),
-            std::min(y + height, targetHeight)};
+inline Box translated(const Box& box, int64_t dx, int64_t dy) {
+    return {box.left + dx, box.top + dy, box.right + dx, box.bottom + dy};
 }
 
 }  // namespace VFontEffect::internal

@@ -2,6 +2,7 @@
 
 #include <cstdint>
 
+#include "simd/cpu_level.h"
 #include "voreleffect/VFECore.h"
 
 /// The machinery of both glows.
@@ -32,8 +33,9 @@ struct GlowRecord {
 int glowReach(const GlowRecord& record);
 
 /// The colours from the text outwards, straight; see VFOuterGlow::makeColorLUT.
-void fillGlowTable(const GlowRecord& record, float fadeStart, int curve, unsigned int* table);
+void fillGlowTable(CpuLevel level, const GlowRecord& record, float fadeStart, int curve,
+                   unsigned int* table);
 
-void paintGlow(const VFECore::ParamPostProcessing* params, const GlowRecord& record, GlowSide sense);
+void paintGlow(const VFECore::ParamPostProcessing* params, const GlowRecord& record, GlowSide side);
 
 }  // namespace VFontEffect::internal

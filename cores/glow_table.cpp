@@ -17,7 +17,7 @@ float curved(float position, int curve) {
     return curve == kCurveSquare ? position * position : position;
 }
 
-void fillRamp(const GlowRecord& record, int curve, unsigned int* table) {
+void fillRamp(CpuLevel level, const GlowRecord& record, int curve, unsigned int* table) {
     if (record.hasOneColour()) {
         std::fill_n(table, kTableSize, record.oneColour());
         return;
@@ -27,7 +27,7 @@ void fillRamp(const GlowRecord& record, int curve, unsigned int* table) {
         position = curved(position, curve);
     table[0] = record.stops[0].mColor;
     // Deliberate: the first segment starts at 0, whatever the position of stop 0.
-    fillBetweenStops(record.stops, record.count, 0.0F, positions, table);
+    fillBetweenStops(rampLoops(level), record.stops, record.count, 0.0F, positions, table);
     table[kTableLast] = record.stops[record.count - 1].mColor;
 }
 
@@ -51,13 +51,14 @@ int glowReach(const GlowRecord& record) {
     return toInt(record.sizePx + 0.5F);
 }
 
-void fillGlowTable(const GlowRecord& record, float fadeStart, int curve, unsigned int* table) {
+void fillGlowTable(CpuLevel level, const GlowRecord& record, float fadeStart, int curve,
+                   unsigned int* table) {
     if (table == nullptr) return;
     if (record.sizePx == 0.0F) {
         std::fill_n(table, kTableSize, 0U);
         return;
     }
-    fillRamp(record, curve, table);
+    fillRamp(level, record, curve, table);
     fadeOut(fadeStart, table);
 }
 

@@ -29,11 +29,11 @@ int VFInnerGlow::getOffset() {
 }
 
 void VFInnerGlow::makeColorLUT(unsigned int* table, float fadeStart, int curve) {
-    fillGlowTable(GlowRecord::of(mProperty), fadeStart, curve, table);
+    fillGlowTable(chosenLevel(), GlowRecord::of(mProperty), fadeStart, curve, table);
 }
 
 void VFInnerGlow::increaseByBoxFilter(unsigned char* mask, int passes, int width, int height) {
-    growByBoxFilter(mask, passes, width, height);
+    growByBoxFilter(chosenLevel(), mask, passes, width, height);
 }
 
 void VFInnerGlow::doPostProcessing(ParamPostProcessing* params) {

@@ -54,24 +54,26 @@ void VFInnerShadow::doPostProcessing(ParamPostProcessing* params) {
     const CoverageBox box = coverageOf(params);
     if (!box || mProperty == nullptr || exceedsSizeLimit(mProperty->mSize)) return;
 
-    const PlacedTarget target(params->dstBitmap, box.left, box.top);
-    const Box window = target.seen(wholeOf(box));
+    const CpuLevel level = chosenLevel();
+    const PlacedTarget target(level, params->dstBitmap, box.left, box.top);
+    const Box window = target.seen(wholeOf(box.rows()));
     if (window.empty()) return;
     const uint32_t color = mProperty->mColor;
     const int radius = shadowRadius(mProperty->mSize);
     const ShadowOffset offset = shadowOffset(mProperty->mAngle, mProperty->mDistance);
     if (!meetsItself(box, radius, offset.x, offset.y)) {
         // The glyph moved clear of itself: all of it lies in shadow, by its own coverage.
-        return target.paintBeneath(window, box.row(window.top) + window.left, box.mask.width, color);
+        return target.paintCoverage(&BlendLoops::dstOverMask, box.rows(), 0, 0, color);
     }
 
     const Box unmoved = translated(window, -int64_t{offset.x}, -int64_t{offset.y});
-    blurAcrossThenDown(
-        shadowWeights(radius), sourceOf(box), unmoved,
-        [&](int64_t y, int64_t rows, const uint8_t* values, int64_t stride) {
-            const int64_t top = y + offset.y;
-            target.paintBeneath({window.left, top, window.right, top + rows}, values, stride, color);
-        });
+    const BlurWeights weights = gaussianOf100(radius);
+    BlurPlan blur(level, BlurInput::inverseAcross(weights, box.rows(), unmoved));
+    if (!blur) return;
+    forBands(blur, unmoved, [&](const Box& band, const BlurredRows& rows) {
+        target.paint(&BlendLoops::dstOverMask, translated(band, offset.x, offset.y), rows.values,
+                     rows.stride, color);
+    });
 }
 
 }  // namespace VFontEffect

@@ -46,7 +46,9 @@ VFProperty* VFLinearGradient::getProperty() {
 void VFLinearGradient::doPostProcessing(ParamPostProcessing* params) {
     const CoverageBox box = coverageOf(params);
     if (!box || !canFill(mProperty)) return;
-    const GradientTable table(mProperty->mGradient, mProperty->mGradientCount);
+    const CpuLevel level = chosenLevel();
+    const RampLoops& loops = rampLoops(level);
+    const GradientTable table(loops, mProperty->mGradient, mProperty->mGradientCount);
 
     const auto w = static_cast<float>(box.width);
     const auto h = static_cast<float>(box.height);
@@ -54,7 +56,7 @@ void VFLinearGradient::doPostProcessing(ParamPostProcessing* params) {
     const float step = (256.0F / mProperty->mScale) / lengthAcross(angle, w, h);
     const LinearRamp ramp = {table.pixels(), portableCos(angle) * step, portableSin(angle) * step,
                              w * 0.5F, h * 0.5F};
-    fillCovered(box, params->dstBitmap, [&](const BlendJob& job) { rampLoops().linear(job, ramp); });
+    fillCovered(level, box, params->dstBitmap, [&](const BlendJob& job) { loops.linear(job, ramp); });
 }
 
 }  // namespace VFontEffect

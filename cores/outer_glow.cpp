@@ -29,11 +29,11 @@ int VFOuterGlow::getOffset() {
 }
 
 void VFOuterGlow::makeColorLUT(unsigned int* table, float fadeStart, int curve) {
-    fillGlowTable(GlowRecord::of(mProperty), fadeStart, curve, table);
+    fillGlowTable(chosenLevel(), GlowRecord::of(mProperty), fadeStart, curve, table);
 }
 
 void VFOuterGlow::increaseByBoxFilter(unsigned char* mask, int passes, int width, int height) {
-    growByBoxFilter(mask, passes, width, height);
+    growByBoxFilter(chosenLevel(), mask, passes, width, height);
 }
 
 void VFOuterGlow::doPostProcessing(ParamPostProcessing* params) {

@@ -61,21 +61,21 @@ void VFOuterShadow::doPostProcessing(ParamPostProcessing* params) {
     const CoverageBox box = coverageOf(params);
     if (!box || mProperty == nullptr || exceedsSizeLimit(mProperty->mSize)) return;
 
-    const PlacedTarget target(params->dstBitmap, box.left + mOffsetX, box.top + mOffsetY);
-    const int radius = shadowRadius(mProperty->mSize);
-    const Box window = target.seen(expanded(wholeOf(box), radius));
-    if (window.empty()) return;
-    // Without blur the coverage itself is the shadow.
+    const CpuLevel level = chosenLevel();
+    const PlacedTarget target(level, params->dstBitmap, box.left + mOffsetX, box.top + mOffsetY);
     const uint32_t color = mProperty->mColor;
-    if (radius == 0) {
-        return target.paintBeneath(window, box.row(window.top) + window.left, box.mask.width, color);
-    }
+    const int radius = shadowRadius(mProperty->mSize);
+    // Without blur the coverage itself is the shadow.
+    if (radius == 0) return target.paintCoverage(&BlendLoops::dstOverMask, box.rows(), 0, 0, color);
+    const Box window = target.seen(expanded(wholeOf(box.rows()), radius));
+    if (window.empty()) return;
 
-    blurDownThenAcross(
-        shadowWeights(radius), sourceOf(box), window, kNoFullColumns, false,
-        [&](int64_t y, int64_t rows, const uint8_t* values, int64_t stride) {
-            target.paintBeneath({window.left, y, window.right, y + rows}, values, stride, color);
-        });
+    const BlurWeights weights = gaussianOf100(radius);
+    BlurPlan blur(level, BlurInput::down(weights, box.rows(), window, kNoFullColumns, false));
+    if (!blur) return;
+    forBands(blur, window, [&](const Box& band, const BlurredRows& rows) {
+        target.paint(&BlendLoops::dstOverMask, band, rows.values, rows.stride, color);
+    });
 }
 
 }  // namespace VFontEffect

@@ -2,7 +2,7 @@
 
 #include <cstdint>
 
-#include "core/numeric.h"
+#include "core/coverage_rows.h"
 #include "core/views.h"
 #include "voreleffect/VFECore.h"
 
@@ -19,8 +19,10 @@ struct CoverageBox {
 
     explicit operator bool() const { return static_cast<bool>(mask); }
 
-    /// First of the `width` coverage bytes of row y of the box.
-    unsigned char* row(int64_t y) const { return mask.at(left, top + y); }
+    /// The box as operators read it.
+    CoverageRows rows(uint8_t invertMask = kAsIs) const {
+        return {mask.at(left, top), mask.width, width, height, invertMask};
+    }
 
     static CoverageBox of(const MaskView& mask, int64_t left, int64_t top, int64_t width,
                           int64_t height) {

@@ -4,9 +4,10 @@
 
 #include "blend/blend_loops.h"
 #include "blend/job.h"
+#include "core/assert.h"
 #include "core/box.h"
+#include "core/coverage_rows.h"
 #include "core/views.h"
-#include "cores/paint_input.h"
 
 namespace VFontEffect::internal {
 
@@ -14,43 +15,46 @@ namespace VFontEffect::internal {
 class PlacedTarget {
   public:
     /// The picture's origin lies at (left, top) of the destination.
-    PlacedTarget(const VFBitmap* destination, int64_t left, int64_t top)
-        : mPixels(ColourView::of(destination)), mLeft(left), mTop(top) {}
+    PlacedTarget(CpuLevel level, const VFBitmap* destination, int64_t left, int64_t top)
+        : mLoops(blendLoops(level)), mPixels(ColourView::of(destination)), mLeft(left), mTop(top) {}
 
     /// The part of the picture that lies on the destination; empty for one that cannot be trusted.
     Box seen(const Box& part) const {
         return intersection(part, translated({0, 0, mPixels.width, mPixels.height}, -mLeft, -mTop));
     }
 
-    /// A job on a part that is seen, with nothing to paint yet.
-    BlendJob jobOn(const Box& part) const {
-        return internal::jobOn(mPixels, translated(part, mLeft, mTop));
-    }
-
-    /// A job that paints through a mask of the part's size.
+    /// A job on a part that is seen, through a mask of the part's size.
     BlendJob jobOn(const Box& part, const uint8_t* mask, int64_t stride) const {
-        BlendJob job = jobOn(part);
+        VOREL_ASSERT(!part.empty() && seen(part) == part);
+        BlendJob job = internal::jobOn(mPixels, translated(part, mLeft, mTop));
         job.mask = mask;
         job.maskStride = stride;
         return job;
     }
 
-    /// Paints one colour through a mask of the part's size beneath what is there.
-    void paintBeneath(const Box& part, const uint8_t* mask, int64_t stride, uint32_t color) const {
+    /// Paints one colour through such a mask.
+    void paint(BlendLoop BlendLoops::*rule, const Box& part, const uint8_t* mask, int64_t stride,
+               uint32_t color) const {
         BlendJob job = jobOn(part, mask, stride);
         job.color = color;
-        blendLoops().dstOverMask(job);
+        (mLoops.*rule)(job);
+    }
+
+    /// Paints one colour through coverage whose first pixel lies at (x, y) of the picture, where it is
+    /// seen.
+    void paintCoverage(BlendLoop BlendLoops::*rule, const CoverageRows& coverage, int64_t x, int64_t y,
+                       uint32_t color) const {
+        const Box part = seen(translated(wholeOf(coverage), x, y));
+        if (part.empty()) return;
+        const uint8_t* const mask = coverage.start + (part.top - y) * coverage.stride + (part.left - x);
+        paint(rule, part, mask, coverage.stride, color);
     }
 
   private:
+    const BlendLoops& mLoops;
     ColourView mPixels;
     int64_t mLeft;
     int64_t mTop;
 };
-
-/// The whole of a box, in its own coordinates.
-inline Box wholeOf(const CoverageBox& box) {
-    return {0, 0, box.width, box.height};
-}
 
 }  // namespace VFontEffect::internal

@@ -29,13 +29,15 @@ VFProperty* VFRadialGradient::getProperty() {
 void VFRadialGradient::doPostProcessing(ParamPostProcessing* params) {
     const CoverageBox box = coverageOf(params);
     if (!box || !canFill(mProperty)) return;
-    const GradientTable table(mProperty->mGradient, mProperty->mGradientCount);
+    const CpuLevel level = chosenLevel();
+    const RampLoops& loops = rampLoops(level);
+    const GradientTable table(loops, mProperty->mGradient, mProperty->mGradientCount);
 
     // Deliberate: the radius is measured by the width alone, so a tall box ends in a plain colour.
     const auto w = static_cast<float>(box.width);
     const float step = (256.0F / w + 256.0F / w) / mProperty->mScale;
     const RadialRamp ramp = {table.pixels(), step, w * 0.5F, static_cast<float>(box.height) * 0.5F};
-    fillCovered(box, params->dstBitmap, [&](const BlendJob& job) { rampLoops().radial(job, ramp); });
+    fillCovered(level, box, params->dstBitmap, [&](const BlendJob& job) { loops.radial(job, ramp); });
 }
 
 }  // namespace VFontEffect

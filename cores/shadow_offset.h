@@ -4,6 +4,8 @@
 
 #include "core/numeric.h"
 #include "core/portable_math.h"
+#include "core/size_limit.h"
+#include "ops/blur/blur_weights.h"
 
 /// What both shadows derive from their record.
 namespace VFontEffect::internal {
@@ -22,6 +24,9 @@ inline ShadowOffset shadowOffset(float angleDeg, float distancePx) {
     const float down = portableSin(angle) * distancePx;
     return {toInt((across < 0.0F ? 0.5F : -0.5F) - across), toInt(down + (down > 0.0F ? 0.5F : -0.5F))};
 }
+
+static_assert(totalBound(100, static_cast<uint32_t>(kLargestSizePx)) <= kLargestTotal,
+              "a shadow of the size limit divides by reciprocals");
 
 /// The blur radius of a shadow; a negative size does not blur.
 inline int shadowRadius(float sizePx) {

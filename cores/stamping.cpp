@@ -2,7 +2,7 @@
 #include <cstddef>
 #include <cstdint>
 
-#include "ops/dilate/dilation_loops.h"
+#include "core/coverage_rows.h"
 #include "voreleffect/VFECore.h"
 
 /// Grey-scale dilation by the anti-aliased disc, stamped: every source pixel of coverage c raises
@@ -26,13 +26,30 @@ bool fitsTogether(const Work& work) {
            work.planeHeight >= work.sourceHeight + border;
 }
 
-/// Stamps the band of rows into the plane. `invertMask` kInverse takes the inverse of the coverage.
+/// Raises what lies under the disc whose corner is at (x, y) of the plane.
+void stampDisc(const Work& work, unsigned char* plane, int64_t x, int64_t y, int coverage) {
+    for (int64_t row = 0; row < work.kernelSide; ++row) {
+        const unsigned char* const weights = work.kernel + row * work.kernelSide;
+        unsigned char* const target = plane + (y + row) * work.planeWidth + x;
+        for (int64_t i = 0; i < work.kernelSide; ++i) {
+            const int stamped = coverage - (255 - weights[i]);
+            if (stamped > target[i]) target[i] = static_cast<unsigned char>(stamped);
+        }
+    }
+}
+
+/// Stamps the band of rows, each byte ^ invertMask, into the plane.
 int stampBand(const Work& work, unsigned char* plane, uint8_t invertMask) {
-    const int firstRow = std::max(work.firstRow, 0);
-    const int endRow = std::min(work.endRow, work.sourceHeight);
+    const int64_t firstRow = std::max(work.firstRow, 0);
+    const int64_t endRow = std::min(work.endRow, work.sourceHeight);
     if (firstRow >= endRow) return 0;
-    dilationLoops().stamp({work.source, work.sourceWidth, firstRow, endRow, invertMask, work.kernel,
-                           work.kernelSide, plane, work.planeWidth});
+    for (int64_t y = firstRow; y < endRow; ++y) {
+        for (int64_t x = 0; x < work.sourceWidth; ++x) {
+            const int coverage = work.source[y * work.sourceWidth + x] ^ invertMask;
+            // The disc's centre lies half its side further on both axes: its corner is at (x, y).
+            if (coverage != 0) stampDisc(work, plane, x, y, coverage);
+        }
+    }
     return 1;
 }
 
@@ -42,7 +59,7 @@ int stampWork(const void* work, bool outside, bool inside) {
     if (!fitsTogether(w)) return 0;
     const ptrdiff_t planeBytes = static_cast<ptrdiff_t>(w.planeWidth) * w.planeHeight;
     int done = 0;
-    if (outside) done = stampBand(w, w.plane, kCoverage);
+    if (outside) done = stampBand(w, w.plane, kAsIs);
     if (inside) done = stampBand(w, outside ? w.plane + planeBytes : w.plane, kInverse);
     return done;
 }

@@ -2,17 +2,14 @@
 #include <cstdint>
 #include <optional>
 
-#include "core/blend_modes.h"
 #include "core/effect_types.h"
-#include "core/line_buffer.h"
 #include "core/numeric.h"
 #include "core/size_limit.h"
 #include "cores/paint_input.h"
 #include "cores/placed_target.h"
 #include "cores/property_copy.h"
-#include "ops/dilate/dilation_loops.h"
+#include "ops/dilate/dilation_plan.h"
 #include "ops/dilate/disc_shape.h"
-#include "voreleffect/VFBlender.h"
 #include "voreleffect/VFECore.h"
 
 namespace VFontEffect {
@@ -21,85 +18,25 @@ using namespace internal;
 
 namespace {
 
-/// The dilation takes its source with a border of one pixel.
-constexpr int64_t kBorder = 1;
-
-/// Rows that are dilated and blended at once: few enough to stay in the cache.
-constexpr int64_t kBandRows = 32;
-
-/// The part of an outline that at least one of the targets shows, in the coordinates of the bordered
-/// source.
-Box visiblePart(const CoverageBox& box, int64_t reach, const VFECore::ParamPostProcessing& params) {
-    const Box bordered = {0, 0, box.width + 2 * kBorder, box.height + 2 * kBorder};
-    Box visible = {};
-    for (const VFBitmap* target : {params.dstBitmap, params.subDstBitmap}) {
-        const PlacedTarget placed(target, box.left - kBorder, box.top - kBorder);
-        visible = boundingBox(visible, placed.seen(expanded(bordered, reach)));
-    }
-    return visible;
-}
-
-/// The coverage, or its inverse, grown by a disc; empty when memory ran out.
-class GrownCoverage {
-  public:
-    GrownCoverage(const CoverageBox& box, const DiscShape& disc, const Box& part, uint8_t invertMask)
-        : mDilation(dilationOf(box, disc, part, invertMask)),
-          mMemory(dilationLoops().memoryBytes(mDilation)) {
-        mDilation.memory = mMemory.data();
-        if (mMemory) dilationLoops().begin(mDilation);
-    }
-
-    explicit operator bool() const { return static_cast<bool>(mMemory); }
-    const Dilation& dilation() const { return mDilation; }
-    uint8_t* rows(int64_t y, int64_t count) const {
-        return dilationLoops().dilateRows(mDilation, y, count);
-    }
-
-  private:
-    static Dilation dilationOf(const CoverageBox& box, const DiscShape& disc, const Box& part,
-                               uint8_t invertMask) {
-        Dilation dilation = {};
-        dilation.box = box.row(0);
-        dilation.boxStride = box.mask.width;
-        dilation.width = box.width + 2 * kBorder;
-        dilation.height = box.height + 2 * kBorder;
-        dilation.invertMask = invertMask;
-        dilation.disc = &disc;
-        dilation.left = std::min<int64_t>(part.left, 0);
-        dilation.right = std::max(part.right, dilation.width);
-        dilation.top = part.top;
-        dilation.bandRows = std::min(kBandRows, part.height());
-        return dilation;
-    }
-
-    Dilation mDilation;
-    LineBuffer mMemory;
-};
-
 /// The outline's coverage, a band of rows at a time; empty when memory ran out. What is centred lies
 /// within the disc's radius of the edge on both sides of it.
 class Outline {
   public:
-    Outline(const CoverageBox& box, const DiscShape& disc, const Box& part, int position)
-        : mGrown(box, disc, part, position == kStrokeInside ? kInverse : kCoverage) {
-        if (position == kStrokeCentre) mInverse.emplace(box, disc, part, kInverse);
+    Outline(CpuLevel level, const CoverageBox& box, const DiscShape& disc, const Box& part, int position)
+        : mGrown(level, box.rows(position == kStrokeInside ? kInverse : kAsIs), disc, part) {
+        if (position == kStrokeCentre) mInverse.emplace(level, box.rows(kInverse), disc, part);
     }
 
     explicit operator bool() const { return mGrown && (!mInverse || *mInverse); }
-    int64_t left() const { return mGrown.dilation().left; }
-    int64_t width() const { return mGrown.dilation().right - left(); }
-    int64_t stride() const { return dilatedStride(mGrown.dilation()); }
-    int64_t bandRows() const { return mGrown.dilation().bandRows; }
-
-    uint8_t* band(int64_t y, int64_t count) {
-        uint8_t* const band = mGrown.rows(y, count);
-        if (mInverse) dilationLoops().keepSmaller(band, mInverse->rows(y, count), stride() * count);
-        return band;
+    int64_t left() const { return mGrown.left(); }
+    int64_t bandRows() const { return mGrown.bandRows(); }
+    CoverageRows rows(int64_t y, int64_t count) {
+        return mInverse ? mGrown.smallerRows(*mInverse, y, count) : mGrown.rows(y, count);
     }
 
   private:
-    GrownCoverage mGrown;
-    std::optional<GrownCoverage> mInverse;
+    DilationPlan mGrown;
+    std::optional<DilationPlan> mInverse;
 };
 
 }  // namespace
@@ -133,22 +70,22 @@ void VFStroke::doPostProcessing(ParamPostProcessing* params) {
     const bool outside = mProperty->mPosition == kStrokeOutside;
     const DiscShape disc(centred ? mProperty->mSize * 0.5F : mProperty->mSize);
     if (!disc) return;
-    const Box visible = visiblePart(box, disc.reach, *params);
+    const CpuLevel level = chosenLevel();
+    const PlacedTarget targets[] = {{level, params->dstBitmap, box.left, box.top},
+                                    {level, params->subDstBitmap, box.left, box.top}};
+    const Box reached = DilationPlan::reached(box.rows(), disc);
+    const Box visible = boundingBox(targets[0].seen(reached), targets[1].seen(reached));
     if (visible.empty()) return;
-    Outline outline(box, disc, visible, centred || outside ? mProperty->mPosition : kStrokeInside);
+    Outline outline(level, box, disc, visible,
+                    centred || outside ? mProperty->mPosition : kStrokeInside);
     if (!outline) return;
 
-    const int left = saturateToInt(box.left - kBorder + outline.left());
-    const int width = saturateToInt(outline.width());
-    const int stride = saturateToInt(outline.stride());
-    const int mode = centred && params->useOuterLayer != 1 ? kModeSrcOver : kModeDstOver;
+    const bool overText = centred && params->useOuterLayer != 1;
+    const auto rule = overText ? &BlendLoops::srcOverMask : &BlendLoops::dstOverMask;
     for (int64_t y = visible.top; y < visible.bottom; y += outline.bandRows()) {
-        const int64_t count = std::min(outline.bandRows(), visible.bottom - y);
-        uint8_t* const band = outline.band(y, count);
-        for (const VFBitmap* target : {params->dstBitmap, params->subDstBitmap}) {
-            VFBlender().drawBitmapBlend8(left, saturateToInt(box.top - kBorder + y), target, band, width,
-                                         static_cast<int>(count), stride, mProperty->mColor, mode);
-        }
+        const CoverageRows band = outline.rows(y, std::min(outline.bandRows(), visible.bottom - y));
+        for (const PlacedTarget& target : targets)
+            target.paintCoverage(rule, band, outline.left(), y, mProperty->mColor);
     }
 }
 

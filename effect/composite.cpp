@@ -24,7 +24,7 @@ void mergeLayers(const ColourView& destination, const ColourView& outer, const M
     job.mask = mask.data;
     job.width = destination.width * destination.height;
     job.height = 1;
-    blendLoops().mixByCoverage(job);
+    blendLoops(chosenLevel()).mixByCoverage(job);
 }
 
 }  // namespace

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <cstdint>
+
 /// Levels of the instruction set. The sources of the inner loops are compiled once for each level of
 /// the machine's kind, each time in a namespace of the level's name (VOREL_LEVEL), and picked when the
 /// process runs. All levels give the same bytes.
@@ -32,6 +34,9 @@ constexpr int kPlainestLevel = 1;
 #else
 constexpr int kPlainestLevel = 0;
 #endif
+
+/// Bytes of the longest vector of any level.
+constexpr int64_t kWidestVector = 64;
 
 /// Whether this CPU, and the system's kernel, have what the level's code needs.
 bool runsHere(CpuLevel level);

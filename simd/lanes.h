@@ -18,41 +18,47 @@
 
 #include "simd/lanes_default.h"
 
+// clang-format off
 /// Lanes: what a level of the instruction set must provide beside its width, VOREL_VECTOR_BYTES, and
 /// what vectors.h has for all. A level is one file, lanes_<level>.h; what stands in brackets it may
 /// leave to lanes_default.h. All levels give the same bytes: the scalar one is what the tests compare
 /// with.
 ///
-/// | operation                     | result | | ----------------------------- |
-/// -------------------------------------------------------------------- | | addSaturated, subSaturated
-/// | bytes: a + b, at most 255; a - b, at least 0                           | | multiplyHigh | the upper
-/// 16 bits of products of 16-bit lanes                          | | allZero                       |
-/// whether no lane holds anything but 0                                   | | nonZeroLanes, kLaneBits |
-/// kLaneBits ones for each byte but 0, the first one's lowest             | | toInt | as core/numeric.h
-/// converts: toward zero, saturating, NaN to 0          | | squareRoot                    | correctly
-/// rounded                                                    | | [timesFactor, kNumberBias]    |
-/// numbers below 2^23, stored with the bias added, as floats, times a     | | | factor, rounded once |
-/// | [loadFirst]                   | 1 to kBytes bytes of memory, zeros after them | | [gather] | the
-/// words of a table at kU32Lanes indices, in a vector or in bytes     | | [gatherNear] | the same from a
-/// table of `size` words, 32 at least, by indices that    | |                               | mostly lie
-/// close together: looked up in registers then               | | widenLow, widenHigh           | the
-/// first, the second half of the bytes, each byte in 16 bits          | | narrow | 16-bit lanes of at
-/// most 255 as bytes: the first vector's, the second's | | interleaveLow, interleaveHigh | the lanes of
-/// two vectors in turn, from their lower, their upper ends;  | |                               | AVX
-/// does so in each 128 bits by itself                               | | pack                          |
-/// lanes of at most 255 in half the width, as before interleaving         | | pairSums | of each two
-/// neighbouring bytes                                       | | quarters                      | a
-/// quarter of each 16-bit lane, at most 255, from two vectors in turn   |
+/// | operation                     | result                                                               |
+/// | ----------------------------- | -------------------------------------------------------------------- |
+/// | addSaturated, subSaturated    | bytes: a + b, at most 255; a - b, at least 0                         |
+/// | multiplyHigh                  | the upper 16 bits of products of 16-bit lanes                        |
+/// | allZero                       | whether no lane holds anything but 0                                 |
+/// | nonZeroLanes, kLaneBits       | kLaneBits ones for each byte but 0, the first one's lowest           |
+/// | toInt                         | as core/numeric.h converts: toward zero, saturating, NaN to 0        |
+/// | squareRoot                    | correctly rounded                                                    |
+/// | [timesFactor, kNumberBias]    | numbers below 2^23, stored with the bias added, as floats, times a   |
+/// |                               | factor, rounded once                                                 |
+/// | [loadFirst]                   | 1 to kBytes bytes of memory, zeros after them                        |
+/// | [gather]                      | the words of a table at kU32Lanes indices, in a vector or in bytes   |
+/// | [gatherNear]                  | the same from a table of `size` words, 32 at least, by indices that  |
+/// |                               | mostly lie close together: looked up in registers then               |
+/// | widenLow, widenHigh           | the first, the second half of the bytes, each byte in 16 bits        |
+/// | narrow                        | 16-bit lanes of at most 255 as bytes: the first vector's, the second's |
+/// | interleaveLow, interleaveHigh | the lanes of two vectors in turn, from their lower, their upper ends; |
+/// |                               | AVX does so in each 128 bits by itself                               |
+/// | pack                          | lanes of at most 255 in half the width, as before interleaving       |
+/// | pairSums                      | of each two neighbouring bytes                                       |
+/// | quarters                      | a quarter of each 16-bit lane, at most 255, from two vectors in turn |
 ///
 /// Dot products of taps, four to a word:
 ///
-/// | [Taps, tapsOf]                | four taps in each word, made of bytes | | [WeightCell, cellOf] |
-/// what stands for a weight: made of the plain weights (at most 128) from | | | that one on | |
-/// [Weights, weightsAt]          | the string of cells that begins there | | addDots<i>(sums, taps, w)
-/// | adds to each word its four taps times the i-th four weights (0..3)     | | kTapBias | taps are
-/// stored as tap ^ kTapBias: a sum is then too small by the bias | |                               |
-/// times the total of the weights                                       | | [VOREL_DOT_PRODUCTS] | said
-/// where addDots is one instruction                                |
+/// | operation                     | result                                                               |
+/// | ----------------------------- | -------------------------------------------------------------------- |
+/// | [Taps, tapsOf]                | four taps in each word, made of bytes                                |
+/// | [WeightCell, cellOf]          | what stands for a weight: made of the plain weights (at most 128)    |
+/// |                               | from that one on                                                     |
+/// | [Weights, weightsAt]          | the string of cells that begins there                                |
+/// | addDots<i>(sums, taps, w)     | adds to each word its four taps times the i-th four weights (0..3)   |
+/// | kTapBias                      | taps are stored as tap ^ kTapBias: a sum is then too small by the    |
+/// |                               | bias times the total of the weights                                  |
+/// | [VOREL_DOT_PRODUCTS]          | said where addDots is one instruction                                |
 ///
 /// and pixels, in one of two forms: pixels_packed.h (which asks for loadInPairs, highBytesInPairs and
 /// swapRedBlue) or pixels_planar.h.
+// clang-format on

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <climits>
+
 #include "simd/lanes.h"
 
 /// Numbers that depend on the level: which method suits what, and how much is done at a time. None of them
@@ -25,13 +27,13 @@ constexpr int kStepsAtOnce = 1;
 // Up to this radius dot products take less time than differences of the weights, which cost about the same
 // whatever the radius.
 #if defined(VOREL_DOT_PRODUCTS) && defined(VOREL_PLANAR_PIXELS)
-constexpr int kLargestDotRadius = 90;
+constexpr int kLargestDotRadius = INT_MAX;
 #elif defined(VOREL_DOT_PRODUCTS)
 constexpr int kLargestDotRadius = 72;
 #elif defined(__AVX2__)
 constexpr int kLargestDotRadius = 20;
 #else
-constexpr int kLargestDotRadius = 12;
+constexpr int kLargestDotRadius = 15;
 #endif
 
 // Up to this reach of the disc a dilation by spreading takes less time than one by tiles, whose vectors are

@@ -2,52 +2,43 @@
 
 #include <algorithm>
 #include <cstdint>
+#include <optional>
 
+#include "ops/blur/blur_input.h"
 #include "ops/blur/difference_blur.h"
 #include "ops/blur/dot_blur.h"
 
-/// The blur by the method that takes less.
 namespace VFontEffect::internal {
 
-/// Running sums keep up to 256 bytes for each row or column of a strip: no longer ones than this.
-constexpr int64_t kLongestDifferenceSide = 1 << 16;
+/// A separable blur, planned once: the strategy, the weights in its form, and the working memory. It is
+/// ready, or empty when memory ran out.
+class BlurPlan {
+  public:
+    BlurPlan(CpuLevel level, const BlurInput& input);
 
-inline bool suitsDifferences(const BlurWeights& kernel, const BlurSource& source, const Box& window) {
-    const int64_t longest =
-        std::max(std::max(source.width, source.height), std::max(window.width(), window.height()));
-    return kernel.radius > dotLoops().largestDotRadius && longest <= kLongestDifferenceSide;
-}
+    explicit operator bool() const;
 
-/// Runs a blur, if there is memory for it.
-template <class Blur, class Run>
-bool runIfThere(Blur blur, Run run) {
-    if (!blur) return false;
-    run(blur);
-    return true;
-}
+    /// Rows that are asked for at once; the last ones may be fewer.
+    int64_t bandRows() const;
 
-/// Blurs the columns of the source first and then its rows, each pass rounding down, and calls paint(y,
-/// rows, values, stride) for some rows of the window at a time. What lies around the source is 0, but
-/// for the full columns. `inverted` gives 255 minus the mean of the second pass, rounded down as a
-/// whole. Returns false, with nothing painted, when memory ran out.
+    /// `count` rows of results from row y of the source on, first column that of the window. Bands are
+    /// asked for in order, from the window's top on. The rows may be changed, and stay until the next
+    /// call.
+    BlurredRows rows(int64_t y, int64_t count);
+
+  private:
+    std::optional<DotBlur> mDots;
+    std::optional<DifferenceBlur> mDifferences;
+    int64_t mNextRow;
+};
+
+/// Calls paint(part, rows) for all bands of the window, `part` being a band's box.
 template <class Paint>
-bool blurDownThenAcross(const BlurWeights& kernel, const BlurSource& source, const Box& window,
-                        const FullColumns& full, bool inverted, Paint paint) {
-    const auto run = [&](auto& blur) { blur.run(inverted, paint); };
-    if (suitsDifferences(kernel, source, window))
-        return runIfThere(DifferenceDownThenAcross(kernel, source, window, full), run);
-    return runIfThere(DownThenAcross(kernel, source, window, full), run);
-}
-
-/// Blurs the rows of the source's inverse first and then its columns, each pass rounding down, and
-/// paints as above. What lies around the source is 255 in its inverse.
-template <class Paint>
-bool blurAcrossThenDown(const BlurWeights& kernel, const BlurSource& source, const Box& window,
-                        Paint paint) {
-    const auto run = [&](auto& blur) { blur.run(paint); };
-    if (suitsDifferences(kernel, source, window))
-        return runIfThere(DifferenceAcrossThenDown(kernel, source, window), run);
-    return runIfThere(AcrossThenDown(kernel, source, window), run);
+void forBands(BlurPlan& plan, const Box& window, Paint paint) {
+    for (int64_t y = window.top; y < window.bottom; y += plan.bandRows()) {
+        const int64_t count = std::min(plan.bandRows(), window.bottom - y);
+        paint(Box{window.left, y, window.right, y + count}, plan.rows(y, count));
+    }
 }
 
 }  // namespace VFontEffect::internal

@@ -15,30 +15,28 @@ constexpr float kLn100 = 4.60517F;
 /// `round` turns the exponential of a tap into its whole weight.
 template <class Round>
 BlurWeights makeWeights(int radius, uint32_t centre, Round round) {
-    BlurWeights kernel = {PixelBuffer<uint32_t>::uninitialised(int64_t{radius} + 1), radius, centre};
-    if (!kernel) return kernel;
-    kernel.weights[0] = centre;
+    BlurWeights weights = {PixelBuffer<uint32_t>::uninitialised(int64_t{radius} + 1), radius, centre};
+    if (!weights) return weights;
+    weights.byDistance[0] = centre;
     const float spread = static_cast<float>(radius) * static_cast<float>(radius) / kLn100;
     for (int i = 1; i <= radius; ++i) {
         const auto weight =
             static_cast<uint32_t>(round(portableExp(static_cast<float>(-(i * i)) / spread)));
-        kernel.weights[static_cast<size_t>(i)] = weight;
-        kernel.total += 2 * weight;
+        weights.byDistance[static_cast<size_t>(i)] = weight;
+        weights.total += 2 * weight;
     }
-    return kernel;
+    return weights;
 }
 
 }  // namespace
 
-BlurWeights shadowWeights(int radius) {
-    return makeWeights(radius, kShadowScale,
-                       [](float tap) { return toInt(tap * static_cast<float>(kShadowScale) + 0.5F); });
+BlurWeights gaussianOf100(int radius) {
+    return makeWeights(radius, 100, [](float tap) { return toInt(tap * 100.0F + 0.5F); });
 }
 
-BlurWeights glowWeights(int radius) {
-    return makeWeights(radius, kGlowScale, [](float tap) {
-        return toInt(static_cast<double>(tap * static_cast<float>(kGlowScale)) + 0.5);
-    });
+BlurWeights gaussianOf128(int radius) {
+    return makeWeights(radius, 128,
+                       [](float tap) { return toInt(static_cast<double>(tap * 128.0F) + 0.5); });
 }
 
 float inverseAbove(uint32_t total) {

@@ -1,22 +1,21 @@
 #pragma once
 
-#include <algorithm>
 #include <cstdint>
+#include <optional>
 
 #include "core/line_buffer.h"
 #include "core/numeric.h"
 #include "core/pixel_buffer.h"
-#include "ops/blur/blur_weights.h"
+#include "ops/blur/blur_input.h"
 #include "ops/blur/difference_loops.h"
 #include "ops/blur/reached_source.h"
 
-/// The blur by running sums, for wide kernels.
 namespace VFontEffect::internal {
 
-/// A difference of a kernel as a sum of few lines.
-class KernelTerms {
+/// The second difference of weights as a sum of few lines.
+class WeightTerms {
   public:
-    explicit KernelTerms(const BlurWeights& kernel);
+    WeightTerms(const DifferenceLoops& loops, const BlurWeights& weights);
 
     /// Whether there is memory for it.
     explicit operator bool() const { return static_cast<bool>(mMemory); }
@@ -27,107 +26,75 @@ class KernelTerms {
     DifferenceTerms mTerms;
 };
 
-/// What both orders of the passes need.
-class DifferencePasses {
+/// A wide blur, by differences of the weights: either order of the passes is the same loop over strips a
+/// vector wide, `side` lanes, from a strip of the source to a strip of the intermediate plane and from
+/// there to one of results.
+///
+/// The lanes of the first pass are the source's columns, or its rows, transposed. It stores its results
+/// transposed, so that in the intermediate plane a strip is as long as there are lanes, each a line of
+/// `side` results: the lanes of the second pass. That one's strips are bands of results, asked for one
+/// by one, or columns of all results at once.
+class DifferenceBlur {
   public:
-    DifferencePasses(const BlurWeights& kernel, const BlurSource& source, const Box& window);
-
-    explicit operator bool() const { return static_cast<bool>(mTerms); }
-    const Box& window() const { return mWindow; }
-    const ReachedSource& source() const { return mSource; }
-    int radius() const { return mRadius; }
-
-    /// A vector's bytes, the sides of squares.
-    int64_t side() const { return mSide; }
-    int64_t inSquares(int64_t pixels) const { return roundedUp(pixels, mSide); }
-    /// The working memory of strips whose sources have up to so many rows.
-    LineBuffer linesFor(int64_t rows) const;
-
-    void blurStrip(const BlurEnding& ending, const BlurSource& source, int64_t x, LineBuffer& lines,
-                   int64_t first, int64_t count, const SquareRows& out) const;
-
-  private:
-    Box mWindow;
-    ReachedSource mSource;
-    int64_t mSide;
-    int mRadius;
-    uint32_t mTotal;
-    float mInverse;
-    KernelTerms mTerms;
-};
-
-/// Blurs the columns first and then the rows, as DownThenAcross does.
-class DifferenceDownThenAcross {
-  public:
-    DifferenceDownThenAcross(const BlurWeights& kernel, const BlurSource& source, const Box& window,
-                             const FullColumns& full);
+    DifferenceBlur(const DifferenceLoops& loops, const BlurInput& input);
 
     /// Whether there is memory for it.
-    explicit operator bool() const { return mPasses && mLines && mIntermediate && mOut; }
-
-    /// Calls paint(y, rows, values, stride) for some rows of the window at a time.
-    template <class Paint>
-    void run(bool inverted, Paint paint) {
-        blurDown();
-        const Box& window = mPasses.window();
-        for (int64_t y = 0; y < window.height(); y += mPasses.side()) {
-            blurAcross(y, inverted);
-            paint(window.top + y, std::min(mPasses.side(), window.height() - y), mOut.data(),
-                  mOutStride);
-        }
+    explicit operator bool() const {
+        return mTerms && mLines && mIntermediate && mOut && (mDownFirst || *mTransposed);
     }
 
-  private:
-    /// Between the passes there are the columns of the source, or when some of the full ones are in
-    /// reach all columns that are.
-    struct IntermediateColumns {
-        int64_t left;       // column of the source, column 0 here
-        int64_t count;      // that the second pass reads
-        int64_t allocated;  // and those of whole squares
+    /// Rows that are asked for at once.
+    int64_t bandRows() const { return mDownFirst ? mSide : mWindow.height(); }
 
-        static IntermediateColumns of(const DifferencePasses& passes, const FullColumns& full);
+    /// A band of rows from row y on, in order.
+    BlurredRows rows(int64_t y);
+
+  private:
+    /// Of a pass: `count` results from place `first` of a source of `length` places on.
+    struct Axis {
+        int64_t first;
+        int64_t count;
+        int64_t length;
     };
 
-    void blurDown();
-    void fillAround(uint8_t* band);
-    void blurAcross(int64_t y, bool inverted);
-    uint8_t* bandAt(int64_t y) { return mIntermediate.data() + y * mColumns.allocated; }
+    /// The passes, and the lanes of the intermediate plane.
+    struct Layout {
+        Axis first;
+        Axis second;
+        int64_t sourceLane;  // the first that the first pass fills
+        int64_t allocatedLanes;
+        int64_t fullBefore;  // the lanes of full columns
+        int64_t fullFrom;
 
-    DifferencePasses mPasses;
-    FullColumns mFull;
-    IntermediateColumns mColumns;
-    LineBuffer mLines;
-    LineBuffer mIntermediate;  // for each column a line of a square's side, in bands one below the other
-    int64_t mOutStride;
+        static Layout of(const BlurInput& input, const ReachedSource& source, int64_t side);
+    };
+
+    int64_t inSquares(int64_t places) const { return roundedUp(places, mSide); }
+    /// The strip of the intermediate plane whose lines begin with that result of the first pass.
+    uint8_t* strip(int64_t result) { return mIntermediate.data() + result * mLayout.allocatedLanes; }
+
+    void blurStrip(const PassEnding& ending, const CoverageRows& source, int64_t x, const Axis& axis,
+                   const SquareRows& out);
+    void firstPass();
+    void fillAround(uint8_t* strip, int64_t lanes);
+    void secondPass(int64_t result, const SquareRows& out);
+
+    const DifferenceLoops& mLoops;
+    bool mDownFirst;
+    Box mWindow;
+    PassEnding mFirst;
+    PassEnding mSecond;
+    int mRadius;
+    uint32_t mTotal;
+    int64_t mSide;
+    ReachedSource mSource;
+    Layout mLayout;
+    WeightTerms mTerms;
+    LineBuffer mLines;         // what a strip's differences are made of
+    LineBuffer mIntermediate;  // strips, one behind the other
+    int64_t mStride;
     LineBuffer mOut;
-};
-
-/// Blurs the rows of the source's inverse first and then the columns, as AcrossThenDown does.
-class DifferenceAcrossThenDown {
-  public:
-    DifferenceAcrossThenDown(const BlurWeights& kernel, const BlurSource& source, const Box& window);
-
-    explicit operator bool() const { return mPasses && mLines && mTransposed && mIntermediate && mOut; }
-
-    /// Calls paint(y, rows, values, stride) for all rows of the window.
-    template <class Paint>
-    void run(Paint paint) {
-        blurAcross();
-        blurDown();
-        paint(mPasses.window().top, mPasses.window().height(), mOut.data(), mOutStride);
-    }
-
-  private:
-    void blurAcross();
-    void blurDown();
-
-    DifferencePasses mPasses;
-    LineBuffer mLines;
-    LineBuffer mTransposed;  // rows of the source, as many as a square has
-    int64_t mStripBytes;
-    LineBuffer mIntermediate;  // for each row a line of a square's side, in strips one beside the other
-    int64_t mOutStride;
-    LineBuffer mOut;
+    std::optional<LineBuffer> mTransposed;  // a strip of the source's rows, where they are the lanes
 };
 
 }  // namespace VFontEffect::internal

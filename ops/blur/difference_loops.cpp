@@ -3,23 +3,35 @@
 #include <cstdint>
 #include <cstring>
 
+#include "core/assert.h"
 #include "ops/blur/quotients.h"
 #include "ops/blur/source_strip.h"
 #include "simd/lanes.h"
 #include "simd/unrolled.h"
 
-/// Wide blurs by running sums.
+/// Wide blurs by differences of the weights.
 ///
-/// Between neighbouring results a sum changes by the first difference of the kernel over the taps, that
-/// one by the second difference, and so on. The weights are whole numbers that rise to 100 or 128 and
-/// fall again, whatever the radius: their second difference is hardly anything but -1, 0 and 1, and its
-/// absolute values add up to a fraction of the taps; for smaller radii so do those of the third. A
-/// result takes as many additions of 16 bits, and two or three more to add up the differences. Where two
-/// taps at a fixed distance have one sign, or opposite ones, a line of their sums, or differences, made
-/// once for all results, counts for both.
+/// Let t(y) be the taps of a column and w(k) the weights, 0 beyond the radius. The result at y is the
+/// sum
 ///
-/// Exactness: all differences are whole numbers. The first one is at most 255 * 128 and fits in 16 bits
-/// with its sign, however the higher ones wrap; sums have 32 bits.
+///     S(y) = sum over k of w(k) t(y + k),
+///
+/// and what it changes by from one result to the next, and what that changes by, are sums over the same
+/// taps with the differences of the weights:
+///
+///     D1(y) = S(y) - S(y - 1)   = sum of (w(k) - w(k + 1)) t(y + k)
+///     D2(y) = D1(y) - D1(y - 1) = sum of (w(k) - 2 w(k + 1) + w(k + 2)) t(y + k)
+///
+/// so that  D1(y) = D1(y - 1) + D2(y)  and  S(y) = S(y - 1) + D1(y).
+///
+/// The weights are whole numbers that rise to 100 or 128 and fall again, whatever the radius: their
+/// second difference is hardly anything but -1, 0 and 1, and its absolute values add up to a fraction of
+/// the taps. D2 takes as many additions of 16 bits, D1 and S one each. Where two taps at a fixed
+/// distance have one sign, or opposite ones, a line of their sums, or differences, made once for all
+/// results, counts for both.
+///
+/// Exactness: all of these are whole numbers. |D1| is at most 255 * 128 and fits in 16 bits with its
+/// sign, however D2 wraps; S has 32 bits.
 ///
 /// Cost: 20 to 40 additions a pixel and pass up to a radius of 40, 60 at 100. Lanes are columns. The
 /// results are transposed in squares, so that lanes are rows then, and the pass across is this one
@@ -27,7 +39,7 @@
 namespace VFontEffect::internal::VOREL_LEVEL {
 namespace {
 
-constexpr int64_t kLineBytes = kDifferencePixelBytes * kBytes;
+constexpr int64_t kLineBytes = kLinePixelBytes * kBytes;
 constexpr int64_t kRowBytes = kLinesOfRow * kLineBytes;
 
 /// The halves of a line.
@@ -143,7 +155,7 @@ struct FourLines {
             });
         }
     }
-    /// Differences of a lower order, of which `last` is the one before.
+    /// Makes first differences of the second ones; `last` is that of the row before.
     VOREL_INLINE void addUp(Line& last) {
         unrolled<kDifferenceRows>([&](auto i) VOREL_INLINE_LAMBDA {
             last.add(lines[i.value]);
@@ -154,17 +166,15 @@ struct FourLines {
 
 class StripSum {
   public:
-    StripSum(const DifferenceSum& sum, const Rows& rows, int64_t inkEnd)
+    StripSum(const DifferencePass& pass, const Rows& rows, int64_t inkEnd)
         : mRows(rows),
           mInkEnd(inkEnd),
-          mOrder(sum.terms.order),
-          mAdded(sum.terms.added),
-          mTakenAway(sum.terms.takenAway),
-          mSecond{},
+          mAdded(pass.terms.added),
+          mTakenAway(pass.terms.takenAway),
           mFirst{},
-          mInverse(splat<F32s>(sum.inverse)),
-          mInvertMask(splat<U8s>(sum.ending.invertMask)) {
-        const uint32_t rounding = sum.ending.roundsUp ? sum.total - 1 : 0;
+          mInverse(splat<F32s>(pass.inverse)),
+          mInvertMask(splat<U8s>(pass.ending.invertMask)) {
+        const uint32_t rounding = pass.ending.roundsUp ? pass.total - 1 : 0;
         for (U32s& words : mSums)
             words = splat<U32s>(kNumberBias + rounding);
     }
@@ -180,7 +190,6 @@ class StripSum {
                    [](Line& line, const Line& tap) VOREL_INLINE_LAMBDA { line.add(tap); });
         four.apply(mTakenAway, mRows.lines, row,
                    [](Line& line, const Line& tap) VOREL_INLINE_LAMBDA { line.subtract(tap); });
-        if (mOrder == 3) four.addUp(mSecond);
         four.addUp(mFirst);
         unrolled<kDifferenceRows>([&](auto i) VOREL_INLINE_LAMBDA {
             rows[i.value] = quotients(four.lines[i.value]) ^ mInvertMask;
@@ -202,11 +211,9 @@ class StripSum {
 
     Rows mRows;
     int64_t mInkEnd;
-    int mOrder;
     TermRange mAdded;
     TermRange mTakenAway;
-    Line mSecond;
-    Line mFirst;
+    Line mFirst;  // the first difference of the row before
     U32s mSums[4];
     F32s mInverse;
     U8s mInvertMask;
@@ -259,7 +266,7 @@ void storePlain(const U8s* rows, uint8_t* to, int64_t rowStride) {
         store(to + i * rowStride, rows[i]);
 }
 
-void transpose(const BlurSource& source, int64_t row, uint8_t* lines) {
+void transpose(const CoverageRows& source, int64_t row, uint8_t* lines) {
     for (int64_t x = 0; x < source.width; x += kBytes) {
         const SourceStrip strip = SourceStrip::of(source, x);
         U8s rows[kBytes];
@@ -274,14 +281,15 @@ void fillSquare(uint8_t value, uint8_t* to, int64_t rowStride) {
         std::memset(to + i * rowStride, value, static_cast<size_t>(kBytes));
 }
 
-void blurStrip(const DifferenceSum& sum, const BlurSource& source, int64_t x, uint8_t* lines,
+void blurStrip(const DifferencePass& pass, const CoverageRows& source, int64_t x, uint8_t* lines,
                int64_t first, int64_t count, const SquareRows& out) {
     const SourceStrip strip = SourceStrip::of(source, x);
+    VOREL_ASSERT(reinterpret_cast<uintptr_t>(lines) % kBytes == 0);
     const RowExtent ink = RowExtent::of(strip);
     const bool isEmpty = ink.first >= ink.end;
-    StripSum sums(sum, isEmpty ? Rows{} : filledRows(strip, ink, sum.terms.pairs, lines), ink.end);
-    const int64_t begin = ink.first - sum.radius;
-    const int64_t end = ink.end + sum.radius;
+    StripSum sums(pass, isEmpty ? Rows{} : filledRows(strip, ink, pass.terms.pairs, lines), ink.end);
+    const int64_t begin = ink.first - pass.radius;
+    const int64_t end = ink.end + pass.radius;
     U8s rows[kBytes];
     int64_t y = first;
     // Results that nobody wants, but that the following ones build on.
@@ -291,7 +299,7 @@ void blurStrip(const DifferenceSum& sum, const BlurSource& source, int64_t x, ui
     }
     for (uint8_t* square = out.start; y < first + count; square += out.squareStride) {
         if (isEmpty || y + kBytes <= begin || y >= end) {
-            fillSquare(sum.ending.invertMask, square, out.rowStride);
+            fillSquare(pass.ending.invertMask, square, out.rowStride);
             y += kBytes;
             continue;
         }
@@ -307,6 +315,6 @@ void blurStrip(const DifferenceSum& sum, const BlurSource& source, int64_t x, ui
 
 }  // namespace
 
-extern const DifferenceLoops kDifferenceLoops = {transpose, blurStrip};
+extern const DifferenceLoops kDifferenceLoops = {kBytes, transpose, blurStrip};
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

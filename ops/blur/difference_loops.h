@@ -2,10 +2,11 @@
 
 #include <cstdint>
 
+#include "core/coverage_rows.h"
 #include "ops/blur/dot_loops.h"
 
 /// The inner loop of a wide blur, compiled once per level of the instruction set: one pass down a strip
-/// of columns, whose results are stored the other way round, so that the pass across is the same loop.
+/// of columns, whose results are stored transposed, so that the pass across is the same loop.
 namespace VFontEffect::internal {
 
 /// Results of four neighbouring rows are summed together.
@@ -24,20 +25,19 @@ struct TermList {
     int64_t count;
 };
 
-/// A difference of the kernel: the lines that add up to it.
+/// The second difference of the weights: the lines that add up to it.
 struct DifferenceTerms {
-    int order;  // 2 or 3: of the second or of the third difference
     TapPairs pairs;
     TermList added;
     TermList takenAway;
 };
 
-struct DifferenceSum {
-    DifferenceTerms terms;
+struct DifferencePass {
+    const DifferenceTerms& terms;
     int radius;
     uint32_t total;
     float inverse;  // just above 1 / total
-    BlurEnding ending;
+    PassEnding ending;
 };
 
 /// No pair is wider.
@@ -45,7 +45,7 @@ constexpr int64_t kLargestPairDistance = 2;
 /// The working memory of a strip: for each row of the source, and for so many more, a line of taps and
 /// one of pairs, each of a vector's pixels in 16 bits.
 constexpr int64_t kLinesOfRow = 2;
-constexpr int64_t kDifferencePixelBytes = 2;
+constexpr int64_t kLinePixelBytes = 2;
 constexpr int64_t kDifferenceRowsAround = kLargestPairDistance + 2 * (kDifferenceRows - 1);
 
 /// Results in squares of vectorBytes a side, transposed ones with a row for each column of results.
@@ -57,16 +57,17 @@ struct SquareRows {
 };
 
 struct DifferenceLoops {
+    int64_t vectorBytes;
     /// The source's rows from `row` on, as many as a vector has bytes, transposed: a line for each
     /// column. Lines are written up to a whole number of squares.
-    void (*transpose)(const BlurSource& source, int64_t row, uint8_t* lines);
+    void (*transpose)(const CoverageRows& source, int64_t row, uint8_t* lines);
     /// Sums the strip of the source that begins at column x, as wide as a vector: `count` results from
     /// row `first` on, in whole squares. `lines` is the working memory, aligned to a vector.
-    void (*blurStrip)(const DifferenceSum& sum, const BlurSource& source, int64_t x, uint8_t* lines,
+    void (*blurStrip)(const DifferencePass& pass, const CoverageRows& source, int64_t x, uint8_t* lines,
                       int64_t first, int64_t count, const SquareRows& out);
 };
 
-/// The kernels of the chosen level.
-const DifferenceLoops& differenceLoops();
+/// The loops of a level.
+const DifferenceLoops& differenceLoops(CpuLevel level);
 
 }  // namespace VFontEffect::internal

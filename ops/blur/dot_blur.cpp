@@ -4,7 +4,9 @@
 #include <cstdint>
 #include <cstdlib>
 #include <cstring>
+#include <utility>
 
+#include "core/assert.h"
 #include "core/numeric.h"
 
 namespace VFontEffect::internal {
@@ -25,12 +27,12 @@ int64_t cellsOf(int radius) {
 }
 
 /// The total of the weights before each cell.
-void fillTotals(const BlurWeights& kernel, uint32_t* totals) {
+void fillTotals(const BlurWeights& weights, uint32_t* totals) {
     uint32_t total = 0;
-    for (int64_t i = 0; i < cellsOf(kernel.radius); ++i) {
+    for (int64_t i = 0; i < cellsOf(weights.radius); ++i) {
         totals[i] = total;
-        const int64_t distance = std::abs(i - kCellsBefore - kernel.radius);
-        if (distance <= kernel.radius) total += kernel.weights.data()[distance];
+        const int64_t distance = std::abs(i - kCellsBefore - weights.radius);
+        if (distance <= weights.radius) total += weights.byDistance.data()[distance];
     }
 }
 
@@ -38,27 +40,26 @@ void fillTotals(const BlurWeights& kernel, uint32_t* totals) {
 
 // --- Weights --------------------------------------------------------------------------------------
 
-PackedWeights::PackedWeights(const BlurWeights& kernel)
-    : mMemory(PixelBuffer<uint8_t>::uninitialised(kernel ? cellsOf(kernel.radius) : -1,
-                                                  dotLoops().cellBytes + int64_t{sizeof(uint32_t)})),
+PackedWeights::PackedWeights(const DotLoops& loops, const BlurWeights& weights)
+    : mMemory(PixelBuffer<uint8_t>::uninitialised(cellsOf(weights.radius),
+                                                  loops.cellBytes + int64_t{sizeof(uint32_t)})),
       mBlur{} {
-    mBlur.radius = kernel.radius;
-    mBlur.total = kernel.total;
+    mBlur.radius = weights.radius;
+    mBlur.total = weights.total;
     if (!mMemory) return;
-    const DotLoops& loops = dotLoops();
-    loops.fillCells(kernel.weights.data(), kernel.radius, mMemory.data());
+    loops.fillCells(weights.byDistance.data(), weights.radius, mMemory.data());
     auto* const totals =
-        reinterpret_cast<uint32_t*>(mMemory.data() + cellsOf(kernel.radius) * loops.cellBytes);
-    fillTotals(kernel, totals);
+        reinterpret_cast<uint32_t*>(mMemory.data() + cellsOf(weights.radius) * loops.cellBytes);
+    fillTotals(weights, totals);
     mBlur.cells = mMemory.data() + kCellsBefore * loops.cellBytes;
     mBlur.totals = totals + kCellsBefore;
-    mBlur.inverse = inverseAbove(kernel.total);
-    mBlur.isNarrow = loops.hasNarrow && kernel.radius <= kLargestNarrowRadius && kernel.total <= 0xFF;
+    mBlur.inverse = inverseAbove(weights.total);
+    mBlur.isNarrow = loops.hasNarrow && weights.radius <= kLargestNarrowRadius && weights.total <= 0xFF;
     if (!mBlur.isNarrow) return;
-    const uint32_t scale = kernel.total < 128 ? 2 : 1;
-    for (int k = 0; k <= kernel.radius; ++k)
-        mBlur.weights[k] = static_cast<uint16_t>(kernel.weights.data()[k] * scale);
-    mBlur.narrowTotal = static_cast<uint16_t>(kernel.total * scale);
+    const uint32_t scale = weights.total < 128 ? 2 : 1;
+    for (int k = 0; k <= weights.radius; ++k)
+        mBlur.weights[k] = static_cast<uint16_t>(weights.byDistance.data()[k] * scale);
+    mBlur.narrowTotal = static_cast<uint16_t>(weights.total * scale);
     mBlur.division = narrowDivision(mBlur.narrowTotal);
 }
 
@@ -74,13 +75,13 @@ GroupRange GroupRange::needed(const PackedWeights& weights, int64_t height, int6
     return {first, std::clamp(quadsOf(height - firstRow), first, end)};
 }
 
-TapGroups::TapGroups(const PackedWeights& weights, int64_t width, int64_t height, int64_t firstRow,
-                     int64_t quads)
+TapGroups::TapGroups(const DotLoops& loops, const PackedWeights& weights, int64_t width, int64_t height,
+                     int64_t firstRow, int64_t quads)
     : mSteps(tapSteps(weights->radius)),
       mMissing(GroupRange::needed(weights, height, firstRow, quads)),
       mCapacity(std::min(mSteps - 1 + kSpareGroups, mMissing.end - mMissing.first)),
-      mStrips(roundedUp(width, dotLoops().vectorBytes) / dotLoops().vectorBytes),
-      mGroupBytes(kQuad * dotLoops().vectorBytes * weights.pixelBytes()),
+      mStrips(roundedUp(width, loops.vectorBytes) / loops.vectorBytes),
+      mGroupBytes(kQuad * loops.vectorBytes * weights.pixelBytes()),
       mMemory(mGroupBytes * mCapacity, mStrips),
       mInked(PixelBuffer<int32_t>::zeroed(mStrips, 2)) {
     if (!*this) return;
@@ -91,6 +92,7 @@ TapGroups::TapGroups(const PackedWeights& weights, int64_t width, int64_t height
 
 /// Makes room behind the groups from `group` on.
 void TapGroups::forgetBefore(int64_t group) {
+    VOREL_ASSERT(group > mColumns.firstGroup && group <= mMissing.first);
     const int64_t skipped = (group - mColumns.firstGroup) * mGroupBytes;
     const int64_t kept = (mMissing.first - group) * mGroupBytes;
     for (int64_t strip = 0; strip < mStrips; ++strip) {
@@ -100,83 +102,78 @@ void TapGroups::forgetBefore(int64_t group) {
     mColumns.firstGroup = group;
 }
 
-IntermediateBuffer::IntermediateBuffer(const PackedWeights& weights, int64_t inkColumn, int64_t columns,
-                                       const FullColumns& full)
+IntermediateBuffer::IntermediateBuffer(const DotLoops& loops, const PackedWeights& weights,
+                                       int64_t inkColumn, int64_t columns, const FullColumns& full)
     : mStrideBytes((strideFor(columns) + 2 * kIntermediateMargin) * weights.pixelBytes()),
       mPixels(mStrideBytes, kQuad),
-      mInked(PixelBuffer<uint8_t>::zeroed(strideFor(columns) / dotLoops().vectorBytes)) {
+      mInked(PixelBuffer<uint8_t>::zeroed(strideFor(columns) / loops.vectorBytes)) {
     if (!*this || !weights) return;
     uint8_t* const start = mPixels.data() + kIntermediateMargin * weights.pixelBytes();
     mRows = {start, mStrideBytes, columns, inkColumn, full.before, full.from, mInked.data()};
-    dotLoops().clear(*weights, mRows);
+    loops.clear(*weights, mRows);
 }
 
-// --- Down, then across ------------------------------------------------------------------------------
+// --- Passes -----------------------------------------------------------------------------------------
 
-DownThenAcross::DownThenAcross(const BlurWeights& kernel, const BlurSource& source, const Box& window,
-                               const FullColumns& full)
-    : mWindow(window),
-      mWeights(kernel),
-      mSource(ReachedSource::of(source, kernel.radius, window)),
-      mFirstRow(window.top - kernel.radius - mSource.top),
-      mTaps(mWeights, mSource.part.width, mSource.part.height, mFirstRow, quadsOf(window.height())),
+DotBlur::DotBlur(const DotLoops& loops, const BlurInput& input)
+    : mLoops(loops),
+      mWindow(input.window),
+      mFirst(input.first),
+      mSecond(input.second),
+      mWeights(loops, input.weights),
+      mSource(ReachedSource::of(input.source, input.weights.radius, mWindow)),
+      mFirstRow(mWindow.top - input.weights.radius - mSource.top),
+      mStride(strideFor(mWindow.width())),
+      mAcross(input.order == BlurInput::Order::acrossThenDown
+                  ? std::optional<LineBuffer>(std::in_place, mStride, kQuad)
+                  : std::nullopt),
+      mTaps(loops, mWeights, mAcross ? mWindow.width() : mSource.part.width, mSource.part.height,
+            mFirstRow, quadsOf(mWindow.height())),
       mIntermediateLeft(mSource.left),
-      mIntermediate(intermediateFor(full)),
-      mOutStride(strideFor(window.width())),
-      mOut(mOutStride, kQuad) {}
+      mIntermediate(intermediateFor(input.full)),
+      mOut(mStride, kQuad) {}
 
-/// The rows between the passes have the source's columns, and when some of the full ones are in reach
-/// all that are.
-IntermediateBuffer DownThenAcross::intermediateFor(const FullColumns& full) {
+/// The rows that are blurred across have the source's columns, and when some of the full ones are in
+/// reach all that are.
+IntermediateBuffer DotBlur::intermediateFor(const FullColumns& full) {
     const Box reach = expanded(mWindow, mWeights->radius);
     const int64_t width = mSource.part.width;
-    if (full.before <= reach.left && full.from >= reach.right) return {mWeights, 0, width, {0, width}};
+    if (full.before <= reach.left && full.from >= reach.right)
+        return {mLoops, mWeights, 0, width, {0, width}};
     const int64_t inkColumn =
         roundedUp(std::max<int64_t>(0, mIntermediateLeft - reach.left), kWidestVector);
     mIntermediateLeft -= inkColumn;
-    return {mWeights,
+    return {mLoops,
+            mWeights,
             inkColumn,
             reach.right - mIntermediateLeft,
             {full.before - mIntermediateLeft, full.from - mIntermediateLeft}};
 }
 
-void DownThenAcross::blurQuad(int64_t quad, bool inverted) {
-    const DotLoops& loops = dotLoops();
-    mTaps.complete(quad, [&](int64_t group) {
-        loops.feed(*mWeights, mSource.part, mFirstRow + kQuad * group, mTaps.columns(), group);
-    });
-    loops.down(*mWeights, mTaps.columns(), quad, mIntermediate.rows());
-    loops.across(*mWeights, mIntermediate.rows(), mWindow.left - mIntermediateLeft,
-                 mWindow.right - mIntermediateLeft, {mOut.data(), mOutStride, BlurEnding::of(inverted)});
+void DotBlur::blurAcross(const PassEnding& ending, uint8_t* out) {
+    mLoops.across(*mWeights, mIntermediate.rows(), mWindow.left - mIntermediateLeft,
+                  mWindow.right - mIntermediateLeft, {out, mStride, ending});
 }
 
-// --- Across, then down ------------------------------------------------------------------------------
+void DotBlur::feed(int64_t group) {
+    const int64_t row = mFirstRow + kQuad * group;
+    if (!mAcross) return mLoops.feed(*mWeights, mSource.part, row, mTaps.columns(), group);
+    mLoops.copy(*mWeights, mSource.part, row, mIntermediate.rows());
+    blurAcross(mFirst, mAcross->data());
+    const CoverageRows across = {mAcross->data(), mStride, mWindow.width(), kQuad, kAsIs};
+    mLoops.feed(*mWeights, across, 0, mTaps.columns(), group);
+}
 
-// 255 minus a mean that is rounded down is the mean of the inverse rounded up. So both passes work on
-// what is missing from 255, which is 0 around the source, round up, and the second gives 255 minus its
-// result.
-
-AcrossThenDown::AcrossThenDown(const BlurWeights& kernel, const BlurSource& source, const Box& window)
-    : mWindow(window),
-      mWeights(kernel),
-      mSource(ReachedSource::of(source, kernel.radius, window)),
-      mFirstRow(window.top - kernel.radius - mSource.top),
-      mIntermediate(mWeights, 0, mSource.part.width, {0, mSource.part.width}),
-      mStride(strideFor(window.width())),
-      mAcross(mStride, kQuad),
-      mTaps(mWeights, window.width(), mSource.part.height, mFirstRow, quadsOf(window.height())),
-      mOut(mStride, kQuad) {}
-
-void AcrossThenDown::blurQuad(int64_t quad) {
-    const DotLoops& loops = dotLoops();
-    const BlurSource across = {mAcross.data(), mStride, mWindow.width(), kQuad, 0};
-    mTaps.complete(quad, [&](int64_t group) {
-        loops.copy(*mWeights, mSource.part, mFirstRow + kQuad * group, mIntermediate.rows());
-        loops.across(*mWeights, mIntermediate.rows(), mWindow.left - mSource.left,
-                     mWindow.right - mSource.left, {mAcross.data(), mStride, {true, 0}});
-        loops.feed(*mWeights, across, 0, mTaps.columns(), group);
-    });
-    loops.downToBytes(*mWeights, mTaps.columns(), quad, {mOut.data(), mStride, {true, 0xFF}});
+BlurredRows DotBlur::rows(int64_t y) {
+    const int64_t quad = (y - mWindow.top) / kQuad;
+    mTaps.complete(quad, [&](int64_t group) { feed(group); });
+    if (mAcross) {
+        mLoops.downToBytes(*mWeights, mTaps.columns(), quad, {mOut.data(), mStride, mSecond});
+    } else {
+        mLoops.down(*mWeights, mTaps.columns(), quad, mIntermediate.rows());
+        blurAcross(mSecond, mOut.data());
+    }
+    return {mOut.data(), mStride};
 }
 
 }  // namespace VFontEffect::internal

@@ -2,31 +2,31 @@
 
 #include <algorithm>
 #include <cstdint>
+#include <optional>
 
 #include "core/line_buffer.h"
 #include "core/pixel_buffer.h"
-#include "ops/blur/blur_weights.h"
+#include "ops/blur/blur_input.h"
 #include "ops/blur/dot_loops.h"
 #include "ops/blur/reached_source.h"
 
-/// The blur by dot products, of any radius.
 namespace VFontEffect::internal {
 
-/// A kernel in the form of the chosen level's loops.
+/// Weights in the form of a level's loops.
 class PackedWeights {
   public:
-    explicit PackedWeights(const BlurWeights& kernel);
+    PackedWeights(const DotLoops& loops, const BlurWeights& weights);
 
     explicit operator bool() const { return static_cast<bool>(mMemory); }
-    const PreparedBlur& operator*() const { return mBlur; }
-    const PreparedBlur* operator->() const { return &mBlur; }
+    const PackedBlur& operator*() const { return mBlur; }
+    const PackedBlur* operator->() const { return &mBlur; }
 
     /// U8s of a pixel in a row between the passes.
     int64_t pixelBytes() const { return mBlur.isNarrow ? kNarrowPixelBytes : 1; }
 
   private:
     PixelBuffer<uint8_t> mMemory;
-    PreparedBlur mBlur;
+    PackedBlur mBlur;
 };
 
 /// Groups of four rows.
@@ -44,8 +44,8 @@ struct GroupRange {
 class TapGroups {
   public:
     /// For the groups of GroupRange::needed, of rows of `width` bytes.
-    TapGroups(const PackedWeights& weights, int64_t width, int64_t height, int64_t firstRow,
-              int64_t quads);
+    TapGroups(const DotLoops& loops, const PackedWeights& weights, int64_t width, int64_t height,
+              int64_t firstRow, int64_t quads);
 
     explicit operator bool() const { return mMemory && mInked; }
     const TapColumns& columns() const { return mColumns; }
@@ -76,11 +76,11 @@ class TapGroups {
     TapColumns mColumns = {};
 };
 
-/// Four rows between the passes.
+/// Four rows that are blurred across.
 class IntermediateBuffer {
   public:
-    IntermediateBuffer(const PackedWeights& weights, int64_t inkColumn, int64_t columns,
-                       const FullColumns& full);
+    IntermediateBuffer(const DotLoops& loops, const PackedWeights& weights, int64_t inkColumn,
+                       int64_t columns, const FullColumns& full);
 
     explicit operator bool() const { return mPixels && mInked; }
     const IntermediateRows& rows() const { return mRows; }
@@ -92,69 +92,37 @@ class IntermediateBuffer {
     IntermediateRows mRows = {};
 };
 
-/// Blurs the columns first and then the rows, each pass rounding down, four rows at a time. What lies
-/// around the source is 0, but for the full columns.
-class DownThenAcross {
+/// A blur by dot products, of any radius, four rows at a time: the two orders of the passes differ in
+/// which one feeds the groups of taps.
+class DotBlur {
   public:
-    DownThenAcross(const BlurWeights& kernel, const BlurSource& source, const Box& window,
-                   const FullColumns& full);
+    DotBlur(const DotLoops& loops, const BlurInput& input);
 
     /// Whether there is memory for it.
-    explicit operator bool() const { return mWeights && mTaps && mIntermediate && mOut; }
-
-    /// Calls paint(y, rows, values, stride) for up to kQuad rows of the window at a time. `inverted`
-    /// gives 255 minus the mean of the second pass, rounded down as a whole.
-    template <class Paint>
-    void run(bool inverted, Paint paint) {
-        for (int64_t y = 0; y < mWindow.height(); y += kQuad) {
-            blurQuad(y / kQuad, inverted);
-            paint(mWindow.top + y, std::min(kQuad, mWindow.height() - y), mOut.data(), mOutStride);
-        }
+    explicit operator bool() const {
+        return mWeights && mTaps && mIntermediate && mOut && (!mAcross || *mAcross);
     }
+
+    /// Up to kQuad rows from row y on, in order.
+    BlurredRows rows(int64_t y);
 
   private:
     IntermediateBuffer intermediateFor(const FullColumns& full);
-    void blurQuad(int64_t quad, bool inverted);
+    void feed(int64_t group);
+    void blurAcross(const PassEnding& ending, uint8_t* out);
 
+    const DotLoops& mLoops;
     Box mWindow;
+    PassEnding mFirst;
+    PassEnding mSecond;
     PackedWeights mWeights;
     ReachedSource mSource;
-    int64_t mFirstRow;  // of the source, the first of group 0
+    int64_t mFirstRow;                  // of the source, the first of group 0
+    int64_t mStride;                    // of results
+    std::optional<LineBuffer> mAcross;  // results of the pass across, when it is the first
     TapGroups mTaps;
-    int64_t mIntermediateLeft;  // column of the source, column 0 between the passes
+    int64_t mIntermediateLeft;  // column of the source, column 0 of the rows that are blurred across
     IntermediateBuffer mIntermediate;
-    int64_t mOutStride;
-    LineBuffer mOut;
-};
-
-/// Blurs the rows of the source's inverse first and then the columns, each pass rounding down, four rows
-/// at a time. What lies around the source is 255 in its inverse.
-class AcrossThenDown {
-  public:
-    AcrossThenDown(const BlurWeights& kernel, const BlurSource& source, const Box& window);
-
-    explicit operator bool() const { return mWeights && mIntermediate && mAcross && mTaps && mOut; }
-
-    /// Calls paint(y, rows, values, stride) for up to kQuad rows of the window at a time.
-    template <class Paint>
-    void run(Paint paint) {
-        for (int64_t y = 0; y < mWindow.height(); y += kQuad) {
-            blurQuad(y / kQuad);
-            paint(mWindow.top + y, std::min(kQuad, mWindow.height() - y), mOut.data(), mStride);
-        }
-    }
-
-  private:
-    void blurQuad(int64_t quad);
-
-    Box mWindow;
-    PackedWeights mWeights;
-    ReachedSource mSource;
-    int64_t mFirstRow;  // of the source, the first of group 0
-    IntermediateBuffer mIntermediate;
-    int64_t mStride;
-    LineBuffer mAcross;
-    TapGroups mTaps;
     LineBuffer mOut;
 };
 

@@ -80,7 +80,7 @@ struct DotMethod {
     uint32_t rounding;
     F32s inverse;
 
-    static DotMethod of(const PreparedBlur& blur, bool roundsUp) {
+    static DotMethod of(const PackedBlur& blur, bool roundsUp) {
         return {static_cast<const WeightCell*>(blur.cells), blur.totals, roundsUp ? blur.total - 1 : 0,
                 splat<F32s>(blur.inverse)};
     }
@@ -213,7 +213,7 @@ struct NarrowMethod {
     U16s start;
     U16s multiplier;
 
-    static NarrowMethod of(const PreparedBlur& blur, bool roundsUp) {
+    static NarrowMethod of(const PackedBlur& blur, bool roundsUp) {
         NarrowMethod method;
         method.radius = blur.radius;
         for (int k = 0; k <= blur.radius; ++k)
@@ -288,7 +288,7 @@ VOREL_INLINE uint8_t* groupAt(const TapColumns& columns, int64_t strip, int64_t 
 }
 
 template <class Method>
-void feed(const PreparedBlur&, const BlurSource& source, int64_t row, const TapColumns& columns,
+void feed(const PackedBlur&, const CoverageRows& source, int64_t row, const TapColumns& columns,
           int64_t index) {
     for (int64_t strip = 0; strip * kBytes < columns.width; ++strip) {
         const Group group = Group::of(SourceStrip::of(source, strip * kBytes), row);
@@ -340,7 +340,7 @@ VOREL_INLINE void fillIntermediate(const IntermediateRows& intermediate, int64_t
 }
 
 template <class Method>
-void clear(const PreparedBlur&, const IntermediateRows& intermediate) {
+void clear(const PackedBlur&, const IntermediateRows& intermediate) {
     fillIntermediate<Method>(intermediate, -kIntermediateMargin,
                              wholeVectors(intermediate.columns) + kIntermediateMargin, 0);
 }
@@ -358,7 +358,7 @@ void fillFullColumns(const IntermediateRows& intermediate) {
 }
 
 template <class Method>
-void down(const PreparedBlur& blur, const TapColumns& columns, int64_t quad,
+void down(const PackedBlur& blur, const TapColumns& columns, int64_t quad,
           const IntermediateRows& intermediate) {
     std::memset(intermediate.inked, 0, static_cast<size_t>(wholeVectors(intermediate.columns) / kBytes));
     const int64_t firstStrip = intermediate.inkColumn / kBytes;
@@ -374,8 +374,7 @@ void down(const PreparedBlur& blur, const TapColumns& columns, int64_t quad,
 }
 
 template <class Method>
-void downToBytes(const PreparedBlur& blur, const TapColumns& columns, int64_t quad,
-                 const BlurRows& out) {
+void downToBytes(const PackedBlur& blur, const TapColumns& columns, int64_t quad, const BlurRows& out) {
     quadDown(Method::of(blur, out.ending.roundsUp), columns, quad, blur.radius,
              [&](int64_t strip, int j, const typename Method::Row& row) VOREL_INLINE_LAMBDA {
                  store(out.start + j * out.stride + strip * kBytes,
@@ -384,7 +383,7 @@ void downToBytes(const PreparedBlur& blur, const TapColumns& columns, int64_t qu
 }
 
 template <class Method>
-void copy(const PreparedBlur&, const BlurSource& source, int64_t row,
+void copy(const PackedBlur&, const CoverageRows& source, int64_t row,
           const IntermediateRows& intermediate) {
     for (int64_t x = 0; x < source.width; x += kBytes) {
         const Group group = Group::of(SourceStrip::of(source, x), row);
@@ -416,7 +415,7 @@ VOREL_INLINE Range inkedSteps(const IntermediateRows& intermediate, int64_t x, i
 }
 
 template <class Method>
-void across(const PreparedBlur& blur, const IntermediateRows& intermediate, int64_t left, int64_t right,
+void across(const PackedBlur& blur, const IntermediateRows& intermediate, int64_t left, int64_t right,
             const BlurRows& out) {
     const Method method = Method::of(blur, out.ending.roundsUp);
     for (int64_t x = left; x < right; x += kBytes) {
@@ -451,7 +450,7 @@ void fillCells(const uint32_t* weights, int radius, uint8_t* cells) {
 
 /// The form of a kernel that suits the blur; where it sums in 32 bits always there is one only.
 template <auto kNarrow, auto kWide, class... Arguments>
-void chosen(const PreparedBlur& blur, Arguments... arguments) {
+void chosen(const PackedBlur& blur, Arguments... arguments) {
     if constexpr (!kHasDotProducts) {
         if (blur.isNarrow) return kNarrow(blur, arguments...);
     }

@@ -2,10 +2,12 @@
 
 #include <cstdint>
 
+#include "core/coverage_rows.h"
 #include "core/inline.h"
+#include "simd/cpu_level.h"
 
-/// The inner loops of the blur, compiled once per level of the instruction set: one pass down the
-/// columns and one across the rows, and between them a plane in a form of the level's own.
+/// The inner loops of the blur by dot products, compiled once per level of the instruction set: one pass
+/// down the columns and one across the rows, and between them a plane in a form of the level's own.
 namespace VFontEffect::internal {
 
 /// Rows are read and blurred four at a time.
@@ -15,8 +17,6 @@ VOREL_INLINE int64_t tapSteps(int radius) {
     return (2 * int64_t{radius} + kQuad + 3) / 4;
 }
 
-/// No level's vector is wider.
-constexpr int64_t kWidestVector = 64;
 /// Up to this radius, and a total that fits in a byte, sums fit in 16 bits.
 constexpr int64_t kLargestNarrowRadius = 3;
 
@@ -35,7 +35,7 @@ struct NarrowDivision {
 constexpr int kNarrowShift = 7;
 
 /// A blur in the form in which a level's loops read it.
-struct PreparedBlur {
+struct PackedBlur {
     int radius;
     uint32_t total;
     float inverse;           // just above 1 / total
@@ -48,20 +48,8 @@ struct PreparedBlur {
 };
 
 /// What a pass makes of the mean of the taps: rounded down or up, and then byte ^ invertMask.
-struct BlurEnding {
+struct PassEnding {
     bool roundsUp;
-    uint8_t invertMask;
-
-    /// The mean rounded down, or 255 minus the mean rounded down as a whole.
-    static BlurEnding of(bool inverted) { return {inverted, static_cast<uint8_t>(inverted ? 0xFF : 0)}; }
-};
-
-/// `height` rows of `width` bytes, each taken as byte ^ invertMask. All around them is 0.
-struct BlurSource {
-    const uint8_t* start;
-    int64_t stride;
-    int64_t width;
-    int64_t height;
     uint8_t invertMask;
 };
 
@@ -97,7 +85,7 @@ constexpr int64_t kNarrowPixelBytes = 2;
 struct BlurRows {
     uint8_t* start;
     int64_t stride;
-    BlurEnding ending;
+    PassEnding ending;
 };
 
 /// Cells of zeros before and behind those of the weights.
@@ -106,7 +94,7 @@ constexpr int64_t kCellsBehind = 20;
 
 struct DotLoops {
     int64_t vectorBytes;
-    /// Up to this radius dot products take fewer instructions than running sums.
+    /// Up to this radius dot products take less time than differences of the weights.
     int largestDotRadius;
     /// Whether the level sums in 16 bits where that suffices.
     bool hasNarrow;
@@ -116,27 +104,27 @@ struct DotLoops {
     void (*fillCells)(const uint32_t* weights, int radius, uint8_t* cells);
 
     /// Fills rows between the passes, with their margins, with 0: once, before the first quad.
-    void (*clear)(const PreparedBlur& blur, const IntermediateRows& intermediate);
+    void (*clear)(const PackedBlur& blur, const IntermediateRows& intermediate);
 
     /// Stores the source's rows from `row` on as a group.
-    void (*feed)(const PreparedBlur& blur, const BlurSource& source, int64_t row,
+    void (*feed)(const PackedBlur& blur, const CoverageRows& source, int64_t row,
                  const TapColumns& columns, int64_t group);
     /// The pass down, for the four results whose uppermost taps are in the group `quad`: rounded down,
     /// for the pass across, or as plain bytes.
-    void (*down)(const PreparedBlur& blur, const TapColumns& columns, int64_t quad,
+    void (*down)(const PackedBlur& blur, const TapColumns& columns, int64_t quad,
                  const IntermediateRows& intermediate);
-    void (*downToBytes)(const PreparedBlur& blur, const TapColumns& columns, int64_t quad,
+    void (*downToBytes)(const PackedBlur& blur, const TapColumns& columns, int64_t quad,
                         const BlurRows& out);
 
     /// The source's rows from `row` on as they are, for the pass across.
-    void (*copy)(const PreparedBlur& blur, const BlurSource& source, int64_t row,
+    void (*copy)(const PackedBlur& blur, const CoverageRows& source, int64_t row,
                  const IntermediateRows& intermediate);
     /// The pass across, for the columns `left` to `right` - 1.
-    void (*across)(const PreparedBlur& blur, const IntermediateRows& intermediate, int64_t left,
+    void (*across)(const PackedBlur& blur, const IntermediateRows& intermediate, int64_t left,
                    int64_t right, const BlurRows& out);
 };
 
-/// The kernels of the chosen level.
-const DotLoops& dotLoops();
+/// The loops of a level.
+const DotLoops& dotLoops(CpuLevel level);
 
 }  // namespace VFontEffect::internal

@@ -2,7 +2,7 @@
 
 namespace VFontEffect::internal {
 
-ReachedSource ReachedSource::of(const BlurSource& source, int64_t radius, const Box& window) {
+ReachedSource ReachedSource::of(const CoverageRows& source, int64_t radius, const Box& window) {
     const Box reach = intersection(expanded(window, radius), {0, 0, source.width, source.height});
     ReachedSource reached = {source, 0, 0};
     if (reach.empty()) {

@@ -2,7 +2,7 @@
 
 #include <cstdint>
 
-#include "ops/blur/dot_loops.h"
+#include "core/coverage_rows.h"
 #include "simd/lanes.h"
 
 namespace VFontEffect::internal::VOREL_LEVEL {
@@ -15,7 +15,7 @@ struct SourceStrip {
     int64_t count;
     U8s invertMask;
 
-    static SourceStrip of(const BlurSource& source, int64_t x) {
+    static SourceStrip of(const CoverageRows& source, int64_t x) {
         const int64_t left = source.width - x;
         const int64_t count = left < kBytes ? left : int64_t{kBytes};
         return {source.start + x, source.stride, source.height, count,

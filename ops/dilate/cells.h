@@ -10,23 +10,16 @@
 /// Cost: 9 loads a vector for a reach of 1, 25 for one of 2. Telling empty stretches would cost as much.
 namespace VFontEffect::internal::VOREL_LEVEL {
 
-constexpr int kLongestCellReach = 2;
-
-struct CellPlanes {
+struct CellLayout {
     PaddedRows rows;
     uint8_t* results;  ///< of a band
-    int64_t bytes;
-};
 
-inline CellPlanes cellPlanes(const Dilation& dilation) {
-    const int64_t reach = dilation.disc->reach;
-    Arena arena = {dilation.memory};
-    CellPlanes planes;
-    planes.rows = takeRows(dilation, dilation.bandRows + 2 * reach, reach, reach + kBytes, arena);
-    planes.results = arena.take<uint8_t>(dilation.bandRows * dilatedStride(dilation));
-    planes.bytes = arena.used;
-    return planes;
-}
+    static CellLayout of(const Dilation& dilation, Arena& arena) {
+        const int64_t reach = dilation.disc->reach;
+        return {takeRows(dilation, dilation.bandRows + 2 * reach, reach, reach + kBytes, arena),
+                arena.take<uint8_t>(dilation.bandRows * dilatedStride(dilation))};
+    }
+};
 
 /// 255 - weight of the cells that lie that far aside.
 VOREL_INLINE U8s cellDeficit(const DiscShape& disc, int dx, int dy) {
@@ -96,9 +89,13 @@ struct FarCells {
     }
 };
 
+inline void beginCells(const Dilation& dilation, uint8_t* memory) {
+    layOut<CellLayout>(dilation, memory);
+}
+
 template <class Cells>
-uint8_t* dilateRowsByCells(const Dilation& dilation, int64_t y, int64_t count) {
-    const CellPlanes planes = cellPlanes(dilation);
+uint8_t* rowsByCells(const Dilation& dilation, uint8_t* memory, int64_t y, int64_t count) {
+    const auto planes = layoutIn<CellLayout>(memory);
     for (int64_t row = 0; row < count + 2 * Cells::kReach; ++row)
         fillRow(dilation, y + row - Cells::kReach, planes.rows, row);
     const Cells cells(*dilation.disc);
@@ -111,5 +108,8 @@ uint8_t* dilateRowsByCells(const Dilation& dilation, int64_t y, int64_t count) {
     }
     return planes.results;
 }
+
+template <class Cells>
+constexpr DilationStrategy kCellStrategy = {layoutBytes<CellLayout>, beginCells, rowsByCells<Cells>};
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

@@ -3,11 +3,12 @@
 #include <cstdint>
 #include <cstring>
 
+#include "core/assert.h"
 #include "core/numeric.h"
 #include "ops/dilate/dilation_loops.h"
 #include "simd/pieces.h"
 
-/// Rows of source pixels as all ways of dilation read them, and windowed maxima of them.
+/// Working memory of the strategies, and rows of source pixels as all of them read them.
 namespace VFontEffect::internal::VOREL_LEVEL {
 
 constexpr int64_t kArenaAlignment = 64;
@@ -25,15 +26,44 @@ struct Arena {
     }
 };
 
+/// Bytes of memory for a strategy's `Layout`, which `Layout::of(dilation, arena)` takes, and which
+/// stands at their beginning itself.
+template <class Layout>
+int64_t layoutBytes(const Dilation& dilation) {
+    Arena arena = {nullptr};
+    arena.take<Layout>(1);
+    Layout::of(dilation, arena);
+    return arena.used;
+}
+
+template <class Layout>
+Layout& layOut(const Dilation& dilation, uint8_t* memory) {
+    Arena arena = {memory};
+    Layout& layout = *arena.take<Layout>(1);
+    layout = Layout::of(dilation, arena);
+    VOREL_ASSERT(arena.used == layoutBytes<Layout>(dilation));
+    return layout;
+}
+
+/// By value: stores of bytes could change what stands in memory, for all that a compiler knows.
+template <class Layout>
+VOREL_INLINE Layout layoutIn(const uint8_t* memory) {
+    return *reinterpret_cast<const Layout*>(memory);
+}
+
 /// Rows of the source with zeros to both sides, as far as any load goes.
 struct PaddedRows {
     uint8_t* start;
+    int64_t count;
     int64_t stride;
     int64_t lead;   ///< columns before column 0
     int64_t width;  ///< of the source
 
     /// Column 0 of a row.
-    VOREL_INLINE uint8_t* at(int64_t row) const { return start + row * stride + lead; }
+    VOREL_INLINE uint8_t* at(int64_t row) const {
+        VOREL_ASSERT(row >= 0 && row < count);
+        return start + row * stride + lead;
+    }
 };
 
 /// Rows in which there are so many columns before and behind those of the result that are wanted.
@@ -41,7 +71,7 @@ VOREL_INLINE PaddedRows takeRows(const Dilation& dilation, int64_t count, int64_
                                  Arena& arena) {
     const int64_t lead = before - dilation.left;
     const int64_t stride = lead + dilation.right + behind;
-    return {arena.take<uint8_t>(count * stride), stride, lead, dilation.width};
+    return {arena.take<uint8_t>(count * stride), count, stride, lead, dilation.width};
 }
 
 VOREL_INLINE void setBytes(uint8_t* to, uint8_t value, int64_t count) {
@@ -58,10 +88,10 @@ inline void fillRow(const Dilation& dilation, int64_t y, const PaddedRows& rows,
     uint8_t* const to = rows.at(row);
     setBytes(to - rows.lead, 0, rows.lead);
     setBytes(to + rows.width, 0, rows.stride - rows.lead - rows.width);
-    if (y == 0 || y == dilation.height - 1) return setBytes(to, dilation.invertMask, rows.width);
-    to[0] = to[rows.width - 1] = dilation.invertMask;
-    copyInverted(dilation.box + (y - 1) * dilation.boxStride, rows.width - 2, dilation.invertMask,
-                 to + 1);
+    const CoverageRows& box = dilation.box;
+    if (y == 0 || y == dilation.height - 1) return setBytes(to, box.invertMask, rows.width);
+    to[0] = to[rows.width - 1] = box.invertMask;
+    copyInverted(box.start + (y - kDilationBorder) * box.stride, box.width, box.invertMask, to + 1);
 }
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

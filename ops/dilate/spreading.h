@@ -22,34 +22,31 @@
 /// results, for each vector of the source along the outline.
 namespace VFontEffect::internal::VOREL_LEVEL {
 
-/// The way's working memory.
-struct SpreadPlanes {
+struct SpreadLayout {
     PaddedRows row;     ///< one of the source's
     uint8_t* deficits;  ///< vectors of 255 - weight: of the rim, from the disc's end to its middle row,
                         ///< from the inside outwards
     uint8_t* wasFull;   ///< for each vector of a row whether the row before was full there
     uint8_t* rows;      ///< of results: 2 * reach before a band, the band, and 2 * reach behind it
     int64_t stride;
-    int64_t bytes;
+
+    static SpreadLayout of(const Dilation& dilation, Arena& arena) {
+        const int64_t reach = dilation.disc->reach;
+        SpreadLayout layout;
+        // The first column that is wanted begins a line of the cache.
+        layout.row = takeRows(dilation, 1, roundedUp(reach, kArenaAlignment), reach + kBytes, arena);
+        layout.deficits = arena.take<uint8_t>(4 * (kLongestSpreadReach + 1) * kBytes);
+        layout.stride = dilatedStride(dilation);
+        layout.wasFull = arena.take<uint8_t>(layout.stride / kBytes);
+        layout.rows = arena.take<uint8_t>((dilation.bandRows + 4 * reach) * layout.stride);
+        return layout;
+    }
 };
 
-inline SpreadPlanes spreadPlanes(const Dilation& dilation) {
-    const int64_t reach = dilation.disc->reach;
-    Arena arena = {dilation.memory};
-    SpreadPlanes planes;
-    // The first column that is wanted begins a line of the cache.
-    planes.row = takeRows(dilation, 1, roundedUp(reach, kArenaAlignment), reach + kBytes, arena);
-    planes.deficits = arena.take<uint8_t>(4 * (kLongestSpreadReach + 1) * kBytes);
-    planes.stride = dilatedStride(dilation);
-    planes.wasFull = arena.take<uint8_t>(planes.stride / kBytes);
-    planes.rows = arena.take<uint8_t>((dilation.bandRows + 4 * reach) * planes.stride);
-    planes.bytes = arena.used;
-    return planes;
-}
-
-inline void listDeficits(const Dilation& dilation) {
+inline void beginSpreading(const Dilation& dilation, uint8_t* memory) {
     const DiscShape& disc = *dilation.disc;
-    uint8_t* deficits = spreadPlanes(dilation).deficits;
+    VOREL_ASSERT(disc.reach <= kLongestSpreadReach);
+    uint8_t* deficits = layOut<SpreadLayout>(dilation, memory).deficits;
     for (int64_t d = disc.reach; d >= 0; --d) {
         for (int i = 0; i < disc.outerReach[d] - disc.flatReach[d]; ++i, deficits += kBytes)
             setBytes(deficits, disc.rimDeficit[disc.rimStart[d] + i], kBytes);
@@ -69,7 +66,7 @@ VOREL_INLINE void raise(uint8_t* target, U8s value) {
 }
 
 /// Spreads a vector of the source; `target` is its own place among the results.
-inline void spreadVector(const DiscShape& disc, const SpreadPlanes& planes, const uint8_t* source,
+inline void spreadVector(const DiscShape& disc, const SpreadLayout& planes, const uint8_t* source,
                          uint8_t* target) {
     U8s pairs[kLongestSpreadReach + 1];
     for (int64_t k = 0; k <= disc.reach; ++k)
@@ -91,7 +88,7 @@ inline void spreadVector(const DiscShape& disc, const SpreadPlanes& planes, cons
 }
 
 /// Spreads a row of the source; `targets` is its own row of results.
-inline void spreadRow(const Dilation& dilation, const SpreadPlanes& planes, uint8_t* targets) {
+inline void spreadRow(const Dilation& dilation, const SpreadLayout& planes, uint8_t* targets) {
     const DiscShape& disc = *dilation.disc;
     const uint8_t* const source = planes.row.at(0) + dilation.left;
     // A disc that ends with rows of the rim alone reaches farther than it fills.
@@ -109,7 +106,7 @@ inline void spreadRow(const Dilation& dilation, const SpreadPlanes& planes, uint
 }
 
 /// Makes room for the rows of results of the band that begins with row y: some of them have been begun.
-inline void nextBand(const Dilation& dilation, const SpreadPlanes& planes, bool isFirst) {
+inline void nextBand(const Dilation& dilation, const SpreadLayout& planes, bool isFirst) {
     const int64_t reach = dilation.disc->reach;
     const int64_t begun = isFirst ? 0 : 2 * reach;
     uint8_t* const band = planes.rows + 2 * reach * planes.stride;
@@ -121,8 +118,8 @@ inline void nextBand(const Dilation& dilation, const SpreadPlanes& planes, bool 
 }
 
 /// The band before has spread the rows in its reach.
-inline uint8_t* dilateRowsBySpreading(const Dilation& dilation, int64_t y, int64_t count) {
-    const SpreadPlanes planes = spreadPlanes(dilation);
+inline uint8_t* rowsBySpreading(const Dilation& dilation, uint8_t* memory, int64_t y, int64_t count) {
+    const auto planes = layoutIn<SpreadLayout>(memory);
     const int64_t reach = dilation.disc->reach;
     const bool isFirst = y == dilation.top;
     nextBand(dilation, planes, isFirst);
@@ -134,5 +131,7 @@ inline uint8_t* dilateRowsBySpreading(const Dilation& dilation, int64_t y, int64
     }
     return band;
 }
+
+constexpr DilationStrategy kSpreading = {layoutBytes<SpreadLayout>, beginSpreading, rowsBySpreading};
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

@@ -50,9 +50,13 @@ constexpr int64_t kLongestWindow = 64;
 /// Columns for the windows and the vector that start last.
 constexpr int64_t kWindowSlack = kLongestWindow + 2 * kBytes;
 
-/// The way's working memory.
-struct TilePlanes {
+/// Rows as long as they may be take nine windows of 64 pixels, rows shorter than 16 up to 15 single
+/// ones.
+constexpr int64_t kMostTaps = 16;
+
+struct TileLayout {
     int64_t tiles;
+    uint8_t largest;  ///< of all coverage
     // By row of the source.
     PaddedRows rows;
     PaddedRows windows[2];
@@ -74,43 +78,37 @@ struct TilePlanes {
     Tile* rimDeficits;
     uint8_t* outerReach;  ///< by dy, from -reach to reach, at most 255, then zeros
     uint8_t* results;     ///< of a band
-    int64_t bytes;
+
+    static TileLayout of(const Dilation& dilation, Arena& arena) {
+        const int64_t height = dilation.height;
+        const int64_t reach = dilation.disc->reach;
+        const auto take = [&] {
+            return takeRows(dilation, height, reach + kFewestRimCells, reach + kWindowSlack, arena);
+        };
+        TileLayout layout;
+        layout.tiles = (dilation.right - dilation.left + kTile - 1) / kTile;
+        layout.largest = 0;
+        layout.rows = take();
+        layout.windows[0] = take();
+        layout.windows[1] = take();
+        layout.lengths[0] = reach < 24 ? 4 : 16;
+        layout.lengths[1] = 4 * layout.lengths[0];
+        layout.reachStride = roundedUp(layout.tiles, kDistances);
+        layout.full = arena.take<Reach>(height * layout.reachStride);
+        layout.touched = arena.take<Reach>(height * layout.reachStride);
+        layout.columnStride = height + kBytes;
+        layout.toRight = arena.take<uint8_t>(layout.tiles * layout.columnStride);
+        layout.toLeft = arena.take<uint8_t>(layout.tiles * layout.columnStride);
+        layout.ink = takeExtents(layout.tiles, arena);
+        layout.most = takeExtents(layout.tiles, arena);
+        layout.discRows = arena.take<DiscRow>(reach + 1);
+        layout.taps = arena.take<int32_t>((reach + 1) * kMostTaps);
+        layout.rimDeficits = arena.take<Tile>(DiscShape::kMostRimCells + (reach + 1) * kFewestRimCells);
+        layout.outerReach = arena.take<uint8_t>(2 * reach + 1 + kOverhang);
+        layout.results = arena.take<uint8_t>(dilation.bandRows * dilatedStride(dilation));
+        return layout;
+    }
 };
-
-/// Rows as long as they may be take nine windows of 64 pixels, rows shorter than 16 up to 15 single
-/// ones.
-constexpr int64_t kMostTaps = 16;
-
-inline TilePlanes tilePlanes(const Dilation& dilation) {
-    const int64_t height = dilation.height;
-    const int64_t reach = dilation.disc->reach;
-    Arena arena = {dilation.memory};
-    TilePlanes planes;
-    planes.tiles = (dilation.right - dilation.left + kTile - 1) / kTile;
-    const auto take = [&] {
-        return takeRows(dilation, height, reach + kFewestRimCells, reach + kWindowSlack, arena);
-    };
-    planes.rows = take();
-    planes.windows[0] = take();
-    planes.windows[1] = take();
-    planes.lengths[0] = reach < 24 ? 4 : 16;
-    planes.lengths[1] = 4 * planes.lengths[0];
-    planes.reachStride = (planes.tiles + kDistances - 1) / kDistances * kDistances;
-    planes.full = arena.take<Reach>(height * planes.reachStride);
-    planes.touched = arena.take<Reach>(height * planes.reachStride);
-    planes.columnStride = height + kBytes;
-    planes.toRight = arena.take<uint8_t>(planes.tiles * planes.columnStride);
-    planes.toLeft = arena.take<uint8_t>(planes.tiles * planes.columnStride);
-    planes.ink = takeExtents(planes.tiles, arena);
-    planes.most = takeExtents(planes.tiles, arena);
-    planes.discRows = arena.take<DiscRow>(reach + 1);
-    planes.taps = arena.take<int32_t>((reach + 1) * kMostTaps);
-    planes.rimDeficits = arena.take<Tile>(DiscShape::kMostRimCells + (reach + 1) * kFewestRimCells);
-    planes.outerReach = arena.take<uint8_t>(2 * reach + 1 + kOverhang);
-    planes.results = arena.take<uint8_t>(dilation.bandRows * dilatedStride(dilation));
-    planes.bytes = arena.used;
-    return planes;
-}
 
 // --- The disc ----------------------------------------------------------------------------------------
 
@@ -120,7 +118,7 @@ VOREL_INLINE int64_t evenAtLeast(int64_t count, int64_t fewest) {
 
 /// Covers a run of full cells with the longest windows that are not too long. They lie over each other
 /// where there are more than it takes.
-inline int32_t listFlatTaps(const TilePlanes& planes, int64_t reach, int32_t* taps) {
+inline int32_t listFlatTaps(const TileLayout& planes, int64_t reach, int32_t* taps) {
     const int64_t length = 2 * reach + 1;
     int64_t plane = 0;
     int64_t step = 1;
@@ -131,10 +129,11 @@ inline int32_t listFlatTaps(const TilePlanes& planes, int64_t reach, int32_t* ta
     const int64_t count = evenAtLeast((length + step - 1) / step, kFewestTaps);
     for (int64_t i = 0; i < count; ++i)
         taps[i] = static_cast<int32_t>(plane + min(i * step - reach, reach + 1 - step));
+    VOREL_ASSERT(count <= kMostTaps);
     return static_cast<int32_t>(count);
 }
 
-inline void listDiscRows(const TilePlanes& planes, const DiscShape& disc) {
+inline void listDiscRows(const TileLayout& planes, const DiscShape& disc) {
     int32_t* taps = planes.taps;
     Tile* deficits = planes.rimDeficits;
     for (int64_t dy = 0; dy <= disc.reach; ++dy, taps += kMostTaps) {
@@ -153,7 +152,7 @@ inline void listDiscRows(const TilePlanes& planes, const DiscShape& disc) {
     }
 }
 
-inline void listOuterReach(const TilePlanes& planes, const DiscShape& disc) {
+inline void listOuterReach(const TileLayout& planes, const DiscShape& disc) {
     setBytes(planes.outerReach, 0, 2 * disc.reach + 1 + kOverhang);
     for (int64_t dy = -disc.reach; dy <= disc.reach; ++dy) {
         const int reach = disc.outerReach[dy < 0 ? -dy : dy];
@@ -199,7 +198,7 @@ inline void widenWindows(const PaddedRows& rows, const uint8_t* from, uint8_t* t
 }
 
 /// Fills the rows of coverage and of windows.
-inline void fillRows(const Dilation& dilation, const TilePlanes& planes) {
+inline void fillRows(const Dilation& dilation, const TileLayout& planes) {
     for (int64_t y = 0; y < dilation.height; ++y) {
         fillRow(dilation, y, planes.rows, y);
         uint8_t* const windows = planes.windows[0].at(y);
@@ -223,10 +222,10 @@ inline uint8_t largestCoverage(const PaddedRows& rows, int64_t height) {
 }
 
 /// Notes what is covered in a row of the source, which may lie behind its last one.
-inline void findExtents(const Dilation& dilation, const TilePlanes& planes, int64_t y) {
+inline void findExtents(const Dilation& dilation, const TileLayout& planes, int64_t y) {
     const bool inside = y < dilation.height;
     const uint8_t* const source = planes.rows.at(inside ? y : 0) + dilation.left;
-    const U8s most = splat<U8s>(dilation.largest);
+    const U8s most = splat<U8s>(planes.largest);
     for (int64_t tile = 0; tile < planes.tiles; tile += kBytes / kTile) {
         const U8s coverage = inside ? load<U8s>(source + tile * kTile) : U8s{};
         const uint64_t ink = nonZeroLanes(coverage);
@@ -246,7 +245,7 @@ VOREL_INLINE void storeBytes(uint8_t* to, Distances distances) {
 }
 
 /// Looks up what kDistances rows from row y on reach of a tile.
-inline void noteReaches(const Dilation& dilation, const TilePlanes& planes, const DiscReaches& reaches,
+inline void noteReaches(const Dilation& dilation, const TileLayout& planes, const DiscReaches& reaches,
                         int64_t y, int64_t tile) {
     const int64_t at = tile * kDistances;
     const Distances toRight = toTheRight(planes.ink, at);
@@ -269,7 +268,7 @@ inline void noteReaches(const Dilation& dilation, const TilePlanes& planes, cons
 }
 
 /// What lies behind the last tile of a row, to the end of a vector, is both full and untouched.
-inline void closeReaches(const TilePlanes& planes, int64_t height) {
+inline void closeReaches(const TileLayout& planes, int64_t height) {
     for (int64_t y = 0; y < height; ++y) {
         for (int64_t tile = planes.tiles; tile < planes.reachStride; ++tile) {
             planes.full[y * planes.reachStride + tile] = kBeyond;
@@ -292,10 +291,10 @@ inline void passReaches(Reach* reaches, int64_t stride, int64_t height) {
         pass(y, y - 1);
 }
 
-inline void beginTiles(Dilation& dilation) {
-    const TilePlanes planes = tilePlanes(dilation);
+inline void beginTiles(const Dilation& dilation, uint8_t* memory) {
+    TileLayout& planes = layOut<TileLayout>(dilation, memory);
     fillRows(dilation, planes);
-    dilation.largest = largestCoverage(planes.rows, dilation.height);
+    planes.largest = largestCoverage(planes.rows, dilation.height);
     listDiscRows(planes, *dilation.disc);
     listOuterReach(planes, *dilation.disc);
 
@@ -343,7 +342,7 @@ VOREL_INLINE Tile dilatedRow(const DiscRow& row, const uint8_t* source) {
 
 /// A tile of the result on its way up from 0.
 struct OpenTile {
-    const TilePlanes& planes;
+    const TileLayout& planes;
     int64_t y;
     const uint8_t* source;   ///< the tile's place in the first row of the source
     const uint8_t* toRight;  ///< of the tile's column
@@ -405,7 +404,7 @@ inline void addTouching(OpenTile& tile, RowRange rows, int firstOpen, int lastOp
     }
 }
 
-inline Tile dilatedTile(const Dilation& dilation, const TilePlanes& planes, int64_t y, int64_t tile) {
+inline Tile dilatedTile(const Dilation& dilation, const TileLayout& planes, int64_t y, int64_t tile) {
     const int64_t reach = dilation.disc->reach;
     OpenTile open = {planes,
                      y,
@@ -419,24 +418,24 @@ inline Tile dilatedTile(const Dilation& dilation, const TilePlanes& planes, int6
     // The nearest row and the one in the middle mostly settle the pixels that come out as M.
     open.add(min(max(y, rows.first), rows.last));
     open.add((rows.first + rows.last) / 2);
-    const uint64_t unsettled = open.unsettled(dilation.largest);
+    const uint64_t unsettled = open.unsettled(planes.largest);
     if (unsettled != 0) addTouching(open, rows, firstLane(unsettled), lastLane(unsettled));
     return open.result;
 }
 
-inline void dilateRowByTiles(const Dilation& dilation, const TilePlanes& planes, int64_t y,
+inline void dilateRowByTiles(const Dilation& dilation, const TileLayout& planes, int64_t y,
                              uint8_t* results) {
     const int64_t nearest = min(max<int64_t>(y, 0), dilation.height - 1);
     const auto away = static_cast<Reach>(y < nearest ? nearest - y : y - nearest);
     const Reach* const full = planes.full + nearest * planes.reachStride;
     const Reach* const touched = planes.touched + nearest * planes.reachStride;
-    const Tile most = splat<Tile>(dilation.largest);
+    const Tile most = splat<Tile>(planes.largest);
     for (int64_t tile = 0; tile < planes.tiles; tile += kDistances) {
         const int64_t end = min(tile + kDistances, planes.tiles);
         const bool allFull = allZero(bitCast<U8s>(load<Distances>(full + tile) < away));
         const bool allUntouched = allZero(bitCast<U8s>(load<Distances>(touched + tile) >= away));
         if (allFull || allUntouched) {
-            setBytes(results + tile * kTile, allFull ? dilation.largest : 0, (end - tile) * kTile);
+            setBytes(results + tile * kTile, allFull ? planes.largest : 0, (end - tile) * kTile);
             continue;
         }
         for (int64_t i = tile; i < end; ++i) {
@@ -448,11 +447,13 @@ inline void dilateRowByTiles(const Dilation& dilation, const TilePlanes& planes,
     }
 }
 
-inline uint8_t* dilateRowsByTiles(const Dilation& dilation, int64_t y, int64_t count) {
-    const TilePlanes planes = tilePlanes(dilation);
+inline uint8_t* rowsByTiles(const Dilation& dilation, uint8_t* memory, int64_t y, int64_t count) {
+    const auto planes = layoutIn<TileLayout>(memory);
     for (int64_t i = 0; i < count; ++i)
         dilateRowByTiles(dilation, planes, y + i, planes.results + i * dilatedStride(dilation));
     return planes.results;
 }
+
+constexpr DilationStrategy kTiles = {layoutBytes<TileLayout>, beginTiles, rowsByTiles};
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

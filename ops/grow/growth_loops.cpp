@@ -3,8 +3,6 @@
 #include <cstdint>
 #include <cstring>
 
-#include "blend/rows.h"
-#include "blend/rules.h"
 #include "simd/pieces.h"
 
 /// Growth: each pass makes a pixel a quarter of its 3 x 3 sum, at most 255.
@@ -25,7 +23,7 @@ namespace {
 constexpr int64_t kTileColumns = kBytes > kGrowthTile ? kBytes : kGrowthTile;
 constexpr int64_t kTileRows = kGrowthTile;
 
-/// Adds to each half the lower, or the upper, of the two bytes that stand there.
+/// Adds to each 16-bit lane the lower, or the upper, of the two bytes that stand there.
 VOREL_INLINE U16s plusLowBytes(U16s sums, U8s v) {
     return sums + (bitCast<U16s>(v) & 0x00FF);
 }
@@ -164,53 +162,8 @@ void grow(const GrowthJob& job) {
     }
 }
 
-/// 256 * value / 180: of the upper half of a product with 2^23 / 180, rounded up, the upper 9 bits. The
-/// rounding adds less than 0.005 for values of a byte, and whole quotients lie 1 / 45 apart from the
-/// next fraction below: this is the whole quotient.
-VOREL_INLINE U16s fadedHalves(U16s values, U16s alpha) {
-    constexpr uint16_t kMultiplier = ((1U << 23) + kFadedValues - 1) / kFadedValues;
-    const U16s quotient = multiplyHigh(values << 8, splat<U16s>(kMultiplier)) >> 7;
-    const auto factor = min(bitCast<I16s>(quotient), splat<I16s>(int16_t{256}));
-    return alpha * bitCast<U16s>(factor) >> 8;
-}
-
-void fade(uint8_t* values, int64_t count, uint32_t alpha) {
-    const auto alphas = splat<U16s>(static_cast<uint16_t>(alpha));
-    const auto faded = [alphas](U8s v) VOREL_INLINE_LAMBDA {
-        return narrow(fadedHalves(widenLow(v), alphas), fadedHalves(widenHigh(v), alphas));
-    };
-    int64_t x = 0;
-    for (; x + kBytes <= count; x += kBytes)
-        store(values + x, faded(load<U8s>(values + x)));
-    if (x == count) return;
-    const U8s rest = faded(loadFirst(values + x, count - x));
-    std::memcpy(values + x, &rest, static_cast<size_t>(count - x));
-}
-
-struct GlowPainter {
-    static constexpr bool kReadsImage = false;
-    static constexpr bool kReadsMask = true;
-    static constexpr bool kIsSparse = false;
-    static constexpr Empty kEmpty = Empty::keeps;
-    const uint32_t* pixels;
-
-    template <int64_t kCount>
-    VOREL_INLINE bool isEmpty(const Place& place) const {
-        return hasEmptyMask<kCount>(place);
-    }
-    VOREL_INLINE bool paintWhole(const Place&) const { return false; }
-    VOREL_INLINE Pixels paint(const Place& place) const {
-        const Pixels colours = madeOfWords([&](int64_t i) { return gather(pixels, place.mask() + i); });
-        return DstOver::apply(loadPixels(place.destination()), colours);
-    }
-};
-
-void paint(const GlowJob& job) {
-    paintRows(GlowPainter{job.pixels}, job.blend);
-}
-
 }  // namespace
 
-extern const GrowthLoops kGrowthLoops = {copyInverted, grow, fade, paint};
+extern const GrowthLoops kGrowthLoops = {copyInverted, grow};
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

@@ -4,9 +4,9 @@
 #include <cstdint>
 #include <cstring>
 
+#include "core/assert.h"
 #include "core/box.h"
 #include "core/numeric.h"
-#include "ops/grow/growth_loops.h"
 
 namespace VFontEffect::internal {
 namespace {
@@ -57,20 +57,6 @@ Box inkedPart(const Picture& picture) {
     return inked;
 }
 
-void copyIn(const Picture& picture, const Box& part, Growth& growth) {
-    for (int64_t y = -1; y <= part.height(); ++y) {
-        std::memcpy(growth.row(y) - 1, picture.at(part.left - 1, part.top + y),
-                    static_cast<size_t>(part.width() + 2));
-    }
-}
-
-void copyOut(Growth& growth, const Box& part, const Picture& picture) {
-    for (int64_t y = 0; y < part.height(); ++y) {
-        std::memcpy(picture.at(part.left, part.top + y), growth.row(y),
-                    static_cast<size_t>(part.width()));
-    }
-}
-
 /// Deliberate: the first and the last column count as 0 after a pass, but for their ends.
 void clearEndColumns(const Picture& picture) {
     for (int64_t y = 1; y < picture.height - 1; ++y)
@@ -88,56 +74,92 @@ LineBuffer planeFor(int64_t width, int64_t height) {
 
 }  // namespace
 
-Growth::Growth(int64_t width, int64_t height)
-    : mWidth(width),
-      mHeight(height),
-      mStride(strideFor(width)),
-      mPlanes{planeFor(width, height), planeFor(width, height)},
-      mTiles(PixelBuffer<uint8_t>::uninitialised(growthTileBytes(width, height))) {}
-
-uint8_t* Growth::rowOf(int plane, int64_t y) {
-    return mPlanes[plane].data() + kGrowthMargin + (y + 1) * mStride;
-}
-
-/// The other plane's frame: as it is in this one above and below, `beside` at the sides.
-void Growth::frameOther(uint8_t beside) {
-    const int other = 1 - mCurrent;
-    for (const int64_t y : {int64_t{-1}, mHeight})
-        std::memcpy(rowOf(other, y) - 1, row(y) - 1, static_cast<size_t>(mWidth + 2));
-    for (int64_t y = 0; y < mHeight; ++y)
-        rowOf(other, y)[-1] = rowOf(other, y)[mWidth] = beside;
-}
-
-void Growth::grow(int passes, uint8_t beside) {
-    frameOther(beside);
-    growthLoops().grow({{rowOf(mCurrent, 0), rowOf(1 - mCurrent, 0)},
-                        mStride,
-                        mWidth,
-                        mHeight,
-                        beside,
-                        passes,
-                        mTiles.data()});
-    if (passes % 2 != 0) mCurrent = 1 - mCurrent;
-}
-
-void Growth::finish() {
+GrowthPlan::GrowthPlan(CpuLevel level, const GrowthInput& input)
+    : mLoops(growthLoops(level)),
+      mMargin(input.margin),
+      mWidth(input.source.width + 2 * mMargin),
+      mHeight(input.source.height + 2 * mMargin),
+      mInvertMask(input.source.invertMask),
+      mStride(strideFor(mWidth)),
+      mPlanes{planeFor(mWidth, mHeight), planeFor(mWidth, mHeight)},
+      mTiles(PixelBuffer<uint8_t>::uninitialised(growthTileBytes(mWidth, mHeight))) {
+    VOREL_ASSERT(mMargin >= -1 && mWidth > 0 && mHeight > 0 && input.passes > 0);
+    if (mPlanes[0] && mPlanes[1] && mTiles) {
+        copyIn(input);
+        // What stood beside the rows in the source counts in the first pass only.
+        const int first = mMargin < 0 ? 1 : input.passes;
+        grow(first);
+        if (input.passes > first) grow(input.passes - first);
+    } else {
+        mPlanes[mCurrent].release();
+    }
     mPlanes[1 - mCurrent].release();
     mTiles.release();
 }
 
+CoverageRows GrowthPlan::rows(int64_t y, int64_t count) {
+    VOREL_ASSERT(*this && y >= -mMargin && count >= 0 && y + count <= mHeight - mMargin);
+    return {rowOf(mCurrent, y + mMargin), mStride, mWidth, count, mInvertMask};
+}
+
+/// Row 0 to mHeight - 1 of what grows, between the frame's pixels at -1 and mWidth; row -1 and row
+/// mHeight are the frame's.
+uint8_t* GrowthPlan::rowOf(int plane, int64_t y) {
+    return mPlanes[plane].data() + kGrowthMargin + (y + 1) * mStride;
+}
+
+void GrowthPlan::copyIn(const GrowthInput& input) {
+    const CoverageRows& source = input.source;
+    const auto side = static_cast<size_t>(mMargin + 1);
+    for (int64_t y = -1 - mMargin; y <= source.height + mMargin; ++y) {
+        uint8_t* const row = rowOf(0, y + mMargin) - 1;
+        if (y < 0 || y >= source.height) {
+            std::memset(row, mInvertMask, 2 * side + static_cast<size_t>(source.width));
+            continue;
+        }
+        std::memset(row, mInvertMask, side);
+        mLoops.copyInverted(source.start + y * source.stride, source.width, mInvertMask, row + side);
+        std::memset(row + side + source.width, mInvertMask, side);
+    }
+}
+
+/// The frame of the other plane: as it is in this one above and below.
+void GrowthPlan::setFrame(int plane, int other) {
+    for (const int64_t y : {int64_t{-1}, mHeight})
+        std::memcpy(rowOf(other, y) - 1, rowOf(plane, y) - 1, static_cast<size_t>(mWidth + 2));
+    for (int64_t y = 0; y < mHeight; ++y)
+        rowOf(other, y)[-1] = rowOf(other, y)[mWidth] = mInvertMask;
+}
+
+void GrowthPlan::grow(int passes) {
+    const int other = 1 - mCurrent;
+    setFrame(mCurrent, other);
+    mLoops.grow({{rowOf(mCurrent, 0), rowOf(other, 0)},
+                 mStride,
+                 mWidth,
+                 mHeight,
+                 mInvertMask,
+                 passes,
+                 mTiles.data()});
+    if (passes % 2 != 0) mCurrent = other;
+}
+
 // What is not 0 spreads by a pixel a pass: the part that changes lies within `passes` pixels of it.
-void growByBoxFilter(unsigned char* mask, int passes, int width, int height) {
+void growByBoxFilter(CpuLevel level, unsigned char* mask, int passes, int width, int height) {
     if (mask == nullptr || passes < 1 || width < 1 || height <= 2) return;
     const Picture picture = {mask, width, height};
     const Box inner = {1, 1, int64_t{width} - 1, int64_t{height} - 1};
     const Box part = intersection(expanded(inkedPart(picture), passes), inner);
     if (part.empty()) return clearEndColumns(picture);
-    Growth growth(part.width(), part.height());
-    if (!growth) return;
-    copyIn(picture, part, growth);
-    growth.grow(1, 0);
-    growth.grow(passes - 1, 0);
-    copyOut(growth, part, picture);
+    const CoverageRows framed = {picture.at(part.left - 1, part.top - 1), width, part.width() + 2,
+                                 part.height() + 2, kAsIs};
+    GrowthPlan plan(level, {framed, -1, passes});
+    if (!plan) return;
+    const CoverageRows grown = plan.rows(1, part.height());
+    for (int64_t y = 0; y < grown.height; ++y) {
+        std::memcpy(picture.at(part.left, part.top + y), grown.start + y * grown.stride,
+                    static_cast<size_t>(grown.width));
+    }
     clearEndColumns(picture);
 }
 

@@ -2,40 +2,46 @@
 
 #include <cstdint>
 
+#include "core/coverage_rows.h"
 #include "core/line_buffer.h"
 #include "core/pixel_buffer.h"
-#include "ops/blur/dot_loops.h"
+#include "ops/grow/growth_loops.h"
 
 namespace VFontEffect::internal {
 
-/// Coverage that grows: each pass makes a pixel a quarter of its 3 x 3 sum, at most 255. Around it is a
-/// frame of one pixel, which counts in the sums and does not grow.
-class Growth {
+/// What grows: each pass makes a pixel a quarter of its 3 x 3 sum, at most 255. Around what grows is a
+/// frame of one pixel, which counts in the sums and stays.
+struct GrowthInput {
+    CoverageRows source;
+    /// So many pixels around the source grow too, at first 0 ^ invertMask as the frame around them; with
+    /// -1 the source's own edge is the frame.
+    int64_t margin;
+    int passes;
+};
+
+/// A growth, done at once, for a pass needs all of the one before. It is ready, or empty when memory ran
+/// out.
+class GrowthPlan {
   public:
-    Growth(int64_t width, int64_t height);
+    GrowthPlan(CpuLevel level, const GrowthInput& input);
 
-    /// Whether there is memory for it.
-    explicit operator bool() const { return mPlanes[0] && mPlanes[1] && mTiles; }
+    explicit operator bool() const { return mPlanes[0] || mPlanes[1]; }
 
-    /// The coverage of row 0 to height - 1, between the frame's pixels at -1 and width; row -1 and row
-    /// `height` are the frame's.
-    uint8_t* row(int64_t y) { return rowOf(mCurrent, y); }
-
-    /// From the second pass on the frame beside the rows is `beside`; above and below it stays.
-    void grow(int passes, uint8_t beside);
-
-    /// Gives back the memory that only growing takes.
-    void finish();
-
-    /// The coverage, each byte ^ invertMask.
-    BlurSource source(uint8_t invertMask) { return {row(0), mStride, mWidth, mHeight, invertMask}; }
+    /// `count` rows from the source's row y on, first column -margin, to be taken as the source is: each
+    /// byte ^ its invertMask.
+    CoverageRows rows(int64_t y, int64_t count);
 
   private:
     uint8_t* rowOf(int plane, int64_t y);
-    void frameOther(uint8_t beside);
+    void copyIn(const GrowthInput& input);
+    void setFrame(int plane, int other);
+    void grow(int passes);
 
+    const GrowthLoops& mLoops;
+    int64_t mMargin;
     int64_t mWidth;
     int64_t mHeight;
+    uint8_t mInvertMask;
     int64_t mStride;
     LineBuffer mPlanes[2];
     PixelBuffer<uint8_t> mTiles;
@@ -44,6 +50,6 @@ class Growth {
 
 /// Grows the coverage of a whole picture in place; see VFOuterGlow::increaseByBoxFilter. When memory
 /// runs out it stays as it was.
-void growByBoxFilter(unsigned char* mask, int passes, int width, int height);
+void growByBoxFilter(CpuLevel level, unsigned char* mask, int passes, int width, int height);
 
 }  // namespace VFontEffect::internal

@@ -4,10 +4,10 @@
 
 namespace VFontEffect::internal {
 
-GradientTable::GradientTable(const VFGradient* stops, int count) {
+GradientTable::GradientTable(const RampLoops& loops, const VFGradient* stops, int count) {
     std::fill_n(mPixels, kTableLast, stops[0].mColor);
-    if (count > 1) fillBetweenStops(stops, count, stops[0].mLocation, TablePositions(), mPixels);
-    rampLoops().premultiplied(mPixels, kTableLast, mPixels);
+    if (count > 1) fillBetweenStops(loops, stops, count, stops[0].mLocation, TablePositions(), mPixels);
+    loops.premultiplied(mPixels, kTableLast, mPixels);
 }
 
 }  // namespace VFontEffect::internal

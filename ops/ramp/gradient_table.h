@@ -2,7 +2,6 @@
 
 #include <cstdint>
 
-#include "cores/covered_fill.h"
 #include "ops/ramp/ramp_loops.h"
 #include "ops/ramp/stop_ramp.h"
 
@@ -12,19 +11,12 @@ namespace VFontEffect::internal {
 class GradientTable {
   public:
     /// `count` of 1 or more stops.
-    GradientTable(const VFGradient* stops, int count);
+    GradientTable(const RampLoops& loops, const VFGradient* stops, int count);
 
     RampPixels pixels() const { return mPixels; }
 
   private:
     uint32_t mPixels[kTableLast];
 };
-
-/// Whether a gradient record has what it takes to draw.
-template <class Property>
-bool canFill(const Property* record) {
-    return record != nullptr && !(record->mScale < kSmallestScale) && record->mGradient != nullptr &&
-           record->mGradientCount > 0;
-}
 
 }  // namespace VFontEffect::internal

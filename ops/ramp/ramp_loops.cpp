@@ -15,10 +15,6 @@ namespace {
 constexpr int32_t kLastEntry = 255;
 constexpr int32_t kMiddleEntry = 128;
 
-VOREL_INLINE I32s clamped(I32s value, int32_t low, int32_t high) {
-    return max(min(value, splat<I32s>(high)), splat<I32s>(low));
-}
-
 /// x - centre for the columns x, x + 1, ...
 VOREL_INLINE F32s columnsFrom(int64_t x, float centre) {
     return __builtin_convertvector(iota<I32s>() + static_cast<int32_t>(x), F32s) - centre;
@@ -91,8 +87,6 @@ void fillRamp(const BlendJob& job, const Ramp& ramp) {
     }
 }
 
-constexpr uint32_t kEvenBytes = 0x00FF00FFU;
-
 /// Weights of 256ths: the colours keep all four bytes alike, two of them at a time. Positions beyond a
 /// segment have the colour of its end.
 void mixStops(const RampSegment& segment, const float* positions, int64_t count, uint32_t* colours) {
@@ -119,54 +113,50 @@ void premultiplied(const uint32_t* colours, int64_t count, uint32_t* pixels) {
     }
 }
 
-/// Two bytes of each word times the weight in both of its halves: 255 * 255 fits in 16 bits.
-VOREL_INLINE U16s weighted(U32s bytes, U32s weight) {
-    return bitCast<U16s>(bytes) * bitCast<U16s>(weight);
+/// 256 * value / 180: of the upper half of a product with 2^23 / 180, rounded up, the upper 9 bits. The
+/// rounding adds less than 0.005 for values of a byte, and whole quotients lie 1 / 45 apart from the
+/// next fraction below: this is the whole quotient.
+VOREL_INLINE U16s fadedLanes(U16s values, U16s alpha) {
+    constexpr uint16_t kMultiplier = ((1U << 23) + kFadedValues - 1) / kFadedValues;
+    const U16s quotient = multiplyHigh(values << 8, splat<U16s>(kMultiplier)) >> 7;
+    const auto factor = min(bitCast<I16s>(quotient), splat<I16s>(int16_t{256}));
+    return alpha * bitCast<U16s>(factor) >> 8;
 }
 
-// Deliberate: pattern pixels stand in memory as A, R, G, B, unlike the destination's.
-void mixColumns(const uint32_t* patternRow, const ColumnTaps& taps, int64_t count, const MixedRow& out) {
-    const auto pixelsAt = [patternRow](const int32_t* columns) {
-        const U32s argb = gather(patternRow, load<I32s>(columns));
-        return argb >> 8 | argb << 24;
+void fade(uint8_t* values, int64_t count, uint32_t alpha) {
+    const auto alphas = splat<U16s>(static_cast<uint16_t>(alpha));
+    const auto faded = [alphas](U8s v) VOREL_INLINE_LAMBDA {
+        return narrow(fadedLanes(widenLow(v), alphas), fadedLanes(widenHigh(v), alphas));
     };
-    for (int64_t x = 0; x < count; x += kU32Lanes) {
-        const U32s near = pixelsAt(taps.near + x);
-        const U32s far = pixelsAt(taps.far + x);
-        const auto nearWeight = load<U32s>(taps.nearWeights + x);
-        const auto farWeight = load<U32s>(taps.farWeights + x);
-        store(out.redBlue + x,
-              weighted(near & kEvenBytes, nearWeight) + weighted(far & kEvenBytes, farWeight));
-        store(out.greenAlpha + x,
-              weighted(near >> 8 & kEvenBytes, nearWeight) + weighted(far >> 8 & kEvenBytes, farWeight));
-    }
+    int64_t x = 0;
+    for (; x + kBytes <= count; x += kBytes)
+        store(values + x, faded(load<U8s>(values + x)));
+    if (x == count) return;
+    const U8s rest = faded(loadFirst(values + x, count - x));
+    std::memcpy(values + x, &rest, static_cast<size_t>(count - x));
 }
 
-/// (near * nearWeight + far * farWeight) >> 16: the upper halves of both products, and the carry of the
-/// lower ones.
-VOREL_INLINE U16s mixed(const uint32_t* near, const uint32_t* far, U16s nearWeight, U16s farWeight) {
-    const auto n = load<U16s>(near);
-    const auto f = load<U16s>(far);
-    const U16s low = n * nearWeight;
-    const U16s carry = bitCast<U16s>(low + f * farWeight < low);
-    return multiplyHigh(n, nearWeight) + multiplyHigh(f, farWeight) - carry;
-}
+/// The mask is values, each painted in its colour.
+struct ValuePainter {
+    static constexpr bool kReadsImage = false;
+    static constexpr bool kReadsMask = true;
+    static constexpr bool kIsSparse = false;
+    static constexpr Empty kEmpty = Empty::keeps;
+    RampPixels pixels;
 
-// Deliberate: weights of 255 and a shift by 16 sample an opaque pattern as 253.
-void mixRows(const MixedRow& near, const MixedRow& far, uint32_t nearWeight, uint32_t farWeight,
-             float opacity, int64_t count, uint32_t* out) {
-    const auto n = splat<U16s>(static_cast<uint16_t>(nearWeight));
-    const auto f = splat<U16s>(static_cast<uint16_t>(farWeight));
-    for (int64_t x = 0; x < count; x += kU32Lanes) {
-        const U16s redBlue = mixed(near.redBlue + x, far.redBlue + x, n, f);
-        const U16s greenAlpha = mixed(near.greenAlpha + x, far.greenAlpha + x, n, f);
-        const auto straightAlpha = bitCast<I32s>(bitCast<U32s>(greenAlpha) >> 16);
-        const I32s seenAlpha = toInt(__builtin_convertvector(straightAlpha, F32s) * opacity);
-        const auto alpha = bitCast<U32s>(clamped(seenAlpha, 0, 255));
-        const auto factor = bitCast<U16s>(alpha | alpha << 16);
-        const auto green = bitCast<U32s>(product(greenAlpha, factor)) & 0xFFFFU;
-        store(out + x, bitCast<U32s>(product(redBlue, factor)) | green << 8 | alpha << 24);
+    template <int64_t kCount>
+    VOREL_INLINE bool isEmpty(const Place& place) const {
+        return hasEmptyMask<kCount>(place);
     }
+    VOREL_INLINE bool paintWhole(const Place&) const { return false; }
+    VOREL_INLINE Pixels paint(const Place& place) const {
+        const Pixels colours = madeOfWords([&](int64_t i) { return gather(pixels, place.mask() + i); });
+        return DstOver::apply(loadPixels(place.destination()), colours);
+    }
+};
+
+void byValue(const BlendJob& job, RampPixels pixels) {
+    paintRows(ValuePainter{pixels}, job);
 }
 
 }  // namespace
@@ -176,8 +166,8 @@ extern const RampLoops kRampLoops = {
     fillRamp<RadialRow, RadialRamp>,
     mixStops,
     premultiplied,
-    mixColumns,
-    mixRows,
+    byValue,
+    fade,
 };
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

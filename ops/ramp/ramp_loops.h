@@ -4,7 +4,7 @@
 
 #include "blend/blend_loops.h"
 
-/// The inner loops of gradients and patterns, compiled once per level of the instruction set.
+/// The inner loops of colour ramps, compiled once per level of the instruction set.
 namespace VFontEffect::internal {
 
 /// The colours of a gradient, entries 0..255, premultiplied, as pixels in memory: R, G, B, A.
@@ -27,8 +27,8 @@ struct RadialRamp {
     float centreY;
 };
 
-/// Rows may be read and written this many pixels past their count where a kernel says so.
-constexpr int64_t kRowSlack = 16;
+/// Tables are read and written in whole vectors: up to so many entries past their count.
+constexpr int64_t kRampSlack = kWidestVector / 4;
 
 /// A stretch of a ramp between two stops with straight colours 0xAARRGGBB, from `start` on.
 struct RampSegment {
@@ -38,21 +38,8 @@ struct RampSegment {
     float span;
 };
 
-/// Where each column of a row is sampled: two neighbouring pattern pixels and their weights, which add
-/// up to 255. A weight stands in both halves of its word.
-struct ColumnTaps {
-    const int32_t* near;
-    const int32_t* far;
-    const uint32_t* nearWeights;
-    const uint32_t* farWeights;
-};
-
-/// A row of the pattern mixed along its columns, before any shift: red and blue of each pixel in one
-/// plane of words, green and alpha in the other, 16 bits each, up to 255 * 255.
-struct MixedRow {
-    uint32_t* redBlue;
-    uint32_t* greenAlpha;
-};
+/// Weaker values than this fade.
+constexpr uint32_t kFadedValues = 180;
 
 struct RampLoops {
     /// Fill a covered box from its corner on: the job's mask is its coverage, which gates the colour.
@@ -64,20 +51,18 @@ struct RampLoops {
                      uint32_t* colours);
 
     /// Straight colours 0xAARRGGBB as premultiplied pixels in memory: R, G, B, A. Their count is a
-    /// multiple of kRowSlack.
+    /// multiple of kRampSlack.
     void (*premultiplied)(const uint32_t* colours, int64_t count, uint32_t* pixels);
 
-    /// Mixes `count` columns of a pattern row of words (memory order A, R, G, B). Rows of a pattern are
-    /// read and written past their count.
-    void (*mixColumns)(const uint32_t* patternRow, const ColumnTaps& taps, int64_t count,
-                       const MixedRow& out);
+    /// The job's mask is values: their colours beneath the destination. That of 0 must be transparent.
+    void (*byValue)(const BlendJob& job, RampPixels pixels);
 
-    /// `count` pixels (R, G, B, A, premultiplied) between two mixed rows, their alpha times `opacity`.
-    void (*mixRows)(const MixedRow& near, const MixedRow& far, uint32_t nearWeight, uint32_t farWeight,
-                    float opacity, int64_t count, uint32_t* out);
+    /// Makes values the alphas of a colour of that alpha: (alpha * factor) >> 8, where the factor is
+    /// 256 * value / kFadedValues, rounded down, and 256 at most.
+    void (*fade)(uint8_t* values, int64_t count, uint32_t alpha);
 };
 
-/// The kernels of the chosen level.
-const RampLoops& rampLoops();
+/// The loops of a level.
+const RampLoops& rampLoops(CpuLevel level);
 
 }  // namespace VFontEffect::internal

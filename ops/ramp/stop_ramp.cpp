@@ -1,9 +1,12 @@
 #include "ops/ramp/stop_ramp.h"
 
+#include "core/assert.h"
+
 namespace VFontEffect::internal {
 
-void fillBetweenStops(const VFGradient* stops, int count, float start, const TablePositions& positions,
-                      uint32_t* table) {
+void fillBetweenStops(const RampLoops& loops, const VFGradient* stops, int count, float start,
+                      const TablePositions& positions, uint32_t* table) {
+    VOREL_ASSERT(count > 1);
     float end = stops[1].mLocation;
     RampSegment segment = {stops[0].mColor, stops[1].mColor, start, end - start};
     int next = 2;
@@ -17,7 +20,7 @@ void fillBetweenStops(const VFGradient* stops, int count, float start, const Tab
         int behind = first + 1;
         while (behind < kTableLast && !movesOn(behind))
             ++behind;
-        rampLoops().mixStops(segment, positions.of + first, behind - first, table + first);
+        loops.mixStops(segment, positions.of + first, behind - first, table + first);
         first = behind;
     }
 }

@@ -13,7 +13,7 @@ constexpr int kTableLast = kTableSize - 1;
 
 /// The places on a ramp of a table's entries, which ascend, and of some more.
 struct TablePositions {
-    static constexpr int kCount = kTableLast + static_cast<int>(kRowSlack);
+    static constexpr int kCount = kTableLast + static_cast<int>(kRampSlack);
     float of[kCount];
 
     TablePositions() {
@@ -28,7 +28,7 @@ struct TablePositions {
 /// Deliberate: an entry moves on by one segment at most, even when it has passed several stops, so stops
 /// closer together than a table entry take effect one entry late. When no stop is left the last segment
 /// stays.
-void fillBetweenStops(const VFGradient* stops, int count, float start, const TablePositions& positions,
-                      uint32_t* table);
+void fillBetweenStops(const RampLoops& loops, const VFGradient* stops, int count, float start,
+                      const TablePositions& positions, uint32_t* table);
 
 }  // namespace VFontEffect::internal

@@ -11,69 +11,49 @@ namespace {
 
 using namespace VFontEffect::internal;
 
-/// Collects the rows that `run(blur, paint)` paints.
-template <class Blur, class Run>
-std::vector<uint8_t> collected(const BlurCase& which, Blur blur, Run run) {
-    std::vector<uint8_t> values(static_cast<size_t>(which.window.width() * which.window.height()));
+template <class Blur>
+std::vector<uint8_t> collected(Blur& blur, const Box& window, int64_t bandRows) {
     if (!blur) return {};
-    int64_t next = which.window.top;
-    run(blur, [&](int64_t y, int64_t rows, const uint8_t* from, int64_t stride) {
-        if (y != next) return;
-        for (; next < y + rows; ++next) {
-            const auto to = values.begin() + (next - which.window.top) * which.window.width();
-            std::copy_n(from + (next - y) * stride, which.window.width(), to);
+    std::vector<uint8_t> values;
+    for (int64_t y = window.top; y < window.bottom; y += bandRows) {
+        const BlurredRows band = blur.rows(y);
+        for (int64_t row = 0; row < std::min(bandRows, window.bottom - y); ++row) {
+            const uint8_t* const from = band.values + row * band.stride;
+            values.insert(values.end(), from, from + window.width());
         }
-    });
-    return next == which.window.bottom ? values : std::vector<uint8_t>{};
-}
-
-template <class Blur>
-std::vector<uint8_t> blurredBy(const BlurCase& which) {
-    return collected(which, Blur(which.kernel, which.source, which.window, which.full),
-                     [&](Blur& blur, auto paint) { blur.run(which.inverted, paint); });
-}
-
-template <class Blur>
-std::vector<uint8_t> inverseBlurredBy(const BlurCase& which) {
-    return collected(which, Blur(which.kernel, which.source, which.window),
-                     [](Blur& blur, auto paint) { blur.run(paint); });
+    }
+    return values;
 }
 
 void append(const TermList& list, int sign, std::vector<Term>& terms) {
-    const int64_t lineBytes = kDifferencePixelBytes * dotLoops().vectorBytes;
+    const int64_t lineBytes = kLinePixelBytes * differenceLoops(chosenLevel()).vectorBytes;
     const int64_t rowBytes = kLinesOfRow * lineBytes;
     for (int64_t i = 0; i < list.count; ++i) {
         const int64_t offset = list.offsets[i];
         const int64_t row = (offset < 0 ? offset - rowBytes + 1 : offset) / rowBytes;
         const int64_t line = offset - row * rowBytes;
-        if (line != 0 && line != lineBytes) sign = 0;  // neither taps nor pairs: no term of any kernel
+        if (line != 0 && line != lineBytes) sign = 0;  // neither taps nor pairs: no term of any weights
         terms.push_back({row, line != 0, sign});
     }
 }
 
 }  // namespace
 
-std::vector<uint8_t> blurredByDots(const BlurCase& blur) {
-    return blurredBy<DownThenAcross>(blur);
+std::vector<uint8_t> blurredByDots(const BlurInput& input) {
+    DotBlur blur(dotLoops(chosenLevel()), input);
+    return collected(blur, input.window, kQuad);
 }
 
-std::vector<uint8_t> blurredByRunningSums(const BlurCase& blur) {
-    return blurredBy<DifferenceDownThenAcross>(blur);
+std::vector<uint8_t> blurredByDifferences(const BlurInput& input) {
+    DifferenceBlur blur(differenceLoops(chosenLevel()), input);
+    return collected(blur, input.window, blur.bandRows());
 }
 
-std::vector<uint8_t> inverseBlurredByDots(const BlurCase& blur) {
-    return inverseBlurredBy<AcrossThenDown>(blur);
-}
-
-std::vector<uint8_t> inverseBlurredByRunningSums(const BlurCase& blur) {
-    return inverseBlurredBy<DifferenceAcrossThenDown>(blur);
-}
-
-TermsOfKernel termsOf(const BlurWeights& kernel) {
-    const KernelTerms memory(kernel);
+TermsOfWeights termsOf(const BlurWeights& weights) {
+    const WeightTerms memory(differenceLoops(chosenLevel()), weights);
     if (!memory) return {};
     const DifferenceTerms& terms = *memory;
-    TermsOfKernel result = {terms.order, terms.pairs.distance, terms.pairs.areDifferences, {}};
+    TermsOfWeights result = {terms.pairs.distance, terms.pairs.areDifferences, {}};
     append(terms.added, 1, result.terms);
     append(terms.takenAway, -1, result.terms);
     return result;

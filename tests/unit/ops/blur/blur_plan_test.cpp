@@ -32,11 +32,11 @@ using VFontEffect::VFOuterShadow;
 using VFontEffect::VFOuterShadowProperty;
 using VFontEffect::VFRect;
 using VFontEffect::internal::BlurWeights;
-using VFontEffect::internal::glowWeights;
+using VFontEffect::internal::gaussianOf100;
+using VFontEffect::internal::gaussianOf128;
 using VFontEffect::internal::inverseAbove;
 using VFontEffect::internal::NarrowDivision;
 using VFontEffect::internal::narrowDivision;
-using VFontEffect::internal::shadowWeights;
 
 constexpr int kLargestRadius = 256;
 
@@ -59,15 +59,27 @@ void expectWholeQuotients(uint32_t total, int radius) {
 
 TEST(BlurDivision, OfEveryRadius_IsExactAroundEveryMultipleOfTheTotal) {
     for (int radius = 0; radius <= kLargestRadius; ++radius) {
-        expectWholeQuotients(shadowWeights(radius).total, radius);
+        expectWholeQuotients(gaussianOf100(radius).total, radius);
         // The largest glow has a radius of 231: 0.9 times 257.
-        if (radius <= 231) expectWholeQuotients(glowWeights(radius).total, radius);
+        if (radius <= 231) expectWholeQuotients(gaussianOf128(radius).total, radius);
     }
+}
+
+/// The bound of a total by its radius, and the one under which the reciprocal divides exactly.
+TEST(BlurDivision, TotalsOfEveryRadius_StayBelowTheirBound) {
+    using VFontEffect::internal::kLargestTotal;
+    using VFontEffect::internal::totalBound;
+    for (int radius = 0; radius <= kLargestRadius; ++radius) {
+        EXPECT_LE(gaussianOf100(radius).total, totalBound(100, static_cast<uint32_t>(radius)));
+        EXPECT_LE(gaussianOf128(radius).total, totalBound(128, static_cast<uint32_t>(radius)));
+    }
+    for (uint32_t total = kLargestTotal - 2000; total <= kLargestTotal; ++total)
+        expectWholeQuotients(total, static_cast<int>(total));
 }
 
 TEST(BlurDivision, OfSomeRadii_IsExactForEverySum) {
     for (const int radius : {4, 17, 100, 231}) {
-        const uint32_t total = glowWeights(radius).total;
+        const uint32_t total = gaussianOf128(radius).total;
         const float inverse = inverseAbove(total);
         for (uint32_t sum = 0; sum < 256 * total; ++sum)
             ASSERT_EQ(sum / total, quotient(sum, inverse)) << sum << ", radius " << radius;
@@ -86,23 +98,22 @@ TEST(BlurDivision, In16Bits_IsExactForEveryDivisorAndSum) {
     }
 }
 
-// --- Blurs by their definition, in the part that a picture of the mask's size shows
-// ---------------------
+// --- Blurs by their definition, in the part that a picture of the mask's size shows -----------------
 
-int64_t weightOf(const std::vector<uint32_t>& kernel, int64_t distance) {
+int64_t weightOf(const std::vector<uint32_t>& weights, int64_t distance) {
     const auto k = static_cast<size_t>(distance < 0 ? -distance : distance);
-    return k < kernel.size() ? kernel[k] : 0;
+    return k < weights.size() ? weights[k] : 0;
 }
 
 /// A blur of a box of the mask; what lies outside of it is 0. Taps there add nothing and are left out,
 /// so that large radii can be tried by the hundred.
 class DefinedBlur {
   public:
-    DefinedBlur(const Mask& mask, Box box, std::vector<uint32_t> kernel)
-        : mMask(mask), mBox(box), mKernel(std::move(kernel)) {
-        mTotal = mKernel[0];
-        for (size_t i = 1; i < mKernel.size(); ++i)
-            mTotal += 2 * mKernel[i];
+    DefinedBlur(const Mask& mask, Box box, std::vector<uint32_t> weights)
+        : mMask(mask), mBox(box), mWeights(std::move(weights)) {
+        mTotal = mWeights[0];
+        for (size_t i = 1; i < mWeights.size(); ++i)
+            mTotal += 2 * mWeights[i];
     }
 
     /// The columns, then the rows; as the outer shadow.
@@ -113,13 +124,13 @@ class DefinedBlur {
             for (int x = mBox.left; x < mBox.right; ++x) {
                 int64_t sum = 0;
                 for (int tap = mBox.top; tap < mBox.bottom; ++tap)
-                    sum += coverage(x, tap) * weightOf(mKernel, tap - y);
+                    sum += coverage(x, tap) * weightOf(mWeights, tap - y);
                 row.push_back(sum / mTotal);
             }
             for (int x = 0; x < mMask.width; ++x) {
                 int64_t sum = 0;
                 for (int tap = mBox.left; tap < mBox.right; ++tap)
-                    sum += row[static_cast<size_t>(tap - mBox.left)] * weightOf(mKernel, tap - x);
+                    sum += row[static_cast<size_t>(tap - mBox.left)] * weightOf(mWeights, tap - x);
                 blurred.push_back(static_cast<int>(sum / mTotal));
             }
         }
@@ -134,14 +145,14 @@ class DefinedBlur {
             for (int y = mBox.top; y < mBox.bottom; ++y) {
                 int64_t sum = 0;
                 for (int tap = mBox.left; tap < mBox.right; ++tap)
-                    sum += coverage(tap, y) * weightOf(mKernel, tap - x);
+                    sum += coverage(tap, y) * weightOf(mWeights, tap - x);
                 column.push_back((255 * mTotal - sum) / mTotal);
             }
             for (int y = mBox.top; y < mBox.bottom; ++y) {
                 int64_t sum = 255 * mTotal;
                 for (int tap = mBox.top; tap < mBox.bottom; ++tap) {
                     const int64_t missing = 255 - column[static_cast<size_t>(tap - mBox.top)];
-                    sum -= missing * weightOf(mKernel, tap - y);
+                    sum -= missing * weightOf(mWeights, tap - y);
                 }
                 blurred[static_cast<size_t>(y * mMask.width + x)] = static_cast<int>(sum / mTotal);
             }
@@ -156,7 +167,7 @@ class DefinedBlur {
 
     const Mask& mMask;
     Box mBox;
-    std::vector<uint32_t> mKernel;
+    std::vector<uint32_t> mWeights;
     int64_t mTotal;
 };
 
@@ -197,12 +208,12 @@ Scene extremeScene(Random& random, int width, int height) {
 
 TEST(Blur, OfEveryRadiusAndWidth_IsTheDefinedOne) {
     for (int radius = 0; radius <= kLargestRadius; ++radius) {
-        const std::vector<uint32_t> kernel = literal::shadowWeights(radius);
+        const std::vector<uint32_t> weights = literal::shadowWeights(radius);
         // Widths 1 to 130, each with some of the radii.
         forSeeds(static_cast<uint64_t>(radius) * 10, 4, [&](Random& random) {
             const int width = 1 + (radius * 7 + random.between(0, 3) * 33) % 130;
             const Scene scene = extremeScene(random, width, random.between(1, 40));
-            const DefinedBlur blur(scene.mask, scene.text, kernel);
+            const DefinedBlur blur(scene.mask, scene.text, weights);
             ASSERT_EQ(blur.downThenAcross(),
                       (shadowAlpha<VFOuterShadow, VFOuterShadowProperty>(scene, radius)))
                 << describe(scene) << ", radius " << radius;
@@ -365,7 +376,8 @@ TEST(Blur, NeverReadsOrWritesBeyondMaskAndDestination) {
         Random random(static_cast<uint64_t>(width) + 77);
         Mask mask = noiseMask(random, width, random.between(1, 9), 20);
         const Scene scene = sceneOf(mask);
-        // Up to 12 by dot products at every level, above 90 by running sums.
+        // Up to 12 by dot products at every level, above 90 by differences where there are no dot
+        // products of four.
         const auto size =
             static_cast<float>(random.chance(70) ? random.between(0, 12) : random.between(91, 110));
         for (const Edge edge : {Edge::kStart, Edge::kEnd}) {

@@ -13,19 +13,20 @@
 #include "tests/support/core_compare.h"
 #include "tests/support/mask_gallery.h"
 
-/// The blur by running sums against the one by dot products, whichever of the two a level chooses, and
-/// the terms that it adds up against the kernel's differences.
+/// The blur by differences of the weights against the one by dot products, whichever of the two a level
+/// chooses, and the terms that it adds up against those differences.
 namespace {
 
 using namespace vorel_test;
 using literal::Mask;
-using VFontEffect::internal::BlurSource;
+using VFontEffect::internal::BlurInput;
 using VFontEffect::internal::BlurWeights;
 using VFontEffect::internal::Box;
+using VFontEffect::internal::CoverageRows;
 using VFontEffect::internal::FullColumns;
-using VFontEffect::internal::glowWeights;
+using VFontEffect::internal::gaussianOf100;
+using VFontEffect::internal::gaussianOf128;
 using VFontEffect::internal::kNoFullColumns;
-using VFontEffect::internal::shadowWeights;
 
 // The largest glow has a radius of 231.
 constexpr int kLargestShadow = 256;
@@ -33,54 +34,53 @@ constexpr int kLargestGlow = 231;
 
 // --- Terms ------------------------------------------------------------------------------------------
 
-/// What the taps from distance -radius - order on weigh in a difference of the order: the binomials of
-/// 1 - z, times the weights.
-std::vector<int64_t> definedDifference(const BlurWeights& kernel, int order) {
-    const std::vector<int64_t> binomials =
-        order == 2 ? std::vector<int64_t>{1, -2, 1} : std::vector<int64_t>{1, -3, 3, -1};
+/// What the taps from distance -radius - 2 on weigh in the second difference: (1 - z)^2 times the
+/// weights.
+std::vector<int64_t> secondDifference(const BlurWeights& weights) {
+    const int64_t binomials[] = {1, -2, 1};
     std::vector<int64_t> difference;
-    for (int k = -kernel.radius - order; k <= kernel.radius; ++k) {
+    for (int k = -weights.radius - 2; k <= weights.radius; ++k) {
         int64_t sum = 0;
-        for (size_t i = 0; i < binomials.size(); ++i) {
-            const int distance = std::abs(k + static_cast<int>(i));
-            if (distance <= kernel.radius) sum += binomials[i] * kernel.weights.data()[distance];
+        for (int i = 0; i < 3; ++i) {
+            const int distance = std::abs(k + i);
+            if (distance <= weights.radius) sum += binomials[i] * weights.byDistance.data()[distance];
         }
         difference.push_back(sum);
     }
     return difference;
 }
 
-void expectTermsOf(const BlurWeights& kernel) {
-    SCOPED_TRACE(kernel.radius);
-    const TermsOfKernel split = termsOf(kernel);
-    ASSERT_TRUE(split.order == 2 || split.order == 3);
-    std::vector<int64_t> sum(static_cast<size_t>(2 * kernel.radius + 1 + split.order), 0);
+void expectTermsOf(const BlurWeights& weights) {
+    SCOPED_TRACE(weights.radius);
+    const TermsOfWeights split = termsOf(weights);
+    ASSERT_NE(split.pairDistance, 0);
+    std::vector<int64_t> sum(static_cast<size_t>(2 * weights.radius + 3), 0);
     for (const Term& term : split.terms) {
-        const auto cell = static_cast<size_t>(term.row + kernel.radius + split.order);
+        const auto cell = static_cast<size_t>(term.row + weights.radius + 2);
         sum.at(cell) += term.sign;
         if (!term.isPair) continue;
         sum.at(cell + static_cast<size_t>(split.pairDistance)) +=
             split.pairsAreDifferences ? -term.sign : term.sign;
     }
-    EXPECT_EQ(sum, definedDifference(kernel, split.order));
+    EXPECT_EQ(sum, secondDifference(weights));
     for (size_t i = 1; i < split.terms.size(); ++i) {
         if (split.terms[i].sign != split.terms[i - 1].sign) continue;
         EXPECT_LE(split.terms[i - 1].row, split.terms[i].row);
     }
 }
 
-TEST(RunningBlur, TermsOfEveryKernel_AscendAndAddUpToItsDifference) {
+TEST(DifferenceBlur, TermsOfEveryRadius_AscendAndAddUpToTheSecondDifference) {
     for (int radius = 0; radius <= kLargestShadow; ++radius)
-        expectTermsOf(shadowWeights(radius));
+        expectTermsOf(gaussianOf100(radius));
     for (int radius = 0; radius <= kLargestGlow; ++radius)
-        expectTermsOf(glowWeights(radius));
+        expectTermsOf(gaussianOf128(radius));
 }
 
-TEST(RunningBlur, TermsOfWideKernels_AreFarFewerThanTheTaps) {
-    for (int radius = 13; radius <= 100; ++radius) {
+TEST(DifferenceBlur, TermsOfWideBlurs_AreFarFewerThanTheTaps) {
+    for (int radius = 16; radius <= 100; ++radius) {
         const size_t most = radius <= 40 ? 40 : 66;
-        EXPECT_LE(termsOf(shadowWeights(radius)).terms.size(), most) << radius;
-        EXPECT_LE(termsOf(glowWeights(radius)).terms.size(), most) << radius;
+        EXPECT_LE(termsOf(gaussianOf100(radius)).terms.size(), most) << radius;
+        EXPECT_LE(termsOf(gaussianOf128(radius)).terms.size(), most) << radius;
     }
 }
 
@@ -104,24 +104,34 @@ Mask maskWithEmptyEdges(Random& random, int width, int height) {
     return mask;
 }
 
+/// A blur in either order; `full` and `inverted` are for the first.
+struct BlurCase {
+    const BlurWeights& weights;
+    CoverageRows source;
+    Box window;
+    FullColumns full;
+    bool inverted;
+};
+
 /// What a case says when it fails.
 std::string describe(const BlurCase& blur) {
     std::ostringstream text;
-    text << blur.source.width << " x " << blur.source.height << ", radius " << blur.kernel.radius
+    text << blur.source.width << " x " << blur.source.height << ", radius " << blur.weights.radius
          << ", window " << blur.window.left << " " << blur.window.top << " " << blur.window.right << " "
          << blur.window.bottom << ", full before " << blur.full.before << " and from " << blur.full.from
-         << ", centre " << blur.kernel.weights.data()[0] << ", flip " << int{blur.source.invertMask}
+         << ", centre " << blur.weights.byDistance.data()[0] << ", mask " << int{blur.source.invertMask}
          << ", inverted " << blur.inverted;
     return text.str();
 }
 
-void expectBothMethodsTheSame(const BlurCase& blur) {
-    const std::vector<uint8_t> expected = blurredByDots(blur);
-    ASSERT_FALSE(expected.empty());
-    ASSERT_EQ(blurredByRunningSums(blur), expected) << describe(blur);
-    const std::vector<uint8_t> inverse = inverseBlurredByDots(blur);
-    ASSERT_FALSE(inverse.empty());
-    ASSERT_EQ(inverseBlurredByRunningSums(blur), inverse) << describe(blur);
+void expectBothTheSame(const BlurCase& blur) {
+    const auto expectSame = [&blur](const BlurInput& input) {
+        const std::vector<uint8_t> expected = blurredByDots(input);
+        ASSERT_FALSE(expected.empty());
+        ASSERT_EQ(blurredByDifferences(input), expected) << describe(blur);
+    };
+    expectSame(BlurInput::down(blur.weights, blur.source, blur.window, blur.full, blur.inverted));
+    expectSame(BlurInput::inverseAcross(blur.weights, blur.source, blur.window));
 }
 
 /// Near one of two columns, or anywhere between them.
@@ -130,9 +140,9 @@ int64_t nearEither(Random& random, int64_t a, int64_t b) {
     return (random.chance(50) ? a : b) + random.between(-2, 2);
 }
 
-void expectBothMethodsTheSame(Random& random, int radius) {
+void expectBothTheSame(Random& random, int radius) {
     const bool glow = radius <= kLargestGlow && random.chance(50);
-    const BlurWeights kernel = glow ? glowWeights(radius) : shadowWeights(radius);
+    const BlurWeights weights = glow ? gaussianOf128(radius) : gaussianOf100(radius);
     const int stride = random.between(1, 150);
     const int width = random.chance(50) ? stride : random.between(1, stride);
     const int height = random.between(1, 90);
@@ -144,35 +154,35 @@ void expectBothMethodsTheSame(Random& random, int radius) {
     FullColumns full = kNoFullColumns;
     if (random.chance(30)) full.before = nearEither(random, left - radius, width);
     if (random.chance(30)) full.from = nearEither(random, 0, right + radius);
-    const auto flip = static_cast<uint8_t>(random.chance(50) ? 0 : 0xFF);
-    expectBothMethodsTheSame({kernel,
-                              {mask.bytes.data(), stride, width, height, flip},
-                              {left, top, right, bottom},
-                              full,
-                              random.chance(50)});
+    const auto invertMask = static_cast<uint8_t>(random.chance(50) ? 0 : 0xFF);
+    expectBothTheSame({weights,
+                       {mask.bytes.data(), stride, width, height, invertMask},
+                       {left, top, right, bottom},
+                       full,
+                       random.chance(50)});
 }
 
-TEST(RunningBlur, OfEveryRadius_IsTheOneByDotProducts) {
+TEST(DifferenceBlur, OfEveryRadius_IsTheOneByDotProducts) {
     for (int radius = 0; radius <= kLargestShadow; ++radius) {
         forSeeds(static_cast<uint64_t>(radius) * 100, radius <= 100 ? 10 : 4,
-                 [&](Random& random) { expectBothMethodsTheSame(random, radius); });
+                 [&](Random& random) { expectBothTheSame(random, radius); });
         if (HasFatalFailure()) return;
     }
 }
 
-TEST(RunningBlur, OfSidesLongerThanTheKernel_ReachesTheLargestDifferences) {
+TEST(DifferenceBlur, OfSidesLongerThanTheBlur_ReachesTheLargestDifferences) {
     for (const int radius : {13, 100, 150, 256}) {
-        const BlurWeights kernel = shadowWeights(radius);
-        const BlurWeights glow = glowWeights(std::min(radius, kLargestGlow));
+        const BlurWeights shadow = gaussianOf100(radius);
+        const BlurWeights glow = gaussianOf128(std::min(radius, kLargestGlow));
         const int length = 2 * radius + 60;
         for (const bool wide : {true, false}) {
             const int width = wide ? length : 5;
             const int height = wide ? 5 : length;
             const Mask mask = filledMask(width, height, 255);
             const Box window = {-radius, -radius, width + radius, height + radius};
-            const BlurSource source = {mask.bytes.data(), width, width, height, 0};
-            expectBothMethodsTheSame({kernel, source, window, kNoFullColumns, false});
-            expectBothMethodsTheSame({glow, source, window, kNoFullColumns, true});
+            const CoverageRows source = {mask.bytes.data(), width, width, height, 0};
+            expectBothTheSame({shadow, source, window, kNoFullColumns, false});
+            expectBothTheSame({glow, source, window, kNoFullColumns, true});
             if (HasFatalFailure()) return;
         }
     }

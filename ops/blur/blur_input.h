@@ -1,0 +1,58 @@
+#pragma once
+
+#include <cstdint>
+
+#include "core/box.h"
+#include "core/coverage_rows.h"
+#include "ops/blur/blur_weights.h"
+
+namespace VFontEffect::internal {
+
+/// Columns before the one and from the other on count as 255 between the passes.
+struct FullColumns {
+    int64_t before;
+    int64_t from;
+};
+/// Farther away than any column is, but not so far that places could not be taken from it.
+constexpr FullColumns kNoFullColumns = {INT64_MIN / 2, INT64_MAX / 2};
+
+/// What is blurred, and how. Each of the two passes drops the rest of its division, so their order is
+/// part of the result.
+struct BlurInput {
+    enum class Order { downThenAcross, acrossThenDown };
+
+    const BlurWeights& weights;  // for the plan's making only
+    CoverageRows source;
+    Box window;  // what is wanted of the results, in the source's coordinates; not empty
+    Order order;
+    FullColumns full;
+    PassEnding first;
+    PassEnding second;
+
+    /// Down the columns of the source, then across its rows, each pass rounding down. Around the source
+    /// is 0, but for the full columns. `inverted` gives 255 minus the mean of the second pass, rounded
+    /// down as a whole: the mean rounded up, inverted.
+    static BlurInput down(const BlurWeights& weights, const CoverageRows& source, const Box& window,
+                          const FullColumns& full, bool inverted) {
+        const PassEnding second = {inverted, inverted ? kInverse : kAsIs};
+        return {weights, source, window, Order::downThenAcross, full, {false, kAsIs}, second};
+    }
+
+    /// Across the rows of the source's inverse, then down its columns, each pass rounding down. Around
+    /// the source is 255 in its inverse. 255 minus a mean that is rounded down is the mean of the
+    /// inverse rounded up: both passes work on what is missing from 255, which is 0 around the source,
+    /// and round up, and the second gives 255 minus its result.
+    static BlurInput inverseAcross(const BlurWeights& weights, const CoverageRows& source,
+                                   const Box& window) {
+        return {weights,        source,        window,          Order::acrossThenDown,
+                kNoFullColumns, {true, kAsIs}, {true, kInverse}};
+    }
+};
+
+/// Rows of results, `stride` bytes apart.
+struct BlurredRows {
+    uint8_t* values;
+    int64_t stride;
+};
+
+}  // namespace VFontEffect::internal

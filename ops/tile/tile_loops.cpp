@@ -1,0 +1,66 @@
+#include "ops/tile/tile_loops.h"
+
+#include <cstdint>
+
+#include "core/fixed_point.h"
+#include "simd/lanes.h"
+
+/// Bilinear samples of a pattern, in two steps: along its columns, then between its rows.
+namespace VFontEffect::internal::VOREL_LEVEL {
+namespace {
+
+/// Two bytes of each word times the weight in both of its halves: 255 * 255 fits in 16 bits.
+VOREL_INLINE U16s weighted(U32s bytes, U32s weight) {
+    return bitCast<U16s>(bytes) * bitCast<U16s>(weight);
+}
+
+// Deliberate: pattern pixels stand in memory as A, R, G, B, unlike the destination's.
+void mixColumns(const uint32_t* patternRow, const ColumnTaps& taps, int64_t count, const MixedRow& out) {
+    const auto pixelsAt = [patternRow](const int32_t* columns) {
+        const U32s argb = gather(patternRow, load<I32s>(columns));
+        return argb >> 8 | argb << 24;
+    };
+    for (int64_t x = 0; x < count; x += kU32Lanes) {
+        const U32s near = pixelsAt(taps.near + x);
+        const U32s far = pixelsAt(taps.far + x);
+        const auto nearWeight = load<U32s>(taps.nearWeights + x);
+        const auto farWeight = load<U32s>(taps.farWeights + x);
+        store(out.redBlue + x,
+              weighted(near & kEvenBytes, nearWeight) + weighted(far & kEvenBytes, farWeight));
+        store(out.greenAlpha + x,
+              weighted(near >> 8 & kEvenBytes, nearWeight) + weighted(far >> 8 & kEvenBytes, farWeight));
+    }
+}
+
+/// (near * nearWeight + far * farWeight) >> 16: the upper halves of both products, and the carry of the
+/// lower ones.
+VOREL_INLINE U16s mixed(const uint32_t* near, const uint32_t* far, U16s nearWeight, U16s farWeight) {
+    const auto n = load<U16s>(near);
+    const auto f = load<U16s>(far);
+    const U16s low = n * nearWeight;
+    const U16s carry = bitCast<U16s>(low + f * farWeight < low);
+    return multiplyHigh(n, nearWeight) + multiplyHigh(f, farWeight) - carry;
+}
+
+// Deliberate: weights of 255 and a shift by 16 sample an opaque pattern as 253.
+void mixRows(const MixedRow& near, const MixedRow& far, uint32_t nearWeight, uint32_t farWeight,
+             float opacity, int64_t count, uint32_t* out) {
+    const auto n = splat<U16s>(static_cast<uint16_t>(nearWeight));
+    const auto f = splat<U16s>(static_cast<uint16_t>(farWeight));
+    for (int64_t x = 0; x < count; x += kU32Lanes) {
+        const U16s redBlue = mixed(near.redBlue + x, far.redBlue + x, n, f);
+        const U16s greenAlpha = mixed(near.greenAlpha + x, far.greenAlpha + x, n, f);
+        const auto straightAlpha = bitCast<I32s>(bitCast<U32s>(greenAlpha) >> 16);
+        const I32s seenAlpha = toInt(__builtin_convertvector(straightAlpha, F32s) * opacity);
+        const auto alpha = bitCast<U32s>(clamped(seenAlpha, 0, 255));
+        const auto factor = bitCast<U16s>(alpha | alpha << 16);
+        const auto green = bitCast<U32s>(product(greenAlpha, factor)) & 0xFFFFU;
+        store(out + x, bitCast<U32s>(product(redBlue, factor)) | green << 8 | alpha << 24);
+    }
+}
+
+}  // namespace
+
+extern const TileLoops kTileLoops = {mixColumns, mixRows};
+
+}  // namespace VFontEffect::internal::VOREL_LEVEL
