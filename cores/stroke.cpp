@@ -10,6 +10,7 @@
 #include "cores/paint_input.h"
 #include "cores/placed_target.h"
 #include "cores/property_copy.h"
+#include "cores/stroke_shape.h"
 #include "ops/dilate/dilation_loops.h"
 #include "ops/dilate/disc_shape.h"
 #include "voreleffect/VFBlender.h"
@@ -80,9 +81,9 @@ class GrownCoverage {
 /// within the disc's radius of the edge on both sides of it.
 class Outline {
   public:
-    Outline(const CoverageBox& box, const DiscShape& disc, const Box& part, int position)
-        : mGrown(box, disc, part, position == kStrokeInside ? kInverse : kCoverage) {
-        if (position == kStrokeCentre) mInverse.emplace(box, disc, part, kInverse);
+    Outline(const CoverageBox& box, const DiscShape& disc, const Box& part, const StrokeShape& shape)
+        : mGrown(box, disc, part, shape.growsGlyph ? kCoverage : kInverse) {
+        if (shape.side == StrokeSide::centre) mInverse.emplace(box, disc, part, kInverse);
     }
 
     explicit operator bool() const { return mGrown && (!mInverse || *mInverse); }
@@ -121,26 +122,24 @@ VFProperty* VFStroke::getProperty() {
 }
 
 int VFStroke::getOffset() {
-    if (mProperty == nullptr) return 0;
-    if (mProperty->mPosition == kStrokeOutside) return toInt(mProperty->mSize + 0.5F);
-    return mProperty->mPosition == kStrokeCentre ? toInt(mProperty->mSize * 0.5F + 0.5F) : 0;
+    return mProperty != nullptr ? StrokeShape(*mProperty).reach : 0;
 }
 
 void VFStroke::doPostProcessing(ParamPostProcessing* params) {
     const CoverageBox box = coverageOf(params);
     if (!box || mProperty == nullptr || exceedsSizeLimit(mProperty->mSize)) return;
-    const bool centred = mProperty->mPosition == kStrokeCentre;
-    const bool outside = mProperty->mPosition == kStrokeOutside;
-    const DiscShape disc(centred ? mProperty->mSize * 0.5F : mProperty->mSize);
+    const StrokeShape shape(*mProperty);
+    const DiscShape disc(shape.radiusPx);
     if (!disc) return;
     const Box visible = visiblePart(box, disc.reach, *params);
     if (visible.empty()) return;
-    Outline outline(box, disc, visible, centred || outside ? mProperty->mPosition : kStrokeInside);
+    Outline outline(box, disc, visible, shape);
     if (!outline) return;
 
     const int left = saturateToInt(box.left - kBorder + outline.left());
     const int width = saturateToInt(outline.width());
     const int stride = saturateToInt(outline.stride());
+    const bool centred = shape.side == StrokeSide::centre;
     const int mode = centred && params->useOuterLayer != 1 ? kModeSrcOver : kModeDstOver;
     for (int64_t y = visible.top; y < visible.bottom; y += outline.bandRows()) {
         const int64_t count = std::min(outline.bandRows(), visible.bottom - y);

@@ -24,7 +24,7 @@ VFBitmap* makeLayer(int width, int height, unsigned int bytesPerPixel) {
 /// An effect that needs the outer layer whatever the text opacity.
 bool needsOuterLayer(VFECore* core) {
     const int type = core->getStyle();
-    return type == kEmboss || (isStroke(type) && strokePosition(*core) == kStrokeCentre);
+    return type == kEmboss || (isStroke(type) && strokeSide(*core) == StrokeSide::centre);
 }
 
 /// Puts the cores in paint order: over the text, the text fill, beneath the text. In layered mode only
@@ -78,8 +78,8 @@ bool VFEffect::isUnderEffect(VFECore* core) {
     if (core == nullptr) return false;
     const int type = core->getStyle();
     if (isStroke(type)) {
-        const int position = strokePosition(*core);
-        return position == kStrokeOutside || (position == kStrokeCentre && mUseOuterLayer != 1);
+        const StrokeSide side = strokeSide(*core);
+        return side == StrokeSide::outside || (side == StrokeSide::centre && mUseOuterLayer != 1);
     }
     switch (type) {
         case kNoEffect:
