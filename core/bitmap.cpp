@@ -21,12 +21,12 @@ unsigned int byteCount(const VFBitmap& bitmap) {
     return byteCount(bitmap.mWidth, bitmap.mHeight, bitmap.mBytesPerPixel);
 }
 
-unsigned char* allocateZeroed(size_t bytes) {
+[[nodiscard]] unsigned char* allocateZeroed(size_t bytes) {
     return static_cast<unsigned char*>(std::calloc(bytes, 1));
 }
 
 /// A copy of `bytes` bytes from `source`; null for no source or no memory.
-unsigned char* duplicate(const unsigned char* source, size_t bytes) {
+[[nodiscard]] unsigned char* duplicate(const unsigned char* source, size_t bytes) {
     if (source == nullptr) return nullptr;
     auto* copy = static_cast<unsigned char*>(std::malloc(bytes));
     if (copy != nullptr && bytes != 0) std::memcpy(copy, source, bytes);

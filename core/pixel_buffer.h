@@ -9,7 +9,7 @@ namespace VFontEffect::internal {
 
 /// Working memory of one call: a move-only array over malloc, empty when memory ran out.
 template <class T>
-class PixelBuffer {
+class [[nodiscard]] PixelBuffer {
   public:
     static PixelBuffer zeroed(int64_t width, int64_t height = 1) { return make(width, height, true); }
     static PixelBuffer uninitialised(int64_t width, int64_t height = 1) {

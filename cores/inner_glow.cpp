@@ -17,7 +17,7 @@ VFInnerGlow::~VFInnerGlow() {
 }
 
 void VFInnerGlow::setProperty(VFProperty* property) {
-    replaceCopy(mProperty, property);
+    (void)replaceCopy(mProperty, property);
 }
 
 VFProperty* VFInnerGlow::getProperty() {

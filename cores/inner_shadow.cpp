@@ -39,7 +39,7 @@ VFInnerShadow::~VFInnerShadow() {
 }
 
 void VFInnerShadow::setProperty(VFProperty* property) {
-    replaceCopy(mProperty, property);
+    (void)replaceCopy(mProperty, property);
 }
 
 VFProperty* VFInnerShadow::getProperty() {

@@ -36,7 +36,7 @@ VFLinearGradient::~VFLinearGradient() {
 }
 
 void VFLinearGradient::setProperty(VFProperty* property) {
-    replaceCopy(mProperty, property);
+    (void)replaceCopy(mProperty, property);
 }
 
 VFProperty* VFLinearGradient::getProperty() {

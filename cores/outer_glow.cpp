@@ -17,7 +17,7 @@ VFOuterGlow::~VFOuterGlow() {
 }
 
 void VFOuterGlow::setProperty(VFProperty* property) {
-    replaceCopy(mProperty, property);
+    (void)replaceCopy(mProperty, property);
 }
 
 VFProperty* VFOuterGlow::getProperty() {

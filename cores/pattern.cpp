@@ -187,7 +187,7 @@ VFPattern::~VFPattern() {
 }
 
 void VFPattern::setProperty(VFProperty* property) {
-    replaceCopy(mProperty, property);
+    (void)replaceCopy(mProperty, property);
 }
 
 VFProperty* VFPattern::getProperty() {

@@ -16,14 +16,14 @@ struct Fields {
     /// The same class of record built anew from another's fields, so that the constructor's clamps and
     /// reductions run again. Arrays and bitmaps are still shared. Null when memory ran out.
     template <class Record>
-    static Record* rebuilt(const Record& p) {
+    [[nodiscard]] static Record* rebuilt(const Record& p) {
         return new (std::nothrow) Record(p.*Field...);
     }
 
     /// Puts copies in the place of the shared array or bitmap; false when memory ran out. Even then the
     /// record holds nothing shared afterwards.
     template <class Record>
-    static bool ownContents(Record& copy) {
+    [[nodiscard]] static bool ownContents(Record& copy) {
         return (own(copy, copy.*Field) && ...);
     }
 
@@ -34,11 +34,11 @@ struct Fields {
 
   private:
     template <class Record, class Number>
-    static bool own(const Record& /*copy*/, Number& /*number*/) {
+    [[nodiscard]] static bool own(const Record& /*copy*/, Number& /*number*/) {
         return true;
     }
     template <class Record>
-    static bool own(const Record& copy, VFGradient*& stops) {
+    [[nodiscard]] static bool own(const Record& copy, VFGradient*& stops) {
         if (stops == nullptr) return true;
         const VFGradient* const shared = stops;
         const auto count = static_cast<std::size_t>(std::max(copy.mGradientCount, 0));
@@ -47,7 +47,7 @@ struct Fields {
         return stops != nullptr;
     }
     template <class Record>
-    static bool own(const Record& /*copy*/, VFBitmap*& bitmap) {
+    [[nodiscard]] static bool own(const Record& /*copy*/, VFBitmap*& bitmap) {
         if (bitmap == nullptr) return true;
         const VFBitmap* const shared = bitmap;
         bitmap = new (std::nothrow) VFBitmap(*shared);
@@ -100,10 +100,10 @@ void releaseCopy(Record* owned) {
 }
 
 /// A core's setProperty: puts a deep copy of `given`, which must be of class Record, in the place of
-/// `stored`. Returns whether it did: not for null, nor when memory ran out. `given` may be the stored
-/// record itself.
+/// `stored`. Returns whether it did: not for null, nor when memory ran out; only a core that derives
+/// numbers from its record needs to know. `given` may be the stored record itself.
 template <class Record>
-bool replaceCopy(Record*& stored, const VFProperty* given) {
+[[nodiscard]] bool replaceCopy(Record*& stored, const VFProperty* given) {
     if (given == nullptr) return false;
     Record* copy = FieldsOf<Record>::rebuilt(static_cast<const Record&>(*given));
     if (copy == nullptr) return false;

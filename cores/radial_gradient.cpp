@@ -19,7 +19,7 @@ VFRadialGradient::~VFRadialGradient() {
 }
 
 void VFRadialGradient::setProperty(VFProperty* property) {
-    replaceCopy(mProperty, property);
+    (void)replaceCopy(mProperty, property);
 }
 
 VFProperty* VFRadialGradient::getProperty() {

@@ -114,7 +114,7 @@ VFStroke::~VFStroke() {
 }
 
 void VFStroke::setProperty(VFProperty* property) {
-    replaceCopy(mProperty, property);
+    (void)replaceCopy(mProperty, property);
 }
 
 VFProperty* VFStroke::getProperty() {

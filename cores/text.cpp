@@ -19,7 +19,7 @@ VFText::~VFText() {
 }
 
 void VFText::setProperty(VFProperty* property) {
-    replaceCopy(mProperty, property);
+    (void)replaceCopy(mProperty, property);
 }
 
 VFProperty* VFText::getProperty() {

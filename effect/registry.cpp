@@ -12,7 +12,7 @@ using namespace internal;
 
 namespace {
 
-VFECore* makeCore(int type) {
+[[nodiscard]] VFECore* makeCore(int type) {
     switch (type) {
         case kOuterShadow:
             return new (std::nothrow) VFOuterShadow;

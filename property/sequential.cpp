@@ -33,7 +33,7 @@ int withStops(int fixedChars, int count) {
 
 /// Lets `write` fill a fragment that starts with `letter`, and moves the cursor past it.
 template <class Write>
-bool writeFragment(char** cursor, char letter, Write write) {
+[[nodiscard]] bool writeFragment(char** cursor, char letter, Write write) {
     if (cursor == nullptr || *cursor == nullptr) return false;
     SequentialWriter writer(*cursor, letter);
     write(writer);
@@ -42,21 +42,21 @@ bool writeFragment(char** cursor, char letter, Write write) {
 }
 
 template <class Shadow>
-bool writeShadow(const Shadow& shadow, char letter, char** cursor) {
+[[nodiscard]] bool writeShadow(const Shadow& shadow, char letter, char** cursor) {
     return writeFragment(cursor, letter, [&](SequentialWriter& writer) {
         writer.angle(shadow.mAngle).small(shadow.mDistance).small(shadow.mSize).word(shadow.mColor);
     });
 }
 
 template <class Glow>
-bool writeGlow(const Glow& glow, char letter, char** cursor) {
+[[nodiscard]] bool writeGlow(const Glow& glow, char letter, char** cursor) {
     return writeFragment(cursor, letter, [&](SequentialWriter& writer) {
         writer.small(glow.mSize).word(glow.mColor).stops(glow.mGradient, glow.mGradientCount);
     });
 }
 
 template <class Gradient>
-bool writeGradient(const Gradient& gradient, char letter, char** cursor) {
+[[nodiscard]] bool writeGradient(const Gradient& gradient, char letter, char** cursor) {
     return writeFragment(cursor, letter, [&](SequentialWriter& writer) {
         writer.angle(gradient.mAngle)
             .bytePair(gradient.mScale * 100.0F)
@@ -65,7 +65,7 @@ bool writeGradient(const Gradient& gradient, char letter, char** cursor) {
 }
 
 template <class Relief>
-bool writeRelief(const Relief& relief, char letter, char** cursor) {
+[[nodiscard]] bool writeRelief(const Relief& relief, char letter, char** cursor) {
     return writeFragment(cursor, letter, [&](SequentialWriter& writer) {
         writer.small(relief.mStyle)
             .bytePair(relief.mSize)
