@@ -10,13 +10,15 @@ namespace VFontEffect::internal {
 /// painted like one inside, but placed among the effects differently: see effect/placement.h.
 enum class StrokeSide { centre = 0, outside = 1, inside = 2, unknown };
 
-inline StrokeSide strokeSide(int position) {
-    return position >= 0 && position <= 2 ? static_cast<StrokeSide>(position) : StrokeSide::unknown;
+/// Unknown without a record.
+inline StrokeSide sideOf(const VFStrokeProperty* stroke) {
+    const bool known = stroke != nullptr && stroke->mPosition >= 0 && stroke->mPosition <= 2;
+    return known ? static_cast<StrokeSide>(stroke->mPosition) : StrokeSide::unknown;
 }
 
 struct StrokeShape {
     explicit StrokeShape(const VFStrokeProperty& stroke)
-        : side(strokeSide(stroke.mPosition)),
+        : side(sideOf(&stroke)),
           radiusPx(side == StrokeSide::centre ? stroke.mSize * 0.5F : stroke.mSize),
           growsGlyph(side == StrokeSide::centre || side == StrokeSide::outside),
           reach(growsGlyph ? static_cast<int>(discReach(radiusPx)) : 0) {}

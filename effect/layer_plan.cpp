@@ -12,7 +12,7 @@ using namespace internal;
 
 namespace {
 
-/// A zeroed layer; one whose byte count does not fit in 32 bits has its size but no pixels.
+/// A zeroed layer. It has its size but no pixels when its byte count does not fit in 32 bits.
 [[nodiscard]] VFBitmap* makeLayer(int width, int height, unsigned int bytesPerPixel) {
     const auto columns = static_cast<unsigned int>(std::max(width, 0));
     const auto rows = static_cast<unsigned int>(std::max(height, 0));

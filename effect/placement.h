@@ -28,23 +28,16 @@ constexpr Placement kWithin = {false, false, false, false, true};
 constexpr Placement kStray = {false, false, false, true, false};
 
 inline const Placement& placementOf(StrokeSide side) {
-    switch (side) {
-        case StrokeSide::centre:
-            return kAstride;
-        case StrokeSide::outside:
-            return kBeneath;
-        case StrokeSide::inside:
-            return kWithin;
-        default:
-            return kStray;
-    }
+    if (side == StrokeSide::centre) return kAstride;
+    if (side == StrokeSide::outside) return kBeneath;
+    return side == StrokeSide::inside ? kWithin : kStray;
 }
 
-/// The bevel style that lies inside the glyph.
-constexpr int kInnerBevel = 1;
+inline bool isInnerBevel(const VFBevelProperty* bevel) {
+    return bevel != nullptr && bevel->mStyle == 1;
+}
 
-/// The placement of a core by its type and, for bevels and strokes, its record. One without a record is
-/// no inner bevel, and a stroke at an unknown position.
+/// By the type of the core and, if it is a bevel or a stroke and has one, its record.
 inline const Placement& placementOf(VFECore& core) {
     const VFProperty* const record = core.getProperty();
     switch (core.getStyle()) {
@@ -54,15 +47,11 @@ inline const Placement& placementOf(VFECore& core) {
             return kBeneath;
         case kEmboss:
             return kAstride;
-        case kBevel: {
-            const auto* const bevel = static_cast<const VFBevelProperty*>(record);
-            return bevel != nullptr && bevel->mStyle == kInnerBevel ? kWithin : kBeneath;
-        }
+        case kBevel:
+            return isInnerBevel(static_cast<const VFBevelProperty*>(record)) ? kWithin : kBeneath;
         case kStroke:
-        case kReservedStroke: {
-            const auto* const stroke = static_cast<const VFStrokeProperty*>(record);
-            return placementOf(stroke != nullptr ? strokeSide(stroke->mPosition) : StrokeSide::unknown);
-        }
+        case kReservedStroke:
+            return placementOf(sideOf(static_cast<const VFStrokeProperty*>(record)));
         default:
             return kWithin;
     }

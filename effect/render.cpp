@@ -12,7 +12,7 @@ using namespace internal;
 
 namespace {
 
-constexpr unsigned int kGlyphColour = 0xFF000000U;
+constexpr unsigned int kGlyphColour = 0xFF000000U;  // not looked at: a mask takes coverage only
 
 VFRect glyphBox(int x, int y, const VFGlyph& glyph) {
     return {x, y, saturateToInt(int64_t{x} + glyph.mWidth), saturateToInt(int64_t{y} + glyph.mHeight)};
@@ -25,7 +25,7 @@ void growTo(VFRect& box, const VFRect& other) {
     box.mBottom = std::max(box.mBottom, other.mBottom);
 }
 
-/// Points the parameters at what a core paints into in layered mode: the outer layer comes first.
+/// Sets the targets of a core in layered mode. When there are two the destination is the second.
 void route(VFECore& core, VFBitmap* destination, VFBitmap* outerLayer,
            VFECore::ParamPostProcessing& params) {
     const Placement& placement = placementOf(core);

@@ -22,11 +22,11 @@ constexpr int kShadowChars = kLetter + kAngle + 2 * kSmall + kWord;
 constexpr int kStrokeChars = kLetter + kSmall + kWord + 2 * kSmall;
 constexpr int kGlowChars = kLetter + kSmall + kWord;
 constexpr int kGradientChars = kLetter + kAngle + kBytePair;
-constexpr int kReliefChars =
+constexpr int kReliefChars =  // of a bevel or an emboss
     kLetter + kSmall + kBytePair + kQuad + 3 * kSmall + kAngle + kSmall + 2 * kWord;
 constexpr int kPatternChars = 17;
 
-/// Reserved characters of a record with stops.
+/// Characters that a record reserves when it has stops.
 int withStops(int fixedChars, int count) {
     return fixedChars + SequentialWriter::kReservedStopChars * SequentialWriter::keptStops(count);
 }
