@@ -21,12 +21,12 @@ unsigned int byteCount(const VFBitmap& bitmap) {
     return byteCount(bitmap.mWidth, bitmap.mHeight, bitmap.mBytesPerPixel);
 }
 
-unsigned char* allocateZeroed(size_t bytes) {
+[[nodiscard]] unsigned char* allocateZeroed(size_t bytes) {
     return static_cast<unsigned char*>(std::calloc(bytes, 1));
 }
 
 /// A copy of `bytes` bytes from `source`; null for no source or no memory.
-unsigned char* duplicate(const unsigned char* source, size_t bytes) {
+[[nodiscard]] unsigned char* duplicate(const unsigned char* source, size_t bytes) {
     if (source == nullptr) return nullptr;
     auto* copy = static_cast<unsigned char*>(std::malloc(bytes));
     if (copy != nullptr && bytes != 0) std::memcpy(copy, source, bytes);
@@ -38,7 +38,7 @@ unsigned int distance(int from, int to) {
     return static_cast<unsigned int>(difference < 0 ? -difference : difference);
 }
 
-/// Whether the box, not inverted, lies inside a source whose buffer is as large as it claims.
+/// Whether the box is not inverted and lies inside a source whose buffer is as large as it claims.
 bool liesInside(const VFRect& box, const VFBitmap& source) {
     return box.mLeft >= 0 && box.mTop >= 0 && box.mRight >= box.mLeft && box.mBottom >= box.mTop &&
            static_cast<unsigned int>(box.mRight) <= source.mWidth &&
@@ -71,7 +71,7 @@ VFBitmap::VFBitmap(unsigned int width, unsigned int height, unsigned char* data,
       mData(nullptr),
       mFormat(formatOf(bytesPerPixel)),
       mBytesPerPixel(bytesPerPixel) {
-    // The count is a signed 32-bit number here: from 2^31 on there is no such buffer.
+    // Here the byte count is a signed 32-bit number; a negative one, from 2^31 on, gives no buffer.
     const auto bytes = static_cast<int32_t>(byteCount(*this));
     if (bytes >= 0) mData = duplicate(data, static_cast<size_t>(bytes));
 }

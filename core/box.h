@@ -5,7 +5,7 @@
 
 namespace VFontEffect::internal {
 
-/// A half-open rectangle of pixels.
+/// A rectangle of whole pixels, half-open: the right and bottom edges do not belong to it.
 struct Box {
     int64_t left;
     int64_t top;
@@ -24,7 +24,7 @@ inline Box intersection(const Box& a, const Box& b) {
     return {std::max(a.left, b.left), std::max(a.top, b.top), std::min(a.right, b.right),
             std::min(a.bottom, b.bottom)};
 }
-/// The smallest that has both in it. Empty ones count for nothing.
+/// The smallest box that contains both. An empty one is left out.
 inline Box boundingBox(const Box& a, const Box& b) {
     if (a.empty() || b.empty()) return a.empty() ? b : a;
     return {std::min(a.left, b.left), std::min(a.top, b.top), std::max(a.right, b.right),

@@ -19,7 +19,4 @@ enum EffectType : int {
     kNoEffect = 13
 };
 
-/// VFStrokeProperty::mPosition; any other value is inside.
-enum StrokePosition : int { kStrokeCentre = 0, kStrokeOutside = 1, kStrokeInside = 2 };
-
 }  // namespace VFontEffect::internal

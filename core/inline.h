@@ -1,8 +1,8 @@
 #pragma once
 
-/// For what the inner loops call. In a level's namespace, because a vector passed to a call would need a
-/// calling convention; outside of it, because a copy that the linker could share between levels would
-/// run one level's instructions at another.
+/// Forces the inlining of what inner loops call. In a level's namespace, because a real call that passes
+/// vectors depends on the level's calling convention; outside of it, because of several objects' copies
+/// of a function the linker keeps one, which may hold instructions of a level that the CPU lacks.
 #define VOREL_INLINE inline __attribute__((always_inline))
-/// The same for a lambda, behind its parameters.
+/// The same for a lambda; it stands after the parameter list.
 #define VOREL_INLINE_LAMBDA __attribute__((always_inline))

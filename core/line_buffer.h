@@ -18,8 +18,8 @@
 
 namespace VFontEffect::internal {
 
-/// Working memory of bytes that begins with a line of the cache, so that no vector at a multiple of its
-/// own size crosses two lines. Empty when memory ran out.
+/// Working memory of bytes, aligned to a cache line, so that no vector at a multiple of its own size
+/// straddles two lines. Empty when memory ran out.
 class LineBuffer {
   public:
     explicit LineBuffer(int64_t width, int64_t height = 1)
@@ -40,7 +40,7 @@ class LineBuffer {
   private:
     static constexpr int64_t kLineBytes = 64;
 
-    /// What is there for alignment only is nobody's: the address sanitizer reports any use of it.
+    /// Poisons the padding that is there for alignment only: the address sanitizer reports its use.
     static void forbid([[maybe_unused]] const void* start, [[maybe_unused]] int64_t bytes) {
 #if defined(VOREL_ADDRESS_SANITIZER)
         __asan_poison_memory_region(start, static_cast<size_t>(bytes));

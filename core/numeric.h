@@ -30,23 +30,23 @@ inline float clampKeepingNan(float value, float low, float high) {
     return value > high ? high : value;
 }
 
-/// Whole degrees within a turn, with the sign of the angle.
+/// The angle cut to whole degrees, modulo `turn`. The result keeps the angle's sign.
 inline int32_t reducedDegrees(float degrees, int32_t turn) {
     return toInt(degrees) % turn;
 }
 
-/// Whole degrees in 0..turn - 1.
+/// The angle cut to whole degrees and brought into 0..turn - 1.
 inline int32_t wholeDegrees(float degrees, int32_t turn) {
     const int32_t reduced = reducedDegrees(degrees, turn);
     return reduced < 0 ? reduced + turn : reduced;
 }
 
-/// The smallest multiple that is not below `value`, of 0 or more.
+/// A value of 0 or more, rounded up to a whole multiple.
 VOREL_INLINE int64_t roundedUp(int64_t value, int64_t multiple) {
     return (value + multiple - 1) / multiple * multiple;
 }
 
-/// A 64-bit coordinate cut to the range of an int.
+/// A 64-bit coordinate clamped to the range of an int.
 inline int saturateToInt(int64_t value) {
     constexpr int64_t kLow = std::numeric_limits<int>::min();
     constexpr int64_t kHigh = std::numeric_limits<int>::max();

@@ -9,7 +9,7 @@ namespace VFontEffect::internal {
 
 /// Working memory of one call: a move-only array over malloc, empty when memory ran out.
 template <class T>
-class PixelBuffer {
+class [[nodiscard]] PixelBuffer {
   public:
     static PixelBuffer zeroed(int64_t width, int64_t height = 1) { return make(width, height, true); }
     static PixelBuffer uninitialised(int64_t width, int64_t height = 1) {
@@ -30,7 +30,7 @@ class PixelBuffer {
     T& operator[](size_t i) { return mData[i]; }
 
   private:
-    /// More than this for one working buffer is no size of a text effect.
+    /// A larger request fails: no text effect of a sensible size makes one.
     static constexpr uint64_t kMostBytes = uint64_t{1} << 31;
 
     static PixelBuffer make(int64_t width, int64_t height, bool clear) {
@@ -38,7 +38,7 @@ class PixelBuffer {
         const auto columns = static_cast<uint64_t>(width);
         const auto rows = static_cast<uint64_t>(height);
         if (rows != 0 && columns > kMostBytes / sizeof(T) / rows) return PixelBuffer(nullptr);
-        // An empty buffer asks for one element, so that null always means failure.
+        // A buffer without elements asks malloc for one, so that null always means failure.
         const size_t count = static_cast<size_t>(columns * rows > 0 ? columns * rows : 1);
         return PixelBuffer(
             static_cast<T*>(clear ? std::calloc(count, sizeof(T)) : std::malloc(count * sizeof(T))));

@@ -5,7 +5,7 @@
 namespace VFontEffect::internal {
 namespace {
 
-/// c[0] + x * (c[1] + x * (...)).
+/// c[0] + c[1] * x + c[2] * x^2 + ..., by Horner's rule.
 template <int Terms>
 double polynomial(double x, const double (&c)[Terms]) {
     double sum = c[Terms - 1];
@@ -14,7 +14,7 @@ double polynomial(double x, const double (&c)[Terms]) {
     return sum;
 }
 
-/// Taylor series around 0; their remainders lie below 1e-17 where they are used.
+/// Taylor series around 0; on the reduced arguments their remainders lie below 1e-17.
 constexpr double kExpSeries[] = {1.0,
                                  1.0,
                                  1.0 / 2,
@@ -49,8 +49,8 @@ constexpr double kCosineSeries[] = {1.0,
                                     1.0 / 20922789888000.0,
                                     -1.0 / 6402373705728000.0};
 
-/// ln 2 and pi / 2 in two parts; the first has so few digits that its product with a whole number of
-/// up to 20 bits is exact.
+/// ln 2 and pi / 2, split for argument reduction: the high part has so few significant bits that its
+/// product with a whole number of up to 20 bits is exact.
 constexpr double kLn2High = 6.93147180369123816490e-01;
 constexpr double kLn2Low = 1.90821492927058770002e-10;
 constexpr double kHalfPiHigh = 1.57079632673412561417e+00;
@@ -71,7 +71,7 @@ struct SineCosine {
     double cosine;
 };
 
-/// Both of an angle up to kLargestAngle: reduced to -pi/4..pi/4, then turned back by quarters.
+/// Both of an angle up to kLargestAngle: less whole quarter turns, in -pi/4..pi/4, then turned back.
 SineCosine sineCosine(double radians) {
     const double quarters = nearestWhole(radians * kTwoOverPi);
     const double r = (radians - quarters * kHalfPiHigh) - quarters * kHalfPiLow;

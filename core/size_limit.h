@@ -2,7 +2,7 @@
 
 namespace VFontEffect::internal {
 
-/// Sizes beyond this many pixels are no text effect, and would take gigabytes or minutes.
+/// Nothing is painted for an effect size above this: it would take gigabytes or minutes.
 constexpr float kLargestSizePx = 256.0F;
 
 inline bool exceedsSizeLimit(float sizePx) {

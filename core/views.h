@@ -11,15 +11,15 @@ namespace VFontEffect::internal {
 constexpr int kMaskBytes = 1;
 constexpr int kColourBytes = 4;
 
-/// Whether width x height pixels of that many bytes fit in a 32-bit byte count, the limit up to
-/// which a bitmap's buffer is as large as its numbers claim.
+/// Whether the byte count of width x height pixels fits in 32 bits. Beyond that a bitmap, which counts
+/// its bytes in 32 bits, has a smaller buffer than its numbers claim.
 inline bool fitsByteCount(unsigned int width, unsigned int height, unsigned int bytesPerPixel) {
     const uint64_t pixels = static_cast<uint64_t>(width) * height;
     return bytesPerPixel != 0 && pixels <= std::numeric_limits<uint32_t>::max() / bytesPerPixel;
 }
 
-/// Pixels of a bitmap with the sizes widened to 64 bits; empty for a bitmap that cannot be trusted.
-/// The stride is width * BytesPerPixel.
+/// The pixels of a bitmap, with 64-bit sizes and packed rows. Empty, with null data, for a bitmap
+/// without pixels, of other bytes per pixel, or whose buffer is smaller than its numbers claim.
 template <int BytesPerPixel>
 struct PixelView {
     unsigned char* data = nullptr;
@@ -31,7 +31,7 @@ struct PixelView {
                                                                             : PixelView{};
     }
 
-    /// Takes the bytes of a bitmap for such pixels, of which each must have as many or more.
+    /// Views a bitmap of so many bytes per pixel or more as if its bytes were width x height of these.
     static PixelView ofBytes(const VFBitmap* bitmap) {
         if (bitmap == nullptr || bitmap->mData == nullptr || bitmap->mBytesPerPixel < BytesPerPixel ||
             !fitsByteCount(bitmap->mWidth, bitmap->mHeight, bitmap->mBytesPerPixel)) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <algorithm>
 #include <cstddef>
 #include <new>
 
@@ -8,116 +9,105 @@
 /// How cores take their own deep copy of a record and let go of it.
 namespace VFontEffect::internal {
 
-/// The same class of record built anew from another's fields, so that the constructor's clamps and
-/// reductions run again. Arrays and bitmaps are still shared. Null when memory ran out.
-inline VFTextProperty* rebuilt(const VFTextProperty& p) {
-    return new (std::nothrow) VFTextProperty(p.mColor, p.mOpacity);
-}
-inline VFOuterShadowProperty* rebuilt(const VFOuterShadowProperty& p) {
-    return new (std::nothrow)
-        VFOuterShadowProperty(p.mAngle, p.mDistance, p.mSize, p.mColor, p.mOpacity);
-}
-inline VFInnerShadowProperty* rebuilt(const VFInnerShadowProperty& p) {
-    return new (std::nothrow)
-        VFInnerShadowProperty(p.mAngle, p.mDistance, p.mSize, p.mColor, p.mOpacity);
-}
-inline VFStrokeProperty* rebuilt(const VFStrokeProperty& p) {
-    return new (std::nothrow)
-        VFStrokeProperty(p.mSize, p.mColor, p.mOpacity, p.mStrokeStyle, p.mPosition);
-}
-inline VFOuterGlowProperty* rebuilt(const VFOuterGlowProperty& p) {
-    return new (std::nothrow)
-        VFOuterGlowProperty(p.mSize, p.mColor, p.mOpacity, p.mGradientCount, p.mGradient);
-}
-inline VFInnerGlowProperty* rebuilt(const VFInnerGlowProperty& p) {
-    return new (std::nothrow)
-        VFInnerGlowProperty(p.mSize, p.mColor, p.mOpacity, p.mGradientCount, p.mGradient);
-}
-inline VFLinearGradientProperty* rebuilt(const VFLinearGradientProperty& p) {
-    return new (std::nothrow)
-        VFLinearGradientProperty(p.mAngle, p.mScale, p.mOpacity, p.mGradientCount, p.mGradient);
-}
-inline VFRadialGradientProperty* rebuilt(const VFRadialGradientProperty& p) {
-    return new (std::nothrow)
-        VFRadialGradientProperty(p.mAngle, p.mScale, p.mOpacity, p.mGradientCount, p.mGradient);
-}
-inline VFPatternProperty* rebuilt(const VFPatternProperty& p) {
-    return new (std::nothrow) VFPatternProperty(p.mPattern, p.mScale, p.mOpacity);
-}
+/// The fields of a record, as the parameters of its constructor name them. What a field owns in a copy
+/// is told by its type: a stop array, a bitmap, or nothing.
+template <auto... Field>
+struct Fields {
+    /// The same class of record built anew from another's fields, so that the constructor's clamps and
+    /// reductions run again. Arrays and bitmaps are still shared. Null when memory ran out.
+    template <class Record>
+    [[nodiscard]] static Record* rebuilt(const Record& p) {
+        return new (std::nothrow) Record(p.*Field...);
+    }
 
-/// Puts a copy in the place of a shared stop array; false when memory ran out.
-inline bool ownStops(VFGradient*& stops, int count) {
-    if (stops == nullptr) return true;
-    const VFGradient* const shared = stops;
-    const auto own = static_cast<std::size_t>(count > 0 ? count : 0);
-    stops = new (std::nothrow) VFGradient[own];
-    for (std::size_t i = 0; stops != nullptr && i < own; ++i)
-        stops[i] = shared[i];
-    return stops != nullptr;
-}
+    /// Puts copies in the place of the shared array or bitmap; false when memory ran out. Even then the
+    /// record holds nothing shared afterwards.
+    template <class Record>
+    [[nodiscard]] static bool ownContents(Record& copy) {
+        return (own(copy, copy.*Field) && ...);
+    }
 
-/// Puts a copy in the place of a shared bitmap; false when memory ran out.
-inline bool ownBitmap(VFBitmap*& bitmap) {
-    if (bitmap == nullptr) return true;
-    const VFBitmap* const shared = bitmap;
-    bitmap = new (std::nothrow) VFBitmap(*shared);
-    return bitmap != nullptr && (bitmap->mData != nullptr || shared->mData == nullptr);
-}
+    template <class Record>
+    static void releaseContents(Record& owned) {
+        (release(owned.*Field), ...);
+    }
 
-/// Gives a copy its own array or bitmap, where its class has one. Even when that fails it holds nothing
-/// shared afterwards.
-inline bool ownContents(VFProperty& /*copy*/) {
-    return true;
-}
-inline bool ownContents(VFOuterGlowProperty& p) {
-    return ownStops(p.mGradient, p.mGradientCount);
-}
-inline bool ownContents(VFInnerGlowProperty& p) {
-    return ownStops(p.mGradient, p.mGradientCount);
-}
-inline bool ownContents(VFLinearGradientProperty& p) {
-    return ownStops(p.mGradient, p.mGradientCount);
-}
-inline bool ownContents(VFRadialGradientProperty& p) {
-    return ownStops(p.mGradient, p.mGradientCount);
-}
-inline bool ownContents(VFPatternProperty& p) {
-    return ownBitmap(p.mPattern);
-}
+  private:
+    template <class Record, class Number>
+    [[nodiscard]] static bool own(const Record& /*copy*/, Number& /*number*/) {
+        return true;
+    }
+    template <class Record>
+    [[nodiscard]] static bool own(const Record& copy, VFGradient*& stops) {
+        if (stops == nullptr) return true;
+        const VFGradient* const shared = stops;
+        const auto count = static_cast<std::size_t>(std::max(copy.mGradientCount, 0));
+        stops = new (std::nothrow) VFGradient[count];
+        if (stops != nullptr) std::copy_n(shared, count, stops);
+        return stops != nullptr;
+    }
+    template <class Record>
+    [[nodiscard]] static bool own(const Record& /*copy*/, VFBitmap*& bitmap) {
+        if (bitmap == nullptr) return true;
+        const VFBitmap* const shared = bitmap;
+        bitmap = new (std::nothrow) VFBitmap(*shared);
+        return bitmap != nullptr && (bitmap->mData != nullptr || shared->mData == nullptr);
+    }
 
-inline void releaseContents(VFProperty& /*owned*/) {}
-inline void releaseContents(VFOuterGlowProperty& p) {
-    delete[] p.mGradient;
-}
-inline void releaseContents(VFInnerGlowProperty& p) {
-    delete[] p.mGradient;
-}
-inline void releaseContents(VFLinearGradientProperty& p) {
-    delete[] p.mGradient;
-}
-inline void releaseContents(VFRadialGradientProperty& p) {
-    delete[] p.mGradient;
-}
-inline void releaseContents(VFPatternProperty& p) {
-    delete p.mPattern;
-}
+    template <class Number>
+    static void release(const Number& /*number*/) {}
+    static void release(VFGradient* stops) { delete[] stops; }
+    static void release(VFBitmap* bitmap) { delete bitmap; }
+};
+
+template <class R>
+using ShadowFields = Fields<&R::mAngle, &R::mDistance, &R::mSize, &R::mColor, &R::mOpacity>;
+template <class R>
+using GlowFields = Fields<&R::mSize, &R::mColor, &R::mOpacity, &R::mGradientCount, &R::mGradient>;
+template <class R>
+using GradientFields = Fields<&R::mAngle, &R::mScale, &R::mOpacity, &R::mGradientCount, &R::mGradient>;
+
+/// The fields of each record that a core keeps.
+template <class Record>
+struct FieldsOf;
+template <>
+struct FieldsOf<VFTextProperty> : Fields<&VFTextProperty::mColor, &VFTextProperty::mOpacity> {};
+template <>
+struct FieldsOf<VFOuterShadowProperty> : ShadowFields<VFOuterShadowProperty> {};
+template <>
+struct FieldsOf<VFInnerShadowProperty> : ShadowFields<VFInnerShadowProperty> {};
+template <>
+struct FieldsOf<VFStrokeProperty>
+    : Fields<&VFStrokeProperty::mSize, &VFStrokeProperty::mColor, &VFStrokeProperty::mOpacity,
+             &VFStrokeProperty::mStrokeStyle, &VFStrokeProperty::mPosition> {};
+template <>
+struct FieldsOf<VFOuterGlowProperty> : GlowFields<VFOuterGlowProperty> {};
+template <>
+struct FieldsOf<VFInnerGlowProperty> : GlowFields<VFInnerGlowProperty> {};
+template <>
+struct FieldsOf<VFLinearGradientProperty> : GradientFields<VFLinearGradientProperty> {};
+template <>
+struct FieldsOf<VFRadialGradientProperty> : GradientFields<VFRadialGradientProperty> {};
+template <>
+struct FieldsOf<VFPatternProperty>
+    : Fields<&VFPatternProperty::mPattern, &VFPatternProperty::mScale, &VFPatternProperty::mOpacity> {};
 
 /// Destroys a core's own record with the array or bitmap that came with it.
 template <class Record>
 void releaseCopy(Record* owned) {
-    if (owned != nullptr) releaseContents(*owned);
+    if (owned != nullptr) FieldsOf<Record>::releaseContents(*owned);
     delete owned;
 }
 
 /// A core's setProperty: puts a deep copy of `given`, which must be of class Record, in the place of
-/// `stored`. Returns whether it did: not for null, nor when memory ran out. `given` may be the stored
-/// record itself.
+/// `stored`. Returns whether it did: not for null, nor when memory ran out; only a core that derives
+/// numbers from its record needs to know. `given` may be the stored record itself.
 template <class Record>
 bool replaceCopy(Record*& stored, const VFProperty* given) {
     if (given == nullptr) return false;
-    Record* copy = rebuilt(static_cast<const Record&>(*given));
+    Record* copy = FieldsOf<Record>::rebuilt(static_cast<const Record&>(*given));
     if (copy == nullptr) return false;
-    if (!ownContents(*copy)) {
+    if (!FieldsOf<Record>::ownContents(*copy)) {
         releaseCopy(copy);
         return false;
     }

@@ -8,6 +8,7 @@
 #include "cores/paint_input.h"
 #include "cores/placed_target.h"
 #include "cores/property_copy.h"
+#include "cores/stroke_shape.h"
 #include "ops/dilate/dilation_plan.h"
 #include "ops/dilate/disc_shape.h"
 #include "voreleffect/VFECore.h"
@@ -22,9 +23,10 @@ namespace {
 /// within the disc's radius of the edge on both sides of it.
 class Outline {
   public:
-    Outline(CpuLevel level, const CoverageBox& box, const DiscShape& disc, const Box& part, int position)
-        : mGrown(level, box.rows(position == kStrokeInside ? kInverse : kAsIs), disc, part) {
-        if (position == kStrokeCentre) mInverse.emplace(level, box.rows(kInverse), disc, part);
+    Outline(CpuLevel level, const CoverageBox& box, const DiscShape& disc, const Box& part,
+            const StrokeShape& shape)
+        : mGrown(level, box.rows(shape.growsGlyph ? kAsIs : kInverse), disc, part) {
+        if (shape.side == StrokeSide::centre) mInverse.emplace(level, box.rows(kInverse), disc, part);
     }
 
     explicit operator bool() const { return mGrown && (!mInverse || *mInverse); }
@@ -58,17 +60,14 @@ VFProperty* VFStroke::getProperty() {
 }
 
 int VFStroke::getOffset() {
-    if (mProperty == nullptr) return 0;
-    if (mProperty->mPosition == kStrokeOutside) return toInt(mProperty->mSize + 0.5F);
-    return mProperty->mPosition == kStrokeCentre ? toInt(mProperty->mSize * 0.5F + 0.5F) : 0;
+    return mProperty != nullptr ? StrokeShape(*mProperty).reach : 0;
 }
 
 void VFStroke::doPostProcessing(ParamPostProcessing* params) {
     const CoverageBox box = coverageOf(params);
     if (!box || mProperty == nullptr || exceedsSizeLimit(mProperty->mSize)) return;
-    const bool centred = mProperty->mPosition == kStrokeCentre;
-    const bool outside = mProperty->mPosition == kStrokeOutside;
-    const DiscShape disc(centred ? mProperty->mSize * 0.5F : mProperty->mSize);
+    const StrokeShape shape(*mProperty);
+    const DiscShape disc(shape.radiusPx);
     if (!disc) return;
     const CpuLevel level = chosenLevel();
     const PlacedTarget targets[] = {{level, params->dstBitmap, box.left, box.top},
@@ -76,11 +75,10 @@ void VFStroke::doPostProcessing(ParamPostProcessing* params) {
     const Box reached = DilationPlan::reached(box.rows(), disc);
     const Box visible = boundingBox(targets[0].seen(reached), targets[1].seen(reached));
     if (visible.empty()) return;
-    Outline outline(level, box, disc, visible,
-                    centred || outside ? mProperty->mPosition : kStrokeInside);
+    Outline outline(level, box, disc, visible, shape);
     if (!outline) return;
 
-    const bool overText = centred && params->useOuterLayer != 1;
+    const bool overText = shape.side == StrokeSide::centre && params->useOuterLayer != 1;
     const auto rule = overText ? &BlendLoops::srcOverMask : &BlendLoops::dstOverMask;
     for (int64_t y = visible.top; y < visible.bottom; y += outline.bandRows()) {
         const CoverageRows band = outline.rows(y, std::min(outline.bandRows(), visible.bottom - y));

@@ -12,7 +12,7 @@ using namespace internal;
 
 namespace {
 
-/// Registers a record and gives its effect's id, -1 as 0xFFFFFFFF.
+/// Puts the record's effect into the set and returns its id, which is 0xFFFFFFFF for none.
 template <class Record>
 unsigned int add(VFEffect& set, EffectType type, Record record) {
     return static_cast<unsigned int>(set.addEffect(type, &record));

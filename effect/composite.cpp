@@ -10,7 +10,7 @@ using namespace internal;
 
 namespace {
 
-/// Merges the outer layer into the destination by the coverage; all three must have one size.
+/// Mixes the outer layer into the destination by the coverage. Does nothing unless all have one size.
 void mergeLayers(const ColourView& destination, const ColourView& outer, const MaskView& mask) {
     if (!destination || !outer || !mask) return;
     const auto sameSize = [&](const auto& layer) {

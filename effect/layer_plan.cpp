@@ -3,7 +3,7 @@
 
 #include "core/effect_types.h"
 #include "core/views.h"
-#include "effect/routing.h"
+#include "effect/placement.h"
 #include "voreleffect/VFEffect.h"
 
 namespace VFontEffect {
@@ -12,8 +12,8 @@ using namespace internal;
 
 namespace {
 
-/// A zeroed layer; one whose byte count does not fit in 32 bits has its size but no pixels.
-VFBitmap* makeLayer(int width, int height, unsigned int bytesPerPixel) {
+/// A zeroed layer. It has its size but no pixels when its byte count does not fit in 32 bits.
+[[nodiscard]] VFBitmap* makeLayer(int width, int height, unsigned int bytesPerPixel) {
     const auto columns = static_cast<unsigned int>(std::max(width, 0));
     const auto rows = static_cast<unsigned int>(std::max(height, 0));
     const bool fits = fitsByteCount(columns, rows, bytesPerPixel);
@@ -21,22 +21,15 @@ VFBitmap* makeLayer(int width, int height, unsigned int bytesPerPixel) {
                 : new (std::nothrow) VFBitmap(columns, rows, nullptr, bytesPerPixel);
 }
 
-/// An effect that needs the outer layer whatever the text opacity.
-bool needsOuterLayer(VFECore* core) {
-    const int type = core->getStyle();
-    return type == kEmboss || (isStroke(type) && strokePosition(*core) == kStrokeCentre);
-}
-
 /// Puts the cores in paint order: over the text, the text fill, beneath the text. In layered mode only
 /// the text fill has a place of its own, the end.
 ///
 /// Deliberate: the order is made by reversing the list as it stands, so a second ordering of the same
 /// list restores the earlier order within each group.
-template <class IsUnder>
-void reorder(std::vector<VFECore*>& cores, bool layered, IsUnder isUnder) {
-    const auto rank = [&](VFECore* core) {
+void reorder(std::vector<VFECore*>& cores, bool layered) {
+    const auto rank = [layered](VFECore* core) {
         if (core->getStyle() == kText) return 1;
-        return !layered && isUnder(core) ? 2 : 0;
+        return !layered && placementOf(*core).underText ? 2 : 0;
     };
     std::reverse(cores.begin(), cores.end());
     std::stable_sort(cores.begin(), cores.end(),
@@ -54,8 +47,9 @@ int largestOffset(const std::vector<VFECore*>& cores, Query query) {
 }  // namespace
 
 void VFEffect::initEffect(int width, int height) {
-    const bool layered =
-        mTextOpacity < 1.0F || std::any_of(mEffects.begin(), mEffects.end(), needsOuterLayer);
+    const bool layered = mTextOpacity < 1.0F ||
+                         std::any_of(mEffects.begin(), mEffects.end(),
+                                     [](VFECore* core) { return placementOf(*core).needsOuterLayer; });
     mUseOuterLayer = layered ? 1 : 0;
 
     delete mSrcBitmap;
@@ -65,7 +59,7 @@ void VFEffect::initEffect(int width, int height) {
         mOuterLayer = makeLayer(width, height, kColourBytes);
     }
 
-    if (!mOrdered) reorder(mEffects, layered, [this](VFECore* core) { return isUnderEffect(core); });
+    if (!mOrdered) reorder(mEffects, layered);
     mOrdered = true;
 
     VFECore::ParamInit init = {width, height, mUseOuterLayer};
@@ -76,23 +70,8 @@ void VFEffect::initEffect(int width, int height) {
 
 bool VFEffect::isUnderEffect(VFECore* core) {
     if (core == nullptr) return false;
-    const int type = core->getStyle();
-    if (isStroke(type)) {
-        const int position = strokePosition(*core);
-        return position == kStrokeOutside || (position == kStrokeCentre && mUseOuterLayer != 1);
-    }
-    switch (type) {
-        case kNoEffect:
-        case kOuterShadow:
-        case kOuterGlow:
-            return true;
-        case kEmboss:
-            return mUseOuterLayer != 1;
-        case kBevel:
-            return !isInnerBevel(*core);
-        default:
-            return false;
-    }
+    const Placement& placement = placementOf(*core);
+    return mUseOuterLayer == 1 ? placement.underTextLayered : placement.underText;
 }
 
 int VFEffect::getLeftOffset() {

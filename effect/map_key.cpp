@@ -6,12 +6,12 @@
 namespace VFontEffect {
 namespace {
 
-/// A key that reserves more than this comes from records whose stop counts are not what they claim.
+/// Bytes. Only records with absurd stop counts reserve more; there is no key then.
 constexpr std::size_t kLargestKey = std::size_t{1} << 28;
 
 }  // namespace
 
-// Deliberate: fragments follow the list, whose order planning changes; they are not sorted.
+// Deliberate: the fragments follow the list, which initEffect reorders; they are not sorted.
 char* VFEffect::getMapKey() {
     std::size_t reserved = 0;
     for (VFECore* core : mEffects) {

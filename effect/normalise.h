@@ -37,7 +37,7 @@ inline float wholePixels(float pixels) {
     return static_cast<float>(std::clamp(toInt(pixels), 0, kLargestPixelSize));
 }
 
-/// A stop whose colour carries the effect's opacity and its own, at a position cut to hundredths.
+/// The stop with both opacities multiplied into its alpha byte and its position cut to hundredths.
 inline VFGradient normalisedStop(const VFGradient& stop, float effectOpacity) {
     const float opacity = clampedOpacity(effectOpacity * stop.mOpacity);
     const float location = static_cast<float>(toInt(stop.mLocation * 100.0F)) / 100.0F;

@@ -12,7 +12,7 @@ using namespace internal;
 
 namespace {
 
-VFECore* makeCore(int type) {
+[[nodiscard]] VFECore* makeCore(int type) {
     switch (type) {
         case kOuterShadow:
             return new (std::nothrow) VFOuterShadow;
@@ -64,7 +64,7 @@ int VFEffect::addEffect(int id, int type, VFProperty* property) {
     mOrdered = false;
     VFECore* core = getEffect(type);
     if (core == nullptr) {
-        mEffects.reserve(mEffects.size() + 1);  // before a core exists that could be lost
+        mEffects.reserve(mEffects.size() + 1);  // may throw: before there is a core to leak
         core = createEffect(id, type, nullptr);
         if (core == nullptr) return -1;
         mEffects.push_back(core);
@@ -95,7 +95,7 @@ VFECore* VFEffect::getEffect(int type) {
     return found != mEffects.end() ? *found : nullptr;
 }
 
-// Deliberate: the rest of the list stays in paint order, or out of it, as it was.
+// Deliberate: mOrdered stays as it is, so the rest of the list is not put in paint order anew.
 bool VFEffect::removeEffect(int id) {
     const auto found = std::find_if(mEffects.begin(), mEffects.end(),
                                     [id](VFECore* core) { return core->getId() == id; });
@@ -144,7 +144,7 @@ float VFEffect::getTextOpacity() {
     return mTextOpacity;
 }
 
-// Deliberate: the paint order stays as it is.
+// Deliberate: mOrdered stays as it is; see setTextOpacity.
 void VFEffect::clearTextOpacity() {
     mTextOpacity = 1.0F;
 }

@@ -2,7 +2,7 @@
 #include <cstdint>
 
 #include "core/numeric.h"
-#include "effect/routing.h"
+#include "effect/placement.h"
 #include "voreleffect/VFBlender.h"
 #include "voreleffect/VFEffect.h"
 
@@ -12,7 +12,7 @@ using namespace internal;
 
 namespace {
 
-constexpr unsigned int kGlyphColour = 0xFF000000U;
+constexpr unsigned int kGlyphColour = 0xFF000000U;  // not looked at: a mask takes coverage only
 
 VFRect glyphBox(int x, int y, const VFGlyph& glyph) {
     return {x, y, saturateToInt(int64_t{x} + glyph.mWidth), saturateToInt(int64_t{y} + glyph.mHeight)};
@@ -25,12 +25,12 @@ void growTo(VFRect& box, const VFRect& other) {
     box.mBottom = std::max(box.mBottom, other.mBottom);
 }
 
-/// Points the parameters at the layers that a core paints into in layered mode.
+/// Sets the targets of a core in layered mode. When there are two the destination is the second.
 void route(VFECore& core, VFBitmap* destination, VFBitmap* outerLayer,
            VFECore::ParamPostProcessing& params) {
-    const Target target = layeredTarget(core);
-    params.dstBitmap = target == Target::destination ? destination : outerLayer;
-    params.subDstBitmap = target == Target::both ? destination : nullptr;
+    const Placement& placement = placementOf(core);
+    params.dstBitmap = placement.inOuterLayer ? outerLayer : destination;
+    params.subDstBitmap = placement.inOuterLayer && placement.inDestination ? destination : nullptr;
 }
 
 void clampTo(VFRect& box, const VFBitmap& mask) {

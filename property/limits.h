@@ -1,9 +1,9 @@
 #pragma once
 
-/// What the records and the add-calls clamp and reduce to.
+/// The ranges that the records and the add-calls bring their numbers into.
 namespace VFontEffect::internal {
 
-/// Degrees after which an angle or an altitude starts again.
+/// Degrees that angles and altitudes are taken modulo.
 constexpr int kTurn = 360;
 constexpr int kQuarterTurn = 90;
 

@@ -22,18 +22,18 @@ constexpr int kShadowChars = kLetter + kAngle + 2 * kSmall + kWord;
 constexpr int kStrokeChars = kLetter + kSmall + kWord + 2 * kSmall;
 constexpr int kGlowChars = kLetter + kSmall + kWord;
 constexpr int kGradientChars = kLetter + kAngle + kBytePair;
-constexpr int kReliefChars =
+constexpr int kReliefChars =  // of a bevel or an emboss
     kLetter + kSmall + kBytePair + kQuad + 3 * kSmall + kAngle + kSmall + 2 * kWord;
 constexpr int kPatternChars = 17;
 
-/// Reserved characters of a record with stops.
+/// Characters that a record reserves when it has stops.
 int withStops(int fixedChars, int count) {
     return fixedChars + SequentialWriter::kReservedStopChars * SequentialWriter::keptStops(count);
 }
 
 /// Lets `write` fill a fragment that starts with `letter`, and moves the cursor past it.
 template <class Write>
-bool writeFragment(char** cursor, char letter, Write write) {
+[[nodiscard]] bool writeFragment(char** cursor, char letter, Write write) {
     if (cursor == nullptr || *cursor == nullptr) return false;
     SequentialWriter writer(*cursor, letter);
     write(writer);
@@ -42,21 +42,21 @@ bool writeFragment(char** cursor, char letter, Write write) {
 }
 
 template <class Shadow>
-bool writeShadow(const Shadow& shadow, char letter, char** cursor) {
+[[nodiscard]] bool writeShadow(const Shadow& shadow, char letter, char** cursor) {
     return writeFragment(cursor, letter, [&](SequentialWriter& writer) {
         writer.angle(shadow.mAngle).small(shadow.mDistance).small(shadow.mSize).word(shadow.mColor);
     });
 }
 
 template <class Glow>
-bool writeGlow(const Glow& glow, char letter, char** cursor) {
+[[nodiscard]] bool writeGlow(const Glow& glow, char letter, char** cursor) {
     return writeFragment(cursor, letter, [&](SequentialWriter& writer) {
         writer.small(glow.mSize).word(glow.mColor).stops(glow.mGradient, glow.mGradientCount);
     });
 }
 
 template <class Gradient>
-bool writeGradient(const Gradient& gradient, char letter, char** cursor) {
+[[nodiscard]] bool writeGradient(const Gradient& gradient, char letter, char** cursor) {
     return writeFragment(cursor, letter, [&](SequentialWriter& writer) {
         writer.angle(gradient.mAngle)
             .bytePair(gradient.mScale * 100.0F)
@@ -65,7 +65,7 @@ bool writeGradient(const Gradient& gradient, char letter, char** cursor) {
 }
 
 template <class Relief>
-bool writeRelief(const Relief& relief, char letter, char** cursor) {
+[[nodiscard]] bool writeRelief(const Relief& relief, char letter, char** cursor) {
     return writeFragment(cursor, letter, [&](SequentialWriter& writer) {
         writer.small(relief.mStyle)
             .bytePair(relief.mSize)

@@ -25,7 +25,7 @@ class SequentialWriter {
     /// Deliberate: a stop reserves one character more than it writes.
     static constexpr int kReservedStopChars = kWordChars + kSmallChars + 1;
 
-    /// As many stops as a fragment can reserve characters for.
+    /// The stop count cut to what a fragment can reserve characters for: its length must fit in an int.
     static int keptStops(int count) {
         constexpr int kMostStops = std::numeric_limits<int>::max() / kReservedStopChars - 10;
         return std::clamp(count, 0, kMostStops);

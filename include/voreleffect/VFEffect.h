@@ -120,7 +120,7 @@ class VF_API VFEffect {
 
     /// Makes a core that is not in the list; the caller owns it. Null for a type without a core, or when
     /// memory ran out.
-    VFECore* createEffect(int id, int type, VFECore* ignored);
+    [[nodiscard]] VFECore* createEffect(int id, int type, VFECore* ignored);
 
     int getNewEffectId();               ///< takes the next id from the counter
     VFECore* getEffect(int type);       ///< the core of that type, owned by the set, or null
@@ -188,7 +188,7 @@ class VF_API VFEffect {
     /// when memory runs out, or when records with absurd stop counts would make it longer than 2^28
     /// bytes. It follows the order of the list, which initEffect changes, so compare
     /// keys taken at the same point of the cycle. A pattern leaves no trace in it.
-    char* getMapKey();
+    [[nodiscard]] char* getMapKey();
 
     /// Registers the text fill in `color` (0xRRGGBB) at the text opacity, then the key.
     char* getMapKey(unsigned int color);
