@@ -12,18 +12,12 @@ namespace {
 
 /// One colour through the mask.
 template <class Rule>
-struct MaskPainter {
-    static constexpr bool kReadsImage = false;
-    static constexpr bool kReadsMask = true;
+struct MaskPainter : MaskReader {
     static constexpr bool kIsSparse = Rule::kIsSparse;
     static constexpr Empty kEmpty = Rule::kEmpty;
     Pixels colour;
     Pixels fullOverNothing;  ///< what full coverage paints over transparent pixels
 
-    template <int64_t kCount>
-    VOREL_INLINE bool isEmpty(const Place& place) const {
-        return hasEmptyMask<kCount>(place);
-    }
     VOREL_INLINE bool paintWhole(const Place& place) const {
         if (!hasFullMask(place) || !isClear<kBytes>(place.destination())) return false;
         for (int64_t x = 0; x < kBytes; x += kPixels)
@@ -35,18 +29,13 @@ struct MaskPainter {
     }
 };
 
-struct SolidPainter {
-    static constexpr bool kReadsImage = false;
-    static constexpr bool kReadsMask = true;
-    static constexpr bool kIsSparse = false;
-    static constexpr Empty kEmpty = Empty::keeps;
+struct SolidPainter : MaskReader {
     Pixels colour;
 
     template <int64_t>
     VOREL_INLINE bool isEmpty(const Place&) const {
         return false;
     }
-    VOREL_INLINE bool paintWhole(const Place&) const { return false; }
     VOREL_INLINE Pixels paint(const Place& place) const {
         return SolidColour::apply(loadAmounts(place.mask()), colour);
     }
@@ -54,17 +43,14 @@ struct SolidPainter {
 
 /// The image, whose pixels `Load` reads.
 template <class Rule, Pixels (*Load)(const uint8_t*)>
-struct ImagePainter {
+struct ImagePainter : MaskReader {
     static constexpr bool kReadsImage = true;
     static constexpr bool kReadsMask = false;
-    static constexpr bool kIsSparse = false;
-    static constexpr Empty kEmpty = Empty::keeps;
 
     template <int64_t kCount>
     VOREL_INLINE bool isEmpty(const Place& place) const {
         return isClear<kCount>(place.image());
     }
-    VOREL_INLINE bool paintWhole(const Place&) const { return false; }
     VOREL_INLINE Pixels paint(const Place& place) const {
         return Rule::apply(loadPixels(place.destination()), Load(place.image()));
     }
@@ -72,17 +58,10 @@ struct ImagePainter {
 
 /// The image of bytes R, G, B, A and the mask.
 template <class Rule>
-struct MaskedImagePainter {
+struct MaskedImagePainter : MaskReader {
     static constexpr bool kReadsImage = true;
-    static constexpr bool kReadsMask = true;
-    static constexpr bool kIsSparse = false;
     static constexpr Empty kEmpty = Rule::kEmpty;
 
-    template <int64_t kCount>
-    VOREL_INLINE bool isEmpty(const Place& place) const {
-        return hasEmptyMask<kCount>(place);
-    }
-    VOREL_INLINE bool paintWhole(const Place&) const { return false; }
     VOREL_INLINE Pixels paint(const Place& place) const {
         return Rule::apply(loadPixels(place.destination()), loadPixels(place.image()),
                            loadAmounts(place.mask()));
@@ -95,11 +74,11 @@ void blendMask(const BlendJob& job) {
     uint8_t full[kPixels];
     std::memset(full, 255, sizeof full);
     const Pixels fullOverNothing = Rule::apply(Pixels{}, loadAmounts(full), colour);
-    paintRows(MaskPainter<Rule>{colour, fullOverNothing}, job);
+    paintRows(MaskPainter<Rule>{{}, colour, fullOverNothing}, job);
 }
 
 void solidColour(const BlendJob& job) {
-    paintRows(SolidPainter{splatColour(job.color)}, job);
+    paintRows(SolidPainter{{}, splatColour(job.color)}, job);
 }
 
 template <class Rule, Pixels (*Load)(const uint8_t*)>

@@ -6,7 +6,7 @@
 #include "blend/blend_loops.h"
 #include "blend/rules.h"
 
-/// The row driver of all blending kernels: the loop over rows and pixels, empty stretches, and the tail.
+/// The row driver of all blending loops: over rows and pixels, empty stretches, and the tail.
 ///
 /// A painter gives the pixels that belong at a place of a row: `paint(place)`. It also tells empty
 /// stretches (`isEmpty<pixels>(place)`, kBytes or kPixels of them), which leave there what its kEmpty
@@ -16,7 +16,7 @@
 /// done so).
 namespace VFontEffect::internal::VOREL_LEVEL {
 
-/// The planes of one row; those that a kernel does not read may be null.
+/// The planes of one row; those that a painter does not read may be null.
 struct Row {
     uint8_t* destinationStart;
     const uint8_t* imageStart;
@@ -55,6 +55,20 @@ VOREL_INLINE bool isClear(const uint8_t* pixels) {
         all |= load<U8s>(pixels + i);
     return allZero(all);
 }
+
+/// What a painter says unless it says otherwise: the mask tells what is empty, and that stays.
+struct MaskReader {
+    static constexpr bool kReadsImage = false;
+    static constexpr bool kReadsMask = true;
+    static constexpr bool kIsSparse = false;
+    static constexpr Empty kEmpty = Empty::keeps;
+
+    template <int64_t kCount>
+    VOREL_INLINE bool isEmpty(const Place& place) const {
+        return hasEmptyMask<kCount>(place);
+    }
+    VOREL_INLINE bool paintWhole(const Place&) const { return false; }
+};
 
 /// Paints a whole stretch of kBytes pixels that is empty. What is clear already is not written: lines of
 /// the cache that stay as they are need not be written back.
@@ -116,8 +130,15 @@ VOREL_INLINE void paintStretches(const Painter& painter, const Row& row, int64_t
 constexpr bool kKeepsToLines = kPixels > 1 && kPixels < kBytes;
 
 /// The first and the last vector begin and end with the row, and the loop between them may keep to whole
-/// lines of the cache: the three overlap. So the two are computed from what the row held before, and
-/// stored when the loop is done.
+/// lines of the cache: the three overlap.
+///
+///     row        |abcdefghijklmnopqrstuvwxyz|
+///     first      |abcdefgh|
+///     loop           |efghijkl|mnopqrst|uvwxyz|..   from a line's start; the last may hang over
+///     last                         |stuvwxyz|
+///
+/// Blending the same pixel twice would change it. So the two are computed from what the row held before,
+/// and stored when the loop is done.
 template <class Painter>
 VOREL_INLINE void paintRow(const Painter& painter, const Row& row, int64_t count) {
     if (kPixels > 1 && count < kPixels) return paintShortRow(painter, row, count);

@@ -2,7 +2,7 @@
 
 #include "simd/pixels.h"
 
-/// Every per-pixel rule of the blending kernels, once, over vectors of pixels.
+/// Every per-pixel rule of blending, once, over vectors of pixels.
 ///
 /// Branches that the arithmetic takes by itself are not spelled out: product(x, 0) = 0,
 /// product(x, 255) = x and product(0, y) = 0, so a factor of 0 or 255 needs no case of its own.
@@ -59,8 +59,18 @@ struct DstOverGate {
 /// Colour under the destination, then the whole pixel times the mask. Deliberate: erases whatever lies
 /// where the mask is 0.
 ///
-/// Colour and alpha are multiplied by the mask after the sum, which may reach 510. A transparent
-/// destination takes the colour times the mask once.
+/// With p = product, m the mask, d the destination, s = p(colour, m) and i = 255 - d.alpha, the rule is
+/// told in five branches. One expression does for all of them,
+///
+///     min(p(d + p(s, i), m), 255)         with d = 0 and the last m = 255 where d.alpha is 0:
+///
+/// - m = 0: 0. So are s and p(0, i); d is times 0, or 0 itself where the last m is 255.
+/// - d.alpha = 0: s. There i = 255, and p(s, 255) = s, twice.
+/// - m = 255: min(d + p(colour, i), 255). There s = colour; of a sum of up to 255 p(sum, 255) is the
+/// sum, of a
+///   larger one 255 or more.
+/// - d.alpha = 255: p(d, m), of which the alpha is m. There i = 0, and p(255, m) = m.
+/// - otherwise: as it stands; the sum may reach 510.
 struct DstOverClip {
     static constexpr Empty kEmpty = Empty::clears;
     static constexpr bool kIsSparse = true;

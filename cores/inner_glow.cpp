@@ -8,21 +8,7 @@ namespace VFontEffect {
 
 using namespace internal;
 
-VFInnerGlow::VFInnerGlow() : mProperty(nullptr) {
-    mEffectType = kInnerGlow;
-}
-
-VFInnerGlow::~VFInnerGlow() {
-    releaseCopy(mProperty);
-}
-
-void VFInnerGlow::setProperty(VFProperty* property) {
-    replaceCopy(mProperty, property);
-}
-
-VFProperty* VFInnerGlow::getProperty() {
-    return mProperty;
-}
+VOREL_KEEPS_RECORD(VFInnerGlow, kInnerGlow)
 
 int VFInnerGlow::getOffset() {
     return glowReach(GlowRecord::of(mProperty));

@@ -30,21 +30,7 @@ bool meetsItself(const CoverageBox& box, int64_t radius, int64_t dx, int64_t dy)
 
 }  // namespace
 
-VFInnerShadow::VFInnerShadow() : mProperty(nullptr) {
-    mEffectType = kInnerShadow;
-}
-
-VFInnerShadow::~VFInnerShadow() {
-    releaseCopy(mProperty);
-}
-
-void VFInnerShadow::setProperty(VFProperty* property) {
-    replaceCopy(mProperty, property);
-}
-
-VFProperty* VFInnerShadow::getProperty() {
-    return mProperty;
-}
+VOREL_KEEPS_RECORD(VFInnerShadow, kInnerShadow)
 
 int VFInnerShadow::getOffset() {
     return 0;

@@ -5,8 +5,8 @@
 #include "cores/covered_fill.h"
 #include "cores/paint_input.h"
 #include "cores/property_copy.h"
-#include "ops/ramp/gradient_table.h"
 #include "ops/ramp/ramp_loops.h"
+#include "ops/ramp/stop_ramp.h"
 #include "voreleffect/VFECore.h"
 
 namespace VFontEffect {
@@ -27,21 +27,7 @@ float lengthAcross(float angle, float w, float h) {
 
 }  // namespace
 
-VFLinearGradient::VFLinearGradient() : mProperty(nullptr) {
-    mEffectType = kLinearGradient;
-}
-
-VFLinearGradient::~VFLinearGradient() {
-    releaseCopy(mProperty);
-}
-
-void VFLinearGradient::setProperty(VFProperty* property) {
-    replaceCopy(mProperty, property);
-}
-
-VFProperty* VFLinearGradient::getProperty() {
-    return mProperty;
-}
+VOREL_KEEPS_RECORD(VFLinearGradient, kLinearGradient)
 
 void VFLinearGradient::doPostProcessing(ParamPostProcessing* params) {
     const CoverageBox box = coverageOf(params);

@@ -8,21 +8,7 @@ namespace VFontEffect {
 
 using namespace internal;
 
-VFOuterGlow::VFOuterGlow() : mProperty(nullptr) {
-    mEffectType = kOuterGlow;
-}
-
-VFOuterGlow::~VFOuterGlow() {
-    releaseCopy(mProperty);
-}
-
-void VFOuterGlow::setProperty(VFProperty* property) {
-    replaceCopy(mProperty, property);
-}
-
-VFProperty* VFOuterGlow::getProperty() {
-    return mProperty;
-}
+VOREL_KEEPS_RECORD(VFOuterGlow, kOuterGlow)
 
 int VFOuterGlow::getOffset() {
     return glowReach(GlowRecord::of(mProperty));

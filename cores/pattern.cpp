@@ -27,21 +27,7 @@ CoverageBox fillBox(const VFECore::ParamPostProcessing* params) {
 
 }  // namespace
 
-VFPattern::VFPattern() : mProperty(nullptr) {
-    mEffectType = kPattern;
-}
-
-VFPattern::~VFPattern() {
-    releaseCopy(mProperty);
-}
-
-void VFPattern::setProperty(VFProperty* property) {
-    replaceCopy(mProperty, property);
-}
-
-VFProperty* VFPattern::getProperty() {
-    return mProperty;
-}
+VOREL_KEEPS_RECORD(VFPattern, kPattern)
 
 void VFPattern::doPostProcessing(ParamPostProcessing* params) {
     const CoverageBox box = fillBox(params);

@@ -117,3 +117,18 @@ bool replaceCopy(Record*& stored, const VFProperty* given) {
 }
 
 }  // namespace VFontEffect::internal
+
+/// Defines what all cores do alike that keep their record in `mProperty` and derive nothing from it.
+#define VOREL_KEEPS_RECORD(Core, type)             \
+    Core::Core() : mProperty(nullptr) {            \
+        mEffectType = type;                        \
+    }                                              \
+    Core::~Core() {                                \
+        releaseCopy(mProperty);                    \
+    }                                              \
+    void Core::setProperty(VFProperty* property) { \
+        replaceCopy(mProperty, property);          \
+    }                                              \
+    VFProperty* Core::getProperty() {              \
+        return mProperty;                          \
+    }

@@ -2,29 +2,15 @@
 #include "cores/covered_fill.h"
 #include "cores/paint_input.h"
 #include "cores/property_copy.h"
-#include "ops/ramp/gradient_table.h"
 #include "ops/ramp/ramp_loops.h"
+#include "ops/ramp/stop_ramp.h"
 #include "voreleffect/VFECore.h"
 
 namespace VFontEffect {
 
 using namespace internal;
 
-VFRadialGradient::VFRadialGradient() : mProperty(nullptr) {
-    mEffectType = kRadialGradient;
-}
-
-VFRadialGradient::~VFRadialGradient() {
-    releaseCopy(mProperty);
-}
-
-void VFRadialGradient::setProperty(VFProperty* property) {
-    replaceCopy(mProperty, property);
-}
-
-VFProperty* VFRadialGradient::getProperty() {
-    return mProperty;
-}
+VOREL_KEEPS_RECORD(VFRadialGradient, kRadialGradient)
 
 void VFRadialGradient::doPostProcessing(ParamPostProcessing* params) {
     const CoverageBox box = coverageOf(params);

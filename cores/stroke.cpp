@@ -43,21 +43,7 @@ class Outline {
 
 }  // namespace
 
-VFStroke::VFStroke() : mProperty(nullptr) {
-    mEffectType = kStroke;
-}
-
-VFStroke::~VFStroke() {
-    releaseCopy(mProperty);
-}
-
-void VFStroke::setProperty(VFProperty* property) {
-    replaceCopy(mProperty, property);
-}
-
-VFProperty* VFStroke::getProperty() {
-    return mProperty;
-}
+VOREL_KEEPS_RECORD(VFStroke, kStroke)
 
 int VFStroke::getOffset() {
     return mProperty != nullptr ? StrokeShape(*mProperty).reach : 0;

@@ -8,21 +8,7 @@ namespace VFontEffect {
 
 using namespace internal;
 
-VFText::VFText() : mProperty(nullptr) {
-    mEffectType = kText;
-}
-
-VFText::~VFText() {
-    releaseCopy(mProperty);
-}
-
-void VFText::setProperty(VFProperty* property) {
-    replaceCopy(mProperty, property);
-}
-
-VFProperty* VFText::getProperty() {
-    return mProperty;
-}
+VOREL_KEEPS_RECORD(VFText, kText)
 
 void VFText::doPostProcessing(ParamPostProcessing* params) {
     if (params == nullptr || mProperty == nullptr || params->dstBitmap == nullptr) return;

@@ -3,7 +3,7 @@
 #include "core/fixed_point.h"
 #include "simd/lanes.h"
 
-/// Packed pixels: one a 32-bit lane, multiplied as even and odd bytes in 16-bit halves.
+/// Packed pixels: one a 32-bit lane, multiplied as even and odd bytes in 16-bit lanes.
 namespace VFontEffect::internal::VOREL_LEVEL {
 
 constexpr int64_t kPixels = kU32Lanes;
@@ -12,7 +12,7 @@ struct Pixels {
     U8s bytes;
 };
 struct Amounts {
-    U16s halves;  // a pixel's amount in both halves of its word
+    U16s u16s;  // a pixel's amount in both 16-bit lanes of its word
 };
 
 constexpr uint16_t kEvenByte = 0x00FF;
@@ -54,7 +54,7 @@ VOREL_INLINE Amounts alphaOf(const Pixels& p) {
     return {highBytesInPairs(p.bytes)};
 }
 VOREL_INLINE Amounts inverse(Amounts a) {
-    return {a.halves ^ kEvenByte};
+    return {a.u16s ^ kEvenByte};
 }
 /// Whether all pixels are zeros.
 VOREL_INLINE bool isClear(const Pixels& p) {
@@ -66,13 +66,13 @@ VOREL_INLINE bool isClear(const Pixels& p) {
 using Where = __mmask16;  // one bit for each pixel
 
 VOREL_INLINE Where isZero(Amounts a) {
-    return _mm512_testn_epi32_mask(bitCast<__m512i>(a.halves), bitCast<__m512i>(a.halves));
+    return _mm512_testn_epi32_mask(bitCast<__m512i>(a.u16s), bitCast<__m512i>(a.u16s));
 }
 VOREL_INLINE Where isTransparent(const Pixels& p) {
     return _mm512_testn_epi32_mask(bitCast<__m512i>(p.bytes), bitCast<__m512i>(splat<U32s>(kAlphaByte)));
 }
 VOREL_INLINE Amounts raisedToFull(Where where, Amounts a) {
-    return {bitCast<U16s>(_mm512_mask_mov_epi32(bitCast<__m512i>(a.halves), where,
+    return {bitCast<U16s>(_mm512_mask_mov_epi32(bitCast<__m512i>(a.u16s), where,
                                                 bitCast<__m512i>(splat<U16s>(kEvenByte))))};
 }
 VOREL_INLINE Pixels kept(Where where, const Pixels& p) {
@@ -87,13 +87,13 @@ VOREL_INLINE Pixels cleared(Where where, const Pixels& p) {
 using Where = U32s;  // all ones or all zeros for each pixel
 
 VOREL_INLINE Where isZero(Amounts a) {
-    return bitCast<Where>(a.halves == 0);
+    return bitCast<Where>(a.u16s == 0);
 }
 VOREL_INLINE Where isTransparent(const Pixels& p) {
     return bitCast<Where>(bitCast<U32s>(p.bytes) >> 24 == 0);
 }
 VOREL_INLINE Amounts raisedToFull(Where where, Amounts a) {
-    return {a.halves | (bitCast<U16s>(where) & kEvenByte)};
+    return {a.u16s | (bitCast<U16s>(where) & kEvenByte)};
 }
 VOREL_INLINE Pixels kept(Where where, const Pixels& p) {
     return {p.bytes & bitCast<U8s>(where)};
@@ -116,21 +116,21 @@ VOREL_INLINE U16s oddBytes(const Pixels& p) {
 }
 
 VOREL_INLINE Pixels scaled(const Pixels& p, Amounts amounts) {
-    const U16s even = product(evenBytes(p), amounts.halves);
-    const U16s odd = (oddBytes(p) + 1) * amounts.halves;
+    const U16s even = product(evenBytes(p), amounts.u16s);
+    const U16s odd = (oddBytes(p) + 1) * amounts.u16s;
     return {bitCast<U8s>(even | (odd & kOddByte))};
 }
 
 /// min(product(a + b, amount), 255), where a + b may reach 510 and the product 17 bits: the amount
 /// stands in the upper byte, and the upper half of the 32-bit product is the result.
 VOREL_INLINE Pixels scaledSum(const Pixels& a, const Pixels& b, Amounts amounts) {
-    const U16s factor = amounts.halves << 8;
-    const auto scaledHalves = [factor](U16s x, U16s y) {
+    const U16s factor = amounts.u16s << 8;
+    const auto scaledLanes = [factor](U16s x, U16s y) {
         const U16s result = multiplyHigh(x + y + 1, factor);
         return bitCast<U16s>(min(bitCast<I16s>(result), splat<I16s>(int16_t{255})));
     };
-    const U16s even = scaledHalves(evenBytes(a), evenBytes(b));
-    const U16s odd = scaledHalves(oddBytes(a), oddBytes(b));
+    const U16s even = scaledLanes(evenBytes(a), evenBytes(b));
+    const U16s odd = scaledLanes(oddBytes(a), oddBytes(b));
     return {bitCast<U8s>(even | odd << 8)};
 }
 

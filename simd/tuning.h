@@ -4,12 +4,12 @@
 
 #include "simd/lanes.h"
 
-/// Numbers that depend on the level: which method suits what, and how much is done at a time. None of them
-/// changes a byte. How each was measured stands beside it; docs/benchmarks.md has the figures.
+/// Numbers that depend on the level: which method suits what, and how much is done at a time. None of
+/// them changes a byte. How each was measured stands beside it; docs/benchmarks.md has the figures.
 namespace VFontEffect::internal::VOREL_LEVEL {
 
-// Vectors of taps that the blur's dot products take at a time, each for four results: of 32 registers half
-// are sums.
+// Vectors of taps that the blur's dot products take at a time, each for four results: of 32 registers
+// half are sums.
 #if defined(VOREL_MASK_REGISTERS) || defined(VOREL_PLANAR_PIXELS)
 constexpr int kGridVectors = 4;
 #else
@@ -24,8 +24,8 @@ constexpr int kStepsAtOnce = 4;
 constexpr int kStepsAtOnce = 1;
 #endif
 
-// Up to this radius dot products take less time than differences of the weights, which cost about the same
-// whatever the radius.
+// Up to this radius dot products take less time than differences of the weights, which cost about the
+// same whatever the radius.
 #if defined(VOREL_DOT_PRODUCTS) && defined(VOREL_PLANAR_PIXELS)
 constexpr int kLargestDotRadius = INT_MAX;
 #elif defined(VOREL_DOT_PRODUCTS)
@@ -36,8 +36,8 @@ constexpr int kLargestDotRadius = 20;
 constexpr int kLargestDotRadius = 15;
 #endif
 
-// Up to this reach of the disc a dilation by spreading takes less time than one by tiles, whose vectors are
-// short: measured at 16 and 64 bytes.
+// Up to this reach of the disc a dilation by spreading takes less time than one by tiles, whose vectors
+// are short: measured at 16 and 64 bytes.
 constexpr int64_t kLongestSpreadReach = 8 + kBytes / 8;
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

@@ -81,7 +81,7 @@ VOREL_INLINE I32s clamped(I32s value, int32_t low, int32_t high) {
     return max(min(value, splat<I32s>(high)), splat<I32s>(low));
 }
 
-/// Two bytes of each word, one in each of its halves.
+/// Two bytes of each word, one in each of its 16-bit lanes.
 constexpr uint32_t kEvenBytes = 0x00FF00FFU;
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

@@ -49,6 +49,27 @@ struct BlurInput {
     }
 };
 
+/// The part of a source that the results in a window depend on, and its place in the source.
+struct ReachedSource {
+    CoverageRows part;
+    int64_t left = 0;
+    int64_t top = 0;
+
+    static ReachedSource of(const BlurInput& input) {
+        const Box reach =
+            intersection(expanded(input.window, input.weights.radius), wholeOf(input.source));
+        ReachedSource reached = {input.source};
+        reached.part.width = reached.part.height = 0;
+        if (reach.empty()) return reached;
+        reached.part.start += reach.top * input.source.stride + reach.left;
+        reached.part.width = reach.width();
+        reached.part.height = reach.height();
+        reached.left = reach.left;
+        reached.top = reach.top;
+        return reached;
+    }
+};
+
 /// Rows of results, `stride` bytes apart.
 struct BlurredRows {
     uint8_t* values;

@@ -29,8 +29,8 @@ int64_t cellsOf(int radius) {
     return 2 * int64_t{radius} + 1 + kOrder;
 }
 
-/// The difference as it applies to the taps from distance -radius - kOrder on: what a running sum
-/// changes by, changes by.
+/// The difference as it applies to the taps from distance -radius - kOrder on: what a sum
+/// changes by from result to result, changes by.
 void fillDifference(const BlurWeights& weights, int32_t* cells) {
     const int64_t count = cellsOf(weights.radius);
     for (int64_t i = 0; i < count; ++i) {
@@ -118,7 +118,7 @@ DifferenceBlur::DifferenceBlur(const DifferenceLoops& loops, const BlurInput& in
       mRadius(input.weights.radius),
       mTotal(input.weights.total),
       mSide(loops.vectorBytes),
-      mSource(ReachedSource::of(input.source, mRadius, mWindow)),
+      mSource(ReachedSource::of(input)),
       mLayout(Layout::of(input, mSource, mSide)),
       mTerms(loops, input.weights),
       mLines(kLinesOfRow * kLinePixelBytes * mSide,

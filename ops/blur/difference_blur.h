@@ -8,7 +8,6 @@
 #include "core/pixel_buffer.h"
 #include "ops/blur/blur_input.h"
 #include "ops/blur/difference_loops.h"
-#include "ops/blur/reached_source.h"
 
 namespace VFontEffect::internal {
 

@@ -42,7 +42,7 @@ namespace {
 constexpr int64_t kLineBytes = kLinePixelBytes * kBytes;
 constexpr int64_t kRowBytes = kLinesOfRow * kLineBytes;
 
-/// The halves of a line.
+/// A line: the lower and the upper half of a vector's pixels.
 struct Line {
     U16s left;
     U16s right;
@@ -72,12 +72,12 @@ struct RowExtent {
     int64_t end;
 
     static RowExtent of(const SourceStrip& strip) {
-        RowExtent ink = {0, strip.height};
-        while (ink.first < ink.end && allZero(strip.row(ink.first)))
-            ++ink.first;
-        while (ink.end > ink.first && allZero(strip.row(ink.end - 1)))
-            --ink.end;
-        return ink;
+        RowExtent covered = {0, strip.height};
+        while (covered.first < covered.end && allZero(strip.row(covered.first)))
+            ++covered.first;
+        while (covered.end > covered.first && allZero(strip.row(covered.end - 1)))
+            --covered.end;
+        return covered;
     }
 };
 
@@ -92,13 +92,14 @@ struct Rows {
     }
 };
 
-/// Stores the ink's taps, and the pairs from `distance` rows before them on; around them zeros, as far
-/// as four results at a time reach.
-Rows filledRows(const SourceStrip& strip, const RowExtent& ink, const TapPairs& pairs, uint8_t* lines) {
-    const Rows rows = {lines, ink.first - (pairs.distance + kDifferenceRows - 1)};
-    rows.clear(rows.top, ink.first);
-    rows.clear(ink.end, ink.end + kDifferenceRows - 1);
-    for (int64_t y = ink.first; y < ink.end; ++y) {
+/// Stores the covered rows' taps, and the pairs from `distance` rows before them on; around them zeros,
+/// as far as four results at a time reach.
+Rows filledRows(const SourceStrip& strip, const RowExtent& covered, const TapPairs& pairs,
+                uint8_t* lines) {
+    const Rows rows = {lines, covered.first - (pairs.distance + kDifferenceRows - 1)};
+    rows.clear(rows.top, covered.first);
+    rows.clear(covered.end, covered.end + kDifferenceRows - 1);
+    for (int64_t y = covered.first; y < covered.end; ++y) {
         const U8s row = strip.row(y);
         const Line taps = {bitCast<U16s>(interleaveLow(row, U8s{})),
                            bitCast<U16s>(interleaveHigh(row, U8s{}))};
@@ -113,14 +114,14 @@ Rows filledRows(const SourceStrip& strip, const RowExtent& ink, const TapPairs& 
         pair.storeAt(earlier + kLineBytes);
     }
     // The last taps have no partners.
-    for (int64_t y = ink.end - pairs.distance; y < ink.end; ++y)
+    for (int64_t y = covered.end - pairs.distance; y < covered.end; ++y)
         Line::at(rows.at(y)).storeAt(rows.at(y) + kLineBytes);
     return rows;
 }
 
 // --- Sums -------------------------------------------------------------------------------------------
 
-/// The terms of one sign that meet ink: as the results go by, the ones further and further up.
+/// The terms of one sign that meet covered rows: as the results go by, the ones further and further up.
 class TermRange {
   public:
     explicit TermRange(const TermList& terms)
@@ -166,23 +167,23 @@ struct FourLines {
 
 class StripSum {
   public:
-    StripSum(const DifferencePass& pass, const Rows& rows, int64_t inkEnd)
+    StripSum(const DifferencePass& pass, const Rows& rows, int64_t coveredEnd)
         : mRows(rows),
-          mInkEnd(inkEnd),
+          mCoveredEnd(coveredEnd),
           mAdded(pass.terms.added),
           mTakenAway(pass.terms.takenAway),
           mFirst{},
           mInverse(splat<F32s>(pass.inverse)),
           mInvertMask(splat<U8s>(pass.ending.invertMask)) {
         const uint32_t rounding = pass.ending.roundsUp ? pass.total - 1 : 0;
-        for (U32s& words : mSums)
-            words = splat<U32s>(kNumberBias + rounding);
+        for (U32s& sum : mSums)
+            sum = splat<U32s>(kNumberBias + rounding);
     }
 
     /// The next four rows of results, from row y on.
     __attribute__((noinline)) void next(int64_t y, U8s* rows) {
         const int64_t row = (y - mRows.top) * kRowBytes;
-        const int64_t end = (mInkEnd - y) * kRowBytes;
+        const int64_t end = (mCoveredEnd - y) * kRowBytes;
         mAdded.moveTo(-row, end);
         mTakenAway.moveTo(-row, end);
         FourLines four = {};
@@ -206,11 +207,11 @@ class StripSum {
         mSums[kFirst + 1] += extended(interleaveHigh(change, change));
         return pack(quotient(mSums[kFirst], mInverse), quotient(mSums[kFirst + 1], mInverse));
     }
-    /// U16s that stand in both halves of their words, with their signs.
+    /// 16-bit lanes that stand twice in each word, as words with their signs.
     static VOREL_INLINE U32s extended(U16s twice) { return bitCast<U32s>(bitCast<I32s>(twice) >> 16); }
 
     Rows mRows;
-    int64_t mInkEnd;
+    int64_t mCoveredEnd;
     TermRange mAdded;
     TermRange mTakenAway;
     Line mFirst;  // the first difference of the row before
@@ -285,11 +286,12 @@ void blurStrip(const DifferencePass& pass, const CoverageRows& source, int64_t x
                int64_t first, int64_t count, const SquareRows& out) {
     const SourceStrip strip = SourceStrip::of(source, x);
     VOREL_ASSERT(reinterpret_cast<uintptr_t>(lines) % kBytes == 0);
-    const RowExtent ink = RowExtent::of(strip);
-    const bool isEmpty = ink.first >= ink.end;
-    StripSum sums(pass, isEmpty ? Rows{} : filledRows(strip, ink, pass.terms.pairs, lines), ink.end);
-    const int64_t begin = ink.first - pass.radius;
-    const int64_t end = ink.end + pass.radius;
+    const RowExtent covered = RowExtent::of(strip);
+    const bool isEmpty = covered.first >= covered.end;
+    StripSum sums(pass, isEmpty ? Rows{} : filledRows(strip, covered, pass.terms.pairs, lines),
+                  covered.end);
+    const int64_t begin = covered.first - pass.radius;
+    const int64_t end = covered.end + pass.radius;
     U8s rows[kBytes];
     int64_t y = first;
     // Results that nobody wants, but that the following ones build on.

@@ -12,7 +12,7 @@
 namespace VFontEffect::internal {
 namespace {
 
-/// U8s of a row that whole vectors are written to.
+/// Bytes of a row that whole vectors are written to.
 int64_t strideFor(int64_t width) {
     return roundedUp(width, kWidestVector);
 }
@@ -65,8 +65,8 @@ PackedWeights::PackedWeights(const DotLoops& loops, const BlurWeights& weights)
 
 // --- Working memory -------------------------------------------------------------------------------
 
-// A narrow blur reads all the groups around its results. A wide one leaves out groups without ink, and
-// so there is no need to store those that lie wholly above or below the rows.
+// A narrow blur reads all the groups around its results. A wide one leaves out groups without coverage,
+// and so there is no need to store those that lie wholly above or below the rows.
 GroupRange GroupRange::needed(const PackedWeights& weights, int64_t height, int64_t firstRow,
                               int64_t quads) {
     const int64_t end = quads - 1 + tapSteps(weights->radius);
@@ -83,11 +83,11 @@ TapGroups::TapGroups(const DotLoops& loops, const PackedWeights& weights, int64_
       mStrips(roundedUp(width, loops.vectorBytes) / loops.vectorBytes),
       mGroupBytes(kQuad * loops.vectorBytes * weights.pixelBytes()),
       mMemory(mGroupBytes * mCapacity, mStrips),
-      mInked(PixelBuffer<int32_t>::zeroed(mStrips, 2)) {
+      mCovered(PixelBuffer<int32_t>::zeroed(mStrips, 2)) {
     if (!*this) return;
     mColumns = {mMemory.data(), mGroupBytes * mCapacity, mMissing.first,
-                width,          mInked.data(),           mInked.data() + mStrips};
-    std::fill_n(mColumns.lastInked, mStrips, -1);
+                width,          mCovered.data(),         mCovered.data() + mStrips};
+    std::fill_n(mColumns.lastCovered, mStrips, -1);
 }
 
 /// Makes room behind the groups from `group` on.
@@ -103,13 +103,13 @@ void TapGroups::forgetBefore(int64_t group) {
 }
 
 IntermediateBuffer::IntermediateBuffer(const DotLoops& loops, const PackedWeights& weights,
-                                       int64_t inkColumn, int64_t columns, const FullColumns& full)
+                                       int64_t coveredColumn, int64_t columns, const FullColumns& full)
     : mStrideBytes((strideFor(columns) + 2 * kIntermediateMargin) * weights.pixelBytes()),
       mPixels(mStrideBytes, kQuad),
-      mInked(PixelBuffer<uint8_t>::zeroed(strideFor(columns) / loops.vectorBytes)) {
+      mCovered(PixelBuffer<uint8_t>::zeroed(strideFor(columns) / loops.vectorBytes)) {
     if (!*this || !weights) return;
     uint8_t* const start = mPixels.data() + kIntermediateMargin * weights.pixelBytes();
-    mRows = {start, mStrideBytes, columns, inkColumn, full.before, full.from, mInked.data()};
+    mRows = {start, mStrideBytes, columns, coveredColumn, full.before, full.from, mCovered.data()};
     loops.clear(*weights, mRows);
 }
 
@@ -121,7 +121,7 @@ DotBlur::DotBlur(const DotLoops& loops, const BlurInput& input)
       mFirst(input.first),
       mSecond(input.second),
       mWeights(loops, input.weights),
-      mSource(ReachedSource::of(input.source, input.weights.radius, mWindow)),
+      mSource(ReachedSource::of(input)),
       mFirstRow(mWindow.top - input.weights.radius - mSource.top),
       mStride(strideFor(mWindow.width())),
       mAcross(input.order == BlurInput::Order::acrossThenDown
@@ -140,12 +140,12 @@ IntermediateBuffer DotBlur::intermediateFor(const FullColumns& full) {
     const int64_t width = mSource.part.width;
     if (full.before <= reach.left && full.from >= reach.right)
         return {mLoops, mWeights, 0, width, {0, width}};
-    const int64_t inkColumn =
+    const int64_t coveredColumn =
         roundedUp(std::max<int64_t>(0, mIntermediateLeft - reach.left), kWidestVector);
-    mIntermediateLeft -= inkColumn;
+    mIntermediateLeft -= coveredColumn;
     return {mLoops,
             mWeights,
-            inkColumn,
+            coveredColumn,
             reach.right - mIntermediateLeft,
             {full.before - mIntermediateLeft, full.from - mIntermediateLeft}};
 }

@@ -8,7 +8,6 @@
 #include "core/pixel_buffer.h"
 #include "ops/blur/blur_input.h"
 #include "ops/blur/dot_loops.h"
-#include "ops/blur/reached_source.h"
 
 namespace VFontEffect::internal {
 
@@ -21,7 +20,7 @@ class PackedWeights {
     const PackedBlur& operator*() const { return mBlur; }
     const PackedBlur* operator->() const { return &mBlur; }
 
-    /// U8s of a pixel in a row between the passes.
+    /// Bytes of a pixel in a row between the passes.
     int64_t pixelBytes() const { return mBlur.isNarrow ? kNarrowPixelBytes : 1; }
 
   private:
@@ -47,7 +46,7 @@ class TapGroups {
     TapGroups(const DotLoops& loops, const PackedWeights& weights, int64_t width, int64_t height,
               int64_t firstRow, int64_t quads);
 
-    explicit operator bool() const { return mMemory && mInked; }
+    explicit operator bool() const { return mMemory && mCovered; }
     const TapColumns& columns() const { return mColumns; }
 
     /// Calls feed(group) for each group that is still missing for a quad of results.
@@ -72,23 +71,23 @@ class TapGroups {
     int64_t mStrips;
     int64_t mGroupBytes;
     LineBuffer mMemory;
-    PixelBuffer<int32_t> mInked;
+    PixelBuffer<int32_t> mCovered;
     TapColumns mColumns = {};
 };
 
 /// Four rows that are blurred across.
 class IntermediateBuffer {
   public:
-    IntermediateBuffer(const DotLoops& loops, const PackedWeights& weights, int64_t inkColumn,
+    IntermediateBuffer(const DotLoops& loops, const PackedWeights& weights, int64_t coveredColumn,
                        int64_t columns, const FullColumns& full);
 
-    explicit operator bool() const { return mPixels && mInked; }
+    explicit operator bool() const { return mPixels && mCovered; }
     const IntermediateRows& rows() const { return mRows; }
 
   private:
     int64_t mStrideBytes;
     LineBuffer mPixels;
-    PixelBuffer<uint8_t> mInked;
+    PixelBuffer<uint8_t> mCovered;
     IntermediateRows mRows = {};
 };
 

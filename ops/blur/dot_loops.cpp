@@ -19,14 +19,14 @@
 /// that is loaded feeds four sums, and every four weights feed several vectors.
 ///
 /// Up to a radius of 3 sums fit in 16 bits. Where no instruction makes a dot product of bytes, taps are
-/// widened to halves there, those at +k and -k are added before the product, and the division is one by
+/// widened to 16 bits there, those at +k and -k are added before the product, and the division is one by
 /// multiplication in 16 bits.
 ///
 /// Exactness: sums are whole numbers and wrap nowhere: 255 times the total stays below 2^23. Their
 /// quotients are whole (quotients.h).
 ///
 /// Cost: (2R + 1) / (taps in a vector) instructions a pixel and pass, over the rows and columns only
-/// that hold ink; what lies beyond them is neither read nor stored.
+/// that hold coverage; what lies beyond them is neither read nor stored.
 namespace VFontEffect::internal::VOREL_LEVEL {
 namespace {
 
@@ -65,7 +65,7 @@ struct Group {
             group.rows[i] = strip.has(y + i) ? strip.row(y + i) : U8s{};
         return group;
     }
-    VOREL_INLINE bool isInked() const { return !allZero(rows[0] | rows[1] | rows[2] | rows[3]); }
+    VOREL_INLINE bool isCovered() const { return !allZero(rows[0] | rows[1] | rows[2] | rows[3]); }
 };
 
 // --- The two methods: how groups are stored, summed and divided ---------------------------------------
@@ -85,7 +85,7 @@ struct DotMethod {
                 splat<F32s>(blur.inverse)};
     }
 
-    /// U32s of four taps: the columns 0-3 of each 16, then 4-7, 8-11 and 12-15.
+    /// Words of four taps: the columns 0-3 of each 16, then 4-7, 8-11 and 12-15.
     static VOREL_INLINE void storeGroup(const Group& group, uint8_t* to) {
         const U16s low01 = bitCast<U16s>(interleaveLow(group.rows[0], group.rows[1]));
         const U16s high01 = bitCast<U16s>(interleaveHigh(group.rows[0], group.rows[1]));
@@ -157,7 +157,7 @@ struct DotMethod {
     /// Four rows of results; `group(step)` is where the taps of a step are.
     template <class GroupAt, class Store>
     VOREL_INLINE void quadDown(const Range& steps, GroupAt groupAt, Store store) const {
-        U16s halves[2][kQuad];
+        U16s results[2][kQuad];
         unrolled<4 / kGridVectors>([&](auto part) VOREL_INLINE_LAMBDA {
             constexpr int kVector = part.value * kGridVectors;
             const uint8_t* const from = groupAt(steps.first) + kVector * kBytes;
@@ -165,14 +165,14 @@ struct DotMethod {
             unrolled<kGridVectors / 2>([&](auto pair) VOREL_INLINE_LAMBDA {
                 constexpr int kPair = pair.value * 2;
                 unrolled<kQuad>([&](auto j) VOREL_INLINE_LAMBDA {
-                    halves[(kVector + kPair) / 2][j.value] =
+                    results[(kVector + kPair) / 2][j.value] =
                         pack(quotient(grid.sums[kPair][j.value], inverse),
                              quotient(grid.sums[kPair + 1][j.value], inverse));
                 });
             });
         });
         unrolled<kQuad>([&](auto j) VOREL_INLINE_LAMBDA {
-            store(j.value, pack(halves[0][j.value], halves[1][j.value]));
+            store(j.value, pack(results[0][j.value], results[1][j.value]));
         });
     }
 
@@ -293,17 +293,18 @@ void feed(const PackedBlur&, const CoverageRows& source, int64_t row, const TapC
     for (int64_t strip = 0; strip * kBytes < columns.width; ++strip) {
         const Group group = Group::of(SourceStrip::of(source, strip * kBytes), row);
         Method::storeGroup(group, groupAt<Method>(columns, strip, index));
-        if (!group.isInked()) continue;
+        if (!group.isCovered()) continue;
         const auto number = static_cast<int32_t>(index);
-        if (columns.lastInked[strip] < columns.firstInked[strip]) columns.firstInked[strip] = number;
-        columns.lastInked[strip] = number;
+        if (columns.lastCovered[strip] < columns.firstCovered[strip])
+            columns.firstCovered[strip] = number;
+        columns.lastCovered[strip] = number;
     }
 }
 
-/// The steps of a quad of results that reach inked groups of a strip.
-VOREL_INLINE Range inkedSteps(const TapColumns& columns, int64_t strip, int64_t quad, int radius) {
-    return {max<int64_t>(0, columns.firstInked[strip] - quad),
-            min<int64_t>(tapSteps(radius), columns.lastInked[strip] + 1 - quad)};
+/// The steps of a quad of results that reach covered groups of a strip.
+VOREL_INLINE Range coveredSteps(const TapColumns& columns, int64_t strip, int64_t quad, int radius) {
+    return {max<int64_t>(0, columns.firstCovered[strip] - quad),
+            min<int64_t>(tapSteps(radius), columns.lastCovered[strip] + 1 - quad)};
 }
 
 /// Calls store(strip, j, row) for each of the four rows of each strip.
@@ -313,7 +314,7 @@ VOREL_INLINE void quadDown(const Method& method, const TapColumns& columns, int6
     for (int64_t strip = 0; strip * kBytes < columns.width; ++strip) {
         const auto storeRow = [&](int j, const typename Method::Row& row)
                                   VOREL_INLINE_LAMBDA { store(strip, j, row); };
-        const Range steps = inkedSteps(columns, strip, quad, radius);
+        const Range steps = coveredSteps(columns, strip, quad, radius);
         if (steps.empty()) {
             for (int j = 0; j < kQuad; ++j)
                 storeRow(j, typename Method::Row{});
@@ -353,17 +354,19 @@ void fillFullColumns(const IntermediateRows& intermediate) {
                              0xFF);
     for (int64_t x = 0; x < intermediate.columns; x += kBytes) {
         if (x < intermediate.fullBefore || x + kBytes > intermediate.fullFrom)
-            intermediate.inked[x / kBytes] = 1;
+            intermediate.covered[x / kBytes] = 1;
     }
 }
 
 template <class Method>
 void down(const PackedBlur& blur, const TapColumns& columns, int64_t quad,
           const IntermediateRows& intermediate) {
-    std::memset(intermediate.inked, 0, static_cast<size_t>(wholeVectors(intermediate.columns) / kBytes));
-    const int64_t firstStrip = intermediate.inkColumn / kBytes;
+    std::memset(intermediate.covered, 0,
+                static_cast<size_t>(wholeVectors(intermediate.columns) / kBytes));
+    const int64_t firstStrip = intermediate.coveredColumn / kBytes;
     for (int64_t strip = 0; strip * kBytes < columns.width; ++strip)
-        intermediate.inked[firstStrip + strip] = !inkedSteps(columns, strip, quad, blur.radius).empty();
+        intermediate.covered[firstStrip + strip] =
+            !coveredSteps(columns, strip, quad, blur.radius).empty();
     quadDown(Method::of(blur, false), columns, quad, blur.radius,
              [&](int64_t strip, int j, const typename Method::Row& row) VOREL_INLINE_LAMBDA {
                  Method::storeIntermediate(
@@ -387,7 +390,7 @@ void copy(const PackedBlur&, const CoverageRows& source, int64_t row,
           const IntermediateRows& intermediate) {
     for (int64_t x = 0; x < source.width; x += kBytes) {
         const Group group = Group::of(SourceStrip::of(source, x), row);
-        intermediate.inked[x / kBytes] = group.isInked();
+        intermediate.covered[x / kBytes] = group.isCovered();
         for (int j = 0; j < kQuad; ++j)
             Method::storeIntermediate(Method::rowOf(group.rows[j]),
                                       intermediateAt<Method>(intermediate, x, j));
@@ -396,16 +399,16 @@ void copy(const PackedBlur&, const CoverageRows& source, int64_t row,
 
 // --- Across -------------------------------------------------------------------------------------------
 
-/// The steps of four taps, for a vector of results from column x on, that reach an inked vector.
-VOREL_INLINE Range inkedSteps(const IntermediateRows& intermediate, int64_t x, int radius) {
+/// The steps of four taps, for a vector of results from column x on, that reach a covered vector.
+VOREL_INLINE Range coveredSteps(const IntermediateRows& intermediate, int64_t x, int radius) {
     const int64_t firstTap = x - radius;
     const int64_t lastTap = min<int64_t>(x + kBytes - 1 + radius, intermediate.columns - 1);
     if (lastTap < 0) return {0, 0};
     int64_t first = max<int64_t>(firstTap, 0) / kBytes;
     int64_t last = lastTap / kBytes;
-    while (first <= last && intermediate.inked[first] == 0)
+    while (first <= last && intermediate.covered[first] == 0)
         ++first;
-    while (last >= first && intermediate.inked[last] == 0)
+    while (last >= first && intermediate.covered[last] == 0)
         --last;
     if (first > last) return {0, 0};
     // Step s reads a vector from firstTap + 4 s on.
@@ -422,7 +425,7 @@ void across(const PackedBlur& blur, const IntermediateRows& intermediate, int64_
         const auto storeRow = [&](int j, U8s row) VOREL_INLINE_LAMBDA {
             store(out.start + j * out.stride + (x - left), row ^ out.ending.invertMask);
         };
-        const Range steps = inkedSteps(intermediate, x, blur.radius);
+        const Range steps = coveredSteps(intermediate, x, blur.radius);
         if (steps.empty()) {
             for (int j = 0; j < kQuad; ++j)
                 storeRow(j, U8s{});
@@ -448,7 +451,7 @@ void fillCells(const uint32_t* weights, int radius, uint8_t* cells) {
     }
 }
 
-/// The form of a kernel that suits the blur; where it sums in 32 bits always there is one only.
+/// The form of a loop that suits the blur; where it sums in 32 bits always there is one only.
 template <auto kNarrow, auto kWide, class... Arguments>
 void chosen(const PackedBlur& blur, Arguments... arguments) {
     if constexpr (!kHasDotProducts) {

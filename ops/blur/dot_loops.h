@@ -61,24 +61,24 @@ struct TapColumns {
     int64_t stripStride;  // bytes
     int64_t firstGroup;
     int64_t width;
-    int32_t* firstInked;  // for each strip the first and the last group that has anything but 0
-    int32_t* lastInked;
+    int32_t* firstCovered;  // for each strip the first and the last group that has anything but 0
+    int32_t* lastCovered;
 };
 
 /// Four rows between the passes, `columns` wide; what lies beyond counts as 0. The columns from
-/// `inkColumn` on are those of the pass before, the others are 0, or 255 before column `fullBefore` and
-/// from `fullFrom` on. For every vector of columns `inked` tells whether there is anything but 0.
+/// `coveredColumn` on are those of the pass before, the others are 0, or 255 before column `fullBefore`
+/// and from `fullFrom` on. For every vector of columns `covered` tells whether there is anything but 0.
 struct IntermediateRows {
     uint8_t* start;  // of row 0, column 0
     int64_t strideBytes;
     int64_t columns;
-    int64_t inkColumn;  // a multiple of kWidestVector
+    int64_t coveredColumn;  // a multiple of kWidestVector
     int64_t fullBefore;
     int64_t fullFrom;
-    uint8_t* inked;
+    uint8_t* covered;
 };
 
-/// U8s of a pixel in the taps of a narrow blur and between its passes; others have 1.
+/// Bytes of a pixel in the taps of a narrow blur and between its passes; others have 1.
 constexpr int64_t kNarrowPixelBytes = 2;
 
 /// Plain rows of results. They are written in whole vectors: up to kWidestVector - 1 bytes too many.
@@ -98,7 +98,7 @@ struct DotLoops {
     int largestDotRadius;
     /// Whether the level sums in 16 bits where that suffices.
     bool hasNarrow;
-    /// U8s of a weight's cell.
+    /// Bytes of a weight's cell.
     int64_t cellBytes;
     /// Makes the cells of the weights at distances 0 to radius and of the zeros around them.
     void (*fillCells)(const uint32_t* weights, int radius, uint8_t* cells);

@@ -3,9 +3,11 @@
 #include <cstdint>
 
 #include "ops/dilate/padded_rows.h"
+#include "simd/unrolled.h"
 
 /// Dilation by the smallest discs, of a reach of up to 2: each cell is a load of its own, and the cells
-/// at one distance, which weigh the same, share a subtraction.
+/// that weigh the same, those a disc maps to one another when it is turned or mirrored, share a
+/// subtraction.
 ///
 /// Cost: 9 loads a vector for a reach of 1, 25 for one of 2. Telling empty stretches would cost as much.
 namespace VFontEffect::internal::VOREL_LEVEL {
@@ -22,70 +24,47 @@ struct CellLayout {
 };
 
 /// 255 - weight of the cells that lie that far aside.
-VOREL_INLINE U8s cellDeficit(const DiscShape& disc, int dx, int dy) {
-    uint8_t deficit = 255;
-    if (dx <= disc.flatReach[dy]) {
-        deficit = 0;
-    } else if (dx <= disc.outerReach[dy]) {
-        deficit = disc.rimDeficit[disc.rimStart[dy] + dx - disc.flatReach[dy] - 1];
-    }
-    return splat<U8s>(deficit);
+inline uint8_t cellDeficit(const DiscShape& disc, int dx, int dy) {
+    if (dx <= disc.flatReach[dy]) return 0;
+    if (dx > disc.outerReach[dy]) return 255;
+    return disc.rimDeficit[disc.rimStart[dy] + dx - disc.flatReach[dy] - 1];
 }
 
-/// The largest of the four pixels that lie dx columns and dy rows aside.
-VOREL_INLINE U8s mirrored(const uint8_t* source, int64_t dx, int64_t dy) {
-    const U8s right = max(load<U8s>(source + dx + dy), load<U8s>(source + dx - dy));
-    const U8s left = max(load<U8s>(source - dx + dy), load<U8s>(source - dx - dy));
-    return max(right, left);
+/// The largest of the pixels that lie dx columns and dy rows aside, on all sides.
+template <int kDx, int kDy>
+VOREL_INLINE U8s mirrored(const uint8_t* source, int64_t stride) {
+    const uint8_t* const below = source + kDy * stride;
+    if constexpr (kDx == 0 && kDy == 0) return load<U8s>(source);
+    if constexpr (kDy == 0) return max(load<U8s>(source - kDx), load<U8s>(source + kDx));
+    const uint8_t* const above = source - kDy * stride;
+    if constexpr (kDx == 0) return max(load<U8s>(above), load<U8s>(below));
+    return max(max(load<U8s>(above - kDx), load<U8s>(above + kDx)),
+               max(load<U8s>(below - kDx), load<U8s>(below + kDx)));
 }
 
-/// A disc of one cell.
-struct CentreCell {
-    static constexpr int kReach = 0;
-    U8s centre;
+/// A disc of that reach, by its cells (dx, dy) of an eighth: 0 <= dy <= dx.
+template <int kReach>
+struct Cells {
+    U8s deficits[kReach + 1][kReach + 1];
 
-    explicit CentreCell(const DiscShape& disc) : centre(cellDeficit(disc, 0, 0)) {}
-    VOREL_INLINE U8s dilated(const uint8_t* source, int64_t /*stride*/) const {
-        return subSaturated(load<U8s>(source), centre);
+    explicit Cells(const DiscShape& disc) {
+        for (int dx = 0; dx <= kReach; ++dx) {
+            for (int dy = 0; dy <= dx; ++dy)
+                deficits[dx][dy] = splat<U8s>(cellDeficit(disc, dx, dy));
+        }
     }
-};
-
-/// With the eight cells around it.
-struct NearCells {
-    static constexpr int kReach = 1;
-    CentreCell inner;
-    U8s side, corner;
-
-    explicit NearCells(const DiscShape& disc)
-        : inner(disc), side(cellDeficit(disc, 1, 0)), corner(cellDeficit(disc, 1, 1)) {}
     VOREL_INLINE U8s dilated(const uint8_t* source, int64_t stride) const {
-        const U8s sides = max(max(load<U8s>(source - 1), load<U8s>(source + 1)),
-                              max(load<U8s>(source - stride), load<U8s>(source + stride)));
-        const U8s corners = mirrored(source, 1, stride);
-        const U8s result = max(subSaturated(sides, side), subSaturated(corners, corner));
-        return max(result, inner.dilated(source, stride));
-    }
-};
-
-/// With the sixteen cells around those.
-struct FarCells {
-    static constexpr int kReach = 2;
-    NearCells inner;
-    U8s side, between, corner;
-
-    explicit FarCells(const DiscShape& disc)
-        : inner(disc),
-          side(cellDeficit(disc, 2, 0)),
-          between(cellDeficit(disc, 2, 1)),
-          corner(cellDeficit(disc, 2, 2)) {}
-    VOREL_INLINE U8s dilated(const uint8_t* source, int64_t stride) const {
-        const U8s sides = max(max(load<U8s>(source - 2), load<U8s>(source + 2)),
-                              max(load<U8s>(source - 2 * stride), load<U8s>(source + 2 * stride)));
-        const U8s betweens = max(mirrored(source, 2, stride), mirrored(source, 1, 2 * stride));
-        const U8s corners = mirrored(source, 2, 2 * stride);
-        const U8s straight = max(subSaturated(sides, side), subSaturated(betweens, between));
-        const U8s result = max(straight, subSaturated(corners, corner));
-        return max(result, inner.dilated(source, stride));
+        U8s result = {};
+        unrolled<kReach + 1>([&](auto x) VOREL_INLINE_LAMBDA {
+            constexpr int kDx = x.value;
+            unrolled<kDx + 1>([&](auto y) VOREL_INLINE_LAMBDA {
+                constexpr int kDy = y.value;
+                U8s cells = mirrored<kDx, kDy>(source, stride);
+                if constexpr (kDx != kDy) cells = max(cells, mirrored<kDy, kDx>(source, stride));
+                result = max(result, subSaturated(cells, deficits[kDx][kDy]));
+            });
+        });
+        return result;
     }
 };
 
@@ -93,23 +72,23 @@ inline void beginCells(const Dilation& dilation, uint8_t* memory) {
     layOut<CellLayout>(dilation, memory);
 }
 
-template <class Cells>
+template <int kReach>
 uint8_t* rowsByCells(const Dilation& dilation, uint8_t* memory, int64_t y, int64_t count) {
     const auto planes = layoutIn<CellLayout>(memory);
-    for (int64_t row = 0; row < count + 2 * Cells::kReach; ++row)
-        fillRow(dilation, y + row - Cells::kReach, planes.rows, row);
-    const Cells cells(*dilation.disc);
+    for (int64_t row = 0; row < count + 2 * kReach; ++row)
+        fillRow(dilation, y + row - kReach, planes.rows, row);
+    const Cells<kReach> cells(*dilation.disc);
     const int64_t width = dilation.right - dilation.left;
     uint8_t* results = planes.results;
     for (int64_t row = 0; row < count; ++row, results += dilatedStride(dilation)) {
-        const uint8_t* const source = planes.rows.at(row + Cells::kReach) + dilation.left;
+        const uint8_t* const source = planes.rows.at(row + kReach) + dilation.left;
         for (int64_t x = 0; x < width; x += kBytes)
             store(results + x, cells.dilated(source + x, planes.rows.stride));
     }
     return planes.results;
 }
 
-template <class Cells>
-constexpr DilationStrategy kCellStrategy = {layoutBytes<CellLayout>, beginCells, rowsByCells<Cells>};
+template <int kReach>
+constexpr DilationStrategy kCells = {layoutBytes<CellLayout>, beginCells, rowsByCells<kReach>};
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

@@ -15,11 +15,7 @@ void keepMin(uint8_t* first, const uint8_t* second, int64_t count) {
 }  // namespace
 
 extern const DilationLoops kDilationLoops = {
-    {kCellStrategy<CentreCell>, kCellStrategy<NearCells>, kCellStrategy<FarCells>},
-    kSpreading,
-    kTiles,
-    kLongestSpreadReach,
-    keepMin,
+    {kCells<0>, kCells<1>, kCells<2>}, kSpreading, kTiles, kLongestSpreadReach, keepMin,
 };
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

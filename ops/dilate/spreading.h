@@ -54,7 +54,7 @@ inline void beginSpreading(const Dilation& dilation, uint8_t* memory) {
 }
 
 /// Whether anything is covered within reach of a vector.
-VOREL_INLINE bool isInked(const uint8_t* source, int64_t reach) {
+VOREL_INLINE bool reachesCoverage(const uint8_t* source, int64_t reach) {
     U8s all = load<U8s>(source + reach);
     for (int64_t k = -reach; k < reach; k += kBytes)
         all |= load<U8s>(source + k);
@@ -98,7 +98,7 @@ inline void spreadRow(const Dilation& dilation, const SpreadLayout& planes, uint
         const bool isFull = fillsItsReach && allZero(~load<U8s>(source + x));
         if (isFull && wasFull != 0) {
             store(targets + x + disc.reach * planes.stride, ~U8s{});
-        } else if (isInked(source + x, disc.reach)) {
+        } else if (reachesCoverage(source + x, disc.reach)) {
             spreadVector(disc, planes, source + x, targets + x);
         }
         wasFull = isFull;

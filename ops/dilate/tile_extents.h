@@ -50,40 +50,41 @@ constexpr int kTileBits = kTile * kLaneBits;
 constexpr uint64_t kTileLanes = ~uint64_t{0} >> (64 - kTileBits);
 
 /// Notes the covered pixels of a tile, given as lanes.
-VOREL_INLINE void noteTile(const TileExtents& ink, int64_t at, uint64_t lanes) {
+VOREL_INLINE void noteTile(const TileExtents& extents, int64_t at, uint64_t lanes) {
     const uint64_t bits = lanes & kTileLanes;
     const int first = bits != 0 ? firstLane(bits) : kBeyond;
     const int last = bits != 0 ? lastLane(bits) : -kBeyond;
     // Adding its lowest bit to a single run of ones carries out of it, and leaves nothing there.
     const bool solid = ((bits + (bits & (0 - bits))) & bits) == 0;
-    ink.first[at] = static_cast<Distance>(first);
-    ink.last[at] = static_cast<Distance>(last);
-    ink.holes[at] = static_cast<Distance>(solid ? 0 : last - first);
+    extents.first[at] = static_cast<Distance>(first);
+    extents.last[at] = static_cast<Distance>(last);
+    extents.holes[at] = static_cast<Distance>(solid ? 0 : last - first);
 }
 
 /// Finds the nearest covered pixels beside each tile.
-inline void findNeighbours(const TileExtents& ink, int64_t tiles) {
+inline void findNeighbours(const TileExtents& extents, int64_t tiles) {
     const Distances beyond = splat<Distances>(kBeyond);
     Distances distance = beyond;
     for (int64_t at = 0; at < tiles * kDistances; at += kDistances) {
-        store(ink.before + at, distance);
-        distance = min(min(distance, beyond) + kTile, kTile - load<Distances>(ink.last + at));
+        store(extents.before + at, distance);
+        distance = min(min(distance, beyond) + kTile, kTile - load<Distances>(extents.last + at));
     }
     distance = beyond;
     for (int64_t at = (tiles - 1) * kDistances; at >= 0; at -= kDistances) {
-        store(ink.after + at, distance);
-        distance = min(min(distance, beyond) + kTile, 1 + load<Distances>(ink.first + at));
+        store(extents.after + at, distance);
+        distance = min(min(distance, beyond) + kTile, 1 + load<Distances>(extents.first + at));
     }
 }
 
 /// From a tile's first column to the nearest covered pixel that is not to the left of it.
-VOREL_INLINE Distances toTheRight(const TileExtents& ink, int64_t at) {
-    return min(load<Distances>(ink.first + at), load<Distances>(ink.after + at) + kTileEnd);
+VOREL_INLINE Distances toTheRight(const TileExtents& extents, int64_t at) {
+    return min(load<Distances>(extents.first + at), load<Distances>(extents.after + at) + kTileEnd);
 }
 
 /// From a tile's last column to the nearest covered pixel that is not to the right of it.
-VOREL_INLINE Distances toTheLeft(const TileExtents& ink, int64_t at) {
-    return min(kTileEnd - load<Distances>(ink.last + at), load<Distances>(ink.before + at) + kTileEnd);
+VOREL_INLINE Distances toTheLeft(const TileExtents& extents, int64_t at) {
+    return min(kTileEnd - load<Distances>(extents.last + at),
+               load<Distances>(extents.before + at) + kTileEnd);
 }
 
 /// Of the tile's pixels the one next to a covered one has it that far away.
@@ -94,15 +95,15 @@ VOREL_INLINE Distances smallestDistance(Distances toRight, Distances toLeft) {
 /// None of the tile's pixels is farther from a covered one: not the tile's pixels before its first
 /// covered one, behind its last one, or between these. From one covered pixel to the next the distance
 /// rises to half of theirs. Holes are taken as one.
-VOREL_INLINE Distances largestDistance(const TileExtents& ink, int64_t at) {
-    const Distances before = load<Distances>(ink.before + at);
-    const Distances after = load<Distances>(ink.after + at);
-    const Distances first = load<Distances>(ink.first + at);
-    const Distances last = load<Distances>(ink.last + at);
+VOREL_INLINE Distances largestDistance(const TileExtents& extents, int64_t at) {
+    const Distances before = load<Distances>(extents.before + at);
+    const Distances after = load<Distances>(extents.after + at);
+    const Distances first = load<Distances>(extents.first + at);
+    const Distances last = load<Distances>(extents.last + at);
     const Distances ofEmpty = min(min(before, after) + kTileEnd, (before + after + kTileEnd) >> 1);
     const Distances toFirst = min(first, (before + first) >> 1);
     const Distances fromLast = min(kTileEnd - last, (after + kTileEnd - last) >> 1);
-    const Distances between = load<Distances>(ink.holes + at) >> 1;
+    const Distances between = load<Distances>(extents.holes + at) >> 1;
     return last < 0 ? ofEmpty : max(max(toFirst, fromLast), between);
 }
 

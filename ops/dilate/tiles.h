@@ -69,8 +69,8 @@ struct TileLayout {
     uint8_t* toLeft;
     int64_t columnStride;
 
-    TileExtents ink;   ///< covered pixels
-    TileExtents most;  ///< pixels of the largest coverage
+    TileExtents covered;  ///< covered pixels
+    TileExtents most;     ///< pixels of the largest coverage
 
     // The disc.
     DiscRow* discRows;
@@ -99,7 +99,7 @@ struct TileLayout {
         layout.columnStride = height + kBytes;
         layout.toRight = arena.take<uint8_t>(layout.tiles * layout.columnStride);
         layout.toLeft = arena.take<uint8_t>(layout.tiles * layout.columnStride);
-        layout.ink = takeExtents(layout.tiles, arena);
+        layout.covered = takeExtents(layout.tiles, arena);
         layout.most = takeExtents(layout.tiles, arena);
         layout.discRows = arena.take<DiscRow>(reach + 1);
         layout.taps = arena.take<int32_t>((reach + 1) * kMostTaps);
@@ -228,11 +228,11 @@ inline void findExtents(const Dilation& dilation, const TileLayout& planes, int6
     const U8s most = splat<U8s>(planes.largest);
     for (int64_t tile = 0; tile < planes.tiles; tile += kBytes / kTile) {
         const U8s coverage = inside ? load<U8s>(source + tile * kTile) : U8s{};
-        const uint64_t ink = nonZeroLanes(coverage);
+        const uint64_t covered = nonZeroLanes(coverage);
         const uint64_t isMost = nonZeroLanes(bitCast<U8s>(coverage == most) & coverage);
         for (int i = 0; i < kBytes / kTile && tile + i < planes.tiles; ++i) {
             const int64_t at = (tile + i) * kDistances + y % kDistances;
-            noteTile(planes.ink, at, ink >> (i * kTileBits % 64));
+            noteTile(planes.covered, at, covered >> (i * kTileBits % 64));
             noteTile(planes.most, at, isMost >> (i * kTileBits % 64));
         }
     }
@@ -248,8 +248,8 @@ VOREL_INLINE void storeBytes(uint8_t* to, Distances distances) {
 inline void noteReaches(const Dilation& dilation, const TileLayout& planes, const DiscReaches& reaches,
                         int64_t y, int64_t tile) {
     const int64_t at = tile * kDistances;
-    const Distances toRight = toTheRight(planes.ink, at);
-    const Distances toLeft = toTheLeft(planes.ink, at);
+    const Distances toRight = toTheRight(planes.covered, at);
+    const Distances toLeft = toTheLeft(planes.covered, at);
     storeBytes(planes.toRight + tile * planes.columnStride + y, toRight);
     storeBytes(planes.toLeft + tile * planes.columnStride + y, toLeft);
 
@@ -303,7 +303,7 @@ inline void beginTiles(const Dilation& dilation, uint8_t* memory) {
     for (int64_t y = 0; y < dilation.height; y += kDistances) {
         for (int64_t i = 0; i < kDistances; ++i)
             findExtents(dilation, planes, y + i);
-        findNeighbours(planes.ink, planes.tiles);
+        findNeighbours(planes.covered, planes.tiles);
         findNeighbours(planes.most, planes.tiles);
         for (int64_t tile = 0; tile < planes.tiles; ++tile)
             noteReaches(dilation, planes, reaches, y, tile);

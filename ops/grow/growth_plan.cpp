@@ -21,7 +21,7 @@ struct Picture {
 };
 
 /// The first place from `x` to `end` - 1 that is not 0, or end.
-int64_t firstInked(const uint8_t* row, int64_t x, int64_t end) {
+int64_t firstCovered(const uint8_t* row, int64_t x, int64_t end) {
     uint64_t eight = 0;
     for (; x + 8 <= end; x += 8) {
         std::memcpy(&eight, row + x, sizeof eight);
@@ -33,7 +33,7 @@ int64_t firstInked(const uint8_t* row, int64_t x, int64_t end) {
 }
 
 /// One place behind the last from `x` to `end` - 1 that is not 0, or x.
-int64_t inkedEnd(const uint8_t* row, int64_t x, int64_t end) {
+int64_t coveredEnd(const uint8_t* row, int64_t x, int64_t end) {
     uint64_t eight = 0;
     for (; x + 8 <= end; end -= 8) {
         std::memcpy(&eight, row + end - 8, sizeof eight);
@@ -45,16 +45,16 @@ int64_t inkedEnd(const uint8_t* row, int64_t x, int64_t end) {
 }
 
 /// The smallest box around what is not 0.
-Box inkedPart(const Picture& picture) {
-    Box inked = {picture.width, picture.height, 0, 0};
+Box coveredPart(const Picture& picture) {
+    Box covered = {picture.width, picture.height, 0, 0};
     for (int64_t y = 0; y < picture.height; ++y) {
         const uint8_t* const row = picture.at(0, y);
-        const int64_t first = firstInked(row, 0, picture.width);
+        const int64_t first = firstCovered(row, 0, picture.width);
         if (first == picture.width) continue;
-        inked = {std::min(inked.left, first), std::min(inked.top, y),
-                 std::max(inked.right, inkedEnd(row, first, picture.width)), y + 1};
+        covered = {std::min(covered.left, first), std::min(covered.top, y),
+                   std::max(covered.right, coveredEnd(row, first, picture.width)), y + 1};
     }
-    return inked;
+    return covered;
 }
 
 /// Deliberate: the first and the last column count as 0 after a pass, but for their ends.
@@ -149,7 +149,7 @@ void growByBoxFilter(CpuLevel level, unsigned char* mask, int passes, int width,
     if (mask == nullptr || passes < 1 || width < 1 || height <= 2) return;
     const Picture picture = {mask, width, height};
     const Box inner = {1, 1, int64_t{width} - 1, int64_t{height} - 1};
-    const Box part = intersection(expanded(inkedPart(picture), passes), inner);
+    const Box part = intersection(expanded(coveredPart(picture), passes), inner);
     if (part.empty()) return clearEndColumns(picture);
     const CoverageRows framed = {picture.at(part.left - 1, part.top - 1), width, part.width() + 2,
                                  part.height() + 2, kAsIs};

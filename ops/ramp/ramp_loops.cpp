@@ -57,18 +57,10 @@ struct RadialRow {
 };
 
 template <class RampRow>
-struct RampPainter {
-    static constexpr bool kReadsImage = false;
-    static constexpr bool kReadsMask = true;
+struct RampPainter : MaskReader {
     static constexpr bool kIsSparse = true;
-    static constexpr Empty kEmpty = DstOverWhereCovered::kEmpty;
     RampRow row;
 
-    template <int64_t kCount>
-    VOREL_INLINE bool isEmpty(const Place& place) const {
-        return hasEmptyMask<kCount>(place);
-    }
-    VOREL_INLINE bool paintWhole(const Place&) const { return false; }
     VOREL_INLINE Pixels paint(const Place& place) const {
         const Pixels destination = loadPixels(place.destination());
         const Pixels colours = madeOfWords(
@@ -80,7 +72,7 @@ struct RampPainter {
 template <class RampRow, class Ramp>
 void fillRamp(const BlendJob& job, const Ramp& ramp) {
     for (int64_t y = 0; y < job.height; ++y) {
-        const RampPainter<RampRow> painter = {RampRow::of(ramp, y)};
+        const RampPainter<RampRow> painter = {{}, RampRow::of(ramp, y)};
         const Row row = {job.destination + y * job.destinationStride, nullptr,
                          job.mask + y * job.maskStride};
         paintRow(painter, row, job.width);
@@ -137,18 +129,9 @@ void fade(uint8_t* values, int64_t count, uint32_t alpha) {
 }
 
 /// The mask is values, each painted in its colour.
-struct ValuePainter {
-    static constexpr bool kReadsImage = false;
-    static constexpr bool kReadsMask = true;
-    static constexpr bool kIsSparse = false;
-    static constexpr Empty kEmpty = Empty::keeps;
+struct ValuePainter : MaskReader {
     RampPixels pixels;
 
-    template <int64_t kCount>
-    VOREL_INLINE bool isEmpty(const Place& place) const {
-        return hasEmptyMask<kCount>(place);
-    }
-    VOREL_INLINE bool paintWhole(const Place&) const { return false; }
     VOREL_INLINE Pixels paint(const Place& place) const {
         const Pixels colours = madeOfWords([&](int64_t i) { return gather(pixels, place.mask() + i); });
         return DstOver::apply(loadPixels(place.destination()), colours);
@@ -156,7 +139,7 @@ struct ValuePainter {
 };
 
 void byValue(const BlendJob& job, RampPixels pixels) {
-    paintRows(ValuePainter{pixels}, job);
+    paintRows(ValuePainter{{}, pixels}, job);
 }
 
 }  // namespace

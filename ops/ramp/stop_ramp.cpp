@@ -1,5 +1,7 @@
 #include "ops/ramp/stop_ramp.h"
 
+#include <algorithm>
+
 #include "core/assert.h"
 
 namespace VFontEffect::internal {
@@ -23,6 +25,12 @@ void fillBetweenStops(const RampLoops& loops, const VFGradient* stops, int count
         loops.mixStops(segment, positions.of + first, behind - first, table + first);
         first = behind;
     }
+}
+
+GradientTable::GradientTable(const RampLoops& loops, const VFGradient* stops, int count) {
+    std::fill_n(mPixels, kTableLast, stops[0].mColor);
+    if (count > 1) fillBetweenStops(loops, stops, count, stops[0].mLocation, TablePositions(), mPixels);
+    loops.premultiplied(mPixels, kTableLast, mPixels);
 }
 
 }  // namespace VFontEffect::internal

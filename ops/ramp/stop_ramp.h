@@ -31,4 +31,16 @@ struct TablePositions {
 void fillBetweenStops(const RampLoops& loops, const VFGradient* stops, int count, float start,
                       const TablePositions& positions, uint32_t* table);
 
+/// The premultiplied colours of a gradient fill, entry i at position i / 256.
+class GradientTable {
+  public:
+    /// `count` of 1 or more stops.
+    GradientTable(const RampLoops& loops, const VFGradient* stops, int count);
+
+    RampPixels pixels() const { return mPixels; }
+
+  private:
+    uint32_t mPixels[kTableLast];
+};
+
 }  // namespace VFontEffect::internal

@@ -9,7 +9,7 @@
 namespace VFontEffect::internal::VOREL_LEVEL {
 namespace {
 
-/// Two bytes of each word times the weight in both of its halves: 255 * 255 fits in 16 bits.
+/// Two bytes of each word times the weight in both of its lanes: 255 * 255 fits in 16 bits.
 VOREL_INLINE U16s weighted(U32s bytes, U32s weight) {
     return bitCast<U16s>(bytes) * bitCast<U16s>(weight);
 }

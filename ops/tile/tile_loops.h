@@ -11,7 +11,7 @@ namespace VFontEffect::internal {
 constexpr int64_t kTileSlack = kWidestVector / 4;
 
 /// Where each column of a row is sampled: two neighbouring pattern pixels and their weights, which add
-/// up to 255. A weight stands in both halves of its word.
+/// up to 255. A weight stands in both 16-bit lanes of its word.
 struct ColumnTaps {
     const int32_t* near;
     const int32_t* far;
