@@ -2,7 +2,7 @@
 
 #include <algorithm>
 
-#include "colour.h"
+#include "style/vorelstyle.h"
 
 namespace vorelpaint {
 namespace {
@@ -41,12 +41,12 @@ uint32_t squareAt(int x, int y) {
 std::optional<Background> parseBackground(std::string_view text) {
     if (text == "transparent") return Background{};
     if (text == "checkerboard") return Background{Background::Kind::checkerboard, 0};
-    const std::optional<uint32_t> colour = parseColour(text);
+    const std::optional<uint32_t> colour = vorelstyle::parseColour(text);
     if (!colour) return std::nullopt;
     return Background{Background::Kind::colour, *colour};
 }
 
-void layOn(Image& image, const Background& background) {
+void layOn(voreltext::Image& image, const Background& background) {
     uint8_t* pixel = image.pixels.data();
     for (int y = 0; y < image.height; ++y) {
         for (int x = 0; x < image.width; ++x, pixel += 4) {

@@ -4,7 +4,7 @@
 #include <optional>
 #include <string_view>
 
-#include "image.h"
+#include "text/voreltext.h"
 
 namespace vorelpaint {
 
@@ -18,6 +18,6 @@ struct Background {
 std::optional<Background> parseBackground(std::string_view text);
 
 /// Lays a premultiplied picture on the background; the result is straight, as a PNG stores it.
-void layOn(Image& image, const Background& background);
+void layOn(voreltext::Image& image, const Background& background);
 
 }  // namespace vorelpaint

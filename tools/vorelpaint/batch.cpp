@@ -7,15 +7,20 @@
 
 #include "console.h"
 #include "error.h"
-#include "json_object.h"
 #include "line_reader.h"
 #include "painting.h"
 #include "progress.h"
 #include "settings.h"
-#include "style.h"
+#include "style/vorelstyle.h"
 
 namespace vorelpaint {
 namespace {
+
+using vorelstyle::JsonDocument;
+using vorelstyle::JsonObject;
+using vorelstyle::JsonValue;
+using vorelstyle::Style;
+using vorelstyle::StyleError;
 
 /// Room for the largest text and the largest style.
 constexpr size_t kMaxJobBytes = size_t{1} << 18;
@@ -25,12 +30,12 @@ bool isBlank(const std::string& line) {
 }
 
 /// A job is one line, so what a syntax error says of lines is left out.
-Json parseLine(const std::string& line) {
+JsonDocument parseLine(const std::string& line) {
     if (line.size() > kMaxJobBytes) {
         throw ToolError("longer than " + std::to_string(kMaxJobBytes) + " bytes");
     }
     try {
-        return parseJson(line);
+        return JsonDocument(line);
     } catch (const StyleError& error) {
         constexpr std::string_view kPlace = "line 1, ";
         std::string fault = error.what();
@@ -68,9 +73,9 @@ Options withoutWhatTheJobSays(const JsonObject& job, const Options& common) {
     return options;
 }
 
-Style readInlineStyle(const Json& json) {
+Style readInlineStyle(JsonValue json) {
     try {
-        return readStyle(json, "");
+        return readStyle(json);
     } catch (const StyleError& error) {
         throw ToolError(std::string("style.") + error.what());
     }
@@ -101,6 +106,19 @@ void requirePicture(const Options& options) {
     }
 }
 
+Options readJob(const JsonObject& job, const Options& common) {
+    Options options = withoutWhatTheJobSays(job, common);
+    for (const std::string_view key : job.keys()) {
+        if (key == "style" && job.value(key).isObject()) {
+            options.inlineStyle = readInlineStyle(job.value(key));
+        } else {
+            readKey(job, settingNamed(key), options);
+        }
+    }
+    requirePicture(options);
+    return options;
+}
+
 bool paintJob(const std::string& line, const Options& common, const Warn& sayHere) {
     try {
         paintPicture(parseJob(line, common), sayHere);
@@ -116,18 +134,12 @@ bool paintJob(const std::string& line, const Options& common, const Warn& sayHer
 }  // namespace
 
 Options parseJob(const std::string& line, const Options& common) {
-    const Json json = parseLine(line);
-    const JsonObject job(json, "", jobKeys());
-    Options options = withoutWhatTheJobSays(job, common);
-    for (const auto& item : json.items()) {
-        if (item.key() == "style" && item.value().is_object()) {
-            options.inlineStyle = readInlineStyle(item.value());
-        } else {
-            readKey(job, settingNamed(item.key()), options);
-        }
+    const JsonDocument document = parseLine(line);
+    try {
+        return readJob(JsonObject(document.root(), "", jobKeys()), common);
+    } catch (const StyleError& error) {
+        throw ToolError(error.what());
     }
-    requirePicture(options);
-    return options;
 }
 
 BatchResult paintBatch(const Options& common) {

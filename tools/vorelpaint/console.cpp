@@ -7,6 +7,8 @@
 #include <iostream>
 #include <string_view>
 
+#include "style/vorelstyle.h"
+
 namespace vorelpaint {
 namespace {
 
@@ -30,16 +32,9 @@ void drawStatus() {
 
 }  // namespace
 
-std::string printable(std::string text) {
-    for (char& c : text) {
-        if (static_cast<unsigned char>(c) < 0x20 || c == 0x7F) c = ' ';
-    }
-    return text;
-}
-
 void say(const std::string& line) {
     eraseStatus();
-    std::cerr << "vorelpaint: " << printable(line) << '\n';
+    std::cerr << "vorelpaint: " << vorelstyle::printable(line) << '\n';
     drawStatus();
 }
 

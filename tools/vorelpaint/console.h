@@ -5,10 +5,6 @@
 /// What the program says beside its output: lines on standard error.
 namespace vorelpaint {
 
-/// The text with control characters replaced by blanks: it stays on one line, whatever bytes a file name
-/// or a message brings along.
-std::string printable(std::string text);
-
 /// One line on standard error, with the program's name before it. A status that is shown stays below it.
 void say(const std::string& line);
 

@@ -9,8 +9,6 @@
 #include <variant>
 #include <vector>
 
-#include "console.h"
-#include "key_text.h"
 #include "measured_run.h"
 #include "memory_meter.h"
 #include "progress.h"
@@ -19,6 +17,18 @@
 namespace vorelpaint {
 namespace {
 
+using vorelstyle::Effect;
+using vorelstyle::effectName;
+using vorelstyle::KeyFragment;
+using vorelstyle::Look;
+using vorelstyle::printable;
+using vorelstyle::Stroke;
+using vorelstyle::Style;
+using voreltext::Frame;
+using voreltext::GlyphMask;
+using voreltext::Margins;
+using voreltext::marginsOf;
+using voreltext::TextLayout;
 using Clock = std::chrono::steady_clock;
 
 constexpr const char* kOrderHeading = "\nOrder of painting, the topmost effect first:\n\n";
@@ -110,7 +120,7 @@ std::string layersText(const Look& look, const Plan& plan) {
 }
 
 bool isCentredStroke(const Style& style, int type) {
-    return type == kStrokeType &&
+    return type == vorelstyle::kStrokeType &&
            std::any_of(style.effects.begin(), style.effects.end(), [](const Effect& effect) {
                const auto* stroke = std::get_if<Stroke>(&effect);
                return stroke != nullptr && stroke->position == 0;
@@ -119,7 +129,7 @@ bool isCentredStroke(const Style& style, int type) {
 
 std::string placeText(const Style& style, const Plan& plan, size_t at) {
     const int type = plan.order[at];
-    if (type == kTextType) return "the text";
+    if (type == vorelstyle::kTextType) return "the text";
     if (isCentredStroke(style, type)) return "across the edge";
     if (plan.under[at]) return plan.layered ? "outside the text" : "beneath the text";
     return "on the text";
@@ -161,10 +171,10 @@ void printKeyPart(std::ostream& out, const std::string& name, const std::string&
 
 void printKey(std::ostream& out, const Look& look) {
     out << "\nCache key of " << look.key().size() << " bytes, before the first run:\n\n";
-    for (const KeyFragment& fragment : keyFragments(look.key()))
+    for (const KeyFragment& fragment : vorelstyle::keyFragments(look.key()))
         printKeyPart(out, std::string(effectName(fragment.type)), fragment.meaning);
     const std::vector<int>& added = look.added();
-    if (std::find(added.begin(), added.end(), kPatternType) != added.end()) {
+    if (std::find(added.begin(), added.end(), vorelstyle::kPatternType) != added.end()) {
         printKeyPart(out, "pattern", "leaves no trace: tell patterns apart by a key of your own");
     }
 }
@@ -195,7 +205,8 @@ std::string textText(const Options& options, const TextLayout& text) {
 
 void printHead(std::ostream& out, const Options& options, const Style& style, Look& look,
                const Plan& plan) {
-    out << entry("style", styleText(options, style)) << entry("margins", marginsText(look.margins()))
+    out << entry("style", styleText(options, style))
+        << entry("margins", marginsText(marginsOf(look.effects())))
         << entry("layers", layersText(look, plan));
 }
 
@@ -208,7 +219,7 @@ void explain(std::ostream& out, const Options& options, const Style& style, Look
     if (text == nullptr) {
         printOrder(out, style, plan);
     } else {
-        const Frame frame{text->inkBox(), look.margins(), options.padding};
+        const Frame frame{text->inkBox(), marginsOf(look.effects()), options.padding};
         out << entry("text", textText(options, *text))
             << entry("ink", sizeText(frame.ink.width(), frame.ink.height()))
             << entry("picture", sizeText(frame.width(), frame.height()));

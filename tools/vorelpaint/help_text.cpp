@@ -1,7 +1,7 @@
 #include "help_text.h"
 
-#include "joined.h"
 #include "settings.h"
+#include "style/vorelstyle.h"
 #include "wrap.h"
 
 namespace vorelpaint {
@@ -14,7 +14,7 @@ std::string jobKeys() {
     for (const Setting& setting : settings()) {
         if (setting.inJobs) keys.push_back(setting.name);
     }
-    return joined(keys);
+    return vorelstyle::joined(keys);
 }
 
 }  // namespace

@@ -10,21 +10,26 @@
 #include "console.h"
 #include "error.h"
 #include "explain.h"
-#include "font.h"
-#include "font_finder.h"
+#include "font_choice.h"
 #include "interrupt.h"
-#include "key_text.h"
-#include "look.h"
 #include "manual.h"
 #include "options.h"
 #include "painting.h"
 #include "sheet.h"
+#include "style/vorelstyle.h"
 #include "style_file.h"
+#include "text/voreltext.h"
 #include "voreleffect/VFVersion.h"
-#include "write_cpp.h"
 
 namespace vorelpaint {
 namespace {
+
+using vorelstyle::Look;
+using vorelstyle::Style;
+using voreltext::Font;
+using voreltext::Margins;
+using voreltext::marginsOf;
+using voreltext::TextLayout;
 
 constexpr int kFailed = 2;
 
@@ -41,9 +46,9 @@ void printMargins(const Margins& margins) {
 }
 
 void printCpp(const Options& options, const Style& style) {
-    const std::string name = options.preset.value_or(style.file.stem().string());
-    writeCpp(std::cout, functionName(name), style, chosenFill(options, style),
-             chosenOpacity(options, style));
+    const std::string name = options.preset.value_or(std::filesystem::path(style.name).stem().string());
+    vorelstyle::writeCpp(std::cout, vorelstyle::functionName(name), style, chosenFill(options, style),
+                         chosenOpacity(options, style), imagesOf(style));
 }
 
 /// What is printed about a look, and its picture.
@@ -51,8 +56,8 @@ void present(const Options& options) {
     const Style style = chosenStyle(options);
     Look look = makeLook(options, style, say);
     if (options.writeCpp) printCpp(options, style);
-    if (options.printKey) std::cout << "key " << hexadecimal(look.key()) << '\n';
-    if (options.printMargins) printMargins(look.margins());
+    if (options.printKey) std::cout << "key " << vorelstyle::hexadecimal(look.key()) << '\n';
+    if (options.printMargins) printMargins(marginsOf(look.effects()));
     if (!options.text && !options.textFile) {
         if (options.explain) explain(std::cout, options, style, look, nullptr);
         return;
@@ -61,7 +66,7 @@ void present(const Options& options) {
     const Font font(findFont(options.font), options.size);
     const TextLayout text = layOutText(options, font, say);
     if (options.explain) explain(std::cout, options, style, look, &text);
-    if (options.output) writePicture(options, look.paint(text, options.padding));
+    if (options.output) writePicture(options, paint(look.effects(), text, options.padding));
 }
 
 void runBatch(const Options& options) {

@@ -13,6 +13,13 @@ namespace {
 using VFontEffect::VFECore;
 using VFontEffect::VFEffect;
 using VFontEffect::VFStrokeProperty;
+using vorelstyle::kStrokeType;
+using vorelstyle::kTextType;
+using vorelstyle::Look;
+using voreltext::Frame;
+using voreltext::GlyphMask;
+using voreltext::Image;
+using voreltext::Run;
 using Clock = std::chrono::steady_clock;
 
 bool hasCentredStroke(VFEffect& effects) {

@@ -5,10 +5,8 @@
 #include <cstddef>
 #include <vector>
 
-#include "image.h"
-#include "look.h"
-#include "run.h"
-#include "text_layout.h"
+#include "style/vorelstyle.h"
+#include "text/voreltext.h"
 
 namespace vorelpaint {
 
@@ -20,7 +18,7 @@ struct Plan {
 };
 
 /// The plan of a look. Nothing is painted.
-Plan planOf(const Look& look);
+Plan planOf(const vorelstyle::Look& look);
 
 /// What one step of a run takes.
 struct Cost {
@@ -37,8 +35,9 @@ struct MeasuredRun {
 
 /// Paints a run with each effect on its own, in the order of the plan, into one picture, which goes to
 /// `picture` unless that is null.
-MeasuredRun measuredRun(const Look& look, const Plan& plan, const Frame& frame,
-                        const std::vector<GlyphMask>& glyphs, Image* picture = nullptr);
+MeasuredRun measuredRun(const vorelstyle::Look& look, const Plan& plan, const voreltext::Frame& frame,
+                        const std::vector<voreltext::GlyphMask>& glyphs,
+                        voreltext::Image* picture = nullptr);
 
 /// A run with the median of each time in `runs`, of which there is at least one.
 MeasuredRun medianOf(std::vector<MeasuredRun> runs);

@@ -5,8 +5,8 @@
 #include <string>
 
 #include "background.h"
-#include "style.h"
-#include "text_layout.h"
+#include "style/vorelstyle.h"
+#include "text/voreltext.h"
 
 namespace vorelpaint {
 
@@ -16,13 +16,14 @@ struct Options {
     std::optional<std::string> textFile;
     std::string font = "DejaVu Sans";
     int size = 96;
-    Align align = Align::left;
+    voreltext::Align align = voreltext::Align::left;
     std::optional<uint32_t> color;
     std::optional<float> opacity;
     float effectScale = 1;
     std::optional<std::string> style;
     std::optional<std::string> preset;
-    std::optional<Style> inlineStyle;  ///< only a job can hold one; it goes before the other two
+    std::optional<vorelstyle::Style>
+        inlineStyle;  ///< only a job can hold one; it goes before the other two
     Background background;
     std::optional<std::string> output;
     int padding = 8;

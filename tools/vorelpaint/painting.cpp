@@ -1,19 +1,22 @@
 #include "painting.h"
 
 #include <utility>
-#include <variant>
 
 #include "background.h"
 #include "error.h"
 #include "file_io.h"
-#include "font_finder.h"
+#include "font_choice.h"
 #include "png_io.h"
 #include "style_file.h"
-#include "style_scale.h"
-#include "utf8.h"
 
 namespace vorelpaint {
 namespace {
+
+using vorelstyle::Look;
+using vorelstyle::Style;
+using voreltext::Font;
+using voreltext::Image;
+using voreltext::TextLayout;
 
 constexpr size_t kMaxTextBytes = size_t{1} << 16;
 
@@ -27,19 +30,15 @@ Style namedStyle(const Options& options) {
 }  // namespace
 
 Style chosenStyle(const Options& options) {
-    return scaledStyle(namedStyle(options), options.effectScale);
+    return vorelstyle::scaledStyle(namedStyle(options), options.effectScale);
 }
 
 uint32_t chosenFill(const Options& options, const Style& style) {
-    if (options.color) return *options.color;
-    for (const Effect& effect : style.effects) {
-        if (const auto* text = std::get_if<TextFill>(&effect)) return text->color;
-    }
-    return style.color.value_or(0);
+    return options.color.value_or(fillOf(style));
 }
 
 float chosenOpacity(const Options& options, const Style& style) {
-    return options.opacity.value_or(style.textOpacity.value_or(1.0F));
+    return options.opacity.value_or(opacityOf(style));
 }
 
 std::string chosenText(const Options& options) {
@@ -50,7 +49,7 @@ std::string chosenText(const Options& options) {
 }
 
 Look makeLook(const Options& options, const Style& style, const Warn& warn) {
-    Look look(style, chosenFill(options, style), chosenOpacity(options, style));
+    Look look(style, chosenFill(options, style), chosenOpacity(options, style), imagesOf(style));
     for (const std::string& effect : look.unpainted()) {
         warn("warning: the library has no core for " + effect + "; it is not painted");
     }
@@ -58,7 +57,7 @@ Look makeLook(const Options& options, const Style& style, const Warn& warn) {
 }
 
 TextLayout layOutText(const Options& options, const Font& font, const Warn& warn) {
-    TextLayout text(font, decodeUtf8(chosenText(options)), options.align);
+    TextLayout text(font, voreltext::decodeUtf8(chosenText(options)), options.align);
     if (text.glyphCount() == 0) throw ToolError("nothing to paint: the text has no visible character");
     if (text.missingGlyphs() > 0) {
         warn("warning: characters missing from the font: " + std::to_string(text.missingGlyphs()));
@@ -74,7 +73,7 @@ void writePicture(const Options& options, Image picture) {
 void paintPicture(const Options& options, const Warn& warn) {
     Look look = makeLook(options, chosenStyle(options), warn);
     const Font font(findFont(options.font), options.size);
-    writePicture(options, look.paint(layOutText(options, font, warn), options.padding));
+    writePicture(options, paint(look.effects(), layOutText(options, font, warn), options.padding));
 }
 
 }  // namespace vorelpaint

@@ -10,6 +10,8 @@
 namespace vorelpaint {
 namespace {
 
+using voreltext::Image;
+
 constexpr png_uint_32 kMaxSide = 4096;
 
 /// libpng's record of one picture; what it holds is freed with it.

@@ -8,12 +8,13 @@
 #include <system_error>
 #include <type_traits>
 
-#include "colour.h"
 #include "error.h"
 
 namespace vorelpaint {
 namespace {
 
+using vorelstyle::parseColour;
+using voreltext::Align;
 using Read = Setting::Read;
 
 [[noreturn]] void refuse(const std::string& text, const std::string& reason) {
@@ -191,7 +192,7 @@ const std::vector<Setting>& settings() {
     return all;
 }
 
-const Setting& settingNamed(const std::string& name) {
+const Setting& settingNamed(std::string_view name) {
     return *std::find_if(settings().begin(), settings().end(),
                          [&](const Setting& setting) { return setting.name == name; });
 }

@@ -2,6 +2,7 @@
 
 #include <functional>
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include "options.h"
@@ -31,7 +32,7 @@ struct Setting {
 const std::vector<Setting>& settings();
 
 /// The setting of this name, which there must be.
-const Setting& settingNamed(const std::string& name);
+const Setting& settingNamed(std::string_view name);
 
 /// "--output", or "TEXT" for the one without a name on the command line.
 std::string optionName(const Setting& setting);

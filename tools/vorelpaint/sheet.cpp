@@ -6,13 +6,24 @@
 #include <utility>
 #include <vector>
 
-#include "font_finder.h"
+#include "font_choice.h"
 #include "progress.h"
 #include "style_file.h"
-#include "utf8.h"
 
 namespace vorelpaint {
 namespace {
+
+using vorelstyle::Look;
+using voreltext::Align;
+using voreltext::Box;
+using voreltext::decodeUtf8;
+using voreltext::Font;
+using voreltext::FontFile;
+using voreltext::Frame;
+using voreltext::Image;
+using voreltext::Margins;
+using voreltext::marginsOf;
+using voreltext::TextLayout;
 
 constexpr int kSmallestLabel = 10;
 constexpr int kLargestLabel = 40;
@@ -67,7 +78,7 @@ void grow(Box& box, const Box& other) {
 Grid gridOf(std::vector<Cell>& cells, const Box& ink, int padding) {
     Grid grid;
     for (Cell& cell : cells) {
-        grow(grid.margins, cell.look.margins());
+        grow(grid.margins, marginsOf(cell.look.effects()));
         grow(grid.label, cell.label.inkBox());
     }
     const Frame frame{ink, grid.margins, padding};
@@ -76,7 +87,7 @@ Grid gridOf(std::vector<Cell>& cells, const Box& ink, int padding) {
     grid.height = frame.height() + grid.label.height() + padding;
     grid.columns = sheetColumns(count, grid.width, grid.height);
     grid.rows = (count + grid.columns - 1) / grid.columns;
-    checkSize(grid.columns * grid.width, grid.rows * grid.height);
+    voreltext::checkSize(grid.columns * grid.width, grid.rows * grid.height);
     return grid;
 }
 
@@ -96,16 +107,18 @@ void lay(Image& sheet, const Image& picture, int x, int y) {
 /// Lays the picture of a cell and of its name into the cell at (left, top).
 void layCell(Image& sheet, const Grid& grid, int left, int top, Cell& cell, const TextLayout& text,
              int padding, uint32_t colour) {
-    const Margins margins = cell.look.margins();
+    const Margins margins = marginsOf(cell.look.effects());
     const Frame frame{text.inkBox(), grid.margins, padding};
     const int slack = grid.width - frame.width();
-    lay(sheet, cell.look.paint(text, 0), left + slack / 2 + padding + grid.margins.left - margins.left,
+    lay(sheet, paint(cell.look.effects(), text, 0),
+        left + slack / 2 + padding + grid.margins.left - margins.left,
         top + padding + grid.margins.top - margins.top);
 
     if (cell.label.glyphCount() == 0) return;  // the font has blanks for these letters
     const Box& name = cell.label.inkBox();
     const int baseline = top + frame.height() - grid.label.top;
-    lay(sheet, Look({}, colour, 1).paint(cell.label, 0), left + (grid.width - name.width()) / 2,
+    Look look({}, colour, 1);
+    lay(sheet, paint(look.effects(), cell.label, 0), left + (grid.width - name.width()) / 2,
         baseline + name.top);
 }
 

@@ -1,15 +1,21 @@
 #include "style_file.h"
 
-#include <algorithm>
 #include <array>
+#include <utility>
 
+#include "error.h"
 #include "file_io.h"
-#include "joined.h"
+#include "png_io.h"
 
 namespace vorelpaint {
 namespace {
 
 namespace fs = std::filesystem;
+
+using vorelstyle::LoadImage;
+using vorelstyle::PatternImage;
+using vorelstyle::Style;
+using vorelstyle::StyleError;
 
 constexpr size_t kMaxStyleBytes = size_t{1} << 17;
 
@@ -30,35 +36,26 @@ fs::path presetDir() {
 }  // namespace
 
 Style loadStyle(const fs::path& path) {
-    const std::string text = readFile(path.string(), kMaxStyleBytes);
-    try {
-        Style style = parseStyle(text, path.parent_path());
-        style.file = path;
-        return style;
-    } catch (const StyleError& error) {
-        throw ToolError(faultPrefix(path) + error.what());
-    }
+    return vorelstyle::parseStyle(readFile(path.string(), kMaxStyleBytes), path.string());
 }
 
-std::string faultPrefix(const fs::path& file) {
-    return file.empty() ? "" : "style '" + file.string() + "': ";
+LoadImage imagesOf(const Style& style) {
+    return [directory = fs::path(style.name).parent_path()](const std::string& image) -> PatternImage {
+        try {
+            voreltext::Image read = readPng(directory / image);
+            return {read.width, read.height, std::move(read.pixels)};
+        } catch (const ToolError& error) {
+            throw StyleError(error.what());
+        }
+    };
 }
 
 std::vector<std::string> presetNames() {
-    std::vector<std::string> names;
-    for (const fs::directory_entry& entry : fs::directory_iterator(presetDir())) {
-        if (entry.path().extension() == ".json") names.push_back(entry.path().stem().string());
-    }
-    std::sort(names.begin(), names.end());
-    return names;
+    return vorelstyle::presetNames(presetDir());
 }
 
 fs::path findPreset(const std::string& name) {
-    const std::vector<std::string> names = presetNames();
-    if (std::find(names.begin(), names.end(), name) == names.end()) {
-        throw ToolError("no preset '" + name + "'; there are " + joined(names));
-    }
-    return presetDir() / (name + ".json");
+    return vorelstyle::presetFile(presetDir(), name);
 }
 
 }  // namespace vorelpaint

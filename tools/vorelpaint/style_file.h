@@ -4,20 +4,22 @@
 #include <string>
 #include <vector>
 
-#include "style.h"
+#include "style/vorelstyle.h"
 
 namespace vorelpaint {
 
-/// Reads a style file. Throws ToolError, naming the file.
-Style loadStyle(const std::filesystem::path& path);
+/// Reads a style file; "-" is standard input. Throws ToolError when it cannot be read, StyleError,
+/// naming the file, when it is wrong.
+vorelstyle::Style loadStyle(const std::filesystem::path& path);
 
-/// What a fault of a style from this file begins with: "style 'FILE': ", nothing without a file.
-std::string faultPrefix(const std::filesystem::path& file);
+/// Loads the pictures of a style from PNG files, whose paths start beside the style's own file.
+vorelstyle::LoadImage imagesOf(const vorelstyle::Style& style);
 
-/// The style file of a preset. Throws ToolError, listing the presets, when there is none.
+/// The style file of a preset. Throws StyleError, listing the presets, when there is none, and ToolError
+/// without a directory of presets.
 std::filesystem::path findPreset(const std::string& name);
 
-/// The names of all presets, sorted.
+/// The names of all presets, sorted. Throws ToolError without a directory of presets.
 std::vector<std::string> presetNames();
 
 }  // namespace vorelpaint
