@@ -30,8 +30,8 @@ Margins marginsOf(VFEffect& effects) {
 }
 
 void checkSize(int width, int height) {
-    const bool fits = width <= TextLayout::kMaxSide && height <= TextLayout::kMaxSide &&
-                      int64_t{width} * height <= kMaxPixels;
+    const bool fits = width >= 0 && width <= TextLayout::kMaxSide && height >= 0 &&
+                      height <= TextLayout::kMaxSide && int64_t{width} * height <= kMaxPixels;
     if (fits) return;
     throw TextError("the picture would be " + std::to_string(width) + " x " + std::to_string(height) +
                     " pixels; at most " + std::to_string(TextLayout::kMaxSide) + " on a side and " +

@@ -25,7 +25,7 @@ Margins marginsOf(VFontEffect::VFEffect& effects);
 struct Frame {
     Box ink;
     Margins margins;
-    int padding;
+    int padding;  ///< at most TextLayout::kMaxSide
 
     int width() const { return ink.width() + margins.left + margins.right + 2 * padding; }
     int height() const { return ink.height() + margins.top + margins.bottom + 2 * padding; }
@@ -35,7 +35,7 @@ struct Frame {
     int shiftY() const { return margins.top + padding - ink.top; }
 };
 
-/// Throws TextError for a picture beyond TextLayout::kMaxSide or kMaxPixels.
+/// Throws TextError for a picture beyond TextLayout::kMaxSide or kMaxPixels, or of a negative size.
 void checkSize(int width, int height);
 constexpr int64_t kMaxPixels = int64_t{1} << 25;
 

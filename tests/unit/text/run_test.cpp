@@ -53,6 +53,8 @@ TEST(Paint, PictureBeyondTheLimit_IsRefused) {
     EXPECT_THROW(checkSize(TextLayout::kMaxSide, 2049), TextError);
     EXPECT_THROW(checkSize(TextLayout::kMaxSide + 1, 1), TextError);
     EXPECT_THROW(checkSize(1, TextLayout::kMaxSide + 1), TextError);
+    EXPECT_THROW(checkSize(-1, 1), TextError);
+    EXPECT_THROW(checkSize(1, -1), TextError);
 }
 
 }  // namespace
