@@ -1,5 +1,5 @@
 # What `cmake --install` lays down, in three components: runtime (the shared library), development
-# (headers, link name or static library, package files) and tool (tools/CMakeLists.txt).
+# (headers, link name or static library, package files) and tool (tools/vorelpaint/CMakeLists.txt).
 include(CMakePackageConfigHelpers)
 include(GNUInstallDirs)
 

@@ -15,8 +15,8 @@ clang-format-14 --dry-run --Werror "${sources[@]}"
 
 database=build/sanitize
 [[ -f $database/compile_commands.json ]] || scripts/test.sh sanitize
-printf '%s\n' "${sources[@]}" | grep -E '^(core|property|blend|effect|cores|tools)/.*\.cpp$' |
+printf '%s\n' "${sources[@]}" | grep -E '^(core|property|blend|effect|cores|style|text|tools)/.*\.cpp$' |
     xargs -P "$(nproc)" -n 4 clang-tidy-14 --quiet -p "$database" 2> /dev/null
 cppcheck --quiet --std=c++17 --enable=warning,performance,portability --inline-suppr --error-exitcode=1 \
-    -I. -Iinclude core property blend cores effect tools
+    -I. -Iinclude core property blend cores effect style text tools
 echo "layout and code are clean"

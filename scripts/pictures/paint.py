@@ -10,7 +10,7 @@ from PIL import Image
 
 from strips import Cell, Strip, paint_strips
 
-PRESETS = Path(__file__).resolve().parents[2] / "tools" / "presets"
+PRESETS = Path(__file__).resolve().parents[2] / "style" / "presets"
 
 ANGLES = (0, 45, 90, 135, 180, 225, 270, 315)
 OPACITIES = (0.1, 0.25, 0.5, 0.75, 1)

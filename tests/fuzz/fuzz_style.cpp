@@ -7,12 +7,11 @@
 #include <string>
 #include <string_view>
 
-#include "style.h"
-#include "style_scale.h"
+#include "style/vorelstyle.h"
 
 namespace {
 
-using namespace vorelpaint;
+using namespace vorelstyle;
 
 [[noreturn]] void fail(const char* what) {
     std::fprintf(stderr, "%s\n", what);

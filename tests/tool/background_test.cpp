@@ -8,7 +8,7 @@ namespace {
 using Pixel = std::vector<uint8_t>;
 
 Pixel laid(const Pixel& pixel, const char* background) {
-    Image image{1, 1, pixel};
+    voreltext::Image image{1, 1, pixel};
     layOn(image, parseBackground(background).value());
     return image.pixels;
 }
@@ -30,7 +30,7 @@ TEST(Background, Colour_ShowsThroughByTheRest) {
 }
 
 TEST(Background, Checkerboard_ChangesEveryEightPixels) {
-    Image image{9, 9, Pixel(9 * 9 * 4, 0)};
+    voreltext::Image image{9, 9, Pixel(9 * 9 * 4, 0)};
     layOn(image, parseBackground("checkerboard").value());
     const auto redAt = [&](int x, int y) { return image.pixels[static_cast<size_t>((y * 9 + x) * 4)]; };
     EXPECT_EQ(redAt(7, 7), redAt(0, 0));

@@ -38,7 +38,7 @@ TEST(Batch, EachKey_IsRead) {
     EXPECT_EQ(job.output, "a.png");
     EXPECT_EQ(job.font, "DejaVu Serif");
     EXPECT_EQ(job.size, 12);
-    EXPECT_EQ(job.align, Align::right);
+    EXPECT_EQ(job.align, voreltext::Align::right);
     EXPECT_EQ(job.preset, "gold");
     EXPECT_EQ(job.effectScale, 2.5F);
     EXPECT_EQ(job.color, 0x010203U);
@@ -57,7 +57,7 @@ TEST(Batch, Style_IsAFileOrAnObject) {
     const Options job = jobOf(R"("style": {"outerGlow": {"size": 3, "color": "#0000FF"}})");
     ASSERT_TRUE(job.inlineStyle);
     ASSERT_EQ(job.inlineStyle->effects.size(), 1U);
-    EXPECT_EQ(std::get<OuterGlow>(job.inlineStyle->effects[0]).size, 3.0F);
+    EXPECT_EQ(std::get<vorelstyle::OuterGlow>(job.inlineStyle->effects[0]).size, 3.0F);
 }
 
 TEST(Batch, WhatAJobDoesNotSay_IsTheCommandLines) {

@@ -6,18 +6,28 @@
 #include <string>
 #include <vector>
 
-#include "font_finder.h"
-#include "key_text.h"
+#include "font_choice.h"
 #include "memory_meter.h"
 #include "style_file.h"
-#include "utf8.h"
 
 namespace vorelpaint {
 namespace {
 
+using vorelstyle::KeyFragment;
+using vorelstyle::Look;
+using vorelstyle::parseStyle;
+using vorelstyle::Style;
+using voreltext::Align;
+using voreltext::decodeUtf8;
+using voreltext::Font;
+using voreltext::Frame;
+using voreltext::GlyphMask;
+using voreltext::Image;
+using voreltext::TextLayout;
+
 class MeasuredRunTest : public ::testing::Test {
   protected:
-    Frame frameOf(Look& look) const { return {mText.inkBox(), look.margins(), 3}; }
+    Frame frameOf(Look& look) const { return {mText.inkBox(), voreltext::marginsOf(look.effects()), 3}; }
 
     std::vector<GlyphMask> glyphs() const {
         std::vector<GlyphMask> masks;
@@ -28,11 +38,11 @@ class MeasuredRunTest : public ::testing::Test {
 
     /// The run in steps paints what the run in one paints, in the order in which the set is planned.
     void expectThePlannedPicture(const Style& style, float opacity) {
-        Look look(style, 0x336699, opacity);
+        Look look(style, 0x336699, opacity, imagesOf(style));
         const Plan plan = planOf(look);
         Image inSteps;
         measuredRun(look, plan, frameOf(look), glyphs(), &inSteps);
-        const Image inOne = look.paint(mText, 3);
+        const Image inOne = paint(look.effects(), mText, 3);
         EXPECT_EQ(inSteps.width, inOne.width);
         EXPECT_EQ(inSteps.pixels, inOne.pixels);
         EXPECT_EQ(withoutPattern(plan.order), plannedOrder(style, opacity));
@@ -40,11 +50,11 @@ class MeasuredRunTest : public ::testing::Test {
 
     /// The order of the key after planning, which follows the set's list.
     static std::vector<int> plannedOrder(const Style& style, float opacity) {
-        VFontEffect::VFEffect effects(Look(style, 0x336699, opacity).effects());
+        VFontEffect::VFEffect effects(Look(style, 0x336699, opacity, imagesOf(style)).effects());
         effects.initEffect(1, 1);
         const std::unique_ptr<char[]> key(effects.getMapKey());
         std::vector<int> types;
-        for (const KeyFragment& fragment : keyFragments(key.get()))
+        for (const KeyFragment& fragment : vorelstyle::keyFragments(key.get()))
             types.push_back(fragment.type);
         return types;
     }
@@ -72,8 +82,8 @@ TEST_F(MeasuredRunTest, TextAmongTheEffects_IsPaintedInItsPlace) {
                            "text": {"color": "#111111", "opacity": 0.7},
                            "innerGlow": {"size": 4, "color": "#FF0000"},
                            "outerGlow": {"size": 9, "color": "#00FF00"}})";
-    expectThePlannedPicture(parseStyle(json, ""), 1);
-    expectThePlannedPicture(parseStyle(json, ""), 0.3F);
+    expectThePlannedPicture(parseStyle(json), 1);
+    expectThePlannedPicture(parseStyle(json), 0.3F);
 }
 
 TEST_F(MeasuredRunTest, Plan_PutsWhatLiesBeneathBehindTheText) {

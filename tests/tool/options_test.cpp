@@ -40,7 +40,7 @@ TEST(Options, EachValue_IsRead) {
         optionsOf({"--size", "12", "--align", "right", "--effect-scale", "2.5", "--color", "#010203",
                    "--opacity", "0.25", "--background", "checkerboard", "--padding", "0", "A"});
     EXPECT_EQ(options.size, 12);
-    EXPECT_EQ(options.align, Align::right);
+    EXPECT_EQ(options.align, voreltext::Align::right);
     EXPECT_EQ(options.effectScale, 2.5F);
     EXPECT_EQ(options.color, 0x010203U);
     EXPECT_EQ(options.opacity, 0.25F);

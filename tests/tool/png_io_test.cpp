@@ -15,6 +15,7 @@ namespace {
 
 using Bytes = std::vector<uint8_t>;
 using vorel_test::readBytes;
+using voreltext::Image;
 
 class PngIo : public ::testing::Test {
   protected:

@@ -12,6 +12,9 @@ namespace {
 using vorel_test::Outcome;
 using vorel_test::runVorelpaint;
 using vorel_test::TempDir;
+using vorelstyle::Effect;
+using vorelstyle::Stroke;
+using vorelstyle::Style;
 
 TEST(Presets, TogetherShowEveryEffectAndStrokePosition) {
     std::set<std::string> effects;

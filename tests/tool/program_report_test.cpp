@@ -17,6 +17,7 @@ using vorel_test::readBytes;
 using vorel_test::runVorelpaint;
 using vorel_test::runVorelpaintOnTerminal;
 using vorel_test::TempDir;
+using voreltext::Image;
 using Words = std::vector<std::string>;
 
 std::string printed(const Words& arguments) {

@@ -19,6 +19,7 @@ using vorel_test::readBytes;
 using vorel_test::runVorelpaint;
 using vorel_test::runVorelpaintInto;
 using vorel_test::TempDir;
+using voreltext::Image;
 using Words = std::vector<std::string>;
 
 const std::string kPngSignature = "\x89PNG\r\n\x1A\n";

@@ -2,8 +2,6 @@
 
 #include <gtest/gtest.h>
 
-#include "console.h"
-
 namespace vorelpaint {
 namespace {
 
@@ -19,10 +17,6 @@ TEST(Progress, MoreThanTheTotal_StaysWithinTheBar) {
 
 TEST(Progress, UnknownTotal_IsACount) {
     EXPECT_EQ(Progress::line(7, 0, "jobs"), "7 jobs");
-}
-
-TEST(Console, Printable_HasNoControlCharacters) {
-    EXPECT_EQ(printable("a\nb\x1B[2J\x7F\xC3\xA9"), "a b [2J \xC3\xA9");
 }
 
 }  // namespace

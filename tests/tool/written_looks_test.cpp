@@ -6,10 +6,8 @@
 #include <ostream>
 #include <string>
 
-#include "font_finder.h"
+#include "font_choice.h"
 #include "painting.h"
-#include "run.h"
-#include "utf8.h"
 
 #define VOREL_WRITTEN_LOOK(function, style) void function(VFontEffect::VFEffect& look);
 #include "written_looks.inc"
@@ -17,6 +15,12 @@
 
 namespace vorelpaint {
 namespace {
+
+using vorelstyle::Look;
+using voreltext::Align;
+using voreltext::Font;
+using voreltext::Image;
+using voreltext::TextLayout;
 
 struct WrittenLook {
     const char* name;
@@ -36,18 +40,6 @@ constexpr WrittenLook kLooks[] = {
 
 class WrittenLooks : public ::testing::TestWithParam<WrittenLook> {};
 
-Image paintWith(VFontEffect::VFEffect& effects, const TextLayout& text) {
-    const Margins margins{effects.getLeftOffset(), effects.getTopOffset(), effects.getRightOffset(),
-                          effects.getBottomOffset()};
-    Run run(effects, {text.inkBox(), margins, 2});
-    run.begin();
-    for (size_t i = 0; i < text.glyphCount(); ++i)
-        run.draw(text.rasterise(i));
-    effects.doEffectPostProcessing();
-    run.merge();
-    return run.picture();
-}
-
 TEST_P(WrittenLooks, PaintTheSamePixels) {
     Options options;
     options.style = GetParam().style;
@@ -58,9 +50,9 @@ TEST_P(WrittenLooks, PaintTheSamePixels) {
     EXPECT_EQ(look.key(), key.get());
 
     const Font font(findFont("DejaVu Sans"), 64);
-    const TextLayout text(font, decodeUtf8("Quick\nfox"), Align::center);
-    const Image expected = look.paint(text, 2);
-    const Image painted = paintWith(written, text);
+    const TextLayout text(font, voreltext::decodeUtf8("Quick\nfox"), Align::center);
+    const Image expected = paint(look.effects(), text, 2);
+    const Image painted = paint(written, text, 2);
     EXPECT_EQ(painted.width, expected.width);
     EXPECT_EQ(painted.height, expected.height);
     EXPECT_TRUE(painted.pixels == expected.pixels);

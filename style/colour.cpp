@@ -1,0 +1,16 @@
+#include "style/colour.h"
+
+#include <charconv>
+
+namespace vorelstyle {
+
+std::optional<uint32_t> parseColour(std::string_view text) {
+    if (text.size() != 7 || text.front() != '#') return std::nullopt;
+    uint32_t colour = 0;
+    const char* end = text.data() + text.size();
+    const auto [stop, error] = std::from_chars(text.data() + 1, end, colour, 16);
+    if (error != std::errc{} || stop != end) return std::nullopt;
+    return colour;
+}
+
+}  // namespace vorelstyle

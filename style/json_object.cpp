@@ -1,0 +1,282 @@
+#include "style/json_object.h"
+
+#include <algorithm>
+#include <cmath>
+#include <nlohmann/json.hpp>
+#include <set>
+#include <sstream>
+#include <utility>
+
+#include "style/colour.h"
+#include "style/error.h"
+#include "style/message.h"
+
+namespace vorelstyle {
+namespace {
+
+using Json = nlohmann::ordered_json;
+
+/// A test of a value's type, such as &Json::is_number.
+using TypeTest = bool (Json::*)() const noexcept;
+
+constexpr size_t kMaxQuoted = 40;
+constexpr size_t kMaxPath = 120;
+
+/// Cut so that it fits into a message.
+std::string shortened(std::string text, size_t maxSize) {
+    if (text.size() > maxSize) text.replace(maxSize, std::string::npos, "...");
+    return text;
+}
+
+/// As JSON, in ASCII and short enough for a message.
+std::string quoted(const Json& value) {
+    return shortened(value.dump(-1, ' ', true), kMaxQuoted);
+}
+
+/// A key from a file as it may stand in a message: like a quoted value, without the quotes unless
+/// nothing stands between them.
+std::string escaped(const std::string& key) {
+    if (key.empty()) return "\"\"";
+    const std::string text = Json(key).dump(-1, ' ', true);
+    return text.substr(1, std::min(text.size() - 2, kMaxQuoted));
+}
+
+std::string under(const std::string& path, std::string_view key) {
+    return path + (path.empty() ? "" : ".") + std::string(key);
+}
+
+std::string withArticle(const Json& value) {
+    std::string type = value.type_name();
+    if (type == "null") return type;
+    return (type == "object" || type == "array" ? "an " : "a ") + type;
+}
+
+std::string wrongType(const std::string& expected, const Json& value) {
+    return "must be " + expected + ", not " + withArticle(value);
+}
+
+/// "a number from 0 to 100" of the noun "a number from".
+std::string between(const char* noun, Range range) {
+    std::ostringstream text;
+    text << noun << ' ' << range.low << " to " << range.high;
+    return text.str();
+}
+
+std::string outOfRange(const Json& value, Range range) {
+    return quoted(value) + between(" is out of range,", range);
+}
+
+bool contains(Range range, double value) {
+    return value >= range.low && value <= range.high;
+}
+
+/// Refuses a second key of the same name: the later one would silently replace the earlier.
+class DuplicateKeys {
+  public:
+    bool operator()(int depth, Json::parse_event_t event, const Json& parsed) {
+        const auto level = static_cast<size_t>(depth);
+        switch (event) {
+            case Json::parse_event_t::object_start:
+            case Json::parse_event_t::array_start:
+                countElement(level);
+                mLevels.resize(std::max(mLevels.size(), level + 2));
+                mLevels[level + 1] = {};
+                break;
+            case Json::parse_event_t::value:
+                countElement(level);
+                break;
+            case Json::parse_event_t::key:
+                addKey(level, parsed.get<std::string>());
+                break;
+            default:
+                break;
+        }
+        return true;
+    }
+
+  private:
+    /// An object or array that is being read.
+    struct Level {
+        std::set<std::string> keys;
+        std::string key;      ///< the last one; arrays have none
+        size_t elements = 0;  ///< values begun so far
+    };
+
+    void countElement(size_t level) { ++mLevels[level].elements; }
+
+    void addKey(size_t level, const std::string& key) {
+        if (!mLevels[level].keys.insert(key).second) {
+            throw StyleError(shortened(under(pathTo(level), escaped(key)), kMaxPath) +
+                             ": key given twice");
+        }
+        mLevels[level].key = key;
+    }
+
+    /// The path of the object at this depth; the root, at depth 1, has none.
+    std::string pathTo(size_t level) const {
+        std::string path;
+        for (size_t i = 1; i < level && path.size() <= kMaxPath; ++i) {
+            const Level& around = mLevels[i];
+            if (around.keys.empty()) {
+                path.append("[").append(std::to_string(around.elements - 1)).append("]");
+            } else {
+                path = under(path, escaped(around.key));
+            }
+        }
+        return path;
+    }
+
+    std::vector<Level> mLevels = std::vector<Level>(1);  ///< by depth; the first holds the root
+};
+
+/// "[json.exception.parse_error.101] parse error at line 3, column 5: fault" without its preface.
+std::string syntaxFault(const std::string& message) {
+    const size_t line = message.find("line ");
+    if (line != std::string::npos) return message.substr(line);
+    const size_t bracket = message.find("] ");
+    return bracket == std::string::npos ? message : message.substr(bracket + 2);
+}
+
+Json parse(std::string_view text) {
+    try {
+        return Json::parse(text.begin(), text.end(), DuplicateKeys());
+    } catch (const Json::exception& error) {
+        throw StyleError("no valid JSON: " + syntaxFault(error.what()));
+    }
+}
+
+const Json& nodeAt(const void* node) {
+    return *static_cast<const Json*>(node);
+}
+
+/// The key's value in the node of `object`, of the tested type; null when it is missing and may be.
+const Json* find(const JsonObject& object, const Json& node, std::string_view key, bool optional,
+                 TypeTest hasType, const std::string& expected) {
+    const auto found = node.find(key);
+    if (found == node.end()) {
+        if (!optional) object.fail(key, "missing; " + expected);
+        return nullptr;
+    }
+    const Json& value = *found;
+    if (!(value.*hasType)()) object.fail(key, wrongType(expected, value));
+    return &value;
+}
+
+}  // namespace
+
+struct JsonDocument::Tree {
+    Json root;
+};
+
+JsonDocument::JsonDocument(std::string_view text) : mTree(new Tree{parse(text)}) {}
+
+JsonDocument::~JsonDocument() = default;
+
+JsonValue JsonDocument::root() const {
+    return JsonValue(&mTree->root);
+}
+
+bool JsonValue::isObject() const {
+    return nodeAt(mNode).is_object();
+}
+
+std::string JsonValue::quoted() const {
+    return vorelstyle::quoted(nodeAt(mNode));
+}
+
+JsonObject::JsonObject(JsonValue value, std::string path, const std::vector<std::string_view>& known)
+    : mObject(value), mPath(std::move(path)) {
+    const Json& node = nodeAt(value.mNode);
+    if (!node.is_object()) {
+        throw StyleError((mPath.empty() ? "" : mPath + ": ") + wrongType("an object", node));
+    }
+    for (const auto& item : node.items()) {
+        if (std::find(known.begin(), known.end(), item.key()) != known.end()) continue;
+        throw StyleError(pathOf(escaped(item.key())) + ": unknown key; known are " + joined(known));
+    }
+}
+
+std::vector<std::string_view> JsonObject::keys() const {
+    std::vector<std::string_view> keys;
+    for (const auto& item : nodeAt(mObject.mNode).items())
+        keys.emplace_back(item.key());
+    return keys;
+}
+
+bool JsonObject::has(std::string_view key) const {
+    return nodeAt(mObject.mNode).contains(key);
+}
+
+JsonValue JsonObject::value(std::string_view key) const {
+    return JsonValue(&*nodeAt(mObject.mNode).find(key));
+}
+
+std::string JsonObject::pathOf(std::string_view key) const {
+    return under(mPath, key);
+}
+
+void JsonObject::fail(std::string_view key, const std::string& fault) const {
+    throw StyleError(pathOf(key) + ": " + fault);
+}
+
+float JsonObject::number(std::string_view key, Range range, std::optional<float> fallback) const {
+    const Json* value = find(*this, nodeAt(mObject.mNode), key, fallback.has_value(), &Json::is_number,
+                             between("a number from", range));
+    if (value == nullptr) return *fallback;
+    if (!contains(range, value->get<double>())) fail(key, outOfRange(*value, range));
+    return value->get<float>();
+}
+
+int JsonObject::integer(std::string_view key, Range range, std::optional<int> fallback) const {
+    const std::string expected = between("a whole number from", range);
+    const Json* value =
+        find(*this, nodeAt(mObject.mNode), key, fallback.has_value(), &Json::is_number, expected);
+    if (value == nullptr) return *fallback;
+    const auto number = value->get<double>();
+    if (!contains(range, number)) fail(key, outOfRange(*value, range));
+    // JSON knows one kind of number: 1.0 is as whole as 1.
+    if (number != std::trunc(number)) fail(key, "must be " + expected + ", not " + quoted(*value));
+    return static_cast<int>(number);
+}
+
+uint32_t JsonObject::color(std::string_view key, std::optional<uint32_t> fallback) const {
+    const Json* value = find(*this, nodeAt(mObject.mNode), key, fallback.has_value(), &Json::is_string,
+                             "a colour \"#RRGGBB\"");
+    if (value == nullptr) return *fallback;
+    const std::optional<uint32_t> colour = parseColour(value->get_ref<const std::string&>());
+    if (!colour) fail(key, quoted(*value) + " is no colour; write \"#RRGGBB\"");
+    return *colour;
+}
+
+std::string JsonObject::string(std::string_view key) const {
+    return find(*this, nodeAt(mObject.mNode), key, false, &Json::is_string, "a string")
+        ->get<std::string>();
+}
+
+std::string JsonObject::numeral(std::string_view key) const {
+    return find(*this, nodeAt(mObject.mNode), key, false, &Json::is_number, "a number")->dump();
+}
+
+int JsonObject::choice(std::string_view key, std::initializer_list<std::string_view> names) const {
+    const Json* value =
+        find(*this, nodeAt(mObject.mNode), key, false, &Json::is_string, "one of " + joined(names));
+    const auto* found = std::find(names.begin(), names.end(), value->get_ref<const std::string&>());
+    if (found == names.end()) fail(key, quoted(*value) + " is none of " + joined(names));
+    return static_cast<int>(found - names.begin());
+}
+
+std::vector<JsonValue> JsonObject::array(std::string_view key, Range sizes) const {
+    const Json* value = find(*this, nodeAt(mObject.mNode), key, false, &Json::is_array,
+                             between("an array of", sizes) + " elements");
+    if (!contains(sizes, static_cast<double>(value->size()))) {
+        fail(key, "has " + std::to_string(value->size()) + " elements" + between(",", sizes) +
+                      " are allowed");
+    }
+    std::vector<JsonValue> elements;
+    elements.reserve(value->size());
+    for (const Json& element : *value)
+        elements.push_back(JsonValue(&element));
+    return elements;
+}
+
+}  // namespace vorelstyle

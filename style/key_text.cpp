@@ -1,0 +1,145 @@
+#include "style/key_text.h"
+
+#include <array>
+#include <cstdint>
+#include <cstdio>
+
+namespace vorelstyle {
+namespace {
+
+/// Reads the characters behind a fragment's letter. Each carries up to seven bits; its top bit is set,
+/// which tells it from a letter.
+class FragmentReader {
+  public:
+    explicit FragmentReader(std::string_view characters) : mRest(characters) {}
+
+    bool atEnd() const { return mRest.empty(); }
+
+    unsigned int small() {
+        if (mRest.empty()) return 0;
+        const unsigned int value = static_cast<unsigned char>(mRest.front()) & 0x7FU;
+        mRest.remove_prefix(1);
+        return value;
+    }
+    unsigned int angle() {
+        const unsigned int high = small();
+        return high << 7 | small();
+    }
+    unsigned int nibbles(int count) {
+        unsigned int value = 0;
+        for (int i = 0; i < count; ++i)
+            value = value << 4 | small();
+        return value;
+    }
+    std::string colour() {
+        std::array<char, 10> text{};
+        std::snprintf(text.data(), text.size(), "#%08X", nibbles(8));
+        return text.data();
+    }
+
+  private:
+    std::string_view mRest;
+};
+
+std::string number(const char* name, unsigned int value) {
+    return std::string(name) + " " + std::to_string(value);
+}
+
+std::string stops(FragmentReader& reader) {
+    std::string text;
+    while (!reader.atEnd()) {
+        text += ", " + reader.colour();
+        text += " at " + std::to_string(reader.small()) + "%";
+    }
+    return text;
+}
+
+std::string readFill(FragmentReader& reader) {
+    return "colour " + reader.colour();
+}
+
+std::string readShadow(FragmentReader& reader) {
+    std::string text = number("angle", reader.angle());
+    text += number(", distance", reader.small());
+    text += number(", size", reader.small());
+    return text + ", colour " + reader.colour();
+}
+
+std::string readGlow(FragmentReader& reader) {
+    std::string text = number("size", reader.small());
+    text += ", colour " + reader.colour();
+    return text + stops(reader);
+}
+
+std::string readGradient(FragmentReader& reader) {
+    std::string text = number("angle", reader.angle());
+    text += number(", scale", reader.nibbles(2)) + "%";
+    return text + stops(reader);
+}
+
+std::string readStroke(FragmentReader& reader) {
+    std::string text = number("size", reader.small());
+    text += ", colour " + reader.colour();
+    text += number(", style", reader.small());
+    const unsigned int position = reader.small();
+    return text + (position == 0 ? ", centred" : position == 1 ? ", outside" : ", inside");
+}
+
+struct Layout {
+    char letter;
+    int type;
+    std::string (*read)(FragmentReader& reader);
+};
+
+/// The effects that leave a fragment. A pattern leaves none, and bevel and emboss have no core.
+constexpr std::array<Layout, 8> kLayouts{{
+    {'S', 1, readShadow},
+    {'I', 2, readShadow},
+    {'G', 3, readGlow},
+    {'N', 4, readGlow},
+    {'L', 7, readGradient},
+    {'D', 8, readGradient},
+    {'K', 10, readStroke},
+    {'T', 12, readFill},
+}};
+
+bool isLetter(char c) {
+    return static_cast<unsigned char>(c) < 0x80;
+}
+
+KeyFragment readFragment(std::string_view fragment) {
+    FragmentReader reader(fragment.substr(1));
+    for (const Layout& layout : kLayouts) {
+        if (layout.letter == fragment.front()) {
+            return {layout.type, layout.letter, layout.read(reader)};
+        }
+    }
+    return {0, fragment.front(), ""};
+}
+
+}  // namespace
+
+std::vector<KeyFragment> keyFragments(std::string_view key) {
+    std::vector<KeyFragment> fragments;
+    while (!key.empty()) {
+        size_t length = 1;
+        while (length < key.size() && !isLetter(key[length]))
+            ++length;
+        fragments.push_back(readFragment(key.substr(0, length)));
+        key.remove_prefix(length);
+    }
+    return fragments;
+}
+
+std::string hexadecimal(std::string_view bytes) {
+    constexpr const char* kDigits = "0123456789abcdef";
+    std::string text;
+    for (const char c : bytes) {
+        const auto byte = static_cast<unsigned char>(c);
+        text += kDigits[byte >> 4];
+        text += kDigits[byte & 15];
+    }
+    return text;
+}
+
+}  // namespace vorelstyle

@@ -1,0 +1,42 @@
+#pragma once
+
+#include <voreleffect/VFEffect.h>
+
+#include <cstdint>
+#include <string>
+#include <vector>
+
+#include "style/pattern_image.h"
+#include "style/style.h"
+
+namespace vorelstyle {
+
+/// A style turned into a set of effects, ready to paint runs of text.
+class Look {
+  public:
+    /// `fill` is 0xRRGGBB; it and `textOpacity` are what the style's text takes. `load` is called,
+    /// before this returns, for a style with a pattern only. Throws StyleError when the pattern has no
+    /// picture.
+    Look(const Style& style, uint32_t fill, float textOpacity, const LoadImage& load = {});
+
+    /// The library's cache key of the look: bytes, mostly beyond ASCII.
+    const std::string& key() const { return mKey; }
+
+    /// Effects of the style that this library has no core for; they are not painted.
+    const std::vector<std::string>& unpainted() const { return mUnpainted; }
+
+    /// The set itself, to paint with. Not planned before the first picture.
+    VFontEffect::VFEffect& effects() { return mEffects; }
+    const VFontEffect::VFEffect& effects() const { return mEffects; }
+
+    /// The types of its effects (VFEffect.h) in the order in which they were added.
+    const std::vector<int>& added() const { return mAdded; }
+
+  private:
+    VFontEffect::VFEffect mEffects;
+    std::vector<int> mAdded;
+    std::string mKey;
+    std::vector<std::string> mUnpainted;
+};
+
+}  // namespace vorelstyle

@@ -1,0 +1,166 @@
+#include "style/write_cpp.h"
+
+#include <array>
+#include <charconv>
+#include <cstdio>
+#include <ostream>
+#include <string_view>
+#include <utility>
+#include <variant>
+
+#include "style/error.h"
+#include "style/message.h"
+
+namespace vorelstyle {
+namespace {
+
+constexpr size_t kMaxPatternPixels = size_t{1} << 16;
+constexpr size_t kBytesPerLine = 16;
+
+/// The shortest spelling that is read as the very same float: 0.6F, 100.
+std::string literal(float value) {
+    std::array<char, 32> text{};
+    const auto [end, error] = std::to_chars(text.data(), text.data() + text.size(), value);
+    const std::string_view digits(text.data(), static_cast<size_t>(end - text.data()));
+    const bool whole = digits.find_first_of(".e") == std::string_view::npos;
+    return std::string(digits) + (whole ? "" : "F");
+}
+
+std::string literal(int value) {
+    return std::to_string(value);
+}
+
+/// 0xRRGGBB.
+std::string colourLiteral(uint32_t colour) {
+    std::array<char, 16> text{};
+    std::snprintf(text.data(), text.size(), "0x%06X", colour);
+    return text.data();
+}
+
+/// A sentence in one line. A comment must not end with a backslash, which would take the next line in.
+std::string sentence(const std::string& text) {
+    const bool ended = !text.empty() && text.back() == '.';
+    return printable(text) + (ended ? "" : ".");
+}
+
+/// Writes the call of one effect, with the array that it needs before it.
+class CallWriter {
+  public:
+    CallWriter(std::ostream& out, const Style& style, uint32_t fill, float textOpacity,
+               const LoadImage& load)
+        : mOut(out), mStyle(style), mFill(fill), mTextOpacity(textOpacity), mLoad(load) {}
+
+    void operator()(const OuterShadow& e) const { shadow("addOuterShadowText", e); }
+    void operator()(const InnerShadow& e) const { shadow("addInnerShadowText", e); }
+    void operator()(const OuterGlow& e) const { glow("addOuterGlowText", "outerGlowStops", e); }
+    void operator()(const InnerGlow& e) const { glow("addInnerGlowText", "innerGlowStops", e); }
+    void operator()(const Bevel& e) const { relief("addBevelText", e); }
+    void operator()(const Emboss& e) const { relief("addEmbossText", e); }
+    void operator()(const LinearGradient& e) const {
+        const std::string array = stops("linearStops", e.gradient);
+        call("addLinearGradientText", literal(e.angle), literal(e.scale), literal(e.opacity), array);
+    }
+    void operator()(const RadialGradient& e) const {
+        const std::string array = stops("radialStops", e.gradient);
+        call("addRadialGradientText", literal(e.scale), literal(e.opacity), array);
+    }
+    void operator()(const Stroke& e) const {
+        call("addStrokeText", literal(e.size), colourLiteral(e.color), literal(e.opacity),
+             literal(e.strokeStyle), literal(e.position));
+    }
+    void operator()(const Pattern& e) const {
+        pixels(e, patternImage(mStyle, e, mLoad));
+        call("addPatternText", "&pattern", literal(e.scale), literal(e.opacity));
+    }
+    void operator()(const TextFill& e) const { fill(e.opacity * mTextOpacity); }
+
+    void fill(float opacity) const { call("addText", colourLiteral(mFill), literal(opacity)); }
+
+  private:
+    template <typename... Arguments>
+    void call(const char* name, const std::string& first, const Arguments&... others) const {
+        mOut << "    look." << name << "(" << first;
+        ((mOut << ", " << others), ...);
+        mOut << ");\n";
+    }
+
+    void shadow(const char* name, const Shadow& e) const {
+        call(name, literal(e.angle), literal(e.distance), literal(e.size), colourLiteral(e.color),
+             literal(e.opacity));
+    }
+
+    void glow(const char* name, const char* arrayName, const Glow& e) const {
+        const std::string array = stops(arrayName, e.gradient);
+        call(name, literal(e.size), colourLiteral(e.color), literal(e.opacity), array);
+    }
+
+    void relief(const char* name, const Relief& e) const {
+        mOut << "    // The library has no core for this one: it leaves no mark.\n";
+        call(name, literal(e.style), literal(e.size), literal(e.depth), literal(e.technique),
+             literal(e.direction), literal(e.soften), literal(e.opacity), literal(e.angle),
+             literal(e.altitude), colourLiteral(e.highlightColor), literal(e.highlightOpacity),
+             colourLiteral(e.shadowColor), literal(e.shadowOpacity));
+    }
+
+    /// Writes the array of the stops and returns the two arguments that hand it over.
+    std::string stops(const char* name, const Stops& stops) const {
+        if (stops.empty()) return "0, nullptr";
+        mOut << "    VFontEffect::VFGradient " << name << "[] = {\n";
+        for (const VFontEffect::VFGradient& stop : stops) {
+            mOut << "        {" << colourLiteral(stop.mColor) << ", " << literal(stop.mOpacity) << ", "
+                 << literal(stop.mLocation) << "},\n";
+        }
+        mOut << "    };\n";
+        return std::to_string(stops.size()) + ", " + name;
+    }
+
+    void pixels(const Pattern& e, const PatternImage& image) const {
+        if (image.pixels.size() > kMaxPatternPixels * 4) {
+            throw StyleError(faultPrefix(mStyle.name) + "pattern.image: has more than " +
+                             std::to_string(kMaxPatternPixels) +
+                             " pixels, too many to be written as C++");
+        }
+        mOut << "    // " << printable(e.image)
+             << " as A, R, G, B\n    static unsigned char pixels[] = {";
+        for (size_t at = 0; at < image.pixels.size(); ++at)
+            mOut << (at % kBytesPerLine == 0 ? "\n        " : " ") << int{image.pixels[at]} << ',';
+        mOut << "\n    };\n    VFontEffect::VFBitmap pattern(" << image.width << ", " << image.height
+             << ", pixels, 4);\n";
+    }
+
+    std::ostream& mOut;
+    const Style& mStyle;
+    uint32_t mFill;
+    float mTextOpacity;
+    const LoadImage& mLoad;
+};
+
+}  // namespace
+
+void writeCpp(std::ostream& out, const std::string& name, const Style& style, uint32_t fill,
+              float textOpacity, const LoadImage& load) {
+    out << "#include <voreleffect/voreleffect.h>\n\n";
+    if (!style.description.empty()) out << "/// " << sentence(style.description) << '\n';
+    out << "/// For an empty set; VFEffect.h shows how a set paints a run.\nvoid " << name
+        << "(VFontEffect::VFEffect& look) {\n    look.setTextOpacity(" << literal(textOpacity) << ");\n";
+    const CallWriter writer(out, style, fill, textOpacity, load);
+    for (const Effect& effect : style.effects)
+        std::visit(writer, effect);
+    if (!hasTextFill(style)) writer.fill(textOpacity);
+    out << "}\n";
+}
+
+std::string functionName(const std::string& look) {
+    std::string name = "add";
+    bool startsWord = true;
+    for (const char c : look) {
+        const bool lower = c >= 'a' && c <= 'z';
+        const bool upper = c >= 'A' && c <= 'Z';
+        const bool digit = c >= '0' && c <= '9';
+        if (lower || upper || digit) name += static_cast<char>(lower && startsWord ? c - 'a' + 'A' : c);
+        startsWord = !(lower || upper || digit);
+    }
+    return name == "add" ? "addLook" : name;
+}
+
+}  // namespace vorelstyle

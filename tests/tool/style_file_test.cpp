@@ -1,0 +1,66 @@
+#include "style_file.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+
+#include "error.h"
+#include "program.h"
+
+namespace vorelpaint {
+namespace {
+
+using vorelstyle::Look;
+using vorelstyle::Style;
+using vorelstyle::StyleError;
+
+/// A style whose file lies among the presets, with this image for its pattern.
+Style patternStyle(const std::string& image) {
+    return vorelstyle::parseStyle(R"({"pattern": {"image": ")" + image + R"("}})",
+                                  VORELPAINT_PRESETS "/a.json");
+}
+
+TEST(StyleFile, Faults_NameTheFile) {
+    const vorel_test::TempDir dir;
+    const std::string path = dir.write("bad.json", R"({"color": 1})");
+    try {
+        loadStyle(path);
+        FAIL() << "read";
+    } catch (const StyleError& error) {
+        EXPECT_EQ(std::string(error.what()).rfind("style '" + path + "': color: ", 0), 0U)
+            << error.what();
+    }
+}
+
+TEST(StyleFile, FileThatCannotBeRead_IsAToolError) {
+    EXPECT_THROW(loadStyle("no/such.json"), ToolError);
+}
+
+TEST(StyleFile, Images_LieBesideTheFile) {
+    const Style style = patternStyle("tiles.png");
+    const vorelstyle::PatternImage image = imagesOf(style)("tiles.png");
+    EXPECT_GT(image.width, 0);
+    EXPECT_EQ(image.pixels.size(), static_cast<size_t>(image.width * image.height * 4));
+    EXPECT_EQ(Look(style, 0, 1, imagesOf(style)).added().front(), vorelstyle::kPatternType);
+}
+
+TEST(StyleFile, PatternFaults_NameTheStyleFile) {
+    try {
+        const Style style =
+            vorelstyle::parseStyle(R"({"pattern": {"image": "none.png"}})", "looks/a.json");
+        const Look look(style, 0, 1, imagesOf(style));
+        FAIL() << "painted without its pattern";
+    } catch (const StyleError& error) {
+        EXPECT_EQ(std::string(error.what()).rfind("style 'looks/a.json': pattern.image: ", 0), 0U);
+    }
+}
+
+TEST(StyleFile, PatternThatCannotBeRead_IsAStyleError) {
+    for (const char* image : {"none.png", ".", "gold.json"}) {
+        const Style style = patternStyle(image);
+        EXPECT_THROW(Look(style, 0, 1, imagesOf(style)), StyleError) << image;
+    }
+}
+
+}  // namespace
+}  // namespace vorelpaint

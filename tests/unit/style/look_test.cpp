@@ -1,0 +1,86 @@
+#include "style/look.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+
+#include "style/error.h"
+
+namespace vorelstyle {
+namespace {
+
+Style styleOf(const std::string& json) {
+    return parseStyle(json);
+}
+
+/// A cache key's 8-character spelling of a colour word: one character a nibble, top bit set.
+std::string keyWord(uint32_t word) {
+    std::string text;
+    for (int shift = 28; shift >= 0; shift -= 4) {
+        text += static_cast<char>(0x80U | ((word >> shift) & 15U));
+    }
+    return text;
+}
+
+TEST(Look, PlainText_HasTheKeyOfItsFill) {
+    EXPECT_EQ(Look(styleOf("{}"), 0x123456, 1).key(), "T" + keyWord(0xFF123456));
+}
+
+TEST(Look, TextOpacity_EntersTheKeyPremultiplied) {
+    // Half opacity is alpha 128, and (128 * (0xFF + 1)) >> 8 = 0x80.
+    EXPECT_EQ(Look(styleOf("{}"), 0xFF0000, 0.5F).key(), "T" + keyWord(0x80800000));
+}
+
+TEST(Look, TextFillOfTheStyle_KeepsItsPlaceAndTakesTheChosenColour) {
+    const Style style = styleOf(R"({"text": {"color": "#111111"},
+                                    "stroke": {"size": 2, "color": "#0000FF", "position": "outside"}})");
+    const std::string stroke = "K\x82" + keyWord(0xFF0000FF) + "\x80\x81";
+    EXPECT_EQ(Look(style, 0x00FF00, 1).key(), "T" + keyWord(0xFF00FF00) + stroke);
+}
+
+TEST(Look, FillWithoutAPlace_ComesLast) {
+    const Style style = styleOf(R"({"stroke": {"size": 2, "color": "#0000FF", "position": "outside"}})");
+    EXPECT_EQ(Look(style, 0, 1).key().back(), '\x80');
+    EXPECT_EQ(Look(style, 0, 1).key().find('T'), Look(style, 0, 1).key().size() - 9);
+}
+
+TEST(Look, EffectsWithoutACore_AreNamed) {
+    const std::string relief =
+        R"({"size": 1, "angle": 0, "altitude": 0, "highlightColor": "#000000", "shadowColor": "#000000"})";
+    const Look look(styleOf(R"({"bevel": )" + relief + R"(, "emboss": )" + relief + "}"), 0, 1);
+    EXPECT_EQ(look.unpainted(), (std::vector<std::string>{"bevel", "emboss"}));
+}
+
+/// The message with which a style with a pattern is refused whose pictures come from `load`.
+std::string faultWith(const LoadImage& load) {
+    try {
+        const Look look(parseStyle(R"({"pattern": {"image": "a.png"}})", "looks/a.json"), 0, 1, load);
+        return "";
+    } catch (const StyleError& error) {
+        return error.what();
+    }
+}
+
+TEST(Look, PatternFaults_NameTheStyle) {
+    const std::string where = "style 'looks/a.json': pattern.image: ";
+    EXPECT_EQ(faultWith([](const std::string& image) -> PatternImage {
+                  throw StyleError(image + " is torn");
+              }),
+              where + "a.png is torn");
+    EXPECT_EQ(faultWith(nullptr), where + "there is nothing to load 'a.png' with");
+}
+
+TEST(Look, PatternPictureOfAnotherSizeThanItsPixels_IsRefused) {
+    const auto withPixels = [](int width, int height, size_t bytes) {
+        return faultWith([=](const std::string&) {
+            return PatternImage{width, height, std::vector<uint8_t>(bytes)};
+        });
+    };
+    EXPECT_EQ(withPixels(2, 3, 24), "");
+    for (const size_t bytes : {size_t{0}, size_t{20}, size_t{23}, size_t{25}, size_t{28}})
+        EXPECT_NE(withPixels(2, 3, bytes), "") << bytes;
+    EXPECT_NE(withPixels(-2, -3, 24), "");
+}
+
+}  // namespace
+}  // namespace vorelstyle

@@ -1,0 +1,29 @@
+#pragma once
+
+#include <memory>
+#include <string>
+
+#include "text/font.h"
+
+namespace voreltext {
+
+/// The fonts that are installed, as fontconfig knows them; the one part of this library that needs it.
+class SystemFonts {
+  public:
+    /// Reads the configuration, which takes a while. fontconfig itself may complain about it on standard
+    /// error; without any, no family is found.
+    SystemFonts();
+    ~SystemFonts();
+    SystemFonts(const SystemFonts&) = delete;
+    SystemFonts& operator=(const SystemFonts&) = delete;
+
+    /// The font of a family as fontconfig writes it ("DejaVu Serif", "DejaVu Sans:bold"). Throws
+    /// TextError when there is no such family.
+    FontFile find(const std::string& request) const;
+
+  private:
+    struct Config;
+    std::unique_ptr<Config> mConfig;
+};
+
+}  // namespace voreltext

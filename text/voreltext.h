@@ -1,0 +1,28 @@
+#pragma once
+
+#include "text/error.h"
+#include "text/font.h"
+#include "text/image.h"
+#include "text/run.h"
+#include "text/system_fonts.h"
+#include "text/text_layout.h"
+#include "text/utf8.h"
+
+/// Text from a font to pixels: fonts are opened, lines shaped and set, glyphs rasterised, and painted by
+/// a set of effects.
+///
+///     using namespace voreltext;
+///     const Font font(FontBytes{data, size}, 96);          // or FontFile{"font.ttf"}
+///     const TextLayout text(font, decodeUtf8("Two\nlines"), Align::center);
+///     VFontEffect::VFEffect effects;
+///     effects.addStrokeText(4, 0xFFFFFF, 1, 0, 1);
+///     effects.addText(0x3366CC, 1);                        // the fill
+///     const Image picture = paint(effects, text, 8);       // premultiplied R, G, B, A
+///
+/// `paint` is the short way; Frame and Run are its steps. SystemFonts finds the file of an installed
+/// family. It is a library of its own, voreltext_system, that needs fontconfig; all else does without.
+///
+/// Nothing is printed, no file is opened but a FontFile, and no state is kept between calls: threads may
+/// use the library at once, each with objects of its own. What cannot be done throws TextError; memory
+/// that runs out throws std::bad_alloc. Rows lie from top to bottom, boxes are half-open and in pixels.
+namespace voreltext {}

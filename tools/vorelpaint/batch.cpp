@@ -1,0 +1,161 @@
+#include "batch.h"
+
+#include <exception>
+#include <new>
+#include <string_view>
+#include <vector>
+
+#include "console.h"
+#include "error.h"
+#include "line_reader.h"
+#include "painting.h"
+#include "progress.h"
+#include "settings.h"
+#include "style/vorelstyle.h"
+
+namespace vorelpaint {
+namespace {
+
+using vorelstyle::JsonDocument;
+using vorelstyle::JsonObject;
+using vorelstyle::JsonValue;
+using vorelstyle::Style;
+using vorelstyle::StyleError;
+
+/// Room for the largest text and the largest style.
+constexpr size_t kMaxJobBytes = size_t{1} << 18;
+
+bool isBlank(const std::string& line) {
+    return line.find_first_not_of(" \t\r") == std::string::npos;
+}
+
+/// A job is one line, so what a syntax error says of lines is left out.
+JsonDocument parseLine(const std::string& line) {
+    if (line.size() > kMaxJobBytes) {
+        throw ToolError("longer than " + std::to_string(kMaxJobBytes) + " bytes");
+    }
+    try {
+        return JsonDocument(line);
+    } catch (const StyleError& error) {
+        constexpr std::string_view kPlace = "line 1, ";
+        std::string fault = error.what();
+        const size_t place = fault.find(kPlace);
+        if (place != std::string::npos) fault.erase(place, kPlace.size());
+        throw ToolError(fault);
+    }
+}
+
+std::vector<std::string_view> jobKeys() {
+    std::vector<std::string_view> keys;
+    for (const Setting& setting : settings()) {
+        if (setting.inJobs) keys.emplace_back(setting.name);
+    }
+    return keys;
+}
+
+/// Of two keys that exclude each other, the one of the job takes the place of the other of the command
+/// line.
+bool hasEither(const JsonObject& job, const char* one, const char* other) {
+    if (job.has(one) && job.has(other)) job.fail(other, std::string("stands beside ") + one);
+    return job.has(one) || job.has(other);
+}
+
+Options withoutWhatTheJobSays(const JsonObject& job, const Options& common) {
+    Options options = common;
+    if (hasEither(job, "text", "text-file")) {
+        options.text.reset();
+        options.textFile.reset();
+    }
+    if (hasEither(job, "style", "preset")) {
+        options.style.reset();
+        options.preset.reset();
+    }
+    return options;
+}
+
+Style readInlineStyle(JsonValue json) {
+    try {
+        return readStyle(json);
+    } catch (const StyleError& error) {
+        throw ToolError(std::string("style.") + error.what());
+    }
+}
+
+std::string readString(const JsonObject& job, const Setting& setting) {
+    std::string text = job.string(setting.name);
+    if (setting.isPositional) return text;
+    if (text.find('\0') != std::string::npos) job.fail(setting.name, "has a NUL character");
+    if (text == "-") job.fail(setting.name, "must name a file: jobs have no standard input or output");
+    return text;
+}
+
+void readKey(const JsonObject& job, const Setting& setting, Options& options) {
+    const bool isNumber = setting.kind == Setting::Kind::number;
+    const std::string value = isNumber ? job.numeral(setting.name) : readString(job, setting);
+    try {
+        setting.read(options, value);
+    } catch (const ToolError& error) {
+        job.fail(setting.name, error.what());
+    }
+}
+
+void requirePicture(const Options& options) {
+    if (!options.output) throw ToolError("output: missing; the PNG file to write");
+    if (!options.text && !options.textFile) {
+        throw ToolError("text: missing; a job has text or text-file");
+    }
+}
+
+Options readJob(const JsonObject& job, const Options& common) {
+    Options options = withoutWhatTheJobSays(job, common);
+    for (const std::string_view key : job.keys()) {
+        if (key == "style" && job.value(key).isObject()) {
+            options.inlineStyle = readInlineStyle(job.value(key));
+        } else {
+            readKey(job, settingNamed(key), options);
+        }
+    }
+    requirePicture(options);
+    return options;
+}
+
+bool paintJob(const std::string& line, const Options& common, const Warn& sayHere) {
+    try {
+        paintPicture(parseJob(line, common), sayHere);
+        return true;
+    } catch (const std::bad_alloc&) {
+        sayHere("not enough memory");
+    } catch (const std::exception& error) {
+        sayHere(error.what());
+    }
+    return false;
+}
+
+}  // namespace
+
+Options parseJob(const std::string& line, const Options& common) {
+    const JsonDocument document = parseLine(line);
+    try {
+        return readJob(JsonObject(document.root(), "", jobKeys()), common);
+    } catch (const StyleError& error) {
+        throw ToolError(error.what());
+    }
+}
+
+BatchResult paintBatch(const Options& common) {
+    LineReader lines(common.batch.value());
+    Progress progress("pictures", hasTerminal() ? lines.countAhead() : 0);
+    BatchResult result;
+    while (const std::optional<std::string> line = lines.next(kMaxJobBytes)) {
+        if (isBlank(*line)) continue;
+        const auto sayHere = [&](const std::string& what) {
+            say("line " + std::to_string(lines.number()) + ": " + what);
+        };
+        ++result.jobs;
+        if (!paintJob(*line, common, sayHere)) ++result.failed;
+        progress.advance();
+    }
+    return result;
+}
+
+}  // namespace vorelpaint

@@ -1,0 +1,59 @@
+#include "console.h"
+
+#include <sys/ioctl.h>
+#include <unistd.h>
+
+#include <csignal>
+#include <iostream>
+#include <string_view>
+
+#include "style/vorelstyle.h"
+
+namespace vorelpaint {
+namespace {
+
+constexpr size_t kUsualWidth = 80;
+constexpr std::string_view kErase = "\r\x1B[K";
+
+std::string gStatus;
+volatile std::sig_atomic_t gStatusShown = 0;
+
+size_t terminalWidth() {
+    winsize size{};
+    const bool known = ::ioctl(STDERR_FILENO, TIOCGWINSZ, &size) == 0 && size.ws_col > 0;
+    return known ? size.ws_col : kUsualWidth;
+}
+
+void drawStatus() {
+    if (gStatus.empty()) return;
+    gStatusShown = 1;
+    std::cerr << gStatus.substr(0, terminalWidth() - 1) << std::flush;
+}
+
+}  // namespace
+
+void say(const std::string& line) {
+    eraseStatus();
+    std::cerr << "vorelpaint: " << vorelstyle::printable(line) << '\n';
+    drawStatus();
+}
+
+bool hasTerminal() {
+    return ::isatty(STDERR_FILENO) == 1;
+}
+
+void showStatus(const std::string& line) {
+    if (!hasTerminal()) return;
+    eraseStatus();
+    gStatus = line;
+    drawStatus();
+}
+
+void eraseStatus() {
+    if (gStatusShown == 0) return;
+    gStatusShown = 0;
+    // Nothing can be done about a terminal that is gone.
+    [[maybe_unused]] const ssize_t written = ::write(STDERR_FILENO, kErase.data(), kErase.size());
+}
+
+}  // namespace vorelpaint

@@ -1,0 +1,67 @@
+#include "help_text.h"
+
+#include "settings.h"
+#include "style/vorelstyle.h"
+#include "wrap.h"
+
+namespace vorelpaint {
+namespace {
+
+constexpr size_t kHelpWidth = 100;
+
+std::string jobKeys() {
+    std::vector<std::string> keys;
+    for (const Setting& setting : settings()) {
+        if (setting.inJobs) keys.push_back(setting.name);
+    }
+    return vorelstyle::joined(keys);
+}
+
+}  // namespace
+
+const std::vector<std::string>& exampleCommands() {
+    static const std::vector<std::string> commands{
+        R"(vorelpaint --preset gold -o title.png "Once upon a time")",
+        R"(vorelpaint --style look.json --size 160 --color '#3366CC' -o title.png "Title")",
+        R"(vorelpaint --preset subtitle --align center --text-file lines.txt -o lines.png)",
+        R"(fortune | vorelpaint --preset chalk --background '#204030' --text-file - -o - > page.png)",
+        R"(vorelpaint --preset neon -o cold.png -- "-40 degrees")",
+        R"(vorelpaint --batch titles.jsonl --font 'DejaVu Sans:bold')",
+        R"(vorelpaint --sheet --background '#23272E' -o presets.png "Type")",
+        R"(vorelpaint --preset gold --explain "Type")",
+        R"(vorelpaint --preset gold --write-cpp > gold.cpp)",
+        R"(vorelpaint --list-presets)"};
+    return commands;
+}
+
+const std::vector<Note>& notes() {
+    static const std::vector<Note> all{
+        {"Style files",
+         "A style file is a JSON object with one object per effect (outerShadow, innerShadow, "
+         "outerGlow, "
+         "innerGlow, linearGradient, radialGradient, stroke, pattern, text, bevel, emboss); the last "
+         "lies "
+         "on top. The presets are style files to start from; docs/style-files.md lists every key."},
+        {"Batches",
+         "Each line of a batch is a JSON object with the keys of one picture: " + jobKeys() +
+             ". They mean what the options of these names mean; style may also be a style itself. What "
+             "a "
+             "job does not say, it takes from the command line. Paths start at the working directory. A "
+             "line that fails is reported with its number, and the next one goes on."},
+        {"Text", "Text that begins with - stands behind --."},
+        {"Exit codes",
+         "0 done. 2 failed, with one line on standard error; after a batch, with one for each job that "
+         "failed and their count. Whatever ends the program, no half-written picture is left."}};
+    return all;
+}
+
+std::string helpFooter() {
+    std::string footer = "Examples:";
+    for (const std::string& command : exampleCommands())
+        footer += "\n  " + command;
+    for (const Note& note : notes())
+        footer += "\n\n" + note.heading + ":\n" + wrapped(note.text, kHelpWidth, 2);
+    return footer;
+}
+
+}  // namespace vorelpaint
