@@ -31,9 +31,7 @@ bool runsHere(CpuLevel level) {
 
 #else
 
-bool runsHere(CpuLevel /*level*/) {
-    return true;
-}
+bool runsHere(CpuLevel /*level*/) { return true; }
 
 #endif
 

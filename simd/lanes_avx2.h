@@ -20,9 +20,7 @@ using X86Floats = __m256;
 
 namespace VFontEffect::internal::VOREL_LEVEL {
 
-VOREL_INLINE bool allZero(U8s v) {
-    return _mm256_testz_si256(ints(v), ints(v)) != 0;
-}
+VOREL_INLINE bool allZero(U8s v) { return _mm256_testz_si256(ints(v), ints(v)) != 0; }
 constexpr int kLaneBits = 1;
 VOREL_INLINE uint64_t nonZeroLanes(U8s v) {
     return static_cast<uint32_t>(_mm256_movemask_epi8(ints(v != 0)));

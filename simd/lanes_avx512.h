@@ -21,13 +21,9 @@ using X86Floats = __m512;
 
 namespace VFontEffect::internal::VOREL_LEVEL {
 
-VOREL_INLINE bool allZero(U8s v) {
-    return _mm512_test_epi32_mask(ints(v), ints(v)) == 0;
-}
+VOREL_INLINE bool allZero(U8s v) { return _mm512_test_epi32_mask(ints(v), ints(v)) == 0; }
 constexpr int kLaneBits = 1;
-VOREL_INLINE uint64_t nonZeroLanes(U8s v) {
-    return _mm512_test_epi8_mask(ints(v), ints(v));
-}
+VOREL_INLINE uint64_t nonZeroLanes(U8s v) { return _mm512_test_epi8_mask(ints(v), ints(v)); }
 /// Moves bytes within each 128 bits; an index of -1 gives 0.
 VOREL_INLINE U8s shuffled(U8s v, __m128i indices) {
     return bitCast<U8s>(_mm512_shuffle_epi8(ints(v), _mm512_broadcast_i32x4(indices)));

@@ -43,20 +43,14 @@ VOREL_INLINE F32s timesFactor(U32s number, F32s factor) {
 using Taps = U8s;
 using WeightCell = uint8_t;
 
-VOREL_INLINE Taps tapsOf(U8s v) {
-    return v;
-}
-VOREL_INLINE WeightCell cellOf(const uint8_t* weights) {
-    return *weights;
-}
+VOREL_INLINE Taps tapsOf(U8s v) { return v; }
+VOREL_INLINE WeightCell cellOf(const uint8_t* weights) { return *weights; }
 #endif
 
 #if !defined(VOREL_NATIVE_WEIGHTS)
 using Weights = const WeightCell*;
 
-VOREL_INLINE Weights weightsAt(const WeightCell* cells) {
-    return cells;
-}
+VOREL_INLINE Weights weightsAt(const WeightCell* cells) { return cells; }
 #endif
 
 /// Whether a dot product of bytes is an instruction.

@@ -14,9 +14,7 @@ VOREL_INLINE U8s addSaturated(U8s a, U8s b) {
 VOREL_INLINE U8s subSaturated(U8s a, U8s b) {
     return bitCast<U8s>(vqsubq_u8(bitCast<uint8x16_t>(a), bitCast<uint8x16_t>(b)));
 }
-VOREL_INLINE bool allZero(U8s v) {
-    return vmaxvq_u32(bitCast<uint32x4_t>(v)) == 0;
-}
+VOREL_INLINE bool allZero(U8s v) { return vmaxvq_u32(bitCast<uint32x4_t>(v)) == 0; }
 constexpr int kLaneBits = 4;
 VOREL_INLINE uint64_t nonZeroLanes(U8s v) {
     const uint16x8_t nonZero = bitCast<uint16x8_t>(v != 0);
@@ -29,18 +27,12 @@ VOREL_INLINE U16s multiplyHigh(U16s a, U16s b) {
     return bitCast<U16s>(
         vuzp2q_u16(bitCast<uint16x8_t>(low), bitCast<uint16x8_t>(vmull_high_u16(x, y))));
 }
-VOREL_INLINE I32s toInt(F32s v) {
-    return bitCast<I32s>(vcvtq_s32_f32(bitCast<float32x4_t>(v)));
-}
-VOREL_INLINE F32s squareRoot(F32s v) {
-    return bitCast<F32s>(vsqrtq_f32(bitCast<float32x4_t>(v)));
-}
+VOREL_INLINE I32s toInt(F32s v) { return bitCast<I32s>(vcvtq_s32_f32(bitCast<float32x4_t>(v))); }
+VOREL_INLINE F32s squareRoot(F32s v) { return bitCast<F32s>(vsqrtq_f32(bitCast<float32x4_t>(v))); }
 VOREL_INLINE U16s widenLow(U8s v) {
     return bitCast<U16s>(vmovl_u8(vget_low_u8(bitCast<uint8x16_t>(v))));
 }
-VOREL_INLINE U16s widenHigh(U8s v) {
-    return bitCast<U16s>(vmovl_high_u8(bitCast<uint8x16_t>(v)));
-}
+VOREL_INLINE U16s widenHigh(U8s v) { return bitCast<U16s>(vmovl_high_u8(bitCast<uint8x16_t>(v))); }
 VOREL_INLINE U8s interleaveLow(U8s a, U8s b) {
     return bitCast<U8s>(vzip1q_u8(bitCast<uint8x16_t>(a), bitCast<uint8x16_t>(b)));
 }
@@ -59,12 +51,8 @@ VOREL_INLINE U16s pack(U32s a, U32s b) {
 VOREL_INLINE U8s pack(U16s a, U16s b) {
     return bitCast<U8s>(vuzp1q_u8(bitCast<uint8x16_t>(a), bitCast<uint8x16_t>(b)));
 }
-VOREL_INLINE U8s narrow(U16s a, U16s b) {
-    return pack(a, b);
-}
-VOREL_INLINE U16s pairSums(U8s v) {
-    return bitCast<U16s>(vpaddlq_u8(bitCast<uint8x16_t>(v)));
-}
+VOREL_INLINE U8s narrow(U16s a, U16s b) { return pack(a, b); }
+VOREL_INLINE U16s pairSums(U8s v) { return bitCast<U16s>(vpaddlq_u8(bitCast<uint8x16_t>(v))); }
 VOREL_INLINE U8s quarters(U16s even, U16s odd) {
     const auto raised = [](U16s sums) {
         return vreinterpretq_u8_u16(vqshlq_n_u16(bitCast<uint16x8_t>(sums), 6));
@@ -76,9 +64,7 @@ VOREL_INLINE U8s quarters(U16s even, U16s odd) {
 /// A string's first sixteen weights.
 using Weights = uint8x16_t;
 
-VOREL_INLINE Weights weightsAt(const uint8_t* cells) {
-    return vld1q_u8(cells);
-}
+VOREL_INLINE Weights weightsAt(const uint8_t* cells) { return vld1q_u8(cells); }
 
 constexpr uint8_t kTapBias = 0;
 #if defined(__ARM_FEATURE_DOTPROD)

@@ -49,12 +49,8 @@ VOREL_INLINE U16s widenLow(U8s v) {
 VOREL_INLINE U16s widenHigh(U8s v) {
     return bitCast<U16s>(_mm_unpackhi_epi8(ints(v), _mm_setzero_si128()));
 }
-VOREL_INLINE U8s narrow(U16s a, U16s b) {
-    return pack(a, b);
-}
-VOREL_INLINE U16s pairSums(U8s v) {
-    return (bitCast<U16s>(v) & 0x00FF) + (bitCast<U16s>(v) >> 8);
-}
+VOREL_INLINE U8s narrow(U16s a, U16s b) { return pack(a, b); }
+VOREL_INLINE U16s pairSums(U8s v) { return (bitCast<U16s>(v) & 0x00FF) + (bitCast<U16s>(v) >> 8); }
 
 #define VOREL_NATIVE_TAPS
 /// Taps 0 and 2 of each word, and taps 1 and 3. The cell of a tap holds its weight and that of the next
@@ -65,9 +61,7 @@ struct Taps {
 };
 using WeightCell = U16s;
 
-VOREL_INLINE Taps tapsOf(U8s v) {
-    return {bitCast<U16s>(v) & 0x00FF, bitCast<U16s>(v) >> 8};
-}
+VOREL_INLINE Taps tapsOf(U8s v) { return {bitCast<U16s>(v) & 0x00FF, bitCast<U16s>(v) >> 8}; }
 VOREL_INLINE WeightCell cellOf(const uint8_t* weights) {
     return bitCast<U16s>(splat<U32s>(weights[0] | uint32_t{weights[2]} << 16));
 }

@@ -27,9 +27,7 @@ VOREL_INLINE I32s toInt(F32s v) {
     const auto converted = bitCast<I32s>(VOREL_X86(cvttps_epi32)(bitCast<X86Floats>(v)));
     return (converted ^ (v >= 2147483648.0F)) & (v == v);
 }
-VOREL_INLINE F32s squareRoot(F32s v) {
-    return bitCast<F32s>(VOREL_X86(sqrt_ps)(bitCast<X86Floats>(v)));
-}
+VOREL_INLINE F32s squareRoot(F32s v) { return bitCast<F32s>(VOREL_X86(sqrt_ps)(bitCast<X86Floats>(v))); }
 VOREL_INLINE U8s interleaveLow(U8s a, U8s b) {
     return bitCast<U8s>(VOREL_X86(unpacklo_epi8)(ints(a), ints(b)));
 }
@@ -45,9 +43,7 @@ VOREL_INLINE U16s interleaveHigh(U16s a, U16s b) {
 VOREL_INLINE U16s pack(U32s a, U32s b) {
     return bitCast<U16s>(VOREL_X86(packs_epi32)(ints(a), ints(b)));
 }
-VOREL_INLINE U8s pack(U16s a, U16s b) {
-    return bitCast<U8s>(VOREL_X86(packus_epi16)(ints(a), ints(b)));
-}
+VOREL_INLINE U8s pack(U16s a, U16s b) { return bitCast<U8s>(VOREL_X86(packus_epi16)(ints(a), ints(b))); }
 VOREL_INLINE U8s quarters(U16s even, U16s odd) {
     const auto most = splat<I16s>(int16_t{1023});
     const auto low = bitCast<U16s>(min(bitCast<I16s>(even), most));

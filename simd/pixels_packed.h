@@ -19,12 +19,8 @@ constexpr uint16_t kEvenByte = 0x00FF;
 constexpr uint16_t kOddByte = 0xFF00;
 constexpr uint32_t kAlphaByte = 0xFF000000U;
 
-VOREL_INLINE Pixels loadPixels(const uint8_t* from) {
-    return {load<U8s>(from)};
-}
-VOREL_INLINE void storePixels(uint8_t* to, const Pixels& pixels) {
-    store(to, pixels.bytes);
-}
+VOREL_INLINE Pixels loadPixels(const uint8_t* from) { return {load<U8s>(from)}; }
+VOREL_INLINE void storePixels(uint8_t* to, const Pixels& pixels) { store(to, pixels.bytes); }
 
 /// Pixels in memory order from the words that `wordsAt(i)` gives for pixel i and the next ones.
 template <class WordsAt>
@@ -32,17 +28,13 @@ VOREL_INLINE Pixels madeOfWords(WordsAt wordsAt) {
     return {bitCast<U8s>(wordsAt(0))};
 }
 /// From words 0xAARRGGBB: memory order B, G, R, A.
-VOREL_INLINE Pixels loadWords(const uint8_t* from) {
-    return {swapRedBlue(load<U8s>(from))};
-}
+VOREL_INLINE Pixels loadWords(const uint8_t* from) { return {swapRedBlue(load<U8s>(from))}; }
 /// From memory order A, R, G, B.
 VOREL_INLINE Pixels loadArgb(const uint8_t* from) {
     const U32s words = load<U32s>(from);
     return {bitCast<U8s>(words >> 8 | words << 24)};
 }
-VOREL_INLINE Amounts loadAmounts(const uint8_t* from) {
-    return {loadInPairs(from)};
-}
+VOREL_INLINE Amounts loadAmounts(const uint8_t* from) { return {loadInPairs(from)}; }
 
 /// The same colour word 0xAARRGGBB in every pixel.
 VOREL_INLINE Pixels splatColour(uint32_t color) {
@@ -50,16 +42,10 @@ VOREL_INLINE Pixels splatColour(uint32_t color) {
     return {bitCast<U8s>(splat<U32s>(swapped))};
 }
 
-VOREL_INLINE Amounts alphaOf(const Pixels& p) {
-    return {highBytesInPairs(p.bytes)};
-}
-VOREL_INLINE Amounts inverse(Amounts a) {
-    return {a.u16s ^ kEvenByte};
-}
+VOREL_INLINE Amounts alphaOf(const Pixels& p) { return {highBytesInPairs(p.bytes)}; }
+VOREL_INLINE Amounts inverse(Amounts a) { return {a.u16s ^ kEvenByte}; }
 /// Whether all pixels are zeros.
-VOREL_INLINE bool isClear(const Pixels& p) {
-    return allZero(p.bytes);
-}
+VOREL_INLINE bool isClear(const Pixels& p) { return allZero(p.bytes); }
 
 #if defined(VOREL_MASK_REGISTERS)
 
@@ -86,34 +72,22 @@ VOREL_INLINE Pixels cleared(Where where, const Pixels& p) {
 
 using Where = U32s;  // all ones or all zeros for each pixel
 
-VOREL_INLINE Where isZero(Amounts a) {
-    return bitCast<Where>(a.u16s == 0);
-}
+VOREL_INLINE Where isZero(Amounts a) { return bitCast<Where>(a.u16s == 0); }
 VOREL_INLINE Where isTransparent(const Pixels& p) {
     return bitCast<Where>(bitCast<U32s>(p.bytes) >> 24 == 0);
 }
 VOREL_INLINE Amounts raisedToFull(Where where, Amounts a) {
     return {a.u16s | (bitCast<U16s>(where) & kEvenByte)};
 }
-VOREL_INLINE Pixels kept(Where where, const Pixels& p) {
-    return {p.bytes & bitCast<U8s>(where)};
-}
-VOREL_INLINE Pixels cleared(Where where, const Pixels& p) {
-    return {p.bytes & bitCast<U8s>(~where)};
-}
+VOREL_INLINE Pixels kept(Where where, const Pixels& p) { return {p.bytes & bitCast<U8s>(where)}; }
+VOREL_INLINE Pixels cleared(Where where, const Pixels& p) { return {p.bytes & bitCast<U8s>(~where)}; }
 
 #endif
 
-VOREL_INLINE Pixels added(const Pixels& a, const Pixels& b) {
-    return {addSaturated(a.bytes, b.bytes)};
-}
+VOREL_INLINE Pixels added(const Pixels& a, const Pixels& b) { return {addSaturated(a.bytes, b.bytes)}; }
 
-VOREL_INLINE U16s evenBytes(const Pixels& p) {
-    return bitCast<U16s>(p.bytes) & kEvenByte;
-}
-VOREL_INLINE U16s oddBytes(const Pixels& p) {
-    return bitCast<U16s>(p.bytes) >> 8;
-}
+VOREL_INLINE U16s evenBytes(const Pixels& p) { return bitCast<U16s>(p.bytes) & kEvenByte; }
+VOREL_INLINE U16s oddBytes(const Pixels& p) { return bitCast<U16s>(p.bytes) >> 8; }
 
 VOREL_INLINE Pixels scaled(const Pixels& p, Amounts amounts) {
     const U16s even = product(evenBytes(p), amounts.u16s);

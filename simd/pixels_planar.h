@@ -14,12 +14,8 @@ struct Pixels {
 using Amounts = uint8x16_t;
 using Where = uint8x16_t;  // all ones or all zeros for each pixel
 
-VOREL_INLINE Pixels loadPixels(const uint8_t* from) {
-    return {vld4q_u8(from)};
-}
-VOREL_INLINE void storePixels(uint8_t* to, const Pixels& pixels) {
-    vst4q_u8(to, pixels.channels);
-}
+VOREL_INLINE Pixels loadPixels(const uint8_t* from) { return {vld4q_u8(from)}; }
+VOREL_INLINE void storePixels(uint8_t* to, const Pixels& pixels) { vst4q_u8(to, pixels.channels); }
 /// Pixels in memory order from the words that `wordsAt(i)` gives for pixel i and the next ones.
 template <class WordsAt>
 VOREL_INLINE Pixels madeOfWords(WordsAt wordsAt) {
@@ -39,9 +35,7 @@ VOREL_INLINE Pixels loadArgb(const uint8_t* from) {
     const uint8x16x4_t p = vld4q_u8(from);
     return {{{p.val[1], p.val[2], p.val[3], p.val[0]}}};
 }
-VOREL_INLINE Amounts loadAmounts(const uint8_t* from) {
-    return vld1q_u8(from);
-}
+VOREL_INLINE Amounts loadAmounts(const uint8_t* from) { return vld1q_u8(from); }
 
 /// The same colour word 0xAARRGGBB in every pixel.
 VOREL_INLINE Pixels splatColour(uint32_t color) {
@@ -49,26 +43,16 @@ VOREL_INLINE Pixels splatColour(uint32_t color) {
     return {{{channel(16), channel(8), channel(0), channel(24)}}};
 }
 
-VOREL_INLINE Amounts alphaOf(const Pixels& p) {
-    return p.channels.val[3];
-}
-VOREL_INLINE Amounts inverse(Amounts a) {
-    return vmvnq_u8(a);
-}
+VOREL_INLINE Amounts alphaOf(const Pixels& p) { return p.channels.val[3]; }
+VOREL_INLINE Amounts inverse(Amounts a) { return vmvnq_u8(a); }
 /// Whether all pixels are zeros.
 VOREL_INLINE bool isClear(const Pixels& p) {
     const uint8x16_t* const c = p.channels.val;
     return allZero(bitCast<U8s>(vorrq_u8(vorrq_u8(c[0], c[1]), vorrq_u8(c[2], c[3]))));
 }
-VOREL_INLINE Where isZero(Amounts a) {
-    return vceqzq_u8(a);
-}
-VOREL_INLINE Where isTransparent(const Pixels& p) {
-    return isZero(alphaOf(p));
-}
-VOREL_INLINE Amounts raisedToFull(Where where, Amounts a) {
-    return vorrq_u8(a, where);
-}
+VOREL_INLINE Where isZero(Amounts a) { return vceqzq_u8(a); }
+VOREL_INLINE Where isTransparent(const Pixels& p) { return isZero(alphaOf(p)); }
+VOREL_INLINE Amounts raisedToFull(Where where, Amounts a) { return vorrq_u8(a, where); }
 
 template <class Operation>
 VOREL_INLINE Pixels perChannel(const Pixels& a, const Pixels& b, Operation operation) {

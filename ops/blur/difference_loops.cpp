@@ -4,7 +4,6 @@
 #include <cstring>
 
 #include "core/assert.h"
-#include "ops/blur/quotients.h"
 #include "ops/blur/source_strip.h"
 #include "simd/lanes.h"
 #include "simd/unrolled.h"

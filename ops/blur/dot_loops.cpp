@@ -3,7 +3,6 @@
 #include <cstdint>
 #include <cstring>
 
-#include "ops/blur/quotients.h"
 #include "ops/blur/source_strip.h"
 #include "simd/lanes.h"
 #include "simd/tuning.h"
@@ -23,7 +22,7 @@
 /// multiplication in 16 bits.
 ///
 /// Exactness: sums are whole numbers and wrap nowhere: 255 times the total stays below 2^23. Their
-/// quotients are whole (quotients.h).
+/// quotients are whole (inverseAbove in blur_weights.h).
 ///
 /// Cost: (2R + 1) / (taps in a vector) instructions a pixel and pass, over the rows and columns only
 /// that hold coverage; what lies beyond them is neither read nor stored.

@@ -5,6 +5,7 @@
 #include "core/coverage_rows.h"
 #include "simd/lanes.h"
 
+/// What both strategies of the blur begin and end with.
 namespace VFontEffect::internal::VOREL_LEVEL {
 
 /// A strip of the source: `count` columns from `x` on, as many as a vector holds at most.
@@ -28,5 +29,11 @@ struct SourceStrip {
         return (count == kBytes ? load<U8s>(from) : loadFirst(from, count)) ^ invertMask;
     }
 };
+
+/// Of a sum below 2^23 that began with kNumberBias. With an inverse just above 1 / total the rounded
+/// product reaches n exactly when the sum reaches n * total (inverseAbove in blur_weights.h).
+VOREL_INLINE U32s quotient(U32s sum, F32s inverse) {
+    return bitCast<U32s>(__builtin_convertvector(timesFactor(sum, inverse), I32s));
+}
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

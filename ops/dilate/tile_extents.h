@@ -92,9 +92,15 @@ VOREL_INLINE Distances smallestDistance(Distances toRight, Distances toLeft) {
     return max(min(toRight, toLeft) - kTileEnd, Distances{});
 }
 
-/// None of the tile's pixels is farther from a covered one: not the tile's pixels before its first
-/// covered one, behind its last one, or between these. From one covered pixel to the next the distance
-/// rises to half of theirs. Holes are taken as one.
+/// None of the tile's pixels is farther from a covered one. Between neighbouring covered columns p < q
+/// the distance of x is min(x - p, q - x), at most (q - p) / 2, rounded down. With E = kTileEnd, b =
+/// before and a = after, in columns 0 to E of the tile:
+///  - of an empty tile p = -b and q = E + a: min(x + b, E + a - x) is at most (b + a + E) / 2, and as
+///    x is 0 to E also at most min(b, a) + E;
+///  - before the first one, f, p = -b and q = f: at most (b + f) / 2, and at most f as x >= 0;
+///  - behind the last one, l, likewise: at most (a + E - l) / 2, and at most E - l;
+///  - between these any gap has q - p <= l - f: at most (l - f) / 2.
+/// The last one alone may be more than what occurs. More only leaves a tile to be evaluated.
 VOREL_INLINE Distances largestDistance(const TileExtents& extents, int64_t at) {
     const Distances before = load<Distances>(extents.before + at);
     const Distances after = load<Distances>(extents.after + at);
