@@ -1,11 +1,9 @@
 #include "ops/tile/tile_plan.h"
 
 #include <algorithm>
-#include <cmath>
 #include <cstring>
 
 #include "core/assert.h"
-#include "core/numeric.h"
 
 namespace VFontEffect::internal {
 namespace {
@@ -14,21 +12,6 @@ namespace {
 constexpr uint32_t kBothHalves = 0x00010001U;
 
 }  // namespace
-
-// A tile smaller than a pixel counts as one pixel.
-TileAxis::TileAxis(int64_t patternSize, float scale)
-    : mPatternSize(patternSize),
-      mScale(scale),
-      mTileSize(std::max(1, toInt(scale * static_cast<float>(patternSize)))) {}
-
-TileAxis::Tap TileAxis::at(int64_t coordinate) const {
-    const float position = static_cast<float>(coordinate % mTileSize) / mScale;
-    const float whole = std::floor(position);
-    const auto farWeight = static_cast<uint32_t>(std::clamp(toInt((position - whole) * 255.0F), 0, 255));
-    const int64_t near = std::clamp<int64_t>(toInt(whole), 0, mPatternSize - 1);
-    const int64_t far = near + 1 < mPatternSize ? near + 1 : 0;
-    return {static_cast<int32_t>(near), static_cast<int32_t>(far), 255 - farWeight, farWeight};
-}
 
 TilePlan::KeptRow::KeptRow(int64_t width)
     : planes(PixelBuffer<uint32_t>::uninitialised(width + kTileSlack, 2)), length(width + kTileSlack) {}

@@ -1,7 +1,10 @@
 #pragma once
 
+#include <algorithm>
+#include <cmath>
 #include <cstdint>
 
+#include "core/numeric.h"
 #include "core/pixel_buffer.h"
 #include "core/views.h"
 #include "ops/tile/tile_loops.h"
@@ -11,7 +14,11 @@ namespace VFontEffect::internal {
 /// One axis of a tiling: from an output coordinate to the pattern pixels that it is mixed from.
 class TileAxis {
   public:
-    TileAxis(int64_t patternSize, float scale);
+    // A tile smaller than a pixel counts as one pixel.
+    TileAxis(int64_t patternSize, float scale)
+        : mPatternSize(patternSize),
+          mScale(scale),
+          mTileSize(std::max(1, toInt(scale * static_cast<float>(patternSize)))) {}
 
     /// Two neighbouring pattern pixels and their weights, which add up to 255.
     struct Tap {
@@ -20,7 +27,15 @@ class TileAxis {
         uint32_t nearWeight;
         uint32_t farWeight;
     };
-    Tap at(int64_t coordinate) const;
+    Tap at(int64_t coordinate) const {
+        const float position = static_cast<float>(coordinate % mTileSize) / mScale;
+        const float whole = std::floor(position);
+        const auto farWeight =
+            static_cast<uint32_t>(std::clamp(toInt((position - whole) * 255.0F), 0, 255));
+        const int64_t near = std::clamp<int64_t>(toInt(whole), 0, mPatternSize - 1);
+        const int64_t far = near + 1 < mPatternSize ? near + 1 : 0;
+        return {static_cast<int32_t>(near), static_cast<int32_t>(far), 255 - farWeight, farWeight};
+    }
 
     /// Output pixels after which the taps repeat.
     int64_t period() const { return mTileSize; }

@@ -9,9 +9,9 @@
 #include <utility>
 #include <vector>
 
-#include "tests/support/blurs.h"
 #include "tests/support/core_compare.h"
 #include "tests/support/mask_gallery.h"
+#include "tests/support/plans.h"
 
 /// The blur by differences of the weights against the one by dot products, whichever of the two a level
 /// chooses, and the terms that it adds up against those differences.

@@ -1,0 +1,56 @@
+#pragma once
+
+#include <cstdint>
+#include <vector>
+
+#include "core/views.h"
+#include "ops/blur/blur_input.h"
+#include "ops/dilate/disc_shape.h"
+#include "ops/grow/growth_plan.h"
+#include "voreleffect/VFExport.h"
+
+/// The operators' plans, at the level that the tests are at. They stand in the library, which does not
+/// export them; the functions are none when memory ran out.
+namespace vorel_test {
+
+/// The window's values, row after row: by either strategy of the blur, and by the one that the plan
+/// chooses.
+VF_API std::vector<uint8_t> blurredByDots(const VFontEffect::internal::BlurInput& input);
+VF_API std::vector<uint8_t> blurredByDifferences(const VFontEffect::internal::BlurInput& input);
+VF_API std::vector<uint8_t> blurred(const VFontEffect::internal::BlurInput& input);
+
+/// The part's values, row after row: of a source dilated by a disc, or the smaller ones of that and of
+/// its inverse, dilated likewise.
+VF_API std::vector<uint8_t> dilated(const VFontEffect::internal::CoverageRows& source,
+                                    const VFontEffect::internal::DiscShape& disc,
+                                    const VFontEffect::internal::Box& part, bool andInverse);
+
+/// All that a source has grown to, with its margin, row after row.
+VF_API std::vector<uint8_t> grown(const VFontEffect::internal::GrowthInput& input);
+
+/// The first rows of a pattern laid from a corner on, pixels R, G, B, A.
+VF_API std::vector<uint32_t> tiled(const VFontEffect::internal::ColourView& pattern, float scale,
+                                   float opacity, int64_t width, int64_t height);
+
+/// Values faded to the alphas of a colour of that alpha.
+VF_API std::vector<uint8_t> faded(std::vector<uint8_t> values, uint32_t alpha);
+
+/// Asks a dilation for its second row first: a contract that is broken.
+VF_API void askForRowsOutOfOrder();
+
+/// A line of taps or pairs that is added or taken away for a result.
+struct Term {
+    int64_t row;  // from the result's own on
+    bool isPair;
+    int sign;
+};
+
+/// How the second difference of the weights is taken apart, each sign's terms as the library has them.
+struct TermsOfWeights {
+    int pairDistance;
+    bool pairsAreDifferences;
+    std::vector<Term> terms;
+};
+VF_API TermsOfWeights termsOf(const VFontEffect::internal::BlurWeights& weights);
+
+}  // namespace vorel_test
