@@ -5,6 +5,7 @@
 
 #include "blend/blend_loops.h"
 #include "blend/rules.h"
+#include "core/assert.h"
 
 /// The row driver of all blending loops: over rows and pixels, empty stretches, and the tail.
 ///
@@ -157,6 +158,8 @@ VOREL_INLINE void paintRow(const Painter& painter, const Row& row, int64_t count
 template <class Painter>
 VOREL_INLINE void paintRows(const Painter& painter, const BlendJob& job) {
     if (job.width <= 0) return;
+    VOREL_ASSERT(job.destination != nullptr && (!Painter::kReadsImage || job.image != nullptr) &&
+                 (!Painter::kReadsMask || job.mask != nullptr));
     for (int64_t y = 0; y < job.height; ++y) {
         const Row row = {job.destination + y * job.destinationStride,
                          Painter::kReadsImage ? job.image + y * job.imageStride : nullptr,

@@ -37,6 +37,7 @@ VOREL_INLINE int32_t firstNear(I32s indices, int32_t size) {
     return min(min(one, other), static_cast<int32_t>(size - kNearEntries));
 }
 VOREL_INLINE U32s gatherNear(const uint32_t* table, int32_t size, I32s indices) {
+    VOREL_ASSERT(size >= kNearEntries);
     const int32_t first = firstNear(indices, size);
     const auto offsets = bitCast<U32s>(indices - first);
     if (!allZero(bitCast<U8s>(offsets & ~static_cast<uint32_t>(kNearEntries - 1))))

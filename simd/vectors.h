@@ -5,6 +5,7 @@
 #include <cstring>
 #include <utility>
 
+#include "core/assert.h"
 #include "core/inline.h"
 #include "core/numeric.h"
 
@@ -41,6 +42,7 @@ VOREL_INLINE V load(const void* from) {
 /// At a multiple of its size, where an instruction can take it from memory.
 template <class V>
 VOREL_INLINE V loadAligned(const void* from) {
+    VOREL_ASSERT(reinterpret_cast<uintptr_t>(from) % sizeof(V) == 0);
     return load<V>(__builtin_assume_aligned(from, sizeof(V)));
 }
 template <class V>

@@ -4,16 +4,16 @@
 
 namespace VFontEffect {
 
-/// The pixel kernels: stateless, callable from any thread on separate destinations.
+/// The blending operations: stateless, callable from any thread on separate destinations.
 ///
-/// Every kernel places a source of width x height pixels with its top left corner at (x, y) of the
+/// Every operation places a source of width x height pixels with its top left corner at (x, y) of the
 /// destination, which may lie partly or wholly outside, and clips to the destination. The
 /// destination record is not changed, only the pixels that it points to.
 ///
 /// All products are 8-bit fixed point: product(x, y) = ((x + 1) * y) >> 8 stands for x * y / 255.
 ///
 /// Nothing is drawn and nothing is read when the destination or the source is null, the destination
-/// has no pixels, has another number of bytes per pixel than the kernel writes, or a byte count that
+/// has no pixels, has another number of bytes per pixel than the operation writes, or a byte count that
 /// does not fit in 32 bits; nor for a width or height below 1, a negative stride, or an unknown mode
 /// or byte order. Source and destination must not overlap unless said otherwise.
 class VF_API VFBlender {
@@ -50,7 +50,7 @@ class VF_API VFBlender {
     /// @name One colour through a mask, into 32 bits
     /// @{
 
-    /// Draws `color` (premultiplied 0xAARRGGBB) through `mask` with the kernel of `mode`:
+    /// Draws `color` (premultiplied 0xAARRGGBB) through `mask` with the operation of `mode`:
     /// 1 blendSrcOver8To32, 2 blendDstOver8To32, 3 blendDstOver8To32NSA, 7 blendDstOverSA8To32.
     /// Any other mode draws nothing. maskStride is in bytes.
     void drawBitmapBlend8(int x, int y, const VFBitmap* dst, unsigned char* mask, int width, int height,

@@ -64,12 +64,12 @@ void splitTerms(int radius, int64_t lineBytes, int32_t* cells, int32_t* memory, 
             cells[i] -= sign;
             if (isPair) cells[partner] -= other;
             int32_t*& end = sign > 0 ? added : takenAway;
+            VOREL_ASSERT(end - (sign > 0 ? terms.added : terms.takenAway).offsets < kMostTerms);
             *end++ = static_cast<int32_t>((line + (isPair ? 1 : 0)) * lineBytes);
         }
     }
     terms.added.count = added - terms.added.offsets;
     terms.takenAway.count = takenAway - terms.takenAway.offsets;
-    VOREL_ASSERT(terms.added.count <= kMostTerms && terms.takenAway.count <= kMostTerms);
 }
 
 }  // namespace
@@ -175,6 +175,7 @@ void DifferenceBlur::secondPass(int64_t result, const SquareRows& out) {
 }
 
 BlurredRows DifferenceBlur::rows(int64_t y) {
+    VOREL_ASSERT((y - mWindow.top) % (mDownFirst ? mSide : mWindow.height()) == 0);
     if (y == mWindow.top) firstPass();
     if (mDownFirst) {
         secondPass(y - mWindow.top, {mOut.data(), mSide, mStride, true});

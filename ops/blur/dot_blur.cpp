@@ -151,6 +151,7 @@ IntermediateBuffer DotBlur::intermediateFor(const FullColumns& full) {
 }
 
 void DotBlur::blurAcross(const PassEnding& ending, uint8_t* out) {
+    VOREL_ASSERT(roundedUp(mWindow.width(), mLoops.vectorBytes) <= mStride);
     mLoops.across(*mWeights, mIntermediate.rows(), mWindow.left - mIntermediateLeft,
                   mWindow.right - mIntermediateLeft, {out, mStride, ending});
 }
@@ -165,6 +166,7 @@ void DotBlur::feed(int64_t group) {
 }
 
 BlurredRows DotBlur::rows(int64_t y) {
+    VOREL_ASSERT((y - mWindow.top) % kQuad == 0);
     const int64_t quad = (y - mWindow.top) / kQuad;
     mTaps.complete(quad, [&](int64_t group) { feed(group); });
     if (mAcross) {

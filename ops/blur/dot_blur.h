@@ -4,6 +4,7 @@
 #include <cstdint>
 #include <optional>
 
+#include "core/assert.h"
 #include "core/line_buffer.h"
 #include "core/pixel_buffer.h"
 #include "ops/blur/blur_input.h"
@@ -55,6 +56,7 @@ class TapGroups {
         const int64_t end = std::min(quad + mSteps, mMissing.end);
         for (; mMissing.first < end; ++mMissing.first) {
             if (mMissing.first == mColumns.firstGroup + mCapacity) forgetBefore(quad);
+            VOREL_ASSERT(mMissing.first - mColumns.firstGroup < mCapacity);
             feed(mMissing.first);
         }
     }

@@ -351,6 +351,7 @@ struct OpenTile {
     Tile result;
 
     VOREL_INLINE void add(int64_t row) {
+        VOREL_ASSERT(row >= 0 && row < planes.rows.count);
         const DiscRow& discRow = planes.discRows[row < y ? y - row : row - y];
         const uint8_t* const place = source + row * planes.rows.stride;
         result = max(result, dilatedRow(discRow, place));
