@@ -5,7 +5,7 @@
 #include "voreleffect/VFBlender.h"
 #include "voreleffect/VFEffect.h"
 
-/// The blending kernels on whole images, and the composite of a layered run. The destination is
+/// The blending operations on whole images, and the composite of a layered run. The destination is
 /// refilled before each call; the refill is not part of the figures.
 namespace vorel_bench {
 
@@ -15,7 +15,7 @@ namespace {
 
 namespace literal = vorel_test::literal;
 
-// The kernels take unconst pointers, but only read through them.
+// The operations take unconst pointers, but only read through them.
 unsigned char* maskOf(const BlendScene& scene) {
     return const_cast<unsigned char*>(scene.mask.data());
 }

@@ -72,8 +72,8 @@ const BlendScene& sceneOf(const SceneKind& kind) {
     return scene;
 }
 
-std::string blendRow(const std::string& kernel, const SceneKind& kind) {
-    return "blend/" + kernel + "/" + kind.data + "/" + std::to_string(kind.width) + "x" +
+std::string blendRow(const std::string& operation, const SceneKind& kind) {
+    return "blend/" + operation + "/" + kind.data + "/" + std::to_string(kind.width) + "x" +
            std::to_string(kind.height);
 }
 

@@ -35,8 +35,8 @@ struct BlendScene {
 /// Made at the first call, kept to the end.
 const BlendScene& sceneOf(const SceneKind& kind);
 
-/// The row of a kernel on a scene.
-std::string blendRow(const std::string& kernel, const SceneKind& kind);
+/// The row of an operation on a scene.
+std::string blendRow(const std::string& operation, const SceneKind& kind);
 
 /// Changes a destination that is refilled before each call.
 class BlendJob : public Job {

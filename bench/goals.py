@@ -9,8 +9,8 @@ def each(kind, rows, best, narrow, **more):
     return [dict(kind=kind, row=row, limits=dict(zip(LEVELS, (best, narrow))), **more) for row in rows]
 
 
-def blends(*kernels):
-    return [f"blend/{kernel}/{data}/512x128" for kernel in kernels for data in ("text", "random")]
+def blends(*operations):
+    return [f"blend/{operation}/{data}/512x128" for operation in operations for data in ("text", "random")]
 
 
 def goals():

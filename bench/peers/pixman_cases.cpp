@@ -66,23 +66,23 @@ class PixmanJob : public Job {
     Image mMask;
 };
 
-struct Kernel {
+struct Operation {
     const char* name;
     pixman_op_t operation;
     bool throughMask;
 };
-constexpr Kernel kKernels[] = {{"src-over", PIXMAN_OP_OVER, false},
-                               {"dst-over", PIXMAN_OP_OVER_REVERSE, false},
-                               {"mask-mode1", PIXMAN_OP_OVER, true},
-                               {"mask-mode2", PIXMAN_OP_OVER_REVERSE, true}};
+constexpr Operation kOperations[] = {{"src-over", PIXMAN_OP_OVER, false},
+                                     {"dst-over", PIXMAN_OP_OVER_REVERSE, false},
+                                     {"mask-mode1", PIXMAN_OP_OVER, true},
+                                     {"mask-mode2", PIXMAN_OP_OVER_REVERSE, true}};
 
 }  // namespace
 
 void addPixmanCases(Cases& cases) {
     for (const SceneKind& kind : kScenes) {
-        for (const Kernel& kernel : kKernels) {
-            cases.push_back(caseOf<PixmanJob>(blendRow(kernel.name, kind), kPixman, kind.pixels(), kind,
-                                              kernel.operation, kernel.throughMask));
+        for (const Operation& operation : kOperations) {
+            cases.push_back(caseOf<PixmanJob>(blendRow(operation.name, kind), kPixman, kind.pixels(),
+                                              kind, operation.operation, operation.throughMask));
         }
     }
 }

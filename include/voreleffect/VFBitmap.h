@@ -33,8 +33,8 @@ class VF_API VFRect {
 /// image (4 bytes per pixel). Rows stand back to back: the stride is mWidth * mBytesPerPixel bytes.
 ///
 /// The byte count is the 32-bit unsigned product of the three numbers. Where the true product does
-/// not fit in 32 bits the buffer is smaller than the numbers claim, and nothing is drawn there
-/// into such a bitmap and read nothing from it.
+/// not fit in 32 bits the buffer is smaller than the numbers claim, and the blender draws nothing
+/// into such a bitmap and reads nothing from it.
 class VF_API VFBitmap {
   public:
     /// An empty bitmap: no pixels, 0 x 0, 0 bytes per pixel, format 4.

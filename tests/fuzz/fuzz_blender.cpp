@@ -1,4 +1,4 @@
-/// Every pixel kernel, at any placement, stride, mode and order, from sources that hold exactly the
+/// Every pixel operation, at any placement, stride, mode and order, from sources that hold exactly the
 /// bytes that their numbers ask for.
 #include <voreleffect/VFBlender.h>
 
@@ -154,14 +154,15 @@ void Caller::blendMask() {
     s.strideBytes = stride;
     std::unique_ptr<unsigned char[]> mask;
     if (!makePixels(s, 1, mask)) return;
-    using Kernel =
+    using Operation =
         void (VFBlender::*)(int, int, const VFBitmap*, unsigned char*, int, int, int, unsigned int);
-    constexpr Kernel kKernels[] = {&VFBlender::blendSrcOver8To32, &VFBlender::blendDstOver8To32,
-                                   &VFBlender::blendDstOver8To32NSA, &VFBlender::blendDstOverSA8To32};
-    const int kernel = mIn.between(0, 4);
-    if (kernel < 4) {
-        (mBlender.*kKernels[kernel])(s.x, s.y, mTarget.get(), mask.get(), s.width, s.height, stride,
-                                     color);
+    constexpr Operation kOperations[] = {&VFBlender::blendSrcOver8To32, &VFBlender::blendDstOver8To32,
+                                         &VFBlender::blendDstOver8To32NSA,
+                                         &VFBlender::blendDstOverSA8To32};
+    const int operation = mIn.between(0, 4);
+    if (operation < 4) {
+        (mBlender.*kOperations[operation])(s.x, s.y, mTarget.get(), mask.get(), s.width, s.height,
+                                           stride, color);
     } else {
         mBlender.drawBitmapBlend8(s.x, s.y, mTarget.get(), mask.get(), s.width, s.height, stride, color,
                                   mIn.wildInt(0, 8));

@@ -66,12 +66,13 @@ void requireEqual(const T& expected, const T& actual, const std::string& what) {
     require(expected == actual ? testing::AssertionSuccess() : testing::AssertionFailure(), what);
 }
 
-// --- Kernels ----------------------------------------------------------------------------------------
+// --- Operations
+// ----------------------------------------------------------------------------------------
 
-/// Runs one kernel both ways on copies of one destination.
+/// Runs one operation both ways on copies of one destination.
 template <class Library, class Literal>
-void compareKernel(const std::string& name, const vorel_test::Placement& p, int bytesPerPixel,
-                   const std::vector<uint8_t>& target, Library library, Literal reference) {
+void compareOperation(const std::string& name, const vorel_test::Placement& p, int bytesPerPixel,
+                      const std::vector<uint8_t>& target, Library library, Literal reference) {
     std::vector<uint8_t> expected = target;
     const VFBitmap actual(static_cast<unsigned>(p.dstWidth), static_cast<unsigned>(p.dstHeight),
                           expected.data(), static_cast<unsigned>(bytesPerPixel));
@@ -94,16 +95,16 @@ vorel_test::Placement decodePlacement(Decoder& in) {
     return p;
 }
 
-void compareKernels(Decoder& in) {
+void compareOperations(Decoder& in) {
     const vorel_test::Placement p = decodePlacement(in);
     const uint32_t color = in.word();
     const int padding = in.between(0, 5);
     VFBlender blender;
-    const int kernel = in.between(0, 4);
-    if (kernel == 0) {
+    const int operation = in.between(0, 4);
+    if (operation == 0) {
         const auto target = vorel_fuzz::decodeCoverage(in, p.dstWidth, p.dstHeight);
         auto mask = vorel_fuzz::decodeCoverage(in, p.width, p.height);
-        compareKernel(
+        compareOperation(
             "drawBitmap8To8", p, 1, target,
             [&](const VFBitmap* dst) {
                 blender.drawBitmap8To8(p.x, p.y, dst, mask.data(), p.width, p.height);
@@ -115,9 +116,9 @@ void compareKernels(Decoder& in) {
         return;
     }
     const auto target = vorel_fuzz::decodeColours(in, p.dstWidth, p.dstHeight, 3);
-    if (kernel == 1) {
+    if (operation == 1) {
         auto mask = vorel_fuzz::decodeCoverage(in, p.width, p.height);
-        compareKernel(
+        compareOperation(
             "drawBitmap8To32", p, 4, target,
             [&](const VFBitmap* dst) {
                 blender.drawBitmap8To32(p.x, p.y, dst, mask.data(), p.width, p.height, color);
@@ -128,11 +129,11 @@ void compareKernels(Decoder& in) {
             });
         return;
     }
-    if (kernel == 2) {
+    if (operation == 2) {
         const int mode = in.between(0, 8);
         const int stride = p.width + padding;
         auto mask = vorel_fuzz::decodeCoverage(in, stride, p.height);
-        compareKernel(
+        compareOperation(
             "drawBitmapBlend8, mode " + std::to_string(mode), p, 4, target,
             [&](const VFBitmap* dst) {
                 blender.drawBitmapBlend8(p.x, p.y, dst, mask.data(), p.width, p.height, stride, color,
@@ -144,12 +145,12 @@ void compareKernels(Decoder& in) {
             });
         return;
     }
-    if (kernel == 3) {
+    if (operation == 3) {
         const int mode = in.between(0, 3);
         const int stride = p.width + padding;
         std::vector<uint32_t> words(static_cast<size_t>(stride) * static_cast<size_t>(p.height));
         vorel_fuzz::fillColours(in, reinterpret_cast<uint8_t*>(words.data()), words.size(), 3);
-        compareKernel(
+        compareOperation(
             "drawBitmapBlend32 from words, mode " + std::to_string(mode), p, 4, target,
             [&](const VFBitmap* dst) {
                 blender.drawBitmapBlend32(p.x, p.y, dst, words.data(), p.width, p.height, stride, mode);
@@ -163,7 +164,7 @@ void compareKernels(Decoder& in) {
     const int order = in.between(0, 2);
     const int stride = p.width * 4 + padding;
     auto bytes = vorel_fuzz::decodeCoverage(in, stride, p.height);
-    compareKernel(
+    compareOperation(
         "drawBitmapBlend32 from bytes, order " + std::to_string(order), p, 4, target,
         [&](const VFBitmap* dst) {
             blender.drawBitmapBlend32(p.x, p.y, dst, bytes.data(), p.width, p.height, stride, order);
@@ -600,7 +601,7 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
         case 1:
         case 2:
         case 3:
-            compareKernels(in);
+            compareOperations(in);
             break;
         case 4:
         case 5:

@@ -9,7 +9,8 @@
 
 #include "voreleffect/VFBitmap.h"
 
-/// Buffers between inaccessible pages: a kernel that reads or writes one byte too far stops the test.
+/// Buffers between inaccessible pages: an operation that reads or writes one byte too far stops the
+/// test.
 namespace vorel_test {
 
 /// Which end of the buffer touches an inaccessible page.

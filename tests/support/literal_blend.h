@@ -2,10 +2,10 @@
 
 #include <cstdint>
 
-/// The blending kernels one pixel at a time.
+/// The blending operations one pixel at a time.
 ///
-/// Every kernel takes the placement (x, y), the destination's bytes, width and height, then its
-/// source with its size and stride, as the library's kernel of the same name does. A null
+/// Every operation takes the placement (x, y), the destination's bytes, width and height, then its
+/// source with its size and stride, as the library's operation of the same name does. A null
 /// destination or source draws nothing. The destination holds 4 bytes R, G, B, A per pixel unless
 /// said otherwise.
 namespace vorel_test::literal {
@@ -22,7 +22,7 @@ void drawBitmap8To8(int x, int y, uint8_t* dst, int dstWidth, int dstHeight, con
 void drawBitmap8To32(int x, int y, uint8_t* dst, int dstWidth, int dstHeight, const uint8_t* mask,
                      int maskWidth, int maskHeight, uint32_t color);
 
-/// The kernel of `mode`: 1, 2, 3 or 7; any other mode draws nothing.
+/// The operation of `mode`: 1, 2, 3 or 7; any other mode draws nothing.
 void drawBitmapBlend8(int x, int y, uint8_t* dst, int dstWidth, int dstHeight, const uint8_t* mask,
                       int width, int height, int maskStride, uint32_t color, int mode);
 

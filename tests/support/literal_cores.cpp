@@ -92,10 +92,10 @@ Plane<uint8_t> padded(const Mask& mask, Box box, int64_t side, int64_t ends, uin
 }
 
 template <class Weight>
-int64_t totalOf(const std::vector<Weight>& kernel) {
-    int64_t total = kernel[0];
-    for (size_t i = 1; i < kernel.size(); ++i)
-        total += 2 * int64_t{kernel[i]};
+int64_t totalOf(const std::vector<Weight>& weights) {
+    int64_t total = weights[0];
+    for (size_t i = 1; i < weights.size(); ++i)
+        total += 2 * int64_t{weights[i]};
     return total;
 }
 
@@ -204,23 +204,23 @@ std::vector<uint8_t> dilated(const std::vector<uint8_t>& source, int width, int 
 }
 
 std::vector<uint32_t> shadowWeights(int radius) {
-    std::vector<uint32_t> kernel{100};
+    std::vector<uint32_t> weights{100};
     const float d = static_cast<float>(radius) * static_cast<float>(radius) / kLn100;
     for (int i = 1; i <= radius; ++i) {
-        kernel.push_back(static_cast<uint32_t>(
+        weights.push_back(static_cast<uint32_t>(
             truncated(exponential(static_cast<float>(-(i * i)) / d) * 100.0F + 0.5F)));
     }
-    return kernel;
+    return weights;
 }
 
 std::vector<int32_t> glowWeights(int radius) {
-    std::vector<int32_t> kernel{128};
+    std::vector<int32_t> weights{128};
     const float d = static_cast<float>(radius * radius) / kLn100;
     for (int i = 1; i <= radius; ++i) {
-        kernel.push_back(truncated(
+        weights.push_back(truncated(
             static_cast<double>(exponential(static_cast<float>(-(i * i)) / d) * 128.0F) + 0.5));
     }
-    return kernel;
+    return weights;
 }
 
 std::vector<uint32_t> glowColours(float size, uint32_t color, const std::vector<Stop>& stops,
@@ -375,8 +375,8 @@ void paintOuterShadow(Picture& dst, const Mask& mask, Box text, float angle, flo
     if (text.right + 2 * r + move.x < 0 || text.left - 2 * r + move.x >= dst.width) return;
     if (text.bottom + 2 * r + move.y < 0 || text.top - 2 * r + move.y >= dst.height) return;
 
-    const std::vector<uint32_t> kernel = shadowWeights(static_cast<int>(r));
-    const int64_t sum = totalOf(kernel);
+    const std::vector<uint32_t> weights = shadowWeights(static_cast<int>(r));
+    const int64_t sum = totalOf(weights);
     const Plane<uint8_t> mid = padded(mask, text, 2 * r, 2 * r, 0, false);
     Plane<uint8_t> shadow(mid.width, mid.height);
     for (int64_t y = r; y < mid.height - r; ++y) {
@@ -384,14 +384,14 @@ void paintOuterShadow(Picture& dst, const Mask& mask, Box text, float angle, flo
         for (int64_t x = r; x < mid.width - r; ++x) {
             int64_t weighted = 0;
             for (int64_t k = -r; k <= r; ++k) {
-                weighted += int64_t{mid.at(x, y + k)} * kernel[static_cast<size_t>(std::abs(k))];
+                weighted += int64_t{mid.at(x, y + k)} * weights[static_cast<size_t>(std::abs(k))];
             }
             row[static_cast<size_t>(x)] = weighted / sum;
         }
         for (int64_t x = r; x < mid.width - r; ++x) {
             int64_t weighted = 0;
             for (int64_t k = -r; k <= r; ++k) {
-                weighted += row[static_cast<size_t>(x + k)] * kernel[static_cast<size_t>(std::abs(k))];
+                weighted += row[static_cast<size_t>(x + k)] * weights[static_cast<size_t>(std::abs(k))];
             }
             shadow.at(x, y) = static_cast<uint8_t>(std::min<int64_t>(255, weighted / sum));
         }
@@ -415,8 +415,8 @@ void paintInnerShadow(Picture& dst, const Mask& mask, Box text, float angle, flo
         return;
     }
 
-    const std::vector<uint32_t> kernel = shadowWeights(static_cast<int>(r));
-    const int64_t sum = totalOf(kernel);
+    const std::vector<uint32_t> weights = shadowWeights(static_cast<int>(r));
+    const int64_t sum = totalOf(weights);
     const Plane<uint8_t> wide = padded(mask, text, r, 0, 0, false);
     Plane<uint8_t> inverse(wide.width, wide.height);
     for (int64_t y = 0; y < wide.height; ++y) {
@@ -424,7 +424,7 @@ void paintInnerShadow(Picture& dst, const Mask& mask, Box text, float angle, flo
             int64_t weighted = 0;
             for (int64_t k = -r; k <= r; ++k) {
                 if (!wide.has(x + k, y)) continue;
-                weighted += int64_t{wide.at(x + k, y)} * kernel[static_cast<size_t>(std::abs(k))];
+                weighted += int64_t{wide.at(x + k, y)} * weights[static_cast<size_t>(std::abs(k))];
             }
             inverse.at(x, y) = static_cast<uint8_t>((255 * sum - weighted) / sum);
         }
@@ -438,7 +438,7 @@ void paintInnerShadow(Picture& dst, const Mask& mask, Box text, float angle, flo
                 const int64_t fromX = x - move.x + r;
                 const int64_t fromY = y - move.y + k;
                 const int64_t value = inverse.has(fromX, fromY) ? inverse.at(fromX, fromY) : 255;
-                weighted += value * kernel[static_cast<size_t>(std::abs(k))];
+                weighted += value * weights[static_cast<size_t>(std::abs(k))];
             }
             shadow.at(x, y) = static_cast<uint8_t>(weighted / sum);
         }
@@ -463,8 +463,8 @@ void paintGlow(Picture& dst, const Mask& mask, Box text, float size, uint32_t co
     boxFilter(grown.values, passes, static_cast<int>(grown.width), static_cast<int>(grown.height));
 
     const int64_t r = truncated(static_cast<float>(pad) * 0.9F);
-    const std::vector<int32_t> kernel = glowWeights(static_cast<int>(r));
-    const int64_t total = totalOf(kernel);
+    const std::vector<int32_t> weights = glowWeights(static_cast<int>(r));
+    const int64_t total = totalOf(weights);
     const auto normalised = [&](int64_t weighted) {
         return inner ? (255 * total - weighted) / total : weighted / total;
     };
@@ -476,7 +476,7 @@ void paintGlow(Picture& dst, const Mask& mask, Box text, float size, uint32_t co
             int64_t weighted = int64_t{grown.at(x, y)} * 128;
             for (int64_t i = 1; i <= r; ++i) {
                 weighted +=
-                    (int64_t{grown.at(x, y - i)} + grown.at(x, y + i)) * kernel[static_cast<size_t>(i)];
+                    (int64_t{grown.at(x, y - i)} + grown.at(x, y + i)) * weights[static_cast<size_t>(i)];
             }
             row[static_cast<size_t>(x)] = normalised(weighted);
         }
@@ -484,7 +484,7 @@ void paintGlow(Picture& dst, const Mask& mask, Box text, float size, uint32_t co
             int64_t weighted = row[static_cast<size_t>(x)] * 128;
             for (int64_t i = 1; i <= r; ++i) {
                 weighted += (row[static_cast<size_t>(x - i)] + row[static_cast<size_t>(x + i)]) *
-                            kernel[static_cast<size_t>(i)];
+                            weights[static_cast<size_t>(i)];
             }
             const int64_t index = 256 - std::min<int64_t>(normalised(weighted), 256);
             glow.at(x, y) = premultiplied(table[static_cast<size_t>(index)]);

@@ -4,7 +4,7 @@
 #include <vector>
 
 /// The plain value types of the literal forms: references written one pixel at a time, which the
-/// library's kernels and cores are compared with.
+/// library's operations and cores are compared with.
 namespace vorel_test::literal {
 
 /// Coverage, one byte per pixel, packed rows.

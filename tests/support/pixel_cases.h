@@ -10,8 +10,8 @@
 #include "guarded.h"
 #include "random.h"
 
-/// Random pixels and placements for sweeps of the blending kernels, biased to the values and
-/// positions where a kernel takes another path.
+/// Random pixels and placements for sweeps of the blending operations, biased to the values and
+/// positions where an operation takes another path.
 namespace vorel_test {
 
 template <class T>

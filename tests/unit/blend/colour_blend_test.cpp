@@ -49,19 +49,19 @@ Pixel blendedBytes(int order, Pixel source, const Pixel& before) {
     return Pixel(dst.mData, dst.mData + 4);
 }
 
-/// Draws words with the kernel of `mode` by its own name.
+/// Draws words with the operation of `mode` by its own name.
 void drawByName(int mode, const Placement& p, const VFBitmap* dst, uint32_t* src, int stride) {
     VFBlender blender;
     if (mode == kSrcOver) blender.blendSrcOver32To32(p.x, p.y, dst, src, p.width, p.height, stride);
     if (mode == kDstOver) blender.blendDstOver32To32(p.x, p.y, dst, src, p.width, p.height, stride);
 }
 
-/// Draws words with the kernel of `mode` by the mode's number.
+/// Draws words with the operation of `mode` by the mode's number.
 void drawByMode(int mode, const Placement& p, const VFBitmap* dst, uint32_t* src, int stride) {
     VFBlender().drawBitmapBlend32(p.x, p.y, dst, src, p.width, p.height, stride, mode);
 }
 
-/// Draws bytes with the kernel that takes them, by its own name.
+/// Draws bytes with the operation that takes them, by its own name.
 void drawBytesByName(int order, const Placement& p, const VFBitmap* dst, uint8_t* src, int stride) {
     VFBlender().blendDstOver32To32(p.x, p.y, dst, src, p.width, p.height, stride, order);
 }
@@ -85,7 +85,7 @@ template <class Unit>
     return sameBytes(expected.data(), dst.pixels().data(), p.dstWidth, p.dstHeight, 4);
 }
 
-/// Every kernel, by both of its names and from words and bytes, leaves `dst` as it is.
+/// Every operation, by both of its names and from words and bytes, leaves `dst` as it is.
 void expectNothingDrawn(GuardedBitmap& dst, const Placement& p, uint32_t* words, int stride) {
     const std::vector<uint8_t> before = bytesOf(dst.pixels());
     for (const int mode : kModes) {

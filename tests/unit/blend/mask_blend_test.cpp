@@ -35,7 +35,7 @@ Pixel blended(int mode, uint8_t m, uint32_t color, const Pixel& before) {
     return Pixel(dst.mData, dst.mData + 4);
 }
 
-/// Draws with the kernel of `mode` by its own name.
+/// Draws with the operation of `mode` by its own name.
 void drawByName(int mode, const Placement& p, const VFBitmap* dst, uint8_t* mask, int stride,
                 uint32_t color) {
     VFBlender blender;
@@ -71,7 +71,7 @@ using Draw = decltype(&drawByName);
     return sameBytes(expected.data(), dst.pixels().data(), p.dstWidth, p.dstHeight, 4);
 }
 
-/// Every kernel, by both of its names, leaves `dst` as it is.
+/// Every operation, by both of its names, leaves `dst` as it is.
 void expectNothingDrawn(GuardedBitmap& dst, const Placement& p, uint8_t* mask, int stride) {
     const std::vector<uint8_t> before = bytesOf(dst.pixels());
     for (const int mode : kModes) {

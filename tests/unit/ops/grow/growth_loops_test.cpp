@@ -26,7 +26,7 @@ constexpr uint32_t kBlue = 0xFF0000FF;
 
 using Table = std::vector<uint32_t>;
 
-/// The two cores share their kernels: every test runs on both.
+/// The two cores share their loops: every test runs on both.
 template <class Core>
 struct RecordOf;
 template <>
