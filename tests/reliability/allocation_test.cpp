@@ -19,6 +19,7 @@
 #include "tests/support/fake_core.h"
 #include "tests/support/mask_gallery.h"
 #include "tests/support/pixel_cases.h"
+#include "tests/support/plans.h"
 #include "voreleffect/voreleffect.h"
 
 /// Memory that runs out: every request for memory of every operation is refused once, alone and with
@@ -137,7 +138,7 @@ struct CoreCase {
     std::shared_ptr<VFProperty> record;
     std::shared_ptr<VFProperty> other;  ///< paints differently
     bool layered;
-    long paintRequests;  ///< what painting asks for at least; 0 means that it works without memory
+    long paintRequests;  ///< what painting asks for; 0 means that it works without memory
     long copyRequests;   ///< what taking a copy of the record asks for
 
     friend std::ostream& operator<<(std::ostream& out, const CoreCase& c) { return out << c.name; }
@@ -180,14 +181,14 @@ std::vector<CoreCase> strokeCases() {
 template <class Core, class Record>
 void addGlowCases(std::vector<CoreCase>& cases, const std::string& name, int border) {
     VFGradient* const stops = gStops.data();
-    // Two planes and the tiles of the growth; the kernel, its cells, groups of taps and their ink, the
-    // rows between the passes and theirs, and the finished rows of the blur. An inner glow has a row for
-    // its border too.
+    // Two planes and the tiles of the growth; the weights, their cells, groups of taps and what they
+    // cover, the rows between the passes and theirs, and the finished rows of the blur. An inner glow
+    // has a row for its border too.
     cases.push_back(coreCase<Core>(name, Record(4, 0xC0FF8000, 0.75F, 0, nullptr),
                                    Record(2, 0xFF0080FF, 1, 0, nullptr), false, 10 + border, 1));
     cases.push_back(coreCase<Core>(name + "WithStops", Record(4, 0, 1, 3, stops),
                                    Record(2, 0, 1, 2, stops), true, 10 + border, 2));
-    // The kernel, its terms, the lines of a strip, the columns between the passes, the finished rows.
+    // The weights, their terms, the lines of a strip, the columns between the passes, the finished rows.
     cases.push_back(coreCase<Core>("Widest" + name, Record(104, 0xC0FF8000, 0.75F, 0, nullptr),
                                    Record(2, 0xFF0080FF, 1, 0, nullptr), false, 8 + border, 1));
     cases.push_back(coreCase<Core>(name + "Layered", Record(4, 0xC0FF8000, 0.75F, 0, nullptr),
@@ -207,7 +208,7 @@ std::vector<CoreCase> coreCases() {
         using Radial = VFRadialGradientProperty;
         cases.push_back(coreCase<VFText>("Text" + suffix, VFTextProperty(0x80808080, 0.5F),
                                          VFTextProperty(0xFF204060, 1), layered, 0, 1));
-        // Sums of the wide ones take 32 bits; those of the widest run on at every level.
+        // Sums of the wide ones take 32 bits; the widest blurs are by differences.
         for (const auto& [kind, size, outer, inner] :
              {std::tuple("", 3.0F, 7, 8), std::tuple("Wide", 10.0F, 7, 8),
               std::tuple("Widest", 100.0F, 5, 6)}) {
@@ -267,8 +268,9 @@ TEST_P(CoreMemory, RefusedWhilePainting_PaintsNothing) {
         EXPECT_TRUE(samePaint(expected, painted(mCore, mScene))) << "the next call must be perfect";
         return refused;
     });
-    EXPECT_EQ(GetParam().paintRequests == 0, requests == 0);
-    EXPECT_EQ(requests, GetParam().paintRequests);
+    // The widest blurs are by differences but where instructions make dot products, which take two more.
+    const bool byDots = GetParam().name.rfind("Widest", 0) == 0 && blursByDotsAlone();
+    EXPECT_EQ(requests, GetParam().paintRequests + (byDots ? 2 : 0));
 }
 
 TEST_P(CoreMemory, RefusedWhileCopyingARecord_KeepsTheStoredOne) {

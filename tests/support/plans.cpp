@@ -69,6 +69,11 @@ std::vector<uint8_t> blurred(const BlurInput& input) {
     return values;
 }
 
+bool blursByDotsAlone() {
+    constexpr int kLargestRadius = 256;
+    return dotLoops(chosenLevel()).largestDotRadius >= kLargestRadius;
+}
+
 std::vector<uint8_t> dilated(const CoverageRows& source, const DiscShape& disc, const Box& part,
                              bool andInverse) {
     DilationPlan plan(chosenLevel(), source, disc, part);

@@ -19,6 +19,9 @@ VF_API std::vector<uint8_t> blurredByDots(const VFontEffect::internal::BlurInput
 VF_API std::vector<uint8_t> blurredByDifferences(const VFontEffect::internal::BlurInput& input);
 VF_API std::vector<uint8_t> blurred(const VFontEffect::internal::BlurInput& input);
 
+/// Whether the level takes dot products at every radius, and no differences.
+VF_API bool blursByDotsAlone();
+
 /// The part's values, row after row: of a source dilated by a disc, or the smaller ones of that and of
 /// its inverse, dilated likewise.
 VF_API std::vector<uint8_t> dilated(const VFontEffect::internal::CoverageRows& source,
