@@ -14,6 +14,9 @@ function(vorel_objects target)
   endif()
   # Beyond this level compilers unroll loops that are vectors already: half the size again, no speed.
   target_compile_options(${target} PRIVATE $<$<CONFIG:Release>:-O2>)
+  if(VOREL_ASSERTIONS)
+    target_compile_definitions(${target} PRIVATE VOREL_ASSERTIONS=1)
+  endif()
   vorel_warnings(${target})
   set_target_properties(${target} PROPERTIES
     CXX_EXTENSIONS OFF

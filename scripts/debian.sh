@@ -12,7 +12,7 @@ build=build/debian
 # In /usr the multiarch directories are chosen, and programs need no search path of their own. No path
 # of this machine gets into the packages.
 quietly cmake -S . -B "$build" -G Ninja -DCMAKE_BUILD_TYPE=Release -DCMAKE_INSTALL_PREFIX=/usr \
-    -DCMAKE_SKIP_INSTALL_RPATH=ON -DVOREL_BUILD_TOOLS=ON \
+    -DCMAKE_SKIP_INSTALL_RPATH=ON -DVOREL_BUILD_TOOLS=ON -DVOREL_WERROR="${VOREL_WERROR:-OFF}" \
     -DVOREL_PRESET_DIR=/usr/share/voreleffect/presets
 quietly cmake --build "$build"
 

@@ -14,7 +14,11 @@ need_packages cmake ninja-build g++ pkg-config fonts-dejavu-core \
     libraqm-dev libfreetype-dev libfribidi-dev libharfbuzz-dev libfontconfig-dev libpng-dev \
     nlohmann-json3-dev libcli11-dev
 
-quietly cmake -S . -B "$build" -G Ninja -DCMAKE_BUILD_TYPE=Release -DVOREL_BUILD_TOOLS=ON
+# The Release build of scripts/test.sh has the same program: where there is one, it is this build as well.
+[[ -e $build ]] || rm -f "$build"
+if [[ ! -e $build && -f build/release/build.ninja ]]; then ln -s release "$build"; fi
+[[ -L $build ]] ||
+    quietly cmake -S . -B "$build" -G Ninja -DCMAKE_BUILD_TYPE=Release -DVOREL_BUILD_TOOLS=ON
 quietly cmake --build "$build" --target vorelpaint
 
 "$build/tools/vorelpaint" --preset "$preset" --font "DejaVu Sans:bold" --size 96 --align center \

@@ -1,5 +1,6 @@
 #!/usr/bin/env bash
-# Checks the layout (clang-format) and the code (clang-tidy, cppcheck) of everything that is tracked.
+# Checks the layout (clang-format), which way the rooms depend on each other (scripts/arrows.py) and the
+# code (clang-tidy, cppcheck) of everything that is tracked.
 #
 #     scripts/format.sh            check; fails on the first difference or finding
 #     scripts/format.sh --fix      lay the sources out anew first
@@ -7,16 +8,23 @@ set -euo pipefail
 cd "$(dirname "$0")/.."
 source scripts/packages.sh
 
-need_packages clang-format-14 clang-tidy-14 cppcheck
+need_packages clang-format-14 clang-tidy-14 cppcheck python3
 
 mapfile -t sources < <(git ls-files --cached --others --exclude-standard '*.h' '*.cpp')
 if [[ "${1:-}" == --fix ]]; then clang-format-14 -i "${sources[@]}"; fi
-clang-format-14 --dry-run --Werror "${sources[@]}"
+printf '%s\n' "${sources[@]}" | xargs -P "$(nproc)" -n 40 clang-format-14 --dry-run --Werror
+
+python3 -B scripts/arrows.py --self-test
+python3 -B scripts/arrows.py
 
 database=build/sanitize
 [[ -f $database/compile_commands.json ]] || scripts/test.sh sanitize
-printf '%s\n' "${sources[@]}" | grep -E '^(core|property|blend|effect|cores|style|text|tools)/.*\.cpp$' |
-    xargs -P "$(nproc)" -n 4 clang-tidy-14 --quiet -p "$database" 2> /dev/null
+rooms=()
+for room in core simd property blend ops cores effect style text tools; do
+    [[ ! -d $room ]] || rooms+=("$room")
+done
+printf '%s\n' "${sources[@]}" | grep -E "^($(IFS='|'; echo "${rooms[*]}"))/.*\.cpp\$" |
+    xargs -P "$(nproc)" -n 1 clang-tidy-14 --quiet -p "$database" 2> /dev/null
 cppcheck --quiet --std=c++17 --enable=warning,performance,portability --inline-suppr --error-exitcode=1 \
-    -I. -Iinclude core property blend cores effect style text tools
+    -j "$(nproc)" -I. -Iinclude "${rooms[@]}"
 echo "layout and code are clean"

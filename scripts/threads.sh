@@ -14,6 +14,7 @@ if setarch --addr-no-randomize true 2> /dev/null; then run=(setarch --addr-no-ra
 build=build/thread
 cmake -S . -B "$build" -G Ninja -DCMAKE_BUILD_TYPE=RelWithDebInfo -DCMAKE_CXX_COMPILER=clang++-14 \
     -DCMAKE_CXX_FLAGS='-fsanitize=thread -fno-omit-frame-pointer' \
+    -DCMAKE_CXX_FLAGS_RELWITHDEBINFO='-O2 -gline-tables-only -DNDEBUG' -DVOREL_ASSERTIONS=ON \
     -DVOREL_BUILD_TESTS=ON -DVOREL_WERROR=ON > /dev/null
 "${run[@]}" cmake --build "$build" --target reliability_threads_tests -- --quiet
 

@@ -10,6 +10,7 @@
 #include "literal_image.h"
 #include "mask_gallery.h"
 #include "random.h"
+#include "thinned.h"
 #include "voreleffect/voreleffect.h"
 
 /// Driving a core and comparing what it paints with the literal form of the same effect.
@@ -216,10 +217,10 @@ template <class Reference>
     return samePaint(expected, painted(core, scene));
 }
 
-/// Calls `check(random)` for `cases` seeds; stops after the first one that fails and names it.
+/// Calls `check(random)` for `cases` seeds, thinned; stops after the first one that fails and names it.
 template <class Check>
 void forSeeds(uint64_t firstSeed, int cases, Check check) {
-    for (uint64_t seed = firstSeed; seed < firstSeed + static_cast<uint64_t>(cases); ++seed) {
+    for (uint64_t seed = firstSeed; seed < firstSeed + static_cast<uint64_t>(thinned(cases)); ++seed) {
         SCOPED_TRACE("seed " + std::to_string(seed));
         Random random(seed);
         check(random);

@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "levels.h"
+#include "thinned.h"
 
 /// Runs all tests once for each level of the instruction set that the CPU has.
 namespace {
@@ -37,6 +38,8 @@ int main(int argc, char** argv) {
     const std::vector<CpuLevel> levels = vorel_test::levelsHere();
     testing::FLAGS_gtest_repeat = static_cast<int>(levels.size());
     testing::InitGoogleTest(&argc, argv);
+    std::printf("%zu levels; of the random cases of a sweep one in %d\n", levels.size(),
+                vorel_test::kThinned);
     testing::UnitTest::GetInstance()->listeners().Append(new LevelOfIteration(levels));
     return RUN_ALL_TESTS();
 }

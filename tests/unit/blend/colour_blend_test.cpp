@@ -11,6 +11,7 @@
 #include "tests/support/literal_blend.h"
 #include "tests/support/pixel_cases.h"
 #include "tests/support/random.h"
+#include "tests/support/thinned.h"
 #include "voreleffect/VFBitmap.h"
 #include "voreleffect/VFBlender.h"
 
@@ -180,7 +181,7 @@ TEST(ColourBlendSweep, AllPairsOfAlphasMatchTheLiteralForm) {
     constexpr int kSide = 256;
     const Placement whole{kSide, kSide, 0, 0, kSide, kSide};
     for (const int mode : kModes) {
-        for (int seed = 0; seed < 32; ++seed) {
+        for (int seed = 0; seed < thinned(32); ++seed) {
             SCOPED_TRACE(testing::Message() << "seed " << seed << ", mode " << mode);
             Random random(static_cast<uint64_t>(seed));
             GuardedBitmap dst(kSide, kSide, 4);
@@ -197,7 +198,7 @@ TEST(ColourBlendSweep, AllPairsOfAlphasMatchTheLiteralForm) {
 
 TEST(ColourBlendSweep, WordsMatchTheLiteralForm) {
     for (const int mode : kModes) {
-        for (int seed = 0; seed < kSweepCases; ++seed) {
+        for (int seed = 0; seed < thinned(kSweepCases); ++seed) {
             Random random(static_cast<uint64_t>(seed));
             const Placement p = randomPlacement(random);
             const int stride = p.width + oneOf(random, {0, 0, 1, 3, 16, 29});
@@ -217,7 +218,7 @@ TEST(ColourBlendSweep, WordsMatchTheLiteralForm) {
 
 TEST(ColourBlendSweep, BytesMatchTheLiteralForm) {
     for (const int order : kOrders) {
-        for (int seed = 0; seed < kSweepCases; ++seed) {
+        for (int seed = 0; seed < thinned(kSweepCases); ++seed) {
             Random random(static_cast<uint64_t>(seed));
             const Placement p = randomPlacement(random);
             const int stride = p.width * 4 + oneOf(random, {0, 0, 1, 2, 3, 4, 29});

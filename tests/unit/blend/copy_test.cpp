@@ -10,6 +10,7 @@
 #include "tests/support/literal_blend.h"
 #include "tests/support/pixel_cases.h"
 #include "tests/support/random.h"
+#include "tests/support/thinned.h"
 #include "voreleffect/VFBitmap.h"
 #include "voreleffect/VFBlender.h"
 
@@ -163,7 +164,7 @@ TEST(DrawBitmap, BitmapSourceGivesItsPixelsAndSize) {
 
 TEST(CopySweep, MatchesTheLiteralForm) {
     for (const int bytesPerPixel : kByteSizes) {
-        for (int seed = 0; seed < kSweepCases; ++seed) {
+        for (int seed = 0; seed < thinned(kSweepCases); ++seed) {
             Random random(static_cast<uint64_t>(seed));
             const Placement p = randomPlacement(random);
             SCOPED_TRACE(testing::Message()

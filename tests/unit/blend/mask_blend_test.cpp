@@ -10,6 +10,7 @@
 #include "tests/support/literal_blend.h"
 #include "tests/support/pixel_cases.h"
 #include "tests/support/random.h"
+#include "tests/support/thinned.h"
 #include "voreleffect/VFBitmap.h"
 #include "voreleffect/VFBlender.h"
 
@@ -177,7 +178,7 @@ TEST(MaskBlendSweep, AllCoveragesOverAllAlphasMatchTheLiteralForm) {
     for (size_t i = 0; i < mask.size(); ++i)
         mask.data()[i] = static_cast<uint8_t>(i % kSide);
     for (const int mode : kModes) {
-        for (int seed = 0; seed < 32; ++seed) {
+        for (int seed = 0; seed < thinned(32); ++seed) {
             Random random(static_cast<uint64_t>(seed));
             const uint32_t color = randomColor(random);
             SCOPED_TRACE(testing::Message() << "seed " << seed << ", mode " << mode);
@@ -193,7 +194,7 @@ TEST(MaskBlendSweep, AllCoveragesOverAllAlphasMatchTheLiteralForm) {
 
 TEST(MaskBlendSweep, MatchesTheLiteralForm) {
     for (const int mode : kModes) {
-        for (int seed = 0; seed < kSweepCases; ++seed) {
+        for (int seed = 0; seed < thinned(kSweepCases); ++seed) {
             Random random(static_cast<uint64_t>(seed));
             const Placement p = randomPlacement(random);
             const int stride = p.width + oneOf(random, {0, 0, 1, 3, 16, 29});

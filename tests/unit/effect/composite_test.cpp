@@ -9,6 +9,7 @@
 #include "tests/support/literal_blend.h"
 #include "tests/support/pixel_cases.h"
 #include "tests/support/random.h"
+#include "tests/support/thinned.h"
 #include "voreleffect/VFBitmap.h"
 #include "voreleffect/VFEffect.h"
 
@@ -102,7 +103,7 @@ TEST(Composite, AllValuesMatchTheLiteralForm) {
 }
 
 TEST(Composite, AllSizesMatchTheLiteralForm) {
-    for (int seed = 0; seed < 1000; ++seed) {
+    for (int seed = 0; seed < thinned(1000); ++seed) {
         Random random(static_cast<uint64_t>(seed));
         const int width = 1 + seed % 67;
         const int height = random.between(1, 5);

@@ -14,6 +14,7 @@
 #include "tests/support/literal_engine.h"
 #include "tests/support/pixel_cases.h"
 #include "tests/support/random.h"
+#include "tests/support/thinned.h"
 #include "voreleffect/VFBitmap.h"
 #include "voreleffect/VFECore.h"
 #include "voreleffect/VFEffect.h"
@@ -366,7 +367,7 @@ void liveOnce(uint64_t seed, const Kinds& kinds) {
 }
 
 TEST(WholeRun, TextFillAloneMatchesTheLiteralEngine) {
-    for (uint64_t seed = 0; seed < 2000 && !HasFailure(); ++seed)
+    for (uint64_t seed = 0; seed < thinned(2000U) && !HasFailure(); ++seed)
         liveOnce(seed, kTextOnly);
 }
 
@@ -374,18 +375,18 @@ TEST(WholeRun, EachKindWithTheTextFillMatchesTheLiteralEngine) {
     for (const int kind : kEveryKind) {
         SCOPED_TRACE(testing::Message() << "kind " << kind);
         const Kinds kinds = {kind, kind, literal::kText};
-        for (uint64_t seed = 0; seed < 200 && !HasFailure(); ++seed)
+        for (uint64_t seed = 0; seed < thinned(200U) && !HasFailure(); ++seed)
             liveOnce(seed, kinds);
     }
 }
 
 TEST(WholeRun, AllKindsMatchTheLiteralEngine) {
-    for (uint64_t seed = 0; seed < 1000 && !HasFailure(); ++seed)
+    for (uint64_t seed = 0; seed < thinned(1000U) && !HasFailure(); ++seed)
         liveOnce(seed, kEveryKind);
 }
 
 TEST(WholeRun, EveryKindAtOncePaintsInEveryOrder) {
-    for (uint64_t seed = 0; seed < 250 && !HasFailure(); ++seed) {
+    for (uint64_t seed = 0; seed < thinned(250U) && !HasFailure(); ++seed) {
         SCOPED_TRACE(testing::Message() << "seed " << seed);
         Random random(seed);
         Pair pair(random, kEveryKind);
