@@ -12,6 +12,10 @@ from conan.tools.files import copy, load, rmdir
 required_conan_version = ">=2.0"
 
 
+# What the library is made of.
+ROOMS = ("blend", "cmake", "core", "cores", "effect", "include", "ops", "property", "simd")
+
+
 class VoreleffectConan(ConanFile):
     name = "voreleffect"
     description = "Text effects painted from glyph coverage masks, the same bytes on every CPU"
@@ -37,7 +41,7 @@ class VoreleffectConan(ConanFile):
             "CMakeLists.txt",
             "LICENSE",
             "README.md",
-            *(f"{folder}/*" for folder in ("blend", "cmake", "core", "cores", "effect", "include", "property")),
+            *(f"{folder}/*" for folder in ROOMS),
         ):
             copy(self, pattern, src=self._tree, dst=self.export_sources_folder)
 
