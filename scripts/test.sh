@@ -20,13 +20,16 @@ presets=("$@")
 [[ $# -gt 0 ]] || presets=(release sanitize arm64)
 for preset in "${presets[@]}"; do
     echo "== $preset"
-    if [[ $preset == quick ]]; then
-        cmake --preset release > /dev/null
-        cmake --build --preset release --target unit_tests -- --quiet
-        VOREL_THINNED=8 ctest --preset release --parallel "$(nproc)" --progress --label-regex '^unit$'
-        continue
-    fi
-    cmake --preset "$preset" > /dev/null
-    cmake --build --preset "$preset" -- --quiet
-    ctest --preset "$preset" --parallel "$(nproc)" --progress
+    TIMEFORMAT="== $preset: %U s user, %S s system, %R s on the clock"
+    time {
+        labels=()
+        target=all
+        if [[ $preset == quick ]]; then
+            preset=release target=unit_tests labels=(--label-regex '^unit$')
+            export VOREL_THINNED=8
+        fi
+        cmake --preset "$preset" > /dev/null
+        cmake --build --preset "$preset" --target "$target" -- --quiet
+        ctest --preset "$preset" --parallel "$(nproc)" --progress "${labels[@]}"
+    }
 done
