@@ -1,7 +1,7 @@
 #!/usr/bin/env python3
 """Counts what the inner loops cost on 64-bit ARM, where nothing is timed: instructions in the code of g++
 and clang, and llvm-mca's cycles on a Cortex-A76. Blends and growth are counted per pixel (and pass), the
-blur per result and 16 taps, or by running sums per result and term.
+blur per result and 16 taps, or by differences of the weights per result and term.
 
     bench/arm64_loops.py        prints a table in Markdown
 """
@@ -57,7 +57,7 @@ LOOPS = (
     Loop("blur, down", "ops/blur/dot_loops.cpp", DOT_PRODUCTS, ("down",), "udot", 64, "", 64),
     Loop("blur, across", "ops/blur/dot_loops.cpp", DOT_PRODUCTS, ("across",), "udot", 64, "", 64),
     # Four rows of results at a time, 16 of each.
-    Loop("running sums, a term", "ops/blur/difference_loops.cpp", NEON, ("next",), "add\tv", 8, "", 64),
+    Loop("differences, a term", "ops/blur/difference_loops.cpp", NEON, ("next",), "add\tv", 8, "", 64),
     # Two rows at a time, a pair sum in each.
     Loop("growth", "ops/grow/growth_loops.cpp", NEON, ("grow",), "uaddlp", 2, "st", 32),
 )

@@ -31,8 +31,8 @@ Glyph rendered(FT_Face face, char character, int& penX) {
     return glyph;
 }
 
-/// Moves the glyphs so that their ink starts at (0, 0), and sets the size of the workload.
-void cropToInk(Workload& workload) {
+/// Moves the glyphs so that their extents start at (0, 0), and sets the size of the workload.
+void cropToExtents(Workload& workload) {
     int left = INT_MAX, top = INT_MAX, right = INT_MIN, bottom = INT_MIN;
     for (const Glyph& glyph : workload.glyphs) {
         left = std::min(left, glyph.x);
@@ -73,7 +73,7 @@ Workload textLine(const char* name, const char* text, const char* font, int size
         Glyph glyph = rendered(face.face(), character, penX);
         if (!glyph.coverage.empty()) workload.glyphs.push_back(std::move(glyph));
     }
-    cropToInk(workload);
+    cropToExtents(workload);
     mergeGlyphs(workload);
     return workload;
 }

@@ -15,7 +15,7 @@ struct Glyph {
     std::vector<uint8_t> coverage;
 };
 
-/// What is decorated: coverage cropped to its ink, whole and glyph by glyph.
+/// What is decorated: coverage cropped to its extents, whole and glyph by glyph.
 struct Workload {
     std::string name;
     std::string text;  ///< empty where no font is used
@@ -24,7 +24,7 @@ struct Workload {
     int width = 0;
     int height = 0;
     std::vector<uint8_t> mask;  ///< overlapping glyphs keep the larger coverage
-    std::vector<Glyph> glyphs;  ///< those with ink
+    std::vector<Glyph> glyphs;  ///< those with coverage
 
     /// Pixels of the mask grown by `margin` on each side.
     int64_t grownPixels(int margin) const {

@@ -41,8 +41,8 @@ class OpencvJob : public Job {
 };
 
 OpencvJob::Filter dilation(int radius) {
-    return [kernel = disc(radius)](const cv::Mat& mask, cv::Mat& result) {
-        cv::dilate(mask, result, kernel, {-1, -1}, 1, cv::BORDER_CONSTANT, cv::Scalar(0));
+    return [element = disc(radius)](const cv::Mat& mask, cv::Mat& result) {
+        cv::dilate(mask, result, element, {-1, -1}, 1, cv::BORDER_CONSTANT, cv::Scalar(0));
     };
 }
 

@@ -21,7 +21,7 @@ NAVIGATION = [
                   "docs/style-files.md"]),
     ("How it works", ["docs/architecture.md", "docs/pixels.md", "docs/fixed-point.md", "docs/quirks.md",
                       "docs/determinism.md", "docs/reliability.md", "docs/benchmarks.md",
-                      "docs/adding-a-core.md"]),
+                      "docs/adding-a-core.md", "docs/adding-a-level.md"]),
     ("Project", ["CHANGELOG.md", "CONTRIBUTING.md", "SECURITY.md"]),
 ]
 START = "README.md"
