@@ -10,7 +10,7 @@ else()
   set(VOREL_LEVELS scalar)
 endif()
 
-# On x86-64 a level has the instructions of its name and no better ones, whatever -march a build asks for.
+# On x86-64 a level has the vectors of its name and no wider ones, whatever -march a build asks for.
 set(VOREL_FLAGS_scalar -DVOREL_SCALAR)
 set(VOREL_FLAGS_sse2 -mno-avx)
 set(VOREL_FLAGS_avx2 -mavx2 -mno-avx512f)

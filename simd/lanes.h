@@ -20,9 +20,9 @@
 
 // clang-format off
 /// Lanes: what a level of the instruction set must provide beside its width, VOREL_VECTOR_BYTES, and
-/// what vectors.h has for all. A level is one file, lanes_<level>.h; what stands in brackets it may
-/// leave to lanes_default.h. All levels give the same bytes: the scalar one is what the tests compare
-/// with.
+/// what vectors.h has for all. A level is one file, lanes_<level>.h, or shares one as NEON with dot
+/// products does; what stands in brackets it may leave to lanes_default.h. All levels give the same
+/// bytes: the scalar one is what the tests compare with.
 ///
 /// | operation                     | result                                                               |
 /// | ----------------------------- | -------------------------------------------------------------------- |
