@@ -15,7 +15,7 @@ uint8_t scaled(uint32_t value, uint32_t alpha) {
 }
 
 /// A straight colour at the alpha `coverage`, premultiplied.
-uint32_t inked(uint32_t rgb, uint32_t coverage) {
+uint32_t covered(uint32_t rgb, uint32_t coverage) {
     return coverage << 24 | uint32_t{scaled(rgb >> 16 & 0xFF, coverage)} << 16 |
            uint32_t{scaled(rgb >> 8 & 0xFF, coverage)} << 8 | scaled(rgb & 0xFF, coverage);
 }
@@ -41,8 +41,8 @@ BlendScene textScene(const SceneKind& kind) {
         for (int x = 0; x < kind.width; ++x) {
             const uint8_t coverage = pageCoverage(x, y, 0);
             scene.mask.push_back(coverage);
-            scene.source.push_back(inked(red << 16 | 0x4080U, coverage));
-            appendPixel(scene.before, inked(0x202830U, pageCoverage(x, y, 4)));
+            scene.source.push_back(covered(red << 16 | 0x4080U, coverage));
+            appendPixel(scene.before, covered(0x202830U, pageCoverage(x, y, 4)));
         }
     }
     return scene;
@@ -53,8 +53,8 @@ BlendScene randomScene(const SceneKind& kind) {
     vorel_test::Random random(2);
     for (int64_t i = 0; i < kind.pixels(); ++i) {
         scene.mask.push_back(random.byte());
-        scene.source.push_back(inked(random.next(), random.byte()));
-        appendPixel(scene.before, inked(random.next(), random.byte()));
+        scene.source.push_back(covered(random.next(), random.byte()));
+        appendPixel(scene.before, covered(random.next(), random.byte()));
     }
     return scene;
 }

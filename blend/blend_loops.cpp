@@ -91,7 +91,7 @@ void blendMaskedImage(const BlendJob& job) {
     paintRows(MaskedImagePainter<Rule>{}, job);
 }
 
-void largerCoverage(const BlendJob& job) {
+void maxCoverage(const BlendJob& job) {
     // A column of vectors after the other, as glyphs are a few vectors wide; in bands that stay in the
     // cache, as whole layers are not.
     constexpr int64_t kBandRows = 64;
@@ -122,7 +122,7 @@ extern const BlendLoops kBlendLoops = {
     blendImage<DstOver, loadPixels>,
     blendMaskedImage<DstOverWhereCovered>,
     blendMaskedImage<MixByCoverage>,
-    largerCoverage,
+    maxCoverage,
 };
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

@@ -40,7 +40,7 @@ struct BlendLoops {
     BlendLoop dstOverWhereCovered;
     BlendLoop mixByCoverage;
     // The mask into a destination of 1 byte a pixel.
-    BlendLoop largerCoverage;
+    BlendLoop maxCoverage;
 };
 
 /// The loops of a level.

@@ -1,8 +1,8 @@
 #include <cstdint>
 
 #include "blend/blend_loops.h"
+#include "blend/blend_modes.h"
 #include "blend/job.h"
-#include "core/blend_modes.h"
 #include "core/views.h"
 #include "voreleffect/VFBlender.h"
 

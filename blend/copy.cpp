@@ -53,7 +53,7 @@ void VFBlender::drawBitmap8To8(int x, int y, const VFBitmap* dst, unsigned char*
     BlendJob job = copyJob(mask, maskWidth, x, y, clip);
     job.destination = target.at(clip.left, clip.top);
     job.destinationStride = target.width;
-    blendLoops(chosenLevel()).largerCoverage(job);
+    blendLoops(chosenLevel()).maxCoverage(job);
 }
 
 void VFBlender::drawBitmap8To32(int x, int y, const VFBitmap* dst, unsigned char* mask, int maskWidth,

@@ -135,8 +135,8 @@ constexpr bool kKeepsToLines = kPixels > 1 && kPixels < kBytes;
 ///
 ///     row        |abcdefghijklmnopqrstuvwxyz|
 ///     first      |abcdefgh|
-///     loop           |efghijkl|mnopqrst|uvwxyz|..   from a line's start; the last may hang over
-///     last                         |stuvwxyz|
+///     loop           |efghijkl|mnopqrst|       from a line's start on, while a vector starts before the
+///     last last                         |stuvwxyz|
 ///
 /// Blending the same pixel twice would change it. So the two are computed from what the row held before,
 /// and stored when the loop is done.

@@ -62,13 +62,12 @@ struct DstOverGate {
 /// With p = product, m the mask, d the destination, s = p(colour, m) and i = 255 - d.alpha, the rule is
 /// told in five branches. One expression does for all of them,
 ///
-///     min(p(d + p(s, i), m), 255)         with d = 0 and the last m = 255 where d.alpha is 0:
+///     min(p(d + p(s, i), m), 255)      with d = 0 and the last m = 255 where d.alpha is 0:
 ///
 /// - m = 0: 0. So are s and p(0, i); d is times 0, or 0 itself where the last m is 255.
 /// - d.alpha = 0: s. There i = 255, and p(s, 255) = s, twice.
-/// - m = 255: min(d + p(colour, i), 255). There s = colour; of a sum of up to 255 p(sum, 255) is the
-/// sum, of a
-///   larger one 255 or more.
+/// - m = 255: min(d + p(colour, i), 255). There s = colour; p(sum, 255) is the sum up to 255, and 255 or
+///   more above.
 /// - d.alpha = 255: p(d, m), of which the alpha is m. There i = 0, and p(255, m) = m.
 /// - otherwise: as it stands; the sum may reach 510.
 struct DstOverClip {

@@ -3,6 +3,7 @@
 #include <cstdint>
 #include <limits>
 
+#include "core/assert.h"
 #include "core/inline.h"
 
 namespace VFontEffect::internal {
@@ -43,6 +44,7 @@ inline int32_t wholeDegrees(float degrees, int32_t turn) {
 
 /// A value of 0 or more, rounded up to a whole multiple.
 VOREL_INLINE int64_t roundedUp(int64_t value, int64_t multiple) {
+    VOREL_ASSERT(value >= 0);
     return (value + multiple - 1) / multiple * multiple;
 }
 

@@ -1,7 +1,5 @@
 #pragma once
 
-#include <cstdint>
-
 #include "cores/paint_input.h"
 #include "cores/placed_target.h"
 

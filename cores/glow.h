@@ -36,6 +36,10 @@ int glowReach(const GlowRecord& record);
 void fillGlowTable(CpuLevel level, const GlowRecord& record, float fadeStart, int curve,
                    unsigned int* table);
 
+/// Grows the coverage of a whole picture in place; see VFOuterGlow::increaseByBoxFilter. When memory
+/// runs out it stays as it was.
+void growByBoxFilter(CpuLevel level, unsigned char* mask, int passes, int width, int height);
+
 void paintGlow(const VFECore::ParamPostProcessing* params, const GlowRecord& record, GlowSide side);
 
 }  // namespace VFontEffect::internal

@@ -1,7 +1,6 @@
 #include "core/effect_types.h"
 #include "cores/glow.h"
 #include "cores/property_copy.h"
-#include "ops/grow/growth_plan.h"
 #include "voreleffect/VFECore.h"
 
 namespace VFontEffect {

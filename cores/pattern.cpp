@@ -38,11 +38,12 @@ void VFPattern::doPostProcessing(ParamPostProcessing* params) {
     const CpuLevel level = chosenLevel();
     TilePlan tiles(level, pattern, mProperty->mScale, mProperty->mOpacity, box.width);
     if (!tiles) return;
+    const BlendLoop paint = blendLoops(level).dstOverWhereCovered;
     fillCovered(level, box, params->dstBitmap, [&](const BlendJob& job) {
         for (int64_t y = 0; y < job.height; ++y) {
             BlendJob row = rowOf(job, y);
             row.image = reinterpret_cast<const uint8_t*>(tiles.row(y));
-            blendLoops(level).dstOverWhereCovered(row);
+            paint(row);
         }
     });
 }

@@ -24,7 +24,9 @@ struct Fields {
     /// record holds nothing shared afterwards.
     template <class Record>
     [[nodiscard]] static bool ownContents(Record& copy) {
-        return (own(copy, copy.*Field) && ...);
+        bool owned = true;
+        ((owned = own(copy, copy.*Field) && owned), ...);
+        return owned;
     }
 
     template <class Record>
@@ -118,17 +120,11 @@ bool replaceCopy(Record*& stored, const VFProperty* given) {
 
 }  // namespace VFontEffect::internal
 
+// clang-format off
 /// Defines what all cores do alike that keep their record in `mProperty` and derive nothing from it.
-#define VOREL_KEEPS_RECORD(Core, type)             \
-    Core::Core() : mProperty(nullptr) {            \
-        mEffectType = type;                        \
-    }                                              \
-    Core::~Core() {                                \
-        releaseCopy(mProperty);                    \
-    }                                              \
-    void Core::setProperty(VFProperty* property) { \
-        replaceCopy(mProperty, property);          \
-    }                                              \
-    VFProperty* Core::getProperty() {              \
-        return mProperty;                          \
-    }
+#define VOREL_KEEPS_RECORD(Core, type)                                                             \
+    Core::Core() : mProperty(nullptr) { mEffectType = type; }                                      \
+    Core::~Core() { internal::releaseCopy(mProperty); }                                            \
+    void Core::setProperty(VFProperty* property) { internal::replaceCopy(mProperty, property); }   \
+    VFProperty* Core::getProperty() { return mProperty; }
+// clang-format on

@@ -33,7 +33,7 @@ class Outline {
     int64_t left() const { return mGrown.left(); }
     int64_t bandRows() const { return mGrown.bandRows(); }
     CoverageRows rows(int64_t y, int64_t count) {
-        return mInverse ? mGrown.smallerRows(*mInverse, y, count) : mGrown.rows(y, count);
+        return mInverse ? mGrown.minRows(*mInverse, y, count) : mGrown.rows(y, count);
     }
 
   private:

@@ -1,5 +1,3 @@
-#include <cstdint>
-
 #include "blend/blend_loops.h"
 #include "core/views.h"
 #include "voreleffect/VFEffect.h"

@@ -18,14 +18,14 @@ struct Placement {
 };
 
 /// Outside the glyph.
-constexpr Placement kBeneath = {true, true, false, true, false};
+inline constexpr Placement kBeneath = {true, true, false, true, false};
 /// On both sides of the glyph's edge.
-constexpr Placement kAstride = {true, false, true, true, true};
+inline constexpr Placement kAstride = {true, false, true, true, true};
 /// Inside the glyph, or the text fill itself.
-constexpr Placement kWithin = {false, false, false, false, true};
+inline constexpr Placement kWithin = {false, false, false, false, true};
 /// Deliberate: a stroke at an unknown position is painted among the effects inside the glyph, but into
 /// the outer layer, of which the composite shows nothing where the glyph covers.
-constexpr Placement kStray = {false, false, false, true, false};
+inline constexpr Placement kStray = {false, false, false, true, false};
 
 inline const Placement& placementOf(StrokeSide side) {
     if (side == StrokeSide::centre) return kAstride;

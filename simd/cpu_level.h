@@ -9,9 +9,9 @@
 /// VOREL_EACH_VECTOR_LEVEL applies a macro to the name of each level but the scalar one, from the
 /// plainest to the best, and to two arguments of the caller's. The plainest runs on every CPU of its
 /// kind, so only the tests have the scalar level beside it, and VOREL_WITHOUT_SCALAR says that it is not
-/// there. VOREL_EACH_DOTLESS_LEVEL gives for each the level whose code does when it takes no dot
-/// products, and VOREL_EACH_DIFFERENCE_LEVEL the one whose differences of a blur's weights do: levels
-/// with instructions for dot products blur by these alone.
+/// there. Two more lists name for each of them the level that its loops are taken from:
+/// VOREL_EACH_DOTLESS_LEVEL for the loops without dot products, VOREL_EACH_DIFFERENCE_LEVEL for a blur's
+/// differences of the weights, which levels with instructions for dot products do not choose.
 #if defined(__x86_64__)
 #define VOREL_EACH_VECTOR_LEVEL(apply, a, b) apply(sse2, a, b) apply(avx2, a, b) apply(avx512, a, b)
 #define VOREL_EACH_DOTLESS_LEVEL(apply, a, b) VOREL_EACH_VECTOR_LEVEL(apply, a, b)

@@ -34,8 +34,8 @@ float inverseAbove(uint32_t total);
 constexpr uint32_t kLargestTotal = 26000;
 
 /// No total of weights on that scale is above this. As exp(-x^2 / d) falls, the sum over the distances 1
-/// to R is below its integral from 0 on, R / 2 * sqrt(pi / ln 100) = 0.41297 R; there are two such
-/// sides, the centre, and up to half a unit of rounding in each of the other 2 R weights.
+/// to R is below its integral from 0 on, R / 2 * sqrt(pi / ln 100) = 0.41297 R: 826 thousandths for both
+/// sides. The centre adds the scale, and rounding at most half a unit to each of the other 2 R weights.
 constexpr uint32_t totalBound(uint32_t scale, uint32_t radius) {
     return scale + (scale * radius / 1000 + 1) * 826 + radius;
 }

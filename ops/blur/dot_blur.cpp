@@ -72,7 +72,7 @@ GroupRange GroupRange::needed(const PackedWeights& weights, int64_t height, int6
     const int64_t end = quads - 1 + tapSteps(weights->radius);
     if (weights->isNarrow) return {0, end};
     const int64_t first = std::min(end, std::max<int64_t>(0, -firstRow) / kQuad);
-    return {first, std::clamp(quadsOf(height - firstRow), first, end)};
+    return {first, std::clamp(quadsOf(std::max<int64_t>(0, height - firstRow)), first, end)};
 }
 
 TapGroups::TapGroups(const DotLoops& loops, const PackedWeights& weights, int64_t width, int64_t height,
@@ -108,6 +108,7 @@ IntermediateBuffer::IntermediateBuffer(const DotLoops& loops, const PackedWeight
       mPixels(mStrideBytes, kQuad),
       mCovered(PixelBuffer<uint8_t>::zeroed(strideFor(columns) / loops.vectorBytes)) {
     if (!*this || !weights) return;
+    VOREL_ASSERT(coveredColumn % kWidestVector == 0);
     uint8_t* const start = mPixels.data() + kIntermediateMargin * weights.pixelBytes();
     mRows = {start, mStrideBytes, columns, coveredColumn, full.before, full.from, mCovered.data()};
     loops.clear(*weights, mRows);

@@ -153,7 +153,7 @@ struct DotMethod {
         return grid;
     }
 
-    /// Four rows of results; `group(step)` is where the taps of a step are.
+    /// Four rows of results; `groupAt(step)` is where the taps of a step are.
     template <class GroupAt, class Store>
     VOREL_INLINE void quadDown(const Range& steps, GroupAt groupAt, Store store) const {
         U16s results[2][kQuad];
@@ -360,12 +360,13 @@ void fillFullColumns(const IntermediateRows& intermediate) {
 template <class Method>
 void down(const PackedBlur& blur, const TapColumns& columns, int64_t quad,
           const IntermediateRows& intermediate) {
-    std::memset(intermediate.covered, 0,
-                static_cast<size_t>(wholeVectors(intermediate.columns) / kBytes));
+    const int64_t strips = wholeVectors(intermediate.columns) / kBytes;
+    std::memset(intermediate.covered, 0, static_cast<size_t>(strips));
     const int64_t firstStrip = intermediate.coveredColumn / kBytes;
-    for (int64_t strip = 0; strip * kBytes < columns.width; ++strip)
-        intermediate.covered[firstStrip + strip] =
-            !coveredSteps(columns, strip, quad, blur.radius).empty();
+    for (int64_t strip = 0; strip * kBytes < columns.width; ++strip) {
+        const Range steps = coveredSteps(columns, strip, quad, blur.radius);
+        intermediate.covered[firstStrip + strip] = !steps.empty();
+    }
     quadDown(Method::of(blur, false), columns, quad, blur.radius,
              [&](int64_t strip, int j, const typename Method::Row& row) VOREL_INLINE_LAMBDA {
                  Method::storeIntermediate(
@@ -390,9 +391,10 @@ void copy(const PackedBlur&, const CoverageRows& source, int64_t row,
     for (int64_t x = 0; x < source.width; x += kBytes) {
         const Group group = Group::of(SourceStrip::of(source, x), row);
         intermediate.covered[x / kBytes] = group.isCovered();
-        for (int j = 0; j < kQuad; ++j)
-            Method::storeIntermediate(Method::rowOf(group.rows[j]),
-                                      intermediateAt<Method>(intermediate, x, j));
+        for (int j = 0; j < kQuad; ++j) {
+            uint8_t* const to = intermediateAt<Method>(intermediate, x, j);
+            Method::storeIntermediate(Method::rowOf(group.rows[j]), to);
+        }
     }
 }
 

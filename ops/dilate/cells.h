@@ -72,7 +72,7 @@ inline void beginCells(const Dilation& dilation, uint8_t* memory) {
     layOut<CellLayout>(dilation, memory);
 }
 
-template <int kReach>
+template <int64_t kReach>
 uint8_t* rowsByCells(const Dilation& dilation, uint8_t* memory, int64_t y, int64_t count) {
     const auto planes = layoutIn<CellLayout>(memory);
     for (int64_t row = 0; row < count + 2 * kReach; ++row)
@@ -88,7 +88,7 @@ uint8_t* rowsByCells(const Dilation& dilation, uint8_t* memory, int64_t y, int64
     return planes.results;
 }
 
-template <int kReach>
+template <int64_t kReach>
 constexpr DilationStrategy kCells = {layoutBytes<CellLayout>, beginCells, rowsByCells<kReach>};
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

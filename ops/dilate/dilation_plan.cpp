@@ -11,6 +11,7 @@ namespace {
 constexpr int64_t kBandRows = 32;
 
 Dilation inputOf(const CoverageRows& box, const DiscShape& disc, const Box& wanted) {
+    VOREL_ASSERT(!wanted.empty());
     const Box part = translated(wanted, kDilationBorder, kDilationBorder);
     Dilation input = {};
     input.box = box;
@@ -25,6 +26,7 @@ Dilation inputOf(const CoverageRows& box, const DiscShape& disc, const Box& want
 }
 
 const DilationStrategy& strategyFor(const DilationLoops& loops, int reach) {
+    VOREL_ASSERT(reach >= 0);
     if (reach <= kLongestCellReach) return loops.cells[reach];
     return reach <= loops.longestSpreadReach ? loops.spreading : loops.tiles;
 }
@@ -38,7 +40,6 @@ DilationPlan::DilationPlan(CpuLevel level, const CoverageRows& source, const Dis
       mStrategy(strategyFor(mLoops, disc.reach)),
       mMemory(mStrategy.memoryBytes(mInput)),
       mNextRow(part.top) {
-    VOREL_ASSERT(disc && !part.empty());
     if (mMemory) mStrategy.begin(mInput, mMemory.data());
 }
 
@@ -46,7 +47,7 @@ CoverageRows DilationPlan::rows(int64_t y, int64_t count) {
     return asRows(nextRows(y, count), count);
 }
 
-CoverageRows DilationPlan::smallerRows(DilationPlan& other, int64_t y, int64_t count) {
+CoverageRows DilationPlan::minRows(DilationPlan& other, int64_t y, int64_t count) {
     VOREL_ASSERT(left() == other.left() && mInput.right == other.mInput.right);
     uint8_t* const values = nextRows(y, count);
     mLoops.keepMin(values, other.nextRows(y, count), dilatedStride(mInput) * count);

@@ -34,7 +34,7 @@ class DilationPlan {
     CoverageRows rows(int64_t y, int64_t count);
 
     /// Likewise, of each result the smaller one of this plan's and of another's for the same part.
-    CoverageRows smallerRows(DilationPlan& other, int64_t y, int64_t count);
+    CoverageRows minRows(DilationPlan& other, int64_t y, int64_t count);
 
   private:
     uint8_t* nextRows(int64_t y, int64_t count);

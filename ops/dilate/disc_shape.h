@@ -49,7 +49,7 @@ class RimWalk {
     float mRadius;
 };
 
-/// The disc of a stroke row by row: full cells in the middle, then cells of falling weight.
+/// A disc row by row: full cells in the middle, then cells of falling weight.
 struct DiscShape {
     static constexpr int kLongestReach = static_cast<int>(kLargestSizePx);
     /// Of a quarter of the disc. The rim is one pixel wide: where it is flatter than the diagonal it has
@@ -58,7 +58,7 @@ struct DiscShape {
 
     explicit DiscShape(float radius);
 
-    /// Whether there is a disc, of a size that a stroke can have.
+    /// Whether there is a disc, of up to kLongestReach.
     explicit operator bool() const { return reach >= 0; }
 
     int reach;

@@ -20,6 +20,7 @@ struct Arena {
 
     template <class T>
     VOREL_INLINE T* take(int64_t count) {
+        static_assert(alignof(T) <= kArenaAlignment, "all that is handed out is aligned for its type");
         uint8_t* const taken = memory == nullptr ? nullptr : memory + used;
         used += roundedUp(count * static_cast<int64_t>(sizeof(T)), kArenaAlignment);
         return reinterpret_cast<T*>(taken);
@@ -38,6 +39,7 @@ int64_t layoutBytes(const Dilation& dilation) {
 
 template <class Layout>
 Layout& layOut(const Dilation& dilation, uint8_t* memory) {
+    VOREL_ASSERT(reinterpret_cast<uintptr_t>(memory) % kArenaAlignment == 0);
     Arena arena = {memory};
     Layout& layout = *arena.take<Layout>(1);
     layout = Layout::of(dilation, arena);

@@ -15,8 +15,8 @@
 /// and to the right, serves them all; the cells of the rim take the same pairs less what they lack.
 ///
 /// Vectors without anything covered in reach are left out, and so is the inside of glyphs: a full vector
-/// fills as many rows as the disc has full cells in its middle column. Below another one that is one row
-/// more.
+/// fills as many rows as the disc has full cells in its middle column, all but the lowest of which the
+/// full vector above it has filled.
 ///
 /// Cost: for a reach of r, 2 r + 2 loads, up to 3 r cells of the rim and 2 r + 1 maxima with rows of
 /// results, for each vector of the source along the outline.

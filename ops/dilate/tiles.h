@@ -127,9 +127,9 @@ inline int32_t listFlatTaps(const TileLayout& planes, int64_t reach, int32_t* ta
         step = planes.lengths[i];
     }
     const int64_t count = evenAtLeast((length + step - 1) / step, kFewestTaps);
+    VOREL_ASSERT(count <= kMostTaps);
     for (int64_t i = 0; i < count; ++i)
         taps[i] = static_cast<int32_t>(plane + min(i * step - reach, reach + 1 - step));
-    VOREL_ASSERT(count <= kMostTaps);
     return static_cast<int32_t>(count);
 }
 
@@ -315,7 +315,7 @@ inline void beginTiles(const Dilation& dilation, uint8_t* memory) {
 
 // --- Evaluation --------------------------------------------------------------------------------------
 
-VOREL_INLINE Tile largerTap(const uint8_t* source, const int32_t* taps) {
+VOREL_INLINE Tile maxTap(const uint8_t* source, const int32_t* taps) {
     return max(load<Tile>(source + taps[0]), load<Tile>(source + taps[1]));
 }
 
@@ -333,10 +333,10 @@ VOREL_INLINE Tile dilatedRow(const DiscRow& row, const uint8_t* source) {
     for (int32_t i = kFewestRimCells; i < row.rimCount; i += 2)
         result = max(result, rimPair(source, row.firstRim + i, row.deficits + i));
     if (row.taps == nullptr) return result;
-    const Tile flat = max(largerTap(source, row.taps), largerTap(source, row.taps + 2));
+    const Tile flat = max(maxTap(source, row.taps), maxTap(source, row.taps + 2));
     result = max(result, flat);
     for (int32_t i = kFewestTaps; i < row.tapCount; i += 2)
-        result = max(result, largerTap(source, row.taps + i));
+        result = max(result, maxTap(source, row.taps + i));
     return result;
 }
 

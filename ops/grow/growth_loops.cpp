@@ -87,11 +87,11 @@ struct Column {
 /// Which tiles are to do in this pass and in the next one, with a tile more on all sides.
 class Tiles {
   public:
-    explicit Tiles(const GrowthJob& job)
+    Tiles(const GrowthJob& job, uint8_t* tiles)
         : mStride((job.width + kTileColumns - 1) / kTileColumns + 2),
           mBytes(mStride * ((job.height + kTileRows - 1) / kTileRows + 2)),
-          mNow(job.tiles),
-          mNext(job.tiles + mBytes) {
+          mNow(tiles),
+          mNext(tiles + mBytes) {
         std::memset(mNow, 1, static_cast<size_t>(mBytes));
         std::memset(mNext, 0, static_cast<size_t>(mBytes));
     }
@@ -155,8 +155,8 @@ bool growPass(const GrowthJob& job, int from, Tiles& tiles) {
 }
 
 /// When nothing changes any more both planes are the same.
-void grow(const GrowthJob& job) {
-    Tiles tiles(job);
+void grow(const GrowthJob& job, uint8_t* memory) {
+    Tiles tiles(job, memory);
     for (int pass = 0; pass < job.passes; ++pass) {
         if (!growPass(job, pass % 2, tiles)) return;
     }

@@ -18,7 +18,6 @@ struct GrowthJob {
     int64_t height;
     uint8_t behind;
     int passes;
-    uint8_t* tiles;  // working memory of growthTileBytes(width, height)
 };
 
 constexpr int64_t kGrowthMargin = 64;
@@ -33,8 +32,9 @@ inline int64_t growthTileBytes(int64_t width, int64_t height) {
 struct GrowthLoops {
     /// Copies `count` bytes, each ^ invertMask.
     void (*copyInverted)(const uint8_t* from, int64_t count, uint8_t invertMask, uint8_t* to);
-    /// Grows plane 0 by turns; the result is in plane `passes` % 2.
-    void (*grow)(const GrowthJob& job);
+    /// Grows plane 0 by turns; the result is in plane `passes` % 2. `tiles` is working memory of
+    /// growthTileBytes(width, height).
+    void (*grow)(const GrowthJob& job, uint8_t* tiles);
 };
 
 /// The loops of a level.

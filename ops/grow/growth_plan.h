@@ -34,7 +34,7 @@ class GrowthPlan {
   private:
     uint8_t* rowOf(int plane, int64_t y);
     void copyIn(const GrowthInput& input);
-    void setFrame(int plane, int other);
+    void setFrame(int other);
     void grow(int passes);
 
     const GrowthLoops& mLoops;
@@ -47,9 +47,5 @@ class GrowthPlan {
     PixelBuffer<uint8_t> mTiles;
     int mCurrent = 0;
 };
-
-/// Grows the coverage of a whole picture in place; see VFOuterGlow::increaseByBoxFilter. When memory
-/// runs out it stays as it was.
-void growByBoxFilter(CpuLevel level, unsigned char* mask, int passes, int width, int height);
 
 }  // namespace VFontEffect::internal

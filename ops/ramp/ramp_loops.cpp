@@ -98,6 +98,7 @@ void mixStops(const RampSegment& segment, const float* positions, int64_t count,
 }
 
 void premultiplied(const uint32_t* colours, int64_t count, uint32_t* pixels) {
+    VOREL_ASSERT(count % kRampSlack == 0);
     for (int64_t i = 0; i < count; i += kPixels) {
         const Pixels straight = loadWords(reinterpret_cast<const uint8_t*>(colours + i));
         storePixels(reinterpret_cast<uint8_t*>(pixels + i),
@@ -106,8 +107,8 @@ void premultiplied(const uint32_t* colours, int64_t count, uint32_t* pixels) {
 }
 
 /// 256 * value / 180: of the upper half of a product with 2^23 / 180, rounded up, the upper 9 bits. The
-/// rounding adds less than 0.005 for values of a byte, and whole quotients lie 1 / 45 apart from the
-/// next fraction below: this is the whole quotient.
+/// rounding adds less than 0.005 for values of a byte, and as 256 / 180 = 64 / 45, fractions are
+/// multiples of 1 / 45: none of them reaches the next whole number.
 VOREL_INLINE U16s fadedLanes(U16s values, U16s alpha) {
     constexpr uint16_t kMultiplier = ((1U << 23) + kFadedValues - 1) / kFadedValues;
     const U16s quotient = multiplyHigh(values << 8, splat<U16s>(kMultiplier)) >> 7;
@@ -116,6 +117,7 @@ VOREL_INLINE U16s fadedLanes(U16s values, U16s alpha) {
 }
 
 void fade(uint8_t* values, int64_t count, uint32_t alpha) {
+    VOREL_ASSERT(alpha <= 255);
     const auto alphas = splat<U16s>(static_cast<uint16_t>(alpha));
     const auto faded = [alphas](U8s v) VOREL_INLINE_LAMBDA {
         return narrow(fadedLanes(widenLow(v), alphas), fadedLanes(widenHigh(v), alphas));
@@ -139,6 +141,7 @@ struct ValuePainter : MaskReader {
 };
 
 void byValue(const BlendJob& job, RampPixels pixels) {
+    VOREL_ASSERT(pixels[0] >> 24 == 0);
     paintRows(ValuePainter{{}, pixels}, job);
 }
 

@@ -31,7 +31,7 @@ struct TablePositions {
 void fillBetweenStops(const RampLoops& loops, const VFGradient* stops, int count, float start,
                       const TablePositions& positions, uint32_t* table);
 
-/// The premultiplied colours of a gradient fill, entry i at position i / 256.
+/// The premultiplied colours along stops, entry i at position i / 256.
 class GradientTable {
   public:
     /// `count` of 1 or more stops.

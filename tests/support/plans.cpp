@@ -84,7 +84,7 @@ std::vector<uint8_t> dilated(const CoverageRows& source, const DiscShape& disc, 
     std::vector<uint8_t> values;
     for (int64_t y = part.top; y < part.bottom; y += plan.bandRows()) {
         const int64_t count = std::min(plan.bandRows(), part.bottom - y);
-        CoverageRows rows = andInverse ? plan.smallerRows(other, y, count) : plan.rows(y, count);
+        CoverageRows rows = andInverse ? plan.minRows(other, y, count) : plan.rows(y, count);
         const int64_t before = part.left - plan.left();
         rows.width = part.width();
         append(rows, before, values);

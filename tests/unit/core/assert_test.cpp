@@ -9,7 +9,6 @@ namespace {
 #if defined(VOREL_ASSERTIONS)
 
 TEST(Assert, BrokenContract_EndsTheProcessAndNamesIt) {
-    GTEST_FLAG_SET(death_test_style, "threadsafe");
     EXPECT_DEATH(vorel_test::askForRowsOutOfOrder(),
                  "dilation_plan.cpp:[0-9]+: contract broken: .*y == ");
 }

@@ -559,7 +559,7 @@ TEST(StrokeWays, MasksOfAllWidths_MatchTheLiteralForm) {
     }
 }
 
-/// Short strokes of ink far apart, some of them across the edges of 1024 pixels.
+/// Short strokes of coverage far apart, some of them across the edges of 1024 pixels.
 literal::Mask sparseMask(Random& random, int width, int height) {
     literal::Mask mask = filledMask(width, height, 0);
     for (int x = random.between(0, 90); x < width; x += random.between(60, 400)) {

@@ -240,7 +240,7 @@ TEST(Blur, OfSmallRadiiAndAllWidths_IsTheDefinedOne) {
 }
 
 TEST(Blur, OfTallAndWideMasks_IsTheDefinedOne) {
-    // More rows than the passes keep at a time, and ink far apart.
+    // More rows than the passes keep at a time, and coverage far apart.
     forSeeds(4000, 24, [&](Random& random) {
         const bool tall = random.chance(50);
         const int length = random.between(200, 700);
@@ -283,7 +283,7 @@ void expectShadowsLikeTheLiteralForm(const Scene& scene, float angle, float dist
 }
 
 TEST(Blur, ShadowsMovedByEveryDistance_AreThoseOfTheLiteralForm) {
-    // Every place that a vector of results can have to the columns that hold ink.
+    // Every place that a vector of results can have to the columns that hold coverage.
     Random random(7000);
     for (const int length : {64, 100, 130, 200}) {
         for (const bool wide : {true, false}) {

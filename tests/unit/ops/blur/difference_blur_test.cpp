@@ -129,6 +129,7 @@ void expectBothTheSame(const BlurCase& blur) {
         const std::vector<uint8_t> expected = blurredByDots(input);
         ASSERT_FALSE(expected.empty());
         ASSERT_EQ(blurredByDifferences(input), expected) << describe(blur);
+        ASSERT_EQ(blurred(input), expected) << describe(blur);
     };
     expectSame(BlurInput::down(blur.weights, blur.source, blur.window, blur.full, blur.inverted));
     expectSame(BlurInput::inverseAcross(blur.weights, blur.source, blur.window));

@@ -79,7 +79,6 @@ TEST(DilationPlan, OfEveryReach_IsTheDefinedOne) {
     for (int reach = 0; reach <= 20; ++reach) {
         forSeeds(static_cast<uint64_t>(reach) * 50, 6, [&](Random& random) {
             const float radius = static_cast<float>(reach) + random.real(-0.5F, 0.49F);
-            if (radius < 0.0F) return;
             const int stride = random.between(1, 60);
             const int width = random.between(1, stride);
             const int height = random.between(1, 40);

@@ -82,4 +82,17 @@ TEST(TilePlan, AxisOfAWholeScale_RepeatsItsPixels) {
     EXPECT_EQ(axis.at(6).farWeight, 0U);
 }
 
+TEST(TilePlan, AxisOfABrokenScale_EndsWithItsTile) {
+    // Seven pixels at two fifths of their size are 2.8 pixels, cut to 2: places 0 and 2.5, then 0 again.
+    const TileAxis axis(7, 0.4F);
+    EXPECT_EQ(axis.period(), 2);
+    EXPECT_EQ(axis.at(1).near, 2);
+    EXPECT_EQ(axis.at(1).far, 3);
+    EXPECT_EQ(axis.at(1).farWeight, 127U);
+    EXPECT_EQ(axis.at(2).near, 0);
+    EXPECT_EQ(axis.at(2).farWeight, 0U);
+    // Two pixels at 0.2 are less than one, which counts as one.
+    EXPECT_EQ(TileAxis(2, 0.2F).period(), 1);
+}
+
 }  // namespace
