@@ -13,6 +13,6 @@ VOREL_LEVEL_TABLE(VOREL_EACH_DOTLESS_LEVEL, dilationLoops, DilationLoops, kDilat
 VOREL_LEVEL_TABLE(VOREL_EACH_DOTLESS_LEVEL, rampLoops, RampLoops, kRampLoops)
 VOREL_LEVEL_TABLE(VOREL_EACH_DOTLESS_LEVEL, tileLoops, TileLoops, kTileLoops)
 VOREL_LEVEL_TABLE(VOREL_EACH_DOTLESS_LEVEL, growthLoops, GrowthLoops, kGrowthLoops)
-VOREL_LEVEL_TABLE(VOREL_EACH_DIFFERENCE_LEVEL, differenceLoops, DifferenceLoops, kDifferenceLoops)
+VOREL_LEVEL_TABLE(VOREL_EACH_DOTLESS_LEVEL, differenceLoops, DifferenceLoops, kDifferenceLoops)
 
 }  // namespace VFontEffect::internal

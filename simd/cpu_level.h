@@ -9,21 +9,17 @@
 /// VOREL_EACH_VECTOR_LEVEL applies a macro to the name of each level but the scalar one, from the
 /// plainest to the best, and to two arguments of the caller's. The plainest runs on every CPU of its
 /// kind, so only the tests have the scalar level beside it, and VOREL_WITHOUT_SCALAR says that it is not
-/// there. Two more lists name for each of them the level that its loops are taken from:
-/// VOREL_EACH_DOTLESS_LEVEL for the loops without dot products, VOREL_EACH_DIFFERENCE_LEVEL for a blur's
-/// differences of the weights, which levels with instructions for dot products do not choose.
+/// there. VOREL_EACH_DOTLESS_LEVEL names for each of them the level that its loops without dot products
+/// are taken from.
 #if defined(__x86_64__)
 #define VOREL_EACH_VECTOR_LEVEL(apply, a, b) apply(sse2, a, b) apply(avx2, a, b) apply(avx512, a, b)
 #define VOREL_EACH_DOTLESS_LEVEL(apply, a, b) VOREL_EACH_VECTOR_LEVEL(apply, a, b)
-#define VOREL_EACH_DIFFERENCE_LEVEL(apply, a, b) apply(sse2, a, b) apply(avx2, a, b) apply(avx2, a, b)
 #elif defined(__aarch64__)
 #define VOREL_EACH_VECTOR_LEVEL(apply, a, b) apply(neon, a, b) apply(dotprod, a, b)
 #define VOREL_EACH_DOTLESS_LEVEL(apply, a, b) apply(neon, a, b) apply(neon, a, b)
-#define VOREL_EACH_DIFFERENCE_LEVEL(apply, a, b) VOREL_EACH_DOTLESS_LEVEL(apply, a, b)
 #else
 #define VOREL_EACH_VECTOR_LEVEL(apply, a, b)
 #define VOREL_EACH_DOTLESS_LEVEL(apply, a, b)
-#define VOREL_EACH_DIFFERENCE_LEVEL(apply, a, b)
 #endif
 
 namespace VFontEffect::internal {

@@ -30,12 +30,14 @@ constexpr int kStepsAtOnce = 1;
 #endif
 
 // Up to this radius dot products take less time than differences of the weights, which cost about the
-// same whatever the radius (shadow/outer/(LINE48|TITLE160|NOISE)/R:). Dot products by differences: with
-// instructions for them 0.86 to 0.92 at a radius of 100 and 0.8 to 1.05 from 128 to 256, on NEON 6.3
-// cycles for 8.4 at 100; at AVX2 0.95 to 1.01 at 20 and 1.2 to 2 at 24; at 16 bytes 0.92 to 1.11 at
-// 16, 1.5 to 1.8 at 32.
-#if defined(VOREL_DOT_PRODUCTS)
+// same whatever the radius (shadow/outer/.*/R:). Dot products by differences: at AVX-512 0.7 to 0.9 at a
+// radius of 64, at 100 still 0.9 on lines but 1.4 on a glyph, narrower than the vectors; on NEON with
+// instructions for them 6.3 cycles for 8.4 at 100; at AVX2 0.95 to 1.01 at 20 and 1.2 to 2 at 24; at 16
+// bytes 0.92 to 1.11 at 16 and 1.5 to 1.8 at 32.
+#if defined(VOREL_DOT_PRODUCTS) && defined(VOREL_PLANAR_PIXELS)
 constexpr int kLargestDotRadius = INT_MAX;
+#elif defined(VOREL_DOT_PRODUCTS)
+constexpr int kLargestDotRadius = 72;
 #elif defined(__AVX2__)
 constexpr int kLargestDotRadius = 20;
 #else

@@ -5,7 +5,7 @@
 namespace VFontEffect::internal {
 namespace {
 
-/// Differences keep up to 128 bytes for each row or column of a strip: no longer ones than this.
+/// Differences keep up to 256 bytes for each row or column of a strip: no longer ones than this.
 constexpr int64_t kLongestDifferenceSide = 1 << 16;
 
 bool suitsDifferences(const DotLoops& dots, const BlurInput& input) {

@@ -268,7 +268,7 @@ TEST_P(CoreMemory, RefusedWhilePainting_PaintsNothing) {
         EXPECT_TRUE(samePaint(expected, painted(mCore, mScene))) << "the next call must be perfect";
         return refused;
     });
-    // The widest blurs are by differences but where instructions make dot products, which take two more.
+    // The widest blurs are by differences but on NEON with dot products, which take two more.
     const bool byDots = GetParam().name.rfind("Widest", 0) == 0 && blursByDotsAlone();
     EXPECT_EQ(requests, GetParam().paintRequests + (byDots ? 2 : 0));
 }
