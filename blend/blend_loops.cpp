@@ -12,9 +12,7 @@ namespace {
 
 /// One colour through the mask.
 template <class Rule>
-struct MaskPainter : MaskReader {
-    static constexpr bool kIsSparse = Rule::kIsSparse;
-    static constexpr Empty kEmpty = Rule::kEmpty;
+struct MaskPainter : MaskReader<Rule::kEmpty, Rule::kIsSparse> {
     Pixels colour;
     Pixels fullOverNothing;  ///< what full coverage paints over transparent pixels
 
@@ -29,7 +27,7 @@ struct MaskPainter : MaskReader {
     }
 };
 
-struct SolidPainter : MaskReader {
+struct SolidPainter : MaskReader<> {
     Pixels colour;
 
     template <int64_t>
@@ -43,14 +41,17 @@ struct SolidPainter : MaskReader {
 
 /// The image, whose pixels `Load` reads.
 template <class Rule, Pixels (*Load)(const uint8_t*)>
-struct ImagePainter : MaskReader {
+struct ImagePainter {
     static constexpr bool kReadsImage = true;
     static constexpr bool kReadsMask = false;
+    static constexpr bool kIsSparse = false;
+    static constexpr Empty kEmpty = Empty::keeps;
 
     template <int64_t kCount>
     VOREL_INLINE bool isEmpty(const Place& place) const {
         return isClear<kCount>(place.image());
     }
+    VOREL_INLINE bool paintWhole(const Place&) const { return false; }
     VOREL_INLINE Pixels paint(const Place& place) const {
         return Rule::apply(loadPixels(place.destination()), Load(place.image()));
     }
@@ -58,10 +59,7 @@ struct ImagePainter : MaskReader {
 
 /// The image of bytes R, G, B, A and the mask.
 template <class Rule>
-struct MaskedImagePainter : MaskReader {
-    static constexpr bool kReadsImage = true;
-    static constexpr Empty kEmpty = Rule::kEmpty;
-
+struct MaskedImagePainter : MaskReader<Rule::kEmpty, false, true> {
     VOREL_INLINE Pixels paint(const Place& place) const {
         return Rule::apply(loadPixels(place.destination()), loadPixels(place.image()),
                            loadAmounts(place.mask()));

@@ -57,12 +57,13 @@ VOREL_INLINE bool isClear(const uint8_t* pixels) {
     return allZero(all);
 }
 
-/// What a painter says unless it says otherwise: the mask tells what is empty, and that stays.
+/// What a painter says whose mask tells what is empty.
+template <Empty kWhatEmptyDoes = Empty::keeps, bool kSparse = false, bool kImage = false>
 struct MaskReader {
-    static constexpr bool kReadsImage = false;
+    static constexpr bool kReadsImage = kImage;
     static constexpr bool kReadsMask = true;
-    static constexpr bool kIsSparse = false;
-    static constexpr Empty kEmpty = Empty::keeps;
+    static constexpr bool kIsSparse = kSparse;
+    static constexpr Empty kEmpty = kWhatEmptyDoes;
 
     template <int64_t kCount>
     VOREL_INLINE bool isEmpty(const Place& place) const {

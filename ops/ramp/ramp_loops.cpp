@@ -57,8 +57,7 @@ struct RadialRow {
 };
 
 template <class RampRow>
-struct RampPainter : MaskReader {
-    static constexpr bool kIsSparse = true;
+struct RampPainter : MaskReader<Empty::keeps, true> {
     RampRow row;
 
     VOREL_INLINE Pixels paint(const Place& place) const {
@@ -131,7 +130,7 @@ void fade(uint8_t* values, int64_t count, uint32_t alpha) {
 }
 
 /// The mask is values, each painted in its colour.
-struct ValuePainter : MaskReader {
+struct ValuePainter : MaskReader<> {
     RampPixels pixels;
 
     VOREL_INLINE Pixels paint(const Place& place) const {
