@@ -30,18 +30,23 @@ if(VOREL_FOR_X86_64 OR VOREL_FOR_AARCH64)
   list(APPEND VOREL_FLAGS_scalar $<$<CONFIG:Release>:-Os>)
 endif()
 
-foreach(level IN LISTS VOREL_LEVELS)
-  add_library(voreleffect_${level} OBJECT ${VOREL_DOT_SOURCES})
-  if(NOT level STREQUAL dotprod)
-    target_sources(voreleffect_${level} PRIVATE ${VOREL_LEVEL_SOURCES})
-  endif()
-  vorel_objects(voreleffect_${level})
-  target_compile_definitions(voreleffect_${level} PRIVATE
+# vorel_level_objects(TARGET LEVEL SOURCE...): objects of sources that are compiled once for each level.
+function(vorel_level_objects target level)
+  add_library(${target} OBJECT ${ARGN})
+  vorel_objects(${target})
+  target_compile_definitions(${target} PRIVATE
     VOREL_LEVEL=${level} VOREL_VECTOR_BYTES=${VOREL_BYTES_${level}})
   # Vectors are passed within a level's sources alone: their calling convention is moot.
-  target_compile_options(voreleffect_${level} PRIVATE ${VOREL_FLAGS_${level}} -Wno-psabi)
+  target_compile_options(${target} PRIVATE ${VOREL_FLAGS_${level}} -Wno-psabi)
   if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
     # Its own headers leave vectors uninitialised on purpose.
-    target_compile_options(voreleffect_${level} PRIVATE -Wno-maybe-uninitialized -Wno-uninitialized)
+    target_compile_options(${target} PRIVATE -Wno-maybe-uninitialized -Wno-uninitialized)
+  endif()
+endfunction()
+
+foreach(level IN LISTS VOREL_LEVELS)
+  vorel_level_objects(voreleffect_${level} ${level} ${VOREL_DOT_SOURCES})
+  if(NOT level STREQUAL dotprod)
+    target_sources(voreleffect_${level} PRIVATE ${VOREL_LEVEL_SOURCES})
   endif()
 endforeach()

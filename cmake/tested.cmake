@@ -3,6 +3,11 @@ add_library(voreleffect_tested)
 target_sources(voreleffect_tested PRIVATE ${PROJECT_SOURCE_DIR}/tests/support/plans.cpp)
 vorel_library(voreleffect_tested ${PROJECT_SOURCE_DIR}/tests/support/levels.cpp LEVELS ${VOREL_LEVELS})
 vorel_library_kind(voreleffect_tested)
+# Each level's operations beside loops over their lanes.
+foreach(level IN LISTS VOREL_LEVELS)
+  vorel_level_objects(voreleffect_lanes_${level} ${level} ${PROJECT_SOURCE_DIR}/tests/support/lanes_check.cpp)
+  target_sources(voreleffect_tested PRIVATE $<TARGET_OBJECTS:voreleffect_lanes_${level}>)
+endforeach()
 
 # The literal forms of what the library does, which tests compare with and benchmarks stand beside: -O3
 # and the plain target where anything is optimised.

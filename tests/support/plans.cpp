@@ -7,6 +7,14 @@
 #include "ops/dilate/dilation_plan.h"
 #include "ops/ramp/ramp_loops.h"
 #include "ops/tile/tile_plan.h"
+#include "simd/level_table.h"
+#include "tests/support/lanes_check.h"
+
+namespace VFontEffect::internal {
+
+VOREL_LEVEL_TABLE(VOREL_EACH_VECTOR_LEVEL, lanesCheck, LanesCheck, kLanesCheck)
+
+}  // namespace VFontEffect::internal
 
 namespace vorel_test {
 namespace {
@@ -115,6 +123,10 @@ std::vector<uint32_t> tiled(const ColourView& pattern, float scale, float opacit
 std::vector<uint8_t> faded(std::vector<uint8_t> values, uint32_t alpha) {
     rampLoops(chosenLevel()).fade(values.data(), static_cast<int64_t>(values.size()), alpha);
     return values;
+}
+
+const char* wrongLanesOperation(uint64_t seed) {
+    return lanesCheck(chosenLevel()).wrongOperation(seed);
 }
 
 void askForRowsOutOfOrder() {

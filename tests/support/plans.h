@@ -38,6 +38,9 @@ VF_API std::vector<uint32_t> tiled(const VFontEffect::internal::ColourView& patt
 /// Values faded to the alphas of a colour of that alpha.
 VF_API std::vector<uint8_t> faded(std::vector<uint8_t> values, uint32_t alpha);
 
+/// The first operation of the level's lanes that does not what a loop over the lanes does, or null.
+VF_API const char* wrongLanesOperation(uint64_t seed);
+
 /// Asks a dilation for its second row first: a contract that is broken.
 VF_API void askForRowsOutOfOrder();
 
