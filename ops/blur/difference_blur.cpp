@@ -117,6 +117,7 @@ DifferenceBlur::DifferenceBlur(const DifferenceLoops& loops, const BlurInput& in
       mSecond(input.second),
       mRadius(input.weights.radius),
       mTotal(input.weights.total),
+      mInverse(inverseAbove(mTotal)),
       mSide(loops.vectorBytes),
       mSource(ReachedSource::of(input)),
       mLayout(Layout::of(input, mSource, mSide)),
@@ -133,7 +134,7 @@ DifferenceBlur::DifferenceBlur(const DifferenceLoops& loops, const BlurInput& in
 
 void DifferenceBlur::blurStrip(const PassEnding& ending, const CoverageRows& source, int64_t x,
                                const Axis& axis, const SquareRows& out) {
-    const DifferencePass pass = {*mTerms, mRadius, mTotal, inverseAbove(mTotal), ending};
+    const DifferencePass pass = {*mTerms, mRadius, mTotal, mInverse, ending};
     mLoops.blurStrip(pass, source, x, mLines.data(), axis.first, axis.count, out);
 }
 

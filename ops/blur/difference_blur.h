@@ -85,6 +85,7 @@ class DifferenceBlur {
     PassEnding mSecond;
     int mRadius;
     uint32_t mTotal;
+    float mInverse;  // just above 1 / mTotal
     int64_t mSide;
     ReachedSource mSource;
     Layout mLayout;
