@@ -12,13 +12,20 @@ using namespace internal;
 
 namespace {
 
-/// A zeroed layer. It has its size but no pixels when its byte count does not fit in 32 bits.
+/// A layer that has its size, but no pixels: nothing is painted into it or from it.
+[[nodiscard]] VFBitmap* makeHollowLayer(int width, int height, unsigned int bytesPerPixel) {
+    return new (std::nothrow) VFBitmap(static_cast<unsigned int>(std::max(width, 0)),
+                                       static_cast<unsigned int>(std::max(height, 0)), nullptr,
+                                       bytesPerPixel);
+}
+
+/// A zeroed layer; a hollow one when its byte count does not fit in 32 bits.
 [[nodiscard]] VFBitmap* makeLayer(int width, int height, unsigned int bytesPerPixel) {
     const auto columns = static_cast<unsigned int>(std::max(width, 0));
     const auto rows = static_cast<unsigned int>(std::max(height, 0));
-    const bool fits = fitsByteCount(columns, rows, bytesPerPixel);
-    return fits ? new (std::nothrow) VFBitmap(columns, rows, bytesPerPixel)
-                : new (std::nothrow) VFBitmap(columns, rows, nullptr, bytesPerPixel);
+    return fitsByteCount(columns, rows, bytesPerPixel)
+               ? new (std::nothrow) VFBitmap(columns, rows, bytesPerPixel)
+               : makeHollowLayer(width, height, bytesPerPixel);
 }
 
 /// Puts the cores in paint order: over the text, the text fill, beneath the text. In layered mode only
@@ -57,6 +64,11 @@ void VFEffect::initEffect(int width, int height) {
     if (layered) {
         delete mOuterLayer;
         mOuterLayer = makeLayer(width, height, kColourBytes);
+        if (!ColourView::of(mOuterLayer)) {
+            // Unmerged, what goes into one layer alone is another picture. The mask tells the caller.
+            delete mSrcBitmap;
+            mSrcBitmap = makeHollowLayer(width, height, kMaskBytes);
+        }
     }
 
     if (!mOrdered) reorder(mEffects, layered);

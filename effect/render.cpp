@@ -2,6 +2,7 @@
 #include <cstdint>
 
 #include "core/numeric.h"
+#include "core/views.h"
 #include "effect/placement.h"
 #include "voreleffect/VFBlender.h"
 #include "voreleffect/VFEffect.h"
@@ -66,6 +67,7 @@ void VFEffect::doEffectPostProcessing() {
     if (mSrcBitmap == nullptr) return;
     clampTo(mTextRect, *mSrcBitmap);
     if (mTextRect.mRight <= mTextRect.mLeft || mTextRect.mBottom <= mTextRect.mTop) return;
+    if (mUseOuterLayer == 1 && !ColourView::of(mOuterLayer)) return;
 
     VFECore::ParamPostProcessing params = {mDstBitmap, mSrcBitmap, &mTextRect, mUseOuterLayer, nullptr};
     for (VFECore* core : mEffects) {

@@ -150,8 +150,9 @@ class VF_API VFEffect {
 
     /// Starts a run on layers of width x height pixels: chooses layered mode (text opacity below 1,
     /// or a centred stroke), makes the glyph mask and the outer layer, and puts the cores in paint
-    /// order. Clears the destination, so setDstBitmap comes after it. Sizes below 0 count as 0;
-    /// layers that cannot be made stay without pixels and nothing is drawn.
+    /// order. Clears the destination, so setDstBitmap comes after it. Sizes below 0 count as 0.
+    /// When one of the layers cannot be made nothing is drawn: getSrcBitmap() is null then or has no
+    /// pixels, whichever layer it was.
     ///
     /// The paint order is worked out by reversing the list as it stands, whenever an add-call or a
     /// new text opacity came since the last time: a second run after such a call paints effects of
