@@ -7,7 +7,8 @@ function(vorel_objects target)
     ${PROJECT_SOURCE_DIR} ${PROJECT_SOURCE_DIR}/include)
   target_compile_features(${target} PRIVATE cxx_std_17)
   # Without contraction no product and sum fuse into one rounding: every CPU paints the same bytes.
-  target_compile_options(${target} PRIVATE -fno-exceptions -ffp-contract=off)
+  # Nor does a build that asks for fast arithmetic get it: core/strict_math.h.
+  target_compile_options(${target} PRIVATE -fno-exceptions -ffp-contract=off -fno-fast-math)
   if(VOREL_FOR_I386)
     # The old floating-point registers of 32-bit x86 would keep more than single precision.
     target_compile_options(${target} PRIVATE -msse2 -mfpmath=sse)
@@ -38,6 +39,9 @@ function(vorel_library target choice)
     target_compile_definitions(${target} PRIVATE VOREL_WITHOUT_SCALAR)
   endif()
   vorel_objects(${target})
+  # Some linkers' drivers answer such a wish with code that, when the library is loaded, lets the whole
+  # process flush subnormal numbers.
+  target_link_options(${target} PRIVATE -O2 -fno-fast-math -fno-unsafe-math-optimizations)
   target_include_directories(${target} PUBLIC $<BUILD_INTERFACE:${PROJECT_SOURCE_DIR}/include>)
   target_compile_features(${target} PUBLIC cxx_std_17)
 endfunction()

@@ -18,5 +18,5 @@ add_library(voreleffect_literal STATIC
 target_include_directories(voreleffect_literal PRIVATE ${PROJECT_SOURCE_DIR})
 target_compile_features(voreleffect_literal PRIVATE cxx_std_17)
 target_compile_options(voreleffect_literal PRIVATE
-  $<$<CONFIG:Release,RelWithDebInfo>:-O3> -ffp-contract=off)
+  $<$<CONFIG:Release,RelWithDebInfo>:-O3> -ffp-contract=off -fno-fast-math)
 vorel_warnings(voreleffect_literal)

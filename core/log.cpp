@@ -1,7 +1,9 @@
+#include <cmath>
 #include <cstdarg>
 #include <cstdio>
 #include <cstring>
 
+#include "core/float_state.h"
 #include "voreleffect/VFLog.h"
 
 #ifdef __ANDROID__
@@ -52,9 +54,28 @@ const char* orEmpty(const char* text) {
     return text != nullptr ? text : "";
 }
 
-double milliseconds(long microseconds) {
-    return static_cast<double>(static_cast<float>(microseconds) / 1000.0F);
-}
+/// Microseconds as milliseconds in single precision with three decimals: as "%.3f" prints them, but with
+/// a point in every locale, and rounded to nearest in every floating-point state.
+class Milliseconds {
+  public:
+    explicit Milliseconds(long microseconds) {
+        internal::inOwnFloatState([&] {
+            const double value = static_cast<double>(static_cast<float>(microseconds) / 1000.0F);
+            // Exact until it is rounded: 24 bits times 10 bits.
+            const double thousandths = std::nearbyint(std::fabs(value) * 1000.0);
+            std::snprintf(mText, sizeof mText, "%s%04.0f", microseconds < 0 ? "-" : "", thousandths);
+        });
+        char* const decimals = mText + std::strlen(mText) - kDecimals;
+        std::memmove(decimals + 1, decimals, kDecimals + 1);
+        *decimals = '.';
+    }
+
+    const char* text() const { return mText; }
+
+  private:
+    static constexpr size_t kDecimals = 3;
+    char mText[32];
+};
 
 }  // namespace
 
@@ -80,7 +101,7 @@ void VFLog::printLog(VFLogLevel level, const char* tag, const char* format, ...)
 
 void VFLog::printTime(const char* tag, const char* label, long microseconds) {
     if ((mCurrentLogLevel & VFLogTime) == 0) return;
-    printLog(VFLogInfo, tag, "[Time] %s %.3fms", orEmpty(label), milliseconds(microseconds));
+    printLog(VFLogInfo, tag, "[Time] %s %sms", orEmpty(label), Milliseconds(microseconds).text());
 }
 
 void VFLog::printTime(const char* tag, const char* label, long microseconds, const char* format, ...) {
@@ -92,7 +113,8 @@ void VFLog::printTime(const char* tag, const char* label, long microseconds, con
         std::vsnprintf(extra, sizeof extra, format, arguments);
         va_end(arguments);
     }
-    printLog(VFLogInfo, tag, "[Time] %s %.3fms %s", orEmpty(label), milliseconds(microseconds), extra);
+    printLog(VFLogInfo, tag, "[Time] %s %sms %s", orEmpty(label), Milliseconds(microseconds).text(),
+             extra);
 }
 
 }  // namespace VFontEffect

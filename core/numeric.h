@@ -5,6 +5,7 @@
 
 #include "core/assert.h"
 #include "core/inline.h"
+#include "core/strict_math.h"
 
 namespace VFontEffect::internal {
 

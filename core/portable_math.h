@@ -1,5 +1,7 @@
 #pragma once
 
+#include "core/strict_math.h"
+
 /// The transcendental functions of the library, the same bits on every CPU and C library.
 ///
 /// Those of a C library may differ in the last bit from machine to machine, and a pixel may depend on

@@ -3,6 +3,7 @@
 #include <cstring>
 #include <limits>
 
+#include "core/float_state.h"
 #include "ops/dilate/disc_shape.h"
 #include "voreleffect/VFECore.h"
 
@@ -24,9 +25,8 @@ void fillRow(const RimWalk& walk, int64_t reach, unsigned char* middle) {
         middle[dx] = middle[-dx] = walk.weight(dx);
 }
 
-}  // namespace
-
-int makeCircleKernel(unsigned char** kernel, float radius) {
+/// As makeCircleKernel.
+int storeDisc(unsigned char** kernel, float radius) {
     const int64_t reach = discReach(radius);
     const int64_t side = 2 * reach + 1;
     if (side < 1 || side > std::numeric_limits<int32_t>::max() / side) return 0;
@@ -44,6 +44,12 @@ int makeCircleKernel(unsigned char** kernel, float radius) {
         }
     }
     return static_cast<int>(side);
+}
+
+}  // namespace
+
+int makeCircleKernel(unsigned char** kernel, float radius) {
+    return inOwnFloatState([&] { return storeDisc(kernel, radius); });
 }
 
 }  // namespace VFontEffect

@@ -1,4 +1,5 @@
 #include "core/effect_types.h"
+#include "core/strict_math.h"
 #include "voreleffect/VFECore.h"
 
 namespace VFontEffect {

@@ -4,6 +4,7 @@
 #include <cstdint>
 #include <cstring>
 
+#include "core/float_state.h"
 #include "core/numeric.h"
 #include "core/pixel_buffer.h"
 #include "core/size_limit.h"
@@ -138,6 +139,7 @@ void paintCorners(const Shape& shape, const PlacedTarget& target, const ValueCol
 }  // namespace
 
 void paintGlow(const VFECore::ParamPostProcessing* params, const GlowRecord& record, GlowSide side) {
+    const OwnFloatState floatState;
     const CoverageBox box = coverageOf(params);
     const int pad = saturateToInt(int64_t{toInt(record.sizePx)} + 1);
     // With no padding at all (a size of -1) the image would be clear, as it is with a size of 0.

@@ -2,6 +2,7 @@
 
 #include <cstdint>
 
+#include "core/strict_math.h"
 #include "simd/cpu_level.h"
 #include "voreleffect/VFECore.h"
 

@@ -2,6 +2,7 @@
 #include <cmath>
 #include <cstdint>
 
+#include "core/float_state.h"
 #include "core/numeric.h"
 #include "cores/glow.h"
 #include "ops/ramp/stop_ramp.h"
@@ -48,18 +49,20 @@ void fadeOut(float fadeStart, unsigned int* table) {
 }  // namespace
 
 int glowReach(const GlowRecord& record) {
-    return toInt(record.sizePx + 0.5F);
+    return inOwnFloatState([&] { return toInt(record.sizePx + 0.5F); });
 }
 
 void fillGlowTable(CpuLevel level, const GlowRecord& record, float fadeStart, int curve,
                    unsigned int* table) {
     if (table == nullptr) return;
-    if (record.sizePx == 0.0F) {
-        std::fill_n(table, kTableSize, 0U);
-        return;
-    }
-    fillRamp(level, record, curve, table);
-    fadeOut(fadeStart, table);
+    inOwnFloatState([&] {
+        if (record.sizePx == 0.0F) {
+            std::fill_n(table, kTableSize, 0U);
+            return;
+        }
+        fillRamp(level, record, curve, table);
+        fadeOut(fadeStart, table);
+    });
 }
 
 }  // namespace VFontEffect::internal

@@ -1,6 +1,7 @@
 #include <cstdint>
 
 #include "core/effect_types.h"
+#include "core/float_state.h"
 #include "core/size_limit.h"
 #include "cores/paint_input.h"
 #include "cores/placed_target.h"
@@ -37,6 +38,7 @@ int VFInnerShadow::getOffset() {
 }
 
 void VFInnerShadow::doPostProcessing(ParamPostProcessing* params) {
+    const OwnFloatState floatState;
     const CoverageBox box = coverageOf(params);
     if (!box || mProperty == nullptr || exceedsSizeLimit(mProperty->mSize)) return;
 

@@ -1,6 +1,7 @@
 #include <cmath>
 
 #include "core/effect_types.h"
+#include "core/float_state.h"
 #include "core/portable_math.h"
 #include "cores/covered_fill.h"
 #include "cores/paint_input.h"
@@ -30,6 +31,7 @@ float lengthAcross(float angle, float w, float h) {
 VOREL_KEEPS_RECORD(VFLinearGradient, kLinearGradient)
 
 void VFLinearGradient::doPostProcessing(ParamPostProcessing* params) {
+    const OwnFloatState floatState;
     const CoverageBox box = coverageOf(params);
     if (!box || !canFill(mProperty)) return;
     const CpuLevel level = chosenLevel();

@@ -2,6 +2,7 @@
 #include <cstdint>
 
 #include "core/effect_types.h"
+#include "core/float_state.h"
 #include "core/numeric.h"
 #include "core/size_limit.h"
 #include "cores/paint_input.h"
@@ -20,7 +21,8 @@ namespace {
 /// How far the shadow reaches on a side towards which it is moved by `shift` pixels.
 int reach(const VFOuterShadowProperty* record, int64_t shift) {
     if (record == nullptr) return 0;
-    return saturateToInt(std::max<int64_t>(0, toInt(record->mSize + 0.5F) + shift));
+    const int blur = inOwnFloatState([&] { return toInt(record->mSize + 0.5F); });
+    return saturateToInt(std::max<int64_t>(0, blur + shift));
 }
 
 }  // namespace
@@ -35,7 +37,8 @@ VFOuterShadow::~VFOuterShadow() {
 
 void VFOuterShadow::setProperty(VFProperty* property) {
     if (!replaceCopy(mProperty, property)) return;
-    const ShadowOffset offset = shadowOffset(mProperty->mAngle, mProperty->mDistance);
+    const ShadowOffset offset =
+        inOwnFloatState([&] { return shadowOffset(mProperty->mAngle, mProperty->mDistance); });
     mOffsetX = offset.x;
     mOffsetY = offset.y;
 }
@@ -58,6 +61,7 @@ int VFOuterShadow::getBottomOffset() {
 }
 
 void VFOuterShadow::doPostProcessing(ParamPostProcessing* params) {
+    const OwnFloatState floatState;
     const CoverageBox box = coverageOf(params);
     if (!box || mProperty == nullptr || exceedsSizeLimit(mProperty->mSize)) return;
 

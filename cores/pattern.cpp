@@ -2,6 +2,7 @@
 #include <cstdint>
 
 #include "core/effect_types.h"
+#include "core/float_state.h"
 #include "cores/covered_fill.h"
 #include "cores/paint_input.h"
 #include "cores/property_copy.h"
@@ -30,6 +31,7 @@ CoverageBox fillBox(const VFECore::ParamPostProcessing* params) {
 VOREL_KEEPS_RECORD(VFPattern, kPattern)
 
 void VFPattern::doPostProcessing(ParamPostProcessing* params) {
+    const OwnFloatState floatState;
     const CoverageBox box = fillBox(params);
     if (!box || mProperty == nullptr || mProperty->mScale < kSmallestScale) return;
     const ColourView pattern = ColourView::of(mProperty->mPattern);

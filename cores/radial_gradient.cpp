@@ -1,4 +1,5 @@
 #include "core/effect_types.h"
+#include "core/float_state.h"
 #include "cores/covered_fill.h"
 #include "cores/paint_input.h"
 #include "cores/property_copy.h"
@@ -13,6 +14,7 @@ using namespace internal;
 VOREL_KEEPS_RECORD(VFRadialGradient, kRadialGradient)
 
 void VFRadialGradient::doPostProcessing(ParamPostProcessing* params) {
+    const OwnFloatState floatState;
     const CoverageBox box = coverageOf(params);
     if (!box || !canFill(mProperty)) return;
     const CpuLevel level = chosenLevel();

@@ -3,6 +3,7 @@
 #include <optional>
 
 #include "core/effect_types.h"
+#include "core/float_state.h"
 #include "core/numeric.h"
 #include "core/size_limit.h"
 #include "cores/paint_input.h"
@@ -46,10 +47,11 @@ class Outline {
 VOREL_KEEPS_RECORD(VFStroke, kStroke)
 
 int VFStroke::getOffset() {
-    return mProperty != nullptr ? StrokeShape(*mProperty).reach : 0;
+    return inOwnFloatState([&] { return mProperty != nullptr ? StrokeShape(*mProperty).reach : 0; });
 }
 
 void VFStroke::doPostProcessing(ParamPostProcessing* params) {
+    const OwnFloatState floatState;
     const CoverageBox box = coverageOf(params);
     if (!box || mProperty == nullptr || exceedsSizeLimit(mProperty->mSize)) return;
     const StrokeShape shape(*mProperty);

@@ -1,6 +1,7 @@
 #include <algorithm>
 
 #include "core/effect_types.h"
+#include "core/float_state.h"
 #include "core/numeric.h"
 #include "effect/normalise.h"
 #include "property/limits.h"
@@ -54,84 +55,106 @@ Relief reliefRecord(int style, float size, float depth, int technique, int direc
 
 unsigned int VFEffect::addOuterShadowText(float angle, float distance, float size, unsigned int color,
                                           float opacity) {
-    return add(*this, kOuterShadow,
-               shadowRecord<VFOuterShadowProperty>(angle, distance, size, color, opacity));
+    return inOwnFloatState([&] {
+        return add(*this, kOuterShadow,
+                   shadowRecord<VFOuterShadowProperty>(angle, distance, size, color, opacity));
+    });
 }
 
 unsigned int VFEffect::addInnerShadowText(float angle, float distance, float size, unsigned int color,
                                           float opacity) {
-    return add(*this, kInnerShadow,
-               shadowRecord<VFInnerShadowProperty>(angle, distance, size, color, opacity));
+    return inOwnFloatState([&] {
+        return add(*this, kInnerShadow,
+                   shadowRecord<VFInnerShadowProperty>(angle, distance, size, color, opacity));
+    });
 }
 
 unsigned int VFEffect::addOuterGlowText(float size, unsigned int color, float opacity, int count,
                                         VFGradient* gradient) {
-    return addGlow<VFOuterGlowProperty>(*this, kOuterGlow, size, color, opacity, count, gradient);
+    return inOwnFloatState([&] {
+        return addGlow<VFOuterGlowProperty>(*this, kOuterGlow, size, color, opacity, count, gradient);
+    });
 }
 
 unsigned int VFEffect::addInnerGlowText(float size, unsigned int color, float opacity, int count,
                                         VFGradient* gradient) {
-    return addGlow<VFInnerGlowProperty>(*this, kInnerGlow, size, color, opacity, count, gradient);
+    return inOwnFloatState([&] {
+        return addGlow<VFInnerGlowProperty>(*this, kInnerGlow, size, color, opacity, count, gradient);
+    });
 }
 
 unsigned int VFEffect::addBevelText(int style, float size, float depth, int technique, int direction,
                                     int soften, float opacity, float angle, float altitude,
                                     unsigned int highlightColor, float highlightOpacity,
                                     unsigned int shadowColor, float shadowOpacity) {
-    return add(*this, kBevel,
-               reliefRecord<VFBevelProperty>(style, size, depth, technique, direction, soften, opacity,
-                                             angle, altitude, highlightColor, highlightOpacity,
-                                             shadowColor, shadowOpacity));
+    return inOwnFloatState([&] {
+        return add(*this, kBevel,
+                   reliefRecord<VFBevelProperty>(style, size, depth, technique, direction, soften,
+                                                 opacity, angle, altitude, highlightColor,
+                                                 highlightOpacity, shadowColor, shadowOpacity));
+    });
 }
 
 unsigned int VFEffect::addEmbossText(int style, float size, float depth, int technique, int direction,
                                      int soften, float opacity, float angle, float altitude,
                                      unsigned int highlightColor, float highlightOpacity,
                                      unsigned int shadowColor, float shadowOpacity) {
-    return add(*this, kEmboss,
-               reliefRecord<VFEmbossProperty>(style, size, depth, technique, direction, soften, opacity,
-                                              angle, altitude, highlightColor, highlightOpacity,
-                                              shadowColor, shadowOpacity));
+    return inOwnFloatState([&] {
+        return add(*this, kEmboss,
+                   reliefRecord<VFEmbossProperty>(style, size, depth, technique, direction, soften,
+                                                  opacity, angle, altitude, highlightColor,
+                                                  highlightOpacity, shadowColor, shadowOpacity));
+    });
 }
 
 unsigned int VFEffect::addLinearGradientText(float angle, float scale, float opacity, int count,
                                              VFGradient* gradient) {
-    const float o = clampedOpacity(opacity);
-    NormalisedStops stops(gradient, count, o);
-    return add(*this, kLinearGradient,
-               VFLinearGradientProperty(static_cast<float>(wholeDegrees(angle, kTurn)),
-                                        clampOrLow(scale, 0.0F, kLargestGradientScale), o, stops.count(),
-                                        stops.data()));
+    return inOwnFloatState([&] {
+        const float o = clampedOpacity(opacity);
+        NormalisedStops stops(gradient, count, o);
+        return add(*this, kLinearGradient,
+                   VFLinearGradientProperty(static_cast<float>(wholeDegrees(angle, kTurn)),
+                                            clampOrLow(scale, 0.0F, kLargestGradientScale), o,
+                                            stops.count(), stops.data()));
+    });
 }
 
 unsigned int VFEffect::addRadialGradientText(float scale, float opacity, int count,
                                              VFGradient* gradient) {
-    const float o = clampedOpacity(opacity);
-    NormalisedStops stops(gradient, count, o);
-    // Deliberate: the record has an angle, the call offers none.
-    return add(*this, kRadialGradient,
-               VFRadialGradientProperty(0.0F, clampOrLow(scale, 0.0F, kLargestGradientScale), o,
-                                        stops.count(), stops.data()));
+    return inOwnFloatState([&] {
+        const float o = clampedOpacity(opacity);
+        NormalisedStops stops(gradient, count, o);
+        // Deliberate: the record has an angle, the call offers none.
+        return add(*this, kRadialGradient,
+                   VFRadialGradientProperty(0.0F, clampOrLow(scale, 0.0F, kLargestGradientScale), o,
+                                            stops.count(), stops.data()));
+    });
 }
 
 unsigned int VFEffect::addStrokeText(float size, unsigned int color, float opacity, int strokeStyle,
                                      int position) {
-    const float o = clampedOpacity(opacity);
-    return add(
-        *this, kStroke,
-        VFStrokeProperty(wholePixels(size), premultipliedColour(color, o), o, strokeStyle, position));
+    return inOwnFloatState([&] {
+        const float o = clampedOpacity(opacity);
+        return add(*this, kStroke,
+                   VFStrokeProperty(wholePixels(size), premultipliedColour(color, o), o, strokeStyle,
+                                    position));
+    });
 }
 
 unsigned int VFEffect::addPatternText(VFBitmap* pattern, float scale, float opacity) {
-    return add(*this, kPattern,
-               VFPatternProperty(pattern, clampOrLow(scale, 0.0F, kLargestPatternScale),
-                                 clampedOpacity(opacity)));
+    return inOwnFloatState([&] {
+        return add(*this, kPattern,
+                   VFPatternProperty(pattern, clampOrLow(scale, 0.0F, kLargestPatternScale),
+                                     clampedOpacity(opacity)));
+    });
 }
 
 unsigned int VFEffect::addText(unsigned int color, float opacity) {
-    mTextAlpha = static_cast<unsigned char>(color >> 24);
-    const float o = clampedOpacity(opacity);
-    return add(*this, kText, VFTextProperty(premultipliedColour(color, o), o));
+    return inOwnFloatState([&] {
+        mTextAlpha = static_cast<unsigned char>(color >> 24);
+        const float o = clampedOpacity(opacity);
+        return add(*this, kText, VFTextProperty(premultipliedColour(color, o), o));
+    });
 }
 
 }  // namespace VFontEffect

@@ -14,18 +14,18 @@ namespace {
 
 /// A layer that has its size, but no pixels: nothing is painted into it or from it.
 [[nodiscard]] VFBitmap* makeHollowLayer(int width, int height, unsigned int bytesPerPixel) {
-    return new (std::nothrow) VFBitmap(static_cast<unsigned int>(std::max(width, 0)),
-                                       static_cast<unsigned int>(std::max(height, 0)), nullptr,
-                                       bytesPerPixel);
+    return new (std::nothrow)
+        VFBitmap(static_cast<unsigned int>(std::max(width, 0)),
+                 static_cast<unsigned int>(std::max(height, 0)), nullptr, bytesPerPixel);
 }
 
 /// A zeroed layer; a hollow one when its byte count does not fit in 32 bits.
 [[nodiscard]] VFBitmap* makeLayer(int width, int height, unsigned int bytesPerPixel) {
     const auto columns = static_cast<unsigned int>(std::max(width, 0));
     const auto rows = static_cast<unsigned int>(std::max(height, 0));
-    return fitsByteCount(columns, rows, bytesPerPixel)
-               ? new (std::nothrow) VFBitmap(columns, rows, bytesPerPixel)
-               : makeHollowLayer(width, height, bytesPerPixel);
+    return fitsByteCount(columns, rows, bytesPerPixel) ? new (std::nothrow)
+                                                             VFBitmap(columns, rows, bytesPerPixel)
+                                                       : makeHollowLayer(width, height, bytesPerPixel);
 }
 
 /// Puts the cores in paint order: over the text, the text fill, beneath the text. In layered mode only
@@ -54,7 +54,7 @@ int largestOffset(const std::vector<VFECore*>& cores, Query query) {
 }  // namespace
 
 void VFEffect::initEffect(int width, int height) {
-    const bool layered = mTextOpacity < 1.0F ||
+    const bool layered = isTranslucent(mTextOpacity) ||
                          std::any_of(mEffects.begin(), mEffects.end(),
                                      [](VFECore* core) { return placementOf(*core).needsOuterLayer; });
     mUseOuterLayer = layered ? 1 : 0;

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "core/effect_types.h"
+#include "core/float_state.h"
 #include "cores/stroke_shape.h"
 #include "voreleffect/VFECore.h"
 
@@ -35,6 +36,11 @@ inline const Placement& placementOf(StrokeSide side) {
 
 inline bool isInnerBevel(const VFBevelProperty* bevel) {
     return bevel != nullptr && bevel->mStyle == 1;
+}
+
+/// Whether a text opacity, of the text alone, makes a run layered.
+inline bool isTranslucent(float textOpacity) {
+    return inOwnFloatState([&] { return textOpacity < 1.0F; });
 }
 
 /// By the type of the core and, if it is a bevel or a stroke and has one, its record.

@@ -3,7 +3,9 @@
 #include <new>
 
 #include "core/effect_types.h"
+#include "core/float_state.h"
 #include "core/numeric.h"
+#include "effect/placement.h"
 #include "voreleffect/VFEffect.h"
 
 namespace VFontEffect {
@@ -131,13 +133,16 @@ void VFEffect::releaseBitmap() {
 void VFEffect::cleanLayers() {}
 
 bool VFEffect::hasEffects() {
-    return !mEffects.empty() || mTextOpacity < 1.0F;
+    return !mEffects.empty() || isTranslucent(mTextOpacity);
 }
 
 void VFEffect::setTextOpacity(float opacity) {
-    // Deliberate: compared as given, so an opacity above 1 re-arms the ordering every time it is set.
-    if (opacity != mTextOpacity) mOrdered = false;
-    mTextOpacity = clampOrLow(opacity, 0.0F, 1.0F);
+    inOwnFloatState([&] {
+        // Deliberate: compared as given, so an opacity above 1 re-arms the ordering every time it is
+        // set.
+        if (opacity != mTextOpacity) mOrdered = false;
+        mTextOpacity = clampOrLow(opacity, 0.0F, 1.0F);
+    });
 }
 
 float VFEffect::getTextOpacity() {

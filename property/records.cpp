@@ -1,5 +1,6 @@
 #include <algorithm>
 
+#include "core/float_state.h"
 #include "core/numeric.h"
 #include "property/limits.h"
 #include "voreleffect/VFProperty.h"
@@ -7,6 +8,19 @@
 namespace VFontEffect {
 
 using namespace internal;
+
+namespace {
+
+float reducedAngle(float degrees, int turn) {
+    return inOwnFloatState([&] { return static_cast<float>(reducedDegrees(degrees, turn)); });
+}
+
+/// Inside [0, largest]; a NaN stays.
+float clamped(float value, float largest) {
+    return inOwnFloatState([&] { return clampKeepingNan(value, 0.0F, largest); });
+}
+
+}  // namespace
 
 VFProperty::VFProperty(unsigned int color, float opacity) : mColor(color), mOpacity(opacity) {}
 VFProperty::~VFProperty() = default;
@@ -20,10 +34,7 @@ VFOuterShadowProperty::VFOuterShadowProperty(float angle, float distance, float 
 
 VFInnerShadowProperty::VFInnerShadowProperty(float angle, float distance, float size, unsigned int color,
                                              float opacity)
-    : VFProperty(color, opacity),
-      mAngle(static_cast<float>(reducedDegrees(angle, kTurn))),
-      mDistance(distance),
-      mSize(size) {}
+    : VFProperty(color, opacity), mAngle(reducedAngle(angle, kTurn)), mDistance(distance), mSize(size) {}
 
 VFStrokeProperty::VFStrokeProperty(float size, unsigned int color, float opacity, int strokeStyle,
                                    int position)
@@ -40,16 +51,16 @@ VFInnerGlowProperty::VFInnerGlowProperty(float size, unsigned int color, float o
 VFLinearGradientProperty::VFLinearGradientProperty(float angle, float scale, float opacity, int count,
                                                    VFGradient* gradient)
     : VFProperty(0, opacity),
-      mAngle(static_cast<float>(reducedDegrees(angle, kTurn))),
-      mScale(clampKeepingNan(scale, 0.0F, kLargestGradientScale)),
+      mAngle(reducedAngle(angle, kTurn)),
+      mScale(clamped(scale, kLargestGradientScale)),
       mGradientCount(count),
       mGradient(gradient) {}
 
 VFRadialGradientProperty::VFRadialGradientProperty(float angle, float scale, float opacity, int count,
                                                    VFGradient* gradient)
     : VFProperty(0, opacity),
-      mAngle(static_cast<float>(reducedDegrees(angle, kTurn))),
-      mScale(clampKeepingNan(scale, 0.0F, kLargestGradientScale)),
+      mAngle(reducedAngle(angle, kTurn)),
+      mScale(clamped(scale, kLargestGradientScale)),
       mGradientCount(count),
       mGradient(gradient) {}
 
@@ -60,12 +71,12 @@ VFBevelProperty::VFBevelProperty(int style, float size, float depth, int techniq
     : VFProperty(0, opacity),
       mStyle(style),
       mSize(size),
-      mDepth(clampKeepingNan(depth, 0.0F, kLargestDepth)),
+      mDepth(clamped(depth, kLargestDepth)),
       mTechnique(technique),
       mDirection(direction),
       mSoften(std::clamp(soften, 0, kLargestSoften)),
-      mAngle(static_cast<float>(reducedDegrees(angle, kTurn))),
-      mAltitude(static_cast<float>(reducedDegrees(altitude, kQuarterTurn))),
+      mAngle(reducedAngle(angle, kTurn)),
+      mAltitude(reducedAngle(altitude, kQuarterTurn)),
       mHighlightColor(highlightColor),
       mHighlightOpacity(highlightOpacity),
       mShadowColor(shadowColor),
@@ -78,20 +89,18 @@ VFEmbossProperty::VFEmbossProperty(int style, float size, float depth, int techn
     : VFProperty(0, opacity),
       mStyle(style),
       mSize(size),
-      mDepth(clampKeepingNan(depth, 0.0F, kLargestDepth)),
+      mDepth(clamped(depth, kLargestDepth)),
       mTechnique(technique),
       mDirection(direction),
       mSoften(std::clamp(soften, 0, kLargestSoften)),
-      mAngle(static_cast<float>(reducedDegrees(angle, kTurn))),
-      mAltitude(static_cast<float>(reducedDegrees(altitude, kQuarterTurn))),
+      mAngle(reducedAngle(angle, kTurn)),
+      mAltitude(reducedAngle(altitude, kQuarterTurn)),
       mHighlightColor(highlightColor),
       mHighlightOpacity(highlightOpacity),
       mShadowColor(shadowColor),
       mShadowOpacity(shadowOpacity) {}
 
 VFPatternProperty::VFPatternProperty(VFBitmap* pattern, float scale, float opacity)
-    : VFProperty(0, opacity),
-      mPattern(pattern),
-      mScale(clampKeepingNan(scale, 0.0F, kLargestPatternScale)) {}
+    : VFProperty(0, opacity), mPattern(pattern), mScale(clamped(scale, kLargestPatternScale)) {}
 
 }  // namespace VFontEffect

@@ -1,3 +1,4 @@
+#include "core/float_state.h"
 #include "property/sequential_writer.h"
 #include "voreleffect/VFProperty.h"
 
@@ -35,6 +36,7 @@ int withStops(int fixedChars, int count) {
 template <class Write>
 [[nodiscard]] bool writeFragment(char** cursor, char letter, Write write) {
     if (cursor == nullptr || *cursor == nullptr) return false;
+    const internal::OwnFloatState floatState;
     SequentialWriter writer(*cursor, letter);
     write(writer);
     *cursor = writer.close();

@@ -45,6 +45,9 @@ for flags in -O0 -O3; do
     check clang++-14 $flags
 done
 check clang++-14 "-O2 -stdlib=libc++"
+# The library has the last word.
+check g++ -Ofast
+check clang++-14 -Ofast
 if grep -qw avx2 /proc/cpuinfo 2> /dev/null; then
     check g++ "-O3 -march=x86-64-v3"
     check clang++-14 "-O3 -march=x86-64-v3"

@@ -14,7 +14,7 @@ need_packages cmake ninja-build g++ clang-14 libclang-rt-14-dev pkg-config \
     libraqm-dev libfreetype-dev libfribidi-dev libharfbuzz-dev libfontconfig-dev libpng-dev \
     nlohmann-json3-dev libcli11-dev fontconfig fonts-dejavu-core \
     python3 python3-jsonschema zsh fish mandoc bsdextrautils \
-    g++-aarch64-linux-gnu qemu-user-static
+    locales g++-aarch64-linux-gnu qemu-user-static
 
 presets=("$@")
 [[ $# -gt 0 ]] || presets=(release sanitize arm64)

@@ -2,6 +2,7 @@
 
 #include <cstdint>
 
+#include "core/strict_math.h"
 #include "ops/ramp/ramp_loops.h"
 #include "voreleffect/VFBitmap.h"
 

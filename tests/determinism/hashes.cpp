@@ -1,3 +1,4 @@
+#include <array>
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
@@ -10,6 +11,7 @@
 #include <vector>
 
 #include "tests/support/both_sets.h"
+#include "tests/support/float_states.h"
 #include "tests/support/levels.h"
 #include "tests/support/mask_gallery.h"
 #include "tests/support/random.h"
@@ -19,8 +21,9 @@
 ///
 ///     voreleffect_hashes                  prints the table
 ///     voreleffect_hashes --literal        the same table, painted by the literal engine
-///     voreleffect_hashes --compare FILE   at every level of the instruction set that this CPU has;
-///                                         fails, naming them, when lines differ from the file's
+///     voreleffect_hashes --compare FILE   at every level of the instruction set that this CPU has, in
+///                                         every floating-point state that a caller may be in; fails,
+///                                         naming them, when lines differ from the file's
 ///     voreleffect_hashes --compare-literal FILE   likewise, painted by the literal engine
 namespace {
 
@@ -61,11 +64,24 @@ float real(int value) {
     return static_cast<float>(value);
 }
 
+/// 0 / Divisor, 1 / Divisor and so on: worked out by the compiler, as what is painted may be painted in
+/// any rounding mode.
+template <int Divisor>
+float part(int value) {
+    constexpr auto kParts = [] {
+        std::array<float, 101> parts = {};
+        for (size_t i = 0; i < parts.size(); ++i)
+            parts[i] = static_cast<float>(i) / static_cast<float>(Divisor);
+        return parts;
+    }();
+    return kParts.at(static_cast<size_t>(value));
+}
+
 template <class Set>
 std::vector<Sweep<Set>> sweeps() {
     using K = Kit<Set>;
     return {
-        {"text opacity", 0, 20, 1, [](Set& s, K&, int i) { s.setTextOpacity(real(i) / 20.0F); }},
+        {"text opacity", 0, 20, 1, [](Set& s, K&, int i) { s.setTextOpacity(part<20>(i)); }},
         {"stroke outside size", 0, 40, 1,
          [](Set& s, K&, int i) { s.addStrokeText(real(i), 0xE03020, 0.9F, 0, 1); }},
         {"stroke inside size", 0, 40, 1,
@@ -89,14 +105,14 @@ std::vector<Sweep<Set>> sweeps() {
         {"linear gradient angle", 0, 359, 1,
          [](Set& s, K& k, int i) { s.addLinearGradientText(real(i), 1, 0.9F, 3, k.stops); }},
         {"linear gradient scale", 0, 40, 1,
-         [](Set& s, K& k, int i) { s.addLinearGradientText(37, real(i) / 20.0F, 1, 3, k.stops); }},
+         [](Set& s, K& k, int i) { s.addLinearGradientText(37, part<20>(i), 1, 3, k.stops); }},
         {"radial gradient scale", 0, 40, 1,
-         [](Set& s, K& k, int i) { s.addRadialGradientText(real(i) / 20.0F, 0.9F, 3, k.stops); }},
+         [](Set& s, K& k, int i) { s.addRadialGradientText(part<20>(i), 0.9F, 3, k.stops); }},
         {"pattern scale", 0, 100, 1,
-         [](Set& s, K& k, int i) { s.addPatternText(&k.tile, real(i) / 10.0F, 0.9F); }},
+         [](Set& s, K& k, int i) { s.addPatternText(&k.tile, part<10>(i), 0.9F); }},
         {"all layered", 0, 10, 1,
          [](Set& s, K& k, int i) {
-             s.setTextOpacity(real(i) / 20.0F);
+             s.setTextOpacity(part<20>(i));
              s.addOuterShadowText(real(40 * i), 6, 3, 0, 0.6F);
              s.addOuterGlowText(real(i), 0x00C0FF, 0.8F, 0, nullptr);
              s.addStrokeText(real(i), 0xFFFFFF, 1, 0, i % 3);
@@ -129,9 +145,11 @@ std::string hashOf(const Sweep<Set>& sweep, const Mask& mask) {
 using Table = std::map<std::string, std::string>;
 
 template <class Set>
-Table tableOf() {
+Table tableOf(const FloatState& state = floatStates().front()) {
     Table table;
-    for (const NamedMask& mask : masks()) {
+    const std::vector<NamedMask> all = masks();
+    const InFloatState callers(state);
+    for (const NamedMask& mask : all) {
         for (const Sweep<Set>& sweep : sweeps<Set>()) {
             table[std::string(sweep.name) + ", " + mask.name] = hashOf(sweep, mask.mask);
         }
@@ -174,7 +192,10 @@ bool compareLevels(const std::string& committed) {
     bool same = true;
     for (const CpuLevel level : levelsHere()) {
         useLevel(level);
-        same = compare(tableOf<VFEffect>(), nameOf(level), committed) && same;
+        for (const FloatState& state : floatStates()) {
+            same =
+                compare(tableOf<VFEffect>(state), nameOf(level) + ", " + state.name, committed) && same;
+        }
     }
     return same;
 }

@@ -2,8 +2,11 @@
 #include <voreleffect/VFLog.h>
 
 #include <algorithm>
+#include <climits>
+#include <clocale>
 #include <cstdarg>
 #include <cstdio>
+#include <cstdlib>
 #include <string>
 #include <vector>
 
@@ -173,6 +176,33 @@ TEST_F(Log, Time_IsDividedInSinglePrecision) {
     // 100000001 is 100000000 in single precision; in double precision this would read 100000.001.
     VFLog::printTime("x", "t", 100000001);
     expectLine(4, "[x] [Time] t 100000.000ms \n");
+}
+
+TEST_F(Log, Time_RoundsToTheEvenThousandth) {
+    // 131072.0625 and 131072.1875 in single precision, both half-way between two thousandths.
+    VFLog::printTime("x", "t", 131072062);
+    expectLine(4, "[x] [Time] t 131072.062ms \n");
+    VFLog::printTime("x", "t", 131072187);
+    expectLine(4, "[x] [Time] t 131072.188ms \n");
+}
+
+TEST_F(Log, Time_AtTheEndsOfItsRange) {
+    // The single-precision number nearest to 2^63 / 1000; they are 2^30 apart there.
+    VFLog::printTime("x", "t", LONG_MAX);
+    expectLine(4, "[x] [Time] t 9223372474941440.000ms \n");
+    VFLog::printTime("x", "t", LONG_MIN);
+    expectLine(4, "[x] [Time] t -9223372474941440.000ms \n");
+}
+
+TEST_F(Log, Time_HasAPointInEveryLocale) {
+    if (std::getenv("LOCPATH") == nullptr) GTEST_SKIP() << "LOCPATH names no folder of locales";
+    ASSERT_NE(std::setlocale(LC_NUMERIC, "de_DE.UTF-8"), nullptr);
+    VFLog::printTime("x", "blur", 1500);
+    expectLine(4, "[x] [Time] blur 1.500ms \n");
+    VFLog::printTime("x", "blur", 2250, "%.1f", 0.5);
+    // What the caller formats is the caller's.
+    expectLine(4, "[x] [Time] blur 2.250ms 0,5 \n");
+    std::setlocale(LC_NUMERIC, "C");
 }
 
 TEST_F(Log, TimeWithText_AppendsTheFormattedText) {
