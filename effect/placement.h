@@ -1,7 +1,9 @@
 #pragma once
 
+#include <cstring>
+
 #include "core/effect_types.h"
-#include "core/float_state.h"
+#include "core/strict_math.h"
 #include "cores/stroke_shape.h"
 #include "voreleffect/VFECore.h"
 
@@ -38,9 +40,11 @@ inline bool isInnerBevel(const VFBevelProperty* bevel) {
     return bevel != nullptr && bevel->mStyle == 1;
 }
 
-/// Whether a text opacity, of the text alone, makes a run layered.
+/// Whether a text opacity, 0 to 1, makes a run layered. What is not 1 is less: its bits tell, in every
+/// floating-point state.
 inline bool isTranslucent(float textOpacity) {
-    return inOwnFloatState([&] { return textOpacity < 1.0F; });
+    constexpr float kOpaque = 1.0F;
+    return std::memcmp(&textOpacity, &kOpaque, sizeof kOpaque) != 0;
 }
 
 /// By the type of the core and, if it is a bevel or a stroke and has one, its record.

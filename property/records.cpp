@@ -12,12 +12,22 @@ using namespace internal;
 namespace {
 
 float reducedAngle(float degrees, int turn) {
-    return inOwnFloatState([&] { return static_cast<float>(reducedDegrees(degrees, turn)); });
+    return static_cast<float>(reducedDegrees(degrees, turn));
 }
 
-/// Inside [0, largest]; a NaN stays.
-float clamped(float value, float largest) {
-    return inOwnFloatState([&] { return clampKeepingNan(value, 0.0F, largest); });
+/// Reduces the angle of a gradient and limits its scale; a NaN stays.
+void normaliseGradient(float& angle, float& scale) {
+    const OwnFloatState floatState;
+    angle = reducedAngle(angle, kTurn);
+    scale = clampKeepingNan(scale, 0.0F, kLargestGradientScale);
+}
+
+/// Likewise with the angles and the depth of a bevel or an emboss.
+void normaliseRelief(float& angle, float& altitude, float& depth) {
+    const OwnFloatState floatState;
+    angle = reducedAngle(angle, kTurn);
+    altitude = reducedAngle(altitude, kQuarterTurn);
+    depth = clampKeepingNan(depth, 0.0F, kLargestDepth);
 }
 
 }  // namespace
@@ -34,7 +44,10 @@ VFOuterShadowProperty::VFOuterShadowProperty(float angle, float distance, float 
 
 VFInnerShadowProperty::VFInnerShadowProperty(float angle, float distance, float size, unsigned int color,
                                              float opacity)
-    : VFProperty(color, opacity), mAngle(reducedAngle(angle, kTurn)), mDistance(distance), mSize(size) {}
+    : VFProperty(color, opacity),
+      mAngle(inOwnFloatState([&] { return reducedAngle(angle, kTurn); })),
+      mDistance(distance),
+      mSize(size) {}
 
 VFStrokeProperty::VFStrokeProperty(float size, unsigned int color, float opacity, int strokeStyle,
                                    int position)
@@ -50,19 +63,15 @@ VFInnerGlowProperty::VFInnerGlowProperty(float size, unsigned int color, float o
 
 VFLinearGradientProperty::VFLinearGradientProperty(float angle, float scale, float opacity, int count,
                                                    VFGradient* gradient)
-    : VFProperty(0, opacity),
-      mAngle(reducedAngle(angle, kTurn)),
-      mScale(clamped(scale, kLargestGradientScale)),
-      mGradientCount(count),
-      mGradient(gradient) {}
+    : VFProperty(0, opacity), mAngle(angle), mScale(scale), mGradientCount(count), mGradient(gradient) {
+    normaliseGradient(mAngle, mScale);
+}
 
 VFRadialGradientProperty::VFRadialGradientProperty(float angle, float scale, float opacity, int count,
                                                    VFGradient* gradient)
-    : VFProperty(0, opacity),
-      mAngle(reducedAngle(angle, kTurn)),
-      mScale(clamped(scale, kLargestGradientScale)),
-      mGradientCount(count),
-      mGradient(gradient) {}
+    : VFProperty(0, opacity), mAngle(angle), mScale(scale), mGradientCount(count), mGradient(gradient) {
+    normaliseGradient(mAngle, mScale);
+}
 
 VFBevelProperty::VFBevelProperty(int style, float size, float depth, int technique, int direction,
                                  int soften, float opacity, float angle, float altitude,
@@ -71,16 +80,18 @@ VFBevelProperty::VFBevelProperty(int style, float size, float depth, int techniq
     : VFProperty(0, opacity),
       mStyle(style),
       mSize(size),
-      mDepth(clamped(depth, kLargestDepth)),
+      mDepth(depth),
       mTechnique(technique),
       mDirection(direction),
       mSoften(std::clamp(soften, 0, kLargestSoften)),
-      mAngle(reducedAngle(angle, kTurn)),
-      mAltitude(reducedAngle(altitude, kQuarterTurn)),
+      mAngle(angle),
+      mAltitude(altitude),
       mHighlightColor(highlightColor),
       mHighlightOpacity(highlightOpacity),
       mShadowColor(shadowColor),
-      mShadowOpacity(shadowOpacity) {}
+      mShadowOpacity(shadowOpacity) {
+    normaliseRelief(mAngle, mAltitude, mDepth);
+}
 
 VFEmbossProperty::VFEmbossProperty(int style, float size, float depth, int technique, int direction,
                                    int soften, float opacity, float angle, float altitude,
@@ -89,18 +100,22 @@ VFEmbossProperty::VFEmbossProperty(int style, float size, float depth, int techn
     : VFProperty(0, opacity),
       mStyle(style),
       mSize(size),
-      mDepth(clamped(depth, kLargestDepth)),
+      mDepth(depth),
       mTechnique(technique),
       mDirection(direction),
       mSoften(std::clamp(soften, 0, kLargestSoften)),
-      mAngle(reducedAngle(angle, kTurn)),
-      mAltitude(reducedAngle(altitude, kQuarterTurn)),
+      mAngle(angle),
+      mAltitude(altitude),
       mHighlightColor(highlightColor),
       mHighlightOpacity(highlightOpacity),
       mShadowColor(shadowColor),
-      mShadowOpacity(shadowOpacity) {}
+      mShadowOpacity(shadowOpacity) {
+    normaliseRelief(mAngle, mAltitude, mDepth);
+}
 
 VFPatternProperty::VFPatternProperty(VFBitmap* pattern, float scale, float opacity)
-    : VFProperty(0, opacity), mPattern(pattern), mScale(clamped(scale, kLargestPatternScale)) {}
+    : VFProperty(0, opacity),
+      mPattern(pattern),
+      mScale(inOwnFloatState([&] { return clampKeepingNan(scale, 0.0F, kLargestPatternScale); })) {}
 
 }  // namespace VFontEffect

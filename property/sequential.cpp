@@ -32,15 +32,22 @@ int withStops(int fixedChars, int count) {
     return fixedChars + SequentialWriter::kReservedStopChars * SequentialWriter::keptStops(count);
 }
 
-/// Lets `write` fill a fragment that starts with `letter`, and moves the cursor past it.
+/// Lets `write` fill a fragment of whole numbers that starts with `letter`, and moves the cursor past
+/// it.
 template <class Write>
-[[nodiscard]] bool writeFragment(char** cursor, char letter, Write write) {
+[[nodiscard]] bool writeWholeFragment(char** cursor, char letter, Write write) {
     if (cursor == nullptr || *cursor == nullptr) return false;
-    const internal::OwnFloatState floatState;
     SequentialWriter writer(*cursor, letter);
     write(writer);
     *cursor = writer.close();
     return true;
+}
+
+/// The same for numbers of any kind.
+template <class Write>
+[[nodiscard]] bool writeFragment(char** cursor, char letter, Write write) {
+    const internal::OwnFloatState floatState;
+    return writeWholeFragment(cursor, letter, write);
 }
 
 template <class Shadow>
@@ -88,7 +95,7 @@ int VFTextProperty::getSequentialCharLength() {
     return kTextChars;
 }
 bool VFTextProperty::toSequentialChar(char** cursor) {
-    return writeFragment(cursor, 'T', [&](SequentialWriter& writer) { writer.word(mColor); });
+    return writeWholeFragment(cursor, 'T', [&](SequentialWriter& writer) { writer.word(mColor); });
 }
 
 int VFOuterShadowProperty::getSequentialCharLength() {
