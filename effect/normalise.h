@@ -48,8 +48,8 @@ inline VFGradient normalisedStop(const VFGradient& stop, float effectOpacity) {
 /// The normalised copy of a caller's stops. A null array counts as no stops.
 class NormalisedStops {
   public:
-    NormalisedStops(const VFGradient* gradient, int count, float effectOpacity)
-        : mCount(gradient == nullptr ? 0 : std::clamp(count, 0, kMostStops)) {
+    void fill(const VFGradient* gradient, int count, float effectOpacity) {
+        mCount = gradient == nullptr ? 0 : std::clamp(count, 0, kMostStops);
         for (int i = 0; i < mCount; ++i)
             mStops[i] = normalisedStop(gradient[i], effectOpacity);
     }
@@ -58,7 +58,7 @@ class NormalisedStops {
     VFGradient* data() { return mStops; }
 
   private:
-    int mCount;
+    int mCount = 0;
     VFGradient mStops[kMostStops];
 };
 

@@ -17,6 +17,7 @@
 #include "tests/support/compare.h"
 #include "tests/support/core_compare.h"
 #include "tests/support/fake_core.h"
+#include "tests/support/float_states.h"
 #include "tests/support/mask_gallery.h"
 #include "tests/support/pixel_cases.h"
 #include "tests/support/plans.h"
@@ -694,6 +695,53 @@ TEST_F(SetMemory, RefusedWhileAdding_PaintsWithoutTheEffectUntilItIsAddedAgain) 
         // The core and its record at least.
         EXPECT_GE(requests, 2);
     }
+}
+
+/// In every floating-point state: throwing leaves it as it was, too.
+TEST_F(SetMemory, ListThatCannotGrow_ThrowsAndLeavesTheSetAsItWas) {
+    for (const FloatState& state : floatStates()) {
+        SCOPED_TRACE(state.name);
+        for (const int type : kEveryType) {
+            VFEffect set;
+            const int other = type == kText ? kStroke : kText;
+            addEffect(set, other);
+            const Bytes before = paintedBy(set);
+            const long live = liveBlocks();
+            bool thrown = false;
+            FloatState after = {};
+            {
+                const RefusedObjects no;
+                const InFloatState callers(state);
+                try {
+                    addEffect(set, type);
+                } catch (const std::bad_alloc&) {
+                    thrown = true;
+                }
+                after = currentFloatState();
+            }
+            EXPECT_TRUE(thrown) << nameOf(type);
+            EXPECT_EQ(state.control, after.control) << nameOf(type);
+            EXPECT_EQ(live, liveBlocks()) << "blocks leak";
+            EXPECT_EQ(set.getEffect(type), nullptr);
+            EXPECT_TRUE(sameRun(before, paintedBy(set)));
+            // The one that is there needs no place in the list.
+            const RefusedObjects no;
+            EXPECT_NO_THROW(addEffect(set, other));
+        }
+    }
+}
+
+TEST_F(SetMemory, CopyWhoseListCannotBeMade_ThrowsAndLeaksNothing) {
+    VFEffect set;
+    kLooks[0].describe(set);
+    const Bytes before = paintedBy(set);
+    const long live = liveBlocks();
+    {
+        const RefusedObjects no;
+        EXPECT_THROW(VFEffect copy(set), std::bad_alloc);
+    }
+    EXPECT_EQ(live, liveBlocks()) << "blocks leak";
+    EXPECT_TRUE(sameRun(before, paintedBy(set)));
 }
 
 TEST_F(SetMemory, RefusedWhileCopyingASet_LeavesOutWhatHasNoMemory) {

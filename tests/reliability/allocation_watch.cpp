@@ -29,6 +29,7 @@ std::atomic<long> gPeakBytes{0};
 std::atomic<long> gRequests{0};
 std::atomic<long> gFirstRefused{kNever};
 std::atomic<bool> gRefuseOn{false};
+std::atomic<bool> gObjectsRefused{false};
 
 }  // namespace
 
@@ -58,6 +59,14 @@ RefusedMemory::~RefusedMemory() {
 
 long RefusedMemory::requests() {
     return gRequests;
+}
+
+RefusedObjects::RefusedObjects() {
+    gObjectsRefused = true;
+}
+
+RefusedObjects::~RefusedObjects() {
+    gObjectsRefused = false;
 }
 
 bool RefusedMemory::refused() {
@@ -124,6 +133,7 @@ void* objectMemory(size_t size) {
 }
 
 void* objectMemoryOrEnd(size_t size) {
+    if (gObjectsRefused) throw std::bad_alloc();
     void* const block = objectMemory(size);
     if (block == nullptr) std::abort();
     return block;

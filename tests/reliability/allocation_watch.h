@@ -38,6 +38,15 @@ class RefusedMemory {
     static bool refused();
 };
 
+/// While it lives, plain operator new throws.
+class RefusedObjects {
+  public:
+    RefusedObjects();
+    ~RefusedObjects();
+    RefusedObjects(const RefusedObjects&) = delete;
+    RefusedObjects& operator=(const RefusedObjects&) = delete;
+};
+
 /// Calls `step` and returns how many requests for memory that may fail it makes.
 template <class Step>
 long requestsOf(Step step) {
