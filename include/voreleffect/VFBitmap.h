@@ -10,8 +10,10 @@
 ///    takes width * 4 bytes. A mask pixel is one byte of coverage, 0 (outside) to 255 (inside).
 ///  - Coordinates are whole pixels, x to the right, y downwards. Rectangles are half-open: the left
 ///    and top edges belong to them, the right and bottom edges do not.
-///  - Nothing throws, but std::bad_alloc when the list of a set's effects cannot grow. No drawing code
-///    logs. A null argument draws nothing.
+///  - Nothing throws, but std::bad_alloc when the list of a set's effects cannot grow, be it by adding
+///    or by copying the set. No drawing code logs. A null argument draws nothing.
+///  - Whatever rounding mode, flushing of subnormal numbers or traps the calling thread has set up: the
+///    bytes are the same, and it finds its floating-point state as it left it.
 namespace VFontEffect {
 
 /// A box of whole pixels, half-open: mRight and mBottom are exclusive. Starts as all zeros.

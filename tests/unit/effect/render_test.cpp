@@ -222,6 +222,21 @@ TEST(TextBox, OnlyPostProcessingReArmsIt) {
     EXPECT_EQ(sidesOf(*set.getTextRect()), (Sides{0, 0, 8, 8}));
 }
 
+TEST(TextBox, RunWithoutGlyphs_PaintsOverTheBoxOfTheLastRun) {
+    VFEffect set;
+    FakeCore* core = insertCore(set, kText);
+    VFBitmap picture(9, 9, 4);
+    SolidGlyph glyph(2, 3);
+    set.initEffect(9, 9);
+    set.renderEffectLayer(4, 5, &glyph.glyph);
+    set.doEffectPostProcessing();
+    set.compositeLayers(&picture);
+    set.initEffect(9, 9);
+    set.doEffectPostProcessing();
+    ASSERT_EQ(core->paints.size(), 2U);
+    EXPECT_EQ(sidesOf(*core->paints[1].textRect), (Sides{4, 5, 6, 8}));
+}
+
 // --- Post-processing --------------------------------------------------------------------------
 
 TEST(PostProcessing, OutsideLayeredMode_GivesEveryCoreTheDestination) {
