@@ -166,9 +166,9 @@ class VF_API VFEffect {
     int getTopOffset();     ///< the same above
     int getBottomOffset();  ///< the same below
 
-    /// The box of the run's glyphs, which the effects paint around; owned by the set. It starts anew with
-    /// the first glyph after doEffectPostProcessing: a run given up before that leaves its box to the
-    /// next one, and a run without glyphs has the box of the last one.
+    /// The box of the run's glyphs, which the effects paint around; owned by the set. It starts anew
+    /// with the first glyph after doEffectPostProcessing: a run given up before that leaves its box to
+    /// the next one, and a run without glyphs has the box of the last one.
     VFRect* getTextRect();
 
     /// Merges the coverage of `glyph` into the mask with its top left corner at (x, y), clipped, and
