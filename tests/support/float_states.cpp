@@ -29,6 +29,7 @@ constexpr uint32_t kDown = 2U << 22;
 constexpr uint32_t kToZero = 3U << 22;
 constexpr uint32_t kFlush = 1U << 24 | 1U << 25;  // and every NaN the default one
 constexpr uint32_t kTraps = 0x9F00;               // stays 0 on CPUs that have none
+constexpr uint32_t kFlags = 0x009F;               // not that of saturated integers
 constexpr uint16_t kX87 = 0;
 constexpr uint16_t kOddX87 = 0;
 
@@ -66,7 +67,7 @@ FloatState currentFloatState() {
     uint64_t flags = 0;
     asm volatile("mrs %0, fpcr\n\tmrs %1, fpsr" : "=r"(control), "=r"(flags) : : "memory");
     state.control = static_cast<uint32_t>(control);
-    state.flags = static_cast<uint32_t>(flags);
+    state.flags = static_cast<uint32_t>(flags) & kFlags;
 #endif
     return state;
 }
@@ -76,6 +77,11 @@ InFloatState::InFloatState(const FloatState& state) : mBefore(currentFloatState(
 }
 InFloatState::~InFloatState() {
     apply(mBefore);
+}
+
+FloatState asThisCpuHasIt(const FloatState& state) {
+    const InFloatState callers(state);
+    return currentFloatState();
 }
 
 }  // namespace vorel_test

@@ -10,7 +10,7 @@ struct FloatState {
     const char* name;
     uint32_t control;  ///< MXCSR without its flags on x86-64, FPCR on 64-bit ARM
     uint16_t x87;      ///< control word of the 80-bit registers, x86-64 only
-    uint32_t flags;    ///< sticky ones: of MXCSR, FPSR
+    uint32_t flags;    ///< of exceptions, sticky: in MXCSR, FPSR
 
     bool operator==(const FloatState& other) const {
         return control == other.control && x87 == other.x87 && flags == other.flags;
@@ -23,6 +23,9 @@ std::vector<FloatState> floatStates();
 
 /// The calling thread's.
 FloatState currentFloatState();
+
+/// What the calling thread is in when it is put into a state: a CPU may lack a part of it.
+FloatState asThisCpuHasIt(const FloatState& state);
 
 /// While one lives, the calling thread is in a state. What it computes itself had better not round.
 class InFloatState {

@@ -39,8 +39,7 @@ class Findings {
   public:
     explicit Findings(const FloatState& state) : mState(state) {
         mState.flags = 5;  // two sticky ones that are none of the operation's
-        const InFloatState callers(mState);
-        mState = currentFloatState();  // a CPU may lack a part of it
+        mState = asThisCpuHasIt(mState);
     }
 
     /// Runs an operation in the state. It must not compute anything itself.
