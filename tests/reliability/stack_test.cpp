@@ -70,7 +70,8 @@ TEST(Stack, WholeLooks_UseLittleOfIt) {
     size_t most = 0;
     for (const WholeLook look : kWholeLooks) {
         gLook = look;
-        expectedPicture(look);
+        // What the loader uses when it binds a name at its first call is not the library's.
+        ASSERT_TRUE(paintsAsExpected(look)) << look;
         const size_t used = stack.usedBy(paintAndCompare) - own;
         EXPECT_TRUE(gSame) << look;
         EXPECT_LE(used, kAllowed) << "bytes of stack, look " << look;
