@@ -11,6 +11,21 @@
 // The native side of org.voreleffect.VorelEffect, which checks every argument before it comes here. The
 // generated header declares each function below, so that the compiler refuses one that does not fit.
 
+namespace VFontEffect {
+
+/// What the public face does not tell of a run: whether its outer layer is there.
+struct RunLayers {
+    static bool areThere(const VFEffect& look) {
+        const bool layered = look.mUseOuterLayer == 1;
+        return hasPixels(look.mSrcBitmap) && (!layered || hasPixels(look.mOuterLayer));
+    }
+
+  private:
+    static bool hasPixels(const VFBitmap* layer) { return layer != nullptr && layer->mData != nullptr; }
+};
+
+}  // namespace VFontEffect
+
 using namespace VFontEffect;
 
 namespace {
@@ -19,23 +34,8 @@ constexpr int kMaxStops = 256;
 constexpr unsigned int kColourBytes = 4;
 constexpr unsigned int kColourFormat = 1;
 
-/// A look and the run that is painted with it.
-struct Painter {
-    VFEffect look;
-    VFBitmap picture;  ///< over the destination of the open run; its pixels belong to the caller
-
-    Painter() = default;
-    Painter(const Painter&) = delete;
-    Painter& operator=(const Painter&) = delete;
-    ~Painter() { picture.mData = nullptr; }
-};
-
-Painter& painterOf(jlong handle) {
-    return *reinterpret_cast<Painter*>(static_cast<intptr_t>(handle));
-}
-
-VFEffect& lookOf(jlong handle) {
-    return painterOf(handle).look;
+VFEffect& lookOf(jlong painter) {
+    return *reinterpret_cast<VFEffect*>(static_cast<intptr_t>(painter));
 }
 
 unsigned int wordOf(jint bits) {
@@ -47,15 +47,25 @@ jint idOf(unsigned int id) {
     return static_cast<jint>(id);
 }
 
-void throwOutOfMemory(JNIEnv* env, const char* what) {
-    const jclass kind = env->FindClass("java/lang/OutOfMemoryError");
+void throwNew(JNIEnv* env, const char* className, const char* what) {
+    const jclass kind = env->FindClass(className);
     if (kind != nullptr) env->ThrowNew(kind, what);
 }
 
-/// The bytes of a direct buffer from `offset` on; null for a buffer without memory.
-unsigned char* bytesOf(JNIEnv* env, jobject buffer, jint offset) {
+void throwOutOfMemory(JNIEnv* env, const char* what) {
+    throwNew(env, "java/lang/OutOfMemoryError", what);
+}
+
+/// The bytes of a direct buffer from `offset` on, of which `count` are used. Where the buffer has not so
+/// many it throws and gives null. Position and limit are not asked, which any thread may move at any
+/// time; the capacity stands.
+unsigned char* bytesOf(JNIEnv* env, jobject buffer, jint offset, int64_t count) {
+    if (count == 0) return nullptr;
     auto* const bytes = static_cast<unsigned char*>(env->GetDirectBufferAddress(buffer));
-    return bytes != nullptr ? bytes + offset : nullptr;
+    if (bytes != nullptr && offset >= 0 && env->GetDirectBufferCapacity(buffer) - offset >= count)
+        return bytes + offset;
+    throwNew(env, "java/lang/IllegalArgumentException", "too few bytes in the buffer");
+    return nullptr;
 }
 
 /// Colour stops, read from three arrays of one length.
@@ -101,10 +111,9 @@ jbyteArray keyArray(JNIEnv* env, char* key) {
 
 /// Ends a run that was not finished, if there is one. Without a mask nothing is painted, but the next
 /// glyph starts a new text box.
-void dropRun(Painter& painter) {
-    painter.look.releaseBitmap();
-    painter.look.doEffectPostProcessing();
-    painter.picture.mData = nullptr;
+void dropRun(VFEffect& look) {
+    look.releaseBitmap();
+    look.doEffectPostProcessing();
 }
 
 }  // namespace
@@ -113,43 +122,46 @@ void dropRun(Painter& painter) {
     extern "C" JNIEXPORT result JNICALL Java_org_voreleffect_VorelEffect_##name
 
 VOREL_NATIVE(jlong, nativeCreate)(JNIEnv* env, jclass) {
-    auto* const painter = new (std::nothrow) Painter;
-    if (painter == nullptr) throwOutOfMemory(env, "look");
-    return static_cast<jlong>(reinterpret_cast<intptr_t>(painter));
+    auto* const look = new (std::nothrow) VFEffect;
+    if (look == nullptr) throwOutOfMemory(env, "look");
+    return static_cast<jlong>(reinterpret_cast<intptr_t>(look));
 }
 
 VOREL_NATIVE(void, nativeDestroy)(JNIEnv*, jclass, jlong painter) {
-    delete &painterOf(painter);
+    delete &lookOf(painter);
 }
 
+// Below, the object stands beside its painter: as an argument it stays reachable until the call has
+// returned, so that the painter is not freed under it.
+
 VOREL_NATIVE(jint, nativeAddOuterShadow)
-(JNIEnv*, jclass, jlong painter, jfloat angle, jfloat distance, jfloat size, jint color,
+(JNIEnv*, jobject, jlong painter, jfloat angle, jfloat distance, jfloat size, jint color,
  jfloat opacity) {
     return idOf(lookOf(painter).addOuterShadowText(angle, distance, size, wordOf(color), opacity));
 }
 
 VOREL_NATIVE(jint, nativeAddInnerShadow)
-(JNIEnv*, jclass, jlong painter, jfloat angle, jfloat distance, jfloat size, jint color,
+(JNIEnv*, jobject, jlong painter, jfloat angle, jfloat distance, jfloat size, jint color,
  jfloat opacity) {
     return idOf(lookOf(painter).addInnerShadowText(angle, distance, size, wordOf(color), opacity));
 }
 
 VOREL_NATIVE(jint, nativeAddOuterGlow)
-(JNIEnv* env, jclass, jlong painter, jfloat size, jint color, jfloat opacity, jintArray colors,
+(JNIEnv* env, jobject, jlong painter, jfloat size, jint color, jfloat opacity, jintArray colors,
  jfloatArray opacities, jfloatArray locations) {
     Stops ramp(env, colors, opacities, locations);
     return idOf(lookOf(painter).addOuterGlowText(size, wordOf(color), opacity, ramp.count, ramp.stops));
 }
 
 VOREL_NATIVE(jint, nativeAddInnerGlow)
-(JNIEnv* env, jclass, jlong painter, jfloat size, jint color, jfloat opacity, jintArray colors,
+(JNIEnv* env, jobject, jlong painter, jfloat size, jint color, jfloat opacity, jintArray colors,
  jfloatArray opacities, jfloatArray locations) {
     Stops ramp(env, colors, opacities, locations);
     return idOf(lookOf(painter).addInnerGlowText(size, wordOf(color), opacity, ramp.count, ramp.stops));
 }
 
 VOREL_NATIVE(jint, nativeAddBevel)
-(JNIEnv*, jclass, jlong painter, jint style, jfloat size, jfloat depth, jint technique, jint direction,
+(JNIEnv*, jobject, jlong painter, jint style, jfloat size, jfloat depth, jint technique, jint direction,
  jint soften, jfloat opacity, jfloat angle, jfloat altitude, jint highlightColor,
  jfloat highlightOpacity, jint shadowColor, jfloat shadowOpacity) {
     return idOf(lookOf(painter).addBevelText(style, size, depth, technique, direction, soften, opacity,
@@ -158,7 +170,7 @@ VOREL_NATIVE(jint, nativeAddBevel)
 }
 
 VOREL_NATIVE(jint, nativeAddEmboss)
-(JNIEnv*, jclass, jlong painter, jint style, jfloat size, jfloat depth, jint technique, jint direction,
+(JNIEnv*, jobject, jlong painter, jint style, jfloat size, jfloat depth, jint technique, jint direction,
  jint soften, jfloat opacity, jfloat angle, jfloat altitude, jint highlightColor,
  jfloat highlightOpacity, jint shadowColor, jfloat shadowOpacity) {
     return idOf(lookOf(painter).addEmbossText(style, size, depth, technique, direction, soften, opacity,
@@ -167,27 +179,27 @@ VOREL_NATIVE(jint, nativeAddEmboss)
 }
 
 VOREL_NATIVE(jint, nativeAddLinearGradient)
-(JNIEnv* env, jclass, jlong painter, jfloat angle, jfloat scale, jfloat opacity, jintArray colors,
+(JNIEnv* env, jobject, jlong painter, jfloat angle, jfloat scale, jfloat opacity, jintArray colors,
  jfloatArray opacities, jfloatArray locations) {
     Stops ramp(env, colors, opacities, locations);
     return idOf(lookOf(painter).addLinearGradientText(angle, scale, opacity, ramp.count, ramp.stops));
 }
 
 VOREL_NATIVE(jint, nativeAddRadialGradient)
-(JNIEnv* env, jclass, jlong painter, jfloat scale, jfloat opacity, jintArray colors,
+(JNIEnv* env, jobject, jlong painter, jfloat scale, jfloat opacity, jintArray colors,
  jfloatArray opacities, jfloatArray locations) {
     Stops ramp(env, colors, opacities, locations);
     return idOf(lookOf(painter).addRadialGradientText(scale, opacity, ramp.count, ramp.stops));
 }
 
 VOREL_NATIVE(jint, nativeAddStroke)
-(JNIEnv*, jclass, jlong painter, jfloat size, jint color, jfloat opacity, jint strokeStyle,
+(JNIEnv*, jobject, jlong painter, jfloat size, jint color, jfloat opacity, jint strokeStyle,
  jint position) {
     return idOf(lookOf(painter).addStrokeText(size, wordOf(color), opacity, strokeStyle, position));
 }
 
 VOREL_NATIVE(jint, nativeAddPattern)
-(JNIEnv* env, jclass, jlong painter, jintArray pixels, jint width, jint height, jfloat scale,
+(JNIEnv* env, jobject, jlong painter, jintArray pixels, jint width, jint height, jfloat scale,
  jfloat opacity) {
     VFBitmap pattern(wordOf(width), wordOf(height), kColourBytes);
     if (pattern.mData == nullptr) {
@@ -199,79 +211,83 @@ VOREL_NATIVE(jint, nativeAddPattern)
     return idOf(lookOf(painter).addPatternText(&pattern, scale, opacity));
 }
 
-VOREL_NATIVE(jint, nativeAddText)(JNIEnv*, jclass, jlong painter, jint color, jfloat opacity) {
+VOREL_NATIVE(jint, nativeAddText)(JNIEnv*, jobject, jlong painter, jint color, jfloat opacity) {
     return idOf(lookOf(painter).addText(wordOf(color), opacity));
 }
 
-VOREL_NATIVE(jboolean, nativeRemoveEffect)(JNIEnv*, jclass, jlong painter, jint id) {
+VOREL_NATIVE(jboolean, nativeRemoveEffect)(JNIEnv*, jobject, jlong painter, jint id) {
     return lookOf(painter).removeEffect(id) ? JNI_TRUE : JNI_FALSE;
 }
 
-VOREL_NATIVE(void, nativeCleanAllEffect)(JNIEnv*, jclass, jlong painter) {
+VOREL_NATIVE(void, nativeCleanAllEffect)(JNIEnv*, jobject, jlong painter) {
     lookOf(painter).cleanAllEffect();
 }
 
-VOREL_NATIVE(void, nativeSetTextOpacity)(JNIEnv*, jclass, jlong painter, jfloat opacity) {
+VOREL_NATIVE(void, nativeSetTextOpacity)(JNIEnv*, jobject, jlong painter, jfloat opacity) {
     lookOf(painter).setTextOpacity(opacity);
 }
 
-VOREL_NATIVE(jfloat, nativeGetTextOpacity)(JNIEnv*, jclass, jlong painter) {
+VOREL_NATIVE(jfloat, nativeGetTextOpacity)(JNIEnv*, jobject, jlong painter) {
     return lookOf(painter).getTextOpacity();
 }
 
-VOREL_NATIVE(jint, nativeGetLeftOffset)(JNIEnv*, jclass, jlong painter) {
+VOREL_NATIVE(jint, nativeGetLeftOffset)(JNIEnv*, jobject, jlong painter) {
     return lookOf(painter).getLeftOffset();
 }
 
-VOREL_NATIVE(jint, nativeGetRightOffset)(JNIEnv*, jclass, jlong painter) {
+VOREL_NATIVE(jint, nativeGetRightOffset)(JNIEnv*, jobject, jlong painter) {
     return lookOf(painter).getRightOffset();
 }
 
-VOREL_NATIVE(jint, nativeGetTopOffset)(JNIEnv*, jclass, jlong painter) {
+VOREL_NATIVE(jint, nativeGetTopOffset)(JNIEnv*, jobject, jlong painter) {
     return lookOf(painter).getTopOffset();
 }
 
-VOREL_NATIVE(jint, nativeGetBottomOffset)(JNIEnv*, jclass, jlong painter) {
+VOREL_NATIVE(jint, nativeGetBottomOffset)(JNIEnv*, jobject, jlong painter) {
     return lookOf(painter).getBottomOffset();
 }
 
-VOREL_NATIVE(jbyteArray, nativeGetMapKey)(JNIEnv* env, jclass, jlong painter) {
+VOREL_NATIVE(jbyteArray, nativeGetMapKey)(JNIEnv* env, jobject, jlong painter) {
     return keyArray(env, lookOf(painter).getMapKey());
 }
 
-VOREL_NATIVE(jbyteArray, nativeGetMapKeyOfColor)(JNIEnv* env, jclass, jlong painter, jint color) {
+VOREL_NATIVE(jbyteArray, nativeGetMapKeyOfColor)(JNIEnv* env, jobject, jlong painter, jint color) {
     return keyArray(env, lookOf(painter).getMapKey(wordOf(color)));
 }
 
-VOREL_NATIVE(void, nativeBegin)
-(JNIEnv* env, jclass, jlong painter, jobject destination, jint offset, jint width, jint height) {
-    auto& [look, picture] = painterOf(painter);
-    dropRun(painterOf(painter));
+VOREL_NATIVE(void, nativeBegin)(JNIEnv* env, jobject, jlong painter, jint width, jint height) {
+    VFEffect& look = lookOf(painter);
+    dropRun(look);
     look.initEffect(width, height);
-    if (look.getSrcBitmap() == nullptr || look.getSrcBitmap()->mData == nullptr) {
-        dropRun(painterOf(painter));
+    if (!RunLayers::areThere(look)) {
+        dropRun(look);
         throwOutOfMemory(env, "layers");
-        return;
     }
-    picture.mWidth = wordOf(width);
-    picture.mHeight = wordOf(height);
-    picture.mFormat = kColourFormat;
-    picture.mBytesPerPixel = kColourBytes;
-    picture.mData = bytesOf(env, destination, offset);
-    look.setDstBitmap(&picture);
 }
 
 VOREL_NATIVE(void, nativeGlyph)
-(JNIEnv* env, jclass, jlong painter, jint x, jint y, jobject coverage, jint offset, jint width,
+(JNIEnv* env, jobject, jlong painter, jint x, jint y, jobject coverage, jint offset, jint width,
  jint height) {
-    VFGlyph glyph = {bytesOf(env, coverage, offset), static_cast<unsigned short>(width),
-                     static_cast<unsigned short>(height)};
+    const int64_t count = int64_t{width} * height;
+    unsigned char* const bytes = bytesOf(env, coverage, offset, count);
+    if (bytes == nullptr && count != 0) return;
+    VFGlyph glyph = {bytes, static_cast<unsigned short>(width), static_cast<unsigned short>(height)};
     lookOf(painter).renderEffectLayer(x, y, &glyph);
 }
 
-VOREL_NATIVE(void, nativeFinish)(JNIEnv*, jclass, jlong painter) {
-    auto& [look, picture] = painterOf(painter);
+VOREL_NATIVE(void, nativeFinish)
+(JNIEnv* env, jobject, jlong painter, jobject destination, jint offset) {
+    VFEffect& look = lookOf(painter);
+    VFBitmap picture;
+    picture.mWidth = look.getSrcBitmap()->mWidth;
+    picture.mHeight = look.getSrcBitmap()->mHeight;
+    picture.mFormat = kColourFormat;
+    picture.mBytesPerPixel = kColourBytes;
+    const int64_t count = int64_t{picture.mWidth} * picture.mHeight * kColourBytes;
+    picture.mData = bytesOf(env, destination, offset, count);
+    if (picture.mData == nullptr) return;
+    look.setDstBitmap(&picture);
     look.doEffectPostProcessing();
     look.compositeLayers(&picture);
-    picture.mData = nullptr;
+    picture.mData = nullptr;  // the caller's
 }

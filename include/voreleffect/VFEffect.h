@@ -199,6 +199,8 @@ class VF_API VFEffect {
     /// @}
 
   private:
+    friend struct RunLayers;  // for a binding, which reports what got no memory
+
     std::vector<VFECore*> mEffects;
     VFBitmap* mSrcBitmap = nullptr;
     VFBitmap* mDstBitmap = nullptr;

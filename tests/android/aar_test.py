@@ -138,9 +138,12 @@ class Archive(unittest.TestCase):
 
     def test_classes_are_of_java_8(self):
         with zipfile.ZipFile(self.content / "classes.jar") as classes:
-            self.assertEqual(classes.namelist(), ["org/voreleffect/VorelEffect.class"])
-            data = classes.read(classes.namelist()[0])
-        self.assertEqual(int.from_bytes(data[6:8], "big"), 52)
+            self.assertEqual(
+                classes.namelist(),
+                ["org/voreleffect/VorelEffect$Painter.class", "org/voreleffect/VorelEffect.class"],
+            )
+            for name in classes.namelist():
+                self.assertEqual(int.from_bytes(classes.read(name)[6:8], "big"), 52)
 
     def test_every_native_method_of_the_class_is_in_the_library_and_nothing_else(self):
         jar = str(self.content / "classes.jar")

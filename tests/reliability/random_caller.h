@@ -21,7 +21,6 @@ class RandomCaller {
 
   private:
     void changeLook();
-    void addEffect();
     void renderGlyph(int width, int height);
 
     Random mRandom;

@@ -1,10 +1,12 @@
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <array>
 #include <atomic>
 #include <cstdint>
 #include <cstring>
 #include <functional>
+#include <iterator>
 #include <thread>
 #include <vector>
 
@@ -12,6 +14,7 @@
 #include "random_caller.h"
 #include "tests/support/mask_gallery.h"
 #include "voreleffect/voreleffect.h"
+#include "whole_looks.h"
 
 /// Separate effect sets on separate threads. scripts/threads.sh runs these under ThreadSanitizer.
 namespace {
@@ -27,13 +30,13 @@ constexpr size_t kThreads = 2;
 
 /// Runs `work(thread)` on every thread at once. None starts before all are there: threads that follow
 /// each other show no race.
-void onAllThreads(const std::function<void(size_t)>& work) {
+void onAllThreads(const std::function<void(size_t)>& work, size_t count = kThreads) {
     std::atomic<size_t> arrived{0};
     std::vector<std::thread> threads;
-    for (size_t i = 0; i < kThreads; ++i) {
-        threads.emplace_back([&work, &arrived, i] {
+    for (size_t i = 0; i < count; ++i) {
+        threads.emplace_back([&work, &arrived, count, i] {
             ++arrived;
-            while (arrived < kThreads)
+            while (arrived < count)
                 std::this_thread::yield();
             work(i);
         });
@@ -68,6 +71,23 @@ TEST(Threads, SeparateEffectSets_PaintWhatOneThreadAlonePaints) {
                 << "thread " << thread << ", seed " << seed;
         }
     }
+}
+
+TEST(Threads, ManyMoreThanCores_PaintWhatTheLiteralFormPaints) {
+    const size_t threads = std::max(size_t{32}, size_t{4} * std::thread::hardware_concurrency());
+    for (const WholeLook look : kWholeLooks)
+        expectedPicture(look);
+    const int rounds = repetitions(10);
+    std::atomic<size_t> same{0};
+    onAllThreads(
+        [&](size_t thread) {
+            for (int round = 0; round < rounds; ++round) {
+                const auto turn = (thread + static_cast<size_t>(round)) % std::size(kWholeLooks);
+                if (paintsAsExpected(kWholeLooks[turn])) ++same;
+            }
+        },
+        threads);
+    EXPECT_EQ(threads * static_cast<size_t>(rounds), same) << "runs on " << threads << " threads";
 }
 
 constexpr int kGlyphWidth = 9;

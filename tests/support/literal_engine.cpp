@@ -479,6 +479,10 @@ void Engine::paint(const Effect& e, Picture* dst, Picture* sub) {
 }
 
 void Engine::doEffectPostProcessing() {
+    if (!mHasMask) {
+        mResetTextRect = true;
+        return;
+    }
     mTextRect.left = std::min(std::max(mTextRect.left, 0), mMask.width);
     mTextRect.right = std::max(std::min(mTextRect.right, mMask.width), 0);
     mTextRect.top = std::min(std::max(mTextRect.top, 0), mMask.height);

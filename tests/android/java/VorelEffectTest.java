@@ -1,5 +1,6 @@
 import java.io.IOException;
 import java.lang.ref.WeakReference;
+import java.lang.reflect.Field;
 import java.lang.reflect.InvocationTargetException;
 import java.lang.reflect.Method;
 import java.lang.reflect.Modifier;
@@ -13,6 +14,7 @@ import java.util.Arrays;
 import java.util.LinkedHashMap;
 import java.util.List;
 import java.util.Map;
+import java.util.concurrent.atomic.AtomicBoolean;
 import java.util.concurrent.atomic.AtomicReference;
 import java.util.function.Consumer;
 import org.voreleffect.VorelEffect;
@@ -250,6 +252,187 @@ public final class VorelEffectTest {
             look.finish();
         }
         check(picture.equals(everythingPainted()), "pixels");
+    }
+
+    /**
+     * Calls for a while, as another thread moves the position and the limit of the buffer: a call may refuse
+     * it, and must go through now and then.
+     */
+    private static void callWhileMoved(ByteBuffer buffer, Runnable call) throws InterruptedException {
+        AtomicBoolean ended = new AtomicBoolean();
+        Thread mover =
+                new Thread(
+                        () -> {
+                            while (!ended.get()) {
+                                buffer.position(buffer.capacity() - 1);
+                                buffer.limit(buffer.capacity() - 1);
+                                buffer.clear();
+                            }
+                        });
+        mover.start();
+        int done = 0;
+        int refused = 0;
+        for (long end = System.nanoTime() + 700_000_000; System.nanoTime() < end; ) {
+            try {
+                call.run();
+                ++done;
+            } catch (IllegalArgumentException e) {
+                ++refused;
+            }
+        }
+        ended.set(true);
+        mover.join();
+        check(done > 0 && refused > 0, done + " calls went through, " + refused + " were refused");
+    }
+
+    void testDestinationWhosePositionAnotherThreadMovesIsPaintedInsideAlone()
+            throws InterruptedException {
+        int bytes = WIDTH * HEIGHT * 4;
+        ByteBuffer whole = ByteBuffer.allocateDirect(2 * bytes);
+        whole.limit(bytes);
+        ByteBuffer destination = whole.slice();
+        whole.clear();
+        ByteBuffer picture = picture();
+        try (VorelEffect look = everything()) {
+            callWhileMoved(destination, () -> paintRun(look, destination));
+            paintRun(look, picture);
+        }
+        for (int i = bytes; i < whole.capacity(); ++i) {
+            check(whole.get(i) == 0, "byte " + (i - bytes) + " after the destination");
+        }
+        check(picture.equals(everythingPainted()), "the next run");
+    }
+
+    void testCoverageWhosePositionAnotherThreadMovesIsReadInsideAlone() throws InterruptedException {
+        int bytes = 31 * 29;
+        ByteBuffer whole = ByteBuffer.allocateDirect(2 * bytes);
+        for (int i = bytes; i < whole.capacity(); ++i) whole.put(i, (byte) 255);
+        whole.limit(bytes);
+        ByteBuffer nothing = whole.slice();
+        ByteBuffer picture = picture();
+        try (VorelEffect look = everything()) {
+            look.begin(WIDTH, HEIGHT, picture);
+            callWhileMoved(nothing, () -> look.glyph(8, 9, nothing, 31, 29));
+            look.finish();
+        }
+        check(picture.equals(picture()), "the bytes after the coverage were read");
+    }
+
+    void testPositionMovedWithinTheRunMovesNothing() {
+        ByteBuffer picture = picture();
+        try (VorelEffect look = everything()) {
+            look.begin(WIDTH, HEIGHT, picture);
+            picture.position(picture.capacity()).limit(picture.capacity());
+            glyphs(look);
+            look.finish();
+        }
+        check(picture.clear().equals(everythingPainted()), "pixels");
+    }
+
+    /** What the checks of the Java side let through by a mistake must end on the native side. */
+    void testNativeSideRefusesWhatLiesOutsideTheCapacity() {
+        ByteBuffer picture = picture();
+        try (VorelEffect look = everything()) {
+            look.begin(WIDTH, HEIGHT, picture);
+            for (int start : new int[] {1, RING.capacity(), Integer.MAX_VALUE, -1}) {
+                refused(() -> call(look, "nativeGlyph", 0, 0, RING, start, 31, 29));
+                refused(() -> call(look, "nativeFinish", picture, start));
+            }
+            refused(() -> call(look, "nativeGlyph", 0, 0, RING, 0, 0xFFFF, 0xFFFF));
+            refused(() -> call(look, "nativeGlyph", 0, 0, ByteBuffer.allocate(900), 0, 31, 29));
+            refused(() -> call(look, "nativeFinish", ByteBuffer.allocateDirect(99), 0));
+            check(picture.equals(picture()), "something was painted");
+            glyphs(look);
+            look.finish();
+        }
+        check(picture.equals(everythingPainted()), "pixels");
+    }
+
+    // --- Objects that are never closed ----------------------------------------------------------
+
+    void testObjectsThatWereNeverClosedAreFreed() throws Exception {
+        int[] pixels = new int[128 * 64];
+        Arrays.fill(pixels, 0x80402010);
+        long before = residentKb();
+        long most = 0;
+        for (int i = 1; i <= 10_000; ++i) {
+            new VorelEffect().addPatternText(pixels, 128, 64, 1, 1);
+            if (i % 500 == 0) {
+                System.gc();
+                most = Math.max(most, residentKb() - before);
+            }
+        }
+        check(most < 60_000, "10,000 looks of 32 kB that were never closed hold " + most + " kB");
+    }
+
+    private static long residentKb() throws IOException {
+        for (String line : Files.readAllLines(Paths.get("/proc/self/status"))) {
+            if (line.startsWith("VmRSS:")) return Long.parseLong(line.replaceAll("[^0-9]", ""));
+        }
+        throw new AssertionError("no VmRSS");
+    }
+
+    void testObjectIsNotFreedWhileItsLastCallRuns() throws InterruptedException {
+        ByteBuffer expected = everythingPainted();
+        byte[] key = everything().getMapKey();
+        AtomicBoolean ended = new AtomicBoolean();
+        Thread collector =
+                new Thread(
+                        () -> {
+                            while (!ended.get()) {
+                                System.gc();
+                                new VorelEffect().close(); // frees what the collector found
+                                Thread.yield();
+                            }
+                        });
+        collector.start();
+        try {
+            for (long end = System.nanoTime() + 700_000_000; System.nanoTime() < end; ) {
+                ByteBuffer picture = picture();
+                paintRun(everything(), picture);
+                check(picture.equals(expected), "pixels");
+                check(Arrays.equals(everything().getMapKey(), key), "key");
+            }
+        } finally {
+            ended.set(true);
+            collector.join();
+        }
+    }
+
+    // --- Memory that is refused -------------------------------------------------------------------
+
+    /** refusing_calloc.cpp refuses the mask of a layer of the first size, the outer layer of the second. */
+    void testLayersThatGetNoMemoryAreReportedAndNothingIsPainted() {
+        for (int[] size : new int[][] {{211, 199}, {197, 223}}) {
+            ByteBuffer picture = ByteBuffer.allocateDirect(size[0] * size[1] * 4);
+            try (VorelEffect look = new VorelEffect()) {
+                describeTranslucent(look);
+                look.getMapKey(TEXT_COLOR);
+                expect(OutOfMemoryError.class, () -> look.begin(size[0], size[1], picture));
+                misplaced(look::finish);
+                check(picture.equals(ByteBuffer.allocateDirect(picture.capacity())), "painted");
+                // The order of effects is that of a second run, as after a run that was given up.
+                ByteBuffer next = picture();
+                paintRun(look, next);
+                ByteBuffer again = picture();
+                try (VorelEffect other = new VorelEffect()) {
+                    describeTranslucent(other);
+                    other.getMapKey(TEXT_COLOR);
+                    paintRun(other, again);
+                }
+                check(next.equals(again), "the next run");
+            }
+        }
+    }
+
+    void testRunWithoutAnOuterLayerNeedsNoMemoryForIt() {
+        ByteBuffer picture = ByteBuffer.allocateDirect(197 * 223 * 4);
+        try (VorelEffect look = everything()) {
+            look.begin(197, 223, picture);
+            glyphs(look);
+            look.finish();
+        }
+        check(!picture.equals(ByteBuffer.allocateDirect(picture.capacity())), "nothing painted");
     }
 
     // --- Arrays ---------------------------------------------------------------------------------
@@ -536,6 +719,27 @@ public final class VorelEffectTest {
         }
     }
 
+    /** Calls a private native method of the object, past the checks of the Java side. */
+    private static void call(VorelEffect look, String name, Object... arguments) {
+        try {
+            Field painter = VorelEffect.class.getDeclaredField("painter");
+            painter.setAccessible(true);
+            Field address = painter.getType().getDeclaredField("look");
+            address.setAccessible(true);
+            List<Object> all = new ArrayList<>(Arrays.asList(arguments));
+            all.add(0, address.get(painter.get(look)));
+            for (Method method : VorelEffect.class.getDeclaredMethods()) {
+                if (!method.getName().equals(name)) continue;
+                method.setAccessible(true);
+                method.invoke(look, all.toArray());
+            }
+        } catch (InvocationTargetException e) {
+            throw (RuntimeException) e.getCause();
+        } catch (ReflectiveOperationException e) {
+            throw new AssertionError(e);
+        }
+    }
+
     private static void refused(Runnable call) {
         expect(IllegalArgumentException.class, call);
     }
@@ -547,7 +751,7 @@ public final class VorelEffectTest {
     private static void expect(Class<? extends Throwable> kind, Runnable call) {
         try {
             call.run();
-        } catch (RuntimeException e) {
+        } catch (RuntimeException | OutOfMemoryError e) {
             check(e.getClass() == kind, kind.getSimpleName() + " expected, not " + e);
             return;
         }

@@ -1,6 +1,11 @@
 package org.voreleffect;
 
+import java.lang.ref.PhantomReference;
+import java.lang.ref.ReferenceQueue;
 import java.nio.ByteBuffer;
+import java.util.Collections;
+import java.util.Set;
+import java.util.concurrent.ConcurrentHashMap;
 
 /**
  * A styled-text look and the painter of its runs.
@@ -34,12 +39,21 @@ import java.nio.ByteBuffer;
  *
  * <p>What would touch memory that is not there is refused: a null array or buffer, a buffer that is
  * not direct, one with too few bytes remaining, a size out of range give an
- * {@link IllegalArgumentException}, and nothing changes. A closed object, and a call that does not
- * fit a run that is or is not open, give an {@link IllegalStateException}. A layer that cannot be
- * made gives an {@link OutOfMemoryError}.
+ * {@link IllegalArgumentException}, and nothing changes. A closed object, a buffer over memory that its
+ * owner has closed, and a call that does not fit a run that is or is not open, give an
+ * {@link IllegalStateException}, and nothing changes either. A layer that cannot be made gives an
+ * {@link OutOfMemoryError}; no run is open then.
  *
  * <p>The methods exclude each other, so that an object may be handed from thread to thread and closed
- * from any of them; separate objects paint at the same time.
+ * from any of them; separate objects paint at the same time. A buffer's position and limit are read once,
+ * when the buffer is handed over: another thread that moves them makes no call touch other memory. Its
+ * bytes are the caller's to keep: memory that is closed or unmapped <em>during</em> a call, or that was
+ * freed behind the virtual machine's back (the pixels under a buffer that native code has made), cannot be
+ * told from memory that is there, and touching it ends the process.
+ *
+ * <p>Close an object when it is done. One that was never closed is freed when a later one is made, after
+ * the collector has found it unreachable, and until then holds the memory of its effects and of a run that
+ * is open.
  */
 public final class VorelEffect implements AutoCloseable {
     /** Position of a stroke: half of it on each side of the edge. Selects layered mode. */
@@ -64,24 +78,72 @@ public final class VorelEffect implements AutoCloseable {
         System.loadLibrary("voreleffect_jni");
     }
 
-    /** The native painter; 0 when closed. */
-    private long painter;
+    private final Painter painter;
 
-    /** Kept from begin to finish, since the painter holds its address. Null between runs. */
+    /**
+     * The destination of the open run, as a buffer of our own, whose position and limit nobody moves.
+     * Null between runs.
+     */
     private ByteBuffer destination;
 
-    /** A look without effects, at full text opacity. */
+    /** Where the picture starts in the destination. */
+    private int destinationStart;
+
+    /** A look without effects, at full text opacity. Frees those that were never closed and are gone. */
     public VorelEffect() {
-        painter = nativeCreate();
+        Painter.freeForgotten();
+        painter = new Painter(this);
     }
 
-    /** Frees the look; a run that is open is dropped. Closing twice does nothing. */
+    /**
+     * Frees the look; a run that is open is dropped. Closing twice does nothing. A call of another thread
+     * that is under way is waited for; what it calls next is refused.
+     */
     @Override
     public synchronized void close() {
-        if (painter == 0) return;
-        nativeDestroy(painter);
-        painter = 0;
+        painter.free();
         destination = null;
+    }
+
+    /**
+     * The native side of an object, which is freed with it: by close, or, where that was never called, once
+     * the collector has found the object unreachable. There is neither a finaliser, which would let an
+     * object be used after its end, nor a thread: looks that are made free those that were forgotten, so
+     * that their number stays bounded wherever it could grow.
+     */
+    private static final class Painter extends PhantomReference<VorelEffect> {
+        /** Painters of unreachable objects. */
+        private static final ReferenceQueue<VorelEffect> FORGOTTEN = new ReferenceQueue<>();
+
+        /** Every painter that is not free: a reference is queued only while it is reachable itself. */
+        private static final Set<Painter> HELD =
+                Collections.newSetFromMap(new ConcurrentHashMap<Painter, Boolean>());
+
+        /** The address of the look; 0 when freed. */
+        private long look;
+
+        Painter(VorelEffect owner) {
+            super(owner, FORGOTTEN);
+            HELD.add(this);
+            look = nativeCreate();
+        }
+
+        long look() {
+            return look;
+        }
+
+        synchronized void free() {
+            if (look != 0) nativeDestroy(look);
+            look = 0;
+            clear();
+            HELD.remove(this);
+        }
+
+        static void freeForgotten() {
+            for (Object gone = FORGOTTEN.poll(); gone != null; gone = FORGOTTEN.poll()) {
+                ((Painter) gone).free();
+            }
+        }
     }
 
     // --- The look: between runs only ------------------------------------------------------------
@@ -491,18 +553,22 @@ public final class VorelEffect implements AutoCloseable {
      * @param width pixels per row of the destination, at least 1
      * @param height rows of the destination, at least 1
      * @param destination direct and writable, with width * height * 4 bytes remaining; the run uses
-     *     those from its position on and does not move the position. Kept until the run ends.
+     *     those from its position on and does not move the position. Kept until the run ends, its memory
+     *     untouched until {@link #finish}.
      */
     public synchronized void begin(int width, int height, ByteBuffer destination) {
         long open = painter();
         checkSize(width, height);
-        checkBuffer("destination", destination, (long) width * height, BYTES_PER_PIXEL);
+        int start = startOf("destination", destination, (long) width * height, BYTES_PER_PIXEL);
         if (destination.isReadOnly()) {
             throw new IllegalArgumentException("destination: read-only");
         }
+        ByteBuffer ours = destination.duplicate();
+        ours.clear();
         this.destination = null;
-        nativeBegin(open, destination, destination.position(), width, height);
-        this.destination = destination;
+        nativeBegin(open, width, height);
+        this.destination = ours;
+        destinationStart = start;
     }
 
     /**
@@ -522,13 +588,18 @@ public final class VorelEffect implements AutoCloseable {
         if (width < 0 || width > LARGEST_GLYPH || height < 0 || height > LARGEST_GLYPH) {
             throw new IllegalArgumentException("size of a glyph: " + width + " x " + height);
         }
-        checkBuffer("coverage", coverage, (long) width * height, 1);
-        nativeGlyph(run, x, y, coverage, coverage.position(), width, height);
+        int start = startOf("coverage", coverage, (long) width * height, 1);
+        nativeGlyph(run, x, y, coverage, start, width, height);
     }
 
-    /** Paints every effect of the open run into its destination and ends the run. */
+    /**
+     * Paints every effect of the open run into its destination and ends the run. Where the memory of the
+     * destination has been closed the run stays open: begin another one.
+     */
     public synchronized void finish() {
-        nativeFinish(run());
+        long run = run();
+        destination.get(destinationStart);
+        nativeFinish(run, destination, destinationStart);
         destination = null;
     }
 
@@ -538,8 +609,9 @@ public final class VorelEffect implements AutoCloseable {
     private static final float[] NO_NUMBERS = {};
 
     private long painter() {
-        if (painter == 0) throw new IllegalStateException("closed");
-        return painter;
+        long open = painter.look();
+        if (open == 0) throw new IllegalStateException("closed");
+        return open;
     }
 
     /** The painter while its look may change: an effect added within a run would miss its order. */
@@ -561,14 +633,31 @@ public final class VorelEffect implements AutoCloseable {
         }
     }
 
-    private static void checkBuffer(String name, ByteBuffer buffer, long pixels, int bytesPerPixel) {
+    /**
+     * The position of a buffer that has enough bytes from there on. Another thread may move position and
+     * limit meanwhile: each is read once, and what is used lies between the two that were read.
+     */
+    private static int startOf(String name, ByteBuffer buffer, long pixels, int bytesPerPixel) {
         if (buffer == null) throw new IllegalArgumentException(name + ": null");
         if (!buffer.isDirect()) throw new IllegalArgumentException(name + ": not direct");
+        int start = buffer.position();
+        int remaining = buffer.limit() - start;
         // Compared in pixels: the byte count of the largest sizes does not fit in a long.
-        if (buffer.remaining() / bytesPerPixel < pixels) {
+        if (remaining / bytesPerPixel < pixels) {
             throw new IllegalArgumentException(
-                    name + ": " + buffer.remaining() + " bytes remaining, too few for " + pixels
+                    name + ": " + remaining + " bytes remaining, too few for " + pixels
                             + " pixels of " + bytesPerPixel);
+        }
+        if (pixels > 0) touch(name, buffer, start);
+        return start;
+    }
+
+    /** Reads a byte: where the memory was closed that fails here, and not on the native side. */
+    private static void touch(String name, ByteBuffer buffer, int index) {
+        try {
+            buffer.get(index);
+        } catch (IndexOutOfBoundsException e) {
+            throw new IllegalArgumentException(name + ": its limit was moved during the call");
         }
     }
 
@@ -590,17 +679,19 @@ public final class VorelEffect implements AutoCloseable {
 
     // --- Native side: every argument has been checked ---------------------------------------------
 
+    // Those of an object are not static: as an argument of the call it stays reachable until that returns.
+
     private static native long nativeCreate();
 
     private static native void nativeDestroy(long painter);
 
-    private static native int nativeAddOuterShadow(
+    private native int nativeAddOuterShadow(
             long painter, float angle, float distance, float size, int color, float opacity);
 
-    private static native int nativeAddInnerShadow(
+    private native int nativeAddInnerShadow(
             long painter, float angle, float distance, float size, int color, float opacity);
 
-    private static native int nativeAddOuterGlow(
+    private native int nativeAddOuterGlow(
             long painter,
             float size,
             int color,
@@ -609,7 +700,7 @@ public final class VorelEffect implements AutoCloseable {
             float[] opacities,
             float[] locations);
 
-    private static native int nativeAddInnerGlow(
+    private native int nativeAddInnerGlow(
             long painter,
             float size,
             int color,
@@ -618,7 +709,7 @@ public final class VorelEffect implements AutoCloseable {
             float[] opacities,
             float[] locations);
 
-    private static native int nativeAddBevel(
+    private native int nativeAddBevel(
             long painter,
             int style,
             float size,
@@ -634,7 +725,7 @@ public final class VorelEffect implements AutoCloseable {
             int shadowColor,
             float shadowOpacity);
 
-    private static native int nativeAddEmboss(
+    private native int nativeAddEmboss(
             long painter,
             int style,
             float size,
@@ -650,7 +741,7 @@ public final class VorelEffect implements AutoCloseable {
             int shadowColor,
             float shadowOpacity);
 
-    private static native int nativeAddLinearGradient(
+    private native int nativeAddLinearGradient(
             long painter,
             float angle,
             float scale,
@@ -659,7 +750,7 @@ public final class VorelEffect implements AutoCloseable {
             float[] opacities,
             float[] locations);
 
-    private static native int nativeAddRadialGradient(
+    private native int nativeAddRadialGradient(
             long painter,
             float scale,
             float opacity,
@@ -667,39 +758,38 @@ public final class VorelEffect implements AutoCloseable {
             float[] opacities,
             float[] locations);
 
-    private static native int nativeAddStroke(
+    private native int nativeAddStroke(
             long painter, float size, int color, float opacity, int strokeStyle, int position);
 
-    private static native int nativeAddPattern(
+    private native int nativeAddPattern(
             long painter, int[] pixels, int width, int height, float scale, float opacity);
 
-    private static native int nativeAddText(long painter, int color, float opacity);
+    private native int nativeAddText(long painter, int color, float opacity);
 
-    private static native boolean nativeRemoveEffect(long painter, int id);
+    private native boolean nativeRemoveEffect(long painter, int id);
 
-    private static native void nativeCleanAllEffect(long painter);
+    private native void nativeCleanAllEffect(long painter);
 
-    private static native void nativeSetTextOpacity(long painter, float opacity);
+    private native void nativeSetTextOpacity(long painter, float opacity);
 
-    private static native float nativeGetTextOpacity(long painter);
+    private native float nativeGetTextOpacity(long painter);
 
-    private static native int nativeGetLeftOffset(long painter);
+    private native int nativeGetLeftOffset(long painter);
 
-    private static native int nativeGetRightOffset(long painter);
+    private native int nativeGetRightOffset(long painter);
 
-    private static native int nativeGetTopOffset(long painter);
+    private native int nativeGetTopOffset(long painter);
 
-    private static native int nativeGetBottomOffset(long painter);
+    private native int nativeGetBottomOffset(long painter);
 
-    private static native byte[] nativeGetMapKey(long painter);
+    private native byte[] nativeGetMapKey(long painter);
 
-    private static native byte[] nativeGetMapKeyOfColor(long painter, int color);
+    private native byte[] nativeGetMapKeyOfColor(long painter, int color);
 
-    private static native void nativeBegin(
-            long painter, ByteBuffer destination, int offset, int width, int height);
+    private native void nativeBegin(long painter, int width, int height);
 
-    private static native void nativeGlyph(
+    private native void nativeGlyph(
             long painter, int x, int y, ByteBuffer coverage, int offset, int width, int height);
 
-    private static native void nativeFinish(long painter);
+    private native void nativeFinish(long painter, ByteBuffer destination, int offset);
 }
