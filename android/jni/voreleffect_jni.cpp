@@ -11,21 +11,6 @@
 // The native side of org.voreleffect.VorelEffect, which checks every argument before it comes here. The
 // generated header declares each function below, so that the compiler refuses one that does not fit.
 
-namespace VFontEffect {
-
-/// What the public face does not tell of a run: whether its outer layer is there.
-struct RunLayers {
-    static bool areThere(const VFEffect& look) {
-        const bool layered = look.mUseOuterLayer == 1;
-        return hasPixels(look.mSrcBitmap) && (!layered || hasPixels(look.mOuterLayer));
-    }
-
-  private:
-    static bool hasPixels(const VFBitmap* layer) { return layer != nullptr && layer->mData != nullptr; }
-};
-
-}  // namespace VFontEffect
-
 using namespace VFontEffect;
 
 namespace {
@@ -54,6 +39,24 @@ void throwNew(JNIEnv* env, const char* className, const char* what) {
 
 void throwOutOfMemory(JNIEnv* env, const char* what) {
     throwNew(env, "java/lang/OutOfMemoryError", what);
+}
+
+/// What `call` gives. It adds an effect, and throws when the list of effects cannot grow: the exception
+/// of a library with a C++ runtime of its own, perhaps, so its type is not asked.
+template <class Call>
+auto orOutOfMemory(JNIEnv* env, Call call) -> decltype(call()) {
+    try {
+        return call();
+    } catch (...) {
+        throwOutOfMemory(env, "list of effects");
+        return {};
+    }
+}
+
+/// The id that the add-call gives.
+template <class AddCall>
+jint added(JNIEnv* env, AddCall addCall) {
+    return idOf(orOutOfMemory(env, addCall));
 }
 
 /// The bytes of a direct buffer from `offset` on, of which `count` are used. Where the buffer has not so
@@ -135,67 +138,85 @@ VOREL_NATIVE(void, nativeDestroy)(JNIEnv*, jclass, jlong painter) {
 // returned, so that the painter is not freed under it.
 
 VOREL_NATIVE(jint, nativeAddOuterShadow)
-(JNIEnv*, jobject, jlong painter, jfloat angle, jfloat distance, jfloat size, jint color,
+(JNIEnv* env, jobject, jlong painter, jfloat angle, jfloat distance, jfloat size, jint color,
  jfloat opacity) {
-    return idOf(lookOf(painter).addOuterShadowText(angle, distance, size, wordOf(color), opacity));
+    return added(env, [&] {
+        return lookOf(painter).addOuterShadowText(angle, distance, size, wordOf(color), opacity);
+    });
 }
 
 VOREL_NATIVE(jint, nativeAddInnerShadow)
-(JNIEnv*, jobject, jlong painter, jfloat angle, jfloat distance, jfloat size, jint color,
+(JNIEnv* env, jobject, jlong painter, jfloat angle, jfloat distance, jfloat size, jint color,
  jfloat opacity) {
-    return idOf(lookOf(painter).addInnerShadowText(angle, distance, size, wordOf(color), opacity));
+    return added(env, [&] {
+        return lookOf(painter).addInnerShadowText(angle, distance, size, wordOf(color), opacity);
+    });
 }
 
 VOREL_NATIVE(jint, nativeAddOuterGlow)
 (JNIEnv* env, jobject, jlong painter, jfloat size, jint color, jfloat opacity, jintArray colors,
  jfloatArray opacities, jfloatArray locations) {
     Stops ramp(env, colors, opacities, locations);
-    return idOf(lookOf(painter).addOuterGlowText(size, wordOf(color), opacity, ramp.count, ramp.stops));
+    return added(env, [&] {
+        return lookOf(painter).addOuterGlowText(size, wordOf(color), opacity, ramp.count, ramp.stops);
+    });
 }
 
 VOREL_NATIVE(jint, nativeAddInnerGlow)
 (JNIEnv* env, jobject, jlong painter, jfloat size, jint color, jfloat opacity, jintArray colors,
  jfloatArray opacities, jfloatArray locations) {
     Stops ramp(env, colors, opacities, locations);
-    return idOf(lookOf(painter).addInnerGlowText(size, wordOf(color), opacity, ramp.count, ramp.stops));
+    return added(env, [&] {
+        return lookOf(painter).addInnerGlowText(size, wordOf(color), opacity, ramp.count, ramp.stops);
+    });
 }
 
 VOREL_NATIVE(jint, nativeAddBevel)
-(JNIEnv*, jobject, jlong painter, jint style, jfloat size, jfloat depth, jint technique, jint direction,
- jint soften, jfloat opacity, jfloat angle, jfloat altitude, jint highlightColor,
+(JNIEnv* env, jobject, jlong painter, jint style, jfloat size, jfloat depth, jint technique,
+ jint direction, jint soften, jfloat opacity, jfloat angle, jfloat altitude, jint highlightColor,
  jfloat highlightOpacity, jint shadowColor, jfloat shadowOpacity) {
-    return idOf(lookOf(painter).addBevelText(style, size, depth, technique, direction, soften, opacity,
-                                             angle, altitude, wordOf(highlightColor), highlightOpacity,
-                                             wordOf(shadowColor), shadowOpacity));
+    return added(env, [&] {
+        return lookOf(painter).addBevelText(style, size, depth, technique, direction, soften, opacity,
+                                            angle, altitude, wordOf(highlightColor), highlightOpacity,
+                                            wordOf(shadowColor), shadowOpacity);
+    });
 }
 
 VOREL_NATIVE(jint, nativeAddEmboss)
-(JNIEnv*, jobject, jlong painter, jint style, jfloat size, jfloat depth, jint technique, jint direction,
- jint soften, jfloat opacity, jfloat angle, jfloat altitude, jint highlightColor,
+(JNIEnv* env, jobject, jlong painter, jint style, jfloat size, jfloat depth, jint technique,
+ jint direction, jint soften, jfloat opacity, jfloat angle, jfloat altitude, jint highlightColor,
  jfloat highlightOpacity, jint shadowColor, jfloat shadowOpacity) {
-    return idOf(lookOf(painter).addEmbossText(style, size, depth, technique, direction, soften, opacity,
-                                              angle, altitude, wordOf(highlightColor), highlightOpacity,
-                                              wordOf(shadowColor), shadowOpacity));
+    return added(env, [&] {
+        return lookOf(painter).addEmbossText(style, size, depth, technique, direction, soften, opacity,
+                                             angle, altitude, wordOf(highlightColor), highlightOpacity,
+                                             wordOf(shadowColor), shadowOpacity);
+    });
 }
 
 VOREL_NATIVE(jint, nativeAddLinearGradient)
 (JNIEnv* env, jobject, jlong painter, jfloat angle, jfloat scale, jfloat opacity, jintArray colors,
  jfloatArray opacities, jfloatArray locations) {
     Stops ramp(env, colors, opacities, locations);
-    return idOf(lookOf(painter).addLinearGradientText(angle, scale, opacity, ramp.count, ramp.stops));
+    return added(env, [&] {
+        return lookOf(painter).addLinearGradientText(angle, scale, opacity, ramp.count, ramp.stops);
+    });
 }
 
 VOREL_NATIVE(jint, nativeAddRadialGradient)
 (JNIEnv* env, jobject, jlong painter, jfloat scale, jfloat opacity, jintArray colors,
  jfloatArray opacities, jfloatArray locations) {
     Stops ramp(env, colors, opacities, locations);
-    return idOf(lookOf(painter).addRadialGradientText(scale, opacity, ramp.count, ramp.stops));
+    return added(env, [&] {
+        return lookOf(painter).addRadialGradientText(scale, opacity, ramp.count, ramp.stops);
+    });
 }
 
 VOREL_NATIVE(jint, nativeAddStroke)
-(JNIEnv*, jobject, jlong painter, jfloat size, jint color, jfloat opacity, jint strokeStyle,
+(JNIEnv* env, jobject, jlong painter, jfloat size, jint color, jfloat opacity, jint strokeStyle,
  jint position) {
-    return idOf(lookOf(painter).addStrokeText(size, wordOf(color), opacity, strokeStyle, position));
+    return added(env, [&] {
+        return lookOf(painter).addStrokeText(size, wordOf(color), opacity, strokeStyle, position);
+    });
 }
 
 VOREL_NATIVE(jint, nativeAddPattern)
@@ -208,11 +229,11 @@ VOREL_NATIVE(jint, nativeAddPattern)
     }
     env->GetIntArrayRegion(pixels, 0, width * height, reinterpret_cast<jint*>(pattern.mData));
     spellOut(pattern.mData, static_cast<size_t>(width) * static_cast<size_t>(height));
-    return idOf(lookOf(painter).addPatternText(&pattern, scale, opacity));
+    return added(env, [&] { return lookOf(painter).addPatternText(&pattern, scale, opacity); });
 }
 
-VOREL_NATIVE(jint, nativeAddText)(JNIEnv*, jobject, jlong painter, jint color, jfloat opacity) {
-    return idOf(lookOf(painter).addText(wordOf(color), opacity));
+VOREL_NATIVE(jint, nativeAddText)(JNIEnv* env, jobject, jlong painter, jint color, jfloat opacity) {
+    return added(env, [&] { return lookOf(painter).addText(wordOf(color), opacity); });
 }
 
 VOREL_NATIVE(jboolean, nativeRemoveEffect)(JNIEnv*, jobject, jlong painter, jint id) {
@@ -252,14 +273,16 @@ VOREL_NATIVE(jbyteArray, nativeGetMapKey)(JNIEnv* env, jobject, jlong painter) {
 }
 
 VOREL_NATIVE(jbyteArray, nativeGetMapKeyOfColor)(JNIEnv* env, jobject, jlong painter, jint color) {
-    return keyArray(env, lookOf(painter).getMapKey(wordOf(color)));
+    char* const key = orOutOfMemory(env, [&] { return lookOf(painter).getMapKey(wordOf(color)); });
+    return env->ExceptionCheck() ? nullptr : keyArray(env, key);
 }
 
 VOREL_NATIVE(void, nativeBegin)(JNIEnv* env, jobject, jlong painter, jint width, jint height) {
     VFEffect& look = lookOf(painter);
     dropRun(look);
     look.initEffect(width, height);
-    if (!RunLayers::areThere(look)) {
+    const VFBitmap* const mask = look.getSrcBitmap();
+    if (mask == nullptr || mask->mData == nullptr) {
         dropRun(look);
         throwOutOfMemory(env, "layers");
     }

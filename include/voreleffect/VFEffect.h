@@ -199,8 +199,6 @@ class VF_API VFEffect {
     /// @}
 
   private:
-    friend struct RunLayers;  // for a binding, which reports what got no memory
-
     std::vector<VFECore*> mEffects;
     VFBitmap* mSrcBitmap = nullptr;
     VFBitmap* mDstBitmap = nullptr;

@@ -18,8 +18,10 @@ for name in c m log jnigraphics; do
     "${compile[@]}" -shared -nostdlib -fuse-ld=lld -Wl,-soname,"lib$name.so" "$sources/$name.c" \
         -o "$stubs/lib$name.so"
 done
-"${compile[@]}" -c "$sources/cxx_static.c" -o "$stubs/cxx_static.o"
-llvm-ar-14 crs "$stubs/libc++_static.a" "$stubs/cxx_static.o"
+for name in cxx_static cxx_catch; do
+    "${compile[@]}" -c "$sources/$name.c" -o "$stubs/$name.o"
+done
+llvm-ar-14 crs "$stubs/libc++_static.a" "$stubs"/cxx_{static,catch}.o
 
 VOREL_STUBS=$stubs cmake -S tests/android/shape -B "$build" -G Ninja \
     -DCMAKE_BUILD_TYPE=Release -DCMAKE_TOOLCHAIN_FILE="$PWD/tests/android/shape/toolchain.cmake" > /dev/null

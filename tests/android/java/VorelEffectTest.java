@@ -425,6 +425,26 @@ public final class VorelEffectTest {
         }
     }
 
+    /** refusing_calloc.cpp refuses the next list of nine effects after a pattern of 1009 pixels. */
+    void testListOfEffectsThatCannotGrowIsReported() {
+        for (boolean withKey : new boolean[] {false, true}) {
+            try (VorelEffect look = new VorelEffect()) {
+                describeEverything(look);
+                look.addRadialGradientText(1, 1, COLORS, OPACITIES, LOCATIONS);
+                look.addPatternText(new int[1009], 1009, 1, 1, 1);
+                byte[] key = look.getMapKey();
+                expect(
+                        OutOfMemoryError.class,
+                        () -> {
+                            if (withKey) look.getMapKey(TEXT_COLOR);
+                            else look.addText(TEXT_COLOR, 1);
+                        });
+                check(Arrays.equals(key, look.getMapKey()), "the key has changed");
+                check(look.addText(TEXT_COLOR, 1) >= 0, "not added the second time");
+            }
+        }
+    }
+
     void testRunWithoutAnOuterLayerNeedsNoMemoryForIt() {
         ByteBuffer picture = ByteBuffer.allocateDirect(197 * 223 * 4);
         try (VorelEffect look = everything()) {
