@@ -2,7 +2,6 @@
 #include <sys/wait.h>
 
 #include <algorithm>
-#include <chrono>
 #include <csignal>
 #include <filesystem>
 #include <string>
@@ -154,48 +153,11 @@ TEST_F(BatchProgram, NarrowTerminal_KeepsTheBarOnItsLine) {
     EXPECT_EQ(runVorelpaintOnTerminal({"--batch", jobs}, 20).err, "[------------------\r\x1B[K");
 }
 
-/// Whether a picture is being written in `dir`.
-bool hasUnfinishedFile(const TempDir& dir) {
-    const Words names = dir.list();
-    return std::any_of(names.begin(), names.end(),
-                       [](const std::string& name) { return name.rfind(".vorelpaint.", 0) == 0; });
-}
-
-class InterruptedBatch : public BatchProgram, public ::testing::WithParamInterface<int> {};
-
-TEST_P(InterruptedBatch, LeavesOnlyWholePictures) {
-    std::string lines;
-    for (int i = 0; i < 500; ++i) {
-        lines += job(std::to_string(i) + ".png",
-                     R"("text": "Grains of dust", "preset": "chalk", "size": 300)");
-    }
-    RunningVorelpaint batch({"--batch", mInputs.write("jobs.jsonl", lines)});
-    using Clock = std::chrono::steady_clock;
-    const Clock::time_point end = Clock::now() + std::chrono::seconds(60);
-    while ((mDir.list().size() < 2 || !hasUnfinishedFile(mDir)) && Clock::now() < end)
-        std::this_thread::yield();
-    ASSERT_TRUE(hasUnfinishedFile(mDir)) << "no picture was on its way";
-    batch.send(GetParam());
-    const int status = batch.wait();
-    ASSERT_TRUE(WIFSIGNALED(status));
-    EXPECT_EQ(WTERMSIG(status), GetParam());
-
-    const Words pictures = mDir.list();
-    EXPECT_LT(pictures.size(), 500U);
-    ASSERT_GE(pictures.size(), 1U);
-    for (const std::string& name : pictures) {
-        EXPECT_EQ(std::filesystem::path(name).extension(), ".png") << name;
-        EXPECT_NO_THROW(readPng(mDir.file(name))) << name;
-    }
-}
-
-INSTANTIATE_TEST_SUITE_P(Signals, InterruptedBatch, ::testing::Values(SIGINT, SIGTERM, SIGHUP));
-
 TEST_F(BatchProgram, IgnoredSignal_StaysIgnored) {
     std::string lines;
     for (int i = 0; i < 20; ++i)
         lines += job(std::to_string(i) + ".png", R"("text": "Dust", "preset": "chalk", "size": 200)");
-    RunningVorelpaint batch({"--batch", mInputs.write("jobs.jsonl", lines)}, SIGHUP);
+    RunningVorelpaint batch({"--batch", mInputs.write("jobs.jsonl", lines)}, {SIGHUP});
     while (mDir.list().empty())
         std::this_thread::yield();
     batch.send(SIGHUP);

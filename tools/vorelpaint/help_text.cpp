@@ -51,7 +51,13 @@ const std::vector<Note>& notes() {
         {"Text", "Text that begins with - stands behind --."},
         {"Exit codes",
          "0 done. 2 failed, with one line on standard error; after a batch, with one for each job that "
-         "failed and their count. Whatever ends the program, no half-written picture is left."}};
+         "failed and their count. A reader that went away is a failure of writing like any other."},
+        {"Interruption",
+         "A picture takes its name when it is whole: whatever signal ends the program, no half-written "
+         "one is left and an older one stays. Only SIGKILL and a loss of power can leave something: on "
+         "a file system without unnamed files (O_TMPFILE), such as NFS or FAT, the begun picture as "
+         ".vorelpaint.XXXXXX in its directory; on others, in the instant in which an older picture is "
+         "replaced, the whole new one under such a name."}};
     return all;
 }
 

@@ -2,9 +2,6 @@
 
 #include <sys/stat.h>
 
-#include <cerrno>
-#include <cstring>
-
 #include "error.h"
 
 namespace vorelpaint {
@@ -20,9 +17,9 @@ bool isBlank(int c) {
 }  // namespace
 
 LineReader::LineReader(const std::string& path)
-    : mName(path == "-" ? "standard input" : "'" + path + "'"),
+    : mName(path == "-" ? "standard input" : inQuotes(path)),
       mFile(path == "-" ? stdin : std::fopen(path.c_str(), "rb")) {
-    if (mFile == nullptr) throw ToolError("cannot read " + mName + ": " + std::strerror(errno));
+    if (mFile == nullptr) failWithErrno("cannot read " + mName);
 }
 
 LineReader::~LineReader() {
@@ -42,7 +39,7 @@ std::optional<std::string> LineReader::next(size_t maxBytes) {
                             std::to_string(kLongestLine) + " bytes");
         }
     }
-    if (std::ferror(mFile) != 0) throw ToolError("cannot read " + mName + ": " + std::strerror(errno));
+    if (std::ferror(mFile) != 0) failWithErrno("cannot read " + mName);
     return line;
 }
 
@@ -61,9 +58,7 @@ size_t LineReader::countAhead() {
         }
     }
     std::clearerr(mFile);
-    if (std::fseek(mFile, here, SEEK_SET) != 0) {
-        throw ToolError("cannot read " + mName + ": " + std::strerror(errno));
-    }
+    if (std::fseek(mFile, here, SEEK_SET) != 0) failWithErrno("cannot read " + mName);
     return count;
 }
 

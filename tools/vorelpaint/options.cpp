@@ -5,6 +5,7 @@
 #include <memory>
 #include <utility>
 
+#include "console.h"
 #include "error.h"
 #include "help_text.h"
 #include "settings.h"
@@ -112,8 +113,8 @@ std::optional<Options> parseOptions(int argc, const char* const* argv) {
         app.get_option(one)->excludes(app.get_option(other));
     try {
         app.parse(argc, argv);
-    } catch (const CLI::Success& answer) {
-        app.exit(answer);
+    } catch (const CLI::Success&) {
+        print(app.help());
         return std::nullopt;
     } catch (const CLI::ParseError& error) {
         throw ToolError(error.what());

@@ -2,6 +2,8 @@
 
 #include <png.h>
 
+#include <cerrno>
+#include <cstring>
 #include <memory>
 #include <string>
 
@@ -57,9 +59,11 @@ void writePng(std::FILE* file, const Image& image) {
     png->width = static_cast<png_uint_32>(image.width);
     png->height = static_cast<png_uint_32>(image.height);
     png->format = PNG_FORMAT_RGBA;
-    if (png_image_write_to_stdio(png.get(), file, 0, image.pixels.data(), 0, nullptr) == 0) {
-        throw ToolError(png->message);
-    }
+    const bool written =
+        png_image_write_to_stdio(png.get(), file, 0, image.pixels.data(), 0, nullptr) != 0;
+    // The system's reason tells more than libpng's "Write Error".
+    if (std::ferror(file) != 0) throw ToolError(std::strerror(errno));
+    if (!written) throw ToolError(png->message);
 }
 
 }  // namespace vorelpaint
