@@ -243,6 +243,19 @@ TEST_F(Program, TextWithoutInk_IsRefused) {
     expectFailure({"--text-file", "/dev/null"}, "no visible character");
 }
 
+TEST_F(Program, ControlCharacters_AreRefusedWithTheirPlace) {
+    const std::string fault = "the text has the control character U+001B in line 2, character 3";
+    expectFailure({"A\nbc\x1B[0m"}, fault);
+    expectFailure({"--sheet", "A\nbc\x1B[0m"}, fault);
+    expectFailure({"--text-file", mDir.write("t", "A\r\nbc\x1B")}, fault);
+}
+
+TEST_F(Program, CarriageReturns_EndLines) {
+    const std::vector<uint8_t> expected = paint({"--text-file", mDir.write("t", "one\ntwo\n")}).pixels;
+    EXPECT_EQ(paint({"--text-file", mDir.write("t", "one\rtwo\r")}).pixels, expected);
+    EXPECT_EQ(paint({"--text-file", mDir.write("t", "one\r\ntwo\r\n")}).pixels, expected);
+}
+
 TEST_F(Program, InvalidUtf8_IsRefusedWithItsPlace) {
     expectFailure({"ab\xFF"}, "not valid UTF-8 at byte 3");
     expectFailure({"--text-file", mDir.write("t", "\xC3")}, "not valid UTF-8 at byte 1");
@@ -279,6 +292,8 @@ TEST_F(Program, Styles_ThatCannotBeReadAreNamed) {
 
 TEST_F(Program, ControlCharactersInANameStayOnTheOneLine) {
     expectFailure({"--style", "a\nb\x1B[2J", "A"}, "cannot read 'a b [2J'");
+    expectFailure({"--style", "a\xC2\x9B\x32J", "A"}, "cannot read 'a<U+009B>2J'");
+    expectFailure({"--style", "a\xE2\x80\xAEgpj\xFF", "A"}, "cannot read 'a<U+202E>gpj<FF>'");
 }
 
 TEST_F(Program, TooLargePictures_AreRefused) {

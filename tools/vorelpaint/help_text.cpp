@@ -48,7 +48,11 @@ const std::vector<Note>& notes() {
              "a "
              "job does not say, it takes from the command line. Paths start at the working directory. A "
              "line that fails is reported with its number, and the next one goes on."},
-        {"Text", "Text that begins with - stands behind --."},
+        {"Text",
+         "Text is UTF-8; text that begins with - stands behind --. A line ends with LF, CR, CR LF, or "
+         "one "
+         "of U+0085, U+2028 and U+2029; a tab is painted as a blank. Any other control character is "
+         "refused, with its place."},
         {"Exit codes",
          "0 done. 2 failed, with one line on standard error; after a batch, with one for each job that "
          "failed and their count. A reader that went away is a failure of writing like any other."},
