@@ -267,6 +267,7 @@ TEST_F(Program, Fonts_ThatCannotBeUsedAreNamed) {
     const std::string noFont = mDir.write("font.ttf", "not a font");
     expectFailure({"--font", noFont, "A"}, "'" + noFont + "' is no font");
     expectFailure({"--font", "", "A"}, "no font file or family ''");
+    expectFailure({"--font", "DejaVu Sans:blod", "A"}, "font 'DejaVu Sans:blod': 'blod' is no style");
 }
 
 TEST_F(Program, FontsWithoutAConfiguration_AreNoReasonForASecondLine) {

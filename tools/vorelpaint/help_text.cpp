@@ -42,6 +42,12 @@ const std::vector<Note>& notes() {
          "innerGlow, linearGradient, radialGradient, stroke, pattern, text, bevel, emboss); the last "
          "lies "
          "on top. The presets are style files to start from; docs/style-files.md lists every key."},
+        {"Fonts",
+         "A font is a file, or a family that fontconfig knows, with styles and properties behind "
+         "colons: "
+         "'DejaVu Sans:bold:italic', 'DejaVu Sans:weight=200'. A style that is misspelt, or that no "
+         "face "
+         "of the family has, is refused; italic and oblique stand for each other."},
         {"Batches",
          "Each line of a batch is a JSON object with the keys of one picture: " + jobKeys() +
              ". They mean what the options of these names mean; style may also be a style itself. What "
