@@ -317,6 +317,18 @@ TEST_F(Program, OutputThatCannotBeWritten_IsNamed) {
     EXPECT_EQ(runVorelpaintInto("/dev/full", {"--print-key"}).exitCode, 2);
 }
 
+TEST_F(Program, OutputNamedLikeAnotherKindOfFile_IsRefused) {
+    const std::string refusal =
+        "is named like another kind of file; only PNG is written: end it with .png";
+    for (const char* name : {"a.jpg", "a.JPG", "look.json"}) {
+        const std::string path = mDir.file(name);
+        expectFailure({"-o", path, "A"}, "--output: '" + path + "' " + refusal);
+        expectFailure({"--sheet", "-o", path, "A"}, "--output: '" + path + "' " + refusal);
+    }
+    for (const char* name : {"a.PNG", "tmp.aBcD12", "plain"})
+        EXPECT_EQ(runVorelpaint({"-o", mDir.file(name), "A"}).exitCode, 0) << name;
+}
+
 TEST_F(Program, FailureKeepsTheOlderPicture) {
     const std::string path = mDir.write("old.png", "older picture");
     expectFailure({"-o", path, "--font", "No Such Family", "A"}, "No Such Family");

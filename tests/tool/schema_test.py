@@ -42,7 +42,8 @@ def reader_faults(styles):
     The styles are the jobs of one batch. Its text has no ink, so that every job fails: those whose style
     was taken only afterwards.
     """
-    jobs = ({"text": " ", "output": "never.png", "style": style} for style in styles)
+    jobs = ({"text": " ", "output": f"never{number}.png", "style": style}
+            for number, style in enumerate(styles))
     run = run_program(["--batch", "-"], "".join(json.dumps(job) + "\n" for job in jobs))
     faults = {}
     for line, fault in re.findall(r"line (\d+): (?!warning: )(.*)", run.stderr):

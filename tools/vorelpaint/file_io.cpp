@@ -1,6 +1,5 @@
 #include "file_io.h"
 
-#include <filesystem>
 #include <memory>
 
 #include "error.h"
@@ -31,7 +30,8 @@ void fill(std::FILE* file, const std::string& name, const std::function<void(std
     if (std::fflush(file) != 0 || std::ferror(file) != 0) failWithErrno("cannot write " + name);
 }
 
-/// Where a path leads: the target of a symbolic link is made or replaced, not the link.
+}  // namespace
+
 fs::path followLinks(fs::path path) {
     std::error_code error;
     for (int links = 0; fs::is_symlink(fs::symlink_status(path, error)); ++links) {
@@ -43,8 +43,6 @@ fs::path followLinks(fs::path path) {
     }
     return path;
 }
-
-}  // namespace
 
 std::string readFile(const std::string& path, size_t maxBytes) {
     const bool standard = path == "-";

@@ -53,7 +53,8 @@ const std::vector<Note>& notes() {
              ". They mean what the options of these names mean; style may also be a style itself. What "
              "a "
              "job does not say, it takes from the command line. Paths start at the working directory. A "
-             "line that fails is reported with its number, and the next one goes on."},
+             "line that fails is reported with its number, and the next one goes on. When two jobs have "
+             "one output, nothing is painted."},
         {"Text",
          "Text is UTF-8; text that begins with - stands behind --. A line ends with LF, CR, CR LF, or "
          "one "

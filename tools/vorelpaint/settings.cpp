@@ -9,6 +9,7 @@
 #include <type_traits>
 
 #include "error.h"
+#include "output_name.h"
 
 namespace vorelpaint {
 namespace {
@@ -72,6 +73,11 @@ std::optional<std::string> parseShell(const std::string& text) {
     return std::nullopt;
 }
 
+std::optional<std::string> parseOutput(const std::string& text) {
+    if (namesOtherKind(text)) return std::nullopt;
+    return text;
+}
+
 /// An option that paints a picture, of a job as well as of the command line.
 Setting pictureOption(const char* name, const char* value, const char* initial, const char* group,
                       const char* description, Read read, Setting::Kind kind = Setting::Kind::text) {
@@ -127,7 +133,8 @@ std::vector<Setting> outputSettings() {
     constexpr const char* kGroup = "Picture";
     Setting output =
         pictureOption("output", "FILE", "", kGroup, "The PNG file to write, - for standard output",
-                      text(&Options::output));
+                      parsed(parseOutput, &Options::output,
+                             "named like another kind of file; only PNG is written: end it with .png"));
     output.letter = "o";
     return {output,
             pictureOption("background", "transparent|checkerboard|#RRGGBB", "transparent", kGroup,
