@@ -9,7 +9,9 @@ findings=$(mandoc -T lint -W style "$page" | grep -v 'WARNING: missing date' || 
 [[ -z $findings ]] || { printf '%s\n' "$findings" >&2; exit 1; }
 
 text=$(mandoc -T ascii -O width=100 "$page" | col -b)
-options=$("$program" --help | sed -n '/^Examples:/q; s/^ *\(-., *\)\?\(-.,\)\?\(--[a-z-]*\).*/\3/p')
+# Kept whole before it is searched: a search that ends early would break the program's pipe.
+help=$("$program" --help)
+options=$(sed -n '/^Examples:/q; s/^ *\(-., *\)\?\(-.,\)\?\(--[a-z-]*\).*/\3/p' <<< "$help")
 [[ $(wc -l <<< "$options") -ge 20 ]]
 for option in $options; do
     grep -q -- "^  *\(-[a-z], \)\?$option\( \|$\)" <<< "$text" || { echo "no $option in the page" >&2; exit 1; }
