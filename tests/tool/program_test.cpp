@@ -288,6 +288,7 @@ TEST_F(Program, Styles_ThatCannotBeReadAreNamed) {
     const std::string style = writeStyle("{\n\"stroke\": {\"size\": 200}\n}");
     expectFailure({"--style", style, "A"}, style + "': stroke.size: 200 is out of range, 0 to 100");
     expectFailure({"--preset", "none", "A"}, "no preset 'none'; there are");
+    expectFailure({"--preset", "glod", "A"}, "no preset 'glod'; did you mean gold? There are aurora, ");
     expectFailure({"--preset", "../presets/gold", "A"}, "no preset");
 }
 

@@ -106,7 +106,7 @@ def variants(schema):
     """Values around the limits of a member, and of every other type."""
     schema = resolved(schema)
     yield from (None, True, 0, 0.5, 1.5, 2.0, -1, 1e9, "", "x", "a\0b", "#12345", "#1234567", "#12345G",
-                "#aBcDeF", [], {}, [[]], STOPS, STOPS[:1] * 256, STOPS[:1] * 257, [{}])
+                "#aBcDeF", "#aB9", "#12", "#1234", "#12G", [], {}, [[]], STOPS, STOPS[:1] * 256, STOPS[:1] * 257, [{}])
     for limit in (schema.get("minimum"), schema.get("maximum")):
         if limit is not None:
             yield from (limit, limit - 1, limit + 1, limit - 0.001, limit + 0.001)

@@ -11,6 +11,7 @@
 #include "output_name.h"
 #include "painting.h"
 #include "progress.h"
+#include "ranges.h"
 #include "settings.h"
 #include "style/vorelstyle.h"
 
@@ -22,9 +23,6 @@ using vorelstyle::JsonObject;
 using vorelstyle::JsonValue;
 using vorelstyle::Style;
 using vorelstyle::StyleError;
-
-/// Room for the largest text and the largest style.
-constexpr size_t kMaxJobBytes = size_t{1} << 18;
 
 bool isBlank(const std::string& line) {
     return line.find_first_not_of(" \t\r") == std::string::npos;

@@ -1,11 +1,15 @@
 #include "help_text.h"
 
+#include "ranges.h"
 #include "settings.h"
 #include "style/vorelstyle.h"
+#include "text/voreltext.h"
 #include "wrap.h"
 
 namespace vorelpaint {
 namespace {
+
+using voreltext::TextLayout;
 
 constexpr size_t kHelpWidth = 100;
 
@@ -60,6 +64,13 @@ const std::vector<Note>& notes() {
          "one "
          "of U+0085, U+2028 and U+2029; a tab is painted as a blank. Any other control character is "
          "refused, with its place."},
+        {"Limits", "A picture has at most " + std::to_string(TextLayout::kMaxSide) +
+                       " pixels on a side and " + std::to_string(voreltext::kMaxPixels) +
+                       " in all; a pattern's picture has at most " + std::to_string(kMaxPatternSide) +
+                       " pixels on a side. A text has at most " + std::to_string(kMaxTextBytes) +
+                       " bytes, a style file " + std::to_string(kMaxStyleBytes) +
+                       " and a line of a batch " + std::to_string(kMaxJobBytes) + "."},
+        {"Colours", "#RGB is short for #RRGGBB with twice the same digits: #F80 is #FF8800."},
         {"Exit codes",
          "0 done. 2 failed, with one line on standard error; after a batch, with one for each job that "
          "failed and their count. A reader that went away is a failure of writing like any other."},

@@ -8,13 +8,12 @@
 #include <string>
 
 #include "error.h"
+#include "ranges.h"
 
 namespace vorelpaint {
 namespace {
 
 using voreltext::Image;
-
-constexpr png_uint_32 kMaxSide = 4096;
 
 /// libpng's record of one picture; what it holds is freed with it.
 class PngRecord {
@@ -42,8 +41,9 @@ Image readPng(const std::filesystem::path& path) {
     if (png_image_begin_read_from_file(png.get(), path.c_str()) == 0) {
         throw ToolError(name + " is no readable PNG: " + png->message);
     }
-    if (png->width > kMaxSide || png->height > kMaxSide) {
-        throw ToolError(name + " has more than " + std::to_string(kMaxSide) + " pixels on a side");
+    if (png->width > kMaxPatternSide || png->height > kMaxPatternSide) {
+        throw ToolError(name + " has more than " + std::to_string(kMaxPatternSide) +
+                        " pixels on a side");
     }
     png->format = PNG_FORMAT_RGBA;
     Image image{static_cast<int>(png->width), static_cast<int>(png->height), {}};
