@@ -1,12 +1,16 @@
 #!/usr/bin/env bash
-# The manual page is well-formed and tells every option of the help: manual_test.sh VORELPAINT PAGE
+# The manual page is well-formed, bears the day of the release and tells every option of the help:
+# manual_test.sh VORELPAINT PAGE CHANGELOG
 set -euo pipefail
 program=$1
 page=$2
+changelog=$3
 
-# A page without a date is built alike every day.
-findings=$(mandoc -T lint -W style "$page" | grep -v 'WARNING: missing date' || true)
+findings=$(mandoc -T lint -W style "$page" || true)
 [[ -z $findings ]] || { printf '%s\n' "$findings" >&2; exit 1; }
+
+day=$(sed -n "/^## $("$program" --version | cut -d ' ' -f 2) (\(.*\))\$/{s//\1/p;q}" "$changelog")
+[[ -n $day && $(sed -n 1p "$page") == ".TH VORELPAINT 1 $day "* ]] || { echo "the page is not of '$day'" >&2; exit 1; }
 
 text=$(mandoc -T ascii -O width=100 "$page" | col -b)
 # Kept whole before it is searched: a search that ends early would break the program's pipe.

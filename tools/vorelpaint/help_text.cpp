@@ -45,7 +45,8 @@ const std::vector<Note>& notes() {
          "outerGlow, "
          "innerGlow, linearGradient, radialGradient, stroke, pattern, text, bevel, emboss); the last "
          "lies "
-         "on top. The presets are style files to start from; docs/style-files.md lists every key."},
+         "on top. The presets are style files to start from. Where they and the page of every key lie "
+         "stands under Files."},
         {"Fonts",
          "A font is a file, or a family that fontconfig knows, with styles and properties behind "
          "colons: "
@@ -71,6 +72,11 @@ const std::vector<Note>& notes() {
                        " bytes, a style file " + std::to_string(kMaxStyleBytes) +
                        " and a line of a batch " + std::to_string(kMaxJobBytes) + "."},
         {"Colours", "#RGB is short for #RRGGBB with twice the same digits: #F80 is #FF8800."},
+        {"Files",
+         "Where the program is installed, in /usr for a package: share/doc/vorelpaint/style-files.md "
+         "lists every key of a style file, share/doc/vorelpaint/vorelpaint.md tells of batches and "
+         "reports, share/voreleffect/presets has the presets, and "
+         "share/voreleffect/vorelpaint-style.schema.json tells editors what a style file may hold."},
         {"Exit codes",
          "0 done. 2 failed, with one line on standard error; after a batch, with one for each job that "
          "failed and their count. A reader that went away is a failure of writing like any other."},
