@@ -84,6 +84,11 @@ void refuseUnnamedFiles() {
 
 /// Makes them those of this process.
 void enter(const Surroundings& surroundings) {
+    // The handlers of a sanitizer would take a signal that is sent for a fault.
+    const char* options = std::getenv("ASAN_OPTIONS");
+    const std::string own =
+        "handle_segv=0:handle_sigbus=0:handle_sigfpe=0:handle_sigill=0:handle_sigtrap=0:handle_abort=0";
+    ::setenv("ASAN_OPTIONS", options == nullptr ? own.c_str() : (options + (":" + own)).c_str(), 1);
     const rlimit noCore{0, 0};
     ::setrlimit(RLIMIT_CORE, &noCore);  // some of the signals that tests send would write one
     if (surroundings.ignoredSignal != 0) std::signal(surroundings.ignoredSignal, SIG_IGN);
