@@ -13,6 +13,7 @@
 
 #include "png_io.h"
 #include "program.h"
+#include "tests/support/thinned.h"
 
 namespace vorelpaint {
 namespace {
@@ -27,7 +28,7 @@ using vorel_test::TempDir;
 using Clock = std::chrono::steady_clock;
 using Words = std::vector<std::string>;
 
-constexpr int kRounds = 10;
+const int kRounds = vorel_test::thinned(10);
 constexpr int kMostRounds = 200;  ///< on a machine where the signal often comes too late
 
 /// Every signal that ends a program by default and that a program can do something about, but the two
