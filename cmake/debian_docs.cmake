@@ -7,12 +7,8 @@ set(root ${CMAKE_CURRENT_LIST_DIR}/..)
 set(version ${CPACK_PACKAGE_VERSION})
 
 # A Debian changelog names each release and its day; the changes are told in CHANGELOG.md.
-string(REPLACE . "\\." pattern ${version})
-file(STRINGS ${root}/CHANGELOG.md heading REGEX "^## ${pattern} .*[0-9][0-9][0-9][0-9]-[0-9][0-9]-[0-9][0-9]")
-if(NOT heading)
-  message(FATAL_ERROR "CHANGELOG.md has no section '## ${version} (YEAR-MONTH-DAY)'")
-endif()
-string(REGEX MATCH "[0-9]+-[0-9]+-[0-9]+" day ${heading})
+include(${root}/cmake/release_date.cmake)
+vorel_release_date(day ${version})
 execute_process(COMMAND date --utc --rfc-email --date ${day}
   OUTPUT_VARIABLE date OUTPUT_STRIP_TRAILING_WHITESPACE COMMAND_ERROR_IS_FATAL ANY)
 set(changelog ${CPACK_TEMPORARY_DIRECTORY}/changelog)

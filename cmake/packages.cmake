@@ -47,7 +47,7 @@ vorel_deb(RUNTIME ${runtime} libs "text effects from glyph masks - shared librar
 vorel_deb(DEVELOPMENT libvoreleffect-dev libdevel "text effects from glyph masks - development files"
   "This package has the headers and the files for CMake and pkg-config.")
 vorel_deb(TOOL vorelpaint graphics "paint text with effects into a PNG file"
-  "This package has vorelpaint, which paints a text in a font and a\nstyle, and its preset styles.")
+  "This package has vorelpaint, which paints a text in a font and a\nstyle, its preset styles, its manual page and documents.")
 
 # Every Debian package has its copyright and its changes.
 set(CPACK_PRE_BUILD_SCRIPTS ${PROJECT_SOURCE_DIR}/cmake/debian_docs.cmake)

@@ -133,4 +133,5 @@ picture=$outside/picture.png
 taken=$(ldd "$(command -v vorelpaint)")
 grep -q '=> \(/usr\)\?/lib.*libvoreleffect.so.1' <<< "$taken" ||
     fail "Debian: vorelpaint does not take the library from its package"
-echo "Debian: vorelpaint paints"
+tests/tool/installed_test.sh "$(command -v vorelpaint)" /usr || fail "Debian: not all that vorelpaint names"
+echo "Debian: vorelpaint paints, and its pages are there"

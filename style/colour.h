@@ -6,7 +6,8 @@
 
 namespace vorelstyle {
 
-/// Reads "#RRGGBB" as 0xRRGGBB; nothing for any other spelling.
+/// Reads "#RRGGBB", or "#RGB" for "#RRGGBB" of twice the same digits, as 0xRRGGBB; nothing for any other
+/// spelling.
 std::optional<uint32_t> parseColour(std::string_view text);
 
 }  // namespace vorelstyle

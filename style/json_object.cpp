@@ -10,6 +10,7 @@
 #include "style/colour.h"
 #include "style/error.h"
 #include "style/message.h"
+#include "style/nearest.h"
 
 namespace vorelstyle {
 namespace {
@@ -192,7 +193,8 @@ JsonObject::JsonObject(JsonValue value, std::string path, const std::vector<std:
     }
     for (const auto& item : node.items()) {
         if (std::find(known.begin(), known.end(), item.key()) != known.end()) continue;
-        throw StyleError(pathOf(escaped(item.key())) + ": unknown key; known are " + joined(known));
+        throw StyleError(pathOf(escaped(item.key())) + ": unknown key" +
+                         choices(item.key(), known, "known are"));
     }
 }
 
@@ -244,7 +246,7 @@ uint32_t JsonObject::color(std::string_view key, std::optional<uint32_t> fallbac
                              "a colour \"#RRGGBB\"");
     if (value == nullptr) return *fallback;
     const std::optional<uint32_t> colour = parseColour(value->get_ref<const std::string&>());
-    if (!colour) fail(key, quoted(*value) + " is no colour; write \"#RRGGBB\"");
+    if (!colour) fail(key, quoted(*value) + " is no colour; write \"#RRGGBB\" or \"#RGB\"");
     return *colour;
 }
 

@@ -1,12 +1,46 @@
 #include "style/message.h"
 
-namespace vorelstyle {
+#include <algorithm>
+#include <array>
+#include <cstdint>
+#include <cstdio>
 
-std::string printable(std::string text) {
-    for (char& c : text) {
-        if (static_cast<unsigned char>(c) < 0x20 || c == 0x7F) c = ' ';
+#include "unicode/utf8.h"
+
+namespace vorelstyle {
+namespace {
+
+/// Whether a character without ink breaks the line that it stands in or changes the order in which it is
+/// read: line and paragraph separator, the marks, embeddings, overrides and isolates of direction.
+bool ordersLines(uint32_t code) {
+    return code == 0x061C || code == 0x200E || code == 0x200F || (code >= 0x2028 && code <= 0x202E) ||
+           (code >= 0x2066 && code <= 0x2069);
+}
+
+std::string inHexadecimal(const char* format, uint32_t number) {
+    std::array<char, 16> text{};
+    std::snprintf(text.data(), text.size(), format, number);
+    return text.data();
+}
+
+}  // namespace
+
+std::string printable(std::string_view text) {
+    std::string safe;
+    for (size_t at = 0; at < text.size();) {
+        const auto [code, length] = vorelunicode::decodeAt(text, at);
+        if (length == 0) {
+            safe += inHexadecimal("<%02X>", static_cast<uint8_t>(text[at]));
+        } else if (code < 0x20 || code == 0x7F) {
+            safe += ' ';
+        } else if (vorelunicode::isControl(code) || ordersLines(code)) {
+            safe += inHexadecimal("<U+%04X>", code);
+        } else {
+            safe += text.substr(at, length);
+        }
+        at += std::max<size_t>(length, 1);
     }
-    return text;
+    return safe;
 }
 
 std::string faultPrefix(std::string_view name) {

@@ -3,7 +3,7 @@
 #include <algorithm>
 
 #include "style/error.h"
-#include "style/message.h"
+#include "style/nearest.h"
 
 namespace vorelstyle {
 
@@ -25,7 +25,7 @@ std::vector<std::string> presetNames(const fs::path& directory) {
 fs::path presetFile(const fs::path& directory, const std::string& name) {
     const std::vector<std::string> names = presetNames(directory);
     if (std::find(names.begin(), names.end(), name) == names.end()) {
-        throw StyleError("no preset '" + name + "'; there are " + joined(names));
+        throw StyleError("no preset '" + name + "'" + choices(name, names, "there are"));
     }
     return directory / (name + ".json");
 }

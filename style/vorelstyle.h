@@ -6,6 +6,7 @@
 #include "style/key_text.h"
 #include "style/look.h"
 #include "style/message.h"
+#include "style/nearest.h"
 #include "style/pattern_image.h"
 #include "style/presets.h"
 #include "style/style.h"

@@ -2,9 +2,11 @@
 
 #include <fontconfig/fontconfig.h>
 
+#include <algorithm>
 #include <array>
 #include <memory>
 #include <string_view>
+#include <vector>
 
 #include "text/error.h"
 
@@ -19,6 +21,12 @@ struct Destroy {
     }
 };
 using FontPattern = std::unique_ptr<FcPattern, Destroy<FcPatternDestroy>>;
+using FontList = std::unique_ptr<FcFontSet, Destroy<FcFontSetDestroy>>;
+using Objects = std::unique_ptr<FcObjectSet, Destroy<FcObjectSetDestroy>>;
+
+const FcChar8* fcText(const std::string& text) {
+    return reinterpret_cast<const FcChar8*>(text.c_str());
+}
 
 /// Names that stand for whatever family the system prefers.
 constexpr std::array<std::string_view, 4> kGenericFamilies{"sans-serif", "sans", "serif", "monospace"};
@@ -40,6 +48,105 @@ bool hasFamily(const FcPattern* font, const FcChar8* family) {
     return false;
 }
 
+[[noreturn]] void fail(const std::string& request, const std::string& fault) {
+    throw TextError("font '" + request + "': " + fault);
+}
+
+/// The parts of a request: the family, and what stands behind each ':'. A backslash takes a character as
+/// it is.
+std::vector<std::string> partsOf(const std::string& request) {
+    std::vector<std::string> parts(1);
+    for (size_t at = 0; at < request.size(); ++at) {
+        if (request[at] == ':') {
+            parts.emplace_back();
+            continue;
+        }
+        parts.back() += request[at];
+        if (request[at] == '\\' && at + 1 < request.size()) parts.back() += request[++at];
+    }
+    return parts;
+}
+
+/// The place of a '-' that is none of the name's own, for fontconfig the begin of a size.
+size_t sizeIn(const std::string& family) {
+    for (size_t at = 0; at < family.size(); ++at) {
+        if (family[at] == '\\') {
+            ++at;
+        } else if (family[at] == '-') {
+            return at;
+        }
+    }
+    return std::string::npos;
+}
+
+/// Whether fontconfig knows a style, "bold", or a property, "weight=200".
+bool isKnown(const std::string& property) {
+    const FontPattern parsed(FcNameParse(fcText(":" + property)));
+    if (!parsed || FcPatternObjectCount(parsed.get()) == 0) return false;
+    const size_t equals = property.find('=');
+    if (equals == std::string::npos) return true;
+    const FcObjectType* type = FcNameGetObjectType(property.substr(0, equals).c_str());
+    return type != nullptr && type->type != FcTypeUnknown;
+}
+
+/// fontconfig reads past what it does not know, and a regular font would stand for a misspelt bold.
+void refuseWhatIsNotKnown(const std::string& request) {
+    std::vector<std::string> parts = partsOf(request);
+    const size_t size = sizeIn(parts.front());
+    if (size != std::string::npos && !isGeneric(parts.front())) {
+        fail(request, "'" + parts.front().substr(size) +
+                          "' is no part of a family; a style stands behind a colon, as in "
+                          "'DejaVu Sans:bold', and a name's own dash behind a backslash");
+    }
+    for (size_t i = 1; i < parts.size(); ++i) {
+        if (!parts[i].empty() && !isKnown(parts[i])) {
+            fail(request, "'" + parts[i] + "' is no style and no property of fonts");
+        }
+    }
+}
+
+/// The bits above these tell the instances of a variable font apart.
+constexpr int kFaceBits = 0xFFFF;
+
+bool isSameFace(const FcPattern* one, const FcPattern* other) {
+    FcChar8* oneFile = nullptr;
+    FcChar8* otherFile = nullptr;
+    int oneIndex = 0;
+    int otherIndex = 0;
+    FcPatternGetInteger(one, FC_INDEX, 0, &oneIndex);
+    FcPatternGetInteger(other, FC_INDEX, 0, &otherIndex);
+    return FcPatternGetString(one, FC_FILE, 0, &oneFile) == FcResultMatch &&
+           FcPatternGetString(other, FC_FILE, 0, &otherFile) == FcResultMatch &&
+           FcStrCmp(oneFile, otherFile) == 0 && (oneIndex & kFaceBits) == (otherIndex & kFaceBits);
+}
+
+/// Whether `font` is among the installed ones that have all that is asked for.
+bool isListed(FcConfig* config, FcPattern* wanted, const FcPattern* font) {
+    const Objects objects(FcObjectSetBuild(FC_FILE, FC_INDEX, nullptr));
+    const FontList listed(FcFontList(config, wanted, objects.get()));
+    if (!listed) return false;
+    return std::any_of(listed->fonts, listed->fonts + listed->nfont,
+                       [&](const FcPattern* each) { return isSameFace(each, font); });
+}
+
+/// Whether a font that was found for `wanted` has its style and its other properties. Few families have
+/// both an italic and an oblique face: each stands for the other.
+bool hasProperties(FcConfig* config, const FcPattern* wanted, const FcPattern* font) {
+    const FontPattern exact(FcPatternDuplicate(wanted));
+    FcChar8* family = nullptr;
+    if (!exact || FcPatternGetString(font, FC_FAMILY, 0, &family) != FcResultMatch) return false;
+    FcPatternDel(exact.get(), FC_FAMILY);  // a generic one is no font's own
+    FcPatternAddString(exact.get(), FC_FAMILY, family);
+    if (isListed(config, exact.get(), font)) return true;
+    int slant = FC_SLANT_ROMAN;
+    FcPatternGetInteger(exact.get(), FC_SLANT, 0, &slant);
+    if (slant == FC_SLANT_ROMAN) return false;
+    FcPatternDel(exact.get(), FC_SLANT);
+    FcPatternAddInteger(exact.get(), FC_SLANT,
+                        slant == FC_SLANT_ITALIC ? FC_SLANT_OBLIQUE : FC_SLANT_ITALIC);
+    return isListed(config, exact.get(), font);
+}
+
 }  // namespace
 
 struct SystemFonts::Config {
@@ -52,19 +159,23 @@ SystemFonts::~SystemFonts() = default;
 
 FontFile SystemFonts::find(const std::string& request) const {
     const TextError noSuchFont("no font file or family '" + request + "'");
+    refuseWhatIsNotKnown(request);
     FcConfig* const config = mConfig->fonts.get();
-    const FontPattern wanted(FcNameParse(reinterpret_cast<const FcChar8*>(request.c_str())));
+    const FontPattern wanted(FcNameParse(fcText(request)));
     if (config == nullptr || !wanted) throw noSuchFont;
     FcChar8* found = nullptr;
     if (FcPatternGetString(wanted.get(), FC_FAMILY, 0, &found) != FcResultMatch) throw noSuchFont;
     const std::string family = reinterpret_cast<const char*>(found);
 
-    FcConfigSubstitute(config, wanted.get(), FcMatchPattern);
-    FcDefaultSubstitute(wanted.get());
+    const FontPattern completed(FcPatternDuplicate(wanted.get()));
+    if (!completed) throw noSuchFont;
+    FcConfigSubstitute(config, completed.get(), FcMatchPattern);
+    FcDefaultSubstitute(completed.get());
     FcResult result = FcResultNoMatch;
-    const FontPattern font(FcFontMatch(config, wanted.get(), &result));
-    if (!font || !hasFamily(font.get(), reinterpret_cast<const FcChar8*>(family.c_str()))) {
-        throw noSuchFont;
+    const FontPattern font(FcFontMatch(config, completed.get(), &result));
+    if (!font || !hasFamily(font.get(), fcText(family))) throw noSuchFont;
+    if (!hasProperties(config, wanted.get(), font.get())) {
+        fail(request, "the family is there, but no face of it is as asked for");
     }
     FcChar8* file = nullptr;
     if (FcPatternGetString(font.get(), FC_FILE, 0, &file) != FcResultMatch) throw noSuchFont;

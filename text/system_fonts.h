@@ -18,7 +18,8 @@ class SystemFonts {
     SystemFonts& operator=(const SystemFonts&) = delete;
 
     /// The font of a family as fontconfig writes it ("DejaVu Serif", "DejaVu Sans:bold"). Throws
-    /// TextError when there is no such family.
+    /// TextError when there is no such family, when it has no face as asked for, and where fontconfig
+    /// would read past a word that it does not know. Italic and oblique stand for each other.
     FontFile find(const std::string& request) const;
 
   private:

@@ -7,10 +7,13 @@
 
 #include <algorithm>
 #include <cstdlib>
+#include <iomanip>
 #include <memory>
+#include <sstream>
 #include <string>
 
 #include "text/error.h"
+#include "unicode/utf8.h"
 
 namespace voreltext {
 namespace {
@@ -39,19 +42,32 @@ void checkSide(int64_t units) {
                     " pixels wide or high");
 }
 
-bool isControl(uint32_t code) {
-    return code < 0x20 || (code >= 0x7F && code < 0xA0);
+/// Next line, line separator and paragraph separator.
+bool endsLine(uint32_t code) {
+    return code == '\n' || code == '\r' || code == 0x85 || code == 0x2028 || code == 0x2029;
 }
 
-/// Cuts at line feeds; tabs and other control characters become blanks.
+[[noreturn]] void refuseControl(uint32_t code, size_t line, size_t character) {
+    std::ostringstream fault;
+    fault << "the text has the control character U+" << std::hex << std::uppercase << std::setfill('0')
+          << std::setw(4) << code << std::dec << " in line " << line << ", character " << character;
+    throw TextError(fault.str());
+}
+
+/// Cuts at line ends, of which CR LF is one; tabs become blanks.
 std::vector<std::vector<uint32_t>> splitLines(const std::vector<uint32_t>& text) {
     std::vector<std::vector<uint32_t>> lines(1);
+    uint32_t before = 0;
     for (const uint32_t code : text) {
-        if (code == '\n') {
-            lines.emplace_back();
-        } else if (code != '\r') {
-            lines.back().push_back(isControl(code) ? ' ' : code);
+        std::vector<uint32_t>& line = lines.back();
+        if (endsLine(code)) {
+            if (code != '\n' || before != '\r') lines.emplace_back();
+        } else if (vorelunicode::isControl(code) && code != '\t') {
+            refuseControl(code, lines.size(), line.size() + 1);
+        } else {
+            line.push_back(code == '\t' ? ' ' : code);
         }
+        before = code;
     }
     return lines;
 }

@@ -30,8 +30,9 @@ struct GlyphMask {
 /// Text set in lines: shaped, ordered from left to right for the eye and placed.
 class TextLayout {
   public:
-    /// The font must outlive the layout. Throws TextError when the text cannot be shaped or grows
-    /// beyond kMaxSide in width or height.
+    /// The font must outlive the layout. A line ends with LF, CR, CR LF, NEL (U+0085), U+2028 or U+2029,
+    /// and a tab is a blank. Throws TextError when the text has any other control character, cannot be
+    /// shaped or grows beyond kMaxSide in width or height.
     TextLayout(const Font& font, const std::vector<uint32_t>& text, Align align);
 
     static constexpr int kMaxSide = 16384;

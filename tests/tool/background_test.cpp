@@ -40,7 +40,7 @@ TEST(Background, Checkerboard_ChangesEveryEightPixels) {
 }
 
 TEST(Background, OtherWords_AreRefused) {
-    for (const char* text : {"", "white", "#FFF", "Transparent"}) {
+    for (const char* text : {"", "white", "#FF", "Transparent"}) {
         EXPECT_FALSE(parseBackground(text)) << text;
     }
 }

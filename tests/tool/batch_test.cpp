@@ -84,7 +84,8 @@ TEST(Batch, WhatAJobSays_ReplacesTheOtherOfThePair) {
 
 TEST(Batch, UnknownKeys_AreRefusedWithTheKnownOnes) {
     EXPECT_EQ(faultOfMember(R"("colour": "#000000")"),
-              "colour: unknown key; known are text, text-file, font, size, align, style, preset, "
+              "colour: unknown key; did you mean color? Known are text, text-file, font, size, align, "
+              "style, preset, "
               "effect-scale, color, opacity, output, background, padding");
     EXPECT_EQ(faultOfMember(R"("batch": "b.jsonl")").rfind("batch: unknown key", 0), 0U);
     EXPECT_EQ(faultOfMember(R"("help": true)").rfind("help: unknown key", 0), 0U);
@@ -102,7 +103,7 @@ TEST(Batch, WrongValues_AreNamedWithTheirRange) {
     EXPECT_EQ(faultOfMember(R"("size": 0)"), "size: '0' is no whole number from 1 to 1000");
     EXPECT_EQ(faultOfMember(R"("size": 12.5)"), "size: '12.5' is no whole number from 1 to 1000");
     EXPECT_EQ(faultOfMember(R"("align": "middle")"), "align: 'middle' is none of left, center, right");
-    EXPECT_EQ(faultOfMember(R"("color": "red")"), "color: 'red' is no colour; write #RRGGBB");
+    EXPECT_EQ(faultOfMember(R"("color": "red")"), "color: 'red' is no colour; write #RRGGBB or #RGB");
 }
 
 TEST(Batch, FaultsOfAnInlineStyle_HaveTheirPath) {

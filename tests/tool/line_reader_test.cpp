@@ -35,17 +35,26 @@ TEST(LineReader, LongLine_IsCutAndTheNextOneIsWhole) {
     EXPECT_EQ(lines.next(4), "next");
 }
 
-TEST(LineReader, CountAhead_SkipsBlankLinesAndStaysInPlace) {
+TEST(LineReader, Rewind_BeginsAnew) {
     const TempDir dir;
-    LineReader lines(dir.write("a", "one\n\n \t\r\ntwo\nthree"));
-    EXPECT_EQ(lines.countAhead(), 3U);
+    LineReader lines(dir.write("a", "one\n\ntwo"));
+    ASSERT_TRUE(lines.canRewind());
+    for (int pass = 0; pass < 2; ++pass) {
+        EXPECT_EQ(lines.next(100), "one");
+        EXPECT_EQ(lines.next(100), "");
+        EXPECT_EQ(lines.next(100), "two");
+        EXPECT_EQ(lines.number(), 3U);
+        EXPECT_EQ(lines.next(100), std::nullopt);
+        lines.rewind();
+    }
     EXPECT_EQ(lines.next(100), "one");
-    EXPECT_EQ(lines.countAhead(), 2U);
-    EXPECT_EQ(lines.next(100), "");
+    lines.rewind();
+    EXPECT_EQ(lines.next(100), "one");
+    EXPECT_EQ(lines.number(), 1U);
 }
 
-TEST(LineReader, WhatIsNoFile_IsNotCounted) {
-    EXPECT_EQ(LineReader("/dev/null").countAhead(), 0U);
+TEST(LineReader, WhatIsNoFile_CannotBeReadAnew) {
+    EXPECT_FALSE(LineReader("/dev/null").canRewind());
 }
 
 TEST(LineReader, WhatCannotBeRead_IsRefused) {

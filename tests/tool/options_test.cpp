@@ -48,6 +48,38 @@ TEST(Options, EachValue_IsRead) {
     EXPECT_EQ(options.padding, 0);
 }
 
+TEST(Options, Colours_MayBeShort) {
+    const Options options = optionsOf({"--color", "#f80", "--background", "#abc", "A"});
+    EXPECT_EQ(options.color, 0xFF8800U);
+    EXPECT_EQ(options.background.kind, Background::Kind::colour);
+    EXPECT_EQ(options.background.colour, 0xAABBCCU);
+    EXPECT_EQ(faultOf({"--color", "#ff", "A"}), "--color: '#ff' is no colour; write #RRGGBB or #RGB");
+    EXPECT_EQ(faultOf({"--background", "#ff", "A"}),
+              "--background: '#ff' is none of transparent, checkerboard, #RRGGBB, #RGB");
+}
+
+TEST(Options, MisspeltOption_IsAnsweredWithTheNearest) {
+    EXPECT_EQ(faultOf({"--szie", "96", "A"}), "no option '--szie'; did you mean --size?");
+    EXPECT_EQ(faultOf({"--szie=96", "A"}), "no option '--szie'; did you mean --size?");
+    EXPECT_EQ(faultOf({"-size", "96", "A"}), "no option '-size'; did you mean --size?");
+    EXPECT_EQ(faultOf({"A", "--colour", "#000"}), "no option '--colour'; did you mean --color?");
+    EXPECT_EQ(faultOf({"A", "--print-margin"}),
+              "no option '--print-margin'; did you mean --print-margins?");
+    EXPECT_EQ(faultOf({"A", "--list"}), "no option '--list'; did you mean --list-presets?");
+    EXPECT_EQ(faultOf({"A", "--Preset", "gold"}), "no option '--Preset'; did you mean --preset?");
+}
+
+TEST(Options, OptionLikeNone_IsNamed) {
+    for (const char* option : {"--no-such-option", "-x", "---"}) {
+        EXPECT_EQ(faultOf({"A", option}), "no option '" + std::string(option) + "'; --help lists them");
+    }
+}
+
+TEST(Options, SecondText_IsNamed) {
+    EXPECT_EQ(faultOf({"Once", "upon", "a time"}),
+              "'upon' is one text too many; quotes keep the words of a text together");
+}
+
 TEST(Options, EmptyNames_AreGivenNames) {
     EXPECT_EQ(optionsOf({"--style", "", "A"}).style, "");
     EXPECT_EQ(optionsOf({"--preset", "", "A"}).preset, "");

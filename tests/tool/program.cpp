@@ -1,14 +1,21 @@
 #include "program.h"
 
 #include <fcntl.h>
+#include <linux/filter.h>
+#include <linux/seccomp.h>
 #include <pty.h>
 #include <sys/ioctl.h>
+#include <sys/prctl.h>
+#include <sys/resource.h>
+#include <sys/syscall.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
 #include <algorithm>
 #include <array>
+#include <cerrno>
 #include <csignal>
+#include <cstddef>
 #include <cstdlib>
 #include <fstream>
 #include <iterator>
@@ -55,6 +62,49 @@ void redirect(int descriptor, const std::string& path, int flags) {
     ::close(file);
 }
 
+/// From now on openat answers as a file system without unnamed files does.
+void refuseUnnamedFiles() {
+    constexpr auto kNumber = static_cast<unsigned int>(offsetof(seccomp_data, nr));
+    constexpr auto kFlags = static_cast<unsigned int>(offsetof(seccomp_data, args) + 2 * sizeof(__u64));
+    constexpr unsigned int kUnnamed = static_cast<unsigned int>(O_TMPFILE) & ~unsigned{O_DIRECTORY};
+    std::array<sock_filter, 6> code{{
+        BPF_STMT(BPF_LD | BPF_W | BPF_ABS, kNumber),
+        BPF_JUMP(BPF_JMP | BPF_JEQ | BPF_K, SYS_openat, 0, 3),
+        BPF_STMT(BPF_LD | BPF_W | BPF_ABS, kFlags),
+        BPF_JUMP(BPF_JMP | BPF_JSET | BPF_K, kUnnamed, 0, 1),
+        BPF_STMT(BPF_RET | BPF_K, SECCOMP_RET_ERRNO | EOPNOTSUPP),
+        BPF_STMT(BPF_RET | BPF_K, SECCOMP_RET_ALLOW),
+    }};
+    const sock_fprog program{static_cast<unsigned short>(code.size()), code.data()};
+    if (::prctl(PR_SET_NO_NEW_PRIVS, 1, 0, 0, 0) != 0 ||
+        ::prctl(PR_SET_SECCOMP, SECCOMP_MODE_FILTER, &program) != 0) {
+        ::_exit(127);
+    }
+}
+
+/// Makes them those of this process.
+void enter(const Surroundings& surroundings) {
+    // The handlers of a sanitizer would take a signal that is sent for a fault.
+    const char* options = std::getenv("ASAN_OPTIONS");
+    const std::string own =
+        "handle_segv=0:handle_sigbus=0:handle_sigfpe=0:handle_sigill=0:handle_sigtrap=0:handle_abort=0";
+    ::setenv("ASAN_OPTIONS", options == nullptr ? own.c_str() : (options + (":" + own)).c_str(), 1);
+    const rlimit noCore{0, 0};
+    ::setrlimit(RLIMIT_CORE, &noCore);  // some of the signals that tests send would write one
+    if (surroundings.ignoredSignal != 0) std::signal(surroundings.ignoredSignal, SIG_IGN);
+    if (surroundings.largestFile != 0) {
+        const rlimit limit{surroundings.largestFile, surroundings.largestFile};
+        if (::setrlimit(RLIMIT_FSIZE, &limit) != 0) ::_exit(127);
+    }
+    if (surroundings.closedOutput) {
+        std::array<int, 2> ends{};
+        if (::pipe(ends.data()) != 0 || ::dup2(ends[1], STDOUT_FILENO) < 0) ::_exit(127);
+        ::close(ends[0]);
+        ::close(ends[1]);
+    }
+    if (!surroundings.unnamedFiles) refuseUnnamedFiles();
+}
+
 /// Becomes vorelpaint; does not return.
 [[noreturn]] void execVorelpaint(const std::vector<std::string>& arguments) {
     std::vector<std::string> words{VORELPAINT_BINARY};
@@ -74,12 +124,14 @@ int exitCodeOf(pid_t child) {
 }
 
 int runRedirected(const std::vector<std::string>& arguments, const std::string& in,
-                  const std::string& out, const std::string& err) {
+                  const std::string& out, const std::string& err,
+                  const Surroundings& surroundings = {}) {
     const pid_t child = ::fork();
     if (child == 0) {
         redirect(STDIN_FILENO, in, O_RDONLY);
         redirect(STDOUT_FILENO, out, O_WRONLY | O_CREAT);
         redirect(STDERR_FILENO, err, O_WRONLY | O_CREAT);
+        enter(surroundings);
         execVorelpaint(arguments);
     }
     return exitCodeOf(child);
@@ -121,13 +173,21 @@ Outcome runVorelpaintOnTerminal(const std::vector<std::string>& arguments, int c
     return {exitCode, readBytes(dir.file("out")), drawn};
 }
 
-RunningVorelpaint::RunningVorelpaint(const std::vector<std::string>& arguments, int ignored)
+Outcome runVorelpaintIn(const Surroundings& surroundings, const std::vector<std::string>& arguments) {
+    const TempDir dir;
+    const int exitCode =
+        runRedirected(arguments, "/dev/null", dir.file("out"), dir.file("err"), surroundings);
+    return {exitCode, readBytes(dir.file("out")), readBytes(dir.file("err"))};
+}
+
+RunningVorelpaint::RunningVorelpaint(const std::vector<std::string>& arguments,
+                                     const Surroundings& surroundings)
     : mChild(::fork()) {
     if (mChild != 0) return;
     redirect(STDIN_FILENO, "/dev/null", O_RDONLY);
     redirect(STDOUT_FILENO, "/dev/null", O_WRONLY);
     redirect(STDERR_FILENO, "/dev/null", O_WRONLY);
-    if (ignored != 0) std::signal(ignored, SIG_IGN);
+    enter(surroundings);
     execVorelpaint(arguments);
 }
 
@@ -139,6 +199,24 @@ RunningVorelpaint::~RunningVorelpaint() {
 
 void RunningVorelpaint::send(int signal) const {
     ::kill(mChild, signal);
+}
+
+bool RunningVorelpaint::isWritingIn(const fs::path& directory) const {
+    const std::string begin = (directory / ".vorelpaint.").string();
+    const std::string unnamed = (directory / "#").string();
+    std::error_code ended;
+    for (const fs::directory_entry& open :
+         fs::directory_iterator("/proc/" + std::to_string(mChild) + "/fd", ended)) {
+        const std::string path = fs::read_symlink(open.path(), ended).string();
+        if (path.rfind(begin, 0) == 0 || path.rfind(unnamed, 0) == 0) return true;
+    }
+    return false;
+}
+
+bool RunningVorelpaint::hasEnded() const {
+    siginfo_t info{};
+    ::waitid(P_PID, static_cast<id_t>(mChild), &info, WEXITED | WNOHANG | WNOWAIT);
+    return info.si_pid != 0;
 }
 
 int RunningVorelpaint::wait() {

@@ -40,17 +40,34 @@ Outcome runVorelpaint(const std::vector<std::string>& arguments, const std::stri
 /// its control characters.
 Outcome runVorelpaintOnTerminal(const std::vector<std::string>& arguments, int columns);
 
+/// What a program finds when it starts.
+struct Surroundings {
+    int ignoredSignal = 0;     ///< as under nohup; 0 for none
+    bool unnamedFiles = true;  ///< whether its file systems have them
+    size_t largestFile =
+        0;  ///< bytes, beyond which SIGXFSZ ends what does not ignore it; 0 for no limit
+    bool closedOutput = false;  ///< standard output is a pipe that nobody reads
+};
+
+/// The same, waited for like runVorelpaint, in other surroundings and without input.
+Outcome runVorelpaintIn(const Surroundings& surroundings, const std::vector<std::string>& arguments);
+
 /// vorelpaint at work, with neither input nor output. Ended and waited for when it goes out of scope.
 class RunningVorelpaint {
   public:
-    /// With `ignored` as a signal that it finds ignored, as under nohup; 0 for none.
-    explicit RunningVorelpaint(const std::vector<std::string>& arguments, int ignored = 0);
+    explicit RunningVorelpaint(const std::vector<std::string>& arguments,
+                               const Surroundings& surroundings = {});
     ~RunningVorelpaint();
     RunningVorelpaint(const RunningVorelpaint&) = delete;
     RunningVorelpaint& operator=(const RunningVorelpaint&) = delete;
 
     void send(int signal) const;
-    int wait();  ///< the status as waitpid gives it
+
+    /// Whether it has a file in this directory open that is not finished: of a passing name, or of none.
+    bool isWritingIn(const std::filesystem::path& directory) const;
+
+    bool hasEnded() const;  ///< wait() tells how
+    int wait();             ///< the status as waitpid gives it
 
   private:
     pid_t mChild;

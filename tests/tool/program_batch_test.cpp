@@ -1,10 +1,11 @@
 #include <gtest/gtest.h>
+#include <sys/stat.h>
 #include <sys/wait.h>
 
 #include <algorithm>
-#include <chrono>
 #include <csignal>
 #include <filesystem>
+#include <fstream>
 #include <string>
 #include <thread>
 #include <vector>
@@ -130,10 +131,54 @@ TEST_F(BatchProgram, WhatCannotGoWithABatch_IsRefused) {
     EXPECT_TRUE(mDir.list().empty());
 }
 
+TEST_F(BatchProgram, TwoJobsWithOneOutput_ArePaintedByNone) {
+    std::filesystem::create_directory_symlink(mDir.path(), mInputs.file("linked"));
+    const std::string a = R"({"text": "A", "output": ")" + mDir.file("./a.png") + "\"}\n";
+    const std::string linked = R"({"text": "A", "output": ")" + mInputs.file("linked/b.png") + "\"}\n";
+    const Outcome outcome = run(job("a.png", R"("text": "A")") + "\n" + job("b.png", R"("text": "B")") +
+                                "{oops\n" + a + linked);
+    EXPECT_EQ(outcome.exitCode, 2);
+    EXPECT_EQ(outcome.err,
+              "vorelpaint: line 5: output: '" + mDir.file("./a.png") +
+                  "' is the file that line 1 writes\n"
+                  "vorelpaint: line 6: output: '" +
+                  mInputs.file("linked/b.png") +
+                  "' is the file that line 3 writes\n"
+                  "vorelpaint: nothing is painted: of 5 jobs 2 would replace the picture of "
+                  "another\n");
+    EXPECT_TRUE(mDir.list().empty());
+}
+
+TEST_F(BatchProgram, SecondJobOfAnOutput_IsRefusedInAPipe) {
+    const std::string jobs =
+        mInputs.write("jobs.jsonl", job("a.png", R"("text": "A")") + job("a.png", R"("text": "B")"));
+    const std::string fifo = mInputs.file("fifo");
+    ASSERT_EQ(::mkfifo(fifo.c_str(), 0600), 0);
+    std::thread writer([&] { std::ofstream(fifo, std::ios::binary) << readBytes(jobs); });
+    const Outcome outcome = runVorelpaint({"--batch", fifo});
+    writer.join();
+    EXPECT_EQ(outcome.exitCode, 2);
+    EXPECT_EQ(outcome.err, "vorelpaint: line 2: output: '" + mDir.file("a.png") +
+                               "' is the file that line 1 writes\nvorelpaint: 1 of 2 jobs failed\n");
+    const std::string expected = mInputs.file("expected.png");
+    runVorelpaint({"-o", expected, "A"});
+    EXPECT_EQ(readBytes(mDir.file("a.png")), readBytes(expected)) << "the first one stays";
+}
+
+TEST_F(BatchProgram, JobNamedLikeAnotherKindOfFile_IsRefused) {
+    const Outcome outcome = run(job("a.jpg", R"("text": "A")"));
+    EXPECT_EQ(outcome.exitCode, 2);
+    EXPECT_EQ(outcome.err,
+              "vorelpaint: line 1: output: '" + mDir.file("a.jpg") +
+                  "' is named like another kind of file; only PNG is written: end it with .png\n"
+                  "vorelpaint: 1 of 1 jobs failed\n");
+    EXPECT_TRUE(mDir.list().empty());
+}
+
 TEST_F(BatchProgram, Terminal_ShowsABarThatGoesInTheEnd) {
     std::string lines;
     for (int i = 0; i < 3; ++i)
-        lines += job(std::to_string(i) + ".png", R"("text": "A")");
+        lines += job(std::to_string(i) + ".png", R"("text": "A")") + " \t\r\n\n";
     const std::string jobs = mInputs.write("jobs.jsonl", lines + "{}\n");
     const Outcome outcome = runVorelpaintOnTerminal({"--batch", jobs}, 80);
     EXPECT_EQ(outcome.exitCode, 2);
@@ -141,7 +186,7 @@ TEST_F(BatchProgram, Terminal_ShowsABarThatGoesInTheEnd) {
     EXPECT_EQ(outcome.err.rfind("[--------------------------------] 0 of 4 pictures", 0), 0U)
         << outcome.err;
     const std::string erased = "\r\x1B[K";
-    const size_t message = outcome.err.find("vorelpaint: line 4: output: missing");
+    const size_t message = outcome.err.find("vorelpaint: line 10: output: missing");
     ASSERT_NE(message, std::string::npos) << outcome.err;
     EXPECT_EQ(outcome.err.substr(message - erased.size(), erased.size()), erased)
         << "the bar makes room for the message";
@@ -154,48 +199,11 @@ TEST_F(BatchProgram, NarrowTerminal_KeepsTheBarOnItsLine) {
     EXPECT_EQ(runVorelpaintOnTerminal({"--batch", jobs}, 20).err, "[------------------\r\x1B[K");
 }
 
-/// Whether a picture is being written in `dir`.
-bool hasUnfinishedFile(const TempDir& dir) {
-    const Words names = dir.list();
-    return std::any_of(names.begin(), names.end(),
-                       [](const std::string& name) { return name.rfind(".vorelpaint.", 0) == 0; });
-}
-
-class InterruptedBatch : public BatchProgram, public ::testing::WithParamInterface<int> {};
-
-TEST_P(InterruptedBatch, LeavesOnlyWholePictures) {
-    std::string lines;
-    for (int i = 0; i < 500; ++i) {
-        lines += job(std::to_string(i) + ".png",
-                     R"("text": "Grains of dust", "preset": "chalk", "size": 300)");
-    }
-    RunningVorelpaint batch({"--batch", mInputs.write("jobs.jsonl", lines)});
-    using Clock = std::chrono::steady_clock;
-    const Clock::time_point end = Clock::now() + std::chrono::seconds(60);
-    while ((mDir.list().size() < 2 || !hasUnfinishedFile(mDir)) && Clock::now() < end)
-        std::this_thread::yield();
-    ASSERT_TRUE(hasUnfinishedFile(mDir)) << "no picture was on its way";
-    batch.send(GetParam());
-    const int status = batch.wait();
-    ASSERT_TRUE(WIFSIGNALED(status));
-    EXPECT_EQ(WTERMSIG(status), GetParam());
-
-    const Words pictures = mDir.list();
-    EXPECT_LT(pictures.size(), 500U);
-    ASSERT_GE(pictures.size(), 1U);
-    for (const std::string& name : pictures) {
-        EXPECT_EQ(std::filesystem::path(name).extension(), ".png") << name;
-        EXPECT_NO_THROW(readPng(mDir.file(name))) << name;
-    }
-}
-
-INSTANTIATE_TEST_SUITE_P(Signals, InterruptedBatch, ::testing::Values(SIGINT, SIGTERM, SIGHUP));
-
 TEST_F(BatchProgram, IgnoredSignal_StaysIgnored) {
     std::string lines;
     for (int i = 0; i < 20; ++i)
         lines += job(std::to_string(i) + ".png", R"("text": "Dust", "preset": "chalk", "size": 200)");
-    RunningVorelpaint batch({"--batch", mInputs.write("jobs.jsonl", lines)}, SIGHUP);
+    RunningVorelpaint batch({"--batch", mInputs.write("jobs.jsonl", lines)}, {SIGHUP});
     while (mDir.list().empty())
         std::this_thread::yield();
     batch.send(SIGHUP);

@@ -243,6 +243,19 @@ TEST_F(Program, TextWithoutInk_IsRefused) {
     expectFailure({"--text-file", "/dev/null"}, "no visible character");
 }
 
+TEST_F(Program, ControlCharacters_AreRefusedWithTheirPlace) {
+    const std::string fault = "the text has the control character U+001B in line 2, character 3";
+    expectFailure({"A\nbc\x1B[0m"}, fault);
+    expectFailure({"--sheet", "A\nbc\x1B[0m"}, fault);
+    expectFailure({"--text-file", mDir.write("t", "A\r\nbc\x1B")}, fault);
+}
+
+TEST_F(Program, CarriageReturns_EndLines) {
+    const std::vector<uint8_t> expected = paint({"--text-file", mDir.write("t", "one\ntwo\n")}).pixels;
+    EXPECT_EQ(paint({"--text-file", mDir.write("t", "one\rtwo\r")}).pixels, expected);
+    EXPECT_EQ(paint({"--text-file", mDir.write("t", "one\r\ntwo\r\n")}).pixels, expected);
+}
+
 TEST_F(Program, InvalidUtf8_IsRefusedWithItsPlace) {
     expectFailure({"ab\xFF"}, "not valid UTF-8 at byte 3");
     expectFailure({"--text-file", mDir.write("t", "\xC3")}, "not valid UTF-8 at byte 1");
@@ -254,6 +267,7 @@ TEST_F(Program, Fonts_ThatCannotBeUsedAreNamed) {
     const std::string noFont = mDir.write("font.ttf", "not a font");
     expectFailure({"--font", noFont, "A"}, "'" + noFont + "' is no font");
     expectFailure({"--font", "", "A"}, "no font file or family ''");
+    expectFailure({"--font", "DejaVu Sans:blod", "A"}, "font 'DejaVu Sans:blod': 'blod' is no style");
 }
 
 TEST_F(Program, FontsWithoutAConfiguration_AreNoReasonForASecondLine) {
@@ -274,11 +288,14 @@ TEST_F(Program, Styles_ThatCannotBeReadAreNamed) {
     const std::string style = writeStyle("{\n\"stroke\": {\"size\": 200}\n}");
     expectFailure({"--style", style, "A"}, style + "': stroke.size: 200 is out of range, 0 to 100");
     expectFailure({"--preset", "none", "A"}, "no preset 'none'; there are");
+    expectFailure({"--preset", "glod", "A"}, "no preset 'glod'; did you mean gold? There are aurora, ");
     expectFailure({"--preset", "../presets/gold", "A"}, "no preset");
 }
 
 TEST_F(Program, ControlCharactersInANameStayOnTheOneLine) {
     expectFailure({"--style", "a\nb\x1B[2J", "A"}, "cannot read 'a b [2J'");
+    expectFailure({"--style", "a\xC2\x9B\x32J", "A"}, "cannot read 'a<U+009B>2J'");
+    expectFailure({"--style", "a\xE2\x80\xAEgpj\xFF", "A"}, "cannot read 'a<U+202E>gpj<FF>'");
 }
 
 TEST_F(Program, TooLargePictures_AreRefused) {
@@ -299,6 +316,18 @@ TEST_F(Program, OutputThatCannotBeWritten_IsNamed) {
     EXPECT_EQ(outcome.exitCode, 2);
     EXPECT_NE(outcome.err.find("standard output"), std::string::npos);
     EXPECT_EQ(runVorelpaintInto("/dev/full", {"--print-key"}).exitCode, 2);
+}
+
+TEST_F(Program, OutputNamedLikeAnotherKindOfFile_IsRefused) {
+    const std::string refusal =
+        "is named like another kind of file; only PNG is written: end it with .png";
+    for (const char* name : {"a.jpg", "a.JPG", "look.json"}) {
+        const std::string path = mDir.file(name);
+        expectFailure({"-o", path, "A"}, "--output: '" + path + "' " + refusal);
+        expectFailure({"--sheet", "-o", path, "A"}, "--output: '" + path + "' " + refusal);
+    }
+    for (const char* name : {"a.PNG", "tmp.aBcD12", "plain"})
+        EXPECT_EQ(runVorelpaint({"-o", mDir.file(name), "A"}).exitCode, 0) << name;
 }
 
 TEST_F(Program, FailureKeepsTheOlderPicture) {

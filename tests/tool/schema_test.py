@@ -42,7 +42,8 @@ def reader_faults(styles):
     The styles are the jobs of one batch. Its text has no ink, so that every job fails: those whose style
     was taken only afterwards.
     """
-    jobs = ({"text": " ", "output": "never.png", "style": style} for style in styles)
+    jobs = ({"text": " ", "output": f"never{number}.png", "style": style}
+            for number, style in enumerate(styles))
     run = run_program(["--batch", "-"], "".join(json.dumps(job) + "\n" for job in jobs))
     faults = {}
     for line, fault in re.findall(r"line (\d+): (?!warning: )(.*)", run.stderr):
@@ -105,7 +106,7 @@ def variants(schema):
     """Values around the limits of a member, and of every other type."""
     schema = resolved(schema)
     yield from (None, True, 0, 0.5, 1.5, 2.0, -1, 1e9, "", "x", "a\0b", "#12345", "#1234567", "#12345G",
-                "#aBcDeF", [], {}, [[]], STOPS, STOPS[:1] * 256, STOPS[:1] * 257, [{}])
+                "#aBcDeF", "#aB9", "#12", "#1234", "#12G", [], {}, [[]], STOPS, STOPS[:1] * 256, STOPS[:1] * 257, [{}])
     for limit in (schema.get("minimum"), schema.get("maximum")):
         if limit is not None:
             yield from (limit, limit - 1, limit + 1, limit - 0.001, limit + 0.001)

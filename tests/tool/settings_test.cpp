@@ -2,15 +2,24 @@
 
 #include <gtest/gtest.h>
 
+#include <regex>
 #include <set>
+#include <sstream>
 #include <string>
 
 #include "completion.h"
+#include "error.h"
 #include "help_text.h"
 #include "manual.h"
 
 namespace vorelpaint {
 namespace {
+
+std::string shortest(double number) {
+    std::ostringstream text;
+    text << number;
+    return text.str();
+}
 
 TEST(Settings, Names_AreUniqueAndDescribed) {
     std::set<std::string> names;
@@ -34,6 +43,35 @@ TEST(Settings, Initial_IsWhatAFreshRequestHolds) {
         EXPECT_EQ(options.effectScale, fresh.effectScale) << setting.name;
         EXPECT_EQ(options.background.kind, fresh.background.kind) << setting.name;
         EXPECT_EQ(options.padding, fresh.padding) << setting.name;
+    }
+}
+
+TEST(Settings, Descriptions_NameTheRangeThatIsTaken) {
+    size_t numbers = 0;
+    for (const Setting& setting : settings()) {
+        if (setting.kind != Setting::Kind::number) continue;
+        ++numbers;
+        std::smatch range;
+        const std::regex form("([0-9.]+) to ([0-9.]+)");
+        ASSERT_TRUE(std::regex_search(setting.description, range, form)) << setting.description;
+        Options options;
+        EXPECT_NO_THROW(setting.read(options, range[1])) << setting.name;
+        EXPECT_NO_THROW(setting.read(options, range[2])) << setting.name;
+        const double beyond = setting.name == "size" || setting.name == "padding" ? 1 : 0.001;
+        const std::string below = shortest(std::stod(range[1]) - beyond);
+        const std::string above = shortest(std::stod(range[2]) + beyond);
+        EXPECT_THROW(setting.read(options, below), ToolError) << setting.name << " " << below;
+        EXPECT_THROW(setting.read(options, above), ToolError) << setting.name << " " << above;
+    }
+    EXPECT_EQ(numbers, 4U);
+}
+
+TEST(Help, NamesTheLimits) {
+    const std::string help = helpFooter();
+    for (const char* limit : {"16384 pixels on a side", "33554432 in all", "4096 pixels on a side",
+                              "65536 bytes", "131072", "262144"}) {
+        EXPECT_NE(std::regex_replace(help, std::regex("\\s+"), " ").find(limit), std::string::npos)
+            << limit;
     }
 }
 

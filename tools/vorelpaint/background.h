@@ -14,7 +14,7 @@ struct Background {
     uint32_t colour = 0;  ///< 0xRRGGBB
 };
 
-/// Reads "transparent", "checkerboard" or "#RRGGBB"; nothing for anything else.
+/// Reads "transparent", "checkerboard" or a colour; nothing for anything else.
 std::optional<Background> parseBackground(std::string_view text);
 
 /// Lays a premultiplied picture on the background; the result is straight, as a PNG stores it.

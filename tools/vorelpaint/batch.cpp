@@ -8,8 +8,10 @@
 #include "console.h"
 #include "error.h"
 #include "line_reader.h"
+#include "output_name.h"
 #include "painting.h"
 #include "progress.h"
+#include "ranges.h"
 #include "settings.h"
 #include "style/vorelstyle.h"
 
@@ -21,9 +23,6 @@ using vorelstyle::JsonObject;
 using vorelstyle::JsonValue;
 using vorelstyle::Style;
 using vorelstyle::StyleError;
-
-/// Room for the largest text and the largest style.
-constexpr size_t kMaxJobBytes = size_t{1} << 18;
 
 bool isBlank(const std::string& line) {
     return line.find_first_not_of(" \t\r") == std::string::npos;
@@ -119,9 +118,26 @@ Options readJob(const JsonObject& job, const Options& common) {
     return options;
 }
 
-bool paintJob(const std::string& line, const Options& common, const Warn& sayHere) {
+/// Two jobs of one output would leave one picture of two.
+void claimOutput(OutputNames& outputs, const Options& job, size_t line) {
+    const std::string& output = job.output.value();
+    const std::optional<size_t> other = outputs.claim(output, line);
+    if (other) {
+        throw ToolError("output: " + inQuotes(output) + " is the file that line " +
+                        std::to_string(*other) + " writes");
+    }
+}
+
+void sayOfLine(size_t number, const std::string& what) {
+    say("line " + std::to_string(number) + ": " + what);
+}
+
+bool paintJob(const std::string& line, size_t number, const Options& common, OutputNames& outputs) {
+    const auto sayHere = [&](const std::string& what) { sayOfLine(number, what); };
     try {
-        paintPicture(parseJob(line, common), sayHere);
+        const Options job = parseJob(line, common);
+        claimOutput(outputs, job, number);
+        paintPicture(job, sayHere);
         return true;
     } catch (const std::bad_alloc&) {
         sayHere("not enough memory");
@@ -129,6 +145,40 @@ bool paintJob(const std::string& line, const Options& common, const Warn& sayHer
         sayHere(error.what());
     }
     return false;
+}
+
+std::optional<std::string> nextJob(LineReader& lines) {
+    std::optional<std::string> line = lines.next(kMaxJobBytes);
+    while (line && isBlank(*line))
+        line = lines.next(kMaxJobBytes);
+    return line;
+}
+
+/// The number of jobs. Throws when two of them have one output, before anything is painted. Other faults
+/// are found where the jobs are painted.
+size_t checkAhead(LineReader& lines, const Options& common) {
+    OutputNames outputs;
+    size_t jobs = 0;
+    size_t clashes = 0;
+    while (const std::optional<std::string> line = nextJob(lines)) {
+        ++jobs;
+        std::optional<Options> job;
+        try {
+            job = parseJob(*line, common);
+        } catch (const ToolError&) {
+            continue;
+        }
+        try {
+            claimOutput(outputs, *job, lines.number());
+        } catch (const ToolError& error) {
+            sayOfLine(lines.number(), error.what());
+            ++clashes;
+        }
+    }
+    lines.rewind();
+    if (clashes == 0) return jobs;
+    throw ToolError("nothing is painted: of " + std::to_string(jobs) + " jobs " +
+                    std::to_string(clashes) + " would replace the picture of another");
 }
 
 }  // namespace
@@ -144,15 +194,13 @@ Options parseJob(const std::string& line, const Options& common) {
 
 BatchResult paintBatch(const Options& common) {
     LineReader lines(common.batch.value());
-    Progress progress("pictures", hasTerminal() ? lines.countAhead() : 0);
+    const size_t jobs = lines.canRewind() ? checkAhead(lines, common) : 0;
+    Progress progress("pictures", jobs);
+    OutputNames outputs;
     BatchResult result;
-    while (const std::optional<std::string> line = lines.next(kMaxJobBytes)) {
-        if (isBlank(*line)) continue;
-        const auto sayHere = [&](const std::string& what) {
-            say("line " + std::to_string(lines.number()) + ": " + what);
-        };
+    while (const std::optional<std::string> line = nextJob(lines)) {
         ++result.jobs;
-        if (!paintJob(*line, common, sayHere)) ++result.failed;
+        if (!paintJob(*line, lines.number(), common, outputs)) ++result.failed;
         progress.advance();
     }
     return result;

@@ -17,7 +17,9 @@ struct BatchResult {
 };
 
 /// Paints the jobs of the batch that the options name. Every fault of a job is said in one line with the
-/// number of its line, and the next job goes on. Throws ToolError when the batch itself cannot be read.
+/// number of its line, and the next job goes on. Throws ToolError when the batch itself cannot be read,
+/// and before anything is painted when two of its jobs have one output. In a pipe, which cannot be read
+/// twice, that is the fault of the second one.
 BatchResult paintBatch(const Options& common);
 
 }  // namespace vorelpaint

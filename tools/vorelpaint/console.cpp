@@ -4,9 +4,11 @@
 #include <unistd.h>
 
 #include <csignal>
+#include <cstdio>
 #include <iostream>
 #include <string_view>
 
+#include "error.h"
 #include "style/vorelstyle.h"
 
 namespace vorelpaint {
@@ -31,6 +33,12 @@ void drawStatus() {
 }
 
 }  // namespace
+
+void print(const std::string& text) {
+    const size_t written = std::fwrite(text.data(), 1, text.size(), stdout);
+    if (written == text.size() && std::fflush(stdout) == 0) return;
+    failWithErrno("cannot write standard output");
+}
 
 void say(const std::string& line) {
     eraseStatus();

@@ -2,8 +2,11 @@
 
 #include <string>
 
-/// What the program says beside its output: lines on standard error.
+/// What the program prints on standard output, and what it says beside that: lines on standard error.
 namespace vorelpaint {
+
+/// Text on standard output. Throws ToolError when it does not get there.
+void print(const std::string& text);
 
 /// One line on standard error, with the program's name before it. A status that is shown stays below it.
 void say(const std::string& line);

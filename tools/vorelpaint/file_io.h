@@ -2,6 +2,7 @@
 
 #include <cstddef>
 #include <cstdio>
+#include <filesystem>
 #include <functional>
 #include <string>
 
@@ -11,10 +12,12 @@ namespace vorelpaint {
 /// longer than `maxBytes`.
 std::string readFile(const std::string& path, size_t maxBytes);
 
-/// Lets `write` fill a temporary file beside `path`, which then takes the name `path` in one step:
-/// after a failure nothing is left and an older file is untouched. A replaced file's permissions stay.
-/// The target of a symbolic link is made or replaced, not the link. "-" is standard output; a device or
-/// a pipe is written directly. Throws ToolError.
+/// The path that the symbolic links of a path lead to, which may not be there yet. Throws ToolError.
+std::filesystem::path followLinks(std::filesystem::path path);
+
+/// Lets `write` fill a NewFile, which takes the name `path` when it is whole. The target of a symbolic
+/// link is made or replaced, not the link. "-" is standard output; a device or a pipe is written
+/// directly. Throws ToolError.
 void writeFile(const std::string& path, const std::function<void(std::FILE*)>& write);
 
 }  // namespace vorelpaint

@@ -11,16 +11,23 @@
 namespace vorelpaint {
 namespace {
 
-constexpr std::array<int, 3> kSignals{SIGINT, SIGTERM, SIGHUP};
-
 /// A plain array: the handler must not touch anything that could be half-changed.
 std::array<char, PATH_MAX> gUnfinished{};
 
+/// The signals that end no program, or that no program can do anything about. All others do when they
+/// find no handler.
+constexpr std::array<int, 9> kHarmless{SIGKILL, SIGSTOP, SIGTSTP, SIGTTIN, SIGTTOU,
+                                       SIGCONT, SIGCHLD, SIGURG,  SIGWINCH};
+
+bool isErrorOfWriting(int number) {
+    return number == SIGPIPE || number == SIGXFSZ;
+}
+
 sigset_t heldSet() {
     sigset_t set;
-    sigemptyset(&set);
-    for (const int number : kSignals)
-        sigaddset(&set, number);
+    sigfillset(&set);
+    for (const int number : kHarmless)
+        sigdelset(&set, number);
     return set;
 }
 
@@ -34,14 +41,21 @@ extern "C" void cleanUp(int number) {
 }  // namespace
 
 void cleanUpOnSignals() {
+    const sigset_t ending = heldSet();
     struct sigaction action {};
     action.sa_handler = cleanUp;
-    action.sa_mask = heldSet();
+    action.sa_mask = ending;
     action.sa_flags = static_cast<int>(SA_RESETHAND);
-    for (const int number : kSignals) {
+    for (int number = 1; number <= SIGRTMAX; ++number) {
+        if (sigismember(&ending, number) != 1) continue;
         struct sigaction before {};
-        ::sigaction(number, nullptr, &before);
-        if (before.sa_handler != SIG_IGN) ::sigaction(number, &action, nullptr);
+        // Some have handlers already: a sanitizer's, for faults.
+        if (::sigaction(number, nullptr, &before) != 0 || before.sa_handler != SIG_DFL) continue;
+        if (isErrorOfWriting(number)) {
+            std::signal(number, SIG_IGN);
+        } else {
+            ::sigaction(number, &action, nullptr);
+        }
     }
 }
 

@@ -3,11 +3,12 @@
 #include <csignal>
 #include <string>
 
-/// Leaving nothing half-written behind when SIGINT, SIGTERM or SIGHUP ends the program.
+/// Leaving nothing half-written behind when a signal ends the program.
 namespace vorelpaint {
 
-/// Makes those signals remove the unfinished file and the status before they end the program as usual.
-/// One that was ignored stays ignored.
+/// Makes every signal that ends the program, and can be caught, remove the unfinished file and the
+/// status before it does so as usual. One that was ignored stays ignored. SIGPIPE and SIGXFSZ end
+/// nothing any more: writing fails with their error instead.
 void cleanUpOnSignals();
 
 /// While it lives those signals wait.

@@ -2,9 +2,6 @@
 
 #include <sys/stat.h>
 
-#include <cerrno>
-#include <cstring>
-
 #include "error.h"
 
 namespace vorelpaint {
@@ -13,16 +10,13 @@ namespace {
 /// What never ends a line is no list of lines.
 constexpr size_t kLongestLine = size_t{1} << 26;
 
-bool isBlank(int c) {
-    return c == ' ' || c == '\t' || c == '\r';
-}
-
 }  // namespace
 
 LineReader::LineReader(const std::string& path)
-    : mName(path == "-" ? "standard input" : "'" + path + "'"),
+    : mName(path == "-" ? "standard input" : inQuotes(path)),
       mFile(path == "-" ? stdin : std::fopen(path.c_str(), "rb")) {
-    if (mFile == nullptr) throw ToolError("cannot read " + mName + ": " + std::strerror(errno));
+    if (mFile == nullptr) failWithErrno("cannot read " + mName);
+    if (canRewind()) mStart = std::ftell(mFile);
 }
 
 LineReader::~LineReader() {
@@ -42,29 +36,19 @@ std::optional<std::string> LineReader::next(size_t maxBytes) {
                             std::to_string(kLongestLine) + " bytes");
         }
     }
-    if (std::ferror(mFile) != 0) throw ToolError("cannot read " + mName + ": " + std::strerror(errno));
+    if (std::ferror(mFile) != 0) failWithErrno("cannot read " + mName);
     return line;
 }
 
-size_t LineReader::countAhead() {
+bool LineReader::canRewind() const {
     struct stat status {};
-    if (::fstat(::fileno(mFile), &status) != 0 || !S_ISREG(status.st_mode)) return 0;
-    const long here = std::ftell(mFile);
-    size_t count = 0;
-    bool counted = false;  // the line that is being read
-    for (int c = std::getc(mFile); c != EOF; c = std::getc(mFile)) {
-        if (c == '\n') {
-            counted = false;
-        } else if (!counted && !isBlank(c)) {
-            counted = true;
-            ++count;
-        }
-    }
+    return ::fstat(::fileno(mFile), &status) == 0 && S_ISREG(status.st_mode);
+}
+
+void LineReader::rewind() {
     std::clearerr(mFile);
-    if (std::fseek(mFile, here, SEEK_SET) != 0) {
-        throw ToolError("cannot read " + mName + ": " + std::strerror(errno));
-    }
-    return count;
+    if (std::fseek(mFile, mStart, SEEK_SET) != 0) failWithErrno("cannot read " + mName);
+    mNumber = 0;
 }
 
 }  // namespace vorelpaint

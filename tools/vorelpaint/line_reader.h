@@ -22,12 +22,16 @@ class LineReader {
     /// The number of the line that was read last, from 1.
     size_t number() const { return mNumber; }
 
-    /// How many lines with anything but blanks follow; 0 when only reading them would tell.
-    size_t countAhead();
+    /// Whether it can be read anew: a pipe cannot.
+    bool canRewind() const;
+
+    /// Goes back to where it began.
+    void rewind();
 
   private:
     std::string mName;
     std::FILE* mFile;
+    long mStart = 0;  ///< in a file that others may have read before
     size_t mNumber = 0;
 };
 

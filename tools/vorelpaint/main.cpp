@@ -1,8 +1,8 @@
 #include <exception>
 #include <filesystem>
-#include <iostream>
 #include <new>
 #include <optional>
+#include <sstream>
 #include <string>
 
 #include "batch.h"
@@ -34,21 +34,32 @@ using voreltext::TextLayout;
 constexpr int kFailed = 2;
 
 void printPresets() {
+    std::string lines;
     for (const std::string& name : presetNames()) {
-        std::cout << name << std::string(name.size() < 12 ? 12 - name.size() : 1, ' ')
-                  << loadStyle(findPreset(name)).description << '\n';
+        lines += name + std::string(name.size() < 12 ? 12 - name.size() : 1, ' ') +
+                 vorelstyle::printable(loadStyle(findPreset(name)).description) + "\n";
     }
+    print(lines);
 }
 
 void printMargins(const Margins& margins) {
-    std::cout << "margins left " << margins.left << " top " << margins.top << " right " << margins.right
-              << " bottom " << margins.bottom << '\n';
+    print("margins left " + std::to_string(margins.left) + " top " + std::to_string(margins.top) +
+          " right " + std::to_string(margins.right) + " bottom " + std::to_string(margins.bottom) +
+          "\n");
 }
 
 void printCpp(const Options& options, const Style& style) {
     const std::string name = options.preset.value_or(std::filesystem::path(style.name).stem().string());
-    vorelstyle::writeCpp(std::cout, vorelstyle::functionName(name), style, chosenFill(options, style),
+    std::ostringstream source;
+    vorelstyle::writeCpp(source, vorelstyle::functionName(name), style, chosenFill(options, style),
                          chosenOpacity(options, style), imagesOf(style));
+    print(source.str());
+}
+
+void printExplanation(const Options& options, const Style& style, Look& look, const TextLayout* text) {
+    std::ostringstream lines;
+    explain(lines, options, style, look, text);
+    print(lines.str());
 }
 
 /// What is printed about a look, and its picture.
@@ -56,16 +67,16 @@ void present(const Options& options) {
     const Style style = chosenStyle(options);
     Look look = makeLook(options, style, say);
     if (options.writeCpp) printCpp(options, style);
-    if (options.printKey) std::cout << "key " << vorelstyle::hexadecimal(look.key()) << '\n';
+    if (options.printKey) print("key " + vorelstyle::hexadecimal(look.key()) + "\n");
     if (options.printMargins) printMargins(marginsOf(look.effects()));
     if (!options.text && !options.textFile) {
-        if (options.explain) explain(std::cout, options, style, look, nullptr);
+        if (options.explain) printExplanation(options, style, look, nullptr);
         return;
     }
     if (!options.explain && !options.output) return;
     const Font font(findFont(options.font), options.size);
     const TextLayout text = layOutText(options, font, say);
-    if (options.explain) explain(std::cout, options, style, look, &text);
+    if (options.explain) printExplanation(options, style, look, &text);
     if (options.output) writePicture(options, paint(look.effects(), text, options.padding));
 }
 
@@ -78,11 +89,11 @@ void runBatch(const Options& options) {
 
 void run(const Options& options) {
     if (options.version) {
-        std::cout << "vorelpaint " << VOREL_VERSION_STRING << '\n';
+        print(std::string("vorelpaint ") + VOREL_VERSION_STRING + "\n");
     } else if (options.manual) {
-        std::cout << manualPage();
+        print(manualPage());
     } else if (options.completion) {
-        std::cout << completionScript(*options.completion);
+        print(completionScript(*options.completion));
     } else if (options.listPresets) {
         printPresets();
     } else if (options.batch) {
@@ -99,7 +110,6 @@ int runProgram(int argc, const char* const* argv) {
     try {
         const std::optional<Options> options = parseOptions(argc, argv);
         if (options) run(*options);
-        if (!std::cout.flush()) throw ToolError("cannot write standard output");
         return 0;
     } catch (const std::bad_alloc&) {
         say("not enough memory");

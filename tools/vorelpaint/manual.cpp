@@ -101,7 +101,7 @@ std::string allExamples() {
 
 std::string manualPage() {
     std::string roff =
-        ".TH VORELPAINT 1 \"\" \"vorelpaint " + std::string(VOREL_VERSION_STRING) + "\"\n";
+        ".TH VORELPAINT 1 " VOREL_RELEASE_DATE " \"vorelpaint " VOREL_VERSION_STRING "\"\n";
     roff += ".SH NAME\nvorelpaint \\- paint text with effects into a PNG file\n";
     roff += ".SH SYNOPSIS\n" + bold("vorelpaint") + " [" + italic("options") + "] [" + italic("TEXT") +
             "]\n";

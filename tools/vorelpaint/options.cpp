@@ -1,13 +1,17 @@
 #include "options.h"
 
 #include <CLI/CLI.hpp>
+#include <algorithm>
 #include <array>
 #include <memory>
 #include <utility>
+#include <vector>
 
+#include "console.h"
 #include "error.h"
 #include "help_text.h"
 #include "settings.h"
+#include "style/vorelstyle.h"
 
 namespace vorelpaint {
 
@@ -85,6 +89,25 @@ void checkOutput(const Options& options) {
     }
 }
 
+/// What is wrong with words that nothing was found for: an option, or else a second text.
+std::string faultOf(const std::vector<std::string>& words) {
+    const auto option = std::find_if(words.begin(), words.end(),
+                                     [](const std::string& word) { return word.front() == '-'; });
+    if (option == words.end()) {
+        return inQuotes(words.front()) +
+               " is one text too many; quotes keep the words of a text together";
+    }
+    const std::string given = option->substr(0, option->find('='));
+    std::vector<std::string> names;
+    for (const Setting& setting : settings()) {
+        if (!setting.isPositional) names.push_back(setting.name);
+    }
+    const std::string meant =
+        vorelstyle::nearest(given.substr(std::min(given.find_first_not_of('-'), given.size())), names);
+    return "no option " + inQuotes(given) +
+           (meant.empty() ? "; --help lists them" : "; did you mean --" + meant + "?");
+}
+
 /// Standard input can be read once, but each job reads what it is told to.
 void checkBatch(const Options& options) {
     if (options.textFile == "-" || options.style == "-") {
@@ -112,9 +135,11 @@ std::optional<Options> parseOptions(int argc, const char* const* argv) {
         app.get_option(one)->excludes(app.get_option(other));
     try {
         app.parse(argc, argv);
-    } catch (const CLI::Success& answer) {
-        app.exit(answer);
+    } catch (const CLI::Success&) {
+        print(app.help());
         return std::nullopt;
+    } catch (const CLI::ExtrasError&) {
+        throw ToolError(faultOf(app.remaining()));
     } catch (const CLI::ParseError& error) {
         throw ToolError(error.what());
     }

@@ -7,6 +7,7 @@
 #include "file_io.h"
 #include "font_choice.h"
 #include "png_io.h"
+#include "ranges.h"
 #include "style_file.h"
 
 namespace vorelpaint {
@@ -17,8 +18,6 @@ using vorelstyle::Style;
 using voreltext::Font;
 using voreltext::Image;
 using voreltext::TextLayout;
-
-constexpr size_t kMaxTextBytes = size_t{1} << 16;
 
 Style namedStyle(const Options& options) {
     if (options.inlineStyle) return *options.inlineStyle;

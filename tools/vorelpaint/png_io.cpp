@@ -2,17 +2,18 @@
 
 #include <png.h>
 
+#include <cerrno>
+#include <cstring>
 #include <memory>
 #include <string>
 
 #include "error.h"
+#include "ranges.h"
 
 namespace vorelpaint {
 namespace {
 
 using voreltext::Image;
-
-constexpr png_uint_32 kMaxSide = 4096;
 
 /// libpng's record of one picture; what it holds is freed with it.
 class PngRecord {
@@ -40,8 +41,9 @@ Image readPng(const std::filesystem::path& path) {
     if (png_image_begin_read_from_file(png.get(), path.c_str()) == 0) {
         throw ToolError(name + " is no readable PNG: " + png->message);
     }
-    if (png->width > kMaxSide || png->height > kMaxSide) {
-        throw ToolError(name + " has more than " + std::to_string(kMaxSide) + " pixels on a side");
+    if (png->width > kMaxPatternSide || png->height > kMaxPatternSide) {
+        throw ToolError(name + " has more than " + std::to_string(kMaxPatternSide) +
+                        " pixels on a side");
     }
     png->format = PNG_FORMAT_RGBA;
     Image image{static_cast<int>(png->width), static_cast<int>(png->height), {}};
@@ -57,9 +59,11 @@ void writePng(std::FILE* file, const Image& image) {
     png->width = static_cast<png_uint_32>(image.width);
     png->height = static_cast<png_uint_32>(image.height);
     png->format = PNG_FORMAT_RGBA;
-    if (png_image_write_to_stdio(png.get(), file, 0, image.pixels.data(), 0, nullptr) == 0) {
-        throw ToolError(png->message);
-    }
+    const bool written =
+        png_image_write_to_stdio(png.get(), file, 0, image.pixels.data(), 0, nullptr) != 0;
+    // The system's reason tells more than libpng's "Write Error".
+    if (std::ferror(file) != 0) throw ToolError(std::strerror(errno));
+    if (!written) throw ToolError(png->message);
 }
 
 }  // namespace vorelpaint

@@ -9,6 +9,8 @@
 #include <type_traits>
 
 #include "error.h"
+#include "output_name.h"
+#include "ranges.h"
 
 namespace vorelpaint {
 namespace {
@@ -32,21 +34,19 @@ Read text(Member Options::*member) {
 
 /// Reads decimal numbers and nothing around them.
 template <typename Number, typename Member>
-Read numberFrom(Number low, Number high, Member Options::*member) {
+Read numberWithin(const Limits<Number>& limits, Member Options::*member) {
     return [=](Options& options, const std::string& given) {
         Number number{};
         const char* end = given.data() + given.size();
         const auto [stop, error] = std::from_chars(given.data(), end, number);
         const bool whole = error == std::errc{} && stop == end;
         // "nan" is a number here; it fails both comparisons.
-        if (whole && number >= low && number <= high) {
+        if (whole && number >= limits.low && number <= limits.high) {
             options.*member = number;
             return;
         }
-        std::ostringstream reason;
-        reason << (std::is_integral_v<Number> ? "no whole number from " : "no number from ") << low
-               << " to " << high;
-        refuse(given, reason.str());
+        refuse(given, (std::is_integral_v<Number> ? "no whole number from " : "no number from ") +
+                          spelled(limits));
     };
 }
 
@@ -72,14 +72,20 @@ std::optional<std::string> parseShell(const std::string& text) {
     return std::nullopt;
 }
 
+std::optional<std::string> parseOutput(const std::string& text) {
+    if (namesOtherKind(text)) return std::nullopt;
+    return text;
+}
+
 /// An option that paints a picture, of a job as well as of the command line.
 Setting pictureOption(const char* name, const char* value, const char* initial, const char* group,
-                      const char* description, Read read, Setting::Kind kind = Setting::Kind::text) {
+                      const std::string& description, Read read,
+                      Setting::Kind kind = Setting::Kind::text) {
     return {name, "", value, initial, group, description, kind, true, false, std::move(read)};
 }
 
 Setting pictureNumber(const char* name, const char* value, const char* initial, const char* group,
-                      const char* description, Read read) {
+                      const std::string& description, Read read) {
     return pictureOption(name, value, initial, group, description, std::move(read),
                          Setting::Kind::number);
 }
@@ -96,15 +102,16 @@ std::vector<Setting> textSettings() {
     Setting words = pictureOption("text", "TEXT", "", kGroup, "The text; a line feed starts a new line",
                                   text(&Options::text));
     words.isPositional = true;
-    return {words,
-            pictureOption("text-file", "FILE", "", kGroup,
-                          "Read the text from FILE, - for standard input", text(&Options::textFile)),
-            pictureOption("font", "FONT", "DejaVu Sans", kGroup,
-                          "Font file, or family such as 'DejaVu Sans:bold'", text(&Options::font)),
-            pictureNumber("size", "PX", "96", kGroup, "Size of the font in pixels",
-                          numberFrom(1, 1000, &Options::size)),
-            pictureOption("align", "left|center|right", "left", kGroup, "Where short lines stand",
-                          parsed(parseAlign, &Options::align, "none of left, center, right"))};
+    return {
+        words,
+        pictureOption("text-file", "FILE", "", kGroup, "Read the text from FILE, - for standard input",
+                      text(&Options::textFile)),
+        pictureOption("font", "FONT", "DejaVu Sans", kGroup,
+                      "Font file, or family such as 'DejaVu Sans:bold'", text(&Options::font)),
+        pictureNumber("size", "PX", "96", kGroup, "Size of the font in pixels, " + spelled(kFontSize),
+                      numberWithin(kFontSize, &Options::size)),
+        pictureOption("align", "left|center|right", "left", kGroup, "Where short lines stand",
+                      parsed(parseAlign, &Options::align, "none of left, center, right"))};
 }
 
 std::vector<Setting> lookSettings() {
@@ -114,28 +121,31 @@ std::vector<Setting> lookSettings() {
             pictureOption("preset", "PRESET", "", kGroup, "Take the effects of a preset",
                           text(&Options::preset)),
             pictureNumber("effect-scale", "FACTOR", "1", kGroup,
-                          "Multiply the effects' sizes; presets are made for text of about 100 pixels",
-                          numberFrom(0.05F, 20.0F, &Options::effectScale)),
+                          "Multiply the effects' sizes by " + spelled(kEffectScale) +
+                              "; presets are made for text of about 100 pixels",
+                          numberWithin(kEffectScale, &Options::effectScale)),
             pictureOption("color", "#RRGGBB", "", kGroup, "Fill of the text (the style's, else #000000)",
-                          parsed(parseColour, &Options::color, "no colour; write #RRGGBB")),
+                          parsed(parseColour, &Options::color, "no colour; write #RRGGBB or #RGB")),
             pictureNumber("opacity", "NUMBER", "", kGroup,
-                          "Opacity of the text, 0 to 1 (the style's, else 1)",
-                          numberFrom(0.0F, 1.0F, &Options::opacity))};
+                          "Opacity of the text, " + spelled(kOpacity) + " (the style's, else 1)",
+                          numberWithin(kOpacity, &Options::opacity))};
 }
 
 std::vector<Setting> outputSettings() {
     constexpr const char* kGroup = "Picture";
     Setting output =
         pictureOption("output", "FILE", "", kGroup, "The PNG file to write, - for standard output",
-                      text(&Options::output));
+                      parsed(parseOutput, &Options::output,
+                             "named like another kind of file; only PNG is written: end it with .png"));
     output.letter = "o";
     return {output,
             pictureOption("background", "transparent|checkerboard|#RRGGBB", "transparent", kGroup,
                           "What lies behind the text",
                           parsed(parseBackground, &Options::background,
-                                 "none of transparent, checkerboard, #RRGGBB")),
-            pictureNumber("padding", "PX", "8", kGroup, "Pixels around the text and its effects",
-                          numberFrom(0, 1000, &Options::padding))};
+                                 "none of transparent, checkerboard, #RRGGBB, #RGB")),
+            pictureNumber("padding", "PX", "8", kGroup,
+                          "Pixels around the text and its effects, " + spelled(kPadding),
+                          numberWithin(kPadding, &Options::padding))};
 }
 
 std::vector<Setting> seriesSettings() {

@@ -6,6 +6,7 @@
 #include "error.h"
 #include "file_io.h"
 #include "png_io.h"
+#include "ranges.h"
 
 namespace vorelpaint {
 namespace {
@@ -16,8 +17,6 @@ using vorelstyle::LoadImage;
 using vorelstyle::PatternImage;
 using vorelstyle::Style;
 using vorelstyle::StyleError;
-
-constexpr size_t kMaxStyleBytes = size_t{1} << 17;
 
 /// The presets installed with the running program, or else those that it was built beside.
 fs::path presetDir() {

@@ -178,7 +178,9 @@ TEST(StyleReader, Relief_ReadsEveryArgument) {
 }
 
 TEST(StyleReader, UnknownEffect_IsNamed) {
-    EXPECT_EQ(faultOf(R"({"outershadow": {}})").rfind("outershadow: unknown key; known are ", 0), 0U);
+    EXPECT_EQ(faultOf(R"({"outershadow": {}})")
+                  .rfind("outershadow: unknown key; did you mean outerShadow? Known are ", 0),
+              0U);
 }
 
 TEST(StyleReader, UnknownKeyBeyondAscii_IsEscaped) {
@@ -192,7 +194,7 @@ TEST(StyleReader, EmptyKey_IsShownInItsQuotes) {
 
 TEST(StyleReader, UnknownArgument_IsNamedBeforeAMissingOne) {
     EXPECT_EQ(faultOf(R"({"text": {"colour": "#000000"}})"),
-              "text.colour: unknown key; known are color, opacity");
+              "text.colour: unknown key; did you mean color? Known are color, opacity");
 }
 
 TEST(StyleReader, UnknownKeyOfAStop_IsNamedWithItsPlace) {
@@ -280,11 +282,15 @@ TEST(StyleReader, StopsThatStepBack_AreRefused) {
               "precedes it");
 }
 
+TEST(StyleReader, ShortColours_AreRead) {
+    EXPECT_EQ(parseStyle(R"({"color": "#F80"})").color, 0xFF8800U);
+}
+
 TEST(StyleReader, BadColours_AreQuoted) {
     for (const char* colour :
-         {"red", "#12345", "#1234567", "#12345G", "123456", "#+12345", "# 12345", ""}) {
+         {"red", "#12", "#1234", "#12345", "#1234567", "#12345G", "123456", "#+12345", "# 12345", ""}) {
         EXPECT_EQ(faultOf(std::string(R"({"color": ")") + colour + R"("})"),
-                  std::string("color: \"") + colour + "\" is no colour; write \"#RRGGBB\"");
+                  std::string("color: \"") + colour + "\" is no colour; write \"#RRGGBB\" or \"#RGB\"");
     }
 }
 

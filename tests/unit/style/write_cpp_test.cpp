@@ -35,6 +35,12 @@ TEST(WriteCppText, Description_StaysInItsComment) {
     EXPECT_NE(text.find("/// a int evil;\\.\n"), std::string::npos) << text;
 }
 
+TEST(WriteCppText, Description_CannotReorderTheSource) {
+    const std::string text = writtenOf(R"({"description": "a \u202e} \u2066b\u0085c\u2028int evil;"})");
+    EXPECT_NE(text.find("/// a <U+202E>} <U+2066>b<U+0085>c<U+2028>int evil;.\n"), std::string::npos)
+        << text;
+}
+
 TEST(WriteCppText, Pattern_IsWrittenWithItsPixels) {
     const auto onePixel = [](const std::string&) { return PatternImage{1, 1, {10, 20, 30, 40}}; };
     std::ostringstream out;

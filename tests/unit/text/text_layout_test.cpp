@@ -75,6 +75,41 @@ TEST_F(TextLayoutTest, EmptyLine_KeepsItsHeight) {
                 static_cast<double>(mFont.lineHeight()) / 64, 1.0);
 }
 
+TEST_F(TextLayoutTest, EveryLineEnd_StartsALine) {
+    const Box expected = layOut("I\nII\n\nI").inkBox();
+    for (const std::string end : {"\r", "\r\n", "\xC2\x85", "\xE2\x80\xA8", "\xE2\x80\xA9"}) {
+        const TextLayout text = layOut("I" + end + "II" + end + end + "I");
+        EXPECT_EQ(text.glyphCount(), 4U);
+        EXPECT_EQ(text.missingGlyphs(), 0U);
+        EXPECT_EQ(text.inkBox().width(), expected.width());
+        EXPECT_EQ(text.inkBox().height(), expected.height());
+    }
+    EXPECT_EQ(layOut("I\n\rI").inkBox().height(), layOut("I\n\nI").inkBox().height());
+}
+
+TEST_F(TextLayoutTest, OtherControlCharacters_AreRefusedWithTheirPlace) {
+    const auto faultOf = [&](const std::string& text) -> std::string {
+        try {
+            layOut(text);
+            return "";
+        } catch (const TextError& error) {
+            return error.what();
+        }
+    };
+    const std::string fault = "the text has the control character ";
+    EXPECT_EQ(faultOf("A\x1B[31mB"), fault + "U+001B in line 1, character 2");
+    EXPECT_EQ(faultOf(std::string("A\0", 2)), fault + "U+0000 in line 1, character 2");
+    EXPECT_EQ(faultOf("A\r\n\xC3\xA9\xC3\xA9\xC2\x9B"), fault + "U+009B in line 2, character 3");
+    EXPECT_EQ(faultOf("\n\r\x7F"), fault + "U+007F in line 3, character 1");
+    for (int code = 0; code < 0xA0; ++code) {
+        if (code == 0x20) code = 0x7F;
+        const bool allowed = code == '\t' || code == '\n' || code == '\r' || code == 0x85;
+        const auto low = static_cast<char>(code);
+        const std::string text = code < 0x80 ? "A" + std::string(1, low) : std::string("A\xC2") + low;
+        EXPECT_EQ(faultOf(text).empty(), allowed) << code;
+    }
+}
+
 TEST_F(TextLayoutTest, Align_MovesTheShortLine) {
     const auto shortLine = [&](Align align) { return rasterisedBox(layOut("MMMM\nM", align), 4); };
     const int left = shortLine(Align::left).left;

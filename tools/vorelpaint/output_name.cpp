@@ -1,0 +1,49 @@
+#include "output_name.h"
+
+#include <algorithm>
+#include <array>
+#include <filesystem>
+#include <system_error>
+
+#include "file_io.h"
+
+namespace vorelpaint {
+namespace {
+
+namespace fs = std::filesystem;
+
+/// Pictures, documents and films; and what the program itself reads and prints, which a forgotten value
+/// would let it overwrite.
+constexpr std::array<std::string_view, 44> kOtherKinds{
+    "jpg",  "jpeg", "jpe", "jfif", "jp2",  "jxl",  "gif",   "webp", "avif", "heic", "heif",
+    "bmp",  "dib",  "ico", "tif",  "tiff", "tga",  "ppm",   "pgm",  "pbm",  "pnm",  "pam",
+    "qoi",  "dds",  "exr", "hdr",  "psd",  "xcf",  "svg",   "svgz", "pdf",  "ps",   "eps",
+    "apng", "mng",  "mp4", "webm", "html", "json", "jsonl", "txt",  "cpp",  "ttf",  "otf"};
+
+/// The file itself that a path leads to; the path as far as that cannot be told.
+std::string resolved(const std::string& path) {
+    std::error_code error;
+    const fs::path whole = fs::absolute(path, error);
+    const fs::path file = fs::weakly_canonical(followLinks(whole), error);
+    return (error ? whole : file).lexically_normal().string();
+}
+
+}  // namespace
+
+bool namesOtherKind(std::string_view path) {
+    const size_t dot = path.find_last_of("./");
+    if (dot == std::string_view::npos || path[dot] != '.') return false;
+    std::string kind(path.substr(dot + 1));
+    std::transform(kind.begin(), kind.end(), kind.begin(),
+                   [](char c) { return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c; });
+    return std::find(kOtherKinds.begin(), kOtherKinds.end(), kind) != kOtherKinds.end();
+}
+
+std::optional<size_t> OutputNames::claim(const std::string& path, size_t line) {
+    std::error_code ignored;
+    if (fs::exists(path, ignored) && !fs::is_regular_file(path, ignored)) return std::nullopt;
+    const auto [first, isNew] = mLines.try_emplace(resolved(path), line);
+    return isNew ? std::nullopt : std::optional<size_t>(first->second);
+}
+
+}  // namespace vorelpaint

@@ -1,0 +1,26 @@
+#pragma once
+
+#include <cstddef>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <unordered_map>
+
+namespace vorelpaint {
+
+/// Whether a file name ends like another kind of file than PNG. Endings that say nothing, such as those
+/// of mktemp, do not.
+bool namesOtherKind(std::string_view path);
+
+/// The files that the jobs of a batch write.
+class OutputNames {
+  public:
+    /// Notes that a line writes to `path`; the line that does so already, if one does. Paths are the
+    /// same that lead to the same file, also through links. Devices and pipes are for all.
+    std::optional<size_t> claim(const std::string& path, size_t line);
+
+  private:
+    std::unordered_map<std::string, size_t> mLines;
+};
+
+}  // namespace vorelpaint

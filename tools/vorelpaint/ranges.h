@@ -1,0 +1,35 @@
+#pragma once
+
+#include <cstddef>
+#include <sstream>
+#include <string>
+
+/// What can be asked for at most; help and manual name the same.
+namespace vorelpaint {
+
+/// From `low` to `high`, both taken.
+template <typename Number>
+struct Limits {
+    Number low;
+    Number high;
+};
+
+constexpr Limits<int> kFontSize{1, 1000};
+constexpr Limits<int> kPadding{0, 1000};
+constexpr Limits<float> kEffectScale{0.05F, 20.0F};
+constexpr Limits<float> kOpacity{0.0F, 1.0F};
+
+constexpr size_t kMaxTextBytes = size_t{1} << 16;
+constexpr size_t kMaxStyleBytes = size_t{1} << 17;
+constexpr size_t kMaxJobBytes = size_t{1} << 18;  ///< room for the largest text and the largest style
+constexpr unsigned int kMaxPatternSide = 4096;    ///< of a picture that is read
+
+/// "1 to 1000".
+template <typename Number>
+std::string spelled(const Limits<Number>& limits) {
+    std::ostringstream text;
+    text << limits.low << " to " << limits.high;
+    return text.str();
+}
+
+}  // namespace vorelpaint
