@@ -5,7 +5,9 @@
 #include "core/effect_types.h"
 #include "core/numeric.h"
 #include "core/size_limit.h"
+#include "core/windows.h"
 #include "cores/paint_input.h"
+#include "cores/painters.h"
 #include "cores/placed_target.h"
 #include "cores/property_copy.h"
 #include "cores/stroke_shape.h"
@@ -19,18 +21,29 @@ using namespace internal;
 
 namespace {
 
-/// The outline's coverage, a band of rows at a time; empty when memory ran out. What is centred lies
-/// within the disc's radius of the edge on both sides of it.
+/// The outline's coverage in a window, a band of rows at a time; empty when memory ran out. What is
+/// centred lies within the disc's radius of the edge on both sides of it.
 class Outline {
   public:
-    Outline(CpuLevel level, const CoverageBox& box, const DiscShape& disc, const Box& part,
-            const StrokeShape& shape)
-        : mGrown(level, box.rows(shape.growsGlyph ? kAsIs : kInverse), disc, part) {
-        if (shape.side == StrokeSide::centre) mInverse.emplace(level, box.rows(kInverse), disc, part);
+    static int64_t memoryBytes(CpuLevel level, const CoverageBox& box, const DiscShape& disc,
+                               const StrokeShape& shape, const Windows& windows) {
+        const int64_t plans = shape.side == StrokeSide::centre ? 2 : 1;
+        return plans * DilationPlan::memoryBytes(level, {box.rows(), disc}, windows);
+    }
+
+    Outline(CpuLevel level, const CoverageBox& box, const DiscShape& disc, const StrokeShape& shape,
+            const Windows& windows)
+        : mGrown(level, {box.rows(shape.growsGlyph ? kAsIs : kInverse), disc}, windows) {
+        if (shape.side == StrokeSide::centre)
+            mInverse.emplace(level, DilationInput{box.rows(kInverse), disc}, windows);
     }
 
     explicit operator bool() const { return mGrown && (!mInverse || *mInverse); }
-    int64_t left() const { return mGrown.left(); }
+
+    void begin(const Box& window) {
+        mGrown.begin(window);
+        if (mInverse) mInverse->begin(window);
+    }
     int64_t bandRows() const { return mGrown.bandRows(); }
     CoverageRows rows(int64_t y, int64_t count) {
         return mInverse ? mGrown.minRows(*mInverse, y, count) : mGrown.rows(y, count);
@@ -50,27 +63,38 @@ int VFStroke::getOffset() {
 }
 
 void VFStroke::doPostProcessing(ParamPostProcessing* params) {
+    if (mProperty != nullptr) paintStroke(params, *mProperty);
+}
+
+void internal::paintStroke(const VFECore::ParamPostProcessing* params, const VFStrokeProperty& record,
+                           int64_t workingBytes) {
     const CoverageBox box = coverageOf(params);
-    if (!box || mProperty == nullptr || exceedsSizeLimit(mProperty->mSize)) return;
-    const StrokeShape shape(*mProperty);
+    if (!box || exceedsSizeLimit(record.mSize)) return;
+    const StrokeShape shape(record);
     const DiscShape disc(shape.radiusPx);
     if (!disc) return;
     const CpuLevel level = chosenLevel();
     const PlacedTarget targets[] = {{level, params->dstBitmap, box.left, box.top},
                                     {level, params->subDstBitmap, box.left, box.top}};
-    const Box reached = DilationPlan::reached(box.rows(), disc);
+    const Box reached = DilationPlan::reached({box.rows(), disc});
     const Box visible = boundingBox(targets[0].seen(reached), targets[1].seen(reached));
     if (visible.empty()) return;
-    Outline outline(level, box, disc, visible, shape);
+    const Windows windows = windowsWithin(workingBytes, visible, [&](const Windows& cut) {
+        return Outline::memoryBytes(level, box, disc, shape, cut);
+    });
+    Outline outline(level, box, disc, shape, windows);
     if (!outline) return;
 
     const bool overText = shape.side == StrokeSide::centre && params->useOuterLayer != 1;
     const auto rule = overText ? &BlendLoops::srcOverMask : &BlendLoops::dstOverMask;
-    for (int64_t y = visible.top; y < visible.bottom; y += outline.bandRows()) {
-        const CoverageRows band = outline.rows(y, std::min(outline.bandRows(), visible.bottom - y));
-        for (const PlacedTarget& target : targets)
-            target.paintCoverage(rule, band, outline.left(), y, mProperty->mColor);
-    }
+    windows.forEach([&](const Box& window) {
+        outline.begin(window);
+        for (int64_t y = window.top; y < window.bottom; y += outline.bandRows()) {
+            const CoverageRows band = outline.rows(y, std::min(outline.bandRows(), window.bottom - y));
+            for (const PlacedTarget& target : targets)
+                target.paintCoverage(rule, band, window.left, y, record.mColor);
+        }
+    });
 }
 
 }  // namespace VFontEffect

@@ -21,11 +21,11 @@ namespace {
 
 using namespace VFontEffect::internal;
 
-/// Appends the rows' values from column `first` on, as they are to be taken.
-void append(const CoverageRows& rows, int64_t first, std::vector<uint8_t>& values) {
+/// Appends the rows' values as they are to be taken.
+void append(const CoverageRows& rows, std::vector<uint8_t>& values) {
     for (int64_t y = 0; y < rows.height; ++y) {
         for (int64_t x = 0; x < rows.width; ++x) {
-            const uint8_t value = rows.start[y * rows.stride + first + x];
+            const uint8_t value = rows.start[y * rows.stride + x];
             values.push_back(static_cast<uint8_t>(value ^ rows.invertMask));
         }
     }
@@ -38,7 +38,7 @@ std::vector<uint8_t> collected(Blur& blur, const Box& window, int64_t bandRows) 
     for (int64_t y = window.top; y < window.bottom; y += bandRows) {
         const BlurredRows band = blur.rows(y);
         const int64_t count = std::min(bandRows, window.bottom - y);
-        append({band.values, band.stride, window.width(), count, kAsIs}, 0, values);
+        append({band.values, band.stride, window.width(), count, kAsIs}, values);
     }
     return values;
 }
@@ -72,7 +72,7 @@ std::vector<uint8_t> blurred(const BlurInput& input) {
     if (!plan) return {};
     std::vector<uint8_t> values;
     forBands(plan, input.window, [&](const Box& band, const BlurredRows& rows) {
-        append({rows.values, rows.stride, band.width(), band.height(), kAsIs}, 0, values);
+        append({rows.values, rows.stride, band.width(), band.height(), kAsIs}, values);
     });
     return values;
 }
@@ -84,18 +84,18 @@ bool blursByDotsAlone() {
 
 std::vector<uint8_t> dilated(const CoverageRows& source, const DiscShape& disc, const Box& part,
                              bool andInverse) {
-    DilationPlan plan(chosenLevel(), source, disc, part);
+    const Windows windows = Windows::oneOf(part);
+    DilationPlan plan(chosenLevel(), {source, disc}, windows);
     CoverageRows inverse = source;
     inverse.invertMask ^= kInverse;
-    DilationPlan other(chosenLevel(), inverse, disc, part);
+    DilationPlan other(chosenLevel(), {inverse, disc}, windows);
     if (!plan || !other) return {};
+    plan.begin(part);
+    other.begin(part);
     std::vector<uint8_t> values;
     for (int64_t y = part.top; y < part.bottom; y += plan.bandRows()) {
         const int64_t count = std::min(plan.bandRows(), part.bottom - y);
-        CoverageRows rows = andInverse ? plan.minRows(other, y, count) : plan.rows(y, count);
-        const int64_t before = part.left - plan.left();
-        rows.width = part.width();
-        append(rows, before, values);
+        append(andInverse ? plan.minRows(other, y, count) : plan.rows(y, count), values);
     }
     return values;
 }
@@ -104,7 +104,7 @@ std::vector<uint8_t> grown(const GrowthInput& input) {
     GrowthPlan plan(chosenLevel(), input);
     if (!plan) return {};
     std::vector<uint8_t> values;
-    append(plan.rows(-input.margin, input.source.height + 2 * input.margin), 0, values);
+    append(plan.rows(-input.margin, input.source.height + 2 * input.margin), values);
     return values;
 }
 
@@ -132,7 +132,9 @@ const char* wrongLanesOperation(uint64_t seed) {
 void askForRowsOutOfOrder() {
     const uint8_t pixel = 255;
     const DiscShape disc(1.0F);
-    DilationPlan plan(chosenLevel(), {&pixel, 1, 1, 1, kAsIs}, disc, {0, 0, 1, 2});
+    const Box part = {0, 0, 1, 2};
+    DilationPlan plan(chosenLevel(), {{&pixel, 1, 1, 1, kAsIs}, disc}, Windows::oneOf(part));
+    plan.begin(part);
     plan.rows(1, 1);
 }
 

@@ -101,7 +101,8 @@ TEST(DilationPlan, OfEveryReach_IsTheDefinedOne) {
 
 TEST(DilationPlan, ReachesOnePixelFartherThanTheDisc) {
     const CoverageRows source = {nullptr, 7, 5, 3, kAsIs};
-    EXPECT_EQ(DilationPlan::reached(source, DiscShape(4.0F)), (Box{-5, -5, 10, 8}));
+    const DiscShape disc(4.0F);
+    EXPECT_EQ(DilationPlan::reached({source, disc}), (Box{-5, -5, 10, 8}));
 }
 
 }  // namespace
