@@ -32,9 +32,10 @@ struct Dilation {
     int64_t bandRows;  ///< rows that are asked for at once; the last ones may be fewer
 };
 
-/// Rows of results are so far apart.
+/// Rows of results are so far apart: an odd number of the cache's lines, for rows that are a power of two
+/// apart share few of its places, and spreading takes 1.6 times as long.
 VOREL_INLINE int64_t dilatedStride(const Dilation& dilation) {
-    return roundedUp(dilation.right - dilation.left, 64);
+    return roundedUp(dilation.right - dilation.left, 64) | 64;
 }
 
 /// One way to dilate. Its layout stands at the beginning of its memory.
