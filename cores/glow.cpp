@@ -96,9 +96,10 @@ class ValueColours {
     const BlurWeights weights = gaussianOf128(shape.radius);
     const Box blurred = translated(window, margin, margin);
     const CoverageRows grown = growth.rows(-margin, box.height + 2 * margin);
-    BlurPlan blur(level, BlurInput::down(weights, grown, blurred, full, inverted));
+    const BlurInput input = BlurInput::down(weights, grown, blurred, full, inverted);
+    BlurPlan blur(level, input);
     if (!blur) return false;
-    forBands(blur, blurred, [&](const Box& band, const BlurredRows& rows) {
+    forBands(blur, input, [&](const Box& band, const BlurredRows& rows) {
         colours.paint(target, translated(band, -margin, -margin), rows.values, rows.stride);
     });
     return true;

@@ -4,6 +4,7 @@
 
 #include "core/windows.h"
 #include "cores/glow.h"
+#include "cores/shadow_offset.h"
 #include "voreleffect/VFECore.h"
 
 /// The cores that take working memory, as functions of it.
@@ -13,5 +14,9 @@ namespace VFontEffect::internal {
 /// All of it is taken before the first pixel is painted: without it nothing is.
 void paintStroke(const VFECore::ParamPostProcessing* params, const VFStrokeProperty& record,
                  int64_t workingBytes = kWorkingBytes);
+void paintOuterShadow(const VFECore::ParamPostProcessing* params, const VFOuterShadowProperty& record,
+                      const ShadowOffset& offset, int64_t workingBytes = kWorkingBytes);
+void paintInnerShadow(const VFECore::ParamPostProcessing* params, const VFInnerShadowProperty& record,
+                      int64_t workingBytes = kWorkingBytes);
 
 }  // namespace VFontEffect::internal

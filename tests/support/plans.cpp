@@ -21,26 +21,51 @@ namespace {
 
 using namespace VFontEffect::internal;
 
-/// Appends the rows' values as they are to be taken.
-void append(const CoverageRows& rows, std::vector<uint8_t>& values) {
-    for (int64_t y = 0; y < rows.height; ++y) {
-        for (int64_t x = 0; x < rows.width; ++x) {
-            const uint8_t value = rows.start[y * rows.stride + x];
-            values.push_back(static_cast<uint8_t>(value ^ rows.invertMask));
+/// The values of a part, which come in pieces.
+class Collected {
+  public:
+    explicit Collected(const Box& part)
+        : mPart(part), mValues(static_cast<size_t>(part.width() * part.height())) {}
+
+    /// Stores rows whose first value lies at (x, y), as they are to be taken.
+    void put(const CoverageRows& rows, int64_t x, int64_t y) {
+        for (int64_t row = 0; row < rows.height; ++row) {
+            for (int64_t i = 0; i < rows.width; ++i) {
+                const int64_t at = (y + row - mPart.top) * mPart.width() + x + i - mPart.left;
+                mValues.at(static_cast<size_t>(at)) = rows.start[row * rows.stride + i] ^ rows.invertMask;
+            }
         }
     }
+    void put(const Box& band, const BlurredRows& rows) {
+        put({rows.values, rows.stride, band.width(), band.height(), kAsIs}, band.left, band.top);
+    }
+    std::vector<uint8_t> values() const { return mValues; }
+
+  private:
+    Box mPart;
+    std::vector<uint8_t> mValues;
+};
+
+/// The input's window of that size, or as a whole.
+Windows cut(const Box& part, const WindowSize& size) {
+    if (size.width == 0) return Windows::oneOf(part);
+    return {part, std::min<int64_t>(size.width, part.width()),
+            std::min<int64_t>(size.height, part.height())};
 }
 
 template <class Blur>
-std::vector<uint8_t> collected(Blur& blur, const Box& window, int64_t bandRows) {
+std::vector<uint8_t> collected(Blur& blur, const BlurInput& input, const Windows& windows) {
     if (!blur) return {};
-    std::vector<uint8_t> values;
-    for (int64_t y = window.top; y < window.bottom; y += bandRows) {
-        const BlurredRows band = blur.rows(y);
-        const int64_t count = std::min(bandRows, window.bottom - y);
-        append({band.values, band.stride, window.width(), count, kAsIs}, values);
-    }
-    return values;
+    Collected values(input.window);
+    windows.forEach([&](const Box& window) {
+        const BlurInput part = input.of(window);
+        blur.begin(part);
+        for (int64_t y = window.top; y < window.bottom; y += blur.bandRows()) {
+            const int64_t end = std::min(y + blur.bandRows(), window.bottom);
+            values.put({window.left, y, window.right, end}, blur.rows(y));
+        }
+    });
+    return values.values();
 }
 
 void append(const TermList& list, int sign, std::vector<Term>& terms) {
@@ -57,24 +82,24 @@ void append(const TermList& list, int sign, std::vector<Term>& terms) {
 
 }  // namespace
 
-std::vector<uint8_t> blurredByDots(const BlurInput& input) {
-    DotBlur blur(dotLoops(chosenLevel()), input);
-    return collected(blur, input.window, kQuad);
+std::vector<uint8_t> blurredByDots(const BlurInput& input, const WindowSize& size) {
+    const Windows windows = cut(input.window, size);
+    DotBlur blur(dotLoops(chosenLevel()), input.largestOf(windows));
+    return collected(blur, input, windows);
 }
 
-std::vector<uint8_t> blurredByDifferences(const BlurInput& input) {
-    DifferenceBlur blur(differenceLoops(chosenLevel()), input);
-    return collected(blur, input.window, blur.bandRows());
+std::vector<uint8_t> blurredByDifferences(const BlurInput& input, const WindowSize& size) {
+    const Windows windows = cut(input.window, size);
+    DifferenceBlur blur(differenceLoops(chosenLevel()), input.largestOf(windows));
+    return collected(blur, input, windows);
 }
 
 std::vector<uint8_t> blurred(const BlurInput& input) {
     BlurPlan plan(chosenLevel(), input);
     if (!plan) return {};
-    std::vector<uint8_t> values;
-    forBands(plan, input.window, [&](const Box& band, const BlurredRows& rows) {
-        append({rows.values, rows.stride, band.width(), band.height(), kAsIs}, values);
-    });
-    return values;
+    Collected values(input.window);
+    forBands(plan, input, [&](const Box& band, const BlurredRows& rows) { values.put(band, rows); });
+    return values.values();
 }
 
 bool blursByDotsAlone() {
@@ -83,29 +108,32 @@ bool blursByDotsAlone() {
 }
 
 std::vector<uint8_t> dilated(const CoverageRows& source, const DiscShape& disc, const Box& part,
-                             bool andInverse) {
-    const Windows windows = Windows::oneOf(part);
+                             bool andInverse, const WindowSize& size) {
+    const Windows windows = cut(part, size);
     DilationPlan plan(chosenLevel(), {source, disc}, windows);
     CoverageRows inverse = source;
     inverse.invertMask ^= kInverse;
     DilationPlan other(chosenLevel(), {inverse, disc}, windows);
     if (!plan || !other) return {};
-    plan.begin(part);
-    other.begin(part);
-    std::vector<uint8_t> values;
-    for (int64_t y = part.top; y < part.bottom; y += plan.bandRows()) {
-        const int64_t count = std::min(plan.bandRows(), part.bottom - y);
-        append(andInverse ? plan.minRows(other, y, count) : plan.rows(y, count), values);
-    }
-    return values;
+    Collected values(part);
+    windows.forEach([&](const Box& window) {
+        plan.begin(window);
+        other.begin(window);
+        for (int64_t y = window.top; y < window.bottom; y += plan.bandRows()) {
+            const int64_t count = std::min(plan.bandRows(), window.bottom - y);
+            values.put(andInverse ? plan.minRows(other, y, count) : plan.rows(y, count), window.left, y);
+        }
+    });
+    return values.values();
 }
 
 std::vector<uint8_t> grown(const GrowthInput& input) {
     GrowthPlan plan(chosenLevel(), input);
     if (!plan) return {};
-    std::vector<uint8_t> values;
-    append(plan.rows(-input.margin, input.source.height + 2 * input.margin), values);
-    return values;
+    const Box all = expanded(wholeOf(input.source), input.margin);
+    Collected values(all);
+    values.put(plan.rows(all.top, all.height()), all.left, all.top);
+    return values.values();
 }
 
 std::vector<uint32_t> tiled(const ColourView& pattern, float scale, float opacity, int64_t width,

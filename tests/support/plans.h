@@ -13,10 +13,18 @@
 /// export them; the functions are none when memory ran out.
 namespace vorel_test {
 
+/// Of windows that what is wanted is cut into; 0 for no cut.
+struct WindowSize {
+    int width = 0;
+    int height = 0;
+};
+
 /// The window's values, row after row: by either strategy of the blur, and by the one that the plan
 /// chooses.
-VF_API std::vector<uint8_t> blurredByDots(const VFontEffect::internal::BlurInput& input);
-VF_API std::vector<uint8_t> blurredByDifferences(const VFontEffect::internal::BlurInput& input);
+VF_API std::vector<uint8_t> blurredByDots(const VFontEffect::internal::BlurInput& input,
+                                          const WindowSize& size = {});
+VF_API std::vector<uint8_t> blurredByDifferences(const VFontEffect::internal::BlurInput& input,
+                                                 const WindowSize& size = {});
 VF_API std::vector<uint8_t> blurred(const VFontEffect::internal::BlurInput& input);
 
 /// Whether the level takes dot products at every radius, and no differences.
@@ -26,7 +34,8 @@ VF_API bool blursByDotsAlone();
 /// its inverse, dilated likewise.
 VF_API std::vector<uint8_t> dilated(const VFontEffect::internal::CoverageRows& source,
                                     const VFontEffect::internal::DiscShape& disc,
-                                    const VFontEffect::internal::Box& part, bool andInverse);
+                                    const VFontEffect::internal::Box& part, bool andInverse,
+                                    const WindowSize& size = {});
 
 /// All that a source has grown to, with its margin, row after row.
 VF_API std::vector<uint8_t> grown(const VFontEffect::internal::GrowthInput& input);
