@@ -31,12 +31,16 @@ struct Windows {
 /// An effect takes about so much working memory at most, whatever the size of its picture.
 constexpr int64_t kWorkingBytes = 3'900'000;
 
-/// Cuts a part into windows of which memoryBytes(windows), what an operator takes for any of them, is at
-/// most `mostBytes`. A cut costs twice what lies in the operator's reach beside it, so the windows are
-/// few, and are cut on the side where that saves more: both sides of what is kept as a plane come out
-/// alike, and what is kept as some rows of a window stays as high as it is.
+/// Cuts a part into windows of which memoryBytes(windows), what an operator of that reach takes for any of
+/// them, is at most `mostBytes`, if there are any such.
+///
+/// What lies in reach beside a cut is worked out twice, so windows are few and not thin. Low ones are
+/// best, for they are painted in long rows; from a height of some reaches on they are cut on the side
+/// where that saves more memory, which for planes is the longer one. An operator that keeps some rows
+/// at a time has nothing to save by low ones.
 template <class MemoryBytes>
-Windows windowsWithin(int64_t mostBytes, const Box& part, MemoryBytes memoryBytes) {
+Windows windowsWithin(int64_t mostBytes, const Box& part, int64_t reach, MemoryBytes memoryBytes) {
+    constexpr int64_t kReachesOfLowWindow = 8;
     Windows windows = Windows::oneOf(part);
     int64_t across = 1;
     int64_t down = 1;
@@ -44,14 +48,16 @@ Windows windowsWithin(int64_t mostBytes, const Box& part, MemoryBytes memoryByte
         count += count / 8 + 1;
         return (length + count - 1) / count;
     };
-    while (memoryBytes(windows) > mostBytes && (windows.width > 1 || windows.height > 1)) {
-        const Windows narrow = {part, (windows.width + 1) / 2, windows.height};
-        const Windows low = {part, windows.width, (windows.height + 1) / 2};
-        const bool cutsAcross = windows.width > 1 && memoryBytes(narrow) <= memoryBytes(low);
-        if (cutsAcross || windows.height == 1) {
+    for (int64_t bytes = memoryBytes(windows); bytes > mostBytes; bytes = memoryBytes(windows)) {
+        const int64_t narrow = memoryBytes({part, (windows.width + 1) / 2, windows.height});
+        const int64_t low = memoryBytes({part, windows.width, (windows.height + 1) / 2});
+        const bool staysHigh = windows.height > kReachesOfLowWindow * reach && low < bytes / 4 * 3;
+        if (windows.height > 1 && (windows.width == 1 || staysHigh || low < narrow)) {
+            windows.height = inPieces(part.height(), down);
+        } else if (windows.width > 1) {
             windows.width = inPieces(part.width(), across);
         } else {
-            windows.height = inPieces(part.height(), down);
+            break;
         }
     }
     return windows;

@@ -79,9 +79,10 @@ void internal::paintStroke(const VFECore::ParamPostProcessing* params, const VFS
     const Box reached = DilationPlan::reached({box.rows(), disc});
     const Box visible = boundingBox(targets[0].seen(reached), targets[1].seen(reached));
     if (visible.empty()) return;
-    const Windows windows = windowsWithin(workingBytes, visible, [&](const Windows& cut) {
+    const auto memoryBytes = [&](const Windows& cut) {
         return Outline::memoryBytes(level, box, disc, shape, cut);
-    });
+    };
+    const Windows windows = windowsWithin(workingBytes, visible, disc.reach, memoryBytes);
     Outline outline(level, box, disc, shape, windows);
     if (!outline) return;
 

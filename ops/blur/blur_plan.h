@@ -55,9 +55,11 @@ void forBands(BlurPlan& plan, const BlurInput& input, Paint paint) {
 template <class Paint>
 void blurInWindows(CpuLevel level, const BlurInput& input, int64_t workingBytes, Paint paint) {
     if (!input.weights) return;
-    const Windows windows = windowsWithin(workingBytes, input.window, [&](const Windows& cut) {
+    const auto memoryBytes = [&](const Windows& cut) {
         return BlurPlan::memoryBytes(level, input.largestOf(cut));
-    });
+    };
+    const Windows windows =
+        windowsWithin(workingBytes, input.window, input.weights.radius, memoryBytes);
     BlurPlan plan(level, input.largestOf(windows));
     if (!plan) return;
     windows.forEach([&](const Box& window) { forBands(plan, input.of(window), paint); });
