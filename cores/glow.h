@@ -2,6 +2,7 @@
 
 #include <cstdint>
 
+#include "core/windows.h"
 #include "simd/cpu_level.h"
 #include "voreleffect/VFECore.h"
 
@@ -40,6 +41,9 @@ void fillGlowTable(CpuLevel level, const GlowRecord& record, float fadeStart, in
 /// runs out it stays as it was.
 void growByBoxFilter(CpuLevel level, unsigned char* mask, int passes, int width, int height);
 
-void paintGlow(const VFECore::ParamPostProcessing* params, const GlowRecord& record, GlowSide side);
+/// Paints a glow in windows that take `workingBytes` at most, if they can. All of it is taken before the
+/// first pixel is painted: without it nothing is.
+void paintGlow(const VFECore::ParamPostProcessing* params, const GlowRecord& record, GlowSide side,
+               int64_t workingBytes = kWorkingBytes);
 
 }  // namespace VFontEffect::internal

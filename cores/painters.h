@@ -3,14 +3,13 @@
 #include <cstdint>
 
 #include "core/windows.h"
-#include "cores/glow.h"
 #include "cores/shadow_offset.h"
 #include "voreleffect/VFECore.h"
 
-/// The cores that take working memory, as functions of it.
+/// The strokes and shadows as functions of the working memory that they may take; glows stand in glow.h.
 namespace VFontEffect::internal {
 
-/// Paint what the core of the record paints, in windows that take `workingBytes` at most, if they can.
+/// Paint what the core of the record does, in windows that take `workingBytes` at most, if they can.
 /// All of it is taken before the first pixel is painted: without it nothing is.
 void paintStroke(const VFECore::ParamPostProcessing* params, const VFStrokeProperty& record,
                  int64_t workingBytes = kWorkingBytes);

@@ -102,11 +102,6 @@ std::vector<uint8_t> blurred(const BlurInput& input) {
     return values.values();
 }
 
-bool blursByDotsAlone() {
-    constexpr int kLargestRadius = 256;
-    return dotLoops(chosenLevel()).largestDotRadius >= kLargestRadius;
-}
-
 std::vector<uint8_t> dilated(const CoverageRows& source, const DiscShape& disc, const Box& part,
                              bool andInverse, const WindowSize& size) {
     const Windows windows = cut(part, size);
@@ -127,12 +122,12 @@ std::vector<uint8_t> dilated(const CoverageRows& source, const DiscShape& disc, 
     return values.values();
 }
 
-std::vector<uint8_t> grown(const GrowthInput& input) {
-    GrowthPlan plan(chosenLevel(), input);
+std::vector<uint8_t> grown(const GrowthInput& input, const WindowSize& size) {
+    const Windows windows = cut(input.whole(), size);
+    GrowthPlan plan(chosenLevel(), input, windows.width, windows.height);
     if (!plan) return {};
-    const Box all = expanded(wholeOf(input.source), input.margin);
-    Collected values(all);
-    values.put(plan.rows(all.top, all.height()), all.left, all.top);
+    Collected values(input.whole());
+    windows.forEach([&](const Box& part) { values.put(plan.grown(part), part.left, part.top); });
     return values.values();
 }
 

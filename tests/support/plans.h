@@ -27,9 +27,6 @@ VF_API std::vector<uint8_t> blurredByDifferences(const VFontEffect::internal::Bl
                                                  const WindowSize& size = {});
 VF_API std::vector<uint8_t> blurred(const VFontEffect::internal::BlurInput& input);
 
-/// Whether the level takes dot products at every radius, and no differences.
-VF_API bool blursByDotsAlone();
-
 /// The part's values, row after row: of a source dilated by a disc, or the smaller ones of that and of
 /// its inverse, dilated likewise.
 VF_API std::vector<uint8_t> dilated(const VFontEffect::internal::CoverageRows& source,
@@ -38,7 +35,8 @@ VF_API std::vector<uint8_t> dilated(const VFontEffect::internal::CoverageRows& s
                                     const WindowSize& size = {});
 
 /// All that a source has grown to, with its margin, row after row.
-VF_API std::vector<uint8_t> grown(const VFontEffect::internal::GrowthInput& input);
+VF_API std::vector<uint8_t> grown(const VFontEffect::internal::GrowthInput& input,
+                                  const WindowSize& size = {});
 
 /// The first rows of a pattern laid from a corner on, pixels R, G, B, A.
 VF_API std::vector<uint32_t> tiled(const VFontEffect::internal::ColourView& pattern, float scale,
