@@ -61,7 +61,9 @@ struct BlurInput {
             largest.window.left = around;
             largest.window.right = around + windows.width + kWidestVector;
             largest.source.width = largest.window.right + around;
-            if (full.before != kNoFullColumns.before) largest.full.before = around;
+            const bool hasFull =
+                full.before != kNoFullColumns.before || full.from != kNoFullColumns.from;
+            if (hasFull) largest.full.before = around;
         }
         if (windows.areCutDown()) {
             largest.window.top = around;

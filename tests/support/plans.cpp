@@ -3,6 +3,9 @@
 #include <algorithm>
 #include <cstddef>
 
+#include "core/effect_types.h"
+#include "cores/glow.h"
+#include "cores/painters.h"
 #include "ops/blur/blur_plan.h"
 #include "ops/dilate/dilation_plan.h"
 #include "ops/ramp/ramp_loops.h"
@@ -19,6 +22,7 @@ VOREL_LEVEL_TABLE(VOREL_EACH_VECTOR_LEVEL, lanesCheck, LanesCheck, kLanesCheck)
 namespace vorel_test {
 namespace {
 
+using namespace VFontEffect;
 using namespace VFontEffect::internal;
 
 /// The values of a part, which come in pieces.
@@ -81,6 +85,25 @@ void append(const TermList& list, int sign, std::vector<Term>& terms) {
 }
 
 }  // namespace
+
+void paintWithin(int64_t workingBytes, int type, const VFProperty& record,
+                 const VFECore::ParamPostProcessing* params) {
+    if (type == kStroke) {
+        paintStroke(params, static_cast<const VFStrokeProperty&>(record), workingBytes);
+    } else if (type == kOuterShadow) {
+        const auto& shadow = static_cast<const VFOuterShadowProperty&>(record);
+        const ShadowOffset offset = shadowOffset(shadow.mAngle, shadow.mDistance);
+        paintOuterShadow(params, shadow, offset, workingBytes);
+    } else if (type == kInnerShadow) {
+        paintInnerShadow(params, static_cast<const VFInnerShadowProperty&>(record), workingBytes);
+    } else if (type == kOuterGlow) {
+        const auto& glow = static_cast<const VFOuterGlowProperty&>(record);
+        paintGlow(params, GlowRecord::of(&glow), GlowSide::outside, workingBytes);
+    } else if (type == kInnerGlow) {
+        const auto& glow = static_cast<const VFInnerGlowProperty&>(record);
+        paintGlow(params, GlowRecord::of(&glow), GlowSide::inside, workingBytes);
+    }
+}
 
 std::vector<uint8_t> blurredByDots(const BlurInput& input, const WindowSize& size) {
     const Windows windows = cut(input.window, size);

@@ -7,11 +7,17 @@
 #include "ops/blur/blur_input.h"
 #include "ops/dilate/disc_shape.h"
 #include "ops/grow/growth_plan.h"
+#include "voreleffect/VFECore.h"
 #include "voreleffect/VFExport.h"
 
 /// The operators' plans, at the level that the tests are at. They stand in the library, which does not
 /// export them; the functions are none when memory ran out.
 namespace vorel_test {
+
+/// Paints what the core of the record does, a stroke, a shadow or a glow, with so many bytes of working
+/// memory.
+VF_API void paintWithin(int64_t workingBytes, int type, const VFontEffect::VFProperty& record,
+                        const VFontEffect::VFECore::ParamPostProcessing* params);
 
 /// Of windows that what is wanted is cut into; 0 for no cut.
 struct WindowSize {
