@@ -12,6 +12,7 @@ struct Windows {
     Box part;
     int64_t width;
     int64_t height;
+    int64_t memoryBytes = 0;  ///< what an operator takes for any of them
 
     static Windows oneOf(const Box& part) { return {part, part.width(), part.height()}; }
 
@@ -31,8 +32,8 @@ struct Windows {
 /// An effect takes about so much working memory at most, whatever the size of its picture.
 constexpr int64_t kWorkingBytes = 3'900'000;
 
-/// Cuts a part into windows of which memoryBytes(windows), what an operator of that reach takes for any of
-/// them, is at most `mostBytes`, if there are any such.
+/// Cuts a part into windows of which memoryBytes(windows), what an operator of that reach takes for any
+/// of them, is at most `mostBytes`, if there are any such.
 ///
 /// What lies in reach beside a cut is worked out twice, so windows are few and not thin. Low ones are
 /// best, for they are painted in long rows; from a height of some reaches on they are cut on the side
@@ -48,10 +49,11 @@ Windows windowsWithin(int64_t mostBytes, const Box& part, int64_t reach, MemoryB
         count += count / 8 + 1;
         return (length + count - 1) / count;
     };
-    for (int64_t bytes = memoryBytes(windows); bytes > mostBytes; bytes = memoryBytes(windows)) {
+    while ((windows.memoryBytes = memoryBytes(windows)) > mostBytes) {
         const int64_t narrow = memoryBytes({part, (windows.width + 1) / 2, windows.height});
         const int64_t low = memoryBytes({part, windows.width, (windows.height + 1) / 2});
-        const bool staysHigh = windows.height > kReachesOfLowWindow * reach && low < bytes / 4 * 3;
+        const bool staysHigh =
+            windows.height > kReachesOfLowWindow * reach && low < windows.memoryBytes / 4 * 3;
         if (windows.height > 1 && (windows.width == 1 || staysHigh || low < narrow)) {
             windows.height = inPieces(part.height(), down);
         } else if (windows.width > 1) {

@@ -5,8 +5,8 @@
 #include <cstring>
 
 #include "core/numeric.h"
-#include "core/pixel_buffer.h"
 #include "core/size_limit.h"
+#include "core/windows.h"
 #include "cores/paint_input.h"
 #include "cores/placed_target.h"
 #include "ops/blur/blur_plan.h"
@@ -78,8 +78,9 @@ class ValueColours {
     uint32_t mPixels[kTableLast];  ///< by value, as in memory, if there are several
 };
 
-/// What has grown, in the part that the blur of a window reaches, and the blur in its coordinates. Around
-/// coverage's inverse everything is full, and stays so; coverage itself spreads by a pixel a pass.
+/// What has grown, in the part that the blur of a window reaches, and the blur in its coordinates.
+/// Around coverage's inverse everything is full, and stays so; coverage itself spreads by a pixel a
+/// pass.
 struct Growing {
     GrowthInput input;
     const BlurWeights& weights;
@@ -105,8 +106,8 @@ struct Growing {
     }
 };
 
-/// Grows, blurs and paints the visible part of the glow. Returns false, with nothing painted, when memory
-/// ran out.
+/// Grows, blurs and paints the visible part of the glow. Returns false, with nothing painted, when
+/// memory ran out.
 [[nodiscard]] bool paintBlurred(CpuLevel level, const Growing& growing, const PlacedTarget& target,
                                 const Box& visible, const ValueColours& colours, int64_t workingBytes) {
     if (!growing.weights) return false;
@@ -122,11 +123,10 @@ struct Growing {
     windows.forEach([&](const Box& window) {
         const Box part = growing.partFor(window);
         const CoverageRows grown = part.empty() ? CoverageRows{} : growth.grown(part);
-        forBands(blur, growing.blurOf(window, part, grown),
-                 [&](const Box& band, const BlurredRows& rows) {
-                     colours.paint(target, translated(band, part.left, part.top), rows.values,
-                                   rows.stride);
-                 });
+        forBands(
+            blur, growing.blurOf(window, part, grown), [&](const Box& band, const BlurredRows& rows) {
+                colours.paint(target, translated(band, part.left, part.top), rows.values, rows.stride);
+            });
     });
     return true;
 }
@@ -135,7 +135,10 @@ struct Growing {
 ///
 /// Deliberate: around an inner glow the pixels that the blur does not reach are opaque white, not
 /// transparent. They are painted, and the text fill or the composite clips them away.
-void paintBorder(const Shape& shape, const PlacedTarget& target, const uint8_t* full) {
+void paintBorder(const Shape& shape, const PlacedTarget& target) {
+    constexpr int64_t kPiece = 1024;
+    uint8_t full[kPiece];
+    std::memset(full, 0xFF, sizeof full);
     const Box& outside = shape.image;
     const Box& inside = shape.blurred;
     const Box sides[] = {{outside.left, outside.top, outside.right, inside.top},
@@ -145,7 +148,10 @@ void paintBorder(const Shape& shape, const PlacedTarget& target, const uint8_t* 
     for (const Box& side : sides) {
         const Box seen = target.seen(side);
         if (seen.empty()) continue;
-        target.paint(&BlendLoops::dstOverGate, seen, full, 0, 0xFFFFFFFFU);
+        const Windows pieces = {seen, kPiece, seen.height()};
+        pieces.forEach([&](const Box& piece) {
+            target.paint(&BlendLoops::dstOverGate, piece, full, 0, 0xFFFFFFFFU);
+        });
     }
 }
 
@@ -174,8 +180,7 @@ void paintGlow(const VFECore::ParamPostProcessing* params, const GlowRecord& rec
     const Shape shape = Shape::of(box, pad);
     const CpuLevel level = chosenLevel();
     const PlacedTarget target(level, params->dstBitmap, box.left, box.top);
-    const Box seen = target.seen(shape.image);
-    if (seen.empty()) return;
+    if (target.seen(shape.image).empty()) return;
     const Box visible = target.seen(shape.blurred);
     const ValueColours colours(level, record);
     const bool inside = side == GlowSide::inside;
@@ -187,19 +192,11 @@ void paintGlow(const VFECore::ParamPostProcessing* params, const GlowRecord& rec
     const BlurWeights weights = gaussianOf128(shape.radius);
     const GrowthInput input = {box.rows(inside ? kInverse : kAsIs), inside ? 0 : shape.passes,
                                shape.passes};
-    const auto paintVisible = [&] {
-        const Growing growing = {input, weights, full};
-        return visible.empty() || paintBlurred(level, growing, target, visible, colours, workingBytes);
-    };
-    if (!inside) {
-        static_cast<void>(paintVisible());
-        return;
-    }
-    auto border = PixelBuffer<uint8_t>::uninitialised(seen.width());
-    if (!border) return;
-    std::memset(border.data(), 0xFF, static_cast<size_t>(seen.width()));
-    if (!paintVisible()) return;
-    paintBorder(shape, target, border.data());
+    const Growing growing = {input, weights, full};
+    const bool done =
+        visible.empty() || paintBlurred(level, growing, target, visible, colours, workingBytes);
+    if (!inside || !done) return;
+    paintBorder(shape, target);
     if (shape.radius == 0) paintCorners(shape, target, colours);
 }
 

@@ -25,17 +25,11 @@ namespace {
 /// centred lies within the disc's radius of the edge on both sides of it.
 class Outline {
   public:
-    static int64_t memoryBytes(CpuLevel level, const CoverageBox& box, const DiscShape& disc,
-                               const StrokeShape& shape, const Windows& windows) {
-        const int64_t plans = shape.side == StrokeSide::centre ? 2 : 1;
-        return plans * DilationPlan::memoryBytes(level, {box.rows(), disc}, windows);
-    }
-
     Outline(CpuLevel level, const CoverageBox& box, const DiscShape& disc, const StrokeShape& shape,
-            const Windows& windows)
-        : mGrown(level, {box.rows(shape.growsGlyph ? kAsIs : kInverse), disc}, windows) {
+            int64_t bytesOfPlan)
+        : mGrown(level, {box.rows(shape.growsGlyph ? kAsIs : kInverse), disc}, bytesOfPlan) {
         if (shape.side == StrokeSide::centre)
-            mInverse.emplace(level, DilationInput{box.rows(kInverse), disc}, windows);
+            mInverse.emplace(level, DilationInput{box.rows(kInverse), disc}, bytesOfPlan);
     }
 
     explicit operator bool() const { return mGrown && (!mInverse || *mInverse); }
@@ -79,11 +73,12 @@ void internal::paintStroke(const VFECore::ParamPostProcessing* params, const VFS
     const Box reached = DilationPlan::reached({box.rows(), disc});
     const Box visible = boundingBox(targets[0].seen(reached), targets[1].seen(reached));
     if (visible.empty()) return;
-    const auto memoryBytes = [&](const Windows& cut) {
-        return Outline::memoryBytes(level, box, disc, shape, cut);
+    const int64_t bytesOfEach = shape.side == StrokeSide::centre ? workingBytes / 2 : workingBytes;
+    const auto bytesOfPlan = [&](const Windows& cut) {
+        return DilationPlan::memoryBytes(level, {box.rows(), disc}, cut);
     };
-    const Windows windows = windowsWithin(workingBytes, visible, disc.reach, memoryBytes);
-    Outline outline(level, box, disc, shape, windows);
+    const Windows windows = windowsWithin(bytesOfEach, visible, disc.reach, bytesOfPlan);
+    Outline outline(level, box, disc, shape, windows.memoryBytes);
     if (!outline) return;
 
     const bool overText = shape.side == StrokeSide::centre && params->useOuterLayer != 1;

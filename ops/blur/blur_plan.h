@@ -50,16 +50,15 @@ void forBands(BlurPlan& plan, const BlurInput& input, Paint paint) {
     }
 }
 
-/// Blurs an input in windows that take `workingBytes` at most, and calls paint(part, rows) for the bands of
-/// all; for none when memory ran out.
+/// Blurs an input in windows that take `workingBytes` at most, and calls paint(part, rows) for the bands
+/// of all; for none when memory ran out.
 template <class Paint>
 void blurInWindows(CpuLevel level, const BlurInput& input, int64_t workingBytes, Paint paint) {
     if (!input.weights) return;
     const auto memoryBytes = [&](const Windows& cut) {
         return BlurPlan::memoryBytes(level, input.largestOf(cut));
     };
-    const Windows windows =
-        windowsWithin(workingBytes, input.window, input.weights.radius, memoryBytes);
+    const Windows windows = windowsWithin(workingBytes, input.window, input.weights.radius, memoryBytes);
     BlurPlan plan(level, input.largestOf(windows));
     if (!plan) return;
     windows.forEach([&](const Box& window) { forBands(plan, input.of(window), paint); });

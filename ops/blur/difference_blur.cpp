@@ -119,8 +119,8 @@ DifferenceBlur::Layout DifferenceBlur::Layout::of(const DifferenceLoops& loops, 
     layout.placeLanes(input, side);
 
     const int64_t longest = std::max(layout.first.length, layout.second.length);
-    layout.lines = arena.take<uint8_t>(kLinesOfRow * kLinePixelBytes * side *
-                                       (longest + kDifferenceRowsAround));
+    layout.lines =
+        arena.take<uint8_t>(kLinesOfRow * kLinePixelBytes * side * (longest + kDifferenceRowsAround));
     layout.intermediate =
         arena.take<uint8_t>(layout.allocatedLanes * roundedUp(layout.first.count, side));
     layout.stride = roundedUp(window.width(), side);

@@ -150,16 +150,14 @@ DotBlur::Layout DotBlur::Layout::of(const DotLoops& loops, const BlurInput& inpu
     if (acrossFirst) layout.across = arena.take<uint8_t>(layout.stride * kQuad);
     const GroupRange needed =
         neededGroups(loops, weights, part.height, layout.firstRow, quadsOf(window.height()));
-    layout.taps =
-        takeGroups(loops, weights, acrossFirst ? window.width() : part.width, needed, arena);
+    layout.taps = takeGroups(loops, weights, acrossFirst ? window.width() : part.width, needed, arena);
 
     // The rows that are blurred across have the source's columns, and when some of the full ones are in
     // reach all that are.
     const Box reach = expanded(window, weights.radius);
     layout.intermediateLeft = layout.source.left;
     if (input.full.before <= reach.left && input.full.from >= reach.right) {
-        layout.intermediate =
-            takeIntermediate(loops, weights, 0, part.width, {0, part.width}, arena);
+        layout.intermediate = takeIntermediate(loops, weights, 0, part.width, {0, part.width}, arena);
     } else {
         const int64_t coveredColumn =
             roundedUp(std::max<int64_t>(0, layout.source.left - reach.left), kWidestVector);

@@ -14,8 +14,8 @@ namespace VFontEffect::internal {
 /// The source is the box with a border of so many empty pixels.
 constexpr int64_t kDilationBorder = 1;
 
-/// Grey-scale dilation of a box of coverage by a disc, for a window of results. All coordinates are those
-/// of the part of the source that the disc reaches from there, its corner being (0, 0).
+/// Grey-scale dilation of a box of coverage by a disc, for a window of results. All coordinates are
+/// those of the part of the source that the disc reaches from there, its corner being (0, 0).
 ///
 /// The result at p is the largest c - (255 - weight) over all source pixels of coverage c, with the
 /// weight that the disc around p has there; 0 where nothing is above 0.
@@ -32,8 +32,8 @@ struct Dilation {
     int64_t bandRows;  ///< rows that are asked for at once; the last ones may be fewer
 };
 
-/// Rows of results are so far apart: an odd number of the cache's lines, for rows that are a power of two
-/// apart share few of its places, and spreading takes 1.6 times as long.
+/// Rows of results are so far apart: an odd number of the cache's lines, for rows that are a power of
+/// two apart share few of its places, and spreading takes 1.6 times as long.
 VOREL_INLINE int64_t dilatedStride(const Dilation& dilation) {
     return roundedUp(dilation.right - dilation.left, 64) | 64;
 }

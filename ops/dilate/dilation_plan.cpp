@@ -20,21 +20,18 @@ Dilation dilationOf(const DilationInput& input, const Box& window) {
     const Box part = reachedSource(input, window);
     VOREL_ASSERT(!window.empty() && !part.empty());
     const Box box = intersection(part, wholeOf(input.source));
-    Dilation dilation = {};
-    dilation.box = input.source;
-    if (!box.empty()) dilation.box.start += box.top * input.source.stride + box.left;
-    dilation.box.width = box.width();
-    dilation.box.height = box.height();
-    dilation.boxLeft = box.left - part.left;
-    dilation.boxTop = box.top - part.top;
-    dilation.disc = &input.disc;
-    dilation.width = part.width();
-    dilation.height = part.height();
-    dilation.left = window.left - part.left;
-    dilation.right = window.right - part.left;
-    dilation.top = window.top - part.top;
-    dilation.bandRows = std::min(kBandRows, window.height());
-    return dilation;
+    const int64_t corner = box.empty() ? 0 : box.top * input.source.stride + box.left;
+    return {{input.source.start + corner, input.source.stride, box.width(), box.height(),
+             input.source.invertMask},
+            box.left - part.left,
+            box.top - part.top,
+            &input.disc,
+            part.width(),
+            part.height(),
+            window.left - part.left,
+            window.right - part.left,
+            window.top - part.top,
+            std::min(kBandRows, window.height())};
 }
 
 /// That of a window that is as large as any and has as much of the source around it.
@@ -66,18 +63,18 @@ int64_t DilationPlan::memoryBytes(CpuLevel level, const DilationInput& input, co
         .memoryBytes(largestDilation(input, windows));
 }
 
-DilationPlan::DilationPlan(CpuLevel level, const DilationInput& input, const Windows& windows)
+DilationPlan::DilationPlan(CpuLevel level, const DilationInput& input, int64_t memoryBytes)
     : mInput(input),
       mLoops(dilationLoops(level)),
       mStrategy(strategyFor(mLoops, input.disc.reach)),
-      mMemoryBytes(memoryBytes(level, input, windows)),
+      mMemoryBytes(memoryBytes),
       mMemory(mMemoryBytes) {}
 
 void DilationPlan::begin(const Box& window) {
     mDilation = dilationOf(mInput, window);
     VOREL_ASSERT(*this && mStrategy.memoryBytes(mDilation) <= mMemoryBytes);
     mStrategy.begin(mDilation, mMemory.data());
-    mFirstRow = reachedSource(mInput, window).top;
+    mFirstRow = window.top - mDilation.top;
     mNextRow = window.top;
 }
 

@@ -28,8 +28,8 @@ class DilationPlan {
     /// What a plan for any of the windows takes.
     static int64_t memoryBytes(CpuLevel level, const DilationInput& input, const Windows& windows);
 
-    /// The windows, in the source's coordinates, are of what is reached.
-    DilationPlan(CpuLevel level, const DilationInput& input, const Windows& windows);
+    /// Takes so much memory. Windows, in the source's coordinates, are of what is reached.
+    DilationPlan(CpuLevel level, const DilationInput& input, int64_t memoryBytes);
 
     explicit operator bool() const { return static_cast<bool>(mMemory); }
 

@@ -89,10 +89,8 @@ inline void fillRow(const Dilation& dilation, int64_t y, const PaddedRows& rows,
     const CoverageRows& box = dilation.box;
     const int64_t boxRow = y - dilation.boxTop;
     if (boxRow < 0 || boxRow >= box.height) return setBytes(to, box.invertMask, rows.width);
-    const int64_t boxEnd = dilation.boxLeft + box.width;
-    // The border is one column wide.
-    if (dilation.boxLeft > 0) to[0] = box.invertMask;
-    if (boxEnd < rows.width) to[boxEnd] = box.invertMask;
+    // The border's columns, or the box's over them.
+    to[0] = to[rows.width - 1] = box.invertMask;
     copyInverted(box.start + boxRow * box.stride, box.width, box.invertMask, to + dilation.boxLeft);
 }
 

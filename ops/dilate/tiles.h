@@ -63,7 +63,7 @@ struct TileLayout {
     int64_t tiles;      ///< in a row
     int64_t firstTile;  ///< of the window, its corner
     int64_t endTile;    ///< behind its last one
-    uint8_t largest;  ///< of all coverage
+    uint8_t largest;    ///< of all coverage
     // By row of the source.
     PaddedRows rows;
     PaddedRows windows[2];
@@ -92,8 +92,7 @@ struct TileLayout {
         TileLayout layout;
         layout.firstTile = tilesOf(max<int64_t>(dilation.left, 0));
         layout.endTile = layout.firstTile + tilesOf(dilation.right - dilation.left);
-        layout.columns = {dilation.left - layout.firstTile * kTile,
-                          max(dilation.right, dilation.width)};
+        layout.columns = {dilation.left - layout.firstTile * kTile, max(dilation.right, dilation.width)};
         layout.tiles = tilesOf(layout.columns.right - layout.columns.left);
         layout.largest = 0;
         const auto take = [&] {

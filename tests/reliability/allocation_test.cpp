@@ -178,25 +178,24 @@ std::vector<CoreCase> strokeCases() {
 }
 
 template <class Core, class Record>
-void addGlowCases(std::vector<CoreCase>& cases, const std::string& name, int border) {
+void addGlowCases(std::vector<CoreCase>& cases, const std::string& name) {
     VFGradient* const stops = gStops.data();
-    // What growth works in, the weights of the blur, their cells or terms, and what the blur works in. An
-    // inner glow has a row for its border too.
+    // What growth works in, the weights of the blur, their cells or terms, and what the blur works in.
     cases.push_back(coreCase<Core>(name, Record(4, 0xC0FF8000, 0.75F, 0, nullptr),
-                                   Record(2, 0xFF0080FF, 1, 0, nullptr), false, 4 + border, 1));
+                                   Record(2, 0xFF0080FF, 1, 0, nullptr), false, 4, 1));
     cases.push_back(coreCase<Core>(name + "WithStops", Record(4, 0, 1, 3, stops),
-                                   Record(2, 0, 1, 2, stops), true, 4 + border, 2));
+                                   Record(2, 0, 1, 2, stops), true, 4, 2));
     cases.push_back(coreCase<Core>("Widest" + name, Record(104, 0xC0FF8000, 0.75F, 0, nullptr),
-                                   Record(2, 0xFF0080FF, 1, 0, nullptr), false, 4 + border, 1));
+                                   Record(2, 0xFF0080FF, 1, 0, nullptr), false, 4, 1));
     cases.push_back(coreCase<Core>(name + "Layered", Record(4, 0xC0FF8000, 0.75F, 0, nullptr),
-                                   Record(2, 0, 1, 2, stops), true, 4 + border, 1));
+                                   Record(2, 0, 1, 2, stops), true, 4, 1));
 }
 
 std::vector<CoreCase> coreCases() {
     VFGradient* const stops = gStops.data();
     std::vector<CoreCase> cases = strokeCases();
-    addGlowCases<VFOuterGlow, VFOuterGlowProperty>(cases, "OuterGlow", 0);
-    addGlowCases<VFInnerGlow, VFInnerGlowProperty>(cases, "InnerGlow", 1);
+    addGlowCases<VFOuterGlow, VFOuterGlowProperty>(cases, "OuterGlow");
+    addGlowCases<VFInnerGlow, VFInnerGlowProperty>(cases, "InnerGlow");
     for (const bool layered : {false, true}) {
         const std::string suffix = layered ? "Layered" : "";
         using Outer = VFOuterShadowProperty;

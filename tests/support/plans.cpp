@@ -36,7 +36,8 @@ class Collected {
         for (int64_t row = 0; row < rows.height; ++row) {
             for (int64_t i = 0; i < rows.width; ++i) {
                 const int64_t at = (y + row - mPart.top) * mPart.width() + x + i - mPart.left;
-                mValues.at(static_cast<size_t>(at)) = rows.start[row * rows.stride + i] ^ rows.invertMask;
+                mValues.at(static_cast<size_t>(at)) =
+                    rows.start[row * rows.stride + i] ^ rows.invertMask;
             }
         }
     }
@@ -128,10 +129,11 @@ std::vector<uint8_t> blurred(const BlurInput& input) {
 std::vector<uint8_t> dilated(const CoverageRows& source, const DiscShape& disc, const Box& part,
                              bool andInverse, const WindowSize& size) {
     const Windows windows = cut(part, size);
-    DilationPlan plan(chosenLevel(), {source, disc}, windows);
+    const int64_t bytes = DilationPlan::memoryBytes(chosenLevel(), {source, disc}, windows);
+    DilationPlan plan(chosenLevel(), {source, disc}, bytes);
     CoverageRows inverse = source;
     inverse.invertMask ^= kInverse;
-    DilationPlan other(chosenLevel(), {inverse, disc}, windows);
+    DilationPlan other(chosenLevel(), {inverse, disc}, bytes);
     if (!plan || !other) return {};
     Collected values(part);
     windows.forEach([&](const Box& window) {
@@ -179,7 +181,9 @@ void askForRowsOutOfOrder() {
     const uint8_t pixel = 255;
     const DiscShape disc(1.0F);
     const Box part = {0, 0, 1, 2};
-    DilationPlan plan(chosenLevel(), {{&pixel, 1, 1, 1, kAsIs}, disc}, Windows::oneOf(part));
+    const DilationInput input = {{&pixel, 1, 1, 1, kAsIs}, disc};
+    DilationPlan plan(chosenLevel(), input,
+                      DilationPlan::memoryBytes(chosenLevel(), input, Windows::oneOf(part)));
     plan.begin(part);
     plan.rows(1, 1);
 }

@@ -28,8 +28,8 @@ TEST(Windows, HaveEachPixelOnce) {
         const Box part = {left, top, left + random.between(1, 30), top + random.between(1, 30)};
         const int reach = random.between(0, 9);
         const int64_t most = random.between(1, 2000);
-        const Windows windows = windowsWithin(
-            most, part, reach, [&](const Windows& cut) { return planeBytes(cut, reach); });
+        const Windows windows =
+            windowsWithin(most, part, reach, [&](const Windows& cut) { return planeBytes(cut, reach); });
         const bool isPixel = windows.width == 1 && windows.height == 1;
         ASSERT_TRUE(isPixel || planeBytes(windows, reach) <= most);
         std::vector<int> painted(static_cast<size_t>(part.width() * part.height()));
@@ -48,9 +48,8 @@ TEST(Windows, HaveEachPixelOnce) {
 }
 
 TEST(Windows, ThatFitAsOne_AreNotCut) {
-    const Windows windows = windowsWithin(1000, {5, 6, 105, 16}, 3, [](const Windows& cut) {
-        return cut.width * cut.height;
-    });
+    const Windows windows = windowsWithin(1000, {5, 6, 105, 16}, 3,
+                                          [](const Windows& cut) { return cut.width * cut.height; });
     EXPECT_EQ(windows.width, 100);
     EXPECT_EQ(windows.height, 10);
     EXPECT_FALSE(windows.areCutAcross());
@@ -58,25 +57,22 @@ TEST(Windows, ThatFitAsOne_AreNotCut) {
 }
 
 TEST(Windows, OfPlanes_AreLowBeforeTheyAreNarrow) {
-    const Windows windows = windowsWithin(1'000'000, {0, 0, 4096, 4096}, 10, [](const Windows& cut) {
-        return planeBytes(cut, 10);
-    });
+    const Windows windows = windowsWithin(1'000'000, {0, 0, 4096, 4096}, 10,
+                                          [](const Windows& cut) { return planeBytes(cut, 10); });
     EXPECT_FALSE(windows.areCutAcross());
     EXPECT_GT(windows.height, 8 * 10);
 }
 
 TEST(Windows, OfPlanesWithALongReach_AreNotThin) {
-    const Windows windows = windowsWithin(1'000'000, {0, 0, 4096, 4096}, 200, [](const Windows& cut) {
-        return planeBytes(cut, 200);
-    });
+    const Windows windows = windowsWithin(1'000'000, {0, 0, 4096, 4096}, 200,
+                                          [](const Windows& cut) { return planeBytes(cut, 200); });
     EXPECT_GT(windows.height, 400);
     EXPECT_GT(windows.width, 400);
 }
 
 TEST(Windows, OfAnOperatorThatKeepsRows_StayAsHighAsTheyAre) {
-    const Windows windows = windowsWithin(1'000'000, {0, 0, 50'000, 9000}, 50, [](const Windows& cut) {
-        return 100 * cut.width;
-    });
+    const Windows windows = windowsWithin(1'000'000, {0, 0, 50'000, 9000}, 50,
+                                          [](const Windows& cut) { return 100 * cut.width; });
     EXPECT_TRUE(windows.areCutAcross());
     EXPECT_FALSE(windows.areCutDown());
 }

@@ -52,7 +52,7 @@ float randomSize(Random& random) {
         case 0:
             return random.real(-3.0F, 0.0F);
         case 1:
-            return random.chance(90) ? random.real(60.0F, 100.0F) : random.real(100.0F, 256.0F);
+            return random.chance(80) ? random.real(30.0F, 60.0F) : random.real(60.0F, 256.0F);
         case 2:
             return std::numeric_limits<float>::quiet_NaN();
         case 3:
@@ -83,10 +83,14 @@ TEST(Painters, StrokesInWindows_AreThoseOfTheLiteralForm) {
         const uint32_t color = randomPremultiplied(random);
         const int64_t bytes = randomBytes(random);
         Painter<VFStrokeProperty> core(internal::kStroke, bytes, {size, color, 1.0F, 0, position});
-        EXPECT_TRUE(paintsLike(core, scene, [&](Scene& expected) {
-            literal::paintStroke(expected.dst, expected.sub ? &*expected.sub : nullptr, expected.mask,
-                                 expected.text, expected.useOuterLayer, size, color, position);
-        })) << "size " << size << ", position " << position << ", " << bytes << " bytes";
+        EXPECT_TRUE(paintsLike(core, scene,
+                               [&](Scene& expected) {
+                                   literal::paintStroke(expected.dst,
+                                                        expected.sub ? &*expected.sub : nullptr,
+                                                        expected.mask, expected.text,
+                                                        expected.useOuterLayer, size, color, position);
+                               }))
+            << "size " << size << ", position " << position << ", " << bytes << " bytes";
     });
 }
 
@@ -98,10 +102,12 @@ void expectShadows(EffectType type, LiteralForm literalForm) {
         const Record record(random.real(0.0F, 360.0F), random.real(0.0F, 30.0F), randomSize(random),
                             randomPremultiplied(random), 1.0F);
         Painter<Record> core(type, bytes, record);
-        EXPECT_TRUE(paintsLike(core, scene, [&](Scene& expected) {
-            literalForm(expected.dst, expected.mask, expected.text, record.mAngle, record.mDistance,
-                        record.mSize, record.mColor);
-        })) << "size " << record.mSize << ", " << bytes << " bytes";
+        EXPECT_TRUE(paintsLike(core, scene,
+                               [&](Scene& expected) {
+                                   literalForm(expected.dst, expected.mask, expected.text, record.mAngle,
+                                               record.mDistance, record.mSize, record.mColor);
+                               }))
+            << "size " << record.mSize << ", " << bytes << " bytes";
     });
 }
 
@@ -123,9 +129,12 @@ void expectGlows(EffectType type, LiteralForm literalForm) {
         const Record record(randomSize(random), randomStraight(random), 1.0F,
                             static_cast<int>(array.size()), array.data());
         Painter<Record> core(type, bytes, record);
-        EXPECT_TRUE(paintsLike(core, scene, [&](Scene& expected) {
-            literalForm(expected.dst, expected.mask, expected.text, record.mSize, record.mColor, stops);
-        })) << "size " << record.mSize << ", " << bytes << " bytes";
+        EXPECT_TRUE(paintsLike(core, scene,
+                               [&](Scene& expected) {
+                                   literalForm(expected.dst, expected.mask, expected.text, record.mSize,
+                                               record.mColor, stops);
+                               }))
+            << "size " << record.mSize << ", " << bytes << " bytes";
     });
 }
 

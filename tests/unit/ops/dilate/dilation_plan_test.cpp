@@ -72,7 +72,8 @@ void expectDefined(const DilationCase& which) {
             smaller.push_back(std::min(expected.back(), definedDilation(inverse, which.radius, x, y)));
         }
     }
-    ASSERT_EQ(dilated(which.source, disc, which.part, false, which.windows), expected) << describe(which);
+    ASSERT_EQ(dilated(which.source, disc, which.part, false, which.windows), expected)
+        << describe(which);
     ASSERT_EQ(dilated(which.source, disc, which.part, true, which.windows), smaller) << describe(which);
 }
 
