@@ -89,8 +89,12 @@ struct Growing {
     Box partFor(const Box& window) const {
         return intersection(expanded(window, weights.radius), input.whole());
     }
-    int64_t widthFor(const Windows& windows) const { return windows.width + 2 * weights.radius; }
-    int64_t heightFor(const Windows& windows) const { return windows.height + 2 * weights.radius; }
+    int64_t widthFor(const Windows& windows) const {
+        return windows.width + 2 * int64_t{weights.radius};
+    }
+    int64_t heightFor(const Windows& windows) const {
+        return windows.height + 2 * int64_t{weights.radius};
+    }
 
     BlurInput blurOf(const Box& window, const Box& part, const CoverageRows& grown) const {
         return BlurInput::down(weights, grown, translated(window, -part.left, -part.top),

@@ -61,9 +61,8 @@ struct BlurInput {
             largest.window.left = around;
             largest.window.right = around + windows.width + kWidestVector;
             largest.source.width = largest.window.right + around;
-            const bool hasFull =
-                full.before != kNoFullColumns.before || full.from != kNoFullColumns.from;
-            if (hasFull) largest.full.before = around;
+            const Box reach = expanded(window, around);
+            if (full.before > reach.left || full.from < reach.right) largest.full.before = around + 1;
         }
         if (windows.areCutDown()) {
             largest.window.top = around;

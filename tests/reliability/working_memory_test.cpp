@@ -27,14 +27,15 @@ uint8_t coverageAt(int64_t x, int64_t y) {
     return across < 30 ? 255 : across < 32 ? 128 : 0;
 }
 
-/// A mask of any size with a destination of its width, as high as it is or a few rows of it.
+/// A part of the endless pattern from (left, top) on, and a destination of its size.
 class Canvas {
   public:
-    Canvas(unsigned width, unsigned height, unsigned seenRows)
-        : mMask(width, height, 1), mDst(width, seenRows, 4) {
+    Canvas(unsigned width, unsigned height, int left = 0, int top = 0)
+        : mMask(width, height, 1), mDst(width, height, 4) {
+        if (!isMade()) return;
         for (int64_t y = 0; y < height; ++y) {
             for (int64_t x = 0; x < width; ++x)
-                mMask.mData[y * width + x] = coverageAt(x, y);
+                mMask.mData[y * width + x] = coverageAt(left + x, top + y);
         }
         mText = VFRect(0, 0, static_cast<int>(width), static_cast<int>(height));
     }
@@ -54,6 +55,10 @@ class Canvas {
         for (size_t i = 0; i < bytes(); ++i)
             if (mDst.mData[i] != 0) return true;
         return false;
+    }
+
+    const unsigned char* at(int64_t x, int64_t y) const {
+        return mDst.mData + (y * mDst.mWidth + x) * 4;
     }
 
   private:
@@ -90,7 +95,9 @@ void expectFewBytes(Canvas& canvas, float size) {
     ASSERT_TRUE(canvas.isMade());
     for (const NamedCore& named : coresOf(size)) {
         EXPECT_LE(canvas.paint(*named.core), kMostBytes) << named.name << " of size " << size;
-        EXPECT_TRUE(canvas.isPainted()) << named.name << " of size " << size;
+        // Of a line of one pixel a blur beyond the limit of the add-calls leaves nothing.
+        const bool mayVanish = size > 100.0F;
+        EXPECT_TRUE(mayVanish || canvas.isPainted()) << named.name << " of size " << size;
     }
 }
 
@@ -102,7 +109,7 @@ class WorkingMemory : public ::testing::Test {
 };
 
 TEST_F(WorkingMemory, OfASmallPicture_IsLessThanItsDestination) {
-    Canvas canvas(200, 60, 60);
+    Canvas canvas(200, 60);
     for (const float size : {1.0F, 2.0F, 3.0F, 8.0F}) {
         for (const NamedCore& named : coresOf(size))
             EXPECT_LE(canvas.paint(*named.core), 200L * 60 * 4 * 2) << named.name << " " << size;
@@ -111,24 +118,24 @@ TEST_F(WorkingMemory, OfASmallPicture_IsLessThanItsDestination) {
 
 TEST_F(WorkingMemory, OfALargePicture_IsFewMegabytes) {
     if (kThinned > 1) GTEST_SKIP() << "takes a minute under an emulator";
-    Canvas canvas(4096, 4096, 4096);
+    Canvas canvas(4096, 4096);
     expectFewBytes(canvas, 100.0F);
 }
 
 TEST_F(WorkingMemory, OfALongLine_IsFewMegabytes) {
-    Canvas canvas(26'000, 200, 200);
+    Canvas canvas(26'000, 200);
     for (const float size : {2.0F, 17.0F, 48.0F, 256.0F})
         expectFewBytes(canvas, size);
 }
 
 TEST_F(WorkingMemory, OfARowOfPixels_IsFewMegabytes) {
-    Canvas canvas(100'000, 1, 1);
+    Canvas canvas(100'000, 1);
     for (const float size : {1.0F, 3.0F, 8.0F, 24.0F, 100.0F, 256.0F})
         expectFewBytes(canvas, size);
 }
 
 TEST_F(WorkingMemory, OfAColumnOfPixels_IsFewMegabytes) {
-    Canvas canvas(1, 100'000, 100'000);
+    Canvas canvas(1, 100'000);
     for (const float size : {1.0F, 3.0F, 8.0F, 24.0F, 100.0F, 256.0F})
         expectFewBytes(canvas, size);
 }
@@ -136,10 +143,36 @@ TEST_F(WorkingMemory, OfAColumnOfPixels_IsFewMegabytes) {
 /// A plane for each pixel with all that the disc reaches beside it would take 5 GB.
 TEST_F(WorkingMemory, OfTheStrokeOfALongColumn_IsFewMegabytes) {
     const auto length = static_cast<unsigned>(thinned(4'000'000));
-    Canvas canvas(1, length, length);
+    Canvas canvas(1, length);
     const auto stroke = coreOf<VFStroke, VFStrokeProperty>(24.0F, kRed, 1.0F, 0, 1);
     EXPECT_LE(canvas.paint(*stroke), kMostBytes);
     EXPECT_TRUE(canvas.isPainted());
+}
+
+/// By hand, as it holds 3.4 GB: the middle of a picture whose planes would be beyond 2 GiB is that of a
+/// small one.
+TEST_F(WorkingMemory, DISABLED_OfTheLargestPictures_IsFewMegabytes) {
+    constexpr int kSide = 26'000;
+    constexpr int kLeft = 12'345;
+    constexpr int kTop = 13'579;
+    constexpr int kPart = 2000;
+    constexpr int kEdge = 400;  // what lies beyond the small picture reaches no farther
+    Canvas large(kSide, kSide);
+    Canvas small(kPart, kPart, kLeft, kTop);
+    ASSERT_TRUE(large.isMade() && small.isMade());
+    for (const float size : {24.0F, 100.0F}) {
+        for (const NamedCore& named : coresOf(size)) {
+            SCOPED_TRACE(named.name + " of size " + std::to_string(size));
+            EXPECT_LE(large.paint(*named.core), kMostBytes);
+            small.paint(*named.core);
+            EXPECT_TRUE(small.isPainted());
+            for (int y = kEdge; y < kPart - kEdge; ++y) {
+                ASSERT_EQ(0, std::memcmp(large.at(kLeft + kEdge, kTop + y), small.at(kEdge, y),
+                                         size_t{kPart - 2 * kEdge} * 4))
+                    << "row " << y;
+            }
+        }
+    }
 }
 
 }  // namespace
