@@ -41,9 +41,11 @@ class Painter : public VFECoreBase {
     Record mRecord;
 };
 
-/// From what not even a pixel is painted with, which is cut into single ones, to plenty.
-int64_t randomBytes(Random& random) {
-    return int64_t{1} << random.between(8, 19);
+/// From what not even a pixel is painted with, which cuts into single ones, to plenty; of large sizes,
+/// where a pixel takes a while, mostly enough for some.
+int64_t randomBytes(Random& random, float size) {
+    const int fewest = random.chance(3) || !(size > 8.0F) ? 8 : size > 24.0F ? 17 : 14;
+    return int64_t{1} << random.between(fewest, 19);
 }
 
 /// Sizes of all kinds: small, whole, up to the limit of the add-calls, hand-made and odd ones.
@@ -81,7 +83,7 @@ TEST(Painters, StrokesInWindows_AreThoseOfTheLiteralForm) {
         const int position = random.between(-1, 3);
         const float size = randomSize(random);
         const uint32_t color = randomPremultiplied(random);
-        const int64_t bytes = randomBytes(random);
+        const int64_t bytes = randomBytes(random, size);
         Painter<VFStrokeProperty> core(internal::kStroke, bytes, {size, color, 1.0F, 0, position});
         EXPECT_TRUE(paintsLike(core, scene,
                                [&](Scene& expected) {
@@ -98,9 +100,9 @@ template <class Record, class LiteralForm>
 void expectShadows(EffectType type, LiteralForm literalForm) {
     forSeeds(0, 800, [&](Random& random) {
         const Scene scene = windowedScene(random);
-        const int64_t bytes = randomBytes(random);
         const Record record(random.real(0.0F, 360.0F), random.real(0.0F, 30.0F), randomSize(random),
                             randomPremultiplied(random), 1.0F);
+        const int64_t bytes = randomBytes(random, record.mSize);
         Painter<Record> core(type, bytes, record);
         EXPECT_TRUE(paintsLike(core, scene,
                                [&](Scene& expected) {
@@ -123,11 +125,11 @@ template <class Record, class LiteralForm>
 void expectGlows(EffectType type, LiteralForm literalForm) {
     forSeeds(0, 800, [&](Random& random) {
         const Scene scene = windowedScene(random);
-        const int64_t bytes = randomBytes(random);
         const auto stops = randomStops(random, random.chance(50) ? 0 : random.between(1, 4));
         auto array = libraryStops(stops);
         const Record record(randomSize(random), randomStraight(random), 1.0F,
                             static_cast<int>(array.size()), array.data());
+        const int64_t bytes = randomBytes(random, record.mSize);
         Painter<Record> core(type, bytes, record);
         EXPECT_TRUE(paintsLike(core, scene,
                                [&](Scene& expected) {
