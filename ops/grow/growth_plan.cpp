@@ -26,7 +26,7 @@ uint8_t* GrowthPlan::Layout::row(int plane, int64_t y) const {
 
 int64_t GrowthPlan::memoryBytes(const GrowthInput& input, int64_t width, int64_t height) {
     const Box whole = input.whole();
-    const int64_t around = 2 * int64_t{input.passes};
+    const int64_t around = 2 * (int64_t{input.passes} - 1);
     Arena arena = {nullptr};
     static_cast<void>(Layout::of(std::min(width + around, whole.width()),
                                  std::min(height + around, whole.height()), arena));
@@ -42,7 +42,7 @@ GrowthPlan::GrowthPlan(CpuLevel level, const GrowthInput& input, int64_t width, 
 }
 
 CoverageRows GrowthPlan::grown(const Box& part) {
-    const Box worked = intersection(expanded(part, mInput.passes), mInput.whole());
+    const Box worked = intersection(expanded(part, int64_t{mInput.passes} - 1), mInput.whole());
     VOREL_ASSERT(*this && !part.empty() && intersection(part, worked) == part);
     Arena arena = {mMemory.data()};
     mLayout = Layout::of(worked.width(), worked.height(), arena);

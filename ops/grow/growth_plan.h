@@ -26,8 +26,9 @@ struct GrowthInput {
 /// A growth, done at once for a part of it, as a pass needs all of the one before; its memory serves one
 /// part after the other. It is ready, or empty when memory ran out.
 ///
-/// A pass looks a pixel farther, so a part needs as many pixels around it as there are passes: what
-/// stands at the edge of them, where growth goes on, comes a pixel nearer with each.
+/// A pass looks a pixel farther, so a part needs as many pixels around it as there are passes. The last
+/// of them is the frame, which is right for the first pass; where growth goes on there, each later pass
+/// brings what is wrong a pixel nearer.
 class GrowthPlan {
   public:
     /// What a plan takes for parts of that size.
