@@ -3,6 +3,7 @@
 #include <cstddef>
 #include <cstdint>
 
+#include "core/inline.h"
 #include "core/pixel_buffer.h"
 
 #if defined(__SANITIZE_ADDRESS__)
@@ -18,6 +19,22 @@
 
 namespace VFontEffect::internal {
 
+/// The address sanitizer reports a use of bytes that are forbidden. Elsewhere nothing is done, and what
+/// is handed out has no fence behind it.
+#if defined(VOREL_ADDRESS_SANITIZER)
+constexpr int64_t kFenceBytes = 64;
+inline void forbidUse(const void* start, int64_t bytes) {
+    __asan_poison_memory_region(start, static_cast<size_t>(bytes));
+}
+inline void allowUse(const void* start, int64_t bytes) {
+    __asan_unpoison_memory_region(start, static_cast<size_t>(bytes));
+}
+#else
+constexpr int64_t kFenceBytes = 0;
+VOREL_INLINE void forbidUse(const void* /*start*/, int64_t /*bytes*/) {}
+VOREL_INLINE void allowUse(const void* /*start*/, int64_t /*bytes*/) {}
+#endif
+
 /// Working memory of bytes, aligned to a cache line, so that no vector at a multiple of its own size
 /// straddles two lines. Empty when memory ran out.
 class LineBuffer {
@@ -26,8 +43,9 @@ class LineBuffer {
         : mBytes(PixelBuffer<uint8_t>::uninitialised(width * height + kLineBytes)) {
         if (!mBytes) return;
         const int64_t before = data() - mBytes.data();
-        forbid(mBytes.data(), before);
-        forbid(data() + width * height, kLineBytes - before);
+        // The padding is there for alignment only.
+        forbidUse(mBytes.data(), before);
+        forbidUse(data() + width * height, kLineBytes - before);
     }
 
     explicit operator bool() const { return static_cast<bool>(mBytes); }
@@ -39,13 +57,6 @@ class LineBuffer {
 
   private:
     static constexpr int64_t kLineBytes = 64;
-
-    /// Poisons the padding that is there for alignment only: the address sanitizer reports its use.
-    static void forbid([[maybe_unused]] const void* start, [[maybe_unused]] int64_t bytes) {
-#if defined(VOREL_ADDRESS_SANITIZER)
-        __asan_poison_memory_region(start, static_cast<size_t>(bytes));
-#endif
-    }
 
     PixelBuffer<uint8_t> mBytes;
 };

@@ -30,7 +30,7 @@ class [[nodiscard]] PixelBuffer {
     T& operator[](size_t i) { return mData[i]; }
 
   private:
-    /// A larger request fails: no text effect of a sensible size makes one.
+    /// A larger request fails. No effect comes near it, whatever its picture: see core/windows.h.
     static constexpr uint64_t kMostBytes = uint64_t{1} << 31;
 
     static PixelBuffer make(int64_t width, int64_t height, bool clear) {

@@ -72,9 +72,10 @@ void growByBoxFilter(CpuLevel level, unsigned char* mask, int passes, int width,
     if (part.empty()) return clearEndColumns(picture);
     const CoverageRows framed = {picture.at(part.left - 1, part.top - 1), width, part.width() + 2,
                                  part.height() + 2, kAsIs};
-    GrowthPlan plan(level, {framed, -1, passes});
+    const GrowthInput input = {framed, -1, passes};
+    GrowthPlan plan(level, input, part.width(), part.height());
     if (!plan) return;
-    const CoverageRows grown = plan.rows(1, part.height());
+    const CoverageRows grown = plan.grown(input.whole());
     for (int64_t y = 0; y < grown.height; ++y) {
         std::memcpy(picture.at(part.left, part.top + y), grown.start + y * grown.stride,
                     static_cast<size_t>(grown.width));

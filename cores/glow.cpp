@@ -6,8 +6,8 @@
 
 #include "core/float_state.h"
 #include "core/numeric.h"
-#include "core/pixel_buffer.h"
 #include "core/size_limit.h"
+#include "core/windows.h"
 #include "cores/paint_input.h"
 #include "cores/placed_target.h"
 #include "ops/blur/blur_plan.h"
@@ -79,28 +79,59 @@ class ValueColours {
     uint32_t mPixels[kTableLast];  ///< by value, as in memory, if there are several
 };
 
-/// Grows, blurs and paints the part of the glow in the window. Returns false, with nothing painted, when
+/// What has grown, in the part that the blur of a window reaches, and the blur in its coordinates.
+/// Around coverage's inverse everything is full, and stays so; coverage itself spreads by a pixel a
+/// pass.
+struct Growing {
+    GrowthInput input;
+    const BlurWeights& weights;
+    FullColumns full;
+
+    Box partFor(const Box& window) const {
+        return intersection(expanded(window, weights.radius), input.whole());
+    }
+    int64_t widthFor(const Windows& windows) const {
+        return windows.width + 2 * int64_t{weights.radius};
+    }
+    int64_t heightFor(const Windows& windows) const {
+        return windows.height + 2 * int64_t{weights.radius};
+    }
+
+    BlurInput blurOf(const Box& window, const Box& part, const CoverageRows& grown) const {
+        return BlurInput::down(weights, grown, translated(window, -part.left, -part.top),
+                               {full.before - part.left, full.from - part.left},
+                               input.source.invertMask == kInverse);
+    }
+    /// The blur that takes the most memory of those of any of the windows.
+    BlurInput largestBlur(const Windows& windows) const {
+        const Box part = partFor(windows.part);
+        const CoverageRows sizes = {nullptr, 0, std::max<int64_t>(0, part.width()),
+                                    std::max<int64_t>(0, part.height()), kAsIs};
+        return blurOf(windows.part, part, sizes).largestOf(windows);
+    }
+};
+
+/// Grows, blurs and paints the visible part of the glow. Returns false, with nothing painted, when
 /// memory ran out.
-[[nodiscard]] bool paintBlurred(CpuLevel level, const CoverageBox& box, const Shape& shape,
-                                const PlacedTarget& target, const Box& window,
-                                const ValueColours& colours, GlowSide side) {
-    const bool inverted = side == GlowSide::inside;
-    // Coverage spreads by a pixel a pass. Around its inverse everything is full, and stays so.
-    const int64_t margin = inverted ? 0 : shape.passes;
-    GrowthPlan growth(level, {box.rows(inverted ? kInverse : kAsIs), margin, shape.passes});
-    if (!growth) return false;
-    // Deliberate: between the passes of an inner glow the columns that the first pass does not reach are
-    // full; with a radius of 0 those that growth clears, the first one and the last.
-    const int64_t open = std::max(1, shape.radius);
-    const FullColumns full =
-        inverted ? FullColumns{shape.image.left + open, shape.image.right - open} : kNoFullColumns;
-    const BlurWeights weights = gaussianOf128(shape.radius);
-    const Box blurred = translated(window, margin, margin);
-    const CoverageRows grown = growth.rows(-margin, box.height + 2 * margin);
-    BlurPlan blur(level, BlurInput::down(weights, grown, blurred, full, inverted));
-    if (!blur) return false;
-    forBands(blur, blurred, [&](const Box& band, const BlurredRows& rows) {
-        colours.paint(target, translated(band, -margin, -margin), rows.values, rows.stride);
+[[nodiscard]] bool paintBlurred(CpuLevel level, const Growing& growing, const PlacedTarget& target,
+                                const Box& visible, const ValueColours& colours, int64_t workingBytes) {
+    if (!growing.weights) return false;
+    const auto memoryBytes = [&](const Windows& cut) {
+        return GrowthPlan::memoryBytes(growing.input, growing.widthFor(cut), growing.heightFor(cut)) +
+               BlurPlan::memoryBytes(level, growing.largestBlur(cut));
+    };
+    const int64_t reach = int64_t{growing.weights.radius} + growing.input.passes;
+    const Windows windows = windowsWithin(workingBytes, visible, reach, memoryBytes);
+    GrowthPlan growth(level, growing.input, growing.widthFor(windows), growing.heightFor(windows));
+    BlurPlan blur(level, growing.largestBlur(windows));
+    if (!growth || !blur) return false;
+    windows.forEach([&](const Box& window) {
+        const Box part = growing.partFor(window);
+        const CoverageRows grown = part.empty() ? CoverageRows{} : growth.grown(part);
+        forBands(
+            blur, growing.blurOf(window, part, grown), [&](const Box& band, const BlurredRows& rows) {
+                colours.paint(target, translated(band, part.left, part.top), rows.values, rows.stride);
+            });
     });
     return true;
 }
@@ -109,7 +140,10 @@ class ValueColours {
 ///
 /// Deliberate: around an inner glow the pixels that the blur does not reach are opaque white, not
 /// transparent. They are painted, and the text fill or the composite clips them away.
-void paintBorder(const Shape& shape, const PlacedTarget& target, const uint8_t* full) {
+void paintBorder(const Shape& shape, const PlacedTarget& target) {
+    constexpr int64_t kPiece = 1024;
+    uint8_t full[kPiece];
+    std::memset(full, 0xFF, sizeof full);
     const Box& outside = shape.image;
     const Box& inside = shape.blurred;
     const Box sides[] = {{outside.left, outside.top, outside.right, inside.top},
@@ -119,7 +153,10 @@ void paintBorder(const Shape& shape, const PlacedTarget& target, const uint8_t* 
     for (const Box& side : sides) {
         const Box seen = target.seen(side);
         if (seen.empty()) continue;
-        target.paint(&BlendLoops::dstOverGate, seen, full, 0, 0xFFFFFFFFU);
+        const Windows pieces = {seen, kPiece, seen.height()};
+        pieces.forEach([&](const Box& piece) {
+            target.paint(&BlendLoops::dstOverGate, piece, full, 0, 0xFFFFFFFFU);
+        });
     }
 }
 
@@ -138,7 +175,8 @@ void paintCorners(const Shape& shape, const PlacedTarget& target, const ValueCol
 
 }  // namespace
 
-void paintGlow(const VFECore::ParamPostProcessing* params, const GlowRecord& record, GlowSide side) {
+void paintGlow(const VFECore::ParamPostProcessing* params, const GlowRecord& record, GlowSide side,
+               int64_t workingBytes) {
     const OwnFloatState floatState;
     const CoverageBox box = coverageOf(params);
     const int pad = saturateToInt(int64_t{toInt(record.sizePx)} + 1);
@@ -148,22 +186,23 @@ void paintGlow(const VFECore::ParamPostProcessing* params, const GlowRecord& rec
     const Shape shape = Shape::of(box, pad);
     const CpuLevel level = chosenLevel();
     const PlacedTarget target(level, params->dstBitmap, box.left, box.top);
-    const Box seen = target.seen(shape.image);
-    if (seen.empty()) return;
-    const Box window = target.seen(shape.blurred);
+    if (target.seen(shape.image).empty()) return;
+    const Box visible = target.seen(shape.blurred);
     const ValueColours colours(level, record);
-    const auto paintWindow = [&] {
-        return window.empty() || paintBlurred(level, box, shape, target, window, colours, side);
-    };
-    if (side == GlowSide::outside) {
-        static_cast<void>(paintWindow());
-        return;
-    }
-    auto full = PixelBuffer<uint8_t>::uninitialised(seen.width());
-    if (!full) return;
-    std::memset(full.data(), 0xFF, static_cast<size_t>(seen.width()));
-    if (!paintWindow()) return;
-    paintBorder(shape, target, full.data());
+    const bool inside = side == GlowSide::inside;
+    // Deliberate: between the passes of an inner glow the columns that the first pass does not reach are
+    // full; with a radius of 0 those that growth clears, the first one and the last.
+    const int64_t open = std::max(1, shape.radius);
+    const FullColumns full =
+        inside ? FullColumns{shape.image.left + open, shape.image.right - open} : kNoFullColumns;
+    const BlurWeights weights = gaussianOf128(shape.radius);
+    const GrowthInput input = {box.rows(inside ? kInverse : kAsIs), inside ? 0 : shape.passes,
+                               shape.passes};
+    const Growing growing = {input, weights, full};
+    const bool done =
+        visible.empty() || paintBlurred(level, growing, target, visible, colours, workingBytes);
+    if (!inside || !done) return;
+    paintBorder(shape, target);
     if (shape.radius == 0) paintCorners(shape, target, colours);
 }
 

@@ -3,6 +3,7 @@
 #include <cstdint>
 
 #include "core/strict_math.h"
+#include "core/windows.h"
 #include "simd/cpu_level.h"
 #include "voreleffect/VFECore.h"
 
@@ -41,6 +42,9 @@ void fillGlowTable(CpuLevel level, const GlowRecord& record, float fadeStart, in
 /// runs out it stays as it was.
 void growByBoxFilter(CpuLevel level, unsigned char* mask, int passes, int width, int height);
 
-void paintGlow(const VFECore::ParamPostProcessing* params, const GlowRecord& record, GlowSide side);
+/// Paints a glow in windows that take `workingBytes` at most, if they can. All of it is taken before the
+/// first pixel is painted: without it nothing is.
+void paintGlow(const VFECore::ParamPostProcessing* params, const GlowRecord& record, GlowSide side,
+               int64_t workingBytes = kWorkingBytes);
 
 }  // namespace VFontEffect::internal

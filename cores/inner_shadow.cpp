@@ -4,6 +4,7 @@
 #include "core/float_state.h"
 #include "core/size_limit.h"
 #include "cores/paint_input.h"
+#include "cores/painters.h"
 #include "cores/placed_target.h"
 #include "cores/property_copy.h"
 #include "cores/shadow_offset.h"
@@ -38,29 +39,32 @@ int VFInnerShadow::getOffset() {
 }
 
 void VFInnerShadow::doPostProcessing(ParamPostProcessing* params) {
+    if (mProperty != nullptr) paintInnerShadow(params, *mProperty);
+}
+
+void internal::paintInnerShadow(const VFECore::ParamPostProcessing* params,
+                                const VFInnerShadowProperty& record, int64_t workingBytes) {
     const OwnFloatState floatState;
     const CoverageBox box = coverageOf(params);
-    if (!box || mProperty == nullptr || exceedsSizeLimit(mProperty->mSize)) return;
+    if (!box || exceedsSizeLimit(record.mSize)) return;
 
     const CpuLevel level = chosenLevel();
     const PlacedTarget target(level, params->dstBitmap, box.left, box.top);
-    const Box window = target.seen(wholeOf(box.rows()));
-    if (window.empty()) return;
-    const uint32_t color = mProperty->mColor;
-    const int radius = shadowRadius(mProperty->mSize);
-    const ShadowOffset offset = shadowOffset(mProperty->mAngle, mProperty->mDistance);
+    const Box visible = target.seen(wholeOf(box.rows()));
+    if (visible.empty()) return;
+    const int radius = shadowRadius(record.mSize);
+    const ShadowOffset offset = shadowOffset(record.mAngle, record.mDistance);
     if (!meetsItself(box, radius, offset.x, offset.y)) {
         // The glyph moved clear of itself: all of it lies in shadow, by its own coverage.
-        return target.paintCoverage(&BlendLoops::dstOverMask, box.rows(), 0, 0, color);
+        return target.paintCoverage(&BlendLoops::dstOverMask, box.rows(), 0, 0, record.mColor);
     }
 
-    const Box unmoved = translated(window, -int64_t{offset.x}, -int64_t{offset.y});
+    const Box unmoved = translated(visible, -int64_t{offset.x}, -int64_t{offset.y});
     const BlurWeights weights = gaussianOf100(radius);
-    BlurPlan blur(level, BlurInput::inverseAcross(weights, box.rows(), unmoved));
-    if (!blur) return;
-    forBands(blur, unmoved, [&](const Box& band, const BlurredRows& rows) {
+    const BlurInput input = BlurInput::inverseAcross(weights, box.rows(), unmoved);
+    blurInWindows(level, input, workingBytes, [&](const Box& band, const BlurredRows& rows) {
         target.paint(&BlendLoops::dstOverMask, translated(band, offset.x, offset.y), rows.values,
-                     rows.stride, color);
+                     rows.stride, record.mColor);
     });
 }
 

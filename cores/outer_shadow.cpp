@@ -6,6 +6,7 @@
 #include "core/numeric.h"
 #include "core/size_limit.h"
 #include "cores/paint_input.h"
+#include "cores/painters.h"
 #include "cores/placed_target.h"
 #include "cores/property_copy.h"
 #include "cores/shadow_offset.h"
@@ -61,24 +62,29 @@ int VFOuterShadow::getBottomOffset() {
 }
 
 void VFOuterShadow::doPostProcessing(ParamPostProcessing* params) {
+    if (mProperty != nullptr) paintOuterShadow(params, *mProperty, {mOffsetX, mOffsetY});
+}
+
+void internal::paintOuterShadow(const VFECore::ParamPostProcessing* params,
+                                const VFOuterShadowProperty& record, const ShadowOffset& offset,
+                                int64_t workingBytes) {
     const OwnFloatState floatState;
     const CoverageBox box = coverageOf(params);
-    if (!box || mProperty == nullptr || exceedsSizeLimit(mProperty->mSize)) return;
+    if (!box || exceedsSizeLimit(record.mSize)) return;
 
     const CpuLevel level = chosenLevel();
-    const PlacedTarget target(level, params->dstBitmap, box.left + mOffsetX, box.top + mOffsetY);
-    const uint32_t color = mProperty->mColor;
-    const int radius = shadowRadius(mProperty->mSize);
+    const PlacedTarget target(level, params->dstBitmap, box.left + offset.x, box.top + offset.y);
+    const int radius = shadowRadius(record.mSize);
     // Without blur the coverage itself is the shadow.
-    if (radius == 0) return target.paintCoverage(&BlendLoops::dstOverMask, box.rows(), 0, 0, color);
-    const Box window = target.seen(expanded(wholeOf(box.rows()), radius));
-    if (window.empty()) return;
+    if (radius == 0)
+        return target.paintCoverage(&BlendLoops::dstOverMask, box.rows(), 0, 0, record.mColor);
+    const Box visible = target.seen(expanded(wholeOf(box.rows()), radius));
+    if (visible.empty()) return;
 
     const BlurWeights weights = gaussianOf100(radius);
-    BlurPlan blur(level, BlurInput::down(weights, box.rows(), window, kNoFullColumns, false));
-    if (!blur) return;
-    forBands(blur, window, [&](const Box& band, const BlurredRows& rows) {
-        target.paint(&BlendLoops::dstOverMask, band, rows.values, rows.stride, color);
+    const BlurInput input = BlurInput::down(weights, box.rows(), visible, kNoFullColumns, false);
+    blurInWindows(level, input, workingBytes, [&](const Box& band, const BlurredRows& rows) {
+        target.paint(&BlendLoops::dstOverMask, band, rows.values, rows.stride, record.mColor);
     });
 }
 

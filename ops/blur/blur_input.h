@@ -4,6 +4,7 @@
 
 #include "core/box.h"
 #include "core/coverage_rows.h"
+#include "core/windows.h"
 #include "ops/blur/blur_weights.h"
 
 namespace VFontEffect::internal {
@@ -46,6 +47,29 @@ struct BlurInput {
                                    const Box& window) {
         return {weights,        source,        window,          Order::acrossThenDown,
                 kNoFullColumns, {true, kAsIs}, {true, kInverse}};
+    }
+
+    /// The same blur of a part of its window.
+    BlurInput of(const Box& part) const { return {weights, source, part, order, full, first, second}; }
+
+    /// One that takes as much memory as that of any of the windows that its own is cut into. Its source
+    /// has sizes alone. A vector and a group more make up for where in them a window begins.
+    BlurInput largestOf(const Windows& windows) const {
+        BlurInput largest = *this;
+        const int64_t around = weights.radius;
+        if (windows.areCutAcross()) {
+            largest.window.left = around;
+            largest.window.right = around + windows.width + kWidestVector;
+            largest.source.width = largest.window.right + around;
+            const Box reach = expanded(window, around);
+            if (full.before > reach.left || full.from < reach.right) largest.full.before = around + 1;
+        }
+        if (windows.areCutDown()) {
+            largest.window.top = around;
+            largest.window.bottom = around + windows.height + kQuad;
+            largest.source.height = largest.window.bottom + around;
+        }
+        return largest;
     }
 };
 

@@ -16,16 +16,32 @@ bool suitsDifferences(const DotLoops& dots, const BlurInput& input) {
 
 }  // namespace
 
-BlurPlan::BlurPlan(CpuLevel level, const BlurInput& input) : mNextRow(input.window.top) {
-    if (!input.weights) return;
-    VOREL_ASSERT(!input.window.empty());
-    VOREL_ASSERT(input.weights.total <= kLargestTotal);
+int64_t BlurPlan::memoryBytes(CpuLevel level, const BlurInput& input) {
     const DotLoops& dots = dotLoops(level);
-    if (suitsDifferences(dots, input)) {
-        mDifferences.emplace(differenceLoops(level), input);
+    return suitsDifferences(dots, input) ? DifferenceBlur::memoryBytes(differenceLoops(level), input)
+                                         : DotBlur::memoryBytes(dots, input);
+}
+
+BlurPlan::BlurPlan(CpuLevel level, const BlurInput& largest) {
+    if (!largest.weights) return;
+    VOREL_ASSERT(!largest.window.empty());
+    VOREL_ASSERT(largest.weights.total <= kLargestTotal);
+    const DotLoops& dots = dotLoops(level);
+    if (suitsDifferences(dots, largest)) {
+        mDifferences.emplace(differenceLoops(level), largest);
     } else {
-        mDots.emplace(dots, input);
+        mDots.emplace(dots, largest);
     }
+}
+
+void BlurPlan::begin(const BlurInput& input) {
+    VOREL_ASSERT(*this && !input.window.empty());
+    if (mDots) {
+        mDots->begin(input);
+    } else {
+        mDifferences->begin(input);
+    }
+    mNextRow = input.window.top;
 }
 
 BlurPlan::operator bool() const {
@@ -33,7 +49,7 @@ BlurPlan::operator bool() const {
 }
 
 int64_t BlurPlan::bandRows() const {
-    return mDots ? kQuad : mDifferences->bandRows();
+    return mDots ? mDots->bandRows() : mDifferences->bandRows();
 }
 
 BlurredRows BlurPlan::rows(int64_t y, int64_t count) {

@@ -10,13 +10,20 @@
 
 namespace VFontEffect::internal {
 
-/// A separable blur, planned once: the strategy, the weights in its form, and the working memory. It is
-/// ready, or empty when memory ran out.
+/// A separable blur, planned once: the strategy, the weights in its form, and the working memory, which
+/// serves one window after the other. It is ready, or empty when memory ran out.
 class BlurPlan {
   public:
-    BlurPlan(CpuLevel level, const BlurInput& input);
+    /// What a plan for an input takes beside the weights.
+    static int64_t memoryBytes(CpuLevel level, const BlurInput& input);
+
+    /// For inputs that take no more memory than this one, of the same weights, order and endings.
+    BlurPlan(CpuLevel level, const BlurInput& largest);
 
     explicit operator bool() const;
+
+    /// Turns to an input.
+    void begin(const BlurInput& input);
 
     /// Rows that are asked for at once; the last ones may be fewer.
     int64_t bandRows() const;
@@ -29,16 +36,32 @@ class BlurPlan {
   private:
     std::optional<DotBlur> mDots;
     std::optional<DifferenceBlur> mDifferences;
-    int64_t mNextRow;
+    int64_t mNextRow = 0;
 };
 
-/// Calls paint(part, rows) for all bands of the window, `part` being a band's box.
+/// Blurs an input and calls paint(part, rows) for all bands of its window, `part` being a band's box.
 template <class Paint>
-void forBands(BlurPlan& plan, const Box& window, Paint paint) {
+void forBands(BlurPlan& plan, const BlurInput& input, Paint paint) {
+    plan.begin(input);
+    const Box& window = input.window;
     for (int64_t y = window.top; y < window.bottom; y += plan.bandRows()) {
         const int64_t count = std::min(plan.bandRows(), window.bottom - y);
         paint(Box{window.left, y, window.right, y + count}, plan.rows(y, count));
     }
+}
+
+/// Blurs an input in windows that take `workingBytes` at most, and calls paint(part, rows) for the bands
+/// of all; for none when memory ran out.
+template <class Paint>
+void blurInWindows(CpuLevel level, const BlurInput& input, int64_t workingBytes, Paint paint) {
+    if (!input.weights) return;
+    const auto memoryBytes = [&](const Windows& cut) {
+        return BlurPlan::memoryBytes(level, input.largestOf(cut));
+    };
+    const Windows windows = windowsWithin(workingBytes, input.window, input.weights.radius, memoryBytes);
+    BlurPlan plan(level, input.largestOf(windows));
+    if (!plan) return;
+    windows.forEach([&](const Box& window) { forBands(plan, input.of(window), paint); });
 }
 
 }  // namespace VFontEffect::internal

@@ -85,49 +85,73 @@ WeightTerms::WeightTerms(const DifferenceLoops& loops, const BlurWeights& weight
 
 // --- Layout -----------------------------------------------------------------------------------------
 
-DifferenceBlur::Layout DifferenceBlur::Layout::of(const BlurInput& input, const ReachedSource& source,
-                                                  int64_t side) {
-    const Box& window = input.window;
-    const Axis down = {window.top - source.top, window.height(), source.part.height};
-    const Axis across = {window.left - source.left, window.width(), source.part.width};
-    const bool downFirst = input.order == BlurInput::Order::downThenAcross;
-    Layout layout = {downFirst ? down : across, downFirst ? across : down, 0, 0, 0, 0};
-    const int64_t sourceLanes = roundedUp(layout.second.length, side);
-    layout.allocatedLanes = sourceLanes;
-
+/// The lanes of the second pass, which lie along the first one's strips.
+void DifferenceBlur::Layout::placeLanes(const BlurInput& input, int64_t side) {
+    const int64_t sourceLanes = roundedUp(second.length, side);
     const Box reach = expanded(window, input.weights.radius);
     if (input.full.before <= reach.left && input.full.from >= reach.right) {
-        layout.fullFrom = layout.second.length;
-        return layout;
+        allocatedLanes = sourceLanes;
+        fullFrom = second.length;
+        return;
     }
     // All columns that are in reach, of which the source's are some.
-    layout.sourceLane = sourceLanes > 0 ? source.left - reach.left : 0;
-    layout.allocatedLanes = std::max(reach.width(), layout.sourceLane + sourceLanes);
-    layout.fullBefore = input.full.before - reach.left;
-    layout.fullFrom = input.full.from - reach.left;
-    layout.second = {window.left - reach.left, window.width(), reach.width()};
+    sourceLane = sourceLanes > 0 ? source.left - reach.left : 0;
+    allocatedLanes = std::max(reach.width(), sourceLane + sourceLanes);
+    fullBefore = input.full.before - reach.left;
+    fullFrom = input.full.from - reach.left;
+    second = {window.left - reach.left, window.width(), reach.width()};
+}
+
+DifferenceBlur::Layout DifferenceBlur::Layout::of(const DifferenceLoops& loops, const BlurInput& input,
+                                                  Arena& arena) {
+    const int64_t side = loops.vectorBytes;
+    const Box& window = input.window;
+    Layout layout = {};
+    layout.window = window;
+    layout.source = ReachedSource::of(input);
+    const CoverageRows& part = layout.source.part;
+    const Axis down = {window.top - layout.source.top, window.height(), part.height};
+    const Axis across = {window.left - layout.source.left, window.width(), part.width};
+    const bool downFirst = input.order == BlurInput::Order::downThenAcross;
+    layout.first = downFirst ? down : across;
+    layout.second = downFirst ? across : down;
+    layout.bandRows = downFirst ? side : window.height();
+    layout.placeLanes(input, side);
+
+    const int64_t longest = std::max(layout.first.length, layout.second.length);
+    layout.lines =
+        arena.take<uint8_t>(kLinesOfRow * kLinePixelBytes * side * (longest + kDifferenceRowsAround));
+    layout.intermediate =
+        arena.take<uint8_t>(layout.allocatedLanes * roundedUp(layout.first.count, side));
+    layout.stride = roundedUp(window.width(), side);
+    layout.out = arena.take<uint8_t>(layout.stride * roundedUp(layout.bandRows, side));
+    if (!downFirst) layout.transposed = arena.take<uint8_t>(roundedUp(part.width, side) * side);
     return layout;
 }
 
-DifferenceBlur::DifferenceBlur(const DifferenceLoops& loops, const BlurInput& input)
+int64_t DifferenceBlur::memoryBytes(const DifferenceLoops& loops, const BlurInput& input) {
+    Arena arena = {nullptr};
+    static_cast<void>(Layout::of(loops, input, arena));
+    return arena.used;
+}
+
+DifferenceBlur::DifferenceBlur(const DifferenceLoops& loops, const BlurInput& largest)
     : mLoops(loops),
-      mDownFirst(input.order == BlurInput::Order::downThenAcross),
-      mWindow(input.window),
-      mFirst(input.first),
-      mSecond(input.second),
-      mRadius(input.weights.radius),
-      mTotal(input.weights.total),
+      mDownFirst(largest.order == BlurInput::Order::downThenAcross),
+      mFirst(largest.first),
+      mSecond(largest.second),
+      mRadius(largest.weights.radius),
+      mTotal(largest.weights.total),
       mInverse(inverseAbove(mTotal)),
       mSide(loops.vectorBytes),
-      mSource(ReachedSource::of(input)),
-      mLayout(Layout::of(input, mSource, mSide)),
-      mTerms(loops, input.weights),
-      mLines(kLinesOfRow * kLinePixelBytes * mSide,
-             std::max(mLayout.first.length, mLayout.second.length) + kDifferenceRowsAround),
-      mIntermediate(mLayout.allocatedLanes, inSquares(mLayout.first.count)),
-      mStride(inSquares(mWindow.width())),
-      mOut(mStride, inSquares(bandRows())) {
-    if (!mDownFirst) mTransposed.emplace(inSquares(mSource.part.width), mSide);
+      mTerms(loops, largest.weights),
+      mMemoryBytes(memoryBytes(loops, largest)),
+      mMemory(mMemoryBytes) {}
+
+void DifferenceBlur::begin(const BlurInput& input) {
+    Arena arena = {mMemory.data()};
+    mLayout = Layout::of(mLoops, input, arena);
+    VOREL_ASSERT(arena.used <= mMemoryBytes);
 }
 
 // --- Passes -----------------------------------------------------------------------------------------
@@ -135,21 +159,21 @@ DifferenceBlur::DifferenceBlur(const DifferenceLoops& loops, const BlurInput& in
 void DifferenceBlur::blurStrip(const PassEnding& ending, const CoverageRows& source, int64_t x,
                                const Axis& axis, const SquareRows& out) {
     const DifferencePass pass = {*mTerms, mRadius, mTotal, mInverse, ending};
-    mLoops.blurStrip(pass, source, x, mLines.data(), axis.first, axis.count, out);
+    mLoops.blurStrip(pass, source, x, mLayout.lines, axis.first, axis.count, out);
 }
 
 void DifferenceBlur::firstPass() {
-    const CoverageRows& part = mSource.part;
+    const CoverageRows& part = mLayout.source.part;
     const int64_t lanes = mDownFirst ? part.width : part.height;
     VOREL_ASSERT(mLayout.sourceLane + inSquares(lanes) <= mLayout.allocatedLanes);
     for (int64_t lane = 0; lane < lanes; lane += mSide) {
-        const SquareRows out = {mIntermediate.data() + (mLayout.sourceLane + lane) * mSide,
+        const SquareRows out = {mLayout.intermediate + (mLayout.sourceLane + lane) * mSide,
                                 mLayout.allocatedLanes * mSide, mSide, true};
         if (mDownFirst) {
             blurStrip(mFirst, part, lane, mLayout.first, out);
         } else {
-            mLoops.transpose(part, lane, mTransposed->data());
-            const CoverageRows rows = {mTransposed->data(), mSide, mSide, part.width, kAsIs};
+            mLoops.transpose(part, lane, mLayout.transposed);
+            const CoverageRows rows = {mLayout.transposed, mSide, mSide, part.width, kAsIs};
             blurStrip(mFirst, rows, 0, mLayout.first, out);
         }
     }
@@ -176,15 +200,15 @@ void DifferenceBlur::secondPass(int64_t result, const SquareRows& out) {
 }
 
 BlurredRows DifferenceBlur::rows(int64_t y) {
-    VOREL_ASSERT((y - mWindow.top) % (mDownFirst ? mSide : mWindow.height()) == 0);
-    if (y == mWindow.top) firstPass();
+    VOREL_ASSERT((y - mLayout.window.top) % (mDownFirst ? mSide : mLayout.window.height()) == 0);
+    if (y == mLayout.window.top) firstPass();
     if (mDownFirst) {
-        secondPass(y - mWindow.top, {mOut.data(), mSide, mStride, true});
+        secondPass(y - mLayout.window.top, {mLayout.out, mSide, mLayout.stride, true});
     } else {
-        for (int64_t x = 0; x < mWindow.width(); x += mSide)
-            secondPass(x, {mOut.data() + x, mSide * mStride, mStride, false});
+        for (int64_t x = 0; x < mLayout.window.width(); x += mSide)
+            secondPass(x, {mLayout.out + x, mSide * mLayout.stride, mLayout.stride, false});
     }
-    return {mOut.data(), mStride};
+    return {mLayout.out, mLayout.stride};
 }
 
 }  // namespace VFontEffect::internal

@@ -1,8 +1,8 @@
 #pragma once
 
 #include <cstdint>
-#include <optional>
 
+#include "core/arena.h"
 #include "core/line_buffer.h"
 #include "core/numeric.h"
 #include "core/pixel_buffer.h"
@@ -35,15 +35,19 @@ class WeightTerms {
 /// by one, or columns of all results at once.
 class DifferenceBlur {
   public:
-    DifferenceBlur(const DifferenceLoops& loops, const BlurInput& input);
+    /// What a blur takes for an input beside its weights.
+    static int64_t memoryBytes(const DifferenceLoops& loops, const BlurInput& input);
+
+    /// For inputs that take no more than this one.
+    DifferenceBlur(const DifferenceLoops& loops, const BlurInput& largest);
 
     /// Whether there is memory for it.
-    explicit operator bool() const {
-        return mTerms && mLines && mIntermediate && mOut && (mDownFirst || *mTransposed);
-    }
+    explicit operator bool() const { return mTerms && mMemory; }
+
+    void begin(const BlurInput& input);
 
     /// Rows that are asked for at once.
-    int64_t bandRows() const { return mDownFirst ? mSide : mWindow.height(); }
+    int64_t bandRows() const { return mLayout.bandRows; }
 
     /// A band of rows from row y on, in order.
     BlurredRows rows(int64_t y);
@@ -56,21 +60,34 @@ class DifferenceBlur {
         int64_t length;
     };
 
-    /// The passes, and the lanes of the intermediate plane.
+    /// A window, its passes, the lanes of the intermediate plane, and the places in the working memory.
     struct Layout {
+        Box window;
+        ReachedSource source;
+        int64_t bandRows;
         Axis first;
         Axis second;
         int64_t sourceLane;  // the first that the first pass fills
         int64_t allocatedLanes;
         int64_t fullBefore;  // the lanes of full columns
         int64_t fullFrom;
+        uint8_t* lines;         // what a strip's differences are made of
+        uint8_t* intermediate;  // strips, one behind the other
+        int64_t stride;         // of results
+        uint8_t* out;
+        uint8_t* transposed;  // a strip of the source's rows, where they are the lanes
 
-        static Layout of(const BlurInput& input, const ReachedSource& source, int64_t side);
+        static Layout of(const DifferenceLoops& loops, const BlurInput& input, Arena& arena);
+
+      private:
+        void placeLanes(const BlurInput& input, int64_t side);
     };
 
     int64_t inSquares(int64_t places) const { return roundedUp(places, mSide); }
     /// The strip of the intermediate plane whose lines begin with that result of the first pass.
-    uint8_t* strip(int64_t result) { return mIntermediate.data() + result * mLayout.allocatedLanes; }
+    uint8_t* strip(int64_t result) const {
+        return mLayout.intermediate + result * mLayout.allocatedLanes;
+    }
 
     void blurStrip(const PassEnding& ending, const CoverageRows& source, int64_t x, const Axis& axis,
                    const SquareRows& out);
@@ -80,21 +97,16 @@ class DifferenceBlur {
 
     const DifferenceLoops& mLoops;
     bool mDownFirst;
-    Box mWindow;
     PassEnding mFirst;
     PassEnding mSecond;
     int mRadius;
     uint32_t mTotal;
     float mInverse;  // just above 1 / mTotal
     int64_t mSide;
-    ReachedSource mSource;
-    Layout mLayout;
     WeightTerms mTerms;
-    LineBuffer mLines;         // what a strip's differences are made of
-    LineBuffer mIntermediate;  // strips, one behind the other
-    int64_t mStride;
-    LineBuffer mOut;
-    std::optional<LineBuffer> mTransposed;  // a strip of the source's rows, where they are the lanes
+    int64_t mMemoryBytes;
+    LineBuffer mMemory;
+    Layout mLayout = {};
 };
 
 }  // namespace VFontEffect::internal

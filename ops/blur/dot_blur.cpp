@@ -4,7 +4,6 @@
 #include <cstdint>
 #include <cstdlib>
 #include <cstring>
-#include <utility>
 
 #include "core/assert.h"
 #include "core/numeric.h"
@@ -24,6 +23,10 @@ int64_t quadsOf(int64_t rows) {
 /// In multiples of four, so that what follows cells of a byte is aligned.
 int64_t cellsOf(int radius) {
     return roundedUp(kCellsBefore + 2 * int64_t{radius} + 1 + kCellsBehind, 4);
+}
+
+bool isNarrow(const DotLoops& loops, const BlurWeights& weights) {
+    return loops.hasNarrow && weights.radius <= kLargestNarrowRadius && weights.total <= 0xFF;
 }
 
 /// The total of the weights before each cell.
@@ -54,7 +57,7 @@ PackedWeights::PackedWeights(const DotLoops& loops, const BlurWeights& weights)
     mBlur.cells = mMemory.data() + kCellsBefore * loops.cellBytes;
     mBlur.totals = totals + kCellsBefore;
     mBlur.inverse = inverseAbove(weights.total);
-    mBlur.isNarrow = loops.hasNarrow && weights.radius <= kLargestNarrowRadius && weights.total <= 0xFF;
+    mBlur.isNarrow = isNarrow(loops, weights);
     if (!mBlur.isNarrow) return;
     const uint32_t scale = weights.total < 128 ? 2 : 1;
     for (int k = 0; k <= weights.radius; ++k)
@@ -65,118 +68,163 @@ PackedWeights::PackedWeights(const DotLoops& loops, const BlurWeights& weights)
 
 // --- Working memory -------------------------------------------------------------------------------
 
-// A narrow blur reads all the groups around its results. A wide one leaves out groups without coverage,
-// and so there is no need to store those that lie wholly above or below the rows.
-GroupRange GroupRange::needed(const PackedWeights& weights, int64_t height, int64_t firstRow,
-                              int64_t quads) {
-    const int64_t end = quads - 1 + tapSteps(weights->radius);
-    if (weights->isNarrow) return {0, end};
+namespace {
+
+/// More than any quad needs, so that groups rarely move.
+constexpr int64_t kSpareGroups = 16;
+
+/// Bytes of a pixel in a row between the passes.
+int64_t pixelBytes(const DotLoops& loops, const BlurWeights& weights) {
+    return isNarrow(loops, weights) ? kNarrowPixelBytes : 1;
+}
+
+/// The groups that 4 * quads rows of results need of `height` rows. Group 0 begins with row `firstRow`.
+/// A narrow blur reads all the groups around its results. A wide one leaves out groups without coverage,
+/// and so there is no need to store those that lie wholly above or below the rows.
+GroupRange neededGroups(const DotLoops& loops, const BlurWeights& weights, int64_t height,
+                        int64_t firstRow, int64_t quads) {
+    const int64_t end = quads - 1 + tapSteps(weights.radius);
+    if (isNarrow(loops, weights)) return {0, end};
     const int64_t first = std::min(end, std::max<int64_t>(0, -firstRow) / kQuad);
     return {first, std::clamp(quadsOf(std::max<int64_t>(0, height - firstRow)), first, end)};
 }
 
-TapGroups::TapGroups(const DotLoops& loops, const PackedWeights& weights, int64_t width, int64_t height,
-                     int64_t firstRow, int64_t quads)
-    : mSteps(tapSteps(weights->radius)),
-      mMissing(GroupRange::needed(weights, height, firstRow, quads)),
-      mCapacity(std::min(mSteps - 1 + kSpareGroups, mMissing.end - mMissing.first)),
-      mStrips(roundedUp(width, loops.vectorBytes) / loops.vectorBytes),
-      mGroupBytes(kQuad * loops.vectorBytes * weights.pixelBytes()),
-      mMemory(mGroupBytes * mCapacity, mStrips),
-      mCovered(PixelBuffer<int32_t>::zeroed(mStrips, 2)) {
-    if (!*this) return;
-    mColumns = {mMemory.data(), mGroupBytes * mCapacity, mMissing.first,
-                width,          mCovered.data(),         mCovered.data() + mStrips};
-    std::fill_n(mColumns.lastCovered, mStrips, -1);
+TapGroups takeGroups(const DotLoops& loops, const BlurWeights& weights, int64_t width,
+                     const GroupRange& needed, Arena& arena) {
+    TapGroups taps = {};
+    taps.missing = needed;
+    taps.steps = tapSteps(weights.radius);
+    taps.capacity = std::min(taps.steps - 1 + kSpareGroups, needed.end - needed.first);
+    taps.strips = roundedUp(width, loops.vectorBytes) / loops.vectorBytes;
+    taps.groupBytes = kQuad * loops.vectorBytes * pixelBytes(loops, weights);
+    const int64_t stripBytes = taps.groupBytes * taps.capacity;
+    uint8_t* const groups = arena.take<uint8_t>(stripBytes * taps.strips);
+    auto* const firstCovered = arena.take<int32_t>(taps.strips);
+    auto* const lastCovered = arena.take<int32_t>(taps.strips);
+    taps.columns = {groups, stripBytes, needed.first, width, firstCovered, lastCovered};
+    return taps;
+}
+
+/// Rows that are blurred across, `columns` wide.
+IntermediateRows takeIntermediate(const DotLoops& loops, const BlurWeights& weights,
+                                  int64_t coveredColumn, int64_t columns, const FullColumns& full,
+                                  Arena& arena) {
+    VOREL_ASSERT(coveredColumn % kWidestVector == 0);
+    const int64_t bytes = pixelBytes(loops, weights);
+    const int64_t stride = (strideFor(columns) + 2 * kIntermediateMargin) * bytes;
+    uint8_t* const pixels = arena.take<uint8_t>(stride * kQuad);
+    uint8_t* const covered = arena.take<uint8_t>(strideFor(columns) / loops.vectorBytes);
+    uint8_t* const start = pixels == nullptr ? nullptr : pixels + kIntermediateMargin * bytes;
+    return {start, stride, columns, coveredColumn, full.before, full.from, covered};
+}
+
+}  // namespace
+
+void TapGroups::clear() const {
+    std::fill_n(columns.firstCovered, strips, 0);
+    std::fill_n(columns.lastCovered, strips, -1);
 }
 
 /// Makes room behind the groups from `group` on.
 void TapGroups::forgetBefore(int64_t group) {
-    VOREL_ASSERT(group > mColumns.firstGroup && group <= mMissing.first);
-    const int64_t skipped = (group - mColumns.firstGroup) * mGroupBytes;
-    const int64_t kept = (mMissing.first - group) * mGroupBytes;
-    for (int64_t strip = 0; strip < mStrips; ++strip) {
-        uint8_t* const groups = mColumns.groups + strip * mColumns.stripStride;
+    VOREL_ASSERT(group > columns.firstGroup && group <= missing.first);
+    const int64_t skipped = (group - columns.firstGroup) * groupBytes;
+    const int64_t kept = (missing.first - group) * groupBytes;
+    for (int64_t strip = 0; strip < strips; ++strip) {
+        uint8_t* const groups = columns.groups + strip * columns.stripStride;
         std::memmove(groups, groups + skipped, static_cast<size_t>(kept));
     }
-    mColumns.firstGroup = group;
+    columns.firstGroup = group;
 }
 
-IntermediateBuffer::IntermediateBuffer(const DotLoops& loops, const PackedWeights& weights,
-                                       int64_t coveredColumn, int64_t columns, const FullColumns& full)
-    : mStrideBytes((strideFor(columns) + 2 * kIntermediateMargin) * weights.pixelBytes()),
-      mPixels(mStrideBytes, kQuad),
-      mCovered(PixelBuffer<uint8_t>::zeroed(strideFor(columns) / loops.vectorBytes)) {
-    if (!*this || !weights) return;
-    VOREL_ASSERT(coveredColumn % kWidestVector == 0);
-    uint8_t* const start = mPixels.data() + kIntermediateMargin * weights.pixelBytes();
-    mRows = {start, mStrideBytes, columns, coveredColumn, full.before, full.from, mCovered.data()};
-    loops.clear(*weights, mRows);
+DotBlur::Layout DotBlur::Layout::of(const DotLoops& loops, const BlurInput& input, Arena& arena) {
+    const BlurWeights& weights = input.weights;
+    const Box& window = input.window;
+    Layout layout = {};
+    layout.window = window;
+    layout.source = ReachedSource::of(input);
+    layout.firstRow = window.top - weights.radius - layout.source.top;
+    layout.stride = strideFor(window.width());
+    const CoverageRows& part = layout.source.part;
+    const bool acrossFirst = input.order == BlurInput::Order::acrossThenDown;
+    if (acrossFirst) layout.across = arena.take<uint8_t>(layout.stride * kQuad);
+    const GroupRange needed =
+        neededGroups(loops, weights, part.height, layout.firstRow, quadsOf(window.height()));
+    layout.taps = takeGroups(loops, weights, acrossFirst ? window.width() : part.width, needed, arena);
+
+    // The rows that are blurred across have the source's columns, and when some of the full ones are in
+    // reach all that are.
+    const Box reach = expanded(window, weights.radius);
+    layout.intermediateLeft = layout.source.left;
+    if (input.full.before <= reach.left && input.full.from >= reach.right) {
+        layout.intermediate = takeIntermediate(loops, weights, 0, part.width, {0, part.width}, arena);
+    } else {
+        const int64_t coveredColumn =
+            roundedUp(std::max<int64_t>(0, layout.source.left - reach.left), kWidestVector);
+        const int64_t left = layout.source.left - coveredColumn;
+        layout.intermediateLeft = left;
+        layout.intermediate =
+            takeIntermediate(loops, weights, coveredColumn, reach.right - left,
+                             {input.full.before - left, input.full.from - left}, arena);
+    }
+    layout.out = arena.take<uint8_t>(layout.stride * kQuad);
+    return layout;
+}
+
+int64_t DotBlur::memoryBytes(const DotLoops& loops, const BlurInput& input) {
+    Arena arena = {nullptr};
+    static_cast<void>(Layout::of(loops, input, arena));
+    return arena.used;
 }
 
 // --- Passes -----------------------------------------------------------------------------------------
 
-DotBlur::DotBlur(const DotLoops& loops, const BlurInput& input)
+DotBlur::DotBlur(const DotLoops& loops, const BlurInput& largest)
     : mLoops(loops),
-      mWindow(input.window),
-      mFirst(input.first),
-      mSecond(input.second),
-      mWeights(loops, input.weights),
-      mSource(ReachedSource::of(input)),
-      mFirstRow(mWindow.top - input.weights.radius - mSource.top),
-      mStride(strideFor(mWindow.width())),
-      mAcross(input.order == BlurInput::Order::acrossThenDown
-                  ? std::optional<LineBuffer>(std::in_place, mStride, kQuad)
-                  : std::nullopt),
-      mTaps(loops, mWeights, mAcross ? mWindow.width() : mSource.part.width, mSource.part.height,
-            mFirstRow, quadsOf(mWindow.height())),
-      mIntermediateLeft(mSource.left),
-      mIntermediate(intermediateFor(input.full)),
-      mOut(mStride, kQuad) {}
+      mFirst(largest.first),
+      mSecond(largest.second),
+      mWeights(loops, largest.weights),
+      mMemoryBytes(memoryBytes(loops, largest)),
+      mMemory(mMemoryBytes) {}
 
-/// The rows that are blurred across have the source's columns, and when some of the full ones are in
-/// reach all that are.
-IntermediateBuffer DotBlur::intermediateFor(const FullColumns& full) {
-    const Box reach = expanded(mWindow, mWeights->radius);
-    const int64_t width = mSource.part.width;
-    if (full.before <= reach.left && full.from >= reach.right)
-        return {mLoops, mWeights, 0, width, {0, width}};
-    const int64_t coveredColumn =
-        roundedUp(std::max<int64_t>(0, mIntermediateLeft - reach.left), kWidestVector);
-    mIntermediateLeft -= coveredColumn;
-    return {mLoops,
-            mWeights,
-            coveredColumn,
-            reach.right - mIntermediateLeft,
-            {full.before - mIntermediateLeft, full.from - mIntermediateLeft}};
+void DotBlur::begin(const BlurInput& input) {
+    Arena arena = {mMemory.data()};
+    mLayout = Layout::of(mLoops, input, arena);
+    VOREL_ASSERT(arena.used <= mMemoryBytes);
+    mLayout.taps.clear();
+    mLoops.clear(*mWeights, mLayout.intermediate);
 }
 
 void DotBlur::blurAcross(const PassEnding& ending, uint8_t* out) {
-    VOREL_ASSERT(roundedUp(mWindow.width(), mLoops.vectorBytes) <= mStride);
-    mLoops.across(*mWeights, mIntermediate.rows(), mWindow.left - mIntermediateLeft,
-                  mWindow.right - mIntermediateLeft, {out, mStride, ending});
+    const Box& window = mLayout.window;
+    VOREL_ASSERT(roundedUp(window.width(), mLoops.vectorBytes) <= mLayout.stride);
+    mLoops.across(*mWeights, mLayout.intermediate, window.left - mLayout.intermediateLeft,
+                  window.right - mLayout.intermediateLeft, {out, mLayout.stride, ending});
 }
 
 void DotBlur::feed(int64_t group) {
-    const int64_t row = mFirstRow + kQuad * group;
-    if (!mAcross) return mLoops.feed(*mWeights, mSource.part, row, mTaps.columns(), group);
-    mLoops.copy(*mWeights, mSource.part, row, mIntermediate.rows());
-    blurAcross(mFirst, mAcross->data());
-    const CoverageRows across = {mAcross->data(), mStride, mWindow.width(), kQuad, kAsIs};
-    mLoops.feed(*mWeights, across, 0, mTaps.columns(), group);
+    const CoverageRows& part = mLayout.source.part;
+    const TapColumns& columns = mLayout.taps.columns;
+    const int64_t row = mLayout.firstRow + kQuad * group;
+    if (mLayout.across == nullptr) return mLoops.feed(*mWeights, part, row, columns, group);
+    mLoops.copy(*mWeights, part, row, mLayout.intermediate);
+    blurAcross(mFirst, mLayout.across);
+    const CoverageRows across = {mLayout.across, mLayout.stride, mLayout.window.width(), kQuad, kAsIs};
+    mLoops.feed(*mWeights, across, 0, columns, group);
 }
 
 BlurredRows DotBlur::rows(int64_t y) {
-    VOREL_ASSERT((y - mWindow.top) % kQuad == 0);
-    const int64_t quad = (y - mWindow.top) / kQuad;
-    mTaps.complete(quad, [&](int64_t group) { feed(group); });
-    if (mAcross) {
-        mLoops.downToBytes(*mWeights, mTaps.columns(), quad, {mOut.data(), mStride, mSecond});
+    VOREL_ASSERT((y - mLayout.window.top) % kQuad == 0);
+    const int64_t quad = (y - mLayout.window.top) / kQuad;
+    mLayout.taps.complete(quad, [&](int64_t group) { feed(group); });
+    const TapColumns& columns = mLayout.taps.columns;
+    if (mLayout.across != nullptr) {
+        mLoops.downToBytes(*mWeights, columns, quad, {mLayout.out, mLayout.stride, mSecond});
     } else {
-        mLoops.down(*mWeights, mTaps.columns(), quad, mIntermediate.rows());
-        blurAcross(mSecond, mOut.data());
+        mLoops.down(*mWeights, columns, quad, mLayout.intermediate);
+        blurAcross(mSecond, mLayout.out);
     }
-    return {mOut.data(), mStride};
+    return {mLayout.out, mLayout.stride};
 }
 
 }  // namespace VFontEffect::internal

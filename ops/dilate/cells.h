@@ -18,7 +18,8 @@ struct CellLayout {
 
     static CellLayout of(const Dilation& dilation, Arena& arena) {
         const int64_t reach = dilation.disc->reach;
-        return {takeRows(dilation, dilation.bandRows + 2 * reach, reach, reach + kBytes, arena),
+        return {takeRows(dilation, wantedColumns(dilation), dilation.bandRows + 2 * reach, reach,
+                         reach + kBytes, arena),
                 arena.take<uint8_t>(dilation.bandRows * dilatedStride(dilation))};
     }
 };

@@ -14,25 +14,28 @@ namespace VFontEffect::internal {
 /// The source is the box with a border of so many empty pixels.
 constexpr int64_t kDilationBorder = 1;
 
-/// Grey-scale dilation of a box of coverage by a disc. All coordinates are the source's, the corner of
-/// its border being (0, 0).
+/// Grey-scale dilation of a box of coverage by a disc, for a window of results. All coordinates are
+/// those of the part of the source that the disc reaches from there, its corner being (0, 0).
 ///
 /// The result at p is the largest c - (255 - weight) over all source pixels of coverage c, with the
 /// weight that the disc around p has there; 0 where nothing is above 0.
 struct Dilation {
-    CoverageRows box;  ///< the source without its border, which is full where the box is inverted
+    CoverageRows box;  ///< what is in reach without the border, which is full where the box is inverted
+    int64_t boxLeft;   ///< where it begins: behind the border, if that is in reach
+    int64_t boxTop;
     const DiscShape* disc;
-    int64_t width;   ///< of the source, border included
+    int64_t width;   ///< of what is in reach, border included
     int64_t height;  ///< likewise
-    int64_t left;    ///< the columns that are wanted, the source's own among them
+    int64_t left;    ///< the columns of the window: nothing in reach is farther from them than the reach
     int64_t right;
-    int64_t top;       ///< the first row of results that is asked for
+    int64_t top;       ///< the first row of the window
     int64_t bandRows;  ///< rows that are asked for at once; the last ones may be fewer
 };
 
-/// Rows of results are so far apart.
+/// Rows of results are so far apart: an odd number of the cache's lines, for rows that are a power of
+/// two apart share few of its places, and spreading takes 1.6 times as long.
 VOREL_INLINE int64_t dilatedStride(const Dilation& dilation) {
-    return roundedUp(dilation.right - dilation.left, 64);
+    return roundedUp(dilation.right - dilation.left, 64) | 64;
 }
 
 /// One way to dilate. Its layout stands at the beginning of its memory.

@@ -10,19 +10,44 @@ namespace {
 /// Rows that are dilated at once: few enough to stay in the cache with what is blended with them.
 constexpr int64_t kBandRows = 32;
 
-Dilation inputOf(const CoverageRows& box, const DiscShape& disc, const Box& wanted) {
-    VOREL_ASSERT(!wanted.empty());
-    const Box part = translated(wanted, kDilationBorder, kDilationBorder);
-    Dilation input = {};
-    input.box = box;
-    input.disc = &disc;
-    input.width = box.width + 2 * kDilationBorder;
-    input.height = box.height + 2 * kDilationBorder;
-    input.left = std::min<int64_t>(part.left, 0);
-    input.right = std::max(part.right, input.width);
-    input.top = part.top;
-    input.bandRows = std::min(kBandRows, part.height());
-    return input;
+/// The source with its border, as far as it is in reach of a window.
+Box reachedSource(const DilationInput& input, const Box& window) {
+    const Box whole = expanded(wholeOf(input.source), kDilationBorder);
+    return intersection(expanded(window, input.disc.reach), whole);
+}
+
+Dilation dilationOf(const DilationInput& input, const Box& window) {
+    const Box part = reachedSource(input, window);
+    VOREL_ASSERT(!window.empty() && !part.empty());
+    const Box box = intersection(part, wholeOf(input.source));
+    const int64_t corner = box.empty() ? 0 : box.top * input.source.stride + box.left;
+    return {{input.source.start + corner, input.source.stride, box.width(), box.height(),
+             input.source.invertMask},
+            box.left - part.left,
+            box.top - part.top,
+            &input.disc,
+            part.width(),
+            part.height(),
+            window.left - part.left,
+            window.right - part.left,
+            window.top - part.top,
+            std::min(kBandRows, window.height())};
+}
+
+/// That of a window that is as large as any and has as much of the source around it.
+Dilation largestDilation(const DilationInput& input, const Windows& windows) {
+    Dilation largest = dilationOf(input, windows.part);
+    const int64_t reach = input.disc.reach;
+    if (windows.areCutAcross()) {
+        largest.left = reach;
+        largest.right = reach + windows.width;
+        largest.width = largest.right + reach;
+    }
+    if (windows.areCutDown()) {
+        largest.height = windows.height + 2 * reach;
+        largest.bandRows = std::min(kBandRows, windows.height);
+    }
+    return largest;
 }
 
 const DilationStrategy& strategyFor(const DilationLoops& loops, int reach) {
@@ -33,14 +58,24 @@ const DilationStrategy& strategyFor(const DilationLoops& loops, int reach) {
 
 }  // namespace
 
-DilationPlan::DilationPlan(CpuLevel level, const CoverageRows& source, const DiscShape& disc,
-                           const Box& part)
-    : mInput(inputOf(source, disc, part)),
+int64_t DilationPlan::memoryBytes(CpuLevel level, const DilationInput& input, const Windows& windows) {
+    return strategyFor(dilationLoops(level), input.disc.reach)
+        .memoryBytes(largestDilation(input, windows));
+}
+
+DilationPlan::DilationPlan(CpuLevel level, const DilationInput& input, int64_t memoryBytes)
+    : mInput(input),
       mLoops(dilationLoops(level)),
-      mStrategy(strategyFor(mLoops, disc.reach)),
-      mMemory(mStrategy.memoryBytes(mInput)),
-      mNextRow(part.top) {
-    if (mMemory) mStrategy.begin(mInput, mMemory.data());
+      mStrategy(strategyFor(mLoops, input.disc.reach)),
+      mMemoryBytes(memoryBytes),
+      mMemory(mMemoryBytes) {}
+
+void DilationPlan::begin(const Box& window) {
+    mDilation = dilationOf(mInput, window);
+    VOREL_ASSERT(*this && mStrategy.memoryBytes(mDilation) <= mMemoryBytes);
+    mStrategy.begin(mDilation, mMemory.data());
+    mFirstRow = window.top - mDilation.top;
+    mNextRow = window.top;
 }
 
 CoverageRows DilationPlan::rows(int64_t y, int64_t count) {
@@ -48,20 +83,20 @@ CoverageRows DilationPlan::rows(int64_t y, int64_t count) {
 }
 
 CoverageRows DilationPlan::minRows(DilationPlan& other, int64_t y, int64_t count) {
-    VOREL_ASSERT(left() == other.left() && mInput.right == other.mInput.right);
+    VOREL_ASSERT(mDilation.left == other.mDilation.left && mDilation.right == other.mDilation.right);
     uint8_t* const values = nextRows(y, count);
-    mLoops.keepMin(values, other.nextRows(y, count), dilatedStride(mInput) * count);
+    mLoops.keepMin(values, other.nextRows(y, count), dilatedStride(mDilation) * count);
     return asRows(values, count);
 }
 
 uint8_t* DilationPlan::nextRows(int64_t y, int64_t count) {
     VOREL_ASSERT(*this && y == mNextRow && count > 0 && count <= bandRows());
     mNextRow += count;
-    return mStrategy.rows(mInput, mMemory.data(), y + kDilationBorder, count);
+    return mStrategy.rows(mDilation, mMemory.data(), y - mFirstRow, count);
 }
 
 CoverageRows DilationPlan::asRows(const uint8_t* values, int64_t count) const {
-    return {values, dilatedStride(mInput), mInput.right - mInput.left, count, kAsIs};
+    return {values, dilatedStride(mDilation), mDilation.right - mDilation.left, count, kAsIs};
 }
 
 }  // namespace VFontEffect::internal

@@ -5,46 +5,59 @@
 #include "core/box.h"
 #include "core/coverage_rows.h"
 #include "core/line_buffer.h"
+#include "core/windows.h"
 #include "ops/dilate/dilation_loops.h"
 
 namespace VFontEffect::internal {
 
-/// A dilation, planned once: the strategy, its layout and its memory. It is ready, or empty when memory
-/// ran out.
+/// What is dilated. The disc must outlive the plan.
+struct DilationInput {
+    CoverageRows source;
+    const DiscShape& disc;
+};
+
+/// A dilation, planned once: the strategy and its memory, which serves one window after the other. It is
+/// ready, or empty when memory ran out.
 class DilationPlan {
   public:
     /// All that the disc reaches from a source and the pixel around it, in the source's coordinates.
-    static Box reached(const CoverageRows& source, const DiscShape& disc) {
-        return expanded(wholeOf(source), disc.reach + kDilationBorder);
+    static Box reached(const DilationInput& input) {
+        return expanded(wholeOf(input.source), input.disc.reach + kDilationBorder);
     }
 
-    /// `part` is what is wanted, in the source's coordinates; not empty. The disc must outlive the plan.
-    DilationPlan(CpuLevel level, const CoverageRows& source, const DiscShape& disc, const Box& part);
+    /// What a plan for any of the windows takes.
+    static int64_t memoryBytes(CpuLevel level, const DilationInput& input, const Windows& windows);
+
+    /// Takes so much memory. Windows, in the source's coordinates, are of what is reached.
+    DilationPlan(CpuLevel level, const DilationInput& input, int64_t memoryBytes);
 
     explicit operator bool() const { return static_cast<bool>(mMemory); }
 
-    /// The first column of the results: that of the part, or one before it.
-    int64_t left() const { return mInput.left - kDilationBorder; }
+    /// Turns to a window, or a part of one.
+    void begin(const Box& window);
 
-    /// Rows that are asked for at once; the last ones may be fewer.
-    int64_t bandRows() const { return mInput.bandRows; }
+    /// Rows that are asked for at once; the last ones of a window may be fewer.
+    int64_t bandRows() const { return mDilation.bandRows; }
 
-    /// `count` rows of results from row y of the source on. Bands are asked for in order, from the
-    /// part's top on. The rows stay until the next call.
+    /// `count` rows of the window's results from row y of the source on. Bands are asked for in order,
+    /// from the window's top on. The rows stay until the next call.
     CoverageRows rows(int64_t y, int64_t count);
 
-    /// Likewise, of each result the smaller one of this plan's and of another's for the same part.
+    /// Likewise, of each result the smaller one of this plan's and of another's for the same window.
     CoverageRows minRows(DilationPlan& other, int64_t y, int64_t count);
 
   private:
     uint8_t* nextRows(int64_t y, int64_t count);
     CoverageRows asRows(const uint8_t* values, int64_t count) const;
 
-    Dilation mInput;
+    DilationInput mInput;
     const DilationLoops& mLoops;
     const DilationStrategy& mStrategy;
+    int64_t mMemoryBytes;
     LineBuffer mMemory;
-    int64_t mNextRow;
+    Dilation mDilation = {};  ///< of the window
+    int64_t mFirstRow = 0;    ///< of the source, its row 0
+    int64_t mNextRow = 0;
 };
 
 }  // namespace VFontEffect::internal

@@ -3,29 +3,13 @@
 #include <cstdint>
 #include <cstring>
 
+#include "core/arena.h"
 #include "core/assert.h"
-#include "core/numeric.h"
 #include "ops/dilate/dilation_loops.h"
 #include "simd/pieces.h"
 
 /// Working memory of the strategies, and rows of source pixels as all of them read them.
 namespace VFontEffect::internal::VOREL_LEVEL {
-
-constexpr int64_t kArenaAlignment = 64;
-
-/// Hands out working memory, which is aligned; without any it only counts.
-struct Arena {
-    uint8_t* memory;
-    int64_t used = 0;
-
-    template <class T>
-    VOREL_INLINE T* take(int64_t count) {
-        static_assert(alignof(T) <= kArenaAlignment, "all that is handed out is aligned for its type");
-        uint8_t* const taken = memory == nullptr ? nullptr : memory + used;
-        used += roundedUp(count * static_cast<int64_t>(sizeof(T)), kArenaAlignment);
-        return reinterpret_cast<T*>(taken);
-    }
-};
 
 /// Bytes of memory for a strategy's `Layout`, which `Layout::of(dilation, arena)` takes, and which
 /// stands at their beginning itself.
@@ -68,11 +52,23 @@ struct PaddedRows {
     }
 };
 
-/// Rows in which there are so many columns before and behind those of the result that are wanted.
-VOREL_INLINE PaddedRows takeRows(const Dilation& dilation, int64_t count, int64_t before, int64_t behind,
-                                 Arena& arena) {
-    const int64_t lead = before - dilation.left;
-    const int64_t stride = lead + dilation.right + behind;
+/// Columns of results.
+struct Columns {
+    int64_t left;
+    int64_t right;
+};
+
+VOREL_INLINE Columns wantedColumns(const Dilation& dilation) {
+    return {dilation.left, dilation.right};
+}
+
+/// Rows in which there are so many columns before and behind those of the results, the reach or more. No
+/// more of the source lies there.
+VOREL_INLINE PaddedRows takeRows(const Dilation& dilation, const Columns& results, int64_t count,
+                                 int64_t before, int64_t behind, Arena& arena) {
+    const int64_t lead = before - results.left;
+    const int64_t stride = lead + results.right + behind;
+    VOREL_ASSERT(lead >= 0 && lead + dilation.width <= stride);
     return {arena.take<uint8_t>(count * stride), count, stride, lead, dilation.width};
 }
 
@@ -91,9 +87,11 @@ inline void fillRow(const Dilation& dilation, int64_t y, const PaddedRows& rows,
     setBytes(to - rows.lead, 0, rows.lead);
     setBytes(to + rows.width, 0, rows.stride - rows.lead - rows.width);
     const CoverageRows& box = dilation.box;
-    if (y == 0 || y == dilation.height - 1) return setBytes(to, box.invertMask, rows.width);
+    const int64_t boxRow = y - dilation.boxTop;
+    if (boxRow < 0 || boxRow >= box.height) return setBytes(to, box.invertMask, rows.width);
+    // The border's columns, or the box's over them.
     to[0] = to[rows.width - 1] = box.invertMask;
-    copyInverted(box.start + (y - kDilationBorder) * box.stride, box.width, box.invertMask, to + 1);
+    copyInverted(box.start + boxRow * box.stride, box.width, box.invertMask, to + dilation.boxLeft);
 }
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

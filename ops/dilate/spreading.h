@@ -34,7 +34,8 @@ struct SpreadLayout {
         const int64_t reach = dilation.disc->reach;
         SpreadLayout layout;
         // The first column that is wanted begins a line of the cache.
-        layout.row = takeRows(dilation, 1, roundedUp(reach, kArenaAlignment), reach + kBytes, arena);
+        layout.row = takeRows(dilation, wantedColumns(dilation), 1, roundedUp(reach, kArenaAlignment),
+                              reach + kBytes, arena);
         layout.deficits = arena.take<uint8_t>(4 * (kLongestSpreadReach + 1) * kBytes);
         layout.stride = dilatedStride(dilation);
         layout.wasFull = arena.take<uint8_t>(layout.stride / kBytes);

@@ -54,9 +54,16 @@ constexpr int64_t kWindowSlack = kLongestWindow + 2 * kBytes;
 /// ones.
 constexpr int64_t kMostTaps = 16;
 
+VOREL_INLINE int64_t tilesOf(int64_t columns) {
+    return (columns + kTile - 1) / kTile;
+}
+
 struct TileLayout {
-    int64_t tiles;
-    uint8_t largest;  ///< of all coverage
+    Columns columns;    ///< of all tiles: those of the window, and of the source in its reach
+    int64_t tiles;      ///< in a row
+    int64_t firstTile;  ///< of the window, its corner
+    int64_t endTile;    ///< behind its last one
+    uint8_t largest;    ///< of all coverage
     // By row of the source.
     PaddedRows rows;
     PaddedRows windows[2];
@@ -82,18 +89,24 @@ struct TileLayout {
     static TileLayout of(const Dilation& dilation, Arena& arena) {
         const int64_t height = dilation.height;
         const int64_t reach = dilation.disc->reach;
-        const auto take = [&] {
-            return takeRows(dilation, height, reach + kFewestRimCells, reach + kWindowSlack, arena);
-        };
         TileLayout layout;
-        layout.tiles = (dilation.right - dilation.left + kTile - 1) / kTile;
+        layout.firstTile = tilesOf(max<int64_t>(dilation.left, 0));
+        layout.endTile = layout.firstTile + tilesOf(dilation.right - dilation.left);
+        layout.columns = {dilation.left - layout.firstTile * kTile, max(dilation.right, dilation.width)};
+        layout.tiles = tilesOf(layout.columns.right - layout.columns.left);
         layout.largest = 0;
+        const auto take = [&] {
+            return takeRows(dilation, layout.columns, height, reach + kFewestRimCells,
+                            reach + kWindowSlack, arena);
+        };
         layout.rows = take();
         layout.windows[0] = take();
         layout.windows[1] = take();
         layout.lengths[0] = reach < 24 ? 4 : 16;
         layout.lengths[1] = 4 * layout.lengths[0];
-        layout.reachStride = roundedUp(layout.tiles, kDistances);
+        // Vectors of the window's tiles begin with its first one.
+        const int64_t fromFirst = roundedUp(layout.tiles - layout.firstTile, kDistances);
+        layout.reachStride = roundedUp(layout.firstTile + fromFirst, kDistances);
         layout.full = arena.take<Reach>(height * layout.reachStride);
         layout.touched = arena.take<Reach>(height * layout.reachStride);
         layout.columnStride = height + kBytes;
@@ -224,7 +237,7 @@ inline uint8_t largestCoverage(const PaddedRows& rows, int64_t height) {
 /// Notes what is covered in a row of the source, which may lie behind its last one.
 inline void findExtents(const Dilation& dilation, const TileLayout& planes, int64_t y) {
     const bool inside = y < dilation.height;
-    const uint8_t* const source = planes.rows.at(inside ? y : 0) + dilation.left;
+    const uint8_t* const source = planes.rows.at(inside ? y : 0) + planes.columns.left;
     const U8s most = splat<U8s>(planes.largest);
     for (int64_t tile = 0; tile < planes.tiles; tile += kBytes / kTile) {
         const U8s coverage = inside ? load<U8s>(source + tile * kTile) : U8s{};
@@ -409,7 +422,7 @@ inline Tile dilatedTile(const Dilation& dilation, const TileLayout& planes, int6
     const int64_t reach = dilation.disc->reach;
     OpenTile open = {planes,
                      y,
-                     planes.rows.at(0) + dilation.left + tile * kTile,
+                     planes.rows.at(0) + planes.columns.left + tile * kTile,
                      planes.toRight + tile * planes.columnStride,
                      planes.toLeft + tile * planes.columnStride,
                      planes.outerReach + reach,
@@ -431,19 +444,20 @@ inline void dilateRowByTiles(const Dilation& dilation, const TileLayout& planes,
     const Reach* const full = planes.full + nearest * planes.reachStride;
     const Reach* const touched = planes.touched + nearest * planes.reachStride;
     const Tile most = splat<Tile>(planes.largest);
-    for (int64_t tile = 0; tile < planes.tiles; tile += kDistances) {
-        const int64_t end = min(tile + kDistances, planes.tiles);
+    for (int64_t tile = planes.firstTile; tile < planes.endTile; tile += kDistances) {
+        const int64_t end = min(tile + kDistances, planes.endTile);
         const bool allFull = allZero(bitCast<U8s>(load<Distances>(full + tile) < away));
         const bool allUntouched = allZero(bitCast<U8s>(load<Distances>(touched + tile) >= away));
         if (allFull || allUntouched) {
-            setBytes(results + tile * kTile, allFull ? planes.largest : 0, (end - tile) * kTile);
+            setBytes(results, allFull ? planes.largest : 0, (end - tile) * kTile);
+            results += (end - tile) * kTile;
             continue;
         }
-        for (int64_t i = tile; i < end; ++i) {
+        for (int64_t i = tile; i < end; ++i, results += kTile) {
             const bool known = full[i] >= away || touched[i] < away;
-            store(results + i * kTile, !known            ? dilatedTile(dilation, planes, y, i)
-                                       : full[i] >= away ? most
-                                                         : Tile{});
+            store(results, !known            ? dilatedTile(dilation, planes, y, i)
+                           : full[i] >= away ? most
+                                             : Tile{});
         }
     }
 }

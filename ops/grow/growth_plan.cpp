@@ -1,86 +1,104 @@
 #include "ops/grow/growth_plan.h"
 
+#include <algorithm>
 #include <cstring>
 
 #include "core/assert.h"
 #include "core/numeric.h"
 
 namespace VFontEffect::internal {
-namespace {
 
-int64_t strideFor(int64_t width) {
-    return kGrowthMargin + roundedUp(width, kGrowthMargin);
+GrowthPlan::Layout GrowthPlan::Layout::of(int64_t width, int64_t height, Arena& arena) {
+    Layout layout = {};
+    layout.width = width;
+    layout.height = height;
+    layout.stride = kGrowthMargin + roundedUp(width, kGrowthMargin);
+    // Rows, frame and margins.
+    for (uint8_t*& plane : layout.planes)
+        plane = arena.take<uint8_t>(layout.stride * (height + 2) + 2 * kGrowthMargin);
+    layout.tiles = arena.take<uint8_t>(growthTileBytes(width, height));
+    return layout;
 }
 
-/// Rows, frame and margins.
-LineBuffer planeFor(int64_t width, int64_t height) {
-    return LineBuffer(strideFor(width) * (height + 2) + 2 * kGrowthMargin);
+uint8_t* GrowthPlan::Layout::row(int plane, int64_t y) const {
+    return planes[plane] + kGrowthMargin + (y + 1) * stride;
 }
 
-}  // namespace
+int64_t GrowthPlan::memoryBytes(const GrowthInput& input, int64_t width, int64_t height) {
+    const Box whole = input.whole();
+    const int64_t around = 2 * (int64_t{input.passes} - 1);
+    Arena arena = {nullptr};
+    static_cast<void>(Layout::of(std::min(width + around, whole.width()),
+                                 std::min(height + around, whole.height()), arena));
+    return arena.used;
+}
 
-GrowthPlan::GrowthPlan(CpuLevel level, const GrowthInput& input)
+GrowthPlan::GrowthPlan(CpuLevel level, const GrowthInput& input, int64_t width, int64_t height)
     : mLoops(growthLoops(level)),
-      mMargin(input.margin),
-      mWidth(input.source.width + 2 * mMargin),
-      mHeight(input.source.height + 2 * mMargin),
-      mInvertMask(input.source.invertMask),
-      mStride(strideFor(mWidth)),
-      mPlanes{planeFor(mWidth, mHeight), planeFor(mWidth, mHeight)},
-      mTiles(PixelBuffer<uint8_t>::uninitialised(growthTileBytes(mWidth, mHeight))) {
-    VOREL_ASSERT(mMargin >= -1 && mWidth > 0 && mHeight > 0 && input.passes > 0);
-    const bool ready = mPlanes[0] && mPlanes[1] && mTiles;
-    if (ready) {
-        copyIn(input);
-        // What stood beside the rows in the source counts in the first pass only.
-        const int first = mMargin < 0 ? 1 : input.passes;
-        grow(first);
-        if (input.passes > first) grow(input.passes - first);
-    }
-    mPlanes[1 - mCurrent].release();
-    if (!ready) mPlanes[mCurrent].release();
-    mTiles.release();
+      mInput(input),
+      mMemoryBytes(memoryBytes(input, width, height)),
+      mMemory(mMemoryBytes) {
+    VOREL_ASSERT(input.margin >= -1 && !input.whole().empty() && input.passes > 0);
 }
 
-CoverageRows GrowthPlan::rows(int64_t y, int64_t count) {
-    VOREL_ASSERT(*this && y >= -mMargin && count >= 0 && y + count <= mHeight - mMargin);
-    return {rowOf(mCurrent, y + mMargin), mStride, mWidth, count, mInvertMask};
+CoverageRows GrowthPlan::grown(const Box& part) {
+    const Box worked = intersection(expanded(part, int64_t{mInput.passes} - 1), mInput.whole());
+    VOREL_ASSERT(*this && !part.empty() && intersection(part, worked) == part);
+    Arena arena = {mMemory.data()};
+    mLayout = Layout::of(worked.width(), worked.height(), arena);
+    VOREL_ASSERT(arena.used <= mMemoryBytes);
+    mCurrent = 0;
+    copyIn(worked);
+    // What stood beside the rows in the source counts in the first pass only.
+    const int first = mInput.margin < 0 ? 1 : mInput.passes;
+    grow(first);
+    if (mInput.passes > first) grow(mInput.passes - first);
+    return {mLayout.row(mCurrent, part.top - worked.top) + (part.left - worked.left), mLayout.stride,
+            part.width(), part.height(), mInput.source.invertMask};
 }
 
-/// Row 0 to mHeight - 1 of what grows, between the frame's pixels at -1 and mWidth; row -1 and row
-/// mHeight are the frame's.
-uint8_t* GrowthPlan::rowOf(int plane, int64_t y) {
-    return mPlanes[plane].data() + kGrowthMargin + (y + 1) * mStride;
-}
-
-void GrowthPlan::copyIn(const GrowthInput& input) {
-    const CoverageRows& source = input.source;
-    const auto side = static_cast<size_t>(mMargin + 1);
-    for (int64_t y = -1 - mMargin; y <= source.height + mMargin; ++y) {
-        uint8_t* const row = rowOf(0, y + mMargin) - 1;
-        if (y < 0 || y >= source.height) {
-            std::memset(row, mInvertMask, 2 * side + static_cast<size_t>(source.width));
+/// Fills plane 0 with the source and what is around it, the frame included.
+void GrowthPlan::copyIn(const Box& worked) {
+    const CoverageRows& source = mInput.source;
+    const Box framed = expanded(worked, 1);
+    const Box inside = intersection(framed, wholeOf(source));
+    const int64_t left = inside.left - framed.left;
+    for (int64_t y = framed.top; y < framed.bottom; ++y) {
+        uint8_t* const row = mLayout.row(0, y - worked.top) - 1;
+        if (inside.empty() || y < inside.top || y >= inside.bottom) {
+            std::memset(row, source.invertMask, static_cast<size_t>(framed.width()));
             continue;
         }
-        std::memset(row, mInvertMask, side);
-        mLoops.copyInverted(source.start + y * source.stride, source.width, mInvertMask, row + side);
-        std::memset(row + side + source.width, mInvertMask, side);
+        const int64_t end = left + inside.width();
+        std::memset(row, source.invertMask, static_cast<size_t>(left));
+        mLoops.copyInverted(source.start + y * source.stride + inside.left, inside.width(),
+                            source.invertMask, row + left);
+        std::memset(row + end, source.invertMask, static_cast<size_t>(framed.width() - end));
     }
 }
 
 /// The frame of the other plane: as it is in this one above and below.
-void GrowthPlan::setFrame(int other) {
-    for (const int64_t y : {int64_t{-1}, mHeight})
-        std::memcpy(rowOf(other, y) - 1, rowOf(mCurrent, y) - 1, static_cast<size_t>(mWidth + 2));
-    for (int64_t y = 0; y < mHeight; ++y)
-        rowOf(other, y)[-1] = rowOf(other, y)[mWidth] = mInvertMask;
+void GrowthPlan::setFrame() {
+    const int other = 1 - mCurrent;
+    const int64_t width = mLayout.width;
+    for (const int64_t y : {int64_t{-1}, mLayout.height}) {
+        std::memcpy(mLayout.row(other, y) - 1, mLayout.row(mCurrent, y) - 1,
+                    static_cast<size_t>(width + 2));
+    }
+    for (int64_t y = 0; y < mLayout.height; ++y)
+        mLayout.row(other, y)[-1] = mLayout.row(other, y)[width] = mInput.source.invertMask;
 }
 
 void GrowthPlan::grow(int passes) {
     const int other = 1 - mCurrent;
-    setFrame(other);
-    mLoops.grow({{rowOf(mCurrent, 0), rowOf(other, 0)}, mStride, mWidth, mHeight, mInvertMask, passes},
-                mTiles.data());
+    setFrame();
+    mLoops.grow({{mLayout.row(mCurrent, 0), mLayout.row(other, 0)},
+                 mLayout.stride,
+                 mLayout.width,
+                 mLayout.height,
+                 mInput.source.invertMask,
+                 passes},
+                mLayout.tiles);
     if (passes % 2 != 0) mCurrent = other;
 }
 

@@ -2,9 +2,10 @@
 
 #include <cstdint>
 
+#include "core/arena.h"
+#include "core/box.h"
 #include "core/coverage_rows.h"
 #include "core/line_buffer.h"
-#include "core/pixel_buffer.h"
 #include "ops/grow/growth_loops.h"
 
 namespace VFontEffect::internal {
@@ -17,35 +18,56 @@ struct GrowthInput {
     /// -1 the source's own edge is the frame.
     int64_t margin;
     int passes;
+
+    /// All that grows, in the source's coordinates.
+    Box whole() const { return expanded(wholeOf(source), margin); }
 };
 
-/// A growth, done at once, for a pass needs all of the one before. It is ready, or empty when memory ran
-/// out.
+/// A growth, done at once for a part of it, as a pass needs all of the one before; its memory serves one
+/// part after the other. It is ready, or empty when memory ran out.
+///
+/// A pass looks a pixel farther, so a part needs as many pixels around it as there are passes. The last
+/// of them is the frame, which is right for the first pass; where growth goes on there, each later pass
+/// brings what is wrong a pixel nearer.
 class GrowthPlan {
   public:
-    GrowthPlan(CpuLevel level, const GrowthInput& input);
+    /// What a plan takes for parts of that size.
+    static int64_t memoryBytes(const GrowthInput& input, int64_t width, int64_t height);
 
-    explicit operator bool() const { return mPlanes[0] || mPlanes[1]; }
+    /// For parts up to that size.
+    GrowthPlan(CpuLevel level, const GrowthInput& input, int64_t width, int64_t height);
 
-    /// `count` rows from the source's row y on, first column -margin, to be taken as the source is: each
-    /// byte ^ its invertMask.
-    CoverageRows rows(int64_t y, int64_t count);
+    explicit operator bool() const { return static_cast<bool>(mMemory); }
+
+    /// The part of what grows, grown. First pixel that of the part, to be taken as the source is: each
+    /// byte ^ its invertMask. It stays until the next call.
+    CoverageRows grown(const Box& part);
 
   private:
-    uint8_t* rowOf(int plane, int64_t y);
-    void copyIn(const GrowthInput& input);
-    void setFrame(int other);
+    /// What is worked on, and its places in the working memory.
+    struct Layout {
+        int64_t width;
+        int64_t height;
+        int64_t stride;
+        uint8_t* planes[2];
+        uint8_t* tiles;
+
+        static Layout of(int64_t width, int64_t height, Arena& arena);
+        /// Row 0 to height - 1 of what grows, between the frame's pixels at -1 and width; row -1 and row
+        /// `height` are the frame's.
+        uint8_t* row(int plane, int64_t y) const;
+    };
+
+    void copyIn(const Box& worked);
+    void setFrame();
     void grow(int passes);
 
     const GrowthLoops& mLoops;
-    int64_t mMargin;
-    int64_t mWidth;
-    int64_t mHeight;
-    uint8_t mInvertMask;
-    int64_t mStride;
-    LineBuffer mPlanes[2];
-    PixelBuffer<uint8_t> mTiles;
-    int mCurrent = 0;
+    GrowthInput mInput;
+    int64_t mMemoryBytes;
+    LineBuffer mMemory;
+    Layout mLayout = {};
+    int mCurrent = 0;  ///< the plane of the last pass
 };
 
 }  // namespace VFontEffect::internal

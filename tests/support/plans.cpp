@@ -3,6 +3,9 @@
 #include <algorithm>
 #include <cstddef>
 
+#include "core/effect_types.h"
+#include "cores/glow.h"
+#include "cores/painters.h"
 #include "ops/blur/blur_plan.h"
 #include "ops/dilate/dilation_plan.h"
 #include "ops/ramp/ramp_loops.h"
@@ -19,28 +22,55 @@ VOREL_LEVEL_TABLE(VOREL_EACH_VECTOR_LEVEL, lanesCheck, LanesCheck, kLanesCheck)
 namespace vorel_test {
 namespace {
 
+using namespace VFontEffect;
 using namespace VFontEffect::internal;
 
-/// Appends the rows' values from column `first` on, as they are to be taken.
-void append(const CoverageRows& rows, int64_t first, std::vector<uint8_t>& values) {
-    for (int64_t y = 0; y < rows.height; ++y) {
-        for (int64_t x = 0; x < rows.width; ++x) {
-            const uint8_t value = rows.start[y * rows.stride + first + x];
-            values.push_back(static_cast<uint8_t>(value ^ rows.invertMask));
+/// The values of a part, which come in pieces.
+class Collected {
+  public:
+    explicit Collected(const Box& part)
+        : mPart(part), mValues(static_cast<size_t>(part.width() * part.height())) {}
+
+    /// Stores rows whose first value lies at (x, y), as they are to be taken.
+    void put(const CoverageRows& rows, int64_t x, int64_t y) {
+        for (int64_t row = 0; row < rows.height; ++row) {
+            for (int64_t i = 0; i < rows.width; ++i) {
+                const int64_t at = (y + row - mPart.top) * mPart.width() + x + i - mPart.left;
+                mValues.at(static_cast<size_t>(at)) =
+                    rows.start[row * rows.stride + i] ^ rows.invertMask;
+            }
         }
     }
+    void put(const Box& band, const BlurredRows& rows) {
+        put({rows.values, rows.stride, band.width(), band.height(), kAsIs}, band.left, band.top);
+    }
+    std::vector<uint8_t> values() const { return mValues; }
+
+  private:
+    Box mPart;
+    std::vector<uint8_t> mValues;
+};
+
+/// The input's window of that size, or as a whole.
+Windows cut(const Box& part, const WindowSize& size) {
+    if (size.width == 0) return Windows::oneOf(part);
+    return {part, std::min<int64_t>(size.width, part.width()),
+            std::min<int64_t>(size.height, part.height())};
 }
 
 template <class Blur>
-std::vector<uint8_t> collected(Blur& blur, const Box& window, int64_t bandRows) {
+std::vector<uint8_t> collected(Blur& blur, const BlurInput& input, const Windows& windows) {
     if (!blur) return {};
-    std::vector<uint8_t> values;
-    for (int64_t y = window.top; y < window.bottom; y += bandRows) {
-        const BlurredRows band = blur.rows(y);
-        const int64_t count = std::min(bandRows, window.bottom - y);
-        append({band.values, band.stride, window.width(), count, kAsIs}, 0, values);
-    }
-    return values;
+    Collected values(input.window);
+    windows.forEach([&](const Box& window) {
+        const BlurInput part = input.of(window);
+        blur.begin(part);
+        for (int64_t y = window.top; y < window.bottom; y += blur.bandRows()) {
+            const int64_t end = std::min(y + blur.bandRows(), window.bottom);
+            values.put({window.left, y, window.right, end}, blur.rows(y));
+        }
+    });
+    return values.values();
 }
 
 void append(const TermList& list, int sign, std::vector<Term>& terms) {
@@ -57,55 +87,73 @@ void append(const TermList& list, int sign, std::vector<Term>& terms) {
 
 }  // namespace
 
-std::vector<uint8_t> blurredByDots(const BlurInput& input) {
-    DotBlur blur(dotLoops(chosenLevel()), input);
-    return collected(blur, input.window, kQuad);
+void paintWithin(int64_t workingBytes, int type, const VFProperty& record,
+                 const VFECore::ParamPostProcessing* params) {
+    if (type == kStroke) {
+        paintStroke(params, static_cast<const VFStrokeProperty&>(record), workingBytes);
+    } else if (type == kOuterShadow) {
+        const auto& shadow = static_cast<const VFOuterShadowProperty&>(record);
+        const ShadowOffset offset = shadowOffset(shadow.mAngle, shadow.mDistance);
+        paintOuterShadow(params, shadow, offset, workingBytes);
+    } else if (type == kInnerShadow) {
+        paintInnerShadow(params, static_cast<const VFInnerShadowProperty&>(record), workingBytes);
+    } else if (type == kOuterGlow) {
+        const auto& glow = static_cast<const VFOuterGlowProperty&>(record);
+        paintGlow(params, GlowRecord::of(&glow), GlowSide::outside, workingBytes);
+    } else if (type == kInnerGlow) {
+        const auto& glow = static_cast<const VFInnerGlowProperty&>(record);
+        paintGlow(params, GlowRecord::of(&glow), GlowSide::inside, workingBytes);
+    }
 }
 
-std::vector<uint8_t> blurredByDifferences(const BlurInput& input) {
-    DifferenceBlur blur(differenceLoops(chosenLevel()), input);
-    return collected(blur, input.window, blur.bandRows());
+std::vector<uint8_t> blurredByDots(const BlurInput& input, const WindowSize& size) {
+    const Windows windows = cut(input.window, size);
+    DotBlur blur(dotLoops(chosenLevel()), input.largestOf(windows));
+    return collected(blur, input, windows);
+}
+
+std::vector<uint8_t> blurredByDifferences(const BlurInput& input, const WindowSize& size) {
+    const Windows windows = cut(input.window, size);
+    DifferenceBlur blur(differenceLoops(chosenLevel()), input.largestOf(windows));
+    return collected(blur, input, windows);
 }
 
 std::vector<uint8_t> blurred(const BlurInput& input) {
     BlurPlan plan(chosenLevel(), input);
     if (!plan) return {};
-    std::vector<uint8_t> values;
-    forBands(plan, input.window, [&](const Box& band, const BlurredRows& rows) {
-        append({rows.values, rows.stride, band.width(), band.height(), kAsIs}, 0, values);
-    });
-    return values;
-}
-
-bool blursByDotsAlone() {
-    constexpr int kLargestRadius = 256;
-    return dotLoops(chosenLevel()).largestDotRadius >= kLargestRadius;
+    Collected values(input.window);
+    forBands(plan, input, [&](const Box& band, const BlurredRows& rows) { values.put(band, rows); });
+    return values.values();
 }
 
 std::vector<uint8_t> dilated(const CoverageRows& source, const DiscShape& disc, const Box& part,
-                             bool andInverse) {
-    DilationPlan plan(chosenLevel(), source, disc, part);
+                             bool andInverse, const WindowSize& size) {
+    const Windows windows = cut(part, size);
+    const int64_t bytes = DilationPlan::memoryBytes(chosenLevel(), {source, disc}, windows);
+    DilationPlan plan(chosenLevel(), {source, disc}, bytes);
     CoverageRows inverse = source;
     inverse.invertMask ^= kInverse;
-    DilationPlan other(chosenLevel(), inverse, disc, part);
+    DilationPlan other(chosenLevel(), {inverse, disc}, bytes);
     if (!plan || !other) return {};
-    std::vector<uint8_t> values;
-    for (int64_t y = part.top; y < part.bottom; y += plan.bandRows()) {
-        const int64_t count = std::min(plan.bandRows(), part.bottom - y);
-        CoverageRows rows = andInverse ? plan.minRows(other, y, count) : plan.rows(y, count);
-        const int64_t before = part.left - plan.left();
-        rows.width = part.width();
-        append(rows, before, values);
-    }
-    return values;
+    Collected values(part);
+    windows.forEach([&](const Box& window) {
+        plan.begin(window);
+        other.begin(window);
+        for (int64_t y = window.top; y < window.bottom; y += plan.bandRows()) {
+            const int64_t count = std::min(plan.bandRows(), window.bottom - y);
+            values.put(andInverse ? plan.minRows(other, y, count) : plan.rows(y, count), window.left, y);
+        }
+    });
+    return values.values();
 }
 
-std::vector<uint8_t> grown(const GrowthInput& input) {
-    GrowthPlan plan(chosenLevel(), input);
+std::vector<uint8_t> grown(const GrowthInput& input, const WindowSize& size) {
+    const Windows windows = cut(input.whole(), size);
+    GrowthPlan plan(chosenLevel(), input, windows.width, windows.height);
     if (!plan) return {};
-    std::vector<uint8_t> values;
-    append(plan.rows(-input.margin, input.source.height + 2 * input.margin), 0, values);
-    return values;
+    Collected values(input.whole());
+    windows.forEach([&](const Box& part) { values.put(plan.grown(part), part.left, part.top); });
+    return values.values();
 }
 
 std::vector<uint32_t> tiled(const ColourView& pattern, float scale, float opacity, int64_t width,
@@ -132,7 +180,11 @@ const char* wrongLanesOperation(uint64_t seed) {
 void askForRowsOutOfOrder() {
     const uint8_t pixel = 255;
     const DiscShape disc(1.0F);
-    DilationPlan plan(chosenLevel(), {&pixel, 1, 1, 1, kAsIs}, disc, {0, 0, 1, 2});
+    const Box part = {0, 0, 1, 2};
+    const DilationInput input = {{&pixel, 1, 1, 1, kAsIs}, disc};
+    DilationPlan plan(chosenLevel(), input,
+                      DilationPlan::memoryBytes(chosenLevel(), input, Windows::oneOf(part)));
+    plan.begin(part);
     plan.rows(1, 1);
 }
 

@@ -7,29 +7,42 @@
 #include "ops/blur/blur_input.h"
 #include "ops/dilate/disc_shape.h"
 #include "ops/grow/growth_plan.h"
+#include "voreleffect/VFECore.h"
 #include "voreleffect/VFExport.h"
 
 /// The operators' plans, at the level that the tests are at. They stand in the library, which does not
 /// export them; the functions are none when memory ran out.
 namespace vorel_test {
 
+/// Paints what the core of the record does, a stroke, a shadow or a glow, with so many bytes of working
+/// memory.
+VF_API void paintWithin(int64_t workingBytes, int type, const VFontEffect::VFProperty& record,
+                        const VFontEffect::VFECore::ParamPostProcessing* params);
+
+/// Of windows that what is wanted is cut into; 0 for no cut.
+struct WindowSize {
+    int width = 0;
+    int height = 0;
+};
+
 /// The window's values, row after row: by either strategy of the blur, and by the one that the plan
 /// chooses.
-VF_API std::vector<uint8_t> blurredByDots(const VFontEffect::internal::BlurInput& input);
-VF_API std::vector<uint8_t> blurredByDifferences(const VFontEffect::internal::BlurInput& input);
+VF_API std::vector<uint8_t> blurredByDots(const VFontEffect::internal::BlurInput& input,
+                                          const WindowSize& size = {});
+VF_API std::vector<uint8_t> blurredByDifferences(const VFontEffect::internal::BlurInput& input,
+                                                 const WindowSize& size = {});
 VF_API std::vector<uint8_t> blurred(const VFontEffect::internal::BlurInput& input);
-
-/// Whether the level takes dot products at every radius, and no differences.
-VF_API bool blursByDotsAlone();
 
 /// The part's values, row after row: of a source dilated by a disc, or the smaller ones of that and of
 /// its inverse, dilated likewise.
 VF_API std::vector<uint8_t> dilated(const VFontEffect::internal::CoverageRows& source,
                                     const VFontEffect::internal::DiscShape& disc,
-                                    const VFontEffect::internal::Box& part, bool andInverse);
+                                    const VFontEffect::internal::Box& part, bool andInverse,
+                                    const WindowSize& size = {});
 
 /// All that a source has grown to, with its margin, row after row.
-VF_API std::vector<uint8_t> grown(const VFontEffect::internal::GrowthInput& input);
+VF_API std::vector<uint8_t> grown(const VFontEffect::internal::GrowthInput& input,
+                                  const WindowSize& size = {});
 
 /// The first rows of a pattern laid from a corner on, pixels R, G, B, A.
 VF_API std::vector<uint32_t> tiled(const VFontEffect::internal::ColourView& pattern, float scale,

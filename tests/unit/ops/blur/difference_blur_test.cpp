@@ -111,6 +111,7 @@ struct BlurCase {
     Box window;
     FullColumns full;
     bool inverted;
+    WindowSize windows;
 };
 
 /// What a case says when it fails.
@@ -120,7 +121,8 @@ std::string describe(const BlurCase& blur) {
          << ", window " << blur.window.left << " " << blur.window.top << " " << blur.window.right << " "
          << blur.window.bottom << ", full before " << blur.full.before << " and from " << blur.full.from
          << ", centre " << blur.weights.byDistance.data()[0] << ", mask " << int{blur.source.invertMask}
-         << ", inverted " << blur.inverted;
+         << ", inverted " << blur.inverted << ", windows " << blur.windows.width << " x "
+         << blur.windows.height;
     return text.str();
 }
 
@@ -128,7 +130,8 @@ void expectBothTheSame(const BlurCase& blur) {
     const auto expectSame = [&blur](const BlurInput& input) {
         const std::vector<uint8_t> expected = blurredByDots(input);
         ASSERT_FALSE(expected.empty());
-        ASSERT_EQ(blurredByDifferences(input), expected) << describe(blur);
+        ASSERT_EQ(blurredByDots(input, blur.windows), expected) << describe(blur);
+        ASSERT_EQ(blurredByDifferences(input, blur.windows), expected) << describe(blur);
         ASSERT_EQ(blurred(input), expected) << describe(blur);
     };
     expectSame(BlurInput::down(blur.weights, blur.source, blur.window, blur.full, blur.inverted));
@@ -156,11 +159,13 @@ void expectBothTheSame(Random& random, int radius) {
     if (random.chance(30)) full.before = nearEither(random, left - radius, width);
     if (random.chance(30)) full.from = nearEither(random, 0, right + radius);
     const auto invertMask = static_cast<uint8_t>(random.chance(50) ? 0 : 0xFF);
+    const WindowSize windows = {random.between(1, 150), random.between(1, 90)};
     expectBothTheSame({weights,
                        {mask.bytes.data(), stride, width, height, invertMask},
                        {left, top, right, bottom},
                        full,
-                       random.chance(50)});
+                       random.chance(50),
+                       random.chance(50) ? windows : WindowSize{}});
 }
 
 TEST(DifferenceBlur, OfEveryRadius_IsTheOneByDotProducts) {
@@ -182,8 +187,8 @@ TEST(DifferenceBlur, OfSidesLongerThanTheBlur_ReachesTheLargestDifferences) {
             const Mask mask = filledMask(width, height, 255);
             const Box window = {-radius, -radius, width + radius, height + radius};
             const CoverageRows source = {mask.bytes.data(), width, width, height, 0};
-            expectBothTheSame({shadow, source, window, kNoFullColumns, false});
-            expectBothTheSame({glow, source, window, kNoFullColumns, true});
+            expectBothTheSame({shadow, source, window, kNoFullColumns, false, {}});
+            expectBothTheSame({glow, source, window, kNoFullColumns, true, {70, 70}});
             if (HasFatalFailure()) return;
         }
     }

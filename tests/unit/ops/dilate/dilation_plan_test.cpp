@@ -48,13 +48,15 @@ struct DilationCase {
     CoverageRows source;
     float radius;
     Box part;
+    WindowSize windows;
 };
 
 std::string describe(const DilationCase& which) {
     std::ostringstream text;
     text << which.source.width << " x " << which.source.height << ", radius " << which.radius
          << ", part " << which.part.left << " " << which.part.top << " " << which.part.right << " "
-         << which.part.bottom << ", mask " << int{which.source.invertMask};
+         << which.part.bottom << ", mask " << int{which.source.invertMask} << ", windows "
+         << which.windows.width << " x " << which.windows.height;
     return text.str();
 }
 
@@ -70,14 +72,15 @@ void expectDefined(const DilationCase& which) {
             smaller.push_back(std::min(expected.back(), definedDilation(inverse, which.radius, x, y)));
         }
     }
-    ASSERT_EQ(dilated(which.source, disc, which.part, false), expected) << describe(which);
-    ASSERT_EQ(dilated(which.source, disc, which.part, true), smaller) << describe(which);
+    ASSERT_EQ(dilated(which.source, disc, which.part, false, which.windows), expected)
+        << describe(which);
+    ASSERT_EQ(dilated(which.source, disc, which.part, true, which.windows), smaller) << describe(which);
 }
 
 TEST(DilationPlan, OfEveryReach_IsTheDefinedOne) {
     // Single cells up to 2, then spreading, then tiles: at most from 17 on.
     for (int reach = 0; reach <= 20; ++reach) {
-        forSeeds(static_cast<uint64_t>(reach) * 50, 6, [&](Random& random) {
+        forSeeds(static_cast<uint64_t>(reach) * 50, 12, [&](Random& random) {
             const float radius = static_cast<float>(reach) + random.real(-0.5F, 0.49F);
             const int stride = random.between(1, 60);
             const int width = random.between(1, stride);
@@ -93,7 +96,11 @@ TEST(DilationPlan, OfEveryReach_IsTheDefinedOne) {
                                  : Box{left, top, random.between(left + 1, width + reach + 1),
                                        random.between(top + 1, height + reach + 1)};
             const uint8_t invertMask = random.chance(50) ? kAsIs : kInverse;
-            expectDefined({{mask.bytes.data(), stride, width, height, invertMask}, radius, part});
+            const WindowSize windows = {random.between(1, 40), random.between(1, 50)};
+            expectDefined({{mask.bytes.data(), stride, width, height, invertMask},
+                           radius,
+                           part,
+                           random.chance(50) ? windows : WindowSize{}});
         });
         if (HasFatalFailure()) return;
     }
@@ -101,7 +108,8 @@ TEST(DilationPlan, OfEveryReach_IsTheDefinedOne) {
 
 TEST(DilationPlan, ReachesOnePixelFartherThanTheDisc) {
     const CoverageRows source = {nullptr, 7, 5, 3, kAsIs};
-    EXPECT_EQ(DilationPlan::reached(source, DiscShape(4.0F)), (Box{-5, -5, 10, 8}));
+    const DiscShape disc(4.0F);
+    EXPECT_EQ(DilationPlan::reached({source, disc}), (Box{-5, -5, 10, 8}));
 }
 
 }  // namespace

@@ -65,8 +65,8 @@ std::vector<uint8_t> definedGrowth(const GrowthInput& input) {
     return inside;
 }
 
-TEST(GrowthPlan, OfAnyMarginAndPasses_IsTheDefinedOne) {
-    forSeeds(0, 300, [](Random& random) {
+TEST(GrowthPlan, OfAnyMarginPassesAndParts_IsTheDefinedOne) {
+    forSeeds(0, 600, [](Random& random) {
         const int stride = random.between(3, 90);
         const int width = random.between(3, stride);
         const int height = random.between(3, 40);
@@ -75,8 +75,11 @@ TEST(GrowthPlan, OfAnyMarginAndPasses_IsTheDefinedOne) {
         const GrowthInput input = {{mask.bytes.data(), stride, width, height, invertMask},
                                    random.between(-1, 20),
                                    random.between(1, 9)};
-        ASSERT_EQ(grown(input), definedGrowth(input))
-            << width << " x " << height << ", margin " << input.margin << ", passes " << input.passes;
+        const bool whole = random.chance(50);
+        const WindowSize parts = {whole ? 0 : random.between(1, 60), random.between(1, 40)};
+        ASSERT_EQ(grown(input, parts), definedGrowth(input))
+            << width << " x " << height << ", margin " << input.margin << ", passes " << input.passes
+            << ", parts " << parts.width << " x " << parts.height;
     });
 }
 

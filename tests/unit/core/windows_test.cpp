@@ -1,0 +1,93 @@
+#include "core/windows.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdint>
+#include <vector>
+
+#include "tests/support/core_compare.h"
+
+/// Windows: each pixel in one of them, as few and as low ones as the memory allows.
+namespace {
+
+using namespace vorel_test;
+using VFontEffect::internal::Box;
+using VFontEffect::internal::intersection;
+using VFontEffect::internal::Windows;
+using VFontEffect::internal::windowsWithin;
+
+/// An operator that keeps its window and what is in reach around it.
+int64_t planeBytes(const Windows& windows, int64_t reach) {
+    return (windows.width + 2 * reach) * (windows.height + 2 * reach);
+}
+
+TEST(Windows, HaveEachPixelOnce) {
+    forSeeds(0, 2000, [](Random& random) {
+        const int left = random.between(-20, 20);
+        const int top = random.between(-20, 20);
+        const Box part = {left, top, left + random.between(1, 30), top + random.between(1, 30)};
+        const int reach = random.between(0, 9);
+        const int64_t most = random.between(1, 2000);
+        const Windows windows =
+            windowsWithin(most, part, reach, [&](const Windows& cut) { return planeBytes(cut, reach); });
+        const bool isPixel = windows.width == 1 && windows.height == 1;
+        ASSERT_TRUE(isPixel || planeBytes(windows, reach) <= most);
+        std::vector<int> painted(static_cast<size_t>(part.width() * part.height()));
+        windows.forEach([&](const Box& window) {
+            ASSERT_FALSE(window.empty());
+            ASSERT_EQ(window, intersection(window, part));
+            ASSERT_LE(window.width(), windows.width);
+            ASSERT_LE(window.height(), windows.height);
+            for (int64_t y = window.top - part.top; y < window.bottom - part.top; ++y) {
+                for (int64_t x = window.left - part.left; x < window.right - part.left; ++x)
+                    ++painted[static_cast<size_t>(y * part.width() + x)];
+            }
+        });
+        ASSERT_EQ(painted, std::vector<int>(painted.size(), 1));
+    });
+}
+
+TEST(Windows, ThatFitAsOne_AreNotCut) {
+    const Windows windows = windowsWithin(1000, {5, 6, 105, 16}, 3,
+                                          [](const Windows& cut) { return cut.width * cut.height; });
+    EXPECT_EQ(windows.width, 100);
+    EXPECT_EQ(windows.height, 10);
+    EXPECT_FALSE(windows.areCutAcross());
+    EXPECT_FALSE(windows.areCutDown());
+}
+
+TEST(Windows, OfPlanes_AreLowBeforeTheyAreNarrow) {
+    const Windows windows = windowsWithin(1'000'000, {0, 0, 4096, 4096}, 10,
+                                          [](const Windows& cut) { return planeBytes(cut, 10); });
+    EXPECT_FALSE(windows.areCutAcross());
+    EXPECT_GT(windows.height, 8 * 10);
+}
+
+TEST(Windows, OfPlanesWithALongReach_AreNotThin) {
+    const Windows windows = windowsWithin(1'000'000, {0, 0, 4096, 4096}, 200,
+                                          [](const Windows& cut) { return planeBytes(cut, 200); });
+    EXPECT_GT(windows.height, 400);
+    EXPECT_GT(windows.width, 400);
+}
+
+TEST(Windows, OfAnOperatorThatKeepsRows_StayAsHighAsTheyAre) {
+    const Windows windows = windowsWithin(1'000'000, {0, 0, 50'000, 9000}, 50,
+                                          [](const Windows& cut) { return 100 * cut.width; });
+    EXPECT_TRUE(windows.areCutAcross());
+    EXPECT_FALSE(windows.areCutDown());
+}
+
+TEST(Windows, OfTheLongestPictures_AreFoundAtOnce) {
+    constexpr int64_t kLongest = INT32_MAX;
+    for (const Box part : {Box{0, 0, kLongest, 1}, Box{0, 0, 1, kLongest}, Box{0, 0, 65535, 65535}}) {
+        int asked = 0;
+        const Windows windows = windowsWithin(1'000'000, part, 100, [&](const Windows& cut) {
+            ++asked;
+            return planeBytes(cut, 100);
+        });
+        EXPECT_LE(planeBytes(windows, 100), 1'000'000);
+        EXPECT_LT(asked, 1000);
+    }
+}
+
+}  // namespace

@@ -1,0 +1,151 @@
+#include "cores/painters.h"
+
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <cstdint>
+#include <limits>
+#include <utility>
+#include <vector>
+
+#include "core/effect_types.h"
+#include "tests/support/core_compare.h"
+#include "tests/support/literal_cores.h"
+#include "tests/support/mask_gallery.h"
+#include "tests/support/plans.h"
+
+/// The cores with little working memory: windows of all sizes down to a pixel, cut anywhere, paint the
+/// bytes of the literal forms.
+namespace {
+
+using namespace vorel_test;
+using namespace VFontEffect;
+using VFontEffect::internal::EffectType;
+
+/// A core that paints with so much working memory.
+template <class Record>
+class Painter : public VFECoreBase {
+  public:
+    Painter(EffectType type, int64_t workingBytes, Record record)
+        : mType(type), mWorkingBytes(workingBytes), mRecord(std::move(record)) {}
+
+    void setProperty(VFProperty* /*property*/) override {}
+    VFProperty* getProperty() override { return &mRecord; }
+    void doPostProcessing(ParamPostProcessing* params) override {
+        paintWithin(mWorkingBytes, mType, mRecord, params);
+    }
+
+  private:
+    EffectType mType;
+    int64_t mWorkingBytes;
+    Record mRecord;
+};
+
+/// From what not even a pixel is painted with, which cuts into single ones, to plenty; of large sizes,
+/// where a pixel takes a while, mostly enough for some.
+int64_t randomBytes(Random& random, float size) {
+    const int fewest = random.chance(3) || !(size > 8.0F) ? 8 : size > 24.0F ? 17 : 14;
+    return int64_t{1} << random.between(fewest, 19);
+}
+
+/// Sizes of all kinds: small, whole, up to the limit of the add-calls, hand-made and odd ones.
+float randomSize(Random& random) {
+    switch (random.between(0, 9)) {
+        case 0:
+            return random.real(-3.0F, 0.0F);
+        case 1:
+            return random.chance(80) ? random.real(30.0F, 60.0F) : random.real(60.0F, 256.0F);
+        case 2:
+            return std::numeric_limits<float>::quiet_NaN();
+        case 3:
+        case 4:
+            return static_cast<float>(random.between(0, 24));
+        default:
+            return random.real(0.0F, 30.0F);
+    }
+}
+
+/// Now and then with nothing, or everything, covered, and a destination of another size.
+Scene windowedScene(Random& random) {
+    Scene scene = randomScene(random, 60);
+    if (random.chance(20)) {
+        const uint8_t coverage = random.chance(50) ? 255 : 0;
+        scene.mask = filledMask(scene.mask.width, scene.mask.height, coverage);
+    }
+    if (random.chance(40))
+        scene.dst = randomPicture(random, random.between(1, 110), random.between(1, 90));
+    return scene;
+}
+
+TEST(Painters, StrokesInWindows_AreThoseOfTheLiteralForm) {
+    forSeeds(0, 1200, [](Random& random) {
+        const Scene scene = windowedScene(random);
+        const int position = random.between(-1, 3);
+        const float size = randomSize(random);
+        const uint32_t color = randomPremultiplied(random);
+        const int64_t bytes = randomBytes(random, size);
+        Painter<VFStrokeProperty> core(internal::kStroke, bytes, {size, color, 1.0F, 0, position});
+        EXPECT_TRUE(paintsLike(core, scene,
+                               [&](Scene& expected) {
+                                   literal::paintStroke(expected.dst,
+                                                        expected.sub ? &*expected.sub : nullptr,
+                                                        expected.mask, expected.text,
+                                                        expected.useOuterLayer, size, color, position);
+                               }))
+            << "size " << size << ", position " << position << ", " << bytes << " bytes";
+    });
+}
+
+template <class Record, class LiteralForm>
+void expectShadows(EffectType type, LiteralForm literalForm) {
+    forSeeds(0, 800, [&](Random& random) {
+        const Scene scene = windowedScene(random);
+        const Record record(random.real(0.0F, 360.0F), random.real(0.0F, 30.0F), randomSize(random),
+                            randomPremultiplied(random), 1.0F);
+        const int64_t bytes = randomBytes(random, record.mSize);
+        Painter<Record> core(type, bytes, record);
+        EXPECT_TRUE(paintsLike(core, scene,
+                               [&](Scene& expected) {
+                                   literalForm(expected.dst, expected.mask, expected.text, record.mAngle,
+                                               record.mDistance, record.mSize, record.mColor);
+                               }))
+            << "size " << record.mSize << ", " << bytes << " bytes";
+    });
+}
+
+TEST(Painters, OuterShadowsInWindows_AreThoseOfTheLiteralForm) {
+    expectShadows<VFOuterShadowProperty>(internal::kOuterShadow, literal::paintOuterShadow);
+}
+
+TEST(Painters, InnerShadowsInWindows_AreThoseOfTheLiteralForm) {
+    expectShadows<VFInnerShadowProperty>(internal::kInnerShadow, literal::paintInnerShadow);
+}
+
+template <class Record, class LiteralForm>
+void expectGlows(EffectType type, LiteralForm literalForm) {
+    forSeeds(0, 800, [&](Random& random) {
+        const Scene scene = windowedScene(random);
+        const auto stops = randomStops(random, random.chance(50) ? 0 : random.between(1, 4));
+        auto array = libraryStops(stops);
+        const Record record(randomSize(random), randomStraight(random), 1.0F,
+                            static_cast<int>(array.size()), array.data());
+        const int64_t bytes = randomBytes(random, record.mSize);
+        Painter<Record> core(type, bytes, record);
+        EXPECT_TRUE(paintsLike(core, scene,
+                               [&](Scene& expected) {
+                                   literalForm(expected.dst, expected.mask, expected.text, record.mSize,
+                                               record.mColor, stops);
+                               }))
+            << "size " << record.mSize << ", " << bytes << " bytes";
+    });
+}
+
+TEST(Painters, OuterGlowsInWindows_AreThoseOfTheLiteralForm) {
+    expectGlows<VFOuterGlowProperty>(internal::kOuterGlow, literal::paintOuterGlow);
+}
+
+TEST(Painters, InnerGlowsInWindows_AreThoseOfTheLiteralForm) {
+    expectGlows<VFInnerGlowProperty>(internal::kInnerGlow, literal::paintInnerGlow);
+}
+
+}  // namespace
