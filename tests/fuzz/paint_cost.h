@@ -69,6 +69,11 @@ inline double paintCost(VFontEffect::VFECore& core, double width, double height)
     return paintCost(core.getStyle(), workingSize(core), width, height);
 }
 
+/// A large input may spend so many times as many: its boxes are taller than what a blur keeps of them,
+/// and wider than several of the widest vectors.
+constexpr double kLargeBudget = 8.0;
+constexpr int kLargeSide = 400;
+
 /// The steps that one input may spend.
 class WorkBudget {
   public:
