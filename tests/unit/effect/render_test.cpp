@@ -169,6 +169,17 @@ TEST(TextBox, PostProcessing_ClampsItToTheMask) {
     }
 }
 
+TEST(TextBox, SidesOfAGlyph_HaveAll16Bits) {
+    VFEffect set;
+    SolidGlyph tall(1, 65535);
+    SolidGlyph wide(32768, 1);
+    set.initEffect(4, 4);
+    set.renderEffectLayer(0, -40000, &tall.glyph);
+    EXPECT_EQ(sidesOf(*set.getTextRect()), (Sides{0, -40000, 1, 25535}));
+    set.renderEffectLayer(2, 0, &wide.glyph);
+    EXPECT_EQ(sidesOf(*set.getTextRect()), (Sides{0, -40000, 32770, 25535}));
+}
+
 TEST(TextBox, GlyphsAtTheEndsOfTheRange_SpanTheWholeMask) {
     VFEffect set;
     SolidGlyph glyph(65535, 1);
