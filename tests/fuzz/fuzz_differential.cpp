@@ -43,13 +43,14 @@ using vorel_test::Scene;
 constexpr int kLongestRow = 200;
 constexpr Size kLargestMask = {160, 40};
 constexpr double kMostSteps = 2e6;
+constexpr double kMostLargeSteps = 4e6;
 
 Size largestMask(const Decoder& in) {
     return in.isLarge() ? Size{vorel_fuzz::kLargeSide, vorel_fuzz::kLargeSide} : kLargestMask;
 }
 
 double mostSteps(const Decoder& in) {
-    return in.isLarge() ? vorel_fuzz::kLargeBudget * kMostSteps : kMostSteps;
+    return in.isLarge() ? kMostLargeSteps : kMostSteps;
 }
 
 /// The name of the comparison, for the message of a failure.

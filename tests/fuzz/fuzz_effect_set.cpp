@@ -48,6 +48,7 @@ constexpr int kReservedStroke = 9;
 constexpr Size kLargestPattern = {9, 9};
 constexpr int kMostCalls = 80;
 constexpr double kMostSteps = 8e6;
+constexpr double kMostLargeSteps = 4e7;
 constexpr int kMostKeyBytes = 1 << 20;
 constexpr size_t kMostCores = 24;
 constexpr size_t kLongestTag = 256;
@@ -78,7 +79,7 @@ class Caller {
   public:
     Caller(const uint8_t* data, size_t size)
         : mIn(data, size),
-          mBudget(mIn.isLarge() ? vorel_fuzz::kLargeBudget * kMostSteps : kMostSteps),
+          mBudget(mIn.isLarge() ? kMostLargeSteps : kMostSteps),
           mLongestSide(mIn.isLarge() ? vorel_fuzz::kLargeSide : kLongestSide) {
         for (auto& set : mSets)
             set = std::make_unique<VFEffect>();
