@@ -701,6 +701,7 @@ void Caller::log() {
     const char* const tag = mIn.oneIn(8) ? nullptr : tagText.c_str();
     const char* const format = mIn.oneIn(8) ? nullptr : "%s";
     const auto microseconds = static_cast<long>(mIn.wildInt(0, 1000000));
+    VFLog();
     VFLog::setPrintLogLevel(mIn.byte());
     gLogged = 0;
     switch (mIn.between(0, 2)) {
