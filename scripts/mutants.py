@@ -187,7 +187,7 @@ class Tree:
             for targets, program, tests, thinned, by in [
                     ([LIBRARY] if not mutant.program else [program], program, mutant.tests, 16, "its tests"),
                     ([program], program, mutant.tests, 1, "its tests, all cases"),
-                    ([UNIT], UNIT, "*", 1, "another test")]:
+                    ([UNIT], UNIT, "*", 4, "another test")]:
                 built, output = self.make(*targets)
                 if not built:
                     return "broken", output[-1500:]

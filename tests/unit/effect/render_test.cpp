@@ -468,6 +468,24 @@ TEST(CompositeLayers, Refused_LeavesThePictureAndEndsTheRun) {
     }
 }
 
+/// The caller may put a mask of another size in the place of the run's.
+TEST(CompositeLayers, MaskOfAnotherSize_LeavesThePicture) {
+    for (const unsigned side : {19U, 21U}) {
+        for (const unsigned picture : {20U, side}) {
+            VFEffect set;
+            set.setTextOpacity(0.5F);
+            StartedRun run(set, 20, 20, 0);  // a merge would erase the picture
+            VFBitmap other(picture, picture, 4);
+            fillBytes(other, 77);
+            set.doEffectPostProcessing();
+            delete set.getSrcBitmap();
+            set.setSrcBitmap(new VFBitmap(side, side, 1));
+            set.compositeLayers(&other);
+            EXPECT_EQ(bytesOf(other), std::vector<uint8_t>(size_t{picture} * picture * 4, 77));
+        }
+    }
+}
+
 TEST(CompositeLayers, NullPicture_EndsTheRun) {
     for (const float opacity : {1.0F, 0.5F}) {
         VFEffect set;
