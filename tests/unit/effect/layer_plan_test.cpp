@@ -419,6 +419,8 @@ TEST(InitEffect, AbsurdSizes_SurviveAndDrawNothing) {
             for (const Kind& kind : kKinds)
                 kind.add(set);
             set.initEffect(width, height);
+            ASSERT_NE(set.getSrcBitmap(), nullptr);
+            EXPECT_EQ(set.getSrcBitmap()->mData, nullptr) << "a layer of as many bytes has no pixels";
             set.setDstBitmap(&picture);
             set.renderEffectLayer(1, 1, &glyph.glyph);
             set.doEffectPostProcessing();
