@@ -5,17 +5,42 @@
 #endif
 
 namespace VFontEffect::internal {
+namespace {
 
 #if defined(__x86_64__)
 
-bool runsHere(CpuLevel level) {
+bool has(int supported) { return supported != 0; }
+CpuFeatures featuresHere() {
+    return {has(__builtin_cpu_supports("avx2")),     has(__builtin_cpu_supports("avx512f")),
+            has(__builtin_cpu_supports("avx512bw")), has(__builtin_cpu_supports("avx512dq")),
+            has(__builtin_cpu_supports("avx512vl")), has(__builtin_cpu_supports("avx512vnni"))};
+}
+
+#elif defined(__aarch64__)
+
+CpuFeatures featuresHere() {
+    // The dot product's bit in the Linux kernel's first word of CPU features.
+    constexpr unsigned long kDotProduct = 1UL << 20;
+    return {(getauxval(AT_HWCAP) & kDotProduct) != 0};
+}
+
+#else
+
+CpuFeatures featuresHere() { return {}; }
+
+#endif
+
+}  // namespace
+
+#if defined(__x86_64__)
+
+bool suffices(const CpuFeatures& features, CpuLevel level) {
     switch (level) {
         case CpuLevel::avx2:
-            return __builtin_cpu_supports("avx2") != 0;
+            return features.avx2;
         case CpuLevel::avx512:
-            return __builtin_cpu_supports("avx512f") != 0 && __builtin_cpu_supports("avx512bw") != 0 &&
-                   __builtin_cpu_supports("avx512dq") != 0 && __builtin_cpu_supports("avx512vl") != 0 &&
-                   __builtin_cpu_supports("avx512vnni") != 0;
+            return features.avx512f && features.avx512bw && features.avx512dq && features.avx512vl &&
+                   features.avx512vnni;
         default:
             return true;
     }
@@ -23,16 +48,16 @@ bool runsHere(CpuLevel level) {
 
 #elif defined(__aarch64__)
 
-bool runsHere(CpuLevel level) {
-    // The dot product's bit in the Linux kernel's first word of CPU features.
-    constexpr unsigned long kDotProduct = 1UL << 20;
-    return level != CpuLevel::dotprod || (getauxval(AT_HWCAP) & kDotProduct) != 0;
+bool suffices(const CpuFeatures& features, CpuLevel level) {
+    return level != CpuLevel::dotprod || features.dotProducts;
 }
 
 #else
 
-bool runsHere(CpuLevel /*level*/) { return true; }
+bool suffices(const CpuFeatures& /*features*/, CpuLevel /*level*/) { return true; }
 
 #endif
+
+bool runsHere(CpuLevel level) { return suffices(featuresHere(), level); }
 
 }  // namespace VFontEffect::internal

@@ -38,7 +38,29 @@ constexpr int kPlainestLevel = 0;
 /// Bytes of the longest vector of any level.
 constexpr int64_t kWidestVector = 64;
 
-/// Whether this CPU, and the system's kernel, have what the level's code needs.
+/// What the levels beyond the plainest ask of a CPU and of the system's kernel.
+#if defined(__x86_64__)
+struct CpuFeatures {
+    bool avx2;
+    bool avx512f;
+    bool avx512bw;
+    bool avx512dq;
+    bool avx512vl;
+    bool avx512vnni;
+};
+#elif defined(__aarch64__)
+struct CpuFeatures {
+    bool dotProducts;
+};
+#else
+struct CpuFeatures {};
+#endif
+
+/// Whether a CPU of these features has what the level's code needs: all that cmake/levels.cmake lets the
+/// compiler use for it.
+bool suffices(const CpuFeatures& features, CpuLevel level);
+
+/// Whether this one has.
 bool runsHere(CpuLevel level);
 
 /// The level that the inner loops run at.

@@ -17,9 +17,14 @@ namespace vorel_fuzz {
 /// statement, or they stand in braces, for the arguments of a call may be evaluated in any order.
 class Decoder {
   public:
-    Decoder(const uint8_t* data, size_t size) : mAt(data), mEnd(data + size) {}
+    Decoder(const uint8_t* data, size_t size)
+        : mAt(data), mEnd(data + size), mIsLarge(size > 0 && *data >= kLarge) {}
 
     bool atEnd() const { return mAt == mEnd; }
+
+    /// Whether the input is one in eight that may have long sides. Its first byte tells, which is read
+    /// for something else too.
+    bool isLarge() const { return mIsLarge; }
 
     uint8_t byte() { return atEnd() ? uint8_t{0} : *mAt++; }
 
@@ -114,12 +119,14 @@ class Decoder {
     }
 
   private:
-    /// First bytes from which a number is wild, and from which it is any bit pattern.
+    /// First bytes from which an input is large, a number is wild, and it is any bit pattern.
+    static constexpr uint8_t kLarge = 0xE0;
     static constexpr uint8_t kWild = 0xD0;
     static constexpr uint8_t kAnything = 0xF0;
 
     const uint8_t* mAt;
     const uint8_t* mEnd;
+    bool mIsLarge;
 };
 
 struct Size {

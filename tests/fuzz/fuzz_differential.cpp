@@ -34,15 +34,24 @@ using literal::Mask;
 using literal::Picture;
 using literal::Stop;
 using vorel_fuzz::Decoder;
+using vorel_fuzz::Size;
 using vorel_fuzz::WorkBudget;
 using vorel_test::libraryStops;
 using vorel_test::Scene;
 
 /// Columns for two of the widest vectors and what lies around them.
 constexpr int kLongestRow = 200;
-constexpr int kLongestMaskWidth = 160;
-constexpr int kLongestMaskHeight = 40;
+constexpr Size kLargestMask = {160, 40};
 constexpr double kMostSteps = 2e6;
+constexpr double kMostLargeSteps = 4e6;
+
+Size largestMask(const Decoder& in) {
+    return in.isLarge() ? Size{vorel_fuzz::kLargeSide, vorel_fuzz::kLargeSide} : kLargestMask;
+}
+
+double mostSteps(const Decoder& in) {
+    return in.isLarge() ? kMostLargeSteps : kMostSteps;
+}
 
 /// The name of the comparison, for the message of a failure.
 void require(const testing::AssertionResult& same, const std::string& what) {
@@ -180,8 +189,7 @@ void compareOperations(Decoder& in) {
 /// With a box inside the mask, or anywhere.
 Scene decodeScene(Decoder& in) {
     Scene scene;
-    const int width = in.between(1, kLongestMaskWidth);
-    const int height = in.between(1, kLongestMaskHeight);
+    const auto [width, height] = vorel_fuzz::decodeSize(in, {1, 1}, largestMask(in));
     scene.mask = Mask{width, height, vorel_fuzz::decodeCoverage(in, width, height)};
     scene.dst = Picture{width, height, vorel_fuzz::decodeColours(in, width, height, 3)};
     if (in.oneIn(4)) {
@@ -235,13 +243,15 @@ float decodeScale(Decoder& in) {
 /// Gives the record to a new core and compares its picture, unless both forms would take too long.
 /// `reference` is handed the scene and the record as the core holds it.
 template <class Core, class Record, class Reference>
-void compareCore(const std::string& name, Record& record, const Scene& scene, Reference reference) {
+void compareCore(Decoder& in, const std::string& name, Record& record, Reference reference) {
+    const Scene scene = decodeScene(in);
     Core core;
     core.setProperty(&record);
-    if (vorel_fuzz::paintCost(core, scene.mask.width, scene.mask.height) > kMostSteps) return;
+    if (vorel_fuzz::paintCost(core, scene.mask.width, scene.mask.height) > mostSteps(in)) return;
     const Record& held = *static_cast<Record*>(core.getProperty());
-    require(vorel_test::paintsLike(core, scene, [&](Scene& expected) { reference(expected, held); }),
-            name);
+    Scene expected = scene;
+    reference(expected, held);
+    require(vorel_test::samePaint(expected, vorel_test::painted(core, scene)), name);
 }
 
 /// Of a core or a set.
@@ -267,7 +277,7 @@ void compareStroke(Decoder& in) {
     const float size = decodeSize(in);
     const int position = in.wildInt(0, 3);
     VFStrokeProperty record(size, in.word(), 1.0F, 0, position);
-    compareCore<VFStroke>(named("stroke", {size, static_cast<float>(position)}), record, decodeScene(in),
+    compareCore<VFStroke>(in, named("stroke", {size, static_cast<float>(position)}), record,
                           [&](Scene& s, const VFStrokeProperty& r) {
                               literal::paintStroke(s.dst, s.sub ? &*s.sub : nullptr, s.mask, s.text,
                                                    s.useOuterLayer, r.mSize, r.mColor, r.mPosition);
@@ -285,15 +295,15 @@ void compareShadow(Decoder& in) {
     const uint32_t color = in.word();
     if (in.flag()) {
         VFInnerShadowProperty record(angle, distance, size, color, 1.0F);
-        compareCore<VFInnerShadow>(named("inner shadow", {angle, distance, size}), record,
-                                   decodeScene(in), [](Scene& s, const VFInnerShadowProperty& r) {
+        compareCore<VFInnerShadow>(in, named("inner shadow", {angle, distance, size}), record,
+                                   [](Scene& s, const VFInnerShadowProperty& r) {
                                        literal::paintInnerShadow(s.dst, s.mask, s.text, r.mAngle,
                                                                  r.mDistance, r.mSize, r.mColor);
                                    });
         return;
     }
     VFOuterShadowProperty record(angle, distance, size, color, 1.0F);
-    compareCore<VFOuterShadow>(named("outer shadow", {angle, distance, size}), record, decodeScene(in),
+    compareCore<VFOuterShadow>(in, named("outer shadow", {angle, distance, size}), record,
                                [](Scene& s, const VFOuterShadowProperty& r) {
                                    literal::paintOuterShadow(s.dst, s.mask, s.text, r.mAngle,
                                                              r.mDistance, r.mSize, r.mColor);
@@ -311,7 +321,7 @@ void compareGlow(Decoder& in, const std::string& name, Paint paint) {
     const float size = decodeSize(in);
     Record record(size, in.word(), 1.0F, static_cast<int>(array.size()), array.data());
     compareCore<Core>(
-        named(name, {size, static_cast<float>(array.size())}), record, decodeScene(in),
+        in, named(name, {size, static_cast<float>(array.size())}), record,
         [&](Scene& s, const Record& r) { paint(s.dst, s.mask, s.text, r.mSize, r.mColor, stops); });
 
     Core core;
@@ -333,14 +343,14 @@ void compareGradient(Decoder& in) {
     const float scale = decodeScale(in);
     if (in.flag()) {
         VFLinearGradientProperty record(angle, scale, 1.0F, count, array.data());
-        compareCore<VFLinearGradient>(named("linear gradient", {angle, scale}), record, decodeScene(in),
+        compareCore<VFLinearGradient>(in, named("linear gradient", {angle, scale}), record,
                                       [&](Scene& s, const VFLinearGradientProperty& r) {
                                           literal::paintLinearGradient(s.dst, s.mask, s.text, r.mAngle,
                                                                        r.mScale, stops);
                                       });
     } else {
         VFRadialGradientProperty record(angle, scale, 1.0F, count, array.data());
-        compareCore<VFRadialGradient>(named("radial gradient", {scale}), record, decodeScene(in),
+        compareCore<VFRadialGradient>(in, named("radial gradient", {scale}), record,
                                       [&](Scene& s, const VFRadialGradientProperty& r) {
                                           literal::paintRadialGradient(s.dst, s.mask, s.text, r.mScale,
                                                                        stops);
@@ -364,7 +374,7 @@ void comparePattern(Decoder& in) {
     VFBitmap bitmap = bitmapOf(tile);
     const float scale = in.wildFloat(-0.5F, 11.0F);
     VFPatternProperty record(&bitmap, scale, in.wildFloat(-0.2F, 2.0F));
-    compareCore<VFPattern>(named("pattern", {scale, record.mOpacity}), record, decodeScene(in),
+    compareCore<VFPattern>(in, named("pattern", {scale, record.mOpacity}), record,
                            [&](Scene& s, const VFPatternProperty& r) {
                                literal::paintPattern(s.dst, s.mask, s.text, r.mOpacity, r.mScale,
                                                      tile.width, tile.height, tile.bytes);
@@ -383,8 +393,7 @@ void comparePieces(Decoder& in) {
             weights == nullptr ? 0 : static_cast<size_t>(side) * static_cast<size_t>(side);
         requireEqual(expected.weights, std::vector<uint8_t>(weights, weights + count), "circle kernel");
     }
-    const int width = in.between(0, kLongestMaskWidth);
-    const int height = in.between(0, kLongestMaskHeight);
+    const auto [width, height] = vorel_fuzz::decodeSize(in, {0, 0}, largestMask(in));
     const int passes = in.between(0, 12);
     std::vector<uint8_t> expected = vorel_fuzz::decodeCoverage(in, width, height);
     std::vector<uint8_t> actual = expected;
@@ -398,7 +407,7 @@ void comparePieces(Decoder& in) {
 /// One look in both forms.
 class Pair {
   public:
-    explicit Pair(Decoder& in) : mIn(in), mBudget(kMostSteps) {}
+    explicit Pair(Decoder& in) : mIn(in), mBudget(mostSteps(in)) {}
 
     void run();
 
@@ -551,7 +560,8 @@ void Pair::paint(int width, int height) {
     mReal.setDstBitmap(&actual);
     mLiteral.setDstBitmap(&expected);
     for (int left = mIn.between(0, 3); left > 0; --left) {
-        Mask glyph{mIn.between(0, 24), mIn.between(0, 24), {}};
+        const int longest = mIn.isLarge() ? 300 : 24;
+        Mask glyph{mIn.between(0, longest), mIn.between(0, longest), {}};
         glyph.bytes = vorel_fuzz::decodeCoverage(mIn, glyph.width, glyph.height);
         VFGlyph real{glyph.bytes.data(), static_cast<unsigned short>(glyph.width),
                      static_cast<unsigned short>(glyph.height)};
@@ -584,8 +594,8 @@ void Pair::run() {
         for (int left = mIn.between(0, 3); left > 0; --left)
             add();
         compareKeys();
-        const int width = mIn.between(1, kLongestMaskWidth);
-        paint(width, mIn.between(1, kLongestMaskHeight));
+        const Size size = vorel_fuzz::decodeSize(mIn, {1, 1}, largestMask(mIn));
+        paint(size.width, size.height);
     }
 }
 

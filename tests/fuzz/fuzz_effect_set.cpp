@@ -1,17 +1,22 @@
-/// Any sequence of public calls on up to three effect sets, with arguments far outside their ranges.
-/// A finding is whatever a sanitizer reports, or an input that takes seconds.
+/// Any sequence of public calls on up to three effect sets, with arguments far outside their ranges,
+/// some of them while memory runs out. A finding is whatever a sanitizer reports, or an input that takes
+/// seconds.
 #include <voreleffect/VFBlender.h>
 #include <voreleffect/VFECore.h>
 #include <voreleffect/VFEffect.h>
+#include <voreleffect/VFLog.h>
 #include <voreleffect/VFProperty.h>
 
 #include <algorithm>
 #include <array>
 #include <cmath>
+#include <cstdarg>
 #include <cstdint>
+#include <cstdio>
 #include <cstdlib>
 #include <cstring>
 #include <memory>
+#include <string>
 #include <utility>
 #include <vector>
 
@@ -19,6 +24,8 @@
 #include "level_of_input.h"
 #include "paint_cost.h"
 #include "pixels.h"
+#include "tests/reliability/allocation_watch.h"
+#include "tests/support/fake_core.h"
 #include "tests/support/literal_engine.h"
 
 namespace {
@@ -33,15 +40,21 @@ using vorel_fuzz::paintCost;
 using vorel_fuzz::Size;
 using vorel_fuzz::WorkBudget;
 
-// The types that have a record and no core.
+// The types that have a record and no core, and the one that is placed by a stroke's record.
 constexpr int kBevel = 5;
 constexpr int kEmboss = 6;
+constexpr int kReservedStroke = 9;
 
-constexpr Size kLargestLayer = {kLongestSide, kLongestSide};
 constexpr Size kLargestPattern = {9, 9};
 constexpr int kMostCalls = 80;
 constexpr double kMostSteps = 8e6;
+constexpr double kMostLargeSteps = 4e7;
 constexpr int kMostKeyBytes = 1 << 20;
+constexpr size_t kMostCores = 24;
+constexpr size_t kLongestTag = 256;
+
+/// Lines of the log since the last call that may print one.
+int gLogged = 0;
 
 /// A record made by hand with the array or bitmap that it points to.
 struct Record {
@@ -50,9 +63,24 @@ struct Record {
     std::unique_ptr<VFProperty> property;
 };
 
+/// A core of the caller's own, of any type, that keeps its record and paints nothing.
+class ForeignCore : public VFECoreBase {
+  public:
+    ForeignCore(int type, Record record) : mRecord(std::move(record)) { mEffectType = type; }
+
+    void setProperty(VFProperty* /*property*/) override {}
+    VFProperty* getProperty() override { return mRecord.property.get(); }
+
+  private:
+    Record mRecord;
+};
+
 class Caller {
   public:
-    Caller(const uint8_t* data, size_t size) : mIn(data, size), mBudget(kMostSteps) {
+    Caller(const uint8_t* data, size_t size)
+        : mIn(data, size),
+          mBudget(mIn.isLarge() ? kMostLargeSteps : kMostSteps),
+          mLongestSide(mIn.isLarge() ? vorel_fuzz::kLargeSide : kLongestSide) {
         for (auto& set : mSets)
             set = std::make_unique<VFEffect>();
     }
@@ -65,6 +93,7 @@ class Caller {
     // --- Arguments ------------------------------------------------------------------------------
 
     VFEffect& set() { return *mSets[mCurrent]; }
+    Size largestLayer() const { return {mLongestSide, mLongestSide}; }
     float angle() { return mIn.wildFloat(-720.0F, 720.0F); }
     float distance() { return mIn.wildFloat(-20.0F, 40.0F); }
     float size() { return mIn.wildFloat(-2.0F, mIn.oneIn(8) ? 110.0F : 9.0F); }
@@ -128,9 +157,14 @@ class Caller {
     void strokePieces();
     void bitmapPieces();
     void wholeRun();
+    void pairedRun();
+    void foreignCore();
+    void refusedCall();
+    void log();
 
     Decoder mIn;
     WorkBudget mBudget;
+    int mLongestSide;
     std::array<std::unique_ptr<VFEffect>, 3> mSets;
     size_t mCurrent = 0;
     // Destinations must live until their run has ended; some runs never end.
@@ -212,9 +246,10 @@ VFBitmap* Caller::destination() {
         return mBitmaps[static_cast<size_t>(mIn.between(0, static_cast<int>(mBitmaps.size()) - 1))]
             .get();
     }
-    Size size = decodeSize(mIn, {0, 0}, kLargestLayer);
+    Size size = decodeSize(mIn, {0, 0}, largestLayer());
     const VFBitmap* const mask = set().getSrcBitmap();
-    if (mask != nullptr && mask->mWidth <= kLongestSide && mask->mHeight <= kLongestSide) {
+    const auto longest = static_cast<unsigned>(mLongestSide);
+    if (mask != nullptr && mask->mWidth <= longest && mask->mHeight <= longest) {
         size = {static_cast<int>(mask->mWidth), static_cast<int>(mask->mHeight)};
     }
     return keep(decodeBitmap(mIn, size, 4));
@@ -359,12 +394,12 @@ void Caller::changeOpacity() {
 // --- Runs -------------------------------------------------------------------------------------------
 
 void Caller::plan() {
-    const int width = mIn.wildInt(0, kLongestSide);
-    set().initEffect(width, mIn.wildInt(0, kLongestSide));
+    const int width = mIn.wildInt(0, mLongestSide);
+    set().initEffect(width, mIn.wildInt(0, mLongestSide));
 }
 
 void Caller::giveMask() {
-    auto mask = decodeBitmap(mIn, decodeSize(mIn, {0, 0}, kLargestLayer), 1);
+    auto mask = decodeBitmap(mIn, decodeSize(mIn, {0, 0}, largestLayer()), 1);
     const std::unique_ptr<VFBitmap> previous(set().getSrcBitmap());
     set().setSrcBitmap(mask.release());
 }
@@ -374,11 +409,13 @@ void Caller::giveDestination() {
 }
 
 void Caller::drawGlyph() {
-    const int x = mIn.wildInt(-kLongestSide, kLongestSide);
-    const int y = mIn.wildInt(-kLongestSide, kLongestSide);
+    const int x = mIn.wildInt(-mLongestSide, mLongestSide);
+    const int y = mIn.wildInt(-mLongestSide, mLongestSide);
     if (mIn.oneIn(16)) return set().renderEffectLayer(x, y, nullptr);
-    const int width = mIn.oneIn(16) ? 65535 : mIn.between(0, 40);
-    const int height = mIn.oneIn(16) && width < 2 ? 65535 : mIn.between(0, width > 40 ? 1 : 40);
+    const int longest = mIn.isLarge() ? mLongestSide : 40;
+    const int width = mIn.oneIn(16) ? 65535 : mIn.between(0, longest);
+    const int height =
+        mIn.oneIn(16) && width < 2 ? 65535 : mIn.between(0, width > longest ? 1 : longest);
     std::vector<uint8_t> pixels = vorel_fuzz::decodeCoverage(mIn, width, height);
     VFGlyph glyph{mIn.oneIn(16) ? nullptr : pixels.data(), static_cast<unsigned short>(width),
                   static_cast<unsigned short>(height)};
@@ -420,7 +457,8 @@ void Caller::takeKey() {
     }
     if (reserved > kMostKeyBytes) return;
     char* const key = mIn.flag() ? set().getMapKey() : set().getMapKey(mIn.word());
-    if (key == nullptr || std::strlen(key) > size_t{kMostKeyBytes}) std::abort();
+    if (key == nullptr && !vorel_test::RefusedMemory::refused()) std::abort();
+    if (key != nullptr && std::strlen(key) > size_t{kMostKeyBytes}) std::abort();
     delete[] key;
 }
 
@@ -450,7 +488,7 @@ void Caller::query() {
 void Caller::driveCore() {
     VFECore* const core = set().getEffect(mIn.between(1, 12));
     if (core == nullptr) return;
-    const Size size = decodeSize(mIn, {0, 0}, kLargestLayer);
+    const Size size = decodeSize(mIn, {0, 0}, largestLayer());
     const auto mask = decodeBitmap(mIn, size, 1);
     const auto target = decodeBitmap(mIn, size, 4);
     const auto second = decodeBitmap(mIn, size, 4);
@@ -465,7 +503,11 @@ void Caller::driveCore() {
     VFECore::ParamRender draw = {box.mLeft, box.mTop, nullptr, target.get()};
     core->initEffect(mIn.flag() ? &init : nullptr);
     core->render(mIn.flag() ? &draw : nullptr);
-    if (!mBudget.spend(paintCost(*core, kLongestSide, kLongestSide))) return;
+    // A bitmap of another size has sides of kLongestSide at most.
+    if (!mBudget.spend(
+            paintCost(*core, std::max(size.width, kLongestSide), std::max(size.height, kLongestSide)))) {
+        return;
+    }
     core->doPostProcessing(mIn.oneIn(16) ? nullptr : &params);
 }
 
@@ -499,8 +541,8 @@ void Caller::glowPieces() {
     outer.makeColorLUT(nullptr, fade, curve);
     inner.makeColorLUT(table.data(), fade, curve);
 
-    const int width = mIn.between(0, kLongestSide);
-    const int height = mIn.between(0, kLongestSide);
+    const int width = mIn.between(0, mLongestSide);
+    const int height = mIn.between(0, mLongestSide);
     std::vector<uint8_t> mask = vorel_fuzz::decodeCoverage(mIn, width, height);
     const int passes = mIn.oneIn(8) ? mIn.oneOf({-1, 0, INT_MIN}) : mIn.between(0, 9);
     outer.increaseByBoxFilter(mask.data(), passes, width, height);
@@ -562,7 +604,7 @@ void Caller::strokePieces() {
 }
 
 void Caller::bitmapPieces() {
-    const Size size = decodeSize(mIn, {0, 0}, kLargestLayer);
+    const Size size = decodeSize(mIn, {0, 0}, largestLayer());
     const auto source = decodeBitmap(mIn, size, mIn.oneOf({1, 4}));
     if (source == nullptr) return;
     VFRect box{mIn.wildInt(-1, size.width), mIn.wildInt(-1, size.height), mIn.wildInt(0, size.width + 1),
@@ -583,7 +625,7 @@ void Caller::bitmapPieces() {
 /// What a caller does for one run, so that few bytes already paint.
 void Caller::wholeRun() {
     addFill();
-    const Size size = decodeSize(mIn, {1, 1}, kLargestLayer);
+    const Size size = decodeSize(mIn, {1, 1}, largestLayer());
     set().initEffect(size.width, size.height);
     set().setDstBitmap(destination());
     for (int left = mIn.between(1, 3); left > 0; --left)
@@ -592,16 +634,104 @@ void Caller::wholeRun() {
     set().compositeLayers(set().getDstBitmap());
 }
 
+/// The runs of two sets that paint into one picture, and perhaps through one mask.
+void Caller::pairedRun() {
+    VFEffect& first = set();
+    const size_t other = (mCurrent + 1) % mSets.size();
+    VFEffect& second = *mSets[other];
+    const Size size = decodeSize(mIn, {1, 1}, largestLayer());
+    VFBitmap* const picture = destination();
+    for (VFEffect* const each : {&first, &second}) {
+        each->initEffect(size.width, size.height);
+        each->setDstBitmap(picture);
+    }
+    for (int left = mIn.between(1, 3); left > 0; --left) {
+        if (mIn.flag()) mCurrent = other;
+        drawGlyph();
+    }
+    VFBitmap* const own = second.getSrcBitmap();
+    if (mIn.flag()) second.setSrcBitmap(first.getSrcBitmap());
+    postProcess();
+    mCurrent = (mCurrent + 1) % mSets.size();
+    postProcess();
+    second.setSrcBitmap(own);
+    first.compositeLayers(picture);
+    second.compositeLayers(picture);
+}
+
+/// Puts a core of the caller's own into the list, with a record of its type, or asks about it only.
+void Caller::foreignCore() {
+    const int kind = type();
+    const bool hasRecord = !mIn.oneIn(8);
+    auto core = std::make_unique<ForeignCore>(
+        kind, hasRecord ? record(kind == kReservedStroke ? int{literal::kStroke} : kind) : Record());
+    core->setId(id());
+    set().isUnderEffect(core.get());
+    if (mIn.flag()) return;
+    // Else a set of thousands of cores would take longer than its input is worth.
+    std::vector<VFECore*>& list = vorel_test::effectsOf(set());
+    if (list.size() < kMostCores) list.push_back(core.release());
+}
+
+/// A call to which one request for memory is refused, or that one and all that follow.
+void Caller::refusedCall() {
+    constexpr Call kCalls[] = {&Caller::addRecord,   &Caller::addRecord,   &Caller::addGlow,
+                               &Caller::addPattern,  &Caller::copySet,     &Caller::plan,
+                               &Caller::wholeRun,    &Caller::wholeRun,    &Caller::postProcess,
+                               &Caller::takeKey,     &Caller::driveCore,   &Caller::looseCore,
+                               &Caller::glowPieces,  &Caller::pairedRun,   &Caller::bitmapPieces,
+                               &Caller::addGradient, &Caller::strokePieces};
+    constexpr int kLastCall = static_cast<int>(sizeof kCalls / sizeof kCalls[0]) - 1;
+    const Call call = kCalls[mIn.between(0, kLastCall)];
+    const int first = mIn.between(1, 48);
+    const vorel_test::RefusedMemory refused(
+        first, mIn.flag() ? vorel_test::Refusal::kFromThenOn : vorel_test::Refusal::kOnce);
+    (this->*call)();
+}
+
+/// Texts of any length at any level, through every format of the log.
+void Caller::log() {
+    const auto text = [this] {
+        return std::string(
+            static_cast<size_t>(mIn.oneIn(4) ? mIn.between(250, 1100) : mIn.between(0, 9)),
+            static_cast<char>(mIn.between(' ', '~')));
+    };
+    const std::string tagText = text();
+    const std::string message = text();
+    const char* const tag = mIn.oneIn(8) ? nullptr : tagText.c_str();
+    const char* const format = mIn.oneIn(8) ? nullptr : "%s";
+    const auto microseconds = static_cast<long>(mIn.wildInt(0, 1000000));
+    VFLog();
+    VFLog::setPrintLogLevel(mIn.byte());
+    gLogged = 0;
+    switch (mIn.between(0, 2)) {
+        case 0:
+            VFLog::printLog(static_cast<VFLogLevel>(mIn.wildInt(0, 31)), tag, format, message.c_str());
+            break;
+        case 1:
+            VFLog::printTime(tag, mIn.oneIn(8) ? nullptr : message.c_str(), microseconds);
+            break;
+        default:
+            VFLog::printTime(tag, mIn.oneIn(8) ? nullptr : tagText.c_str(), microseconds, format,
+                             message.c_str());
+            break;
+    }
+    // One line a call at most; a tag that is too long prints none.
+    if (gLogged > (tag != nullptr && tagText.size() >= kLongestTag ? 0 : 1)) std::abort();
+    VFLog::setPrintLogLevel(0xFF);
+}
+
 void Caller::run() {
     constexpr Call kCalls[] = {
-        &Caller::addShadow,     &Caller::addGlow,    &Caller::addRelief,    &Caller::addGradient,
-        &Caller::addStroke,     &Caller::addPattern, &Caller::addFill,      &Caller::addRecord,
-        &Caller::addRecord,     &Caller::remove,     &Caller::copySet,      &Caller::freshSet,
-        &Caller::changeOpacity, &Caller::plan,       &Caller::giveMask,     &Caller::giveDestination,
-        &Caller::drawGlyph,     &Caller::drawGlyph,  &Caller::postProcess,  &Caller::composite,
-        &Caller::takeKey,       &Caller::query,      &Caller::driveCore,    &Caller::driveCore,
-        &Caller::looseCore,     &Caller::glowPieces, &Caller::strokePieces, &Caller::bitmapPieces,
-        &Caller::wholeRun,      &Caller::wholeRun};
+        &Caller::addShadow,     &Caller::addGlow,     &Caller::addRelief,    &Caller::addGradient,
+        &Caller::addStroke,     &Caller::addPattern,  &Caller::addFill,      &Caller::addRecord,
+        &Caller::addRecord,     &Caller::remove,      &Caller::copySet,      &Caller::freshSet,
+        &Caller::changeOpacity, &Caller::plan,        &Caller::giveMask,     &Caller::giveDestination,
+        &Caller::drawGlyph,     &Caller::drawGlyph,   &Caller::postProcess,  &Caller::composite,
+        &Caller::takeKey,       &Caller::query,       &Caller::driveCore,    &Caller::driveCore,
+        &Caller::looseCore,     &Caller::glowPieces,  &Caller::strokePieces, &Caller::bitmapPieces,
+        &Caller::wholeRun,      &Caller::wholeRun,    &Caller::pairedRun,    &Caller::foreignCore,
+        &Caller::refusedCall,   &Caller::refusedCall, &Caller::log};
     constexpr int kLastCall = static_cast<int>(sizeof kCalls / sizeof kCalls[0]) - 1;
     for (int calls = 0; calls < kMostCalls && !mIn.atEnd(); ++calls) {
         if (mIn.oneIn(16)) mCurrent = (mCurrent + 1) % mSets.size();
@@ -610,6 +740,23 @@ void Caller::run() {
 }
 
 }  // namespace
+
+// In the place of Android's function: the library finds it in the running program.
+extern "C" __attribute__((visibility("default"), format(printf, 3, 4))) int __android_log_print(
+    int priority, const char* tag, const char* format, ...);
+
+extern "C" int __android_log_print(int priority, const char* tag, const char* format, ...) {
+    char text[4096];
+    va_list arguments;
+    va_start(arguments, format);
+    const int length = std::vsnprintf(text, sizeof text, format, arguments);
+    va_end(arguments);
+    ++gLogged;
+    // "[tag] message \n": a tag of less than 256 characters, a message of less than 1024.
+    const bool complete = length > 0 && length < 256 + 1024 + 5 && text[length - 1] == '\n';
+    if (!complete || priority < 3 || priority > 6 || std::strcmp(tag, "vfeffect") != 0) std::abort();
+    return length;
+}
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
     vorel_fuzz::useLevelOfInput(size);

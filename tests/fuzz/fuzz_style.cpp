@@ -1,9 +1,11 @@
-/// The bytes are a style file. Either it is read, with every number in its range, or it is refused
-/// with a StyleError of one line; nothing else may be thrown.
+/// The bytes are a style file. Either it is read, with every number in its range and one fill at most,
+/// and becomes a set of effects and a C++ source, or it is refused with a StyleError of one line;
+/// nothing else may be thrown.
 #include <cmath>
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
+#include <sstream>
 #include <string>
 #include <string_view>
 
@@ -85,12 +87,31 @@ struct RangeCheck {
 };
 
 void require(const Style& style) {
+    if (style.color && hasTextFill(style)) fail("a style has two fills");
     if (style.color) requireColour(*style.color);
     if (style.textOpacity) requireIn(*style.textOpacity, 0, 1, "text opacity");
     for (const Effect& effect : style.effects) {
         if (effectName(effect).empty()) fail("an effect has no name");
         std::visit(RangeCheck(), effect);
     }
+}
+
+/// A picture for every pattern but those that have no name.
+PatternImage load(const std::string& image) {
+    if (image.size() < 2) throw StyleError("no picture");
+    return {1, 1, {1, 2, 3, 4}};
+}
+
+void requireLook(const Style& style) {
+    const Look look(style, fillOf(style), opacityOf(style), load);
+    if (look.added().size() > style.effects.size() + 1)
+        fail("a look has effects that its style has not");
+    if (look.added().size() + look.unpainted().size() < style.effects.size()) fail("an effect is lost");
+    // A pattern leaves no trace in a key.
+    if (keyFragments(look.key()).size() > look.added().size()) fail("a key has too many fragments");
+    std::ostringstream source;
+    writeCpp(source, functionName(style.description), style, fillOf(style), opacityOf(style), load);
+    if (source.str().empty()) fail("a look is written as nothing");
 }
 
 }  // namespace
@@ -102,6 +123,7 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
         require(style);
         for (const float factor : {0.01F, 0.5F, 1.0F})
             require(scaledStyle(style, factor));
+        requireLook(style);
     } catch (const StyleError& error) {
         const std::string_view message = error.what();
         if (message.empty() || message.find('\n') != std::string_view::npos) {

@@ -69,6 +69,10 @@ inline double paintCost(VFontEffect::VFECore& core, double width, double height)
     return paintCost(core.getStyle(), workingSize(core), width, height);
 }
 
+/// The longest side of a large input: boxes are taller than what a blur keeps of them, and wider than
+/// several of the widest vectors.
+constexpr int kLargeSide = 400;
+
 /// The steps that one input may spend.
 class WorkBudget {
   public:

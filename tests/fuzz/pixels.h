@@ -89,6 +89,7 @@ inline std::unique_ptr<VFontEffect::VFBitmap> decodePixels(Decoder& in, Size siz
     auto bitmap = std::make_unique<VFontEffect::VFBitmap>(static_cast<unsigned>(size.width),
                                                           static_cast<unsigned>(size.height),
                                                           static_cast<unsigned>(bytesPerPixel));
+    if (bitmap->mData == nullptr) return bitmap;  // where memory is refused
     const size_t pixels = static_cast<size_t>(size.width) * static_cast<size_t>(size.height);
     if (bytesPerPixel == 4) {
         fillColours(in, bitmap->mData, pixels, 3);

@@ -187,6 +187,10 @@ std::vector<CoreCase> coreCases() {
     std::vector<CoreCase> cases = strokeCases();
     addGlowCases<VFOuterGlow, VFOuterGlowProperty>(cases, "OuterGlow");
     addGlowCases<VFInnerGlow, VFInnerGlowProperty>(cases, "InnerGlow");
+    // So small that its border, which needs no blur, lies in the picture.
+    using InnerGlow = VFInnerGlowProperty;
+    cases.push_back(coreCase<VFInnerGlow>("SmallInnerGlow", InnerGlow(1, 0xC0FF8000, 0.75F, 0, nullptr),
+                                          InnerGlow(2, 0xFF0080FF, 1, 0, nullptr), false, 4, 1));
     for (const bool layered : {false, true}) {
         const std::string suffix = layered ? "Layered" : "";
         using Outer = VFOuterShadowProperty;
@@ -226,7 +230,7 @@ class CoreMemory : public MemoryTest, public ::testing::WithParamInterface<CoreC
   protected:
     CoreMemory() : mCore(*GetParam().core) {
         mScene.mask = discMask(30, 24, 14.0F, 11.0F, 8.0F, true);
-        mScene.text = {3, 2, 27, 22};
+        mScene.text = {6, 5, 24, 19};
         mScene.dst = filledPicture(30, 24, 0x40302010);
         mScene.useOuterLayer = GetParam().layered;
         if (GetParam().layered) mScene.sub = filledPicture(30, 24, 0x20100800);

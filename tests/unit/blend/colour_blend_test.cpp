@@ -305,6 +305,23 @@ TEST(ColourBlendLimits, ByteCountsBeyondThirtyTwoBitsAreNotTouched) {
     }
 }
 
+TEST(ColourBlendLimits, StrideOfZeroRepeatsTheRow) {
+    GuardedBuffer source(8 * 4);
+    Random random(6);
+    fillColour(random, source);
+    const Placement p{8, 3, 0, 0, 8, 3};
+    for (const int mode : kModes) {
+        GuardedBitmap dst(8, 3, 4);
+        fillColour(random, dst.pixels());
+        ASSERT_TRUE(matchesLiteral(drawByName, mode, p, dst, wordsOf(source), 0)) << mode;
+    }
+    for (const int order : kOrders) {
+        GuardedBitmap dst(8, 3, 4);
+        fillColour(random, dst.pixels());
+        ASSERT_TRUE(matchesLiteral(drawBytesByName, order, p, dst, source.data(), 0)) << order;
+    }
+}
+
 TEST(ColourBlendLimits, EmptySourceOrDestinationOrNegativeStrideDrawsNothing) {
     std::vector<uint32_t> words(16, 0x80FFFFFF);
     GuardedBitmap dst(4, 4, 4);

@@ -213,8 +213,8 @@ TEST(Crop, EmptyRectangle_HasNoExtent) {
 
 TEST(Crop, RectangleLeavingTheSource_HasNoCoverage) {
     const VFBitmap source = numberedMask();
-    for (VFRect rect :
-         {VFRect(3, 3, 6, 5), VFRect(-1, 0, 2, 2), VFRect(0, -1, 3, 1), VFRect(7, 7, 10, 9)}) {
+    for (VFRect rect : {VFRect(3, 3, 6, 5), VFRect(-1, 0, 2, 2), VFRect(0, -1, 3, 1), VFRect(0, 4, 3, 6),
+                        VFRect(7, 7, 10, 9)}) {
         const VFBitmap crop(source, &rect);
         expectNumbers(crop, 3, 2, 1, 2);
         EXPECT_EQ(bytesOf(crop), Bytes(6, 0));

@@ -86,6 +86,19 @@ TEST(CircleKernel, RadiusOutOfProportion_HasASideButNoBuffer) {
     EXPECT_EQ(nullptr, weights);
 }
 
+TEST(CircleKernel, LargestDisc_HasASideOf8191) {
+    unsigned char* weights = nullptr;
+    EXPECT_EQ(8191, VFontEffect::makeCircleKernel(&weights, 4095.0F));
+    ASSERT_NE(nullptr, weights);
+    EXPECT_EQ(255, weights[size_t{4095} * 8191]);
+    EXPECT_EQ(0, weights[0]);
+    std::free(weights);
+
+    weights = nullptr;
+    EXPECT_EQ(8193, VFontEffect::makeCircleKernel(&weights, 4096.0F));
+    EXPECT_EQ(nullptr, weights);
+}
+
 TEST(CircleKernel, NotANumber_IsOneEmptyCell) {
     const CircleKernel kernel = libraryKernel(std::nanf(""));
     EXPECT_EQ(1, kernel.side);

@@ -412,6 +412,25 @@ TEST(StrokeDilation, BandsInAnyOrder_GiveThePlanesOfOneCall) {
     });
 }
 
+/// The source has as many covered rows on both sides, which belong to no band.
+TEST(StrokeDilation, BandBeyondTheSource_IsCutToIt) {
+    const literal::Mask mask = discMask(9, 27, 4.0F, 13.0F, 13.0F, true);
+    for (Routine routine : kRoutines) {
+        Job whole(mask, 2.0F);
+        Job beyond(mask, 2.0F);
+        for (Job* const job : {&whole, &beyond}) {
+            job->work.source += 9 * 9;
+            job->work.sourceHeight = 9;
+        }
+        whole.work.endRow = 9;
+        beyond.work.firstRow = -4;
+        beyond.work.endRow = 13;
+        EXPECT_EQ(1, routine(&whole.work));
+        EXPECT_EQ(1, routine(&beyond.work));
+        EXPECT_EQ(whole.planes, beyond.planes);
+    }
+}
+
 TEST(StrokeDilation, EmptyBand_ReturnsZeroAndWritesNothing) {
     const literal::Mask mask = discMask(9, 9, 4.0F, 4.0F, 3.0F, true);
     for (Routine routine : kRoutines) {

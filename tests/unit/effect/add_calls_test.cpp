@@ -381,6 +381,44 @@ TEST(AddCalls, BevelAndEmboss_ReturnNoEffectAndLeaveTheList) {
     EXPECT_EQ(set.getNewEffectId(), 1);
 }
 
+/// A core of the caller's own that copies the record it is given.
+template <class Record>
+class ReliefCore : public FakeCore {
+  public:
+    explicit ReliefCore(int style) : FakeCore(style) {}
+    void setProperty(VFProperty* property) override { record = *static_cast<Record*>(property); }
+
+    Record record{0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0};
+};
+
+template <class Record, class Add>
+void expectReliefRecord(int style, Add add) {
+    VFEffect set;
+    auto* const core = new ReliefCore<Record>(style);
+    effectsOf(set).push_back(core);
+    (set.*add)(3, 5.5F, 11, 1, 2, 17, 0.5F, -30.9F, 100, 0x99112233, 0.5F, 0x88445566, 0.8F);
+    const Record& record = core->record;
+    EXPECT_EQ(record.mStyle, 3);
+    EXPECT_EQ(record.mSize, 5.5F);
+    EXPECT_EQ(record.mDepth, 10.0F);
+    EXPECT_EQ(record.mTechnique, 1);
+    EXPECT_EQ(record.mDirection, 2);
+    EXPECT_EQ(record.mSoften, 16);
+    EXPECT_EQ(record.mOpacity, 0.5F);
+    EXPECT_EQ(record.mAngle, 330.0F);
+    EXPECT_EQ(record.mAltitude, 10.0F);
+    // Both opacities multiplied: 0.25 * 255 and 0.4 * 255, rounded.
+    EXPECT_EQ(record.mHighlightColor, 0x40112233U);
+    EXPECT_EQ(record.mHighlightOpacity, 0.5F);
+    EXPECT_EQ(record.mShadowColor, 0x66445566U);
+    EXPECT_EQ(record.mShadowOpacity, 0.8F);
+}
+
+TEST(AddCalls, BevelAndEmboss_GiveTheirRecordToACallersOwnCore) {
+    expectReliefRecord<VFBevelProperty>(kBevel, &VFEffect::addBevelText);
+    expectReliefRecord<VFEmbossProperty>(kEmboss, &VFEffect::addEmbossText);
+}
+
 TEST(AddCalls, BevelAndEmboss_ReArmTheOrder) {
     VFEffect set;
     set.addOuterShadowText(0, 1, 1, 0, 1);

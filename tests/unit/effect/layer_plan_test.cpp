@@ -161,6 +161,26 @@ TEST(PaintOrder, AddingTheSameTextAgain_ReversesBothGroups) {
     EXPECT_EQ(planAndOrder(set), "LITKS");
 }
 
+/// Callers' own cores make lists of any length; 16 are as few as some sorts keep in order by chance.
+TEST(PaintOrder, LongLists_KeepTheOrderOfEachGroup) {
+    VFEffect set;
+    constexpr int kCores = 60;
+    std::vector<FakeCore*> cores;
+    for (int i = 0; i < kCores; ++i)
+        cores.push_back(insertCore(set, i % 3 == 0 ? kOuterShadow : kInnerShadow));
+    set.addText(0, 1);
+    std::vector<VFECore*> expected;
+    for (int i = kCores - 1; i >= 0; --i) {
+        if (i % 3 != 0) expected.push_back(cores[static_cast<size_t>(i)]);
+    }
+    expected.push_back(set.getEffect(kText));
+    for (int i = kCores - 1; i >= 0; --i) {
+        if (i % 3 == 0) expected.push_back(cores[static_cast<size_t>(i)]);
+    }
+    set.initEffect(4, 4);
+    EXPECT_EQ(effectsOf(set), expected);
+}
+
 TEST(PaintOrder, PatternIsPlacedAmongTheOverEffects) {
     VFEffect set;
     set.addPatternText(nullptr, 1, 1);
@@ -399,6 +419,8 @@ TEST(InitEffect, AbsurdSizes_SurviveAndDrawNothing) {
             for (const Kind& kind : kKinds)
                 kind.add(set);
             set.initEffect(width, height);
+            ASSERT_NE(set.getSrcBitmap(), nullptr);
+            EXPECT_EQ(set.getSrcBitmap()->mData, nullptr) << "a layer of as many bytes has no pixels";
             set.setDstBitmap(&picture);
             set.renderEffectLayer(1, 1, &glyph.glyph);
             set.doEffectPostProcessing();

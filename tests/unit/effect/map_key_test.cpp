@@ -208,4 +208,34 @@ TEST(MapKey, CountsOutOfAllProportion_GiveNoKey) {
     EXPECT_EQ(keyOf(set).size(), 10U);
 }
 
+/// A record that claims any length and writes one character.
+class LongRecord : public VFProperty {
+  public:
+    explicit LongRecord(int length) : VFProperty(0, 1), mLength(length) {}
+    int getSequentialCharLength() override { return mLength; }
+    bool toSequentialChar(char** cursor) override {
+        *(*cursor)++ = 'X';
+        return true;
+    }
+
+  private:
+    int mLength;
+};
+
+TEST(MapKey, LongestKey_Has2To28Bytes) {
+    constexpr int kLongest = 1 << 28;
+    LongRecord within(kLongest - 9);
+    LongRecord beyond(kLongest - 8);
+    VFEffect set;
+    set.addText(0, 1);
+    insertCore(set, kOuterGlow, &within);
+    EXPECT_EQ(keyOf(set).size(), 10U);
+    insertCore(set, kInnerGlow, &beyond);
+    EXPECT_EQ(set.getMapKey(), nullptr);
+    VFEffect other;
+    other.addText(0, 1);
+    insertCore(other, kOuterGlow, &beyond);
+    EXPECT_EQ(other.getMapKey(), nullptr);
+}
+
 }  // namespace

@@ -124,6 +124,15 @@ TEST(Registry, FirstThreeCores_GetIds0To2AndIdsAreNotReused) {
     EXPECT_EQ(idsOf(set), (std::vector<int>{0, 2, 3}));
 }
 
+TEST(Registry, IdCounter_StaysAtTheLargestId) {
+    VFEffect set;
+    nextEffectIdOf(set) = INT32_MAX - 1;
+    EXPECT_EQ(set.getNewEffectId(), INT32_MAX - 1);
+    EXPECT_EQ(set.getNewEffectId(), INT32_MAX);
+    EXPECT_EQ(set.getNewEffectId(), INT32_MAX);
+    EXPECT_EQ(set.addText(0, 1), static_cast<unsigned>(INT32_MAX));
+}
+
 TEST(Registry, AddingTwice_UpdatesTheCoreInItsPlace) {
     VFEffect set;
     const unsigned id = set.addText(0xFF111111, 1);

@@ -169,6 +169,17 @@ TEST(TextBox, PostProcessing_ClampsItToTheMask) {
     }
 }
 
+TEST(TextBox, SidesOfAGlyph_HaveAll16Bits) {
+    VFEffect set;
+    SolidGlyph tall(1, 65535);
+    SolidGlyph wide(32768, 1);
+    set.initEffect(4, 4);
+    set.renderEffectLayer(0, -40000, &tall.glyph);
+    EXPECT_EQ(sidesOf(*set.getTextRect()), (Sides{0, -40000, 1, 25535}));
+    set.renderEffectLayer(2, 0, &wide.glyph);
+    EXPECT_EQ(sidesOf(*set.getTextRect()), (Sides{0, -40000, 32770, 25535}));
+}
+
 TEST(TextBox, GlyphsAtTheEndsOfTheRange_SpanTheWholeMask) {
     VFEffect set;
     SolidGlyph glyph(65535, 1);
@@ -469,6 +480,24 @@ TEST(CompositeLayers, Refused_LeavesThePictureAndEndsTheRun) {
         EXPECT_EQ(set.getSrcBitmap(), nullptr);
         EXPECT_EQ(set.getDstBitmap(), nullptr);
         EXPECT_FALSE(isLayered(set));
+    }
+}
+
+/// The caller may put a mask of another size in the place of the run's.
+TEST(CompositeLayers, MaskOfAnotherSize_LeavesThePicture) {
+    for (const unsigned side : {19U, 21U}) {
+        for (const unsigned picture : {20U, side}) {
+            VFEffect set;
+            set.setTextOpacity(0.5F);
+            StartedRun run(set, 20, 20, 0);  // a merge would erase the picture
+            VFBitmap other(picture, picture, 4);
+            fillBytes(other, 77);
+            set.doEffectPostProcessing();
+            delete set.getSrcBitmap();
+            set.setSrcBitmap(new VFBitmap(side, side, 1));
+            set.compositeLayers(&other);
+            EXPECT_EQ(bytesOf(other), std::vector<uint8_t>(size_t{picture} * picture * 4, 77));
+        }
     }
 }
 
