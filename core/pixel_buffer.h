@@ -31,7 +31,7 @@ class [[nodiscard]] PixelBuffer {
 
   private:
     /// A larger request fails. No effect comes near it, whatever its picture: see core/windows.h.
-    static constexpr uint64_t kMostBytes = uint64_t{1} << 31;
+    static constexpr uint64_t kMostBytes = uint64_t{1} << 32;
 
     static PixelBuffer make(int64_t width, int64_t height, bool clear) {
         if (width < 0 || height < 0) return PixelBuffer(nullptr);

@@ -213,8 +213,7 @@ class VF_API VFOuterGlow : public VFECoreBase {
     /// Grows coverage in place, `passes` times: each inner pixel becomes a quarter of the sum of its
     /// 3 x 3 neighbourhood, at most 255. `mask` is packed, width x height; its outermost rows keep
     /// their values, its outermost columns become 0 in the rows between them. Nothing is done for a
-    /// height of at most 2, fewer than 1 pass, or when memory runs out: it takes two bytes for each
-    /// pixel that grows, of rows of 64 pixels or more, and 2 GiB at most.
+    /// height of at most 2, fewer than 1 pass, or when memory runs out.
     void increaseByBoxFilter(unsigned char* mask, int passes, int width, int height);
 
   private:

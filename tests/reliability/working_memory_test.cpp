@@ -1,5 +1,6 @@
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cstdint>
 #include <cstring>
 #include <memory>
@@ -101,6 +102,12 @@ void expectFewBytes(Canvas& canvas, float size) {
     }
 }
 
+/// All of the sizes, or where each takes many times as long the first.
+void expectFewBytes(Canvas& canvas, const std::vector<float>& sizes) {
+    for (size_t i = 0; i < (kThinned > 1 ? 1 : sizes.size()); ++i)
+        expectFewBytes(canvas, sizes[i]);
+}
+
 class WorkingMemory : public ::testing::Test {
   protected:
     void SetUp() override {
@@ -124,20 +131,30 @@ TEST_F(WorkingMemory, OfALargePicture_IsFewMegabytes) {
 
 TEST_F(WorkingMemory, OfALongLine_IsFewMegabytes) {
     Canvas canvas(26'000, 200);
-    for (const float size : {2.0F, 17.0F, 48.0F, 256.0F})
-        expectFewBytes(canvas, size);
+    expectFewBytes(canvas, {48.0F, 2.0F, 17.0F, 256.0F});
 }
 
 TEST_F(WorkingMemory, OfARowOfPixels_IsFewMegabytes) {
     Canvas canvas(100'000, 1);
-    for (const float size : {1.0F, 3.0F, 8.0F, 24.0F, 100.0F, 256.0F})
-        expectFewBytes(canvas, size);
+    expectFewBytes(canvas, {24.0F, 1.0F, 3.0F, 8.0F, 100.0F, 256.0F});
 }
 
 TEST_F(WorkingMemory, OfAColumnOfPixels_IsFewMegabytes) {
     Canvas canvas(1, 100'000);
-    for (const float size : {1.0F, 3.0F, 8.0F, 24.0F, 100.0F, 256.0F})
-        expectFewBytes(canvas, size);
+    expectFewBytes(canvas, {24.0F, 1.0F, 3.0F, 8.0F, 100.0F, 256.0F});
+}
+
+TEST_F(WorkingMemory, OfTheBoxFilter_IsTwoPlanesOfWhatGrows) {
+    std::vector<unsigned char> mask(size_t{1000} * 800, 0);
+    mask[400 * 1000 + 500] = 255;
+    VFOuterGlow glow;
+    const PeakMemory few;
+    glow.increaseByBoxFilter(mask.data(), 20, 1000, 800);
+    EXPECT_LE(few.bytes(), 20'000);
+    std::fill(mask.begin(), mask.end(), uint8_t{200});
+    const PeakMemory whole;
+    glow.increaseByBoxFilter(mask.data(), 20, 1000, 800);
+    EXPECT_LE(whole.bytes(), 2 * (1000 + 128) * 810L);
 }
 
 /// A plane for each pixel with all that the disc reaches beside it would take 5 GB.

@@ -10,7 +10,7 @@ namespace {
 
 using VFontEffect::internal::PixelBuffer;
 
-constexpr int64_t kMostBytes = int64_t{1} << 31;
+constexpr int64_t kMostBytes = int64_t{1} << 32;
 
 template <class T>
 void expectRefusedBeyondTheLimit() {
@@ -22,7 +22,7 @@ void expectRefusedBeyondTheLimit() {
     EXPECT_FALSE(PixelBuffer<T>::uninitialised(INT64_MAX / 2 + 1, 4));
 }
 
-TEST(PixelBuffer, BeyondTwoGigabytes_IsRefusedWhateverAnElementTakes) {
+TEST(PixelBuffer, BeyondFourGigabytes_IsRefusedWhateverAnElementTakes) {
     expectRefusedBeyondTheLimit<uint8_t>();
     expectRefusedBeyondTheLimit<uint16_t>();
     expectRefusedBeyondTheLimit<uint32_t>();
