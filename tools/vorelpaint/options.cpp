@@ -92,7 +92,7 @@ void checkOutput(const Options& options) {
 /// What is wrong with words that nothing was found for: an option, or else a second text.
 std::string faultOf(const std::vector<std::string>& words) {
     const auto option = std::find_if(words.begin(), words.end(),
-                                     [](const std::string& word) { return word.front() == '-'; });
+                                     [](const std::string& word) { return word.rfind('-', 0) == 0; });
     if (option == words.end()) {
         return inQuotes(words.front()) +
                " is one text too many; quotes keep the words of a text together";

@@ -5,6 +5,7 @@
 #include <filesystem>
 #include <system_error>
 
+#include "error.h"
 #include "file_io.h"
 
 namespace vorelpaint {
@@ -20,12 +21,19 @@ constexpr std::array<std::string_view, 44> kOtherKinds{
     "qoi",  "dds",  "exr", "hdr",  "psd",  "xcf",  "svg",   "svgz", "pdf",  "ps",   "eps",
     "apng", "mng",  "mp4", "webm", "html", "json", "jsonl", "txt",  "cpp",  "ttf",  "otf"};
 
-/// The file itself that a path leads to; the path as far as that cannot be told.
-std::string resolved(const std::string& path) {
+/// The file itself that a path without a link at its end leads to; the path as far as that cannot be
+/// told.
+std::string resolved(const fs::path& path) {
     std::error_code error;
     const fs::path whole = fs::absolute(path, error);
-    const fs::path file = fs::weakly_canonical(followLinks(whole), error);
+    const fs::path file = fs::weakly_canonical(whole, error);
     return (error ? whole : file).lexically_normal().string();
+}
+
+/// Whether every job may write there: into a device, a pipe or an open file.
+bool isForAll(const fs::path& path) {
+    std::error_code ignored;
+    return openFileOf(path) || (fs::exists(path, ignored) && !fs::is_regular_file(path, ignored));
 }
 
 }  // namespace
@@ -40,9 +48,14 @@ bool namesOtherKind(std::string_view path) {
 }
 
 std::optional<size_t> OutputNames::claim(const std::string& path, size_t line) {
-    std::error_code ignored;
-    if (fs::exists(path, ignored) && !fs::is_regular_file(path, ignored)) return std::nullopt;
-    const auto [first, isNew] = mLines.try_emplace(resolved(path), line);
+    fs::path target;
+    try {
+        target = followLinks(path);
+    } catch (const ToolError&) {
+        return std::nullopt;  // nothing is written there, and who tries says why
+    }
+    if (isForAll(target)) return std::nullopt;
+    const auto [first, isNew] = mLines.try_emplace(resolved(target), line);
     return isNew ? std::nullopt : std::optional<size_t>(first->second);
 }
 
