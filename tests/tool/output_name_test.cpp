@@ -15,8 +15,8 @@ namespace {
 using vorel_test::TempDir;
 
 TEST(OutputName, OtherKinds_AreToldByTheirEnding) {
-    for (const char* path :
-         {"a.jpg", "a.JPEG", "dir/a.Gif", "a.png.webp", "a.svg", "a.pdf", "look.json", ".txt"})
+    for (const char* path : {"a.jpg", "a.JPEG", "dir/a.Gif", "a.png.webp", "a.svg", "a.pdf", "look.json",
+                             ".txt", "font.ttc"})
         EXPECT_TRUE(namesOtherKind(path)) << path;
 }
 

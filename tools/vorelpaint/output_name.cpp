@@ -7,6 +7,7 @@
 
 #include "error.h"
 #include "file_io.h"
+#include "style/vorelstyle.h"
 
 namespace vorelpaint {
 namespace {
@@ -15,11 +16,12 @@ namespace fs = std::filesystem;
 
 /// Pictures, documents and films; and what the program itself reads and prints, which a forgotten value
 /// would let it overwrite.
-constexpr std::array<std::string_view, 44> kOtherKinds{
-    "jpg",  "jpeg", "jpe", "jfif", "jp2",  "jxl",  "gif",   "webp", "avif", "heic", "heif",
-    "bmp",  "dib",  "ico", "tif",  "tiff", "tga",  "ppm",   "pgm",  "pbm",  "pnm",  "pam",
-    "qoi",  "dds",  "exr", "hdr",  "psd",  "xcf",  "svg",   "svgz", "pdf",  "ps",   "eps",
-    "apng", "mng",  "mp4", "webm", "html", "json", "jsonl", "txt",  "cpp",  "ttf",  "otf"};
+constexpr std::array<std::string_view, 53> kOtherKinds{
+    "jpg",  "jpeg", "jpe", "jfif", "jp2",  "jxl",  "gif",   "webp",  "avif", "heic", "heif",
+    "bmp",  "dib",  "ico", "tif",  "tiff", "tga",  "ppm",   "pgm",   "pbm",  "pnm",  "pam",
+    "qoi",  "dds",  "exr", "hdr",  "psd",  "xcf",  "svg",   "svgz",  "pdf",  "ps",   "eps",
+    "apng", "mng",  "mp4", "webm", "html", "json", "jsonl", "txt",   "cpp",  "ttf",  "otf",
+    "ttc",  "otc",  "pfa", "pfb",  "pcf",  "bdf",  "woff",  "woff2", "md"};
 
 /// The file itself that a path without a link at its end leads to; the path as far as that cannot be
 /// told.
@@ -41,10 +43,9 @@ bool isForAll(const fs::path& path) {
 bool namesOtherKind(std::string_view path) {
     const size_t dot = path.find_last_of("./");
     if (dot == std::string_view::npos || path[dot] != '.') return false;
-    std::string kind(path.substr(dot + 1));
-    std::transform(kind.begin(), kind.end(), kind.begin(),
-                   [](char c) { return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c; });
-    return std::find(kOtherKinds.begin(), kOtherKinds.end(), kind) != kOtherKinds.end();
+    const std::string_view kind = path.substr(dot + 1);
+    return std::any_of(kOtherKinds.begin(), kOtherKinds.end(),
+                       [&](std::string_view other) { return vorelstyle::isSameWord(kind, other); });
 }
 
 std::optional<size_t> OutputNames::claim(const std::string& path, size_t line) {
