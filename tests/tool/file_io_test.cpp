@@ -132,6 +132,17 @@ TEST(FileIo, WriteFile_NameOfAnOpenFileGoesOnInIt) {
     EXPECT_THROW(writeFile("/dev/fd/" + number, writeNew), ToolError) << "it is closed";
 }
 
+TEST(FileIo, StandardOutput_HasMoreNamesThanOne) {
+    const TempDir dir;
+    std::filesystem::create_symlink("/dev/stdout", dir.file("link"));
+    for (const std::string& name :
+         {std::string("-"), std::string("/dev/stdout"), std::string("/dev/fd/1"), dir.file("link")})
+        EXPECT_TRUE(isStandardOutput(name)) << name;
+    for (const char* name :
+         {"", "a", "1", "/dev/fd/2", "/dev/fd/1x", "/dev/fd", "/dev/null", "/dev/fd/"})
+        EXPECT_FALSE(isStandardOutput(name)) << name;
+}
+
 TEST(FileIo, ReadFile_StopsAtTheLimit) {
     const TempDir dir;
     const std::string path = dir.write("a", "12345");

@@ -76,6 +76,10 @@ fs::path followLinks(fs::path path) {
     return path;
 }
 
+bool isStandardOutput(const std::string& path) {
+    return path == "-" || openFileOf(followLinks(path)) == STDOUT_FILENO;
+}
+
 std::string readFile(const std::string& path, size_t maxBytes) {
     const bool standard = path == "-";
     const std::string name = standard ? "standard input" : inQuotes(path);

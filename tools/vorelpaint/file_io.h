@@ -20,6 +20,9 @@ std::optional<int> openFileOf(const std::filesystem::path& path);
 /// where they come by one, as /dev/stdout does. Throws ToolError.
 std::filesystem::path followLinks(std::filesystem::path path);
 
+/// Whether a path, "-" or such as /dev/stdout, is standard output. Throws ToolError.
+bool isStandardOutput(const std::string& path);
+
 /// Lets `write` fill a NewFile, which takes the name `path` when it is whole. The target of a symbolic
 /// link is made or replaced, not the link. "-" is standard output; a device or a pipe is written
 /// directly, and an open file under such a name as /dev/stdout from its place on. Throws ToolError.

@@ -9,6 +9,7 @@
 
 #include "console.h"
 #include "error.h"
+#include "file_io.h"
 #include "help_text.h"
 #include "settings.h"
 #include "style/vorelstyle.h"
@@ -81,7 +82,7 @@ void checkOutput(const Options& options) {
     if (!options.output && !prints) {
         throw ToolError("nowhere to paint: give -o FILE, or -o - for standard output");
     }
-    if (options.output == "-" && prints) {
+    if (prints && options.output && isStandardOutput(*options.output)) {
         throw ToolError("standard output cannot take both the picture and what is printed");
     }
     if (options.output && !options.text && !options.textFile) {
