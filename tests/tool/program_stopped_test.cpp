@@ -41,7 +41,8 @@ int stopsAskedFor() {
 }
 
 const int kRounds = stopsAskedFor();
-const int kMostRounds = 20 * kRounds;  ///< on a machine where the signal often comes too late
+const int kMostRounds =
+    std::max(200, 20 * kRounds);  ///< on a machine where the signal often comes too late
 
 /// Every signal that ends a program by default and that a program can do something about, but the two
 /// that are errors of writing here. Those of real time behave like the first of them.
