@@ -17,9 +17,10 @@ bool ordersLines(uint32_t code) {
            (code >= 0x2066 && code <= 0x2069);
 }
 
-std::string inHexadecimal(const char* format, uint32_t number) {
-    std::array<char, 16> text{};
-    std::snprintf(text.data(), text.size(), format, number);
+std::string inHexadecimal(char byte) {
+    std::array<char, 4> text{};
+    std::snprintf(text.data(), text.size(), "%02X",
+                  static_cast<unsigned int>(static_cast<uint8_t>(byte)));
     return text.data();
 }
 
@@ -30,11 +31,11 @@ std::string printable(std::string_view text) {
     for (size_t at = 0; at < text.size();) {
         const auto [code, length] = vorelunicode::decodeAt(text, at);
         if (length == 0) {
-            safe += inHexadecimal("<%02X>", static_cast<uint8_t>(text[at]));
+            safe += "<" + inHexadecimal(text[at]) + ">";
         } else if (code < 0x20 || code == 0x7F) {
             safe += ' ';
         } else if (vorelunicode::isControl(code) || ordersLines(code)) {
-            safe += inHexadecimal("<U+%04X>", code);
+            safe += "<" + vorelunicode::nameOf(code) + ">";
         } else {
             safe += text.substr(at, length);
         }

@@ -18,6 +18,10 @@ bool areSame(char one, char other) {
 
 }  // namespace
 
+bool isSameWord(std::string_view one, std::string_view other) {
+    return std::equal(one.begin(), one.end(), other.begin(), other.end(), areSame);
+}
+
 size_t editDistance(std::string_view one, std::string_view other) {
     // Rows of the table of distances between beginnings of the words: the one being filled and two
     // before.

@@ -9,6 +9,9 @@
 /// The name that was probably meant by one that is misspelt.
 namespace vorelstyle {
 
+/// Whether two words are the same but for the case of ASCII.
+bool isSameWord(std::string_view one, std::string_view other);
+
 /// How many letters of a word have to be put in, left out, replaced or swapped with their neighbour for
 /// the other one, without regard to the case of ASCII.
 size_t editDistance(std::string_view one, std::string_view other);

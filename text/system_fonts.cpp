@@ -4,7 +4,10 @@
 
 #include <algorithm>
 #include <array>
+#include <map>
 #include <memory>
+#include <sstream>
+#include <string>
 #include <string_view>
 #include <vector>
 
@@ -31,11 +34,13 @@ const FcChar8* fcText(const std::string& text) {
 /// Names that stand for whatever family the system prefers.
 constexpr std::array<std::string_view, 4> kGenericFamilies{"sans-serif", "sans", "serif", "monospace"};
 
+bool areSame(std::string_view one, std::string_view other) {
+    return FcStrCmpIgnoreCase(fcText(std::string(one)), fcText(std::string(other))) == 0;
+}
+
 bool isGeneric(std::string_view family) {
-    for (const std::string_view generic : kGenericFamilies) {
-        if (family == generic) return true;
-    }
-    return false;
+    return std::any_of(kGenericFamilies.begin(), kGenericFamilies.end(),
+                       [&](std::string_view generic) { return areSame(family, generic); });
 }
 
 /// fontconfig answers every request with its nearest font; only one of the family asked for counts.
@@ -90,13 +95,11 @@ bool isKnown(const std::string& property) {
 }
 
 /// fontconfig reads past what it does not know, and a regular font would stand for a misspelt bold.
-void refuseWhatIsNotKnown(const std::string& request) {
-    std::vector<std::string> parts = partsOf(request);
-    const size_t size = sizeIn(parts.front());
-    if (size != std::string::npos && !isGeneric(parts.front())) {
-        fail(request, "'" + parts.front().substr(size) +
-                          "' is no part of a family; a style stands behind a colon, as in "
-                          "'DejaVu Sans:bold', and a name's own dash behind a backslash");
+void refuseWhatIsNotKnown(const std::string& request, const std::vector<std::string>& parts) {
+    if (sizeIn(parts.front()) != std::string::npos && !isGeneric(parts.front())) {
+        throw TextError("no font file or family '" + request +
+                        "'; a style stands behind a colon, as in 'DejaVu Sans:bold', and a name's own "
+                        "dash behind a backslash");
     }
     for (size_t i = 1; i < parts.size(); ++i) {
         if (!parts[i].empty() && !isKnown(parts[i])) {
@@ -129,14 +132,52 @@ bool isListed(FcConfig* config, FcPattern* wanted, const FcPattern* font) {
                        [&](const FcPattern* each) { return isSameFace(each, font); });
 }
 
-/// Whether a font that was found for `wanted` has its style and its other properties. Few families have
-/// both an italic and an oblique face: each stands for the other.
-bool hasProperties(FcConfig* config, const FcPattern* wanted, const FcPattern* font) {
+/// Whether a font's name of its style has this word: "Condensed Bold" has "bold". In "Semi Bold" the
+/// word says something else.
+bool isNamed(const FcPattern* font, const std::string& word) {
+    constexpr std::array<std::string_view, 4> kDegrees{"semi", "demi", "extra", "ultra"};
+    FcChar8* style = nullptr;
+    for (int i = 0; FcPatternGetString(font, FC_STYLE, i, &style) == FcResultMatch; ++i) {
+        std::istringstream words(reinterpret_cast<const char*>(style));
+        bool isFull = true;
+        for (std::string each; words >> each;) {
+            if (isFull && areSame(each, word)) return true;
+            isFull = std::none_of(kDegrees.begin(), kDegrees.end(),
+                                  [&](std::string_view degree) { return areSame(each, degree); });
+        }
+    }
+    return false;
+}
+
+/// Takes out of a request, whose properties are `properties`, what a font's own name of its style says.
+/// Many a face that is named "Book" is regular by its numbers, and "Condensed" semi-condensed:
+/// fontconfig means other numbers by these words.
+void dropWhatIsNamed(FcPattern* exact, const std::vector<std::string>& properties,
+                     const FcPattern* font) {
+    std::map<std::string, bool> isEachNamed;
+    for (const std::string& word : properties) {
+        const size_t equals = word.find('=');
+        if (equals != std::string::npos) isEachNamed[word.substr(0, equals)] = false;
+        const FcConstant* const constant = FcNameGetConstant(fcText(word));
+        if (constant == nullptr) continue;
+        const auto [object, isNew] = isEachNamed.try_emplace(constant->object, true);
+        object->second = object->second && isNamed(font, word);
+    }
+    for (const auto& [object, isDropped] : isEachNamed) {
+        if (isDropped) FcPatternDel(exact, object.c_str());
+    }
+}
+
+/// Whether a font that was found for `wanted` has its style and its other `properties`. Few families
+/// have both an italic and an oblique face: each stands for the other.
+bool hasProperties(FcConfig* config, const FcPattern* wanted, const std::vector<std::string>& properties,
+                   const FcPattern* font) {
     const FontPattern exact(FcPatternDuplicate(wanted));
     FcChar8* family = nullptr;
     if (!exact || FcPatternGetString(font, FC_FAMILY, 0, &family) != FcResultMatch) return false;
     FcPatternDel(exact.get(), FC_FAMILY);  // a generic one is no font's own
     FcPatternAddString(exact.get(), FC_FAMILY, family);
+    dropWhatIsNamed(exact.get(), properties, font);
     if (isListed(config, exact.get(), font)) return true;
     int slant = FC_SLANT_ROMAN;
     FcPatternGetInteger(exact.get(), FC_SLANT, 0, &slant);
@@ -159,7 +200,8 @@ SystemFonts::~SystemFonts() = default;
 
 FontFile SystemFonts::find(const std::string& request) const {
     const TextError noSuchFont("no font file or family '" + request + "'");
-    refuseWhatIsNotKnown(request);
+    const std::vector<std::string> parts = partsOf(request);
+    refuseWhatIsNotKnown(request, parts);
     FcConfig* const config = mConfig->fonts.get();
     const FontPattern wanted(FcNameParse(fcText(request)));
     if (config == nullptr || !wanted) throw noSuchFont;
@@ -174,7 +216,7 @@ FontFile SystemFonts::find(const std::string& request) const {
     FcResult result = FcResultNoMatch;
     const FontPattern font(FcFontMatch(config, completed.get(), &result));
     if (!font || !hasFamily(font.get(), fcText(family))) throw noSuchFont;
-    if (!hasProperties(config, wanted.get(), font.get())) {
+    if (!hasProperties(config, wanted.get(), {parts.begin() + 1, parts.end()}, font.get())) {
         fail(request, "the family is there, but no face of it is as asked for");
     }
     FcChar8* file = nullptr;

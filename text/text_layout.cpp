@@ -7,9 +7,7 @@
 
 #include <algorithm>
 #include <cstdlib>
-#include <iomanip>
 #include <memory>
-#include <sstream>
 #include <string>
 
 #include "text/error.h"
@@ -48,10 +46,8 @@ bool endsLine(uint32_t code) {
 }
 
 [[noreturn]] void refuseControl(uint32_t code, size_t line, size_t character) {
-    std::ostringstream fault;
-    fault << "the text has the control character U+" << std::hex << std::uppercase << std::setfill('0')
-          << std::setw(4) << code << std::dec << " in line " << line << ", character " << character;
-    throw TextError(fault.str());
+    throw TextError("the text has the control character " + vorelunicode::nameOf(code) + " in line " +
+                    std::to_string(line) + ", character " + std::to_string(character));
 }
 
 /// Cuts at line ends, of which CR LF is one; tabs become blanks.

@@ -1,7 +1,10 @@
 #pragma once
 
+#include <array>
 #include <cstddef>
 #include <cstdint>
+#include <cstdio>
+#include <string>
 #include <string_view>
 
 /// Code points and their bytes, for the rooms that read text or show it.
@@ -36,6 +39,13 @@ inline Decoded decodeAt(std::string_view text, size_t at) {
 /// Line feeds and tabs too.
 constexpr bool isControl(uint32_t code) {
     return code < 0x20 || (code >= 0x7F && code < 0xA0);
+}
+
+/// "U+202E".
+inline std::string nameOf(uint32_t code) {
+    std::array<char, 16> name{};
+    std::snprintf(name.data(), name.size(), "U+%04X", static_cast<unsigned int>(code));
+    return name.data();
 }
 
 }  // namespace vorelunicode

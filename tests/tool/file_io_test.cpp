@@ -1,8 +1,12 @@
 #include "file_io.h"
 
 #include <gtest/gtest.h>
+#include <unistd.h>
 
+#include <cstdio>
 #include <filesystem>
+#include <string>
+#include <vector>
 
 #include "error.h"
 #include "program.h"
@@ -106,6 +110,37 @@ TEST(FileIo, WriteFile_DeviceWithoutSpaceIsReported) {
     } catch (const ToolError& error) {
         EXPECT_STREQ(error.what(), "cannot write '/dev/full': No space left on device");
     }
+}
+
+TEST(FileIo, WriteFile_NameOfAnOpenFileGoesOnInIt) {
+    const TempDir dir;
+    const std::string path = dir.file("open");
+    std::FILE* open = std::fopen(path.c_str(), "wb");
+    ASSERT_NE(open, nullptr);
+    std::fputs("begun, ", open);
+    std::fflush(open);
+    const std::string number = std::to_string(::fileno(open));
+    writeFile("/dev/fd/" + number, writeNew);
+    std::filesystem::create_symlink("/proc/self/fd/" + number, dir.file("link"));
+    writeFile(dir.file("link"), writeNew);
+    EXPECT_EQ(readBytes(path), "begun, newnew");
+    std::filesystem::remove(path);
+    writeFile("/dev/fd/" + number, writeNew);
+    EXPECT_EQ(::lseek(::fileno(open), 0, SEEK_CUR), 7 + 3 * 3) << "it has no name any more";
+    std::fclose(open);
+    EXPECT_EQ(dir.list(), std::vector<std::string>{"link"});
+    EXPECT_THROW(writeFile("/dev/fd/" + number, writeNew), ToolError) << "it is closed";
+}
+
+TEST(FileIo, StandardOutput_HasMoreNamesThanOne) {
+    const TempDir dir;
+    std::filesystem::create_symlink("/dev/stdout", dir.file("link"));
+    for (const std::string& name :
+         {std::string("-"), std::string("/dev/stdout"), std::string("/dev/fd/1"), dir.file("link")})
+        EXPECT_TRUE(isStandardOutput(name)) << name;
+    for (const char* name :
+         {"", "a", "1", "/dev/fd/2", "/dev/fd/1x", "/dev/fd", "/dev/null", "/dev/fd/"})
+        EXPECT_FALSE(isStandardOutput(name)) << name;
 }
 
 TEST(FileIo, ReadFile_StopsAtTheLimit) {

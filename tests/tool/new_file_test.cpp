@@ -151,6 +151,41 @@ TEST_P(NewFiles, NameMayBeAsLongAsTheSystemAllows) {
     EXPECT_EQ(mDir.list(), Words{name});
 }
 
+TEST_P(NewFiles, ThatFindNoSpaceWhenTheyAreClosedLeaveNothing) {
+    const std::string path = mDir.file("a");
+    EXPECT_EXIT(
+        {
+            try {
+                write(path, vorel_test::refuseToClose);
+            } catch (const ToolError& error) {
+                std::fputs(error.what(), stderr);
+            }
+            ::_exit(0);
+        },
+        ::testing::ExitedWithCode(0), "cannot write '.*/a': No space left on device");
+    EXPECT_TRUE(mDir.list().empty());
+}
+
+TEST_P(NewFiles, GiveNobodyTheRightsOfTheirOwner) {
+    const std::string path = mDir.write("a", "old");
+    ASSERT_EQ(::chmod(path.c_str(), 06755), 0);
+    write(path);
+    EXPECT_EQ(permissionsOf(path), perms{0755});
+}
+
+TEST_P(NewFiles, KeepTheOwnerOfTheOlderOne) {
+    if (::geteuid() != 0) GTEST_SKIP() << "none but root gives files away";
+    const std::string path = mDir.write("a", "old");
+    ASSERT_EQ(::chown(path.c_str(), 1, 2), 0);
+    ASSERT_EQ(::chmod(path.c_str(), 0640), 0);
+    write(path);
+    struct stat status {};
+    ASSERT_EQ(::stat(path.c_str(), &status), 0);
+    EXPECT_EQ(status.st_uid, 1U);
+    EXPECT_EQ(status.st_gid, 2U);
+    EXPECT_EQ(permissionsOf(path), perms{0640});
+}
+
 INSTANTIATE_TEST_SUITE_P(Kinds, NewFiles,
                          ::testing::Values(NewFile::Kind::unnamed, NewFile::Kind::named));
 

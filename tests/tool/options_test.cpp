@@ -80,6 +80,11 @@ TEST(Options, SecondText_IsNamed) {
               "'upon' is one text too many; quotes keep the words of a text together");
 }
 
+TEST(Options, EmptySecondText_IsNamed) {
+    EXPECT_EQ(faultOf({"A", ""}), "'' is one text too many; quotes keep the words of a text together");
+    EXPECT_EQ(faultOf({"A", "", "--szie"}), "no option '--szie'; did you mean --size?");
+}
+
 TEST(Options, EmptyNames_AreGivenNames) {
     EXPECT_EQ(optionsOf({"--style", "", "A"}).style, "");
     EXPECT_EQ(optionsOf({"--preset", "", "A"}).preset, "");

@@ -1,7 +1,9 @@
 #include "output_name.h"
 
 #include <gtest/gtest.h>
+#include <unistd.h>
 
+#include <cstdio>
 #include <filesystem>
 #include <string>
 
@@ -13,8 +15,8 @@ namespace {
 using vorel_test::TempDir;
 
 TEST(OutputName, OtherKinds_AreToldByTheirEnding) {
-    for (const char* path :
-         {"a.jpg", "a.JPEG", "dir/a.Gif", "a.png.webp", "a.svg", "a.pdf", "look.json", ".txt"})
+    for (const char* path : {"a.jpg", "a.JPEG", "dir/a.Gif", "a.png.webp", "a.svg", "a.pdf", "look.json",
+                             ".txt", "font.ttc"})
         EXPECT_TRUE(namesOtherKind(path)) << path;
 }
 
@@ -66,6 +68,22 @@ TEST_F(Claims, Links_LeadToTheirFile) {
     mDir.write("real/a.png", "");
     EXPECT_EQ(claim(mDir.file("picture.png"), 4), 1U);
     EXPECT_EQ(claim(mDir.file("linked/a.png"), 5), 1U);
+}
+
+TEST_F(Claims, LinksInACircle_AreLeftToTheWriter) {
+    std::filesystem::create_symlink("circle", mDir.file("circle"));
+    EXPECT_FALSE(claim(mDir.file("circle"), 1));
+    EXPECT_FALSE(claim(mDir.file("circle/a.png"), 2));
+}
+
+TEST_F(Claims, OpenFiles_AreForAll) {
+    const std::string path = mDir.file("open");
+    std::FILE* open = std::fopen(path.c_str(), "wb");
+    ASSERT_NE(open, nullptr);
+    const std::string name = "/dev/fd/" + std::to_string(::fileno(open));
+    EXPECT_FALSE(claim(name, 1));
+    EXPECT_FALSE(claim(name, 2));
+    std::fclose(open);
 }
 
 TEST_F(Claims, Devices_AreForAll) {

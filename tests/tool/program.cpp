@@ -62,24 +62,30 @@ void redirect(int descriptor, const std::string& path, int flags) {
     ::close(file);
 }
 
+/// From now on this program answers system calls of this process.
+template <size_t kSteps>
+void answerSystemCalls(std::array<sock_filter, kSteps> code) {
+    const sock_fprog program{static_cast<unsigned short>(kSteps), code.data()};
+    if (::prctl(PR_SET_NO_NEW_PRIVS, 1, 0, 0, 0) != 0 ||
+        ::prctl(PR_SET_SECCOMP, SECCOMP_MODE_FILTER, &program) != 0) {
+        ::_exit(127);
+    }
+}
+
+constexpr auto kCallNumber = static_cast<unsigned int>(offsetof(seccomp_data, nr));
+
 /// From now on openat answers as a file system without unnamed files does.
 void refuseUnnamedFiles() {
-    constexpr auto kNumber = static_cast<unsigned int>(offsetof(seccomp_data, nr));
     constexpr auto kFlags = static_cast<unsigned int>(offsetof(seccomp_data, args) + 2 * sizeof(__u64));
     constexpr unsigned int kUnnamed = static_cast<unsigned int>(O_TMPFILE) & ~unsigned{O_DIRECTORY};
-    std::array<sock_filter, 6> code{{
-        BPF_STMT(BPF_LD | BPF_W | BPF_ABS, kNumber),
+    answerSystemCalls<6>({{
+        BPF_STMT(BPF_LD | BPF_W | BPF_ABS, kCallNumber),
         BPF_JUMP(BPF_JMP | BPF_JEQ | BPF_K, SYS_openat, 0, 3),
         BPF_STMT(BPF_LD | BPF_W | BPF_ABS, kFlags),
         BPF_JUMP(BPF_JMP | BPF_JSET | BPF_K, kUnnamed, 0, 1),
         BPF_STMT(BPF_RET | BPF_K, SECCOMP_RET_ERRNO | EOPNOTSUPP),
         BPF_STMT(BPF_RET | BPF_K, SECCOMP_RET_ALLOW),
-    }};
-    const sock_fprog program{static_cast<unsigned short>(code.size()), code.data()};
-    if (::prctl(PR_SET_NO_NEW_PRIVS, 1, 0, 0, 0) != 0 ||
-        ::prctl(PR_SET_SECCOMP, SECCOMP_MODE_FILTER, &program) != 0) {
-        ::_exit(127);
-    }
+    }});
 }
 
 /// Makes them those of this process.
@@ -224,6 +230,15 @@ int RunningVorelpaint::wait() {
     ::waitpid(mChild, &status, 0);
     mChild = -1;
     return status;
+}
+
+void refuseToClose() {
+    answerSystemCalls<4>({{
+        BPF_STMT(BPF_LD | BPF_W | BPF_ABS, kCallNumber),
+        BPF_JUMP(BPF_JMP | BPF_JEQ | BPF_K, SYS_close, 0, 1),
+        BPF_STMT(BPF_RET | BPF_K, SECCOMP_RET_ERRNO | ENOSPC),
+        BPF_STMT(BPF_RET | BPF_K, SECCOMP_RET_ALLOW),
+    }});
 }
 
 Outcome runVorelpaintInto(const std::string& outPath, const std::vector<std::string>& arguments) {

@@ -76,4 +76,7 @@ class RunningVorelpaint {
 /// The same with standard output going to `outPath`.
 Outcome runVorelpaintInto(const std::string& outPath, const std::vector<std::string>& arguments);
 
+/// From now on every file that this process closes answers that there is no space left.
+void refuseToClose();
+
 }  // namespace vorel_test

@@ -149,6 +149,17 @@ TEST_F(BatchProgram, TwoJobsWithOneOutput_ArePaintedByNone) {
     EXPECT_TRUE(mDir.list().empty());
 }
 
+TEST_F(BatchProgram, OutputThatIsALinkToItself_FailsAlone) {
+    std::filesystem::create_symlink("circle", mInputs.file("circle"));
+    const std::string circle = mInputs.file("circle");
+    const Outcome outcome =
+        run(R"({"text": "A", "output": ")" + circle + "\"}\n" + job("a.png", R"("text": "A")"));
+    EXPECT_EQ(outcome.exitCode, 2);
+    EXPECT_EQ(outcome.err, "vorelpaint: line 1: cannot write '" + circle +
+                               "': too many links\nvorelpaint: 1 of 2 jobs failed\n");
+    EXPECT_EQ(mDir.list(), Words{"a.png"});
+}
+
 TEST_F(BatchProgram, SecondJobOfAnOutput_IsRefusedInAPipe) {
     const std::string jobs =
         mInputs.write("jobs.jsonl", job("a.png", R"("text": "A")") + job("a.png", R"("text": "B")"));

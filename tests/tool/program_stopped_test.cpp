@@ -1,9 +1,11 @@
 #include <gtest/gtest.h>
 #include <sys/wait.h>
 
+#include <algorithm>
 #include <array>
 #include <chrono>
 #include <csignal>
+#include <cstdlib>
 #include <filesystem>
 #include <random>
 #include <string>
@@ -28,8 +30,19 @@ using vorel_test::TempDir;
 using Clock = std::chrono::steady_clock;
 using Words = std::vector<std::string>;
 
-const int kRounds = vorel_test::thinned(10);
-constexpr int kMostRounds = 200;  ///< on a machine where the signal often comes too late
+/// Between two looks whether a program writes: short beside the writing, long beside a look.
+constexpr std::chrono::microseconds kLook{200};
+
+/// How often each signal stops each program: a few times, for all signals take one way, and VOREL_STOPS
+/// times to look for what is rare.
+int stopsAskedFor() {
+    const char* asked = std::getenv("VOREL_STOPS");
+    return asked != nullptr ? std::max(1, std::atoi(asked)) : vorel_test::thinned(3);
+}
+
+const int kRounds = stopsAskedFor();
+const int kMostRounds =
+    std::max(200, 20 * kRounds);  ///< on a machine where the signal often comes too late
 
 /// Every signal that ends a program by default and that a program can do something about, but the two
 /// that are errors of writing here. Those of real time behave like the first of them.
@@ -39,8 +52,9 @@ const std::array<int, 23> kEndingSignals{SIGHUP,    SIGINT,  SIGTERM,   SIGQUIT,
                                          SIGILL,    SIGBUS,  SIGRTMIN,  SIGRTMAX, SIGRTMIN + 5};
 
 /// Small text in much room: soon painted, and then a while in the writing.
-Words roomy(Words arguments) {
-    arguments.insert(arguments.begin(), {"--font", VOREL_TEST_FONT, "--size", "30", "--padding", "300"});
+Words roomy(Words arguments, const char* padding = "300") {
+    arguments.insert(arguments.begin(),
+                     {"--font", VOREL_TEST_FONT, "--size", "30", "--padding", padding});
     return arguments;
 }
 
@@ -81,7 +95,7 @@ class StoppedProgram : public ::testing::TestWithParam<std::tuple<int, bool>> {
                 ADD_FAILURE() << "nothing was written";
                 return false;
             }
-            std::this_thread::yield();
+            std::this_thread::sleep_for(kLook);
         }
         std::this_thread::sleep_for(std::chrono::microseconds(mDelay(mRandom)));
         program.send(signal());
@@ -107,7 +121,8 @@ TEST_P(StoppedProgram, LeavesNoHalfWrittenPicture) {
 }
 
 TEST_P(StoppedProgram, LeavesNoHalfWrittenSheet) {
-    expectOnlyWholePictures(roomy({"--sheet", "-o", mDir.file("a.png"), "Ag"}));
+    // A sheet has this room around each of its looks.
+    expectOnlyWholePictures(roomy({"--sheet", "-o", mDir.file("a.png"), "Ag"}, "60"));
 }
 
 TEST_P(StoppedProgram, LeavesOnlyTheWholePicturesOfABatch) {
@@ -137,7 +152,7 @@ TEST_P(WritingProgram, GoesOnAfterTheSignalsThatAreErrorsOfWriting) {
         const std::string path = mDir.file("a.png");
         RunningVorelpaint program(roomy({"-o", path, "Grains"}), surroundings());
         while (!program.isWritingIn(mDir.path()) && !program.hasEnded())
-            std::this_thread::yield();
+            std::this_thread::sleep_for(kLook);
         program.send(number);
         EXPECT_EQ(program.wait(), 0);
         EXPECT_NO_THROW(readPng(path));

@@ -233,6 +233,7 @@ TEST_F(Program, ContradictoryArguments_FailInOneLine) {
     expectFailure({"--text-file", "-", "A"}, "--text-file");
     expectFailure({"--style", "a", "--preset", "gold", "A"}, "--preset");
     expectFailure({"-o", "-", "--print-key", "A"}, "standard output");
+    expectFailure({"-o", "/dev/stdout", "--print-key", "A"}, "standard output");
     expectFailure({}, "give TEXT");
     EXPECT_EQ(runVorelpaint({"A"}).exitCode, 2) << "no output named";
 }

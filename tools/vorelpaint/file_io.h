@@ -4,6 +4,7 @@
 #include <cstdio>
 #include <filesystem>
 #include <functional>
+#include <optional>
 #include <string>
 
 namespace vorelpaint {
@@ -12,12 +13,19 @@ namespace vorelpaint {
 /// longer than `maxBytes`.
 std::string readFile(const std::string& path, size_t maxBytes);
 
-/// The path that the symbolic links of a path lead to, which may not be there yet. Throws ToolError.
+/// The open file of this process, by its number, whose name a path is: /dev/fd/3.
+std::optional<int> openFileOf(const std::filesystem::path& path);
+
+/// The path that the symbolic links of a path lead to, which may not be there yet; that of an open file
+/// where they come by one, as /dev/stdout does. Throws ToolError.
 std::filesystem::path followLinks(std::filesystem::path path);
+
+/// Whether a path, "-" or such as /dev/stdout, is standard output. Throws ToolError.
+bool isStandardOutput(const std::string& path);
 
 /// Lets `write` fill a NewFile, which takes the name `path` when it is whole. The target of a symbolic
 /// link is made or replaced, not the link. "-" is standard output; a device or a pipe is written
-/// directly. Throws ToolError.
+/// directly, and an open file under such a name as /dev/stdout from its place on. Throws ToolError.
 void writeFile(const std::string& path, const std::function<void(std::FILE*)>& write);
 
 }  // namespace vorelpaint

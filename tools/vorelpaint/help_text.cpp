@@ -42,29 +42,23 @@ const std::vector<Note>& notes() {
     static const std::vector<Note> all{
         {"Style files",
          "A style file is a JSON object with one object per effect (outerShadow, innerShadow, "
-         "outerGlow, "
-         "innerGlow, linearGradient, radialGradient, stroke, pattern, text, bevel, emboss); the last "
-         "lies "
-         "on top. The presets are style files to start from. Where they and the page of every key lie "
-         "stands under Files."},
+         "outerGlow, innerGlow, linearGradient, radialGradient, stroke, pattern, text, bevel, "
+         "emboss); the last lies on top. The presets are style files to start from. Where they "
+         "and the page of every key lie stands under Files."},
         {"Fonts",
          "A font is a file, or a family that fontconfig knows, with styles and properties behind "
-         "colons: "
-         "'DejaVu Sans:bold:italic', 'DejaVu Sans:weight=200'. A style that is misspelt, or that no "
-         "face "
-         "of the family has, is refused; italic and oblique stand for each other."},
+         "colons: 'DejaVu Sans:bold:italic', 'DejaVu Sans:weight=200'. A style that is misspelt, "
+         "or that no face of the family has, is refused; italic and oblique stand for each other."},
         {"Batches",
          "Each line of a batch is a JSON object with the keys of one picture: " + jobKeys() +
-             ". They mean what the options of these names mean; style may also be a style itself. What "
-             "a "
-             "job does not say, it takes from the command line. Paths start at the working directory. A "
-             "line that fails is reported with its number, and the next one goes on. When two jobs have "
-             "one output, nothing is painted."},
+             ". They mean what the options of these names mean; style may also be a style itself. "
+             "What a job does not say, it takes from the command line. Paths start at the working "
+             "directory. A line that fails is reported with its number, and the next one goes on. "
+             "When two jobs have one output, nothing is painted."},
         {"Text",
-         "Text is UTF-8; text that begins with - stands behind --. A line ends with LF, CR, CR LF, or "
-         "one "
-         "of U+0085, U+2028 and U+2029; a tab is painted as a blank. Any other control character is "
-         "refused, with its place."},
+         "Text is UTF-8; text that begins with - stands behind --. A line ends with LF, CR, CR "
+         "LF, or one of U+0085, U+2028 and U+2029; a tab is painted as a blank. Any other control "
+         "character is refused, with its place."},
         {"Limits", "A picture has at most " + std::to_string(TextLayout::kMaxSide) +
                        " pixels on a side and " + std::to_string(voreltext::kMaxPixels) +
                        " in all; a pattern's picture has at most " + std::to_string(kMaxPatternSide) +
@@ -73,19 +67,21 @@ const std::vector<Note>& notes() {
                        " and a line of a batch " + std::to_string(kMaxJobBytes) + "."},
         {"Colours", "#RGB is short for #RRGGBB with twice the same digits: #F80 is #FF8800."},
         {"Files",
-         "Where the program is installed, in /usr for a package: share/doc/vorelpaint/style-files.md "
-         "lists every key of a style file, share/doc/vorelpaint/vorelpaint.md tells of batches and "
-         "reports, share/voreleffect/presets has the presets, and "
+         "Where the program is installed, in /usr for a package: "
+         "share/doc/vorelpaint/style-files.md lists every key of a style file, "
+         "share/doc/vorelpaint/vorelpaint.md tells of batches and reports, "
+         "share/voreleffect/presets has the presets, and "
          "share/voreleffect/vorelpaint-style.schema.json tells editors what a style file may hold."},
         {"Exit codes",
-         "0 done. 2 failed, with one line on standard error; after a batch, with one for each job that "
-         "failed and their count. A reader that went away is a failure of writing like any other."},
+         "0 done. 2 failed, with one line on standard error; after a batch, with one for each job "
+         "that failed and their count. A reader that went away is a failure of writing like any "
+         "other."},
         {"Interruption",
-         "A picture takes its name when it is whole: whatever signal ends the program, no half-written "
-         "one is left and an older one stays. Only SIGKILL and a loss of power can leave something: on "
-         "a file system without unnamed files (O_TMPFILE), such as NFS or FAT, the begun picture as "
-         ".vorelpaint.XXXXXX in its directory; on others, in the instant in which an older picture is "
-         "replaced, the whole new one under such a name."}};
+         "A picture takes its name when it is whole: whatever signal ends the program, no "
+         "half-written one is left and an older one stays. Only SIGKILL and a loss of power can "
+         "leave something: on a file system without unnamed files (O_TMPFILE), such as NFS or "
+         "FAT, the begun picture as .vorelpaint.XXXXXX in its directory; on others, in the "
+         "instant in which an older picture is replaced, the whole new one under such a name."}};
     return all;
 }
 

@@ -21,13 +21,22 @@ std::string passingName(const fs::path& target) {
     return (target.parent_path() / ".vorelpaint.").string();
 }
 
-/// A replaced file's permissions stay; a new file has what the process's mask allows.
-mode_t modeFor(const fs::path& target) {
+/// Gives a file, which was made private, to the owner and the group of the one that it replaces, as far
+/// as this process may, with the permissions of that one; a new file has what the process's mask allows.
+/// The right to act as the owner is not taken over: it would be that of whoever owns the file now.
+void takePlaceOf(const fs::path& target, int descriptor) {
+    constexpr mode_t kPermissions = S_IRWXU | S_IRWXG | S_IRWXO;
     struct stat replaced {};
-    if (::stat(target.c_str(), &replaced) == 0) return replaced.st_mode & 07777;
-    const mode_t mask = ::umask(0);
-    ::umask(mask);
-    return 0666 & ~mask;
+    if (::stat(target.c_str(), &replaced) != 0) {
+        const mode_t mask = ::umask(0);
+        ::umask(mask);
+        ::fchmod(descriptor, 0666 & ~mask);
+        return;
+    }
+    // The group first: who has given a file away may not choose its group.
+    [[maybe_unused]] int given = ::fchown(descriptor, static_cast<uid_t>(-1), replaced.st_gid);
+    given = ::fchown(descriptor, replaced.st_uid, static_cast<gid_t>(-1));
+    ::fchmod(descriptor, replaced.st_mode & kPermissions);
 }
 
 /// Where the system shows an open file under a name that a file without one can be linked from.
@@ -44,10 +53,9 @@ void removeKeepingErrno(const std::string& name) {
 }  // namespace
 
 NewFile::NewFile(fs::path target, Kind kind) : mTarget(std::move(target)) {
-    const mode_t mode = modeFor(mTarget);
     int descriptor = kind == Kind::unnamed ? openUnnamed() : -1;
     if (descriptor < 0) descriptor = openNamed();
-    ::fchmod(descriptor, mode);  // it was made private
+    takePlaceOf(mTarget, descriptor);
     mFile.reset(::fdopen(descriptor, "wb"));
     if (mFile) return;
     const int fault = errno;
@@ -84,16 +92,19 @@ int NewFile::openNamed() {
     const int descriptor = ::mkstemp(name.data());
     if (descriptor < 0) fail();
     setUnfinishedFile(name);
-    mPassingName = name;
+    mPassingName = std::move(name);
     return descriptor;
 }
 
+/// Some file systems report only when a file is closed that there is no space. An unnamed one must stay
+/// open until it has its name; its twin is closed before.
 void NewFile::finish() {
     if (kind() == Kind::unnamed) {
+        const int twin = ::dup(::fileno(mFile.get()));
+        if (twin < 0 || ::close(twin) != 0) fail();
         link();
         mFile.reset();
     } else {
-        // Some file systems report only now that there is no space.
         if (std::fclose(mFile.release()) != 0) fail();
         rename();
     }

@@ -9,6 +9,7 @@
 
 #include "console.h"
 #include "error.h"
+#include "file_io.h"
 #include "help_text.h"
 #include "settings.h"
 #include "style/vorelstyle.h"
@@ -81,7 +82,7 @@ void checkOutput(const Options& options) {
     if (!options.output && !prints) {
         throw ToolError("nowhere to paint: give -o FILE, or -o - for standard output");
     }
-    if (options.output == "-" && prints) {
+    if (prints && options.output && isStandardOutput(*options.output)) {
         throw ToolError("standard output cannot take both the picture and what is printed");
     }
     if (options.output && !options.text && !options.textFile) {
@@ -92,7 +93,7 @@ void checkOutput(const Options& options) {
 /// What is wrong with words that nothing was found for: an option, or else a second text.
 std::string faultOf(const std::vector<std::string>& words) {
     const auto option = std::find_if(words.begin(), words.end(),
-                                     [](const std::string& word) { return word.front() == '-'; });
+                                     [](const std::string& word) { return word.rfind('-', 0) == 0; });
     if (option == words.end()) {
         return inQuotes(words.front()) +
                " is one text too many; quotes keep the words of a text together";

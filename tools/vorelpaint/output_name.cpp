@@ -5,7 +5,9 @@
 #include <filesystem>
 #include <system_error>
 
+#include "error.h"
 #include "file_io.h"
+#include "style/vorelstyle.h"
 
 namespace vorelpaint {
 namespace {
@@ -14,18 +16,26 @@ namespace fs = std::filesystem;
 
 /// Pictures, documents and films; and what the program itself reads and prints, which a forgotten value
 /// would let it overwrite.
-constexpr std::array<std::string_view, 44> kOtherKinds{
-    "jpg",  "jpeg", "jpe", "jfif", "jp2",  "jxl",  "gif",   "webp", "avif", "heic", "heif",
-    "bmp",  "dib",  "ico", "tif",  "tiff", "tga",  "ppm",   "pgm",  "pbm",  "pnm",  "pam",
-    "qoi",  "dds",  "exr", "hdr",  "psd",  "xcf",  "svg",   "svgz", "pdf",  "ps",   "eps",
-    "apng", "mng",  "mp4", "webm", "html", "json", "jsonl", "txt",  "cpp",  "ttf",  "otf"};
+constexpr std::array<std::string_view, 53> kOtherKinds{
+    "jpg",  "jpeg", "jpe", "jfif", "jp2",  "jxl",  "gif",   "webp",  "avif", "heic", "heif",
+    "bmp",  "dib",  "ico", "tif",  "tiff", "tga",  "ppm",   "pgm",   "pbm",  "pnm",  "pam",
+    "qoi",  "dds",  "exr", "hdr",  "psd",  "xcf",  "svg",   "svgz",  "pdf",  "ps",   "eps",
+    "apng", "mng",  "mp4", "webm", "html", "json", "jsonl", "txt",   "cpp",  "ttf",  "otf",
+    "ttc",  "otc",  "pfa", "pfb",  "pcf",  "bdf",  "woff",  "woff2", "md"};
 
-/// The file itself that a path leads to; the path as far as that cannot be told.
-std::string resolved(const std::string& path) {
+/// The file itself that a path without a link at its end leads to; the path as far as that cannot be
+/// told.
+std::string resolved(const fs::path& path) {
     std::error_code error;
     const fs::path whole = fs::absolute(path, error);
-    const fs::path file = fs::weakly_canonical(followLinks(whole), error);
+    const fs::path file = fs::weakly_canonical(whole, error);
     return (error ? whole : file).lexically_normal().string();
+}
+
+/// Whether every job may write there: into a device, a pipe or an open file.
+bool isForAll(const fs::path& path) {
+    std::error_code ignored;
+    return openFileOf(path) || (fs::exists(path, ignored) && !fs::is_regular_file(path, ignored));
 }
 
 }  // namespace
@@ -33,16 +43,20 @@ std::string resolved(const std::string& path) {
 bool namesOtherKind(std::string_view path) {
     const size_t dot = path.find_last_of("./");
     if (dot == std::string_view::npos || path[dot] != '.') return false;
-    std::string kind(path.substr(dot + 1));
-    std::transform(kind.begin(), kind.end(), kind.begin(),
-                   [](char c) { return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c; });
-    return std::find(kOtherKinds.begin(), kOtherKinds.end(), kind) != kOtherKinds.end();
+    const std::string_view kind = path.substr(dot + 1);
+    return std::any_of(kOtherKinds.begin(), kOtherKinds.end(),
+                       [&](std::string_view other) { return vorelstyle::isSameWord(kind, other); });
 }
 
 std::optional<size_t> OutputNames::claim(const std::string& path, size_t line) {
-    std::error_code ignored;
-    if (fs::exists(path, ignored) && !fs::is_regular_file(path, ignored)) return std::nullopt;
-    const auto [first, isNew] = mLines.try_emplace(resolved(path), line);
+    fs::path target;
+    try {
+        target = followLinks(path);
+    } catch (const ToolError&) {
+        return std::nullopt;  // nothing is written there, and who tries says why
+    }
+    if (isForAll(target)) return std::nullopt;
+    const auto [first, isNew] = mLines.try_emplace(resolved(target), line);
     return isNew ? std::nullopt : std::optional<size_t>(first->second);
 }
 

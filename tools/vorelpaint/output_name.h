@@ -16,7 +16,7 @@ bool namesOtherKind(std::string_view path);
 class OutputNames {
   public:
     /// Notes that a line writes to `path`; the line that does so already, if one does. Paths are the
-    /// same that lead to the same file, also through links. Devices and pipes are for all.
+    /// same that lead to the same file, also through links. Devices, pipes and open files are for all.
     std::optional<size_t> claim(const std::string& path, size_t line);
 
   private:

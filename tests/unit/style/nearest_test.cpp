@@ -24,6 +24,14 @@ TEST(Nearest, Distance_CountsEdits) {
     EXPECT_EQ(editDistance("ca", "abc"), 3U) << "nothing is edited twice";
 }
 
+TEST(Nearest, SameWord_IsOfEitherCase) {
+    EXPECT_TRUE(isSameWord("", ""));
+    EXPECT_TRUE(isSameWord("JPeg", "jpEG"));
+    EXPECT_FALSE(isSameWord("jpe", "jpeg"));
+    EXPECT_FALSE(isSameWord("jpeg", "jpe"));
+    EXPECT_FALSE(isSameWord("@[`{", "`{@["));
+}
+
 TEST(Nearest, MisspeltName_IsFound) {
     EXPECT_EQ(nearest("szie", kNames), "size");
     EXPECT_EQ(nearest("opacty", kNames), "opacity");
