@@ -3,7 +3,7 @@
 
 A mistake is a paragraph of tests/mutants/*.txt:
 
-    [blend.tail]                    its name: the room, then what is wrong
+    [blend.last_pixel_left_out]     its name: the room, then what is wrong
     file: blend/rows.h
     line: const Place last = {row, count - kPixels};
     with: const Place last = {row, count - kPixels - 1};

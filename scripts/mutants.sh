@@ -4,7 +4,7 @@
 #
 #     scripts/mutants.sh                    all of them, on as many copies of the tree as there are cores
 #     scripts/mutants.sh blend ops          those of some rooms
-#     scripts/mutants.sh blend.tail         one, by its name
+#     scripts/mutants.sh blend.tail_not_stored   one, by its name
 #     scripts/mutants.sh --list             what there is, without running anything
 #     scripts/mutants.sh --equal [...]      those that are said to change nothing: no test may see them
 #     scripts/mutants.sh --arm64 [...]      those of 64-bit ARM, under qemu
