@@ -26,6 +26,12 @@ function(vorel_objects target)
     POSITION_INDEPENDENT_CODE ON)
 endfunction()
 
+# vorel_strict_link(TARGET): some linkers' drivers answer a wish for fast arithmetic with code that, when
+# the shared library is loaded, lets the whole process flush subnormal numbers. Not for this one.
+function(vorel_strict_link target)
+  target_link_options(${target} PRIVATE -O2 -fno-fast-math -fno-unsafe-math-optimizations)
+endfunction()
+
 # vorel_library(TARGET CHOICE LEVELS LEVEL...): makes a library of all objects, of the choice of the level,
 # and of the levels to choose from.
 function(vorel_library target choice)
@@ -39,9 +45,7 @@ function(vorel_library target choice)
     target_compile_definitions(${target} PRIVATE VOREL_WITHOUT_SCALAR)
   endif()
   vorel_objects(${target})
-  # Some linkers' drivers answer such a wish with code that, when the library is loaded, lets the whole
-  # process flush subnormal numbers.
-  target_link_options(${target} PRIVATE -O2 -fno-fast-math -fno-unsafe-math-optimizations)
+  vorel_strict_link(${target})
   target_include_directories(${target} PUBLIC $<BUILD_INTERFACE:${PROJECT_SOURCE_DIR}/include>)
   target_compile_features(${target} PUBLIC cxx_std_17)
 endfunction()

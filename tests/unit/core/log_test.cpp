@@ -10,6 +10,8 @@
 #include <string>
 #include <vector>
 
+#include "tests/support/float_states.h"
+
 using namespace VFontEffect;
 
 namespace {
@@ -192,6 +194,17 @@ TEST_F(Log, Time_AtTheEndsOfItsRange) {
     expectLine(4, "[x] [Time] t 9223372474941440.000ms \n");
     VFLog::printTime("x", "t", LONG_MIN);
     expectLine(4, "[x] [Time] t -9223372474941440.000ms \n");
+}
+
+TEST_F(Log, Time_IsTheSameInEveryFloatingPointState) {
+    for (const vorel_test::FloatState& state : vorel_test::floatStates()) {
+        SCOPED_TRACE(state.name);
+        {
+            const vorel_test::InFloatState callers(state);
+            VFLog::printTime("x", "t", 131072062);
+        }
+        expectLine(4, "[x] [Time] t 131072.062ms \n");
+    }
 }
 
 TEST_F(Log, Time_HasAPointInEveryLocale) {

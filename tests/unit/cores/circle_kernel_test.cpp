@@ -82,8 +82,13 @@ TEST(CircleKernel, RadiusWithoutASide_StoresNothing) {
 
 TEST(CircleKernel, RadiusOutOfProportion_HasASideButNoBuffer) {
     unsigned char* weights = nullptr;
-    EXPECT_EQ(10001, VFontEffect::makeCircleKernel(&weights, 5000.0F));
-    EXPECT_EQ(nullptr, weights);
+    for (const int reach : {4096, 5000}) {
+        EXPECT_EQ(2 * reach + 1, VFontEffect::makeCircleKernel(&weights, static_cast<float>(reach)));
+        EXPECT_EQ(nullptr, weights) << reach;
+    }
+    EXPECT_EQ(8191, VFontEffect::makeCircleKernel(&weights, 4095.0F));
+    EXPECT_NE(nullptr, weights);
+    std::free(weights);
 }
 
 TEST(CircleKernel, LargestDisc_HasASideOf8191) {

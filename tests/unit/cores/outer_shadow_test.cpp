@@ -256,6 +256,11 @@ TEST(OuterShadow, SizesOutOfProportion_PaintNothing) {
     }
 }
 
+TEST(OuterShadow, LargestSize_MatchesTheLiteralForm) {
+    const Scene scene = sceneOf(discMask(9, 8, 4.0F, 4.0F, 3.0F, true), {1, 1, 6, 7});
+    EXPECT_TRUE(kShadow.matchesLiteral(scene, 60.0F, 3.0F, 256.0F));
+}
+
 TEST(OuterShadow, DistancesOutOfProportion_PaintNothing) {
     const Scene scene = sceneOf(filledMask(10, 10, 255));
     const float infinity = std::numeric_limits<float>::infinity();

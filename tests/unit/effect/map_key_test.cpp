@@ -206,6 +206,14 @@ TEST(MapKey, CountsOutOfAllProportion_GiveNoKey) {
     claim.mGradientCount = 1000;
     set.addEffect(kOuterGlow, &claim);
     EXPECT_EQ(keyOf(set).size(), 10U);
+
+    // 10 bytes and 10 a stop: the last key below 2^28 bytes, and the first above.
+    claim.mGradientCount = 26843544;
+    set.addEffect(kOuterGlow, &claim);
+    EXPECT_EQ(keyOf(set).size(), 10U);
+    ++claim.mGradientCount;
+    set.addEffect(kOuterGlow, &claim);
+    EXPECT_EQ(set.getMapKey(), nullptr);
 }
 
 /// A record that claims any length and writes one character.

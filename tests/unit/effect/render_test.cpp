@@ -248,6 +248,41 @@ TEST(TextBox, RunWithoutGlyphs_PaintsOverTheBoxOfTheLastRun) {
     EXPECT_EQ(sidesOf(*core->paints[1].textRect), (Sides{4, 5, 6, 8}));
 }
 
+/// A run without glyphs, after one with a glyph of 2 x 3 pixels at (4, 5).
+std::vector<uint8_t> secondRunWithoutGlyphs(VFEffect& set) {
+    VFBitmap picture(9, 9, 4);
+    SolidGlyph glyph(2, 3);
+    set.initEffect(9, 9);
+    set.renderEffectLayer(4, 5, &glyph.glyph);
+    set.doEffectPostProcessing();
+    set.compositeLayers(&picture);
+    set.initEffect(9, 9);
+    set.setDstBitmap(&picture);
+    set.doEffectPostProcessing();
+    set.compositeLayers(&picture);
+    return bytesOf(picture);
+}
+
+TEST(TextBox, RunWithoutGlyphs_IsFilledByWhatLiesInsideTheTextUnlessTheFillClips) {
+    using AddCall = void (*)(VFEffect&);
+    const AddCall inside[] = {
+        [](VFEffect& set) { set.addStrokeText(1, 0xFFFFFF, 1, 0, 2); },
+        [](VFEffect& set) { set.addInnerShadowText(0, 0, 1, 0xFFFFFF, 1); },
+        [](VFEffect& set) { set.addInnerGlowText(1, 0xFFFFFF, 1, 0, nullptr); },
+    };
+    for (const AddCall add : inside) {
+        VFEffect set;
+        add(set);
+        const std::vector<uint8_t> bytes = secondRunWithoutGlyphs(set);
+        for (size_t y = 5; y < 8; ++y) {
+            for (size_t x = 4; x < 6; ++x)
+                EXPECT_NE(bytes[(y * 9 + x) * 4 + 3], 0) << x << ", " << y;
+        }
+        set.addText(0xFFFFFF, 1);
+        EXPECT_EQ(secondRunWithoutGlyphs(set), std::vector<uint8_t>(9 * 9 * 4, 0));
+    }
+}
+
 // --- Post-processing --------------------------------------------------------------------------
 
 TEST(PostProcessing, OutsideLayeredMode_GivesEveryCoreTheDestination) {

@@ -191,7 +191,7 @@ void noteTables(Findings& findings, Property record, float fadeStart) {
     Glow glow;
     findings.of("setProperty", [&] { glow.setProperty(&record); });
     for (int curve = 0; curve < 3; ++curve) {
-        unsigned int table[256] = {};
+        unsigned int table[257] = {};
         findings.of("makeColorLUT", [&] { glow.makeColorLUT(table, fadeStart, curve); });
         findings.note(table);
     }
@@ -239,7 +239,8 @@ TEST(FloatState, FreeOperations) {
         VFOuterGlow glow;
         findings.of("increaseByBoxFilter", [&] { glow.increaseByBoxFilter(mask.mData, 3, 40, 30); });
         findings.note(bytesOf(mask));
-        VFLog::setPrintLogLevel(0);
+        // The timing switch alone: the number is worked out, no line is printed.
+        VFLog::setPrintLogLevel(VFLogTime);
         findings.of("printTime", [&] { VFLog::printTime("tag", "label", 1234567); });
         VFLog::setPrintLogLevel(0xFF);
     });
