@@ -20,6 +20,7 @@
 #include "level_of_input.h"
 #include "paint_cost.h"
 #include "pixels.h"
+#include "state_of_input.h"
 #include "tests/support/compare.h"
 #include "tests/support/core_compare.h"
 #include "tests/support/literal_blend.h"
@@ -33,6 +34,7 @@ namespace literal = vorel_test::literal;
 using literal::Mask;
 using literal::Picture;
 using literal::Stop;
+using vorel_fuzz::asCaller;
 using vorel_fuzz::Decoder;
 using vorel_fuzz::Size;
 using vorel_fuzz::WorkBudget;
@@ -246,19 +248,22 @@ template <class Core, class Record, class Reference>
 void compareCore(Decoder& in, const std::string& name, Record& record, Reference reference) {
     const Scene scene = decodeScene(in);
     Core core;
-    core.setProperty(&record);
+    asCaller([&] { core.setProperty(&record); });
     if (vorel_fuzz::paintCost(core, scene.mask.width, scene.mask.height) > mostSteps(in)) return;
     const Record& held = *static_cast<Record*>(core.getProperty());
     Scene expected = scene;
     reference(expected, held);
-    require(vorel_test::samePaint(expected, vorel_test::painted(core, scene)), name);
+    require(vorel_test::samePaint(expected, asCaller([&] { return vorel_test::painted(core, scene); })),
+            name);
 }
 
 /// Of a core or a set.
 template <class Source>
 literal::Margins marginsOf(Source& source) {
-    return {source.getLeftOffset(), source.getTopOffset(), source.getRightOffset(),
-            source.getBottomOffset()};
+    return asCaller([&] {
+        return literal::Margins{source.getLeftOffset(), source.getTopOffset(), source.getRightOffset(),
+                                source.getBottomOffset()};
+    });
 }
 
 void requireMargins(const literal::Margins& expected, const literal::Margins& actual,
@@ -283,7 +288,7 @@ void compareStroke(Decoder& in) {
                                                    s.useOuterLayer, r.mSize, r.mColor, r.mPosition);
                           });
     VFStroke core;
-    core.setProperty(&record);
+    asCaller([&] { core.setProperty(&record); });
     requireMargins(evenMargins(literal::strokeOffset(size, position)), marginsOf(core),
                    "stroke margins");
 }
@@ -309,7 +314,7 @@ void compareShadow(Decoder& in) {
                                                              r.mDistance, r.mSize, r.mColor);
                                });
     VFOuterShadow core;
-    core.setProperty(&record);
+    asCaller([&] { core.setProperty(&record); });
     requireMargins(literal::outerShadowMargins(angle, distance, size), marginsOf(core),
                    "outer shadow margins");
 }
@@ -325,12 +330,12 @@ void compareGlow(Decoder& in, const std::string& name, Paint paint) {
         [&](Scene& s, const Record& r) { paint(s.dst, s.mask, s.text, r.mSize, r.mColor, stops); });
 
     Core core;
-    core.setProperty(&record);
+    asCaller([&] { core.setProperty(&record); });
     requireMargins(evenMargins(literal::glowOffset(size)), marginsOf(core), name + " margins");
     std::vector<uint32_t> table(257);
     const float fade = in.wildFloat(-0.5F, 1.5F);
     const int curve = in.wildInt(0, 3);
-    core.makeColorLUT(table.data(), fade, curve);
+    asCaller([&] { core.makeColorLUT(table.data(), fade, curve); });
     requireEqual(literal::glowColours(size, record.mColor, stops, fade, curve), table,
                  name + " colour table");
 }
@@ -439,8 +444,10 @@ void Pair::add() {
             const float a = decodeAngle(mIn);
             const float d = decodeDistance(mIn);
             const float s = decodeSize(mIn);
-            real = outer ? mReal.addOuterShadowText(a, d, s, color, opacity)
-                         : mReal.addInnerShadowText(a, d, s, color, opacity);
+            real = asCaller([&] {
+                return outer ? mReal.addOuterShadowText(a, d, s, color, opacity)
+                             : mReal.addInnerShadowText(a, d, s, color, opacity);
+            });
             expected = outer ? mLiteral.addOuterShadowText(a, d, s, color, opacity)
                              : mLiteral.addInnerShadowText(a, d, s, color, opacity);
             break;
@@ -452,8 +459,10 @@ void Pair::add() {
             std::vector<VFGradient> array = libraryStops(stops);
             const auto count = static_cast<int>(stops.size());
             const float s = decodeSize(mIn);
-            real = outer ? mReal.addOuterGlowText(s, color, opacity, count, array.data())
-                         : mReal.addInnerGlowText(s, color, opacity, count, array.data());
+            real = asCaller([&] {
+                return outer ? mReal.addOuterGlowText(s, color, opacity, count, array.data())
+                             : mReal.addInnerGlowText(s, color, opacity, count, array.data());
+            });
             expected = outer ? mLiteral.addOuterGlowText(s, color, opacity, count, stops.data())
                              : mLiteral.addInnerGlowText(s, color, opacity, count, stops.data());
             break;
@@ -466,8 +475,10 @@ void Pair::add() {
             const auto count = static_cast<int>(stops.size());
             const float a = decodeAngle(mIn);
             const float s = decodeScale(mIn);
-            real = linear ? mReal.addLinearGradientText(a, s, opacity, count, array.data())
-                          : mReal.addRadialGradientText(s, opacity, count, array.data());
+            real = asCaller([&] {
+                return linear ? mReal.addLinearGradientText(a, s, opacity, count, array.data())
+                              : mReal.addRadialGradientText(s, opacity, count, array.data());
+            });
             expected = linear ? mLiteral.addLinearGradientText(a, s, opacity, count, stops.data())
                               : mLiteral.addRadialGradientText(s, opacity, count, stops.data());
             break;
@@ -476,7 +487,7 @@ void Pair::add() {
             const float s = decodeSize(mIn);
             const int style = mIn.wildInt(0, 9);
             const int position = mIn.wildInt(0, 3);
-            real = mReal.addStrokeText(s, color, opacity, style, position);
+            real = asCaller([&] { return mReal.addStrokeText(s, color, opacity, style, position); });
             expected = mLiteral.addStrokeText(s, color, opacity, style, position);
             break;
         }
@@ -485,12 +496,13 @@ void Pair::add() {
             VFBitmap bitmap = bitmapOf(tile);
             const float s = mIn.wildFloat(-0.5F, 11.0F);
             const bool missing = mIn.oneIn(8);
-            real = mReal.addPatternText(missing ? nullptr : &bitmap, s, opacity);
+            real =
+                asCaller([&] { return mReal.addPatternText(missing ? nullptr : &bitmap, s, opacity); });
             expected = mLiteral.addPatternText(missing ? nullptr : &tile, s, opacity);
             break;
         }
         default:
-            real = mReal.addText(color, opacity);
+            real = asCaller([&] { return mReal.addText(color, opacity); });
             expected = mLiteral.addText(color, opacity);
             break;
     }
@@ -506,7 +518,7 @@ void Pair::changeLook() {
         }
         case 1: {
             const float opacity = mIn.wildFloat(-0.2F, 1.2F);
-            mReal.setTextOpacity(opacity);
+            asCaller([&] { mReal.setTextOpacity(opacity); });
             mLiteral.setTextOpacity(opacity);
             requireEqual(mLiteral.getTextOpacity(), mReal.getTextOpacity(), "text opacity");
             break;
@@ -522,7 +534,7 @@ void Pair::changeLook() {
             break;
         case 4: {
             const uint32_t color = mIn.word();
-            delete[] mReal.getMapKey(color);
+            delete[] asCaller([&] { return mReal.getMapKey(color); });
             mLiteral.getMapKey(color);
             break;
         }
@@ -533,7 +545,7 @@ void Pair::changeLook() {
 }
 
 void Pair::compareKeys() {
-    const std::unique_ptr<char[]> key(mReal.getMapKey());
+    const std::unique_ptr<char[]> key(asCaller([&] { return mReal.getMapKey(); }));
     requireEqual(mLiteral.getMapKey(), std::string(key.get()), "cache key");
     requireMargins(mLiteral.margins(), marginsOf(mReal), "margins of the set");
 }
@@ -554,7 +566,7 @@ void Pair::paint(int width, int height) {
     const auto requireSamePicture = [&](const char* when) {
         require(vorel_test::sameBytes(expected.bytes.data(), actual.mData, width, height, 4), when);
     };
-    mReal.initEffect(width, height);
+    asCaller([&] { mReal.initEffect(width, height); });
     mLiteral.initEffect(width, height);
     compareKeys();
     mReal.setDstBitmap(&actual);
@@ -572,7 +584,7 @@ void Pair::paint(int width, int height) {
     }
     if (mIn.oneIn(4)) changeLook();
     if (affordable(width, height)) {
-        mReal.doEffectPostProcessing();
+        asCaller([&] { mReal.doEffectPostProcessing(); });
         mLiteral.doEffectPostProcessing();
         const VFRect& box = *mReal.getTextRect();
         const literal::Box expectedBox = mLiteral.textRect();
@@ -582,7 +594,7 @@ void Pair::paint(int width, int height) {
         requireEqual(expectedBox.bottom, box.mBottom, "bottom of the text box");
         requireSamePicture("the destination after post-processing");
     }
-    mReal.compositeLayers(&actual);
+    asCaller([&] { mReal.compositeLayers(&actual); });
     mLiteral.compositeLayers(expected);
     requireSamePicture("the destination after the composite");
 }
@@ -603,6 +615,7 @@ void Pair::run() {
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
     vorel_fuzz::useLevelOfInput(size);
+    vorel_fuzz::useStateOfInput(size);
     // The shared comparisons report some differences as test failures: they end the program, too.
     GTEST_FLAG_SET(break_on_failure, true);
     Decoder in(data, size);
