@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <cstring>
 
 #include "core/effect_types.h"
@@ -43,8 +44,11 @@ inline bool isInnerBevel(const VFBevelProperty* bevel) {
 /// Whether a text opacity, 0 to 1, makes a run layered. What is not 1 is less: its bits tell, in every
 /// floating-point state.
 inline bool isTranslucent(float textOpacity) {
-    constexpr float kOpaque = 1.0F;
-    return std::memcmp(&textOpacity, &kOpaque, sizeof kOpaque) != 0;
+    constexpr uint32_t kBitsOfOne = 0x3F800000U;
+    uint32_t bits = 0;
+    static_assert(sizeof bits == sizeof textOpacity);
+    std::memcpy(&bits, &textOpacity, sizeof bits);
+    return bits != kBitsOfOne;
 }
 
 /// By the type of the core and, if it is a bevel or a stroke and has one, its record.
