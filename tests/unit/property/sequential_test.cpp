@@ -189,6 +189,14 @@ TEST(Encoding, BelowOneStop_WritesNoStops) {
     }
 }
 
+/// Of a count whose characters an int could not count, as many as it can.
+TEST(Encoding, LengthOfAnyCount_IsANumberAbove0) {
+    VFOuterGlowProperty glow(1, 0, 1, INT32_MAX, nullptr);
+    VFLinearGradientProperty gradient(0, 1, 1, INT32_MAX, nullptr);
+    for (VFProperty* const record : std::initializer_list<VFProperty*>{&glow, &gradient})
+        EXPECT_GT(record->getSequentialCharLength(), 2000000000);
+}
+
 TEST(Encoding, MissingStops_WriteNothing) {
     VFOuterGlowProperty glow(12, 0, 1, 3, nullptr);
     EXPECT_EQ(fragmentOf(glow).size(), 10U);
