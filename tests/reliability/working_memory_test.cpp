@@ -144,6 +144,18 @@ TEST_F(WorkingMemory, OfAColumnOfPixels_IsFewMegabytes) {
     expectFewBytes(canvas, {24.0F, 1.0F, 3.0F, 8.0F, 100.0F, 256.0F});
 }
 
+TEST_F(WorkingMemory, OfAPattern_IsFewBytesAColumn) {
+    constexpr long kColumns = 26'000;
+    Canvas canvas(kColumns, 20);
+    VFBitmap tile(5, 3, 4);
+    std::fill_n(tile.mData, 5 * 3 * 4, uint8_t{255});
+    for (const float scale : {0.1F, 1.0F, 2.5F, 10.0F}) {
+        const auto pattern = coreOf<VFPattern, VFPatternProperty>(&tile, scale, 1.0F);
+        EXPECT_LE(canvas.paint(*pattern), 40 * kColumns) << scale;
+        EXPECT_TRUE(canvas.isPainted()) << scale;
+    }
+}
+
 TEST_F(WorkingMemory, OfTheBoxFilter_IsTwoPlanesOfWhatGrows) {
     std::vector<unsigned char> mask(size_t{1000} * 800, 0);
     mask[400 * 1000 + 500] = 255;
