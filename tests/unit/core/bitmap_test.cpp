@@ -221,6 +221,14 @@ TEST(Crop, RectangleLeavingTheSource_HasNoCoverage) {
     }
 }
 
+TEST(Crop, OfPixelsWithoutBytes_HasNoPixels) {
+    const VFBitmap source(4, 4, 0U);
+    VFRect rect(0, 0, 2, 2);
+    const VFBitmap crop(source, &rect);
+    EXPECT_EQ(crop.mData, nullptr);
+    EXPECT_EQ(crop.mBytesPerPixel, 0U);
+}
+
 TEST(Crop, LargestRectangle_Survives) {
     const VFBitmap source = numberedMask();
     VFRect rect(INT_MIN, INT_MIN, INT_MAX, INT_MAX);
