@@ -3,6 +3,7 @@
 #include <malloc.h>
 
 #include <atomic>
+#include <cerrno>
 #include <cstddef>
 #include <cstdlib>
 #include <new>
@@ -91,6 +92,7 @@ extern "C" {
 void* VOREL_RAW(malloc)(size_t size) noexcept;
 void* VOREL_RAW(calloc)(size_t count, size_t size) noexcept;
 void* VOREL_RAW(realloc)(void* block, size_t size) noexcept;
+void* VOREL_RAW(memalign)(size_t alignment, size_t size) noexcept;
 void VOREL_RAW(free)(void* block) noexcept;
 }
 
@@ -157,6 +159,13 @@ void* realloc(void* block, size_t size) noexcept {
     if (block != nullptr) --gLive;
     gBytes -= before;
     return counted(moved);
+}
+/// What a C++ runtime may keep exceptions in; not refused.
+int posix_memalign(void** block, size_t alignment, size_t size) noexcept {
+    void* const made = counted(VOREL_RAW(memalign)(alignment, size));
+    if (made == nullptr) return ENOMEM;
+    *block = made;
+    return 0;
 }
 void free(void* block) noexcept {
     release(block);
