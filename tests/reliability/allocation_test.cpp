@@ -65,6 +65,7 @@ class MemoryTest : public ::testing::Test {
         // Their memory stays: it must not count as a leak of the code that uses them first.
         tile();
         letter();
+        EXPECT_THROW(throw std::bad_alloc(), std::bad_alloc);
     }
 };
 
