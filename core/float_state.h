@@ -27,12 +27,12 @@ class OwnFloatState {
 
   private:
 #if defined(__x86_64__)
-    uint32_t mControlAndFlags;
+    uint32_t mControlAndFlags = 0;
 #elif defined(__aarch64__)
-    uint64_t mControl;
-    uint64_t mFlags;
+    uint64_t mControl = 0;
+    uint64_t mFlags = 0;
 #else
-    std::fenv_t mEnvironment;
+    std::fenv_t mEnvironment = {};
 #endif
 };
 
