@@ -4,6 +4,8 @@
 #include <cmath>
 #include <cstdint>
 
+#include "text/run.h"
+
 namespace voreltext {
 namespace {
 
@@ -31,6 +33,13 @@ struct Visible {
 };
 
 }  // namespace
+
+Image transparentImage(int width, int height) {
+    checkSize(width, height);
+    Image image{width, height, {}};
+    image.pixels.resize(static_cast<size_t>(width) * static_cast<size_t>(height) * 4);
+    return image;
+}
 
 size_t offsetOf(const Image& image, int x, int y) {
     return (static_cast<size_t>(y) * static_cast<size_t>(image.width) + static_cast<size_t>(x)) * 4;

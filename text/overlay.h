@@ -6,6 +6,9 @@
 
 namespace voreltext {
 
+/// A picture without a mark on it. Throws TextError for one that is too large, or of a negative size.
+Image transparentImage(int width, int height);
+
 /// Where the pixel (x, y), which lies within the picture, begins among its bytes.
 size_t offsetOf(const Image& image, int x, int y);
 

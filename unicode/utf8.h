@@ -36,6 +36,17 @@ inline Decoded decodeAt(std::string_view text, size_t at) {
     return {code, length};
 }
 
+/// The bytes of a code point in UTF-8.
+inline std::string encoded(uint32_t code) {
+    const auto part = [&](unsigned int shift) {
+        return static_cast<char>(0x80U | ((code >> shift) & 0x3FU));
+    };
+    if (code < 0x80) return {static_cast<char>(code)};
+    if (code < 0x800) return {static_cast<char>(0xC0U | code >> 6), part(0)};
+    if (code < 0x10000) return {static_cast<char>(0xE0U | code >> 12), part(6), part(0)};
+    return {static_cast<char>(0xF0U | code >> 18), part(12), part(6), part(0)};
+}
+
 /// Line feeds and tabs too.
 constexpr bool isControl(uint32_t code) {
     return code < 0x20 || (code >= 0x7F && code < 0xA0);

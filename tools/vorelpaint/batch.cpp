@@ -80,19 +80,38 @@ Style readInlineStyle(JsonValue json) {
     }
 }
 
-std::string readString(const JsonObject& job, const Setting& setting) {
-    std::string text = job.string(setting.name);
+const std::string& checkedString(const JsonObject& job, const Setting& setting,
+                                 const std::string& text) {
     if (setting.isPositional) return text;
     if (text.find('\0') != std::string::npos) job.fail(setting.name, "has a NUL character");
     if (text == "-") job.fail(setting.name, "must name a file: jobs have no standard input or output");
     return text;
 }
 
+/// The values of a key as the command line would give them; more than one of a list alone.
+std::vector<std::string> valuesOf(const JsonObject& job, const Setting& setting) {
+    const std::string& name = setting.name;
+    switch (setting.kind) {
+        case Setting::Kind::flag:
+            return {job.boolean(name) ? "true" : "false"};
+        case Setting::Kind::number:
+            return {job.numeral(name)};
+        case Setting::Kind::length:
+            return {job.value(name).isNumber() ? job.numeral(name) : job.string(name)};
+        case Setting::Kind::list:
+            return job.value(name).isArray() ? job.strings(name, {1, kMostFonts})
+                                             : std::vector<std::string>{job.string(name)};
+        default:
+            return {job.string(name)};
+    }
+}
+
 void readKey(const JsonObject& job, const Setting& setting, Options& options) {
-    const bool isNumber = setting.kind == Setting::Kind::number;
-    const std::string value = isNumber ? job.numeral(setting.name) : readString(job, setting);
+    const std::vector<std::string> values = valuesOf(job, setting);
     try {
-        setting.read(options, value);
+        if (setting.forget) setting.forget(options);
+        for (const std::string& value : values)
+            setting.read(options, checkedString(job, setting, value));
     } catch (const ToolError& error) {
         job.fail(setting.name, error.what());
     }
@@ -115,6 +134,7 @@ Options readJob(const JsonObject& job, const Options& common) {
         }
     }
     requirePicture(options);
+    checkCanvas(options);
     return options;
 }
 
@@ -137,7 +157,7 @@ bool paintJob(const std::string& line, size_t number, const Options& common, Out
     try {
         const Options job = parseJob(line, common);
         claimOutput(outputs, job, number);
-        paintPicture(job, sayHere);
+        paintPicture(job, [&](const std::string& note) { sayHere("note: " + note); });
         return true;
     } catch (const std::bad_alloc&) {
         sayHere("not enough memory");

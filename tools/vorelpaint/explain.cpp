@@ -3,7 +3,6 @@
 #include <algorithm>
 #include <chrono>
 #include <cstdio>
-#include <ostream>
 #include <string>
 #include <utility>
 #include <variant>
@@ -21,21 +20,27 @@ using vorelstyle::Effect;
 using vorelstyle::effectName;
 using vorelstyle::KeyFragment;
 using vorelstyle::Look;
+using vorelstyle::LookStyle;
 using vorelstyle::printable;
+using vorelstyle::Stack;
+using vorelstyle::StackedLook;
 using vorelstyle::Stroke;
 using vorelstyle::Style;
+using voreltext::Canvas;
 using voreltext::Frame;
-using voreltext::GlyphMask;
 using voreltext::Margins;
 using voreltext::marginsOf;
 using voreltext::TextLayout;
 using Clock = std::chrono::steady_clock;
 
-constexpr const char* kOrderHeading = "\nOrder of painting, the topmost effect first:\n\n";
 constexpr size_t kLineWidth = 100;
 constexpr size_t kFewestRuns = 5;
 constexpr size_t kMostRuns = 50;
 constexpr std::chrono::milliseconds kMeasuringTime{500};
+constexpr const char* kCostsNote =
+    "Times are medians. The memory of the whole run is the most at one time, that of the layers with "
+    "that of "
+    "one effect; the picture's own comes on top.";
 
 /// Rows of words in aligned columns: the first two to the left, the others to the right.
 class Table {
@@ -49,7 +54,8 @@ class Table {
         mRows.push_back(std::move(row));
     }
 
-    void print(std::ostream& out) const {
+    std::string text() const {
+        std::string lines;
         for (const std::vector<std::string>& row : mRows) {
             std::string line;
             for (size_t i = 0; i < row.size(); ++i) {
@@ -57,8 +63,9 @@ class Table {
                 line += "  " + (i < kLeftColumns ? row[i] + space : space + row[i]);
             }
             line.erase(line.find_last_not_of(' ') + 1);
-            out << line << '\n';
+            lines += line + "\n";
         }
+        return lines;
     }
 
   private:
@@ -119,113 +126,165 @@ std::string layersText(const Look& look, const Plan& plan) {
     return "two: " + reason + ", so the paint outside the glyphs has a layer of its own";
 }
 
-bool isCentredStroke(const Style& style, int type) {
+bool isCentredStroke(const LookStyle& look, int type) {
     return type == vorelstyle::kStrokeType &&
-           std::any_of(style.effects.begin(), style.effects.end(), [](const Effect& effect) {
+           std::any_of(look.effects.begin(), look.effects.end(), [](const Effect& effect) {
                const auto* stroke = std::get_if<Stroke>(&effect);
                return stroke != nullptr && stroke->position == 0;
            });
 }
 
-std::string placeText(const Style& style, const Plan& plan, size_t at) {
+std::string placeText(const LookStyle& look, const Plan& plan, size_t at) {
     const int type = plan.order[at];
     if (type == vorelstyle::kTextType) return "the text";
-    if (isCentredStroke(style, type)) return "across the edge";
+    if (isCentredStroke(look, type)) return "across the edge";
     if (plan.under[at]) return plan.layered ? "outside the text" : "beneath the text";
     return "on the text";
 }
 
-void printOrder(std::ostream& out, const Style& style, const Plan& plan) {
-    out << kOrderHeading;
-    Table table({"effect", "place"});
-    for (size_t i = 0; i < plan.order.size(); ++i)
-        table.add({std::string(effectName(plan.order[i])), placeText(style, plan, i)});
-    table.print(out);
+/// "Order of painting", and of which look where there are several.
+std::string orderHeading(const Stack& stack, size_t at) {
+    const size_t count = stack.looks().size();
+    if (count == 1) return "\nOrder of painting, the topmost effect first:\n\n";
+    const auto place = vorelstyle::keyFragments(placeFragment(stack.looks()[at].place));
+    return "\nLook " + std::to_string(at + 1) + " of " + std::to_string(count) +
+           (at + 1 == count ? ", the topmost: "
+            : at == 0       ? ", the lowest: "
+                            : ": ") +
+           place.front().meaning + ". Order of painting, the topmost effect first:\n\n";
 }
 
-void printCosts(std::ostream& out, const Style& style, const Plan& plan, const MeasuredRun& run) {
-    out << kOrderHeading;
+std::string orderTable(const LookStyle& look, const Plan& plan) {
+    Table table({"effect", "place"});
+    for (size_t i = 0; i < plan.order.size(); ++i)
+        table.add({std::string(effectName(plan.order[i])), placeText(look, plan, i)});
+    return table.text();
+}
+
+std::string costTable(const LookStyle& look, const Plan& plan, const MeasuredRun& run) {
     Table table({"step", "place", "time", "memory"});
     const auto add = [&](const std::string& step, const std::string& place, const Cost& cost) {
         table.add({step, place, timeText(cost), memoryText(cost.bytes)});
     };
     add("glyphs", "the mask", run.glyphs);
     for (size_t i = 0; i < plan.order.size(); ++i)
-        add(std::string(effectName(plan.order[i])), placeText(style, plan, i), run.effects[i]);
+        add(std::string(effectName(plan.order[i])), placeText(look, plan, i), run.effects[i]);
     add("merge", "the picture", run.merge);
     add("whole run", "", run.whole);
-    table.print(out);
-    out << '\n'
-        << wrapped(
-               "Times are medians. The memory of the whole run is the most at one time, that of the "
-               "layers with that of one effect; the picture's own comes on top.",
-               kLineWidth, 0)
-        << '\n';
+    return table.text();
 }
 
-void printKeyPart(std::ostream& out, const std::string& name, const std::string& meaning) {
+std::string keyPart(const std::string& name, const std::string& meaning) {
     constexpr size_t kIndent = 18;
     std::string lines = wrapped(meaning, kLineWidth, kIndent);
-    out << lines.replace(2, name.size(), name) << '\n';
+    return lines.replace(2, name.size(), name) + "\n";
 }
 
-void printKey(std::ostream& out, const Look& look) {
-    out << "\nCache key of " << look.key().size() << " bytes, before the first run:\n\n";
-    for (const KeyFragment& fragment : vorelstyle::keyFragments(look.key()))
-        printKeyPart(out, std::string(effectName(fragment.type)), fragment.meaning);
-    const std::vector<int>& added = look.added();
-    if (std::find(added.begin(), added.end(), vorelstyle::kPatternType) != added.end()) {
-        printKeyPart(out, "pattern", "leaves no trace: tell patterns apart by a key of your own");
+std::string keyText(const Stack& stack) {
+    std::string text =
+        "\nCache key of " + std::to_string(stack.key().size()) + " bytes, before the first run:\n\n";
+    for (const KeyFragment& fragment : vorelstyle::keyFragments(stack.key()))
+        text += keyPart(std::string(fragment.name), fragment.meaning);
+    const bool hasPattern =
+        std::any_of(stack.looks().begin(), stack.looks().end(), [](const StackedLook& each) {
+            const std::vector<int>& added = each.look.added();
+            return std::find(added.begin(), added.end(), vorelstyle::kPatternType) != added.end();
+        });
+    if (!hasPattern) return text;
+    return text + keyPart("pattern", "leaves no trace: tell patterns apart by a key of your own");
+}
+
+/// The runs of a look: one for each of its spans.
+std::vector<RunOfGlyphs> runsOf(const TextLayout& text, const voreltext::Layer& layer) {
+    VFontEffect::VFEffect effects(*layer.effects);
+    const Margins margins = marginsOf(effects);
+    std::vector<RunOfGlyphs> runs;
+    for (const std::vector<size_t>& glyphs : spansOf(text, layer.span)) {
+        RunOfGlyphs run{{text.glyph(glyphs.front()).box, margins, 0}, {}};
+        for (const size_t i : glyphs) {
+            run.frame.ink = unionOf(run.frame.ink, text.glyph(i).box);
+            run.masks.push_back(text.rasterise(i));
+        }
+        runs.push_back(std::move(run));
     }
+    return runs;
 }
 
-std::vector<GlyphMask> masksOf(const TextLayout& text) {
-    std::vector<GlyphMask> masks;
-    for (size_t i = 0; i < text.glyphCount(); ++i)
-        masks.push_back(text.rasterise(i));
-    return masks;
-}
-
-MeasuredRun measure(const Look& look, const Plan& plan, const Frame& frame,
-                    const std::vector<GlyphMask>& glyphs) {
+MeasuredRun measure(const Look& look, const Plan& plan, const std::vector<RunOfGlyphs>& glyphs) {
     Progress progress("runs measured", 0);
     const Clock::time_point end = Clock::now() + kMeasuringTime;
     std::vector<MeasuredRun> runs;
     while (runs.size() < kFewestRuns || (runs.size() < kMostRuns && Clock::now() < end)) {
-        runs.push_back(measuredRun(look, plan, frame, glyphs));
+        runs.push_back(measuredRuns(look, plan, glyphs));
         progress.advance();
     }
     return medianOf(std::move(runs));
 }
 
-std::string textText(const Options& options, const TextLayout& text) {
-    return std::to_string(text.glyphCount()) + (text.glyphCount() == 1 ? " glyph" : " glyphs") + " of " +
-           std::to_string(options.size) + " pixels in " + inQuotes(options.font);
+std::string textText(const Composition& composition) {
+    const size_t count = composition.text().layout().glyphCount();
+    return std::to_string(count) + (count == 1 ? " glyph" : " glyphs") + " of " +
+           std::to_string(composition.text().size()) + " pixels in " +
+           std::to_string(composition.text().layout().lines().size()) +
+           (composition.text().layout().lines().size() == 1 ? " line" : " lines");
 }
 
-void printHead(std::ostream& out, const Options& options, const Style& style, Look& look,
-               const Plan& plan) {
-    out << entry("style", styleText(options, style))
-        << entry("margins", marginsText(marginsOf(look.effects())))
-        << entry("layers", layersText(look, plan));
+std::string looksText(const Stack& stack) {
+    const std::vector<StackedLook>& looks = stack.looks();
+    if (looks.size() > 1) return entry("looks", std::to_string(looks.size()) + ", the last on top");
+    return entry("layers", layersText(looks.front().look, planOf(looks.front().look)));
+}
+
+std::string headText(const Options& options, const LayerSet& looks, const Margins& margins) {
+    return entry("style", styleText(options, looks.style())) + entry("margins", marginsText(margins)) +
+           looksText(looks.stack());
+}
+
+std::string fontsText(const TextLayout& text) {
+    std::string names;
+    for (const std::string& name : text.fontsUsed())
+        names += (names.empty() ? "" : ", ") + inQuotes(name);
+    return names;
+}
+
+/// What is told of each look, the topmost first; `table` tells how it is painted.
+template <typename MakeTable>
+std::string looksExplained(const LayerSet& looks, MakeTable table) {
+    const std::vector<StackedLook>& stacked = looks.stack().looks();
+    std::string text;
+    for (size_t at = stacked.size(); at-- > 0;) {
+        const Plan plan = planOf(stacked[at].look);
+        text += orderHeading(looks.stack(), at) + table(at, plan);
+        if (stacked.size() > 1) text += "\n  Layers: " + layersText(stacked[at].look, plan) + "\n";
+    }
+    return text;
 }
 
 }  // namespace
 
-void explain(std::ostream& out, const Options& options, const Style& style, Look& look,
-             const TextLayout* text) {
-    const Plan plan = planOf(look);
-    printHead(out, options, style, look, plan);
-    if (text == nullptr) {
-        printOrder(out, style, plan);
-    } else {
-        const Frame frame{text->inkBox(), marginsOf(look.effects()), options.padding};
-        out << entry("text", textText(options, *text))
-            << entry("ink", sizeText(frame.ink.width(), frame.ink.height()))
-            << entry("picture", sizeText(frame.width(), frame.height()));
-        printCosts(out, style, plan, measure(look, plan, frame, masksOf(*text)));
-    }
-    printKey(out, look);
+std::string explanationOf(const Options& options, const LayerSet& looks) {
+    return headText(options, looks, marginsOf(looks.layers())) +
+           looksExplained(
+               looks,
+               [&](size_t at, const Plan& plan) { return orderTable(looks.style().looks[at], plan); }) +
+           keyText(looks.stack());
+}
+
+std::string explanationOf(const Options& options, const Composition& composition) {
+    const LayerSet& looks = composition.looks();
+    const TextLayout& text = composition.text().layout();
+    const Canvas& canvas = composition.canvas();
+    return headText(options, looks, composition.margins()) + entry("text", textText(composition)) +
+           entry("fonts", fontsText(text)) +
+           entry("ink", sizeText(text.inkBox().width(), text.inkBox().height())) +
+           entry("picture", sizeText(canvas.width, canvas.height)) +
+           looksExplained(looks,
+                          [&](size_t at, const Plan& plan) {
+                              const Look& look = looks.stack().looks()[at].look;
+                              const auto runs = runsOf(text, looks.layers()[at]);
+                              return costTable(looks.style().looks[at], plan, measure(look, plan, runs));
+                          }) +
+           "\n" + wrapped(kCostsNote, kLineWidth, 0) + "\n" + keyText(looks.stack());
 }
 
 }  // namespace vorelpaint

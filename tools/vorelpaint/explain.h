@@ -1,17 +1,17 @@
 #pragma once
 
-#include <iosfwd>
+#include <string>
 
 #include "options.h"
-#include "style/vorelstyle.h"
-#include "text/voreltext.h"
+#include "painting.h"
 
 namespace vorelpaint {
 
-/// Tells how a look that has not painted yet will be painted: the order of its effects, its margins, its
-/// cache key; with a text, which may be null, also what each effect takes, measured over several runs.
-/// Throws TextError.
-void explain(std::ostream& out, const Options& options, const vorelstyle::Style& style,
-             vorelstyle::Look& look, const voreltext::TextLayout* text);
+/// How looks that have not painted yet will be painted: the order of their effects, their margins and
+/// cache key. Throws TextError.
+std::string explanationOf(const Options& options, const LayerSet& looks);
+
+/// The same of a picture, with what each effect takes, measured over several runs.
+std::string explanationOf(const Options& options, const Composition& composition);
 
 }  // namespace vorelpaint

@@ -10,7 +10,6 @@
 #include "console.h"
 #include "error.h"
 #include "explain.h"
-#include "font_choice.h"
 #include "interrupt.h"
 #include "manual.h"
 #include "options.h"
@@ -18,18 +17,13 @@
 #include "sheet.h"
 #include "style/vorelstyle.h"
 #include "style_file.h"
-#include "text/voreltext.h"
 #include "voreleffect/VFVersion.h"
 
 namespace vorelpaint {
 namespace {
 
-using vorelstyle::Look;
 using vorelstyle::Style;
-using voreltext::Font;
 using voreltext::Margins;
-using voreltext::marginsOf;
-using voreltext::TextLayout;
 
 constexpr int kFailed = 2;
 
@@ -51,33 +45,34 @@ void printMargins(const Margins& margins) {
 void printCpp(const Options& options, const Style& style) {
     const std::string name = options.preset.value_or(std::filesystem::path(style.name).stem().string());
     std::ostringstream source;
-    vorelstyle::writeCpp(source, vorelstyle::functionName(name), style, chosenFill(options, style),
-                         chosenOpacity(options, style), imagesOf(style));
+    vorelstyle::writeCpp(source, vorelstyle::functionName(name), style, options.color, options.opacity,
+                         imagesOf(style));
     print(source.str());
 }
 
-void printExplanation(const Options& options, const Style& style, Look& look, const TextLayout* text) {
-    std::ostringstream lines;
-    explain(lines, options, style, look, text);
-    print(lines.str());
+void sayNote(const std::string& note) {
+    say("note: " + note);
 }
 
-/// What is printed about a look, and its picture.
+/// What is printed about a look that no text is given for.
+void presentLook(const Options& options) {
+    const LayerSet looks(options, chosenStyle(options), options.size, {}, noteTaker(options, sayNote));
+    if (options.writeCpp) printCpp(options, looks.style());
+    if (options.printKey) print("key " + vorelstyle::hexadecimal(looks.stack().key()) + "\n");
+    if (options.printMargins) printMargins(voreltext::marginsOf(looks.layers()));
+    if (options.explain) print(explanationOf(options, looks));
+}
+
+/// What is printed about a look and its picture.
 void present(const Options& options) {
-    const Style style = chosenStyle(options);
-    Look look = makeLook(options, style, say);
-    if (options.writeCpp) printCpp(options, style);
-    if (options.printKey) print("key " + vorelstyle::hexadecimal(look.key()) + "\n");
-    if (options.printMargins) printMargins(marginsOf(look.effects()));
-    if (!options.text && !options.textFile) {
-        if (options.explain) printExplanation(options, style, look, nullptr);
-        return;
-    }
-    if (!options.explain && !options.output) return;
-    const Font font(findFont(options.font), options.size);
-    const TextLayout text = layOutText(options, font, say);
-    if (options.explain) printExplanation(options, style, look, &text);
-    if (options.output) writePicture(options, paint(look.effects(), text, options.padding));
+    if (!options.text && !options.textFile) return presentLook(options);
+    const Composition composition(options, noteTaker(options, sayNote));
+    if (options.writeCpp) printCpp(options, composition.looks().style());
+    if (options.printKey)
+        print("key " + vorelstyle::hexadecimal(composition.looks().stack().key()) + "\n");
+    if (options.printMargins) printMargins(composition.margins());
+    if (options.explain) print(explanationOf(options, composition));
+    finish(options, composition);
 }
 
 void runBatch(const Options& options) {
@@ -99,7 +94,7 @@ void run(const Options& options) {
     } else if (options.batch) {
         runBatch(options);
     } else if (options.sheet) {
-        paintSheet(options, say);
+        paintSheet(options, sayNote);
     } else {
         present(options);
     }

@@ -71,6 +71,19 @@ Cost sumOf(const MeasuredRun& run) {
     return whole;
 }
 
+void add(Cost& cost, const Cost& other) {
+    cost.milliseconds += other.milliseconds;
+    cost.bytes = std::max(cost.bytes, other.bytes);
+}
+
+void add(MeasuredRun& run, const MeasuredRun& other) {
+    add(run.glyphs, other.glyphs);
+    for (size_t i = 0; i < run.effects.size(); ++i)
+        add(run.effects[i], other.effects[i]);
+    add(run.merge, other.merge);
+    add(run.whole, other.whole);
+}
+
 /// Replaces the time that `part` names in the first run by the median of all.
 template <typename Part>
 void takeMedian(std::vector<MeasuredRun>& runs, Part part) {
@@ -123,6 +136,13 @@ MeasuredRun measuredRun(const Look& look, const Plan& plan, const Frame& frame,
     if (picture != nullptr) *picture = run.picture();
     measured.whole = sumOf(measured);
     return measured;
+}
+
+MeasuredRun measuredRuns(const Look& look, const Plan& plan, const std::vector<RunOfGlyphs>& runs) {
+    MeasuredRun together = measuredRun(look, plan, runs.front().frame, runs.front().masks);
+    for (size_t i = 1; i < runs.size(); ++i)
+        add(together, measuredRun(look, plan, runs[i].frame, runs[i].masks));
+    return together;
 }
 
 MeasuredRun medianOf(std::vector<MeasuredRun> runs) {

@@ -39,6 +39,17 @@ MeasuredRun measuredRun(const vorelstyle::Look& look, const Plan& plan, const vo
                         const std::vector<voreltext::GlyphMask>& glyphs,
                         voreltext::Image* picture = nullptr);
 
+/// Glyphs that are painted as one run.
+struct RunOfGlyphs {
+    voreltext::Frame frame;
+    std::vector<voreltext::GlyphMask> masks;
+};
+
+/// What the runs of a look take together: the time of all, the memory of the one that takes most. There
+/// is at least one.
+MeasuredRun measuredRuns(const vorelstyle::Look& look, const Plan& plan,
+                         const std::vector<RunOfGlyphs>& runs);
+
 /// A run with the median of each time in `runs`, of which there is at least one.
 MeasuredRun medianOf(std::vector<MeasuredRun> runs);
 

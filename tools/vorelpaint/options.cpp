@@ -19,7 +19,7 @@ namespace vorelpaint {
 namespace {
 
 /// What cannot be asked for together, beside what checkCombination explains.
-constexpr std::array<std::pair<const char*, const char*>, 17> kExclusions{{
+constexpr std::array<std::pair<const char*, const char*>, 19> kExclusions{{
     {"--text-file", "TEXT"},
     {"--preset", "--style"},
     {"--batch", "--output"},
@@ -34,6 +34,8 @@ constexpr std::array<std::pair<const char*, const char*>, 17> kExclusions{{
     {"--sheet", "--write-cpp"},
     {"--sheet", "--print-key"},
     {"--sheet", "--print-margins"},
+    {"--sheet", "--report"},
+    {"--write-cpp", "--report"},
     {"--write-cpp", "--explain"},
     {"--write-cpp", "--print-key"},
     {"--write-cpp", "--print-margins"},
@@ -63,12 +65,22 @@ void addSetting(CLI::App& app, const Setting& setting, Options& options) {
             throw CLI::ValidationError(name, error.what());
         }
     };
+    const auto assignAll = [&setting, &options, assign](const std::vector<std::string>& given) {
+        setting.forget(options);
+        for (const std::string& each : given)
+            assign(each);
+    };
     CLI::Option* option = nullptr;
     if (!setting.read) {
         option = app.set_help_flag(names, setting.description);
     } else if (setting.kind == Setting::Kind::flag) {
         option = app.add_flag_callback(
-            names, [assign] { assign(""); }, setting.description);
+            names, [assign] { assign("true"); }, setting.description);
+    } else if (setting.kind == Setting::Kind::list) {
+        option =
+            app.add_option_function<std::vector<std::string>>(names, assignAll, setting.description);
+        option->type_size(1)->expected(1)->multi_option_policy(CLI::MultiOptionPolicy::TakeAll);
+        option->type_name(setting.value)->default_str(setting.initial);
     } else {
         option = app.add_option_function<std::string>(names, assign, setting.description);
         option->type_name(setting.isPositional ? "" : setting.value);
@@ -78,15 +90,19 @@ void addSetting(CLI::App& app, const Setting& setting, Options& options) {
 }
 
 void checkOutput(const Options& options) {
-    const bool prints = options.printKey || options.printMargins || options.explain || options.writeCpp;
+    const bool prints = options.printKey || options.printMargins || options.explain ||
+                        options.writeCpp || options.report;
     if (!options.output && !prints) {
         throw ToolError("nowhere to paint: give -o FILE, or -o - for standard output");
     }
     if (prints && options.output && isStandardOutput(*options.output)) {
         throw ToolError("standard output cannot take both the picture and what is printed");
     }
-    if (options.output && !options.text && !options.textFile) {
+    if ((options.output || options.report) && !options.text && !options.textFile) {
         throw ToolError("nothing to paint: give TEXT, or --text-file FILE");
+    }
+    if (!options.sheetSizes.empty() && !options.sheet) {
+        throw ToolError("--sizes are the columns of a --sheet; the size of one picture is --size");
     }
 }
 
@@ -121,9 +137,23 @@ void checkCombination(const Options& options) {
     if (tells) return;
     if (options.batch) return checkBatch(options);
     checkOutput(options);
+    checkCanvas(options);
 }
 
 }  // namespace
+
+void checkCanvas(const Options& options) {
+    const voreltext::CanvasRequest& canvas = options.canvas;
+    if (options.fit == Fit::wrap && !canvas.width) {
+        throw ToolError("fit: wrap breaks lines at a width; none is given");
+    }
+    if (options.fit == Fit::shrink && !canvas.width && !canvas.height) {
+        throw ToolError("fit: shrink makes a text fit a width or a height; neither is given");
+    }
+    if (options.sheet && (canvas.width || canvas.height)) {
+        throw ToolError("a sheet has the size of its cells; no width or height can be given");
+    }
+}
 
 std::optional<Options> parseOptions(int argc, const char* const* argv) {
     Options options;

@@ -3,6 +3,7 @@
 #include <cstdint>
 #include <optional>
 #include <string>
+#include <vector>
 
 #include "background.h"
 #include "style/vorelstyle.h"
@@ -10,13 +11,32 @@
 
 namespace vorelpaint {
 
+/// What happens to a text that is larger than its canvas leaves room for.
+enum class Fit {
+    none,    ///< it is cut off
+    shrink,  ///< the font becomes smaller
+    wrap,    ///< lines are broken
+};
+
+/// What of a text is placed on its canvas, and has the padding around it.
+enum class TextBox {
+    ink,   ///< the smallest box around the glyphs
+    line,  ///< the line boxes: one height for every text of a font, one width for what is written
+};
+
 /// What is asked for, by the command line or by one job of a batch.
 struct Options {
     std::optional<std::string> text;
     std::optional<std::string> textFile;
-    std::string font = "DejaVu Sans";
+    bool markup = false;
+    std::vector<std::string> fonts{"DejaVu Sans"};  ///< in the order in which they are asked
+    std::vector<std::string> features;
+    std::vector<voreltext::FontVariation> variations;  ///< of the first font
     int size = 96;
     voreltext::Align align = voreltext::Align::left;
+    float lineHeight = 1;
+    vorelstyle::Length letterSpacing;
+
     std::optional<uint32_t> color;
     std::optional<float> opacity;
     float effectScale = 1;
@@ -24,16 +44,23 @@ struct Options {
     std::optional<std::string> preset;
     std::optional<vorelstyle::Style>
         inlineStyle;  ///< only a job can hold one; it goes before the other two
+
     Background background;
     std::optional<std::string> output;
-    int padding = 8;
+    voreltext::CanvasRequest canvas{std::nullopt, std::nullopt, voreltext::Anchor::center, 0, 8};
+    Fit fit = Fit::none;
+    TextBox box = TextBox::ink;
+
     std::optional<std::string> batch;
     bool sheet = false;
+    std::vector<int> sheetSizes;  ///< empty: the one size
     bool explain = false;
     bool writeCpp = false;
     bool listPresets = false;
     bool printKey = false;
     bool printMargins = false;
+    bool report = false;
+    bool strict = false;
     bool version = false;
     bool manual = false;
     std::optional<std::string> completion;
@@ -41,5 +68,8 @@ struct Options {
 
 /// Reads the command line. Nothing after --help, which it answers on standard output. Throws ToolError.
 std::optional<Options> parseOptions(int argc, const char* const* argv);
+
+/// Refuses what is asked of a canvas that has no such side. Throws ToolError.
+void checkCanvas(const Options& options);
 
 }  // namespace vorelpaint

@@ -1,67 +1,63 @@
 #include "painting.h"
 
+#include <algorithm>
+#include <array>
+#include <string>
 #include <utility>
 
 #include "background.h"
+#include "console.h"
 #include "error.h"
 #include "file_io.h"
-#include "font_choice.h"
 #include "png_io.h"
-#include "ranges.h"
-#include "style_file.h"
+#include "report.h"
 
 namespace vorelpaint {
 namespace {
 
-using vorelstyle::Look;
-using vorelstyle::Style;
-using voreltext::Font;
+using voreltext::Box;
+using voreltext::Canvas;
 using voreltext::Image;
-using voreltext::TextLayout;
+using voreltext::Margins;
 
-Style namedStyle(const Options& options) {
-    if (options.inlineStyle) return *options.inlineStyle;
-    if (options.preset) return loadStyle(findPreset(*options.preset));
-    if (options.style) return loadStyle(*options.style);
-    return {};
+/// Notes what of the text and its effects, which are `margins` around the ink, the canvas cuts off.
+void noteCut(const Canvas& canvas, const Box& ink, const Margins& margins, const Note& note) {
+    struct Side {
+        const char* name;
+        int beyond;
+    };
+    const std::array<Side, 4> sides{
+        {{"on the left", -(canvas.x + ink.left - margins.left)},
+         {"at the top", -(canvas.y + ink.top - margins.top)},
+         {"on the right", canvas.x + ink.right + margins.right - canvas.width},
+         {"at the bottom", canvas.y + ink.bottom + margins.bottom - canvas.height}}};
+    std::string places;
+    for (const Side& side : sides) {
+        if (side.beyond <= 0) continue;
+        places += (places.empty() ? "" : ", ") + std::to_string(side.beyond) + " " + side.name;
+    }
+    if (!places.empty()) note("the picture cuts pixels of the text or its effects off: " + places);
 }
 
 }  // namespace
 
-Style chosenStyle(const Options& options) {
-    return vorelstyle::scaledStyle(namedStyle(options), options.effectScale);
+Note noteTaker(const Options& options, const Note& note) {
+    if (!options.strict) return note;
+    return [](const std::string& line) { throw ToolError(line); };
 }
 
-uint32_t chosenFill(const Options& options, const Style& style) {
-    return options.color.value_or(fillOf(style));
+Composition::Composition(const Options& options, const Note& note)
+    : mSource(chosenText(options)),
+      mText(setToFit(options, mSource.text)),
+      mLooks(options, chosenStyle(options), mText.size(), mSource.colours, note),
+      mMargins(marginsOf(mLooks.layers())),
+      mCanvas(placedOn(options.canvas, mText.box(), mMargins)) {
+    noteMissing(mText.layout(), mSource.text, note);
+    noteCut(mCanvas, mText.layout().inkBox(), mMargins, note);
 }
 
-float chosenOpacity(const Options& options, const Style& style) {
-    return options.opacity.value_or(opacityOf(style));
-}
-
-std::string chosenText(const Options& options) {
-    if (options.text) return *options.text;
-    std::string text = readFile(options.textFile.value(), kMaxTextBytes);
-    if (!text.empty() && text.back() == '\n') text.pop_back();
-    return text;
-}
-
-Look makeLook(const Options& options, const Style& style, const Warn& warn) {
-    Look look(style, chosenFill(options, style), chosenOpacity(options, style), imagesOf(style));
-    for (const std::string& effect : look.unpainted()) {
-        warn("warning: the library has no core for " + effect + "; it is not painted");
-    }
-    return look;
-}
-
-TextLayout layOutText(const Options& options, const Font& font, const Warn& warn) {
-    TextLayout text(font, voreltext::decodeUtf8(chosenText(options)), options.align);
-    if (text.glyphCount() == 0) throw ToolError("nothing to paint: the text has no visible character");
-    if (text.missingGlyphs() > 0) {
-        warn("warning: characters missing from the font: " + std::to_string(text.missingGlyphs()));
-    }
-    return text;
+Image Composition::paint() const {
+    return voreltext::paint(mLooks.layers(), mText.layout(), mCanvas);
 }
 
 void writePicture(const Options& options, Image picture) {
@@ -69,10 +65,13 @@ void writePicture(const Options& options, Image picture) {
     writeFile(options.output.value(), [&](std::FILE* file) { writePng(file, picture); });
 }
 
-void paintPicture(const Options& options, const Warn& warn) {
-    Look look = makeLook(options, chosenStyle(options), warn);
-    const Font font(findFont(options.font), options.size);
-    writePicture(options, paint(look.effects(), layOutText(options, font, warn), options.padding));
+void finish(const Options& options, const Composition& composition) {
+    if (options.output) writePicture(options, composition.paint());
+    if (options.report) print(reportOf(options, composition) + "\n");
+}
+
+void paintPicture(const Options& options, const Note& note) {
+    finish(options, Composition(options, noteTaker(options, note)));
 }
 
 }  // namespace vorelpaint

@@ -1,9 +1,9 @@
 #pragma once
 
-#include <functional>
-#include <string>
-
+#include "layer_set.h"
+#include "note.h"
 #include "options.h"
+#include "set_text.h"
 #include "style/vorelstyle.h"
 #include "text/voreltext.h"
 
@@ -11,30 +11,37 @@
 /// TextError.
 namespace vorelpaint {
 
-/// Takes a line that says what is odd, but no reason to stop.
-using Warn = std::function<void(const std::string& line)>;
+/// Takes notes as is asked for: a strict request throws them as ToolError, others go to `note`.
+Note noteTaker(const Options& options, const Note& note);
 
-/// The style that is asked for, at its scale; an empty one when none is.
-vorelstyle::Style chosenStyle(const Options& options);
+/// A picture before it is painted: a text in its fonts, its looks, and the canvas on which they meet.
+class Composition {
+  public:
+    Composition(const Options& options, const Note& note);
 
-/// The fill that is asked for, else the style's, else black.
-uint32_t chosenFill(const Options& options, const vorelstyle::Style& style);
+    const std::vector<uint32_t>& source() const { return mSource.text; }  ///< without markup
+    const SetText& text() const { return mText; }
+    const LayerSet& looks() const { return mLooks; }
+    const voreltext::Margins& margins() const { return mMargins; }
+    const voreltext::Canvas& canvas() const { return mCanvas; }
 
-/// The opacity that is asked for, else the style's, else 1.
-float chosenOpacity(const Options& options, const vorelstyle::Style& style);
+    voreltext::Image paint() const;
 
-std::string chosenText(const Options& options);
-
-/// The look of a style with the fill and the opacity that are asked for.
-vorelstyle::Look makeLook(const Options& options, const vorelstyle::Style& style, const Warn& warn);
-
-/// The text in its font, which must outlive it. Refuses a text without ink.
-voreltext::TextLayout layOutText(const Options& options, const voreltext::Font& font, const Warn& warn);
+  private:
+    vorelstyle::MarkedText mSource;
+    SetText mText;
+    LayerSet mLooks;
+    voreltext::Margins mMargins;
+    voreltext::Canvas mCanvas;
+};
 
 /// The picture on its background into its file.
 void writePicture(const Options& options, voreltext::Image picture);
 
+/// Writes the picture, where an output is asked for, and prints its report, where one is.
+void finish(const Options& options, const Composition& composition);
+
 /// All of these steps.
-void paintPicture(const Options& options, const Warn& warn);
+void paintPicture(const Options& options, const Note& note);
 
 }  // namespace vorelpaint

@@ -2,29 +2,26 @@
 
 #include <algorithm>
 #include <array>
-#include <charconv>
 #include <sstream>
 #include <string_view>
-#include <system_error>
-#include <type_traits>
+#include <utility>
 
 #include "error.h"
 #include "output_name.h"
 #include "ranges.h"
+#include "read_value.h"
 
 namespace vorelpaint {
 namespace {
 
+using vorelstyle::Length;
 using vorelstyle::parseColour;
 using voreltext::Align;
+using voreltext::Anchor;
 using Read = Setting::Read;
 
-[[noreturn]] void refuse(const std::string& text, const std::string& reason) {
-    throw ToolError("'" + text + "' is " + reason);
-}
-
 Read flag(bool Options::*member) {
-    return [member](Options& options, const std::string&) { options.*member = true; };
+    return [member](Options& options, const std::string& given) { options.*member = given == "true"; };
 }
 
 template <typename Member>
@@ -32,21 +29,16 @@ Read text(Member Options::*member) {
     return [member](Options& options, const std::string& given) { options.*member = given; };
 }
 
-/// Reads decimal numbers and nothing around them.
 template <typename Number, typename Member>
 Read numberWithin(const Limits<Number>& limits, Member Options::*member) {
+    return
+        [=](Options& options, const std::string& given) { options.*member = readNumber(limits, given); };
+}
+
+template <typename Member>
+Read pixelsOfCanvas(const Limits<int>& limits, Member voreltext::CanvasRequest::*member) {
     return [=](Options& options, const std::string& given) {
-        Number number{};
-        const char* end = given.data() + given.size();
-        const auto [stop, error] = std::from_chars(given.data(), end, number);
-        const bool whole = error == std::errc{} && stop == end;
-        // "nan" is a number here; it fails both comparisons.
-        if (whole && number >= limits.low && number <= limits.high) {
-            options.*member = number;
-            return;
-        }
-        refuse(given, (std::is_integral_v<Number> ? "no whole number from " : "no number from ") +
-                          spelled(limits));
+        options.canvas.*member = readNumber(limits, given);
     };
 }
 
@@ -60,11 +52,65 @@ Read parsed(Parse parse, Member Options::*member, const char* refusal) {
     };
 }
 
-std::optional<Align> parseAlign(std::string_view text) {
-    if (text == "left") return Align::left;
-    if (text == "center") return Align::center;
-    if (text == "right") return Align::right;
-    return std::nullopt;
+constexpr std::array<Word<Align>, 5> kAligns{{{"left", Align::left},
+                                              {"center", Align::center},
+                                              {"right", Align::right},
+                                              {"start", Align::start},
+                                              {"end", Align::end}}};
+constexpr std::array<Word<Anchor>, 9> kAnchors{{{"top-left", Anchor::topLeft},
+                                                {"top", Anchor::top},
+                                                {"top-right", Anchor::topRight},
+                                                {"left", Anchor::left},
+                                                {"center", Anchor::center},
+                                                {"right", Anchor::right},
+                                                {"bottom-left", Anchor::bottomLeft},
+                                                {"bottom", Anchor::bottom},
+                                                {"bottom-right", Anchor::bottomRight}}};
+constexpr std::array<Word<Fit>, 3> kFits{
+    {{"none", Fit::none}, {"shrink", Fit::shrink}, {"wrap", Fit::wrap}}};
+constexpr std::array<Word<TextBox>, 2> kBoxes{{{"ink", TextBox::ink}, {"line", TextBox::line}}};
+
+template <typename Words, typename Member>
+Read oneOf(const Words& words, Member Options::*member) {
+    return [&words, member](Options& options, const std::string& given) {
+        options.*member = wordAmong(words, given);
+    };
+}
+
+void readSheetSizes(Options& options, const std::string& given) {
+    options.sheetSizes.clear();
+    for (const std::string& size : partsOf(given))
+        options.sheetSizes.push_back(readNumber(kFontSize, size));
+    const Limits<size_t> counts{1, kMostSheetSizes};
+    if (!contains(counts, options.sheetSizes.size()))
+        refuse(given, "no list of " + spelled(counts) + " sizes");
+}
+
+void readVariations(Options& options, const std::string& given) {
+    options.variations.clear();
+    for (const std::string& part : partsOf(given)) {
+        const size_t equals = part.find('=');
+        const auto value = equals == 4 ? numberIn<float>(part.substr(equals + 1)) : std::nullopt;
+        if (!value) refuse(given, "no list of AXIS=VALUE; an axis has four letters, as in wght=700");
+        options.variations.push_back({part.substr(0, equals), *value});
+    }
+}
+
+void readLetterSpacing(Options& options, const std::string& given) {
+    const std::optional<float> pixels = numberIn<float>(given);
+    const std::optional<Length> length = pixels ? Length{*pixels} : vorelstyle::parseLength(given);
+    if (!length || !contains(kLetterSpacing, length->value)) {
+        refuse(given,
+               "no length from " + spelled(kLetterSpacing) + " in pixels or, with a %, in percent");
+    }
+    options.letterSpacing = *length;
+}
+
+void addFont(Options& options, const std::string& given) {
+    if (options.fonts.size() == kMostFonts) {
+        throw ToolError("a text has at most " + std::to_string(kMostFonts) + " fonts");
+    }
+    options.fonts.push_back(given);
 }
 
 std::optional<std::string> parseShell(const std::string& text) {
@@ -78,7 +124,7 @@ std::optional<std::string> parseOutput(const std::string& text) {
 }
 
 /// An option that paints a picture, of a job as well as of the command line.
-Setting pictureOption(const char* name, const char* value, const char* initial, const char* group,
+Setting pictureOption(const char* name, const std::string& value, const char* initial, const char* group,
                       const std::string& description, Read read,
                       Setting::Kind kind = Setting::Kind::text) {
     return {name, "", value, initial, group, description, kind, true, false, std::move(read)};
@@ -97,6 +143,10 @@ Setting programOption(const char* name, const char* value, const char* group, co
     return {name, "", value, "", group, description, kind, false, false, std::move(read)};
 }
 
+Setting pictureFlag(const char* name, const char* group, const std::string& description, Read read) {
+    return pictureOption(name, "", "", group, description, std::move(read), Setting::Kind::flag);
+}
+
 std::vector<Setting> textSettings() {
     constexpr const char* kGroup = "Text";
     Setting words = pictureOption("text", "TEXT", "", kGroup, "The text; a line feed starts a new line",
@@ -106,12 +156,39 @@ std::vector<Setting> textSettings() {
         words,
         pictureOption("text-file", "FILE", "", kGroup, "Read the text from FILE, - for standard input",
                       text(&Options::textFile)),
+        pictureFlag("markup", kGroup,
+                    "Read <c #RRGGBB>...</c> in the text as a colour; &lt;, &gt; and &amp; stand for "
+                    "<, > and &",
+                    flag(&Options::markup)),
+        pictureOption("align", listed(kAligns, "|"), "left", kGroup,
+                      "Where short lines stand; start and end go by the text's direction",
+                      oneOf(kAligns, &Options::align)),
+        pictureNumber("line-height", "FACTOR", "1", kGroup,
+                      "Distance of the lines in line heights of the font, " + spelled(kLineHeight),
+                      numberWithin(kLineHeight, &Options::lineHeight)),
+        pictureOption("letter-spacing", "LENGTH", "0", kGroup,
+                      "Room between letters, in pixels or percent of the size (3px, 5%), " +
+                          spelled(kLetterSpacing),
+                      readLetterSpacing, Setting::Kind::length)};
+}
+
+std::vector<Setting> fontSettings() {
+    constexpr const char* kGroup = "Font";
+    Setting fonts =
         pictureOption("font", "FONT", "DejaVu Sans", kGroup,
-                      "Font file, or family such as 'DejaVu Sans:bold'", text(&Options::font)),
+                      "Font file, or family such as 'DejaVu Sans:bold'; given several times, "
+                      "each has what those before it lack",
+                      addFont, Setting::Kind::list);
+    fonts.forget = [](Options& options) { options.fonts.clear(); };
+    return {
+        fonts,
         pictureNumber("size", "PX", "96", kGroup, "Size of the font in pixels, " + spelled(kFontSize),
                       numberWithin(kFontSize, &Options::size)),
-        pictureOption("align", "left|center|right", "left", kGroup, "Where short lines stand",
-                      parsed(parseAlign, &Options::align, "none of left, center, right"))};
+        pictureOption(
+            "font-features", "LIST", "", kGroup, "OpenType features, such as liga=0,ss01",
+            [](Options& options, const std::string& given) { options.features = partsOf(given); }),
+        pictureOption("font-variations", "LIST", "", kGroup,
+                      "Axes of the first font, such as wght=700,wdth=80", readVariations)};
 }
 
 std::vector<Setting> lookSettings() {
@@ -121,14 +198,46 @@ std::vector<Setting> lookSettings() {
             pictureOption("preset", "PRESET", "", kGroup, "Take the effects of a preset",
                           text(&Options::preset)),
             pictureNumber("effect-scale", "FACTOR", "1", kGroup,
-                          "Multiply the effects' sizes by " + spelled(kEffectScale) +
-                              "; presets are made for text of about 100 pixels",
+                          "Multiply the effects' sizes by " + spelled(kEffectScale),
                           numberWithin(kEffectScale, &Options::effectScale)),
-            pictureOption("color", "#RRGGBB", "", kGroup, "Fill of the text (the style's, else #000000)",
+            pictureOption("color", "#RRGGBB", "", kGroup,
+                          "Fill of the topmost look that has one (the style's, else #000000)",
                           parsed(parseColour, &Options::color, "no colour; write #RRGGBB or #RGB")),
             pictureNumber("opacity", "NUMBER", "", kGroup,
-                          "Opacity of the text, " + spelled(kOpacity) + " (the style's, else 1)",
+                          "Opacity of that text, " + spelled(kOpacity) + " (the style's, else 1)",
                           numberWithin(kOpacity, &Options::opacity))};
+}
+
+std::vector<Setting> canvasSettings() {
+    constexpr const char* kGroup = "Canvas";
+    using voreltext::CanvasRequest;
+    return {pictureNumber(
+                "width", "PX", "", kGroup,
+                "Width of the picture, " + spelled(kCanvasSide) + "; without it, what the text needs",
+                pixelsOfCanvas(kCanvasSide, &CanvasRequest::width)),
+            pictureNumber(
+                "height", "PX", "", kGroup,
+                "Height of the picture, " + spelled(kCanvasSide) + "; without it, what the text needs",
+                pixelsOfCanvas(kCanvasSide, &CanvasRequest::height)),
+            pictureOption("anchor", listed(kAnchors, "|"), "center", kGroup,
+                          "Where the text stands in that width and height",
+                          [](Options& options, const std::string& given) {
+                              options.canvas.anchor = wordAmong(kAnchors, given);
+                          }),
+            pictureNumber("margin", "PX", "0", kGroup,
+                          "Pixels between the text and the edges of that width and height, " +
+                              spelled(kMargin) + "; effects reach into them",
+                          pixelsOfCanvas(kMargin, &CanvasRequest::margin)),
+            pictureOption("fit", listed(kFits, "|"), "none", kGroup,
+                          "What is done with a text that is larger", oneOf(kFits, &Options::fit)),
+            pictureOption("box", listed(kBoxes, "|"), "ink", kGroup,
+                          "What counts as the text's box: its ink, or its lines, which have one height "
+                          "whatever they say",
+                          oneOf(kBoxes, &Options::box)),
+            pictureNumber("padding", "PX", "8", kGroup,
+                          "Pixels around the text and its effects where no width or height is given, " +
+                              spelled(kPadding),
+                          pixelsOfCanvas(kPadding, &CanvasRequest::padding))};
 }
 
 std::vector<Setting> outputSettings() {
@@ -143,9 +252,8 @@ std::vector<Setting> outputSettings() {
                           "What lies behind the text",
                           parsed(parseBackground, &Options::background,
                                  "none of transparent, checkerboard, #RRGGBB, #RGB")),
-            pictureNumber("padding", "PX", "8", kGroup,
-                          "Pixels around the text and its effects, " + spelled(kPadding),
-                          numberWithin(kPadding, &Options::padding))};
+            programOption("strict", "", kGroup, "Take every note for an error, and paint nothing",
+                          flag(&Options::strict))};
 }
 
 std::vector<Setting> seriesSettings() {
@@ -154,7 +262,9 @@ std::vector<Setting> seriesSettings() {
                           "Paint the jobs of FILE, one JSON object a line; - for standard input",
                           text(&Options::batch)),
             programOption("sheet", "", kGroup, "Paint TEXT in every preset, with their names",
-                          flag(&Options::sheet))};
+                          flag(&Options::sheet)),
+            programOption("sizes", "LIST", kGroup, "Sizes of a sheet's columns, such as 24,48,96",
+                          readSheetSizes)};
 }
 
 std::vector<Setting> reportSettings() {
@@ -171,7 +281,14 @@ std::vector<Setting> reportSettings() {
         programOption("print-key", "", kGroup, "Print the look's cache key in hexadecimal",
                       flag(&Options::printKey)),
         programOption("print-margins", "", kGroup, "Print the pixels that the effects need",
-                      flag(&Options::printMargins))};
+                      flag(&Options::printMargins)),
+        programOption("report", "json", kGroup,
+                      "Print where text and picture lie: baselines, boxes, margins, cache key, fonts, "
+                      "missing characters; of a batch one line a job",
+                      [](Options& options, const std::string& given) {
+                          if (given != "json") refuse(given, "none of json");
+                          options.report = true;
+                      })};
 }
 
 std::vector<Setting> helpSettings() {
@@ -188,8 +305,8 @@ std::vector<Setting> helpSettings() {
 
 std::vector<Setting> allSettings() {
     std::vector<Setting> all;
-    for (auto part : {textSettings(), lookSettings(), outputSettings(), seriesSettings(),
-                      reportSettings(), helpSettings()}) {
+    for (auto part : {textSettings(), fontSettings(), lookSettings(), canvasSettings(), outputSettings(),
+                      seriesSettings(), reportSettings(), helpSettings()}) {
         all.insert(all.end(), part.begin(), part.end());
     }
     return all;
@@ -215,8 +332,8 @@ std::vector<std::string> wordsOf(const Setting& setting) {
     std::vector<std::string> words;
     std::istringstream alternatives(setting.value);
     for (std::string word; std::getline(alternatives, word, '|');) {
-        const bool literal =
-            std::all_of(word.begin(), word.end(), [](char c) { return c >= 'a' && c <= 'z'; });
+        const bool literal = std::all_of(word.begin(), word.end(),
+                                         [](char c) { return (c >= 'a' && c <= 'z') || c == '-'; });
         if (literal) words.push_back(word);
     }
     return words;

@@ -11,8 +11,10 @@ namespace vorelpaint {
 
 /// One thing that the program can be asked for by name.
 struct Setting {
-    /// What a value looks like in a job of a batch; a flag has none and stands in no job.
-    enum class Kind { flag, text, number };
+    /// What a value looks like in a job of a batch: true or false, a string, a number, a length, which
+    /// is either of these, or a string or a list of them. On the command line a flag stands alone, and a
+    /// list is an option that may stand several times.
+    enum class Kind { flag, text, number, length, list };
     using Read = std::function<void(Options&, const std::string&)>;
 
     std::string name;    ///< "output": the option --output, the key "output" of a job
@@ -24,7 +26,9 @@ struct Setting {
     Kind kind;
     bool inJobs;        ///< whether a job of a batch may have it as a key
     bool isPositional;  ///< stands on the command line without its name
-    Read read;          ///< takes a value over. Throws ToolError: "'0' is no whole number ..."
+    Read read;  ///< takes a value over; of a flag "true" or "false". Throws ToolError: "'0' is no whole
+                ///< number ..."
+    std::function<void(Options&)> forget{};  ///< of a list: takes what it has back, before the first one
 };
 
 /// Everything there is to ask for: the one list behind the command line, the jobs of a batch, the manual

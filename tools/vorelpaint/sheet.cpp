@@ -1,49 +1,52 @@
 #include "sheet.h"
 
 #include <algorithm>
-#include <cstring>
+#include <memory>
 #include <string>
 #include <utility>
 #include <vector>
 
 #include "font_choice.h"
+#include "layer_set.h"
+#include "painting.h"
 #include "progress.h"
+#include "set_text.h"
 #include "style_file.h"
 
 namespace vorelpaint {
 namespace {
 
 using vorelstyle::Look;
-using voreltext::Align;
+using vorelstyle::MarkedText;
 using voreltext::Box;
-using voreltext::decodeUtf8;
-using voreltext::Font;
-using voreltext::FontFile;
-using voreltext::Frame;
+using voreltext::Canvas;
 using voreltext::Image;
+using voreltext::Layer;
 using voreltext::Margins;
-using voreltext::marginsOf;
-using voreltext::TextLayout;
 
 constexpr int kSmallestLabel = 10;
 constexpr int kLargestLabel = 40;
 constexpr int kLabelShare = 6;  ///< the text's size in sizes of its label
 
-/// The presets' text with its effects above, the preset's name below.
+/// The presets' text in one size with its effects above, the preset's name below.
 struct Cell {
-    Look look;
-    TextLayout label;
+    LayerSet looks;
+    SetText label;
 };
 
-/// What every cell of the sheet measures: the room that the most reaching effects need on each side, and
+/// The cells of one size.
+struct Column {
+    SetText text;
+    std::vector<Cell> cells;
+};
+
+/// What every cell of a column measures: the room that the most reaching effects need on each side, and
 /// a band for the name.
-struct Grid {
+struct CellSize {
     Margins margins{0, 0, 0, 0};
     Box label;  ///< around every name, from the start of its baseline
     int width = 0;
     int height = 0;
-    int columns = 0;
-    int rows = 0;
 };
 
 /// Reads on a dark and on a light ground alike, unless the ground is known.
@@ -57,12 +60,27 @@ uint32_t labelColour(const Background& background) {
     return brightness < 128 ? 0xFFFFFF : 0;
 }
 
-Cell makeCell(const Options& options, const std::string& preset, const Font& labelFont,
-              const Warn& warn) {
+/// A preset's name, set plainly in the first font.
+SetText labelOf(const Options& options, const std::string& preset, int size) {
+    Options plain;
+    plain.fonts = options.fonts;
+    const int labelSize = std::clamp(size / kLabelShare, kSmallestLabel, kLargestLabel);
+    return {plain, voreltext::decodeUtf8(preset), labelSize};
+}
+
+Column columnOf(const Options& options, const MarkedText& source, int size, const Note& note) {
     Options chosen = options;
-    chosen.preset = preset;
-    return {makeLook(chosen, chosenStyle(chosen), warn),
-            TextLayout(labelFont, decodeUtf8(preset), Align::left)};
+    chosen.size = size;
+    Column column{setToFit(chosen, source.text), {}};
+    noteMissing(column.text.layout(), source.text, note);
+    for (const std::string& preset : presetNames()) {
+        chosen.preset = preset;
+        const Note noteOfPreset = [&](const std::string& line) { note(preset + ": " + line); };
+        column.cells.push_back(
+            {LayerSet(chosen, chosenStyle(chosen), size, source.colours, noteOfPreset),
+             labelOf(chosen, preset, size)});
+    }
+    return column;
 }
 
 void grow(Margins& margins, const Margins& others) {
@@ -70,56 +88,74 @@ void grow(Margins& margins, const Margins& others) {
                std::max(margins.right, others.right), std::max(margins.bottom, others.bottom)};
 }
 
-void grow(Box& box, const Box& other) {
-    box = {std::min(box.left, other.left), std::min(box.top, other.top),
-           std::max(box.right, other.right), std::max(box.bottom, other.bottom)};
+CellSize sizeOf(const Column& column, int padding) {
+    CellSize size;
+    for (const Cell& cell : column.cells) {
+        grow(size.margins, marginsOf(cell.looks.layers()));
+        size.label = unionOf(size.label, cell.label.layout().inkBox());
+    }
+    const Canvas canvas = placedOn({{}, {}, {}, 0, padding}, column.text.box(), size.margins);
+    size.width = std::max(canvas.width, size.label.width() + 2 * padding);
+    size.height = canvas.height + size.label.height() + padding;
+    return size;
 }
 
-Grid gridOf(std::vector<Cell>& cells, const Box& ink, int padding) {
-    Grid grid;
-    for (Cell& cell : cells) {
-        grow(grid.margins, marginsOf(cell.look.effects()));
-        grow(grid.label, cell.label.inkBox());
+/// Paints into the cell whose top left corner is at (left, top) of the sheet.
+class CellPainter {
+  public:
+    CellPainter(Image& sheet, const Options& options) : mSheet(sheet), mOptions(options) {}
+
+    void paint(const Column& column, const CellSize& size, const Cell& cell, int left, int top) {
+        const int padding = mOptions.canvas.padding;
+        const Canvas whole = placedOn({{}, {}, {}, 0, padding}, column.text.box(), size.margins);
+        const int slack = size.width - whole.width;
+        layOver(mSheet, voreltext::paint(cell.looks.layers(), column.text.layout(), whole),
+                left + slack / 2, top);
+
+        const Box& name = cell.label.box();
+        const Look plain({}, labelColour(mOptions.background), 1);
+        const std::vector<Layer> layers{{&plain.effects()}};
+        const Canvas band{size.width, size.label.height(), (size.width - name.width()) / 2 - name.left,
+                          -size.label.top};
+        layOver(mSheet, voreltext::paint(layers, cell.label.layout(), band), left, top + whole.height);
     }
-    const Frame frame{ink, grid.margins, padding};
-    const int count = static_cast<int>(cells.size());
-    grid.width = std::max(frame.width(), grid.label.width() + 2 * padding);
-    grid.height = frame.height() + grid.label.height() + padding;
-    grid.columns = sheetColumns(count, grid.width, grid.height);
+
+  private:
+    Image& mSheet;
+    const Options& mOptions;
+};
+
+/// Where the cells of a sheet stand: those of one size beside and below each other, those of several
+/// sizes in a column for each.
+struct Grid {
+    int columns;
+    int rows;
+    std::vector<CellSize> sizes;
+
+    int width(size_t column) const { return sizes[sizes.size() == 1 ? 0 : column].width; }
+    int height() const {
+        int most = 0;
+        for (const CellSize& size : sizes)
+            most = std::max(most, size.height);
+        return most;
+    }
+    int left(int column) const {
+        int left = 0;
+        for (int i = 0; i < column; ++i)
+            left += width(static_cast<size_t>(i));
+        return left;
+    }
+};
+
+Grid gridOf(const std::vector<Column>& columns, int padding) {
+    Grid grid{static_cast<int>(columns.size()), static_cast<int>(columns.front().cells.size()), {}};
+    for (const Column& column : columns)
+        grid.sizes.push_back(sizeOf(column, padding));
+    if (columns.size() > 1) return grid;
+    const int count = grid.rows;
+    grid.columns = sheetColumns(count, grid.width(0), grid.height());
     grid.rows = (count + grid.columns - 1) / grid.columns;
-    voreltext::checkSize(grid.columns * grid.width, grid.rows * grid.height);
     return grid;
-}
-
-size_t offsetOf(const Image& image, int x, int y) {
-    return (static_cast<size_t>(y) * static_cast<size_t>(image.width) + static_cast<size_t>(x)) * 4;
-}
-
-/// Lays a picture on an empty part of the sheet.
-void lay(Image& sheet, const Image& picture, int x, int y) {
-    const size_t bytes = static_cast<size_t>(picture.width) * 4;
-    for (int row = 0; row < picture.height; ++row) {
-        std::memcpy(&sheet.pixels[offsetOf(sheet, x, y + row)],
-                    &picture.pixels[offsetOf(picture, 0, row)], bytes);
-    }
-}
-
-/// Lays the picture of a cell and of its name into the cell at (left, top).
-void layCell(Image& sheet, const Grid& grid, int left, int top, Cell& cell, const TextLayout& text,
-             int padding, uint32_t colour) {
-    const Margins margins = marginsOf(cell.look.effects());
-    const Frame frame{text.inkBox(), grid.margins, padding};
-    const int slack = grid.width - frame.width();
-    lay(sheet, paint(cell.look.effects(), text, 0),
-        left + slack / 2 + padding + grid.margins.left - margins.left,
-        top + padding + grid.margins.top - margins.top);
-
-    if (cell.label.glyphCount() == 0) return;  // the font has blanks for these letters
-    const Box& name = cell.label.inkBox();
-    const int baseline = top + frame.height() - grid.label.top;
-    Look look({}, colour, 1);
-    lay(sheet, paint(look.effects(), cell.label, 0), left + (grid.width - name.width()) / 2,
-        baseline + name.top);
 }
 
 }  // namespace
@@ -132,24 +168,25 @@ int sheetColumns(int count, int cellWidth, int cellHeight) {
     return columns;
 }
 
-void paintSheet(const Options& options, const Warn& warn) {
-    const FontFile file = findFont(options.font);
-    const Font font(file, options.size);
-    const Font labelFont(file, std::clamp(options.size / kLabelShare, kSmallestLabel, kLargestLabel));
-    const TextLayout text = layOutText(options, font, warn);
-    std::vector<Cell> cells;
-    for (const std::string& preset : presetNames())
-        cells.push_back(makeCell(options, preset, labelFont, warn));
-    const Grid grid = gridOf(cells, text.inkBox(), options.padding);
+void paintSheet(const Options& options, const Note& note) {
+    const MarkedText source = chosenText(options);
+    const std::vector<int> sizes =
+        options.sheetSizes.empty() ? std::vector<int>{options.size} : options.sheetSizes;
+    std::vector<Column> columns;
+    for (const int size : sizes)
+        columns.push_back(columnOf(options, source, size, note));
+    const Grid grid = gridOf(columns, options.canvas.padding);
 
-    Image sheet{grid.columns * grid.width, grid.rows * grid.height, {}};
-    sheet.pixels.resize(static_cast<size_t>(sheet.width) * static_cast<size_t>(sheet.height) * 4);
-    Progress progress("presets", cells.size());
-    for (size_t i = 0; i < cells.size(); ++i) {
+    Image sheet = voreltext::transparentImage(grid.left(grid.columns), grid.rows * grid.height());
+    CellPainter painter(sheet, options);
+    const size_t count = columns.front().cells.size();
+    Progress progress("pictures", count * columns.size());
+    for (size_t i = 0; i < count * columns.size(); ++i) {
         const int column = static_cast<int>(i) % grid.columns;
         const int row = static_cast<int>(i) / grid.columns;
-        layCell(sheet, grid, column * grid.width, row * grid.height, cells[i], text, options.padding,
-                labelColour(options.background));
+        const size_t of = columns.size() == 1 ? 0 : static_cast<size_t>(column);
+        const Cell& cell = columns[of].cells[columns.size() == 1 ? i : static_cast<size_t>(row)];
+        painter.paint(columns[of], grid.sizes[of], cell, grid.left(column), row * grid.height());
         progress.advance();
     }
     writePicture(options, std::move(sheet));

@@ -1,0 +1,232 @@
+#include "text/layers.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <cstdint>
+#include <string_view>
+#include <vector>
+
+#include "text/overlay.h"
+#include "text/utf8.h"
+
+namespace voreltext {
+namespace {
+
+using VFontEffect::VFEffect;
+using VFontEffect::VFGradient;
+
+constexpr int kSize = 40;
+
+/// A text in the font of the tests.
+class Sample {
+  public:
+    explicit Sample(std::string_view text) {
+        mFonts.add(FontFile{VOREL_TEST_FONT}, kSize);
+        mLayout = std::make_unique<TextLayout>(mFonts, decodeUtf8(text), TextSettings{});
+    }
+    const TextLayout& layout() const { return *mLayout; }
+
+  private:
+    Fonts mFonts;
+    std::unique_ptr<TextLayout> mLayout;
+};
+
+VFEffect fill(uint32_t colour) {
+    VFEffect effects;
+    effects.addText(colour, 1);
+    return effects;
+}
+
+/// White at the top of the text box, black at its bottom, in steps of one colour each.
+VFEffect ramp() {
+    VFEffect effects;
+    VFGradient stops[]{{0x000000, 1, 0}, {0xFFFFFF, 1, 1}};
+    effects.addLinearGradientText(90, 1, 1, 2, stops);
+    effects.addText(0x00FF00, 1);
+    return effects;
+}
+
+VFEffect everything() {
+    VFEffect effects;
+    effects.addOuterShadowText(135, 6, 5, 0x203040, 0.7F);
+    effects.addStrokeText(4, 0xC02020, 1, 0, 1);
+    effects.addInnerShadowText(90, 3, 3, 0x000000, 0.5F);
+    effects.addText(0xFFE080, 1);
+    return effects;
+}
+
+Canvas around(const TextLayout& text, const std::vector<Layer>& layers) {
+    return placedOn({}, text.inkBox(), marginsOf(layers));
+}
+
+Image painted(const Sample& sample, const std::vector<Layer>& layers) {
+    return paint(layers, sample.layout(), around(sample.layout(), layers));
+}
+
+const uint8_t* pixelAt(const Image& image, int x, int y) {
+    return &image.pixels[offsetOf(image, x, y)];
+}
+
+/// The rows of a picture from `top` on.
+std::vector<uint8_t> rows(const Image& image, int top, int count) {
+    const auto at = image.pixels.begin() + static_cast<std::ptrdiff_t>(offsetOf(image, 0, top));
+    return {at, at + static_cast<std::ptrdiff_t>(image.width) * 4 * count};
+}
+
+TEST(Layers, OneOfTheWholeText_IsThePictureOfItsEffects) {
+    const Sample sample("Type\nface");
+    for (VFEffect effects : {fill(0x102030), ramp(), everything()}) {
+        const std::vector<Layer> layers{{&effects}};
+        const Image image = painted(sample, layers);
+        const Image wanted = paint(effects, sample.layout(), 0);
+        EXPECT_EQ(image.width, wanted.width);
+        EXPECT_EQ(image.pixels, wanted.pixels);
+    }
+}
+
+TEST(Layers, PaintedAgain_AreTheSamePicture) {
+    const Sample sample("Again");
+    VFEffect below = everything();
+    VFEffect above = ramp();
+    const std::vector<Layer> layers{{&below}, {&above, 2, 3, Span::glyph}};
+    EXPECT_EQ(painted(sample, layers).pixels, painted(sample, layers).pixels);
+}
+
+TEST(Layers, LastLiesOnTop) {
+    const Sample sample("I");
+    VFEffect red = fill(0xFF0000);
+    VFEffect blue = fill(0x0000FF);
+    const Image image = painted(sample, {{&red}, {&blue}});
+    const uint8_t* middle = pixelAt(image, image.width / 2, image.height / 2);
+    EXPECT_EQ(middle[0], 0);
+    EXPECT_EQ(middle[2], 255);
+}
+
+TEST(Layers, MovedOne_GrowsTheMarginsWhereItGoes) {
+    VFEffect plain = fill(0);
+    VFEffect shadow;
+    shadow.addOuterShadowText(0, 10, 0, 0, 1);  // 10 pixels to the left
+    const Margins margins = marginsOf({{&plain, 3, -4}, {&shadow, 2, 0}});
+    EXPECT_EQ(margins.left, 8);
+    EXPECT_EQ(margins.top, 4);
+    EXPECT_EQ(margins.right, 3);
+    EXPECT_EQ(margins.bottom, 0);
+}
+
+TEST(Layers, MovedOne_IsTheSamePictureElsewhere) {
+    const Sample sample("Go");
+    VFEffect effects = everything();
+    const Canvas canvas{300, 200, 100, 100};
+    const Image still = paint({{&effects}}, sample.layout(), canvas);
+    const Image moved = paint({{&effects, 7, -5}}, sample.layout(), canvas);
+    Image wanted{300, 200, std::vector<uint8_t>(still.pixels.size())};
+    layOver(wanted, still, 7, -5);
+    EXPECT_EQ(moved.pixels, wanted.pixels);
+    EXPECT_NE(moved.pixels, still.pixels);
+}
+
+TEST(Layers, SmallerCanvas_IsAPartOfThePicture) {
+    const Sample sample("Cut off");
+    VFEffect effects = everything();
+    const std::vector<Layer> layers{{&effects, 0, 0, Span::block}, {&effects, 4, 4, Span::word}};
+    const Canvas whole = around(sample.layout(), layers);
+    const Image image = paint(layers, sample.layout(), whole);
+    const Canvas part{whole.width / 2, whole.height / 2, whole.x - whole.width / 3, whole.y - 7};
+    const Image cut = paint(layers, sample.layout(), part);
+    Image wanted{part.width, part.height, std::vector<uint8_t>(cut.pixels.size())};
+    layOver(wanted, image, -whole.width / 3, -7);
+    EXPECT_EQ(cut.pixels, wanted.pixels);
+}
+
+TEST(Spans, EachLineHasARampOfItsOwn) {
+    const Sample sample("II\nII");
+    const Box ink = sample.layout().inkBox();
+    const int high = sample.layout().glyph(0).box.height();
+    VFEffect effects = ramp();
+    const Image byLine = painted(sample, {{&effects, 0, 0, Span::line}});
+    EXPECT_EQ(rows(byLine, 0, high), rows(byLine, ink.height() - high, high));
+    const Image asBlock = painted(sample, {{&effects}});
+    EXPECT_NE(rows(asBlock, 0, high), rows(asBlock, ink.height() - high, high));
+}
+
+/// The channel of the ramp in the middle of a glyph's lowest row that is wholly covered.
+int rampAtTheFootOf(const Sample& sample, const Image& image, size_t glyph) {
+    const Box& box = sample.layout().glyph(glyph).box;
+    const Box& ink = sample.layout().inkBox();
+    return pixelAt(image, (box.left + box.right) / 2 - ink.left, box.bottom - 2 - ink.top)[0];
+}
+
+TEST(Spans, EachWordHasARampOfItsOwn) {
+    // The foot of the second word is at half of the block's height, but at the end of its own ramp.
+    const Sample sample("I\xC2\xB7| |I| '");
+    const size_t last = sample.layout().glyphCount() - 1;
+    VFEffect effects = ramp();
+    const Image asBlock = painted(sample, {{&effects}});
+    const Image byWord = painted(sample, {{&effects, 0, 0, Span::word}});
+    EXPECT_GT(rampAtTheFootOf(sample, asBlock, last), 100);
+    EXPECT_LT(rampAtTheFootOf(sample, byWord, last), 60);
+}
+
+TEST(Spans, EachGlyphHasARampOfItsOwn) {
+    const Sample sample("I'");
+    VFEffect effects = ramp();
+    const Image byWord = painted(sample, {{&effects, 0, 0, Span::word}});
+    const Image byGlyph = painted(sample, {{&effects, 0, 0, Span::glyph}});
+    EXPECT_GT(rampAtTheFootOf(sample, byWord, 1), 100);
+    EXPECT_LT(rampAtTheFootOf(sample, byGlyph, 1), 60);
+    EXPECT_EQ(rampAtTheFootOf(sample, byGlyph, 0), rampAtTheFootOf(sample, byWord, 0));
+}
+
+TEST(Spans, LaterOnes_LieOverEarlierOnes) {
+    const Sample sample("II");
+    VFEffect effects;
+    effects.addStrokeText(20, 0x0000FF, 1, 0, 1);
+    effects.addText(0xFF0000, 1);
+    const Image image = painted(sample, {{&effects, 0, 0, Span::glyph}});
+    const Box& ink = sample.layout().inkBox();
+    const auto middleOf = [&](size_t i) {
+        const Box& box = sample.layout().glyph(i).box;
+        return pixelAt(image, (box.left + box.right) / 2 - ink.left + 20, ink.height() / 2 + 20);
+    };
+    EXPECT_EQ(middleOf(0)[2], 255) << "the stroke of the second letter covers the first";
+    EXPECT_EQ(middleOf(1)[0], 255);
+}
+
+/// Half of a text in another colour: only its glyphs are taken from the other picture.
+TEST(Exchange, ChangesTheGlyphsAlone) {
+    const Sample sample("abcd");
+    VFEffect red = everything();
+    VFEffect green = everything();
+    green.addText(0x00FF00, 1);
+    Layer layer{&red};
+    layer.exchanges.push_back({1, 3, &green});
+    const Image image = painted(sample, {layer});
+    const Image asRed = painted(sample, {{&red}});
+    const Image asGreen = painted(sample, {{&green}});
+
+    Image covered{image.width, image.height, std::vector<uint8_t>(image.pixels.size())};
+    const Canvas canvas = around(sample.layout(), {layer});
+    for (const size_t i : {1, 2}) {
+        const GlyphMask mask = sample.layout().rasterise(i);
+        Image glyph{mask.box.width(), mask.box.height(), {}};
+        for (const uint8_t each : mask.coverage)
+            glyph.pixels.insert(glyph.pixels.end(), 4, each);
+        layOver(covered, glyph, mask.box.left + canvas.x, mask.box.top + canvas.y);
+    }
+    for (size_t at = 0; at < image.pixels.size(); at += 4) {
+        const Image& wanted = covered.pixels[at] != 0 ? asGreen : asRed;
+        ASSERT_TRUE(std::equal(&image.pixels[at], &image.pixels[at] + 4, &wanted.pixels[at])) << at;
+    }
+    EXPECT_NE(image.pixels, asRed.pixels);
+}
+
+TEST(Layers, WithoutGlyphs_AreATransparentPicture) {
+    const Sample sample(" ");
+    VFEffect effects = everything();
+    const Image image = paint({{&effects}}, sample.layout(), {5, 4, 0, 0});
+    EXPECT_EQ(image.pixels, std::vector<uint8_t>(5 * 4 * 4));
+}
+
+}  // namespace
+}  // namespace voreltext

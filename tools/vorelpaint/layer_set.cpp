@@ -1,0 +1,107 @@
+#include "layer_set.h"
+
+#include <algorithm>
+#include <map>
+#include <optional>
+#include <string>
+#include <variant>
+
+#include "style_file.h"
+
+namespace vorelpaint {
+namespace {
+
+using vorelstyle::ColourRange;
+using vorelstyle::Effect;
+using vorelstyle::Look;
+using vorelstyle::LookStyle;
+using vorelstyle::Stack;
+using vorelstyle::StackedLook;
+using vorelstyle::Style;
+using voreltext::Layer;
+
+/// The rooms of styles and of text do not know each other; they count their spans alike.
+voreltext::Span spanOf(vorelstyle::Span span) {
+    switch (span) {
+        case vorelstyle::Span::line:
+            return voreltext::Span::line;
+        case vorelstyle::Span::word:
+            return voreltext::Span::word;
+        case vorelstyle::Span::glyph:
+            return voreltext::Span::glyph;
+        default:
+            return voreltext::Span::block;
+    }
+}
+
+Layer layerOf(const StackedLook& stacked) {
+    Layer layer{&stacked.look.effects()};
+    layer.x = stacked.place.offsetX;
+    layer.y = stacked.place.offsetY;
+    layer.span = spanOf(stacked.place.span);
+    return layer;
+}
+
+/// The effect of a look that leaves nothing to be seen of the fill; empty when there is none.
+std::string coverOf(const LookStyle& look) {
+    for (const Effect& effect : look.effects) {
+        const auto* linear = std::get_if<vorelstyle::LinearGradient>(&effect);
+        const auto* radial = std::get_if<vorelstyle::RadialGradient>(&effect);
+        const bool covers = (linear != nullptr && linear->opacity >= 1.0F) ||
+                            (radial != nullptr && radial->opacity >= 1.0F);
+        if (covers) return std::string(effectName(effect));
+    }
+    return "";
+}
+
+}  // namespace
+
+Style chosenStyle(const Options& options) {
+    if (options.inlineStyle) return *options.inlineStyle;
+    if (options.preset) return loadStyle(findPreset(*options.preset));
+    if (options.style) return loadStyle(*options.style);
+    return {};
+}
+
+LayerSet::LayerSet(const Options& options, const Style& style, int size,
+                   const std::vector<ColourRange>& colours, const Note& note)
+    : mStyle(resolvedStyle(style, size, options.effectScale, note)),
+      mStack(std::make_unique<Stack>(mStyle, options.color, options.opacity, imagesOf(mStyle))) {
+    for (const std::string& line : mStack->notes())
+        note(line);
+    for (const std::string& effect : mStack->unpainted())
+        note("the library has no core for " + effect + "; it is not painted");
+    for (const StackedLook& stacked : mStack->looks())
+        mLayers.push_back(layerOf(stacked));
+    addColours(options, colours, note);
+}
+
+/// The topmost filled look takes the colours of the markup, and the pictures of colour fonts lie on it;
+/// where no look is filled, the pictures lie on the top.
+void LayerSet::addColours(const Options& options, const std::vector<ColourRange>& colours,
+                          const Note& note) {
+    const std::optional<size_t> top = mStack->topFill();
+    Layer& layer = top ? mLayers[*top] : mLayers.back();
+    layer.takesPictures = true;
+    if (!top) {
+        if (!colours.empty()) note("no look is filled: the colours of the markup do not show");
+        return;
+    }
+    const LookStyle& look = mStyle.looks[*top];
+    const float opacity = textPaintOf(mStyle, *top, options.color, options.opacity).opacity;
+    layer.pictureOpacity = opacity;
+    if (!colours.empty() && !coverOf(look).empty()) {
+        note("the look's " + coverOf(look) + " covers the colours of the markup");
+    }
+    std::map<uint32_t, const Look*> looks;
+    for (const ColourRange& range : colours) {
+        const Look*& coloured = looks[range.colour];
+        if (coloured == nullptr) {
+            mColoured.push_back(std::make_unique<Look>(look, range.colour, opacity, imagesOf(mStyle)));
+            coloured = mColoured.back().get();
+        }
+        layer.exchanges.push_back({range.begin, range.end, &coloured->effects()});
+    }
+}
+
+}  // namespace vorelpaint

@@ -1,0 +1,138 @@
+#include "set_text.h"
+
+#include <algorithm>
+#include <cmath>
+#include <optional>
+#include <string>
+#include <utility>
+
+#include "error.h"
+#include "file_io.h"
+#include "font_choice.h"
+#include "ranges.h"
+#include "unicode/lines.h"
+#include "unicode/utf8.h"
+
+namespace vorelpaint {
+namespace {
+
+using voreltext::Align;
+using voreltext::Box;
+using voreltext::Font;
+using voreltext::FontFile;
+using voreltext::Fonts;
+using voreltext::Glyph;
+using voreltext::Room;
+using voreltext::TextLayout;
+using voreltext::TextSettings;
+
+constexpr size_t kMostMissingNamed = 8;
+
+std::string bytesOfText(const Options& options) {
+    if (options.text) return *options.text;
+    std::string text = readFile(options.textFile.value(), kMaxTextBytes);
+    if (!text.empty() && text.back() == '\n') text.pop_back();
+    return text;
+}
+
+/// In 64ths of a pixel.
+int64_t letterSpacing(const Options& options, int size) {
+    const vorelstyle::Length& length = options.letterSpacing;
+    const bool isShare = length.unit == vorelstyle::Length::Unit::percent;
+    const double pixels = isShare ? length.value * size / 100.0 : double{length.value};
+    return std::llround(pixels * 64.0);
+}
+
+std::unique_ptr<Fonts> openFonts(const Options& options, int size) {
+    std::unique_ptr<Fonts> fonts;
+    FontFile main;
+    for (const std::string& request : options.fonts) {
+        const FontFile file = findFont(request);
+        if (fonts) {
+            fonts->add(Font(file, size));
+        } else {
+            main = file;
+            fonts = std::make_unique<Fonts>(Font(file, size, options.variations));
+        }
+    }
+    fonts->setFallback(
+        [main](const std::vector<uint32_t>& cluster) { return findFontFor(cluster, main); });
+    return fonts;
+}
+
+const Glyph* glyphBeyond(const Room& room, const TextLayout& layout) {
+    for (size_t i = 0; i < layout.glyphCount(); ++i) {
+        if (!room.holds(layout.glyph(i).box)) return &layout.glyph(i);
+    }
+    return nullptr;
+}
+
+void requireRoomForGlyphs(const Room& room, const TextLayout& layout,
+                          const std::vector<uint32_t>& text) {
+    const Glyph* glyph = glyphBeyond(room, layout);
+    if (glyph == nullptr) return;
+    throw ToolError(
+        "the canvas is too small for one glyph: that of " + vorelunicode::nameOf(text[glyph->cluster]) +
+        " at " + vorelunicode::placeName(text, glyph->cluster) + " is " +
+        std::to_string(glyph->box.width()) + " x " + std::to_string(glyph->box.height()) + " pixels");
+}
+
+SetText setInCanvas(const Options& options, const Room& room, const std::vector<uint32_t>& text) {
+    if (options.fit == Fit::wrap) return {options, text, options.size, *room.width};
+    SetText whole(options, text, options.size);
+    if (options.fit == Fit::none || room.holds(whole.box())) return whole;
+    std::optional<SetText> best;
+    voreltext::largestThatFits(options.size - 1, [&](int size) {
+        if (size < 1) return false;
+        SetText smaller(options, text, size);
+        const bool fits = room.holds(smaller.box());
+        if (fits && (!best || size > best->size())) best.emplace(std::move(smaller));
+        return fits;
+    });
+    if (best) return std::move(*best);
+    throw ToolError("the text does not fit the canvas at any size");
+}
+
+}  // namespace
+
+vorelstyle::MarkedText chosenText(const Options& options) {
+    std::vector<uint32_t> text = voreltext::decodeUtf8(bytesOfText(options));
+    if (options.markup) return vorelstyle::parseMarkup(text);
+    return {std::move(text), {}};
+}
+
+SetText::SetText(const Options& options, const std::vector<uint32_t>& text, int size, int wrapWidth)
+    : mSize(size),
+      mFonts(openFonts(options, size)),
+      mLayout(std::make_unique<TextLayout>(
+          *mFonts, text,
+          TextSettings{options.align, options.lineHeight, letterSpacing(options, size), wrapWidth,
+                       options.features})),
+      mBox(options.box == TextBox::ink ? mLayout->inkBox() : mLayout->lineBox()) {}
+
+SetText setToFit(const Options& options, const std::vector<uint32_t>& text) {
+    const Room room = voreltext::roomOf(options.canvas);
+    SetText set = setInCanvas(options, room, text);
+    if (set.layout().glyphCount() == 0) {
+        throw ToolError("nothing to paint: the text has no visible character");
+    }
+    requireRoomForGlyphs(room, set.layout(), text);
+    return set;
+}
+
+void noteMissing(const TextLayout& layout, const std::vector<uint32_t>& text, const Note& note) {
+    std::string names;
+    size_t named = 0;
+    for (const voreltext::MissingCharacter& missing : layout.missing()) {
+        if (++named > kMostMissingNamed) continue;
+        names += (names.empty() ? "" : ", ") + vorelunicode::nameOf(missing.code) + " (" +
+                 vorelunicode::placeName(text, missing.first) + ")";
+    }
+    if (named == 0) return;
+    if (named > kMostMissingNamed) {
+        names += " and " + std::to_string(named - kMostMissingNamed) + " more";
+    }
+    note("no font has " + names + "; its sign for missing characters is painted");
+}
+
+}  // namespace vorelpaint

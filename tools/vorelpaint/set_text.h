@@ -1,0 +1,42 @@
+#pragma once
+
+#include <cstdint>
+#include <memory>
+#include <vector>
+
+#include "note.h"
+#include "options.h"
+#include "style/vorelstyle.h"
+#include "text/voreltext.h"
+
+namespace vorelpaint {
+
+/// The text that is asked for, without its markup. Throws ToolError, TextError or StyleError.
+vorelstyle::MarkedText chosenText(const Options& options);
+
+/// A text set in its fonts at one size.
+class SetText {
+  public:
+    /// Lines are broken at `wrapWidth` pixels, at 0 never. Throws ToolError or TextError.
+    SetText(const Options& options, const std::vector<uint32_t>& text, int size, int wrapWidth = 0);
+
+    int size() const { return mSize; }  ///< of the font, in pixels
+    const voreltext::TextLayout& layout() const { return *mLayout; }
+    const voreltext::Box& box() const { return mBox; }  ///< the kind of box that is asked for
+
+  private:
+    int mSize;
+    std::unique_ptr<voreltext::Fonts> mFonts;
+    std::unique_ptr<voreltext::TextLayout> mLayout;
+    voreltext::Box mBox;
+};
+
+/// Sets the text so that it fits its canvas as is asked for: in broken lines, or in a smaller font.
+/// Throws ToolError when nothing of it is visible, or the canvas is too small for one of its glyphs.
+SetText setToFit(const Options& options, const std::vector<uint32_t>& text);
+
+/// Notes the characters that no font has.
+void noteMissing(const voreltext::TextLayout& layout, const std::vector<uint32_t>& text,
+                 const Note& note);
+
+}  // namespace vorelpaint
