@@ -27,6 +27,7 @@ namespace {
 using vorelstyle::Look;
 using vorelstyle::Style;
 using voreltext::Font;
+using voreltext::Fonts;
 using voreltext::Margins;
 using voreltext::marginsOf;
 using voreltext::TextLayout;
@@ -74,8 +75,8 @@ void present(const Options& options) {
         return;
     }
     if (!options.explain && !options.output) return;
-    const Font font(findFont(options.font), options.size);
-    const TextLayout text = layOutText(options, font, say);
+    Fonts fonts{Font(findFont(options.font), options.size)};
+    const TextLayout text = layOutText(options, fonts, say);
     if (options.explain) printExplanation(options, style, look, &text);
     if (options.output) writePicture(options, paint(look.effects(), text, options.padding));
 }

@@ -16,6 +16,7 @@ namespace {
 using vorelstyle::Look;
 using vorelstyle::Style;
 using voreltext::Font;
+using voreltext::Fonts;
 using voreltext::Image;
 using voreltext::TextLayout;
 
@@ -55,12 +56,13 @@ Look makeLook(const Options& options, const Style& style, const Warn& warn) {
     return look;
 }
 
-TextLayout layOutText(const Options& options, const Font& font, const Warn& warn) {
-    TextLayout text(font, voreltext::decodeUtf8(chosenText(options)), options.align);
+TextLayout layOutText(const Options& options, Fonts& fonts, const Warn& warn) {
+    TextLayout text(fonts, voreltext::decodeUtf8(chosenText(options)), {options.align});
     if (text.glyphCount() == 0) throw ToolError("nothing to paint: the text has no visible character");
-    if (text.missingGlyphs() > 0) {
-        warn("warning: characters missing from the font: " + std::to_string(text.missingGlyphs()));
-    }
+    size_t missing = 0;
+    for (const voreltext::MissingCharacter& character : text.missing())
+        missing += character.count;
+    if (missing > 0) warn("warning: characters missing from the font: " + std::to_string(missing));
     return text;
 }
 
@@ -71,8 +73,8 @@ void writePicture(const Options& options, Image picture) {
 
 void paintPicture(const Options& options, const Warn& warn) {
     Look look = makeLook(options, chosenStyle(options), warn);
-    const Font font(findFont(options.font), options.size);
-    writePicture(options, paint(look.effects(), layOutText(options, font, warn), options.padding));
+    Fonts fonts{Font(findFont(options.font), options.size)};
+    writePicture(options, paint(look.effects(), layOutText(options, fonts, warn), options.padding));
 }
 
 }  // namespace vorelpaint

@@ -29,7 +29,7 @@ std::string chosenText(const Options& options);
 vorelstyle::Look makeLook(const Options& options, const vorelstyle::Style& style, const Warn& warn);
 
 /// The text in its font, which must outlive it. Refuses a text without ink.
-voreltext::TextLayout layOutText(const Options& options, const voreltext::Font& font, const Warn& warn);
+voreltext::TextLayout layOutText(const Options& options, voreltext::Fonts& fonts, const Warn& warn);
 
 /// The picture on its background into its file.
 void writePicture(const Options& options, voreltext::Image picture);

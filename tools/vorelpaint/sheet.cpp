@@ -14,11 +14,11 @@ namespace vorelpaint {
 namespace {
 
 using vorelstyle::Look;
-using voreltext::Align;
 using voreltext::Box;
 using voreltext::decodeUtf8;
 using voreltext::Font;
 using voreltext::FontFile;
+using voreltext::Fonts;
 using voreltext::Frame;
 using voreltext::Image;
 using voreltext::Margins;
@@ -57,12 +57,10 @@ uint32_t labelColour(const Background& background) {
     return brightness < 128 ? 0xFFFFFF : 0;
 }
 
-Cell makeCell(const Options& options, const std::string& preset, const Font& labelFont,
-              const Warn& warn) {
+Cell makeCell(const Options& options, const std::string& preset, Fonts& labelFonts, const Warn& warn) {
     Options chosen = options;
     chosen.preset = preset;
-    return {makeLook(chosen, chosenStyle(chosen), warn),
-            TextLayout(labelFont, decodeUtf8(preset), Align::left)};
+    return {makeLook(chosen, chosenStyle(chosen), warn), TextLayout(labelFonts, decodeUtf8(preset))};
 }
 
 void grow(Margins& margins, const Margins& others) {
@@ -134,12 +132,12 @@ int sheetColumns(int count, int cellWidth, int cellHeight) {
 
 void paintSheet(const Options& options, const Warn& warn) {
     const FontFile file = findFont(options.font);
-    const Font font(file, options.size);
-    const Font labelFont(file, std::clamp(options.size / kLabelShare, kSmallestLabel, kLargestLabel));
-    const TextLayout text = layOutText(options, font, warn);
+    Fonts fonts{Font(file, options.size)};
+    Fonts labelFonts{Font(file, std::clamp(options.size / kLabelShare, kSmallestLabel, kLargestLabel))};
+    const TextLayout text = layOutText(options, fonts, warn);
     std::vector<Cell> cells;
     for (const std::string& preset : presetNames())
-        cells.push_back(makeCell(options, preset, labelFont, warn));
+        cells.push_back(makeCell(options, preset, labelFonts, warn));
     const Grid grid = gridOf(cells, text.inkBox(), options.padding);
 
     Image sheet{grid.columns * grid.width, grid.rows * grid.height, {}};
