@@ -3,6 +3,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <string>
+#include <vector>
 
 struct FT_FaceRec_;
 struct FT_LibraryRec_;
@@ -21,29 +22,57 @@ struct FontBytes {
     long faceIndex = 0;
 };
 
+/// The place of a variable font on one of its axes.
+struct FontVariation {
+    std::string axis;  ///< its tag, such as "wght"
+    float value;       ///< in the axis's own units, 700 for a bold weight
+};
+
 /// An open font at one size. For one thread at a time, with all that is laid out in it.
 class Font {
   public:
-    /// `sizePx` is the size of the em in pixels, at least 1. Throws TextError when the file is no font
-    /// with outlines.
-    Font(const FontFile& file, int sizePx);
+    /// `sizePx` is the size of the em in pixels, at least 1. Axes that are not named stay as the font
+    /// has them; of one that is named twice the last value counts. Throws TextError when the file is no
+    /// font with outlines or pictures in colour, when it has no vertical metrics, and when it has no
+    /// such axis or the value is beyond the axis's range.
+    Font(const FontFile& file, int sizePx, const std::vector<FontVariation>& variations = {});
 
     /// The same of bytes, which must outlive the font.
-    Font(const FontBytes& bytes, int sizePx);
+    Font(const FontBytes& bytes, int sizePx, const std::vector<FontVariation>& variations = {});
 
     ~Font();
+    Font(Font&& other) noexcept;
+    Font& operator=(Font&& other) noexcept;
     Font(const Font&) = delete;
     Font& operator=(const Font&) = delete;
 
-    long lineHeight() const;                     ///< in 64ths of a pixel
+    int sizePx() const { return mSizePx; }
+    const std::string& name() const { return mName; }  ///< family and style, "DejaVu Sans Bold"
+
+    /// The font's own, for its size, in 64ths of a pixel and whole pixels: how far its letters reach
+    /// above the baseline, below it (negative), and from one baseline to the next.
+    long ascender() const { return mAscender; }
+    long descender() const { return mDescender; }
+    long lineHeight() const { return mLineHeight; }
+
+    bool has(uint32_t code) const;  ///< whether it has a glyph for the character
+    bool isColour() const;          ///< whether some of its glyphs have colours of their own
     FT_FaceRec_* face() const { return mFace; }  ///< FreeType's own
 
   private:
     template <typename Open>
-    void open(int sizePx, const std::string& subject, Open openFace);
+    void open(const std::string& subject, const std::vector<FontVariation>& variations, Open openFace);
+    void prepare(const std::string& subject, const std::vector<FontVariation>& variations);
+    bool chooseSize();
+    void measure();
 
     FT_LibraryRec_* mLibrary = nullptr;
     FT_FaceRec_* mFace = nullptr;
+    int mSizePx;
+    std::string mName;
+    long mAscender = 0;
+    long mDescender = 0;
+    long mLineHeight = 0;
 };
 
 }  // namespace voreltext

@@ -1,37 +1,23 @@
 #include "text/text_layout.h"
 
-#include <ft2build.h>
-#include FT_FREETYPE_H
-#include FT_OUTLINE_H
-#include <raqm.h>
-
 #include <algorithm>
+#include <cmath>
 #include <cstdlib>
-#include <memory>
 #include <string>
+#include <utility>
 
 #include "text/error.h"
-#include "unicode/utf8.h"
+#include "text/line_setter.h"
+#include "text/paragraphs.h"
+#include "text/rasteriser.h"
+#include "text/units.h"
+#include "unicode/characters.h"
 
 namespace voreltext {
 namespace {
 
-/// How every glyph is loaded: as its designer's outline, which lands on any fraction of a pixel.
-constexpr FT_Int32 kLoadFlags = FT_LOAD_NO_HINTING | FT_LOAD_NO_BITMAP;
-
-constexpr int64_t kUnit = 64;  ///< FreeType's and raqm's units per pixel
-
-struct DestroyRaqm {
-    void operator()(raqm_t* shaper) const { raqm_destroy(shaper); }
-};
-using Shaper = std::unique_ptr<raqm_t, DestroyRaqm>;
-
-int floorToPixel(int64_t units) {
-    return static_cast<int>(units >> 6);
-}
-int ceilToPixel(int64_t units) {
-    return floorToPixel(units + kUnit - 1);
-}
+using vorelunicode::isBlank;
+using vorelunicode::isLineEnd;
 
 /// A font may step backwards as well as forwards.
 void checkSide(int64_t units) {
@@ -40,143 +26,135 @@ void checkSide(int64_t units) {
                     " pixels wide or high");
 }
 
-/// Next line, line separator and paragraph separator.
-bool endsLine(uint32_t code) {
-    return code == '\n' || code == '\r' || code == 0x85 || code == 0x2028 || code == 0x2029;
-}
-
-[[noreturn]] void refuseControl(uint32_t code, size_t line, size_t character) {
-    throw TextError("the text has the control character " + vorelunicode::nameOf(code) + " in line " +
-                    std::to_string(line) + ", character " + std::to_string(character));
-}
-
-/// Cuts at line ends, of which CR LF is one; tabs become blanks.
-std::vector<std::vector<uint32_t>> splitLines(const std::vector<uint32_t>& text) {
-    std::vector<std::vector<uint32_t>> lines(1);
-    uint32_t before = 0;
-    for (const uint32_t code : text) {
-        std::vector<uint32_t>& line = lines.back();
-        if (endsLine(code)) {
-            if (code != '\n' || before != '\r') lines.emplace_back();
-        } else if (vorelunicode::isControl(code) && code != '\t') {
-            refuseControl(code, lines.size(), line.size() + 1);
-        } else {
-            line.push_back(code == '\t' ? ' ' : code);
-        }
-        before = code;
-    }
-    return lines;
-}
-
 /// The part of a line's slack that stands on its left.
-int64_t leftShare(Align align, int64_t slack) {
+int64_t leftShare(Align align, bool isRightToLeft, int64_t slack) {
     switch (align) {
         case Align::center:
             return slack / 2;
         case Align::right:
             return slack;
+        case Align::start:
+            return isRightToLeft ? slack : 0;
+        case Align::end:
+            return isRightToLeft ? 0 : slack;
         default:
             return 0;
     }
 }
 
+/// A font may step backwards on the way.
+void checkWidth(const SetLine& line) {
+    int64_t width = 0;
+    for (const ShapedGlyph& glyph : line.glyphs) {
+        width += glyph.advance;
+        checkSide(width);
+    }
+}
+
+/// From baseline to baseline, in whole pixels.
+int64_t lineAdvance(const Fonts& fonts, const TextSettings& settings) {
+    const double units = static_cast<double>(fonts.main().lineHeight()) * double{settings.lineHeight};
+    return static_cast<int64_t>(std::floor(units / kUnit + 0.5)) * kUnit;
+}
+
+/// The box of a line, from the main font's ascender to its descender with half of the leading above; it
+/// reaches to that of the next line.
+Box boxOf(const Font& main, int64_t left, int64_t width, int64_t baseline, int64_t advance) {
+    const int64_t leading = advance - (main.ascender() - main.descender());
+    const int top = floorToPixel(-baseline - main.ascender()) - floorToPixel(leading / 2);
+    return {floorToPixel(left), top, ceilToPixel(left + width), top + floorToPixel(advance)};
+}
+
+/// For each character which word it is of; those between words count to the one before.
+std::vector<size_t> wordsOf(const std::vector<uint32_t>& text) {
+    std::vector<size_t> words;
+    words.reserve(text.size());
+    size_t begun = 0;
+    bool isWithin = false;
+    for (const uint32_t code : text) {
+        const bool isGap = isBlank(code) || isLineEnd(code);
+        if (!isGap && !isWithin) ++begun;
+        isWithin = !isGap;
+        words.push_back(begun == 0 ? 0 : begun - 1);
+    }
+    return words;
+}
+
 }  // namespace
 
-TextLayout::TextLayout(const Font& font, const std::vector<uint32_t>& text, Align align) : mFont(font) {
-    std::vector<Line> lines;
+TextLayout::TextLayout(Fonts& fonts, const std::vector<uint32_t>& text, const TextSettings& settings)
+    : mFonts(fonts) {
+    LineSetter setter(fonts, settings);
+    const int64_t advance = lineAdvance(fonts, settings);
+    std::vector<SetLine> lines;
     int64_t width = 0;
-    for (const std::vector<uint32_t>& line : splitLines(text)) {
-        lines.push_back(shapeLine(line.data(), line.size()));
-        width = std::max(width, lines.back().width);
-        checkSide(static_cast<int64_t>(lines.size()) * mFont.lineHeight());
+    for (const Paragraph& paragraph : splitParagraphs(text)) {
+        for (SetLine& line : setter.set(paragraph)) {
+            checkWidth(line);
+            width = std::max(width, line.width);
+            lines.push_back(std::move(line));
+            checkSide(static_cast<int64_t>(lines.size()) * advance);
+        }
     }
-    int64_t baseline = 0;
-    for (Line& line : lines) {
-        placeLine(line, leftShare(align, width - line.width), baseline);
-        baseline -= mFont.lineHeight();
-    }
-}
-
-TextLayout::Line TextLayout::shapeLine(const uint32_t* text, size_t length) const {
-    Line line;
-    if (length == 0) return line;
-    const Shaper shaper(raqm_create());
-    const bool shaped = shaper != nullptr && raqm_set_text(shaper.get(), text, length) &&
-                        raqm_set_freetype_face(shaper.get(), mFont.face()) &&
-                        raqm_set_freetype_load_flags(shaper.get(), kLoadFlags) &&
-                        raqm_set_par_direction(shaper.get(), RAQM_DIRECTION_DEFAULT) &&
-                        raqm_layout(shaper.get());
-    if (!shaped) throw TextError("the text cannot be shaped");
-
-    size_t count = 0;
-    const raqm_glyph_t* glyphs = raqm_get_glyphs(shaper.get(), &count);
-    line.glyphs.reserve(count);
-    for (size_t i = 0; i < count; ++i) {
-        line.glyphs.push_back(
-            {glyphs[i].index, line.width + glyphs[i].x_offset, glyphs[i].y_offset, {}});
-        line.width += glyphs[i].x_advance;
-        checkSide(line.width);
-    }
-    return line;
-}
-
-void TextLayout::placeLine(Line& line, int64_t shift, int64_t baseline) {
-    for (Glyph& glyph : line.glyphs) {
-        glyph.x += shift;
-        glyph.y += baseline;
-        checkSide(glyph.x);
-        checkSide(glyph.y);
-        if (glyph.index == 0) ++mMissingGlyphs;
-        loadOutline(glyph);
-        FT_BBox outline;
-        FT_Outline_Get_CBox(&mFont.face()->glyph->outline, &outline);
-        const int x = floorToPixel(glyph.x);
-        const int y = floorToPixel(glyph.y);
-        glyph.box = {x + floorToPixel(outline.xMin), -y - ceilToPixel(outline.yMax),
-                     x + ceilToPixel(outline.xMax), -y - floorToPixel(outline.yMin)};
-        if (glyph.box.width() <= 0 || glyph.box.height() <= 0) continue;
-        growInkBox(glyph.box);
-        mGlyphs.push_back(glyph);
+    mMissing = setter.missing();
+    const std::vector<size_t> words = wordsOf(text);
+    for (const SetLine& line : lines) {
+        const int64_t shift = leftShare(settings.align, line.isRightToLeft, width - line.width);
+        placeLine(line, shift, -static_cast<int64_t>(mLines.size()) * advance, words);
+        mLines.back().box =
+            boxOf(fonts.main(), shift, line.width, -int64_t{mLines.back().baseline} * kUnit, advance);
     }
 }
 
-/// Leaves the outline in the face's slot, moved by the fraction of a pixel of its origin.
-void TextLayout::loadOutline(const Glyph& glyph) const {
-    const FT_Face face = mFont.face();
-    if (FT_Load_Glyph(face, glyph.index, kLoadFlags) != 0 ||
-        face->glyph->format != FT_GLYPH_FORMAT_OUTLINE) {
-        throw TextError("the font has no outline for glyph " + std::to_string(glyph.index));
+void TextLayout::placeLine(const SetLine& set, int64_t shift, int64_t baseline,
+                           const std::vector<size_t>& words) {
+    Line line{};
+    line.baseline = -floorToPixel(baseline);
+    line.begin = set.begin;
+    line.end = set.end;
+    line.isRightToLeft = set.isRightToLeft;
+    int64_t pen = shift;
+    for (const ShapedGlyph& each : set.glyphs) {
+        const GlyphOrigin origin{each.index, pen + each.x, baseline + each.y};
+        pen += each.advance;
+        checkSide(origin.x);
+        checkSide(origin.y);
+        const Box box = inkOf(mFonts[each.font], origin);
+        if (isEmpty(box)) continue;
+        line.ink = unionOf(line.ink, box);
+        mGlyphs.push_back({{box, mLines.size(), words[each.cluster], each.cluster, each.font, false},
+                           origin.index,
+                           origin.x,
+                           origin.y});
     }
-    FT_Outline_Translate(&face->glyph->outline, glyph.x & (kUnit - 1), glyph.y & (kUnit - 1));
+    mInkBox = unionOf(mInkBox, line.ink);
+    mLines.push_back(line);
 }
 
-void TextLayout::growInkBox(const Box& box) {
-    if (mGlyphs.empty()) {
-        mInkBox = box;
-        return;
+Box TextLayout::lineBox() const {
+    Box box = mLines.front().box;
+    for (const Line& line : mLines) {
+        box = {std::min(box.left, line.box.left), std::min(box.top, line.box.top),
+               std::max(box.right, line.box.right), std::max(box.bottom, line.box.bottom)};
     }
-    mInkBox = {std::min(mInkBox.left, box.left), std::min(mInkBox.top, box.top),
-               std::max(mInkBox.right, box.right), std::max(mInkBox.bottom, box.bottom)};
+    return box;
+}
+
+std::vector<std::string> TextLayout::fontsUsed() const {
+    std::vector<size_t> fonts;
+    for (const Glyph& glyph : mGlyphs) {
+        if (std::find(fonts.begin(), fonts.end(), glyph.font) == fonts.end())
+            fonts.push_back(glyph.font);
+    }
+    std::vector<std::string> names;
+    for (const size_t font : fonts)
+        names.push_back(mFonts[font].name());
+    return names;
 }
 
 GlyphMask TextLayout::rasterise(size_t index) const {
-    const Glyph& glyph = mGlyphs[index];
-    loadOutline(glyph);
-    FT_GlyphSlot slot = mFont.face()->glyph;
-    if (FT_Render_Glyph(slot, FT_RENDER_MODE_NORMAL) != 0) {
-        throw TextError("glyph " + std::to_string(glyph.index) + " cannot be rasterised");
-    }
-    const FT_Bitmap& bitmap = slot->bitmap;
-    const int left = floorToPixel(glyph.x) + slot->bitmap_left;
-    const int top = -floorToPixel(glyph.y) - slot->bitmap_top;
-    GlyphMask mask;
-    mask.box = {left, top, left + static_cast<int>(bitmap.width), top + static_cast<int>(bitmap.rows)};
-    mask.coverage.reserve(size_t{bitmap.width} * bitmap.rows);
-    for (unsigned int row = 0; row < bitmap.rows; ++row) {
-        const uint8_t* pixels = bitmap.buffer + static_cast<ptrdiff_t>(row) * bitmap.pitch;
-        mask.coverage.insert(mask.coverage.end(), pixels, pixels + bitmap.width);
-    }
-    return mask;
+    const PlacedGlyph& glyph = mGlyphs[index];
+    return rasterised(mFonts[glyph.font], {glyph.index, glyph.x, glyph.y});
 }
 
 }  // namespace voreltext

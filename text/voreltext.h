@@ -1,19 +1,25 @@
 #pragma once
 
+#include "text/canvas.h"
 #include "text/error.h"
 #include "text/font.h"
+#include "text/fonts.h"
+#include "text/glyph_mask.h"
 #include "text/image.h"
+#include "text/layers.h"
+#include "text/overlay.h"
 #include "text/run.h"
 #include "text/system_fonts.h"
 #include "text/text_layout.h"
+#include "text/text_settings.h"
 #include "text/utf8.h"
 
 /// Text from a font to pixels: fonts are opened, lines shaped and set, glyphs rasterised, and painted by
 /// a set of effects.
 ///
 ///     using namespace voreltext;
-///     const Font font(FontBytes{data, size}, 96);          // or FontFile{"font.ttf"}
-///     const TextLayout text(font, decodeUtf8("Two\nlines"), Align::center);
+///     Fonts fonts(Font(FontBytes{data, size}, 96));        // or FontFile{"font.ttf"}
+///     const TextLayout text(fonts, decodeUtf8("Two\nlines"), {Align::center});
 ///     VFontEffect::VFEffect effects;
 ///     effects.addStrokeText(4, 0xFFFFFF, 1, 0, 1);
 ///     effects.addText(0x3366CC, 1);                        // the fill

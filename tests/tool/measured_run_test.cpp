@@ -17,9 +17,9 @@ using vorelstyle::KeyFragment;
 using vorelstyle::Look;
 using vorelstyle::parseStyle;
 using vorelstyle::Style;
-using voreltext::Align;
 using voreltext::decodeUtf8;
 using voreltext::Font;
+using voreltext::Fonts;
 using voreltext::Frame;
 using voreltext::GlyphMask;
 using voreltext::Image;
@@ -64,8 +64,8 @@ class MeasuredRunTest : public ::testing::Test {
         return types;
     }
 
-    Font mFont{findFont("DejaVu Sans"), 40};
-    TextLayout mText{mFont, decodeUtf8("Fig"), Align::left};
+    Fonts mFonts{Font(findFont("DejaVu Sans"), 40)};
+    TextLayout mText{mFonts, decodeUtf8("Fig")};
 };
 
 TEST_F(MeasuredRunTest, EveryPreset_IsPaintedAsInOneRun) {

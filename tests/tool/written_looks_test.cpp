@@ -19,6 +19,7 @@ namespace {
 using vorelstyle::Look;
 using voreltext::Align;
 using voreltext::Font;
+using voreltext::Fonts;
 using voreltext::Image;
 using voreltext::TextLayout;
 
@@ -49,8 +50,8 @@ TEST_P(WrittenLooks, PaintTheSamePixels) {
     const std::unique_ptr<char[]> key(written.getMapKey());
     EXPECT_EQ(look.key(), key.get());
 
-    const Font font(findFont("DejaVu Sans"), 64);
-    const TextLayout text(font, voreltext::decodeUtf8("Quick\nfox"), Align::center);
+    Fonts fonts{Font(findFont("DejaVu Sans"), 64)};
+    const TextLayout text(fonts, voreltext::decodeUtf8("Quick\nfox"), {Align::center});
     const Image expected = paint(look.effects(), text, 2);
     const Image painted = paint(written, text, 2);
     EXPECT_EQ(painted.width, expected.width);

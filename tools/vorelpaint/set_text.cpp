@@ -44,17 +44,10 @@ int64_t letterSpacing(const Options& options, int size) {
 }
 
 std::unique_ptr<Fonts> openFonts(const Options& options, int size) {
-    std::unique_ptr<Fonts> fonts;
-    FontFile main;
-    for (const std::string& request : options.fonts) {
-        const FontFile file = findFont(request);
-        if (fonts) {
-            fonts->add(Font(file, size));
-        } else {
-            main = file;
-            fonts = std::make_unique<Fonts>(Font(file, size, options.variations));
-        }
-    }
+    const FontFile main = findFont(options.fonts.front());
+    auto fonts = std::make_unique<Fonts>(Font(main, size, options.variations));
+    for (size_t i = 1; i < options.fonts.size(); ++i)
+        fonts->add(Font(findFont(options.fonts[i]), size));
     fonts->setFallback(
         [main](const std::vector<uint32_t>& cluster) { return findFontFor(cluster, main); });
     return fonts;

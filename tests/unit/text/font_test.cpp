@@ -28,12 +28,12 @@ std::string faultOf(const Source& source) {
 
 TEST(Font, Bytes_GiveTheGlyphsOfTheFile) {
     const std::string bytes = vorel_test::testFontBytes();
-    const Font ofFile(FontFile{VOREL_TEST_FONT}, 48);
-    const Font ofBytes(viewOf(bytes), 48);
-    EXPECT_EQ(ofBytes.lineHeight(), ofFile.lineHeight());
+    Fonts ofFile{Font(FontFile{VOREL_TEST_FONT}, 48)};
+    Fonts ofBytes{Font(viewOf(bytes), 48)};
+    EXPECT_EQ(ofBytes.main().lineHeight(), ofFile.main().lineHeight());
     const std::vector<uint32_t> words = decodeUtf8("Quick\nfox AV");
-    const TextLayout expected(ofFile, words, Align::center);
-    const TextLayout text(ofBytes, words, Align::center);
+    const TextLayout expected(ofFile, words, {Align::center});
+    const TextLayout text(ofBytes, words, {Align::center});
     ASSERT_EQ(expected.glyphCount(), 10U);
     ASSERT_EQ(text.glyphCount(), expected.glyphCount());
     for (size_t i = 0; i < text.glyphCount(); ++i) {

@@ -21,15 +21,12 @@ constexpr int kSize = 40;
 /// A text in the font of the tests.
 class Sample {
   public:
-    explicit Sample(std::string_view text) {
-        mFonts.add(FontFile{VOREL_TEST_FONT}, kSize);
-        mLayout = std::make_unique<TextLayout>(mFonts, decodeUtf8(text), TextSettings{});
-    }
-    const TextLayout& layout() const { return *mLayout; }
+    explicit Sample(std::string_view text) : mLayout(mFonts, decodeUtf8(text)) {}
+    const TextLayout& layout() const { return mLayout; }
 
   private:
-    Fonts mFonts;
-    std::unique_ptr<TextLayout> mLayout;
+    Fonts mFonts{Font(FontFile{VOREL_TEST_FONT}, kSize)};
+    TextLayout mLayout;
 };
 
 VFEffect fill(uint32_t colour) {

@@ -24,8 +24,8 @@ TEST(Margins, AreTheReachOfTheEffects) {
 }
 
 TEST(Paint, FillAlone_IsTheCoverageInItsColour) {
-    const Font font(FontFile{VOREL_TEST_FONT}, 40);
-    const TextLayout text(font, decodeUtf8("I"), Align::left);
+    Fonts fonts{Font(FontFile{VOREL_TEST_FONT}, 40)};
+    const TextLayout text(fonts, decodeUtf8("I"));
     VFEffect effects;
     effects.addText(0xFF0000, 1);
     const Image picture = paint(effects, text, 2);

@@ -1,0 +1,17 @@
+#pragma once
+
+#include <cstdint>
+
+/// 64ths of a pixel, the units of fonts and shapers.
+namespace voreltext {
+
+constexpr int64_t kUnit = 64;
+
+inline int floorToPixel(int64_t units) {
+    return static_cast<int>(units >> 6);
+}
+inline int ceilToPixel(int64_t units) {
+    return floorToPixel(units + kUnit - 1);
+}
+
+}  // namespace voreltext
