@@ -120,8 +120,9 @@ std::string layersText(const Look& look, const Plan& plan) {
 }
 
 bool isCentredStroke(const Style& style, int type) {
+    const std::vector<Effect>& effects = style.looks.front().effects;
     return type == vorelstyle::kStrokeType &&
-           std::any_of(style.effects.begin(), style.effects.end(), [](const Effect& effect) {
+           std::any_of(effects.begin(), effects.end(), [](const Effect& effect) {
                const auto* stroke = std::get_if<Stroke>(&effect);
                return stroke != nullptr && stroke->position == 0;
            });
@@ -172,7 +173,7 @@ void printKeyPart(std::ostream& out, const std::string& name, const std::string&
 void printKey(std::ostream& out, const Look& look) {
     out << "\nCache key of " << look.key().size() << " bytes, before the first run:\n\n";
     for (const KeyFragment& fragment : vorelstyle::keyFragments(look.key()))
-        printKeyPart(out, std::string(effectName(fragment.type)), fragment.meaning);
+        printKeyPart(out, std::string(fragment.name), fragment.meaning);
     const std::vector<int>& added = look.added();
     if (std::find(added.begin(), added.end(), vorelstyle::kPatternType) != added.end()) {
         printKeyPart(out, "pattern", "leaves no trace: tell patterns apart by a key of your own");

@@ -51,8 +51,8 @@ void printMargins(const Margins& margins) {
 void printCpp(const Options& options, const Style& style) {
     const std::string name = options.preset.value_or(std::filesystem::path(style.name).stem().string());
     std::ostringstream source;
-    vorelstyle::writeCpp(source, vorelstyle::functionName(name), style, chosenFill(options, style),
-                         chosenOpacity(options, style), imagesOf(style));
+    vorelstyle::writeCpp(source, vorelstyle::functionName(name), style, options.color, options.opacity,
+                         imagesOf(style));
     print(source.str());
 }
 

@@ -14,6 +14,7 @@ namespace vorelpaint {
 namespace {
 
 using vorelstyle::Look;
+using vorelstyle::Stack;
 using vorelstyle::Style;
 using voreltext::Font;
 using voreltext::Image;
@@ -29,15 +30,7 @@ Style namedStyle(const Options& options) {
 }  // namespace
 
 Style chosenStyle(const Options& options) {
-    return vorelstyle::scaledStyle(namedStyle(options), options.effectScale);
-}
-
-uint32_t chosenFill(const Options& options, const Style& style) {
-    return options.color.value_or(fillOf(style));
-}
-
-float chosenOpacity(const Options& options, const Style& style) {
-    return options.opacity.value_or(opacityOf(style));
+    return vorelstyle::resolvedStyle(namedStyle(options), options.size, options.effectScale);
 }
 
 std::string chosenText(const Options& options) {
@@ -48,11 +41,11 @@ std::string chosenText(const Options& options) {
 }
 
 Look makeLook(const Options& options, const Style& style, const Warn& warn) {
-    Look look(style, chosenFill(options, style), chosenOpacity(options, style), imagesOf(style));
-    for (const std::string& effect : look.unpainted()) {
+    const Stack stack(style, options.color, options.opacity, imagesOf(style));
+    for (const std::string& effect : stack.unpainted()) {
         warn("warning: the library has no core for " + effect + "; it is not painted");
     }
-    return look;
+    return stack.looks().front().look;
 }
 
 TextLayout layOutText(const Options& options, const Font& font, const Warn& warn) {

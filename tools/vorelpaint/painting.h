@@ -14,14 +14,8 @@ namespace vorelpaint {
 /// Takes a line that says what is odd, but no reason to stop.
 using Warn = std::function<void(const std::string& line)>;
 
-/// The style that is asked for, at its scale; an empty one when none is.
+/// The style that is asked for, resolved at its scale; an empty one when none is.
 vorelstyle::Style chosenStyle(const Options& options);
-
-/// The fill that is asked for, else the style's, else black.
-uint32_t chosenFill(const Options& options, const vorelstyle::Style& style);
-
-/// The opacity that is asked for, else the style's, else 1.
-float chosenOpacity(const Options& options, const vorelstyle::Style& style);
 
 std::string chosenText(const Options& options);
 
