@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <locale>
 #include <nlohmann/json.hpp>
 #include <set>
 #include <sstream>
@@ -59,8 +60,23 @@ std::string wrongType(const std::string& expected, const Json& value) {
 /// "a number from 0 to 100" of the noun "a number from".
 std::string between(const char* noun, Range range) {
     std::ostringstream text;
+    text.imbue(std::locale::classic());
     text << noun << ' ' << range.low << " to " << range.high;
     return text.str();
+}
+
+std::string withUnit(double value, const char* unit) {
+    std::ostringstream text;
+    text.imbue(std::locale::classic());
+    text << value << unit;
+    return text.str();
+}
+
+/// 'a length from 0 to 100 pixels, as 4 or "4px", or from 0% to 100% of the font's size, as "4%"'.
+std::string lengthBetween(const LengthRange& range) {
+    return between("a length from", range.pixels) + " pixels, as 4 or \"4px\", or from " +
+           withUnit(range.percent.low, "%") + " to " + withUnit(range.percent.high, "%") +
+           " of the font's size, as \"4%\"";
 }
 
 std::string outOfRange(const Json& value, Range range) {
@@ -181,6 +197,18 @@ bool JsonValue::isObject() const {
     return nodeAt(mNode).is_object();
 }
 
+bool JsonValue::isString() const {
+    return nodeAt(mNode).is_string();
+}
+
+bool JsonValue::isArray() const {
+    return nodeAt(mNode).is_array();
+}
+
+bool JsonValue::isNumber() const {
+    return nodeAt(mNode).is_number();
+}
+
 std::string JsonValue::quoted() const {
     return vorelstyle::quoted(nodeAt(mNode));
 }
@@ -250,6 +278,32 @@ uint32_t JsonObject::color(std::string_view key, std::optional<uint32_t> fallbac
     return *colour;
 }
 
+bool JsonObject::boolean(std::string_view key, std::optional<bool> fallback) const {
+    const Json* value = find(*this, nodeAt(mObject.mNode), key, fallback.has_value(), &Json::is_boolean,
+                             "true or false");
+    return value == nullptr ? *fallback : value->get<bool>();
+}
+
+Length JsonObject::length(std::string_view key, const LengthRange& range,
+                          std::optional<Length> fallback) const {
+    if (!has(key) && fallback) return *fallback;
+    const std::string expected = lengthBetween(range);
+    if (!has(key)) fail(key, "missing; " + expected);
+    const Json& value = *nodeAt(mObject.mNode).find(key);
+    if (value.is_number()) return {number(key, range.pixels)};
+    if (!value.is_string()) fail(key, wrongType(expected, value));
+    const auto& text = value.get_ref<const std::string&>();
+    const std::optional<Length> length = parseLength(text);
+    const bool hasWrongSign = range.pixels.low >= 0 && text.find('-') == 0;
+    if (!length || hasWrongSign) fail(key, "must be " + expected + ", not " + quoted(value));
+    const bool isShare = length->unit == Length::Unit::percent;
+    const Range allowed = isShare ? range.percent : range.pixels;
+    if (contains(allowed, static_cast<double>(length->value))) return *length;
+    const char* unit = isShare ? "%" : "px";
+    fail(key, quoted(value) + " is out of range, " + withUnit(allowed.low, unit) + " to " +
+                  withUnit(allowed.high, unit));
+}
+
 std::string JsonObject::string(std::string_view key) const {
     return find(*this, nodeAt(mObject.mNode), key, false, &Json::is_string, "a string")
         ->get<std::string>();
@@ -259,12 +313,27 @@ std::string JsonObject::numeral(std::string_view key) const {
     return find(*this, nodeAt(mObject.mNode), key, false, &Json::is_number, "a number")->dump();
 }
 
-int JsonObject::choice(std::string_view key, std::initializer_list<std::string_view> names) const {
-    const Json* value =
-        find(*this, nodeAt(mObject.mNode), key, false, &Json::is_string, "one of " + joined(names));
-    const auto* found = std::find(names.begin(), names.end(), value->get_ref<const std::string&>());
+int JsonObject::choice(std::string_view key, const std::vector<std::string_view>& names,
+                       std::optional<int> fallback) const {
+    const Json* value = find(*this, nodeAt(mObject.mNode), key, fallback.has_value(), &Json::is_string,
+                             "one of " + joined(names));
+    if (value == nullptr) return *fallback;
+    const auto found = std::find(names.begin(), names.end(), value->get_ref<const std::string&>());
     if (found == names.end()) fail(key, quoted(*value) + " is none of " + joined(names));
     return static_cast<int>(found - names.begin());
+}
+
+std::vector<std::string> JsonObject::strings(std::string_view key, Range sizes) const {
+    std::vector<std::string> strings;
+    for (const JsonValue element : array(key, sizes)) {
+        const Json& node = nodeAt(element.mNode);
+        if (!node.is_string()) {
+            fail(std::string(key) + "[" + std::to_string(strings.size()) + "]",
+                 wrongType("a string", node));
+        }
+        strings.push_back(node.get<std::string>());
+    }
+    return strings;
 }
 
 std::vector<JsonValue> JsonObject::array(std::string_view key, Range sizes) const {

@@ -1,12 +1,13 @@
 #pragma once
 
 #include <cstdint>
-#include <initializer_list>
 #include <memory>
 #include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
+
+#include "style/length.h"
 
 namespace vorelstyle {
 
@@ -15,10 +16,19 @@ struct Range {
     double high;
 };
 
+/// What a length may be in either unit.
+struct LengthRange {
+    Range pixels;
+    Range percent;
+};
+
 /// A value in a JsonDocument, which must outlive it.
 class JsonValue {
   public:
     bool isObject() const;
+    bool isArray() const;
+    bool isNumber() const;
+    bool isString() const;
     std::string quoted() const;  ///< as JSON, in ASCII and short enough for a message
 
   private:
@@ -60,11 +70,22 @@ class JsonObject {
     float number(std::string_view key, Range range, std::optional<float> fallback = {}) const;
     int integer(std::string_view key, Range range, std::optional<int> fallback = {}) const;
     uint32_t color(std::string_view key, std::optional<uint32_t> fallback = {}) const;
+    bool boolean(std::string_view key, std::optional<bool> fallback = {}) const;
     std::string string(std::string_view key) const;
+
+    /// A number of pixels, or a string that parseLength reads; a minus sign may stand in it only where
+    /// the range goes below 0.
+    Length length(std::string_view key, const LengthRange& range,
+                  std::optional<Length> fallback = {}) const;
+
     std::string numeral(std::string_view key) const;  ///< a number as JSON spells it
 
     /// The position of the key's value, a string, among `names`.
-    int choice(std::string_view key, std::initializer_list<std::string_view> names) const;
+    int choice(std::string_view key, const std::vector<std::string_view>& names,
+               std::optional<int> fallback = {}) const;
+
+    /// The elements of an array of strings; their number lies within `sizes`.
+    std::vector<std::string> strings(std::string_view key, Range sizes) const;
 
     /// The elements of an array; their number lies within `sizes`.
     std::vector<JsonValue> array(std::string_view key, Range sizes) const;

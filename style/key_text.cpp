@@ -7,6 +7,12 @@
 namespace vorelstyle {
 namespace {
 
+constexpr int kOffsetCharacters = 3;
+constexpr int kOffsetOrigin = 1 << 20;
+constexpr unsigned int kSpanBits = 3;
+constexpr unsigned int kUnfilledBit = 4;
+constexpr char kPlaceLetter = 'P';
+
 /// Reads the characters behind a fragment's letter. Each carries up to seven bits; its top bit is set,
 /// which tells it from a letter.
 class FragmentReader {
@@ -30,6 +36,12 @@ class FragmentReader {
         for (int i = 0; i < count; ++i)
             value = value << 4 | small();
         return value;
+    }
+    int offset() {
+        unsigned int value = 0;
+        for (int i = 0; i < kOffsetCharacters; ++i)
+            value = value << 7 | small();
+        return static_cast<int>(value) - kOffsetOrigin;
     }
     std::string colour() {
         std::array<char, 10> text{};
@@ -85,6 +97,15 @@ std::string readStroke(FragmentReader& reader) {
     return text + (position == 0 ? ", centred" : position == 1 ? ", outside" : ", inside");
 }
 
+std::string readPlace(FragmentReader& reader) {
+    std::string text = "moved by " + std::to_string(reader.offset());
+    text += ", " + std::to_string(reader.offset());
+    const unsigned int last = reader.small();
+    const unsigned int span = last & kSpanBits;
+    if (span != 0) text += ", by " + std::string(kSpanNames[span]);
+    return text + ((last & kUnfilledBit) != 0 ? ", not filled" : "");
+}
+
 struct Layout {
     char letter;
     int type;
@@ -111,13 +132,33 @@ KeyFragment readFragment(std::string_view fragment) {
     FragmentReader reader(fragment.substr(1));
     for (const Layout& layout : kLayouts) {
         if (layout.letter == fragment.front()) {
-            return {layout.type, layout.letter, layout.read(reader)};
+            return {layout.type, layout.letter, effectName(layout.type), layout.read(reader)};
         }
     }
-    return {0, fragment.front(), ""};
+    if (fragment.front() == kPlaceLetter) return {0, kPlaceLetter, "place", readPlace(reader)};
+    return {0, fragment.front(), "", ""};
+}
+
+void appendOffset(std::string& fragment, int offset) {
+    const auto value = static_cast<unsigned int>(offset + kOffsetOrigin);
+    for (int shift = 7 * (kOffsetCharacters - 1); shift >= 0; shift -= 7)
+        fragment += static_cast<char>(0x80U | (value >> shift & 0x7FU));
 }
 
 }  // namespace
+
+bool Place::operator==(const Place& other) const {
+    return offsetX == other.offsetX && offsetY == other.offsetY && span == other.span &&
+           isFilled == other.isFilled;
+}
+
+std::string placeFragment(const Place& place) {
+    std::string fragment(1, kPlaceLetter);
+    appendOffset(fragment, place.offsetX);
+    appendOffset(fragment, place.offsetY);
+    const unsigned int fill = place.isFilled ? 0 : kUnfilledBit;
+    return fragment + static_cast<char>(0x80U | static_cast<unsigned int>(place.span) | fill);
+}
 
 std::vector<KeyFragment> keyFragments(std::string_view key) {
     std::vector<KeyFragment> fragments;

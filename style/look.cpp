@@ -4,7 +4,10 @@
 
 #include <memory>
 #include <new>
+#include <utility>
 #include <variant>
+
+#include "style/resolved_style.h"
 
 namespace vorelstyle {
 namespace {
@@ -27,22 +30,25 @@ VFGradient* dataOf(const Stops& stops) {
 /// Makes the add-call of one effect and returns its result.
 class AddCall {
   public:
-    AddCall(VFEffect& effects, const Style& style, uint32_t fill, float textOpacity,
-            const LoadImage& load)
-        : mEffects(effects), mStyle(style), mFill(fill), mTextOpacity(textOpacity), mLoad(load) {}
+    AddCall(VFEffect& effects, uint32_t fill, float textOpacity, const LoadImage& load, Note note)
+        : mEffects(effects),
+          mFill(fill),
+          mTextOpacity(textOpacity),
+          mLoad(load),
+          mNote(std::move(note)) {}
 
     unsigned int operator()(const OuterShadow& e) const {
-        return mEffects.addOuterShadowText(e.angle, e.distance, e.size, e.color, e.opacity);
+        return mEffects.addOuterShadowText(e.angle, e.distance.value, e.size.value, e.color, e.opacity);
     }
     unsigned int operator()(const InnerShadow& e) const {
-        return mEffects.addInnerShadowText(e.angle, e.distance, e.size, e.color, e.opacity);
+        return mEffects.addInnerShadowText(e.angle, e.distance.value, e.size.value, e.color, e.opacity);
     }
     unsigned int operator()(const OuterGlow& e) const {
-        return mEffects.addOuterGlowText(e.size, e.color, e.opacity, countOf(e.gradient),
+        return mEffects.addOuterGlowText(e.size.value, e.color, e.opacity, countOf(e.gradient),
                                          dataOf(e.gradient));
     }
     unsigned int operator()(const InnerGlow& e) const {
-        return mEffects.addInnerGlowText(e.size, e.color, e.opacity, countOf(e.gradient),
+        return mEffects.addInnerGlowText(e.size.value, e.color, e.opacity, countOf(e.gradient),
                                          dataOf(e.gradient));
     }
     unsigned int operator()(const Bevel& e) const { return addRelief(&VFEffect::addBevelText, e); }
@@ -56,13 +62,13 @@ class AddCall {
                                               dataOf(e.gradient));
     }
     unsigned int operator()(const Stroke& e) const {
-        return mEffects.addStrokeText(e.size, e.color, e.opacity, e.strokeStyle, e.position);
+        return mEffects.addStrokeText(e.size.value, e.color, e.opacity, e.strokeStyle, e.position);
     }
     unsigned int operator()(const Pattern& e) const {
-        PatternImage image = patternImage(mStyle, e, mLoad);
+        PatternImage image = patternImage(e, mLoad);
         VFBitmap bitmap(static_cast<unsigned int>(image.width), static_cast<unsigned int>(image.height),
                         image.pixels.data(), 4);
-        return mEffects.addPatternText(&bitmap, e.scale, e.opacity);
+        return mEffects.addPatternText(&bitmap, patternScale(e, image, mNote), e.opacity);
     }
     unsigned int operator()(const TextFill& e) const {
         return mEffects.addText(mFill, e.opacity * mTextOpacity);
@@ -71,33 +77,35 @@ class AddCall {
   private:
     template <typename Call>
     unsigned int addRelief(Call call, const Relief& e) const {
-        return (mEffects.*call)(e.style, e.size, e.depth, e.technique, e.direction, e.soften, e.opacity,
-                                e.angle, e.altitude, e.highlightColor, e.highlightOpacity, e.shadowColor,
-                                e.shadowOpacity);
+        return (mEffects.*call)(e.style, e.size.value, e.depth, e.technique, e.direction, e.soften,
+                                e.opacity, e.angle, e.altitude, e.highlightColor, e.highlightOpacity,
+                                e.shadowColor, e.shadowOpacity);
     }
 
     VFEffect& mEffects;
-    const Style& mStyle;
     uint32_t mFill;
     float mTextOpacity;
     const LoadImage& mLoad;
+    Note mNote;
 };
 
 }  // namespace
 
-Look::Look(const Style& style, uint32_t fill, float textOpacity, const LoadImage& load) {
+Look::Look(const LookStyle& look, uint32_t fill, float textOpacity, const LoadImage& load) {
+    requireResolved(look);
     mEffects.setTextOpacity(textOpacity);
-    const AddCall add(mEffects, style, fill, textOpacity, load);
-    for (const Effect& effect : style.effects) {
+    const AddCall add(mEffects, fill, textOpacity, load,
+                      [this](const std::string& line) { mNotes.push_back(line); });
+    for (const Effect& effect : look.effects) {
         if (std::visit(add, effect) == kNoCore) {
             mUnpainted.emplace_back(effectName(effect));
         } else {
             mAdded.push_back(effectType(effect));
         }
     }
-    const bool filled = hasTextFill(style);
-    if (!filled) mAdded.push_back(kTextType);
-    const std::unique_ptr<char[]> key(filled ? mEffects.getMapKey() : mEffects.getMapKey(fill));
+    const bool hasFill = hasTextFill(look);
+    if (!hasFill) mAdded.push_back(kTextType);
+    const std::unique_ptr<char[]> key(hasFill ? mEffects.getMapKey() : mEffects.getMapKey(fill));
     if (!key) throw std::bad_alloc();
     mKey = key.get();
 }

@@ -11,19 +11,23 @@
 
 namespace vorelstyle {
 
-/// A style turned into a set of effects, ready to paint runs of text.
+/// A look turned into a set of effects, ready to paint runs of text.
 class Look {
   public:
-    /// `fill` is 0xRRGGBB; it and `textOpacity` are what the style's text takes. `load` is called,
-    /// before this returns, for a style with a pattern only. Throws StyleError when the pattern has no
-    /// picture.
-    Look(const Style& style, uint32_t fill, float textOpacity, const LoadImage& load = {});
+    /// The lengths of `look` are resolved (resolvedStyle). `fill` is 0xRRGGBB; it and `textOpacity` are
+    /// what the text takes. `load` is called, before this returns, for a look with a pattern only.
+    /// Throws StyleError when the pattern has no picture, or a length is still a share of the font's
+    /// size.
+    Look(const LookStyle& look, uint32_t fill, float textOpacity, const LoadImage& load = {});
 
     /// The library's cache key of the look: bytes, mostly beyond ASCII.
     const std::string& key() const { return mKey; }
 
-    /// Effects of the style that this library has no core for; they are not painted.
+    /// Effects of the look that this library has no core for; they are not painted.
     const std::vector<std::string>& unpainted() const { return mUnpainted; }
+
+    /// What is painted otherwise than the look asks for, a line each: "pattern.width: ...".
+    const std::vector<std::string>& notes() const { return mNotes; }
 
     /// The set itself, to paint with. Not planned before the first picture.
     VFontEffect::VFEffect& effects() { return mEffects; }
@@ -37,6 +41,7 @@ class Look {
     std::vector<int> mAdded;
     std::string mKey;
     std::vector<std::string> mUnpainted;
+    std::vector<std::string> mNotes;
 };
 
 }  // namespace vorelstyle

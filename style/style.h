@@ -2,6 +2,7 @@
 
 #include <voreleffect/VFBitmap.h>
 
+#include <array>
 #include <cstdint>
 #include <optional>
 #include <string>
@@ -10,18 +11,19 @@
 #include <vector>
 
 #include "style/json_object.h"
+#include "style/length.h"
 
-/// A look as a style file describes it: one record per add-call of the library, in file order.
-/// The fields carry the names, units and ranges of the add-calls' arguments (VFEffect.h); colours
-/// are 0xRRGGBB.
+/// Looks as a style file describes them: one record per add-call of the library, in file order. The
+/// fields carry the names, units and ranges of the add-calls' arguments (VFEffect.h); colours are
+/// 0xRRGGBB, and lengths may be shares of the font's size until resolvedStyle has made them pixels.
 namespace vorelstyle {
 
 using Stops = std::vector<VFontEffect::VFGradient>;
 
 struct Shadow {
     float angle;
-    float distance;
-    float size;
+    Length distance;
+    Length size;
     uint32_t color;
     float opacity;
 };
@@ -29,7 +31,7 @@ struct OuterShadow : Shadow {};
 struct InnerShadow : Shadow {};
 
 struct Glow {
-    float size;
+    Length size;
     uint32_t color;
     float opacity;
     Stops gradient;  ///< empty: the glow has the one colour `color`
@@ -39,7 +41,7 @@ struct InnerGlow : Glow {};
 
 struct Relief {
     int style;
-    float size;
+    Length size;
     float depth;
     int technique;
     int direction;
@@ -69,7 +71,7 @@ struct RadialGradient {
 };
 
 struct Stroke {
-    float size;
+    Length size;
     uint32_t color;
     float opacity;
     int strokeStyle;
@@ -80,6 +82,7 @@ struct Pattern {
     std::string image;  ///< the name of a PNG file, relative to the style file
     float scale;
     float opacity;
+    std::optional<Length> width;  ///< of one tile, above 0; goes before `scale`
 };
 
 struct TextFill {
@@ -102,20 +105,48 @@ constexpr int kTextType = 12;
 int effectType(const Effect& effect);
 std::string_view effectName(int type);
 
-struct Style {
-    std::string description;
+/// What is painted as one run, with a text box of its own, which gradients and patterns fill.
+enum class Span { block, line, word, glyph };
+
+/// The spans' names in a style file, in their order.
+constexpr std::array<std::string_view, 4> kSpanNames{"block", "line", "word", "glyph"};
+
+/// One look: the text with effects around and upon it.
+struct LookStyle {
     std::optional<uint32_t> color;     ///< the fill, unless the caller chooses one
     std::optional<float> textOpacity;  ///< the text's opacity, unless the caller chooses one
-    std::vector<Effect> effects;       ///< in the order of the file: the last lies on top
-    std::string name;  ///< under which messages speak of it, such as its file; may be empty
+    bool isFilled =
+        true;        ///< false leaves the fill out: what lies beneath the glyphs is cut out of them
+    Length offsetX;  ///< to the right
+    Length offsetY;  ///< downwards
+    Span span = Span::block;
+    std::vector<Effect> effects;  ///< in the order of the file: the last lies on top
+    std::string description;      ///< of this look in a list; may be empty
+};
+
+/// Looks that are painted one over the other.
+struct Style {
+    int version = 1;  ///< of the format of the file
+    std::string description;
+    std::vector<LookStyle> looks = std::vector<LookStyle>(1);  ///< never empty; the last lies on top
+    bool isList = false;  ///< whether the file has a list of looks, which the paths of messages tell
+    std::string name;     ///< under which messages speak of it, such as its file; may be empty
 };
 
 /// Whether the text's fill is among the effects, with a place and an opacity of its own.
-bool hasTextFill(const Style& style);
+bool hasTextFill(const LookStyle& look);
 
-/// What the style's text takes where nobody chooses: its fill, else black, and its opacity, else 1.
-uint32_t fillOf(const Style& style);
-float opacityOf(const Style& style);
+/// What the look's text takes where nobody chooses: its fill, else black, and its opacity, else 1. The
+/// opacity of a look that is not filled is 0.
+uint32_t fillOf(const LookStyle& look);
+float opacityOf(const LookStyle& look);
+
+/// The position of the topmost look that is filled, whose fill and opacity a caller may choose; nothing
+/// when none is.
+std::optional<size_t> topFill(const Style& style);
+
+/// What the path of anything in the look at a position begins with: "looks[1]." in a list, else nothing.
+std::string lookPath(const Style& style, size_t position);
 
 /// Reads a style file's text. What its faults call it, and the style's name, is `name`. No file is
 /// opened. Throws StyleError.

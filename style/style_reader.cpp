@@ -1,7 +1,6 @@
 #include <algorithm>
-#include <array>
-#include <utility>
 
+#include "style/effect_reader.h"
 #include "style/error.h"
 #include "style/json_object.h"
 #include "style/message.h"
@@ -11,198 +10,132 @@ namespace vorelstyle {
 namespace {
 
 constexpr Range kUnit{0, 1};
-constexpr Range kAngle{-360, 360};
-constexpr Range kAltitude{0, 90};
-constexpr Range kPixels{0, 100};
-constexpr Range kStopCount{1, 256};
-constexpr Range kCode{0, 255};
-// The library draws nothing below a scale of 0.1.
-constexpr Range kGradientScale{0.1, 2};
-constexpr Range kPatternScale{0.1, 10};
-constexpr Range kDepth{0, 10};
-constexpr Range kSoften{0, 16};
+constexpr Range kVersions{1, 2};
+constexpr Range kLookCount{1, 32};
+constexpr LengthRange kOffset{{-1000, 1000}, {-100, 100}};
 
-Stops readStops(const JsonObject& effect) {
-    constexpr std::string_view kKey = "gradient";
-    Stops stops;
-    std::string spelledBefore;
-    for (const JsonValue element : effect.array(kKey, kStopCount)) {
-        const std::string path = effect.pathOf(kKey) + "[" + std::to_string(stops.size()) + "]";
-        const JsonObject stop(element, path, {"color", "opacity", "location"});
-        const float location = stop.number("location", kUnit);
-        if (!stops.empty() && location < stops.back().mLocation) {
-            stop.fail("location", stop.value("location").quoted() + " lies before " + spelledBefore +
-                                      ", the location of the stop that precedes it");
-        }
-        spelledBefore = stop.value("location").quoted();
-        stops.push_back({stop.color("color"), stop.number("opacity", kUnit, 1.0F), location});
-    }
-    return stops;
-}
+/// The keys of a look that the first version of the format has not.
+constexpr std::array<std::string_view, 3> kNewLookKeys{"fill", "offset", "span"};
 
-Shadow readShadow(JsonValue value, const char* name) {
-    const JsonObject effect(value, name, {"angle", "distance", "size", "color", "opacity"});
-    return {effect.number("angle", kAngle), effect.number("distance", kPixels),
-            effect.number("size", kPixels), effect.color("color"),
-            effect.number("opacity", kUnit, 1.0F)};
-}
-
-/// A glow takes its colours from the stops where there are any, else from `color`.
-Glow readGlow(JsonValue value, const char* name) {
-    const JsonObject effect(value, name, {"size", "color", "opacity", "gradient"});
-    const bool hasStops = effect.has("gradient");
-    const std::optional<uint32_t> unused = hasStops ? std::optional<uint32_t>(0) : std::nullopt;
-    return {effect.number("size", kPixels), effect.color("color", unused),
-            effect.number("opacity", kUnit, 1.0F), hasStops ? readStops(effect) : Stops{}};
-}
-
-Relief readRelief(JsonValue value, const char* name) {
-    const JsonObject effect(
-        value, name,
-        {"style", "size", "depth", "technique", "direction", "soften", "opacity", "angle", "altitude",
-         "highlightColor", "highlightOpacity", "shadowColor", "shadowOpacity"});
-    return {effect.integer("style", kCode, 0),
-            effect.number("size", kPixels),
-            effect.number("depth", kDepth, 1.0F),
-            effect.integer("technique", kCode, 0),
-            effect.integer("direction", kCode, 0),
-            effect.integer("soften", kSoften, 0),
-            effect.number("opacity", kUnit, 1.0F),
-            effect.number("angle", kAngle),
-            effect.number("altitude", kAltitude),
-            effect.color("highlightColor"),
-            effect.number("highlightOpacity", kUnit, 1.0F),
-            effect.color("shadowColor"),
-            effect.number("shadowOpacity", kUnit, 1.0F)};
-}
-
-Effect readLinearGradient(JsonValue value, const char* name) {
-    const JsonObject effect(value, name, {"angle", "scale", "opacity", "gradient"});
-    return LinearGradient{effect.number("angle", kAngle), effect.number("scale", kGradientScale, 1.0F),
-                          effect.number("opacity", kUnit, 1.0F), readStops(effect)};
-}
-
-Effect readRadialGradient(JsonValue value, const char* name) {
-    const JsonObject effect(value, name, {"scale", "opacity", "gradient"});
-    return RadialGradient{effect.number("scale", kGradientScale, 1.0F),
-                          effect.number("opacity", kUnit, 1.0F), readStops(effect)};
-}
-
-Effect readStroke(JsonValue value, const char* name) {
-    const JsonObject effect(value, name, {"size", "color", "opacity", "strokeStyle", "position"});
-    return Stroke{effect.number("size", kPixels), effect.color("color"),
-                  effect.number("opacity", kUnit, 1.0F), effect.integer("strokeStyle", kCode, 0),
-                  effect.choice("position", {"center", "outside", "inside"})};
-}
-
-Effect readPattern(JsonValue value, const char* name) {
-    const JsonObject effect(value, name, {"image", "scale", "opacity"});
-    const std::string image = effect.string("image");
-    if (image.empty()) effect.fail("image", "must name a PNG file");
-    if (image.find('\0') != std::string::npos) effect.fail("image", "has a NUL character in its name");
-    return Pattern{image, effect.number("scale", kPatternScale, 1.0F),
-                   effect.number("opacity", kUnit, 1.0F)};
-}
-
-Effect readTextFill(JsonValue value, const char* name) {
-    const JsonObject effect(value, name, {"color", "opacity"});
-    return TextFill{effect.color("color"), effect.number("opacity", kUnit, 1.0F)};
-}
-
-template <typename Kind, auto kRead>
-Effect readAs(JsonValue value, const char* name) {
-    return Kind{kRead(value, name)};
-}
-
-struct EffectKind {
-    const char* name;
-    int type;
-    Effect (*read)(JsonValue value, const char* name);
-};
-
-/// The keys of a style file in the order of the alternatives of Effect.
-constexpr std::array<EffectKind, std::variant_size_v<Effect>> kEffectKinds{{
-    {"outerShadow", 1, readAs<OuterShadow, readShadow>},
-    {"innerShadow", 2, readAs<InnerShadow, readShadow>},
-    {"outerGlow", 3, readAs<OuterGlow, readGlow>},
-    {"innerGlow", 4, readAs<InnerGlow, readGlow>},
-    {"bevel", 5, readAs<Bevel, readRelief>},
-    {"emboss", 6, readAs<Emboss, readRelief>},
-    {"linearGradient", 7, readLinearGradient},
-    {"radialGradient", 8, readRadialGradient},
-    {"stroke", kStrokeType, readStroke},
-    {"pattern", kPatternType, readPattern},
-    {"text", kTextType, readTextFill},
-}};
-
-std::vector<std::string_view> knownKeys() {
-    std::vector<std::string_view> keys{"$schema", "description", "color", "textOpacity"};
-    for (const EffectKind& kind : kEffectKinds)
-        keys.emplace_back(kind.name);
+std::vector<std::string_view> lookKeys() {
+    std::vector<std::string_view> keys{"description", "color", "textOpacity"};
+    keys.insert(keys.end(), kNewLookKeys.begin(), kNewLookKeys.end());
+    const std::vector<std::string_view> effects = effectNames();
+    keys.insert(keys.end(), effects.begin(), effects.end());
     return keys;
 }
 
-void refuseSecondFill(const Style& style) {
-    if (style.color && hasTextFill(style)) {
-        throw StyleError("color: the fill has its colour in text.color already");
+std::vector<std::string_view> fileKeys() {
+    std::vector<std::string_view> keys{"$schema", "version", "looks"};
+    const std::vector<std::string_view> others = lookKeys();
+    keys.insert(keys.end(), others.begin(), others.end());
+    return keys;
+}
+
+void readFill(const JsonObject& object, LookStyle& look) {
+    look.isFilled = object.boolean("fill", true);
+    for (const std::string_view key : {"color", "textOpacity", "text"}) {
+        if (!look.isFilled && object.has(key)) object.fail(key, "not beside \"fill\": false");
     }
+    if (object.has("color")) look.color = object.color("color");
+    if (object.has("textOpacity")) look.textOpacity = object.number("textOpacity", kUnit);
+}
+
+void readOffset(const JsonObject& object, LookStyle& look) {
+    if (!object.has("offset")) return;
+    const JsonObject offset(object.value("offset"), object.pathOf("offset"), {"x", "y"});
+    look.offsetX = offset.length("x", kOffset, Length{});
+    look.offsetY = offset.length("y", kOffset, Length{});
+}
+
+Span readSpan(const JsonObject& object) {
+    return static_cast<Span>(object.choice("span", {kSpanNames.begin(), kSpanNames.end()}, 0));
+}
+
+/// Reads what makes a look out of an object, which may have other keys, too.
+LookStyle readLook(const JsonObject& object, int version) {
+    for (const std::string_view key : kNewLookKeys)
+        requireVersion2(object, key, version);
+    LookStyle look;
+    readFill(object, look);
+    readOffset(object, look);
+    look.span = readSpan(object);
+    for (const std::string_view key : object.keys()) {
+        if (isEffect(key)) look.effects.push_back(readEffect(object, key, version));
+    }
+    if (look.color && hasTextFill(look)) {
+        object.fail("color", "the fill has its colour in " + object.pathOf("text") + ".color already");
+    }
+    return look;
+}
+
+std::vector<LookStyle> readLooks(const JsonObject& file, int version) {
+    constexpr std::string_view kKey = "looks";
+    requireVersion2(file, kKey, version);
+    for (const std::string_view key : lookKeys()) {
+        const bool isForeign = key != "description" && file.has(key);
+        if (isForeign) file.fail(key, "not beside looks; it belongs into one of them");
+    }
+    std::vector<LookStyle> looks;
+    for (const JsonValue element : file.array(kKey, kLookCount)) {
+        const JsonObject object(element, file.pathOf(kKey) + "[" + std::to_string(looks.size()) + "]",
+                                lookKeys());
+        looks.push_back(readLook(object, version));
+        if (object.has("description")) looks.back().description = object.string("description");
+    }
+    return looks;
 }
 
 }  // namespace
 
-std::string_view effectName(const Effect& effect) {
-    return kEffectKinds[effect.index()].name;
-}
-
-int effectType(const Effect& effect) {
-    return kEffectKinds[effect.index()].type;
-}
-
-std::string_view effectName(int type) {
-    const auto* kind = std::find_if(kEffectKinds.begin(), kEffectKinds.end(),
-                                    [=](const EffectKind& each) { return each.type == type; });
-    return kind == kEffectKinds.end() ? "" : kind->name;
-}
-
-bool hasTextFill(const Style& style) {
-    return std::any_of(style.effects.begin(), style.effects.end(),
+bool hasTextFill(const LookStyle& look) {
+    return std::any_of(look.effects.begin(), look.effects.end(),
                        [](const Effect& effect) { return std::holds_alternative<TextFill>(effect); });
 }
 
-uint32_t fillOf(const Style& style) {
-    for (const Effect& effect : style.effects) {
+uint32_t fillOf(const LookStyle& look) {
+    for (const Effect& effect : look.effects) {
         if (const auto* text = std::get_if<TextFill>(&effect)) return text->color;
     }
-    return style.color.value_or(0);
+    return look.color.value_or(0);
 }
 
-float opacityOf(const Style& style) {
-    return style.textOpacity.value_or(1.0F);
+float opacityOf(const LookStyle& look) {
+    return look.isFilled ? look.textOpacity.value_or(1.0F) : 0.0F;
+}
+
+std::optional<size_t> topFill(const Style& style) {
+    for (size_t i = style.looks.size(); i-- > 0;) {
+        if (style.looks[i].isFilled) return i;
+    }
+    return std::nullopt;
+}
+
+std::string lookPath(const Style& style, size_t position) {
+    const bool isOne = !style.isList && style.looks.size() == 1;
+    return isOne ? "" : "looks[" + std::to_string(position) + "].";
 }
 
 Style parseStyle(std::string_view json, std::string_view name) {
-    try {
+    return withFaultsUnder(faultPrefix(name), [&] {
         Style style = readStyle(JsonDocument(json).root());
         style.name = name;
         return style;
-    } catch (const StyleError& error) {
-        throw StyleError(faultPrefix(name) + error.what());
-    }
+    });
 }
 
 Style readStyle(JsonValue json) {
-    const JsonObject file(json, "", knownKeys());
+    const JsonObject file(json, "", fileKeys());
     Style style;
+    style.version = file.integer("version", kVersions, 1);
     if (file.has("$schema")) file.string("$schema");  // for editors
     if (file.has("description")) style.description = file.string("description");
-    if (file.has("color")) style.color = file.color("color");
-    if (file.has("textOpacity")) style.textOpacity = file.number("textOpacity", kUnit);
-    for (const std::string_view key : file.keys()) {
-        for (const EffectKind& kind : kEffectKinds) {
-            if (key == kind.name) style.effects.push_back(kind.read(file.value(key), kind.name));
-        }
+    style.isList = file.has("looks");
+    if (style.isList) {
+        style.looks = readLooks(file, style.version);
+    } else {
+        style.looks.front() = readLook(file, style.version);
     }
-    refuseSecondFill(style);
     return style;
 }
 

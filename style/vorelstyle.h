@@ -4,26 +4,35 @@
 #include "style/error.h"
 #include "style/json_object.h"
 #include "style/key_text.h"
+#include "style/length.h"
 #include "style/look.h"
 #include "style/markup.h"
 #include "style/message.h"
 #include "style/nearest.h"
+#include "style/note.h"
 #include "style/pattern_image.h"
 #include "style/presets.h"
+#include "style/resolved_style.h"
+#include "style/stack.h"
 #include "style/style.h"
-#include "style/style_scale.h"
 #include "style/write_cpp.h"
 
-/// Looks as data: style files are read, scaled, turned into sets of effects and written out as C++.
+/// Looks as data: style files are read, resolved for a font size, turned into stacks of sets of effects
+/// and written out as C++.
 ///
 ///     using namespace vorelstyle;
-///     const Style style = scaledStyle(parseStyle(json, "look.json"), 0.5F);
-///     Look look(style, fillOf(style), opacityOf(style), loadPicture);
-///     look.effects();  // paints runs, see VFEffect.h
-///     look.key();      // for a cache; keyFragments tells what it says
+///     const Style style = resolvedStyle(parseStyle(json, "look.json"), fontSizePx, 1, note);
+///     Stack stack(style, {}, {}, loadPicture);
+///     stack.key();  // for a cache; keyFragments tells what it says
+///     for (StackedLook& stacked : stack.looks()) {  // the lowest first
+///         stacked.look.effects();  // paints runs, see VFEffect.h
+///         stacked.place;           // how far its picture is moved, and what is one run
+///     }
 ///
-/// `json` is the text of a style file, "look.json" what messages call it, and `loadPicture` reads the
-/// pictures of patterns (LoadImage); where there is none, styles with a pattern are refused.
+/// `json` is the text of a style file, "look.json" what messages call it. Lengths of the style may be
+/// shares of the font's size: `fontSizePx` makes them pixels, and `note` takes a line for each that is
+/// painted otherwise than asked for. `loadPicture` reads the pictures of patterns (LoadImage); where
+/// there is none, styles with a pattern are refused.
 ///
 /// docs/style-files.md lists every key of a style file, vorelpaint-style.schema.json says the same to
 /// editors, and presets/ has style files to start from.

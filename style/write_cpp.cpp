@@ -10,6 +10,8 @@
 
 #include "style/error.h"
 #include "style/message.h"
+#include "style/resolved_style.h"
+#include "style/stack.h"
 
 namespace vorelstyle {
 namespace {
@@ -46,9 +48,8 @@ std::string sentence(const std::string& text) {
 /// Writes the call of one effect, with the array that it needs before it.
 class CallWriter {
   public:
-    CallWriter(std::ostream& out, const Style& style, uint32_t fill, float textOpacity,
-               const LoadImage& load)
-        : mOut(out), mStyle(style), mFill(fill), mTextOpacity(textOpacity), mLoad(load) {}
+    CallWriter(std::ostream& out, const TextPaint& text, const LoadImage& load)
+        : mOut(out), mText(text), mLoad(load) {}
 
     void operator()(const OuterShadow& e) const { shadow("addOuterShadowText", e); }
     void operator()(const InnerShadow& e) const { shadow("addInnerShadowText", e); }
@@ -65,16 +66,18 @@ class CallWriter {
         call("addRadialGradientText", literal(e.scale), literal(e.opacity), array);
     }
     void operator()(const Stroke& e) const {
-        call("addStrokeText", literal(e.size), colourLiteral(e.color), literal(e.opacity),
+        call("addStrokeText", literal(e.size.value), colourLiteral(e.color), literal(e.opacity),
              literal(e.strokeStyle), literal(e.position));
     }
     void operator()(const Pattern& e) const {
-        pixels(e, patternImage(mStyle, e, mLoad));
-        call("addPatternText", "&pattern", literal(e.scale), literal(e.opacity));
+        const PatternImage image = patternImage(e, mLoad);
+        pixels(e, image);
+        const float scale = patternScale(e, image, [](const std::string&) {});
+        call("addPatternText", "&pattern", literal(scale), literal(e.opacity));
     }
-    void operator()(const TextFill& e) const { fill(e.opacity * mTextOpacity); }
+    void operator()(const TextFill& e) const { fill(e.opacity * mText.opacity); }
 
-    void fill(float opacity) const { call("addText", colourLiteral(mFill), literal(opacity)); }
+    void fill(float opacity) const { call("addText", colourLiteral(mText.fill), literal(opacity)); }
 
   private:
     template <typename... Arguments>
@@ -85,18 +88,18 @@ class CallWriter {
     }
 
     void shadow(const char* name, const Shadow& e) const {
-        call(name, literal(e.angle), literal(e.distance), literal(e.size), colourLiteral(e.color),
-             literal(e.opacity));
+        call(name, literal(e.angle), literal(e.distance.value), literal(e.size.value),
+             colourLiteral(e.color), literal(e.opacity));
     }
 
     void glow(const char* name, const char* arrayName, const Glow& e) const {
         const std::string array = stops(arrayName, e.gradient);
-        call(name, literal(e.size), colourLiteral(e.color), literal(e.opacity), array);
+        call(name, literal(e.size.value), colourLiteral(e.color), literal(e.opacity), array);
     }
 
     void relief(const char* name, const Relief& e) const {
         mOut << "    // The library has no core for this one: it leaves no mark.\n";
-        call(name, literal(e.style), literal(e.size), literal(e.depth), literal(e.technique),
+        call(name, literal(e.style), literal(e.size.value), literal(e.depth), literal(e.technique),
              literal(e.direction), literal(e.soften), literal(e.opacity), literal(e.angle),
              literal(e.altitude), colourLiteral(e.highlightColor), literal(e.highlightOpacity),
              colourLiteral(e.shadowColor), literal(e.shadowOpacity));
@@ -116,8 +119,7 @@ class CallWriter {
 
     void pixels(const Pattern& e, const PatternImage& image) const {
         if (image.pixels.size() > kMaxPatternPixels * 4) {
-            throw StyleError(faultPrefix(mStyle.name) + "pattern.image: has more than " +
-                             std::to_string(kMaxPatternPixels) +
+            throw StyleError("pattern.image: has more than " + std::to_string(kMaxPatternPixels) +
                              " pixels, too many to be written as C++");
         }
         mOut << "    // " << printable(e.image)
@@ -129,25 +131,69 @@ class CallWriter {
     }
 
     std::ostream& mOut;
-    const Style& mStyle;
-    uint32_t mFill;
-    float mTextOpacity;
+    const TextPaint& mText;
     const LoadImage& mLoad;
 };
 
+/// Writes the function that makes the calls of one look.
+void writeLook(std::ostream& out, const std::string& name, const LookStyle& look,
+               const std::string& description, const TextPaint& text, const LoadImage& load) {
+    requireResolved(look);
+    if (!description.empty()) out << "/// " << sentence(description) << '\n';
+    out << "/// For an empty set; VFEffect.h shows how a set paints a run.\nvoid " << name
+        << "(VFontEffect::VFEffect& look) {\n    look.setTextOpacity(" << literal(text.opacity)
+        << ");\n";
+    const CallWriter writer(out, text, load);
+    for (const Effect& effect : look.effects)
+        std::visit(writer, effect);
+    if (!hasTextFill(look)) writer.fill(text.opacity);
+    out << "}\n";
+}
+
+/// Writes the array that tells the looks and their places.
+void writePlaces(std::ostream& out, const std::string& name, const Style& style) {
+    std::string type = name + "Look";
+    if (type.front() >= 'a' && type.front() <= 'z') type.front() += 'A' - 'a';
+    const std::string array = name + "Looks[" + std::to_string(style.looks.size()) + "]";
+    out << "/// One look of the stack and its place.\nstruct " << type << " {\n"
+        << "    void (*add)(VFontEffect::VFEffect& look);\n"
+        << "    int offsetX;  // in pixels, to the right\n"
+        << "    int offsetY;  // in pixels, downwards\n"
+        << "    const char* span;  // what is one run, with a text box of its own\n};\n\n";
+    if (!style.description.empty()) out << "/// " << sentence(style.description) << '\n';
+    out << "/// In the order of painting. Each look paints the whole text, one run for each of its "
+           "spans\n"
+        << "/// (block, line, word or glyph), into a transparent picture of its own, which is then "
+           "moved by\n"
+        << "/// the offset and laid over the ones before: each premultiplied channel is that of the "
+           "upper\n"
+        << "/// picture plus that of the lower one times (1 - the upper alpha).\n"
+        << "extern const " << type << " " << array << ";\nconst " << type << " " << array << " = {\n";
+    for (size_t i = 0; i < style.looks.size(); ++i) {
+        const Place place = placeOf(style.looks[i]);
+        out << "    {" << name << i + 1 << ", " << place.offsetX << ", " << place.offsetY << ", \""
+            << kSpanNames[static_cast<size_t>(place.span)] << "\"},\n";
+    }
+    out << "};\n";
+}
+
 }  // namespace
 
-void writeCpp(std::ostream& out, const std::string& name, const Style& style, uint32_t fill,
-              float textOpacity, const LoadImage& load) {
+void writeCpp(std::ostream& out, const std::string& name, const Style& style,
+              std::optional<uint32_t> fill, std::optional<float> textOpacity, const LoadImage& load) {
+    const bool isOne = style.looks.size() == 1 && isPlain(placeOf(style.looks.front()));
     out << "#include <voreleffect/voreleffect.h>\n\n";
-    if (!style.description.empty()) out << "/// " << sentence(style.description) << '\n';
-    out << "/// For an empty set; VFEffect.h shows how a set paints a run.\nvoid " << name
-        << "(VFontEffect::VFEffect& look) {\n    look.setTextOpacity(" << literal(textOpacity) << ");\n";
-    const CallWriter writer(out, style, fill, textOpacity, load);
-    for (const Effect& effect : style.effects)
-        std::visit(writer, effect);
-    if (!hasTextFill(style)) writer.fill(textOpacity);
-    out << "}\n";
+    for (size_t i = 0; i < style.looks.size(); ++i) {
+        const LookStyle& look = style.looks[i];
+        withFaultsUnder(faultPrefix(style.name) + lookPath(style, i), [&] {
+            const TextPaint text = textPaintOf(style, i, fill, textOpacity);
+            const bool takesStyles = isOne && look.description.empty();
+            writeLook(out, isOne ? name : name + std::to_string(i + 1), look,
+                      takesStyles ? style.description : look.description, text, load);
+        });
+        if (!isOne) out << '\n';
+    }
+    if (!isOne) writePlaces(out, name, style);
 }
 
 std::string functionName(const std::string& look) {

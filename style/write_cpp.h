@@ -1,6 +1,8 @@
 #pragma once
 
+#include <cstdint>
 #include <iosfwd>
+#include <optional>
 #include <string>
 
 #include "style/pattern_image.h"
@@ -8,13 +10,17 @@
 
 namespace vorelstyle {
 
-/// Writes a C++ source with one function, `name`, that makes the library calls of the style: the picture
-/// is the one that Look paints of the same style, fill (0xRRGGBB), text opacity and pattern picture.
-/// Throws StyleError when a pattern has no picture, or one too large to be written out.
-void writeCpp(std::ostream& out, const std::string& name, const Style& style, uint32_t fill,
-              float textOpacity, const LoadImage& load = {});
+/// Writes a C++17 source that makes the library calls of a resolved style. One look that is not moved,
+/// of the whole block, is one function, `name`; else there is a function for each look, `name` with its
+/// number from 1 on, and the array `name` + "Looks", which tells them in the order of painting with
+/// their offsets and spans, and how they are painted. The pictures are those of the Stack of the same
+/// style, fill (0xRRGGBB), text opacity and pattern pictures. Throws StyleError as Stack does, and for a
+/// pattern with a picture too large to be written out.
+void writeCpp(std::ostream& out, const std::string& name, const Style& style,
+              std::optional<uint32_t> fill = {}, std::optional<float> textOpacity = {},
+              const LoadImage& load = {});
 
-/// The name of that function for a look of this name: "addPaperCut" for "paper-cut".
+/// The name of that function for a style of this name: "addPaperCut" for "paper-cut".
 std::string functionName(const std::string& look);
 
 }  // namespace vorelstyle

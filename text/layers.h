@@ -34,7 +34,7 @@ struct Layer {
     int x = 0;  ///< how far it is moved, in pixels to the right and downwards
     int y = 0;
     Span span = Span::block;  ///< spans are painted in reading order, later ones over earlier ones
-    std::vector<Exchange> exchanges;
+    std::vector<Exchange> exchanges = {};
 
     /// Whether the pictures of colour fonts are laid over what the effects make of their coverage, and
     /// at which opacity.

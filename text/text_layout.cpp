@@ -120,7 +120,7 @@ void TextLayout::placeLine(const SetLine& set, int64_t shift, int64_t baseline,
         checkSide(origin.x);
         checkSide(origin.y);
         const Box box = inkOf(mFonts[each.font], origin);
-        if (isEmpty(box)) continue;
+        if (box.isEmpty()) continue;
         line.ink = unionOf(line.ink, box);
         mGlyphs.push_back({{box, mLines.size(), words[each.cluster], each.cluster, each.font, false},
                            origin.index,

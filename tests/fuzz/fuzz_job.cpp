@@ -1,42 +1,24 @@
 /// The bytes are a job of a batch, one line of JSON. Either it is read, with every number in its range,
 /// or it is refused with a ToolError of one line; nothing else may be thrown.
 #include <cstdint>
-#include <cstdio>
-#include <cstdlib>
 #include <string>
-#include <string_view>
 
 #include "batch.h"
+#include "demand.h"
 #include "error.h"
 #include "settings.h"
 
 namespace {
 
+using namespace vorel_fuzz;
 using namespace vorelpaint;
 
-[[noreturn]] void fail(const char* what) {
-    std::fprintf(stderr, "%s\n", what);
-    std::abort();
-}
-
-/// A NaN is in no range.
-void requireIn(double value, double low, double high, const char* name) {
-    if (!(value >= low && value <= high)) fail(name);
-}
-
 void require(const Options& options) {
-    requireIn(options.size, 1, 1000, "size");
-    requireIn(options.padding, 0, 1000, "padding");
-    requireIn(static_cast<double>(options.effectScale), static_cast<double>(0.05F), 20, "effect-scale");
-    if (options.opacity) requireIn(static_cast<double>(*options.opacity), 0, 1, "opacity");
-    if (options.color && *options.color > 0xFFFFFF) fail("a colour has an alpha byte");
-}
-
-void requireLine(const char* message) {
-    const std::string_view line = message;
-    if (line.empty() || line.find('\n') != std::string_view::npos) {
-        fail("the message of a refused job is not one line");
-    }
+    demandIn(options.size, 1, 1000, "size");
+    demandIn(options.padding, 0, 1000, "padding");
+    demandIn(static_cast<double>(options.effectScale), static_cast<double>(0.05F), 20, "effect-scale");
+    if (options.opacity) demandIn(static_cast<double>(*options.opacity), 0, 1, "opacity");
+    if (options.color) demandColour(*options.color);
 }
 
 /// A first byte of 0 asks for the text as the value of each setting, as a command line gives it.
@@ -49,7 +31,7 @@ void readValues(const std::string& value) {
             require(options);
         } catch (const ToolError& error) {
             // The value itself is quoted as it was given.
-            if (value.find('\n') == std::string::npos) requireLine(error.what());
+            if (value.find('\n') == std::string::npos) demandLine(error.what());
         }
     }
 }
@@ -69,7 +51,7 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
         if (options.text.has_value() == options.textFile.has_value()) fail("a job needs one text");
         if (options.style && options.preset) fail("a job has two looks");
     } catch (const ToolError& error) {
-        requireLine(error.what());
+        demandLine(error.what());
     }
     return 0;
 }

@@ -1,99 +1,107 @@
-/// The bytes are a style file. Either it is read, with every number in its range and one fill at most,
-/// and becomes a set of effects and a C++ source, or it is refused with a StyleError of one line;
+/// The bytes up to the first 0 are a style file, those behind it choose the font size and the scale.
+/// Either the file is read, with every number in its range and one fill a look at most, resolved, and
+/// becomes a stack of sets of effects and a C++ source, or it is refused with a StyleError of one line;
 /// nothing else may be thrown.
 #include <cmath>
 #include <cstdint>
-#include <cstdio>
-#include <cstdlib>
 #include <sstream>
 #include <string>
 #include <string_view>
 
+#include "decoder.h"
+#include "demand.h"
 #include "style/vorelstyle.h"
 
 namespace {
 
+using namespace vorel_fuzz;
 using namespace vorelstyle;
 
-[[noreturn]] void fail(const char* what) {
-    std::fprintf(stderr, "%s\n", what);
-    std::abort();
-}
-
-void requireIn(double value, double low, double high, const char* name) {
-    if (!(value >= low && value <= high)) fail(name);
-}
-
-void requireColour(uint32_t color) {
-    if (color > 0xFFFFFF) fail("a colour has an alpha byte");
-}
-
-void requireStops(const Stops& stops) {
+void demandStops(const Stops& stops) {
     float last = 0.0F;
     for (const VFontEffect::VFGradient& stop : stops) {
-        requireColour(stop.mColor);
-        requireIn(stop.mOpacity, 0, 1, "stop opacity");
-        requireIn(stop.mLocation, last, 1, "stop location");
+        demandColour(stop.mColor);
+        demandIn(stop.mOpacity, 0, 1, "stop opacity");
+        demandIn(stop.mLocation, last, 1, "stop location");
         last = stop.mLocation;
     }
 }
 
 /// The numbers of one effect lie in the ranges of its add-call.
 struct RangeCheck {
+    bool isResolved;
+
     void operator()(const Shadow& e) const {
-        requireIn(e.angle, -360, 360, "shadow angle");
-        requireIn(e.distance, 0, 100, "shadow distance");
-        requireIn(e.size, 0, 100, "shadow size");
-        requireIn(e.opacity, 0, 1, "shadow opacity");
-        requireColour(e.color);
+        demandIn(e.angle, -360, 360, "shadow angle");
+        demandSize(e.distance, "shadow distance");
+        demandSize(e.size, "shadow size");
+        demandIn(e.opacity, 0, 1, "shadow opacity");
+        demandColour(e.color);
     }
     void operator()(const Glow& e) const {
-        requireIn(e.size, 0, 100, "glow size");
-        requireIn(e.opacity, 0, 1, "glow opacity");
-        requireColour(e.color);
-        requireStops(e.gradient);
+        demandSize(e.size, "glow size");
+        demandIn(e.opacity, 0, 1, "glow opacity");
+        demandColour(e.color);
+        demandStops(e.gradient);
     }
     void operator()(const Relief& e) const {
-        requireIn(e.size, 0, 100, "relief size");
-        requireIn(e.opacity, 0, 1, "relief opacity");
-        requireColour(e.highlightColor);
-        requireColour(e.shadowColor);
+        demandSize(e.size, "relief size");
+        demandIn(e.opacity, 0, 1, "relief opacity");
+        demandColour(e.highlightColor);
+        demandColour(e.shadowColor);
     }
     void operator()(const LinearGradient& e) const {
-        requireIn(e.angle, -360, 360, "gradient angle");
-        requireIn(e.opacity, 0, 1, "gradient opacity");
-        if (e.gradient.empty()) fail("a gradient has no stops");
-        requireStops(e.gradient);
+        demandIn(e.angle, -360, 360, "gradient angle");
+        demandIn(e.opacity, 0, 1, "gradient opacity");
+        demand(!e.gradient.empty(), "a gradient has no stops");
+        demandStops(e.gradient);
     }
     void operator()(const RadialGradient& e) const {
-        requireIn(e.opacity, 0, 1, "gradient opacity");
-        if (e.gradient.empty()) fail("a gradient has no stops");
-        requireStops(e.gradient);
+        demandIn(e.opacity, 0, 1, "gradient opacity");
+        demand(!e.gradient.empty(), "a gradient has no stops");
+        demandStops(e.gradient);
     }
     void operator()(const Stroke& e) const {
-        requireIn(e.size, 0, 100, "stroke size");
-        requireIn(e.opacity, 0, 1, "stroke opacity");
-        requireIn(e.position, 0, 2, "stroke position");
-        requireColour(e.color);
+        demandSize(e.size, "stroke size");
+        demandIn(e.opacity, 0, 1, "stroke opacity");
+        demandIn(e.position, 0, 2, "stroke position");
+        demandColour(e.color);
     }
     void operator()(const Pattern& e) const {
-        requireIn(e.opacity, 0, 1, "pattern opacity");
-        if (e.image.empty()) fail("a pattern has no image");
+        demandIn(e.opacity, 0, 1, "pattern opacity");
+        demandIn(e.scale, static_cast<double>(kSmallestPatternScale), 10, "pattern scale");
+        if (e.width) demandIn(e.width->value, 0.001F, isResolved ? HUGE_VAL : 1000, "tile width");
+        demand(!e.image.empty(), "a pattern has no image");
     }
     void operator()(const TextFill& e) const {
-        requireIn(e.opacity, 0, 1, "text opacity");
-        requireColour(e.color);
+        demandIn(e.opacity, 0, 1, "text opacity");
+        demandColour(e.color);
+    }
+
+  private:
+    void demandSize(const Length& length, const char* name) const {
+        demandIn(length.value, 0, 100, name);
+        if (!isResolved) return;
+        demand(length.unit == Length::Unit::pixels, "a share is not resolved");
     }
 };
 
-void require(const Style& style) {
-    if (style.color && hasTextFill(style)) fail("a style has two fills");
-    if (style.color) requireColour(*style.color);
-    if (style.textOpacity) requireIn(*style.textOpacity, 0, 1, "text opacity");
-    for (const Effect& effect : style.effects) {
-        if (effectName(effect).empty()) fail("an effect has no name");
-        std::visit(RangeCheck(), effect);
+void demandLook(const LookStyle& look, bool isResolved) {
+    demand(!look.color || !hasTextFill(look), "a look has two fills");
+    if (look.color) demandColour(*look.color);
+    if (look.textOpacity) demandIn(*look.textOpacity, 0, 1, "text opacity");
+    for (const Length& offset : {look.offsetX, look.offsetY})
+        demandIn(std::abs(offset.value), 0, isResolved ? kMaxOffset : 1000, "offset");
+    for (const Effect& effect : look.effects) {
+        demand(!effectName(effect).empty(), "an effect has no name");
+        std::visit(RangeCheck{isResolved}, effect);
     }
+}
+
+void demandStyle(const Style& style, bool isResolved) {
+    demandIn(static_cast<double>(style.looks.size()), 1, 32, "looks");
+    for (const LookStyle& look : style.looks)
+        demandLook(look, isResolved);
 }
 
 /// A picture for every pattern but those that have no name.
@@ -102,33 +110,54 @@ PatternImage load(const std::string& image) {
     return {1, 1, {1, 2, 3, 4}};
 }
 
-void requireLook(const Style& style) {
-    const Look look(style, fillOf(style), opacityOf(style), load);
-    if (look.added().size() > style.effects.size() + 1)
-        fail("a look has effects that its style has not");
-    if (look.added().size() + look.unpainted().size() < style.effects.size()) fail("an effect is lost");
-    // A pattern leaves no trace in a key.
-    if (keyFragments(look.key()).size() > look.added().size()) fail("a key has too many fragments");
+/// A pattern leaves no trace in a key, every other effect that is painted one fragment.
+void demandKey(const Stack& stack) {
+    size_t most = 0;
+    for (const StackedLook& stacked : stack.looks())
+        most += stacked.look.added().size() + 1;
+    demand(keyFragments(stack.key()).size() <= most, "a key has too many fragments");
+}
+
+void demandStack(const Style& style) {
+    const Stack stack(style, {}, {}, load);
+    demand(stack.looks().size() == style.looks.size(), "a look is lost");
+    for (size_t i = 0; i < style.looks.size(); ++i) {
+        const Look& look = stack.looks()[i].look;
+        const size_t effects = style.looks[i].effects.size();
+        demand(look.added().size() <= effects + 1, "a look has effects that its style has not");
+        demand(look.added().size() + look.unpainted().size() >= effects, "an effect is lost");
+    }
+    for (const std::string& note : stack.notes())
+        demandLine(note);
+    demandKey(stack);
     std::ostringstream source;
-    writeCpp(source, functionName(style.description), style, fillOf(style), opacityOf(style), load);
-    if (source.str().empty()) fail("a look is written as nothing");
+    writeCpp(source, functionName(style.description), style, {}, {}, load);
+    demand(!source.str().empty(), "a style is written as nothing");
+}
+
+void readAndPaint(std::string_view json, Decoder& choices) {
+    const Style style = parseStyle(json, "styles");
+    demandStyle(style, false);
+    constexpr int kSteps = 20;  // of a scale from 0.05 to 20
+    const int fontSize = choices.atEnd() ? 96 : choices.between(1, 1000);
+    const int steps = choices.atEnd() ? kSteps : choices.between(1, 20 * kSteps);
+    const float scale = static_cast<float>(steps) / static_cast<float>(kSteps);
+    const Style resolved = resolvedStyle(style, fontSize, scale, demandLine);
+    demandStyle(resolved, true);
+    demandStack(resolved);
 }
 
 }  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
-    const std::string_view json(reinterpret_cast<const char*>(data), size);
+    const std::string_view bytes(reinterpret_cast<const char*>(data), size);
+    const std::string_view json = bytes.substr(0, bytes.find('\0'));
+    const size_t behind = std::min(size, json.size() + 1);
+    Decoder choices(data + behind, size - behind);
     try {
-        const Style style = parseStyle(json, "styles");
-        require(style);
-        for (const float factor : {0.01F, 0.5F, 1.0F})
-            require(scaledStyle(style, factor));
-        requireLook(style);
+        readAndPaint(json, choices);
     } catch (const StyleError& error) {
-        const std::string_view message = error.what();
-        if (message.empty() || message.find('\n') != std::string_view::npos) {
-            fail("the message of a refused style is not one line");
-        }
+        demandLine(error.what());
     }
     return 0;
 }

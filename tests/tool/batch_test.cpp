@@ -56,8 +56,8 @@ TEST(Batch, Style_IsAFileOrAnObject) {
     EXPECT_EQ(jobOf(R"("style": "look.json")").style, "look.json");
     const Options job = jobOf(R"("style": {"outerGlow": {"size": 3, "color": "#0000FF"}})");
     ASSERT_TRUE(job.inlineStyle);
-    ASSERT_EQ(job.inlineStyle->effects.size(), 1U);
-    EXPECT_EQ(std::get<vorelstyle::OuterGlow>(job.inlineStyle->effects[0]).size, 3.0F);
+    ASSERT_EQ(job.inlineStyle->looks[0].effects.size(), 1U);
+    EXPECT_EQ(std::get<vorelstyle::OuterGlow>(job.inlineStyle->looks[0].effects[0]).size.value, 3.0F);
 }
 
 TEST(Batch, WhatAJobDoesNotSay_IsTheCommandLines) {

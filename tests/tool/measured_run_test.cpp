@@ -38,7 +38,7 @@ class MeasuredRunTest : public ::testing::Test {
 
     /// The run in steps paints what the run in one paints, in the order in which the set is planned.
     void expectThePlannedPicture(const Style& style, float opacity) {
-        Look look(style, 0x336699, opacity, imagesOf(style));
+        Look look(style.looks.front(), 0x336699, opacity, imagesOf(style));
         const Plan plan = planOf(look);
         Image inSteps;
         measuredRun(look, plan, frameOf(look), glyphs(), &inSteps);
@@ -50,7 +50,8 @@ class MeasuredRunTest : public ::testing::Test {
 
     /// The order of the key after planning, which follows the set's list.
     static std::vector<int> plannedOrder(const Style& style, float opacity) {
-        VFontEffect::VFEffect effects(Look(style, 0x336699, opacity, imagesOf(style)).effects());
+        VFontEffect::VFEffect effects(
+            Look(style.looks.front(), 0x336699, opacity, imagesOf(style)).effects());
         effects.initEffect(1, 1);
         const std::unique_ptr<char[]> key(effects.getMapKey());
         std::vector<int> types;
@@ -90,8 +91,8 @@ TEST_F(MeasuredRunTest, Plan_PutsWhatLiesBeneathBehindTheText) {
     const Look look(
         parseStyle(R"({"outerShadow": {"angle": 0, "distance": 1, "size": 1, "color": "#000000"},
                        "innerShadow": {"angle": 0, "distance": 1, "size": 1, "color": "#000000"},
-                       "stroke": {"size": 1, "color": "#000000", "position": "outside"}})",
-                   ""),
+                       "stroke": {"size": 1, "color": "#000000", "position": "outside"}})")
+            .looks.front(),
         0, 1);
     const Plan plan = planOf(look);
     EXPECT_FALSE(plan.layered);
@@ -101,10 +102,10 @@ TEST_F(MeasuredRunTest, Plan_PutsWhatLiesBeneathBehindTheText) {
 
 TEST_F(MeasuredRunTest, Plan_IsLayeredForTranslucentTextAndCentredStrokes) {
     const Style centred =
-        parseStyle(R"({"stroke": {"size": 1, "color": "#000000", "position": "center"}})", "");
+        parseStyle(R"({"stroke": {"size": 1, "color": "#000000", "position": "center"}})");
     EXPECT_FALSE(planOf(Look({}, 0, 1)).layered);
     EXPECT_TRUE(planOf(Look({}, 0, 0.99F)).layered);
-    EXPECT_TRUE(planOf(Look(centred, 0, 1)).layered);
+    EXPECT_TRUE(planOf(Look(centred.looks.front(), 0, 1)).layered);
 }
 
 TEST_F(MeasuredRunTest, Memory_IsThatOfTheLayersAndOneEffect) {
@@ -119,7 +120,7 @@ TEST_F(MeasuredRunTest, Memory_IsThatOfTheLayersAndOneEffect) {
     EXPECT_NEAR(static_cast<double>(layersOf(opaque)), static_cast<double>(pixels), 300);
     EXPECT_NEAR(static_cast<double>(layersOf(translucent)), static_cast<double>(5 * pixels), 300);
 
-    Look glow(parseStyle(R"({"outerGlow": {"size": 9, "color": "#00FF00"}})", ""), 0, 1);
+    Look glow(parseStyle(R"({"outerGlow": {"size": 9, "color": "#00FF00"}})").looks.front(), 0, 1);
     const MeasuredRun run = measuredRun(glow, planOf(glow), frameOf(glow), glyphs());
     ASSERT_EQ(run.effects.size(), 2U);
     EXPECT_GT(run.effects[1].bytes, 0U) << "the glow works on planes of its own";

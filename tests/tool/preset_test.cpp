@@ -13,6 +13,7 @@ using vorel_test::Outcome;
 using vorel_test::runVorelpaint;
 using vorel_test::TempDir;
 using vorelstyle::Effect;
+using vorelstyle::LookStyle;
 using vorelstyle::Stroke;
 using vorelstyle::Style;
 
@@ -21,9 +22,12 @@ TEST(Presets, TogetherShowEveryEffectAndStrokePosition) {
     std::set<int> positions;
     for (const std::string& name : presetNames()) {
         const Style style = loadStyle(findPreset(name));
-        for (const Effect& effect : style.effects) {
-            effects.emplace(effectName(effect));
-            if (const auto* stroke = std::get_if<Stroke>(&effect)) positions.insert(stroke->position);
+        for (const LookStyle& look : style.looks) {
+            for (const Effect& effect : look.effects) {
+                effects.emplace(effectName(effect));
+                if (const auto* stroke = std::get_if<Stroke>(&effect))
+                    positions.insert(stroke->position);
+            }
         }
     }
     const std::set<std::string> painted{"outerShadow", "innerShadow",    "outerGlow",

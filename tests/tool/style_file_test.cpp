@@ -10,7 +10,7 @@
 namespace vorelpaint {
 namespace {
 
-using vorelstyle::Look;
+using vorelstyle::Stack;
 using vorelstyle::Style;
 using vorelstyle::StyleError;
 
@@ -41,14 +41,15 @@ TEST(StyleFile, Images_LieBesideTheFile) {
     const vorelstyle::PatternImage image = imagesOf(style)("tiles.png");
     EXPECT_GT(image.width, 0);
     EXPECT_EQ(image.pixels.size(), static_cast<size_t>(image.width * image.height * 4));
-    EXPECT_EQ(Look(style, 0, 1, imagesOf(style)).added().front(), vorelstyle::kPatternType);
+    EXPECT_EQ(Stack(style, {}, {}, imagesOf(style)).looks().front().look.added().front(),
+              vorelstyle::kPatternType);
 }
 
 TEST(StyleFile, PatternFaults_NameTheStyleFile) {
     try {
         const Style style =
             vorelstyle::parseStyle(R"({"pattern": {"image": "none.png"}})", "looks/a.json");
-        const Look look(style, 0, 1, imagesOf(style));
+        const Stack stack(style, {}, {}, imagesOf(style));
         FAIL() << "painted without its pattern";
     } catch (const StyleError& error) {
         EXPECT_EQ(std::string(error.what()).rfind("style 'looks/a.json': pattern.image: ", 0), 0U);
@@ -58,7 +59,7 @@ TEST(StyleFile, PatternFaults_NameTheStyleFile) {
 TEST(StyleFile, PatternThatCannotBeRead_IsAStyleError) {
     for (const char* image : {"none.png", ".", "gold.json"}) {
         const Style style = patternStyle(image);
-        EXPECT_THROW(Look(style, 0, 1, imagesOf(style)), StyleError) << image;
+        EXPECT_THROW(Stack(style, {}, {}, imagesOf(style)), StyleError) << image;
     }
 }
 

@@ -53,4 +53,9 @@ voreltext::FontFile findFont(const std::string& request) {
     return systemFonts().find(request);
 }
 
+std::optional<voreltext::FontFile> findFontFor(const std::vector<uint32_t>& /*cluster*/,
+                                               const voreltext::FontFile& /*main*/) {
+    return std::nullopt;
+}
+
 }  // namespace vorelpaint

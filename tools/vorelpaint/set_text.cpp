@@ -39,7 +39,7 @@ std::string bytesOfText(const Options& options) {
 int64_t letterSpacing(const Options& options, int size) {
     const vorelstyle::Length& length = options.letterSpacing;
     const bool isShare = length.unit == vorelstyle::Length::Unit::percent;
-    const double pixels = isShare ? length.value * size / 100.0 : double{length.value};
+    const double pixels = isShare ? double{length.value} * size / 100.0 : double{length.value};
     return std::llround(pixels * 64.0);
 }
 

@@ -9,8 +9,8 @@
 namespace vorelstyle {
 namespace {
 
-Style styleOf(const std::string& json) {
-    return parseStyle(json);
+LookStyle lookOf(const std::string& json) {
+    return parseStyle(json).looks.front();
 }
 
 /// A cache key's 8-character spelling of a colour word: one character a nibble, top bit set.
@@ -23,23 +23,24 @@ std::string keyWord(uint32_t word) {
 }
 
 TEST(Look, PlainText_HasTheKeyOfItsFill) {
-    EXPECT_EQ(Look(styleOf("{}"), 0x123456, 1).key(), "T" + keyWord(0xFF123456));
+    EXPECT_EQ(Look(lookOf("{}"), 0x123456, 1).key(), "T" + keyWord(0xFF123456));
 }
 
 TEST(Look, TextOpacity_EntersTheKeyPremultiplied) {
     // Half opacity is alpha 128, and (128 * (0xFF + 1)) >> 8 = 0x80.
-    EXPECT_EQ(Look(styleOf("{}"), 0xFF0000, 0.5F).key(), "T" + keyWord(0x80800000));
+    EXPECT_EQ(Look(lookOf("{}"), 0xFF0000, 0.5F).key(), "T" + keyWord(0x80800000));
 }
 
 TEST(Look, TextFillOfTheStyle_KeepsItsPlaceAndTakesTheChosenColour) {
-    const Style style = styleOf(R"({"text": {"color": "#111111"},
+    const LookStyle style = lookOf(R"({"text": {"color": "#111111"},
                                     "stroke": {"size": 2, "color": "#0000FF", "position": "outside"}})");
     const std::string stroke = "K\x82" + keyWord(0xFF0000FF) + "\x80\x81";
     EXPECT_EQ(Look(style, 0x00FF00, 1).key(), "T" + keyWord(0xFF00FF00) + stroke);
 }
 
 TEST(Look, FillWithoutAPlace_ComesLast) {
-    const Style style = styleOf(R"({"stroke": {"size": 2, "color": "#0000FF", "position": "outside"}})");
+    const LookStyle style =
+        lookOf(R"({"stroke": {"size": 2, "color": "#0000FF", "position": "outside"}})");
     EXPECT_EQ(Look(style, 0, 1).key().back(), '\x80');
     EXPECT_EQ(Look(style, 0, 1).key().find('T'), Look(style, 0, 1).key().size() - 9);
 }
@@ -47,22 +48,22 @@ TEST(Look, FillWithoutAPlace_ComesLast) {
 TEST(Look, EffectsWithoutACore_AreNamed) {
     const std::string relief =
         R"({"size": 1, "angle": 0, "altitude": 0, "highlightColor": "#000000", "shadowColor": "#000000"})";
-    const Look look(styleOf(R"({"bevel": )" + relief + R"(, "emboss": )" + relief + "}"), 0, 1);
+    const Look look(lookOf(R"({"bevel": )" + relief + R"(, "emboss": )" + relief + "}"), 0, 1);
     EXPECT_EQ(look.unpainted(), (std::vector<std::string>{"bevel", "emboss"}));
 }
 
-/// The message with which a style with a pattern is refused whose pictures come from `load`.
+/// The message with which a look with a pattern is refused whose pictures come from `load`.
 std::string faultWith(const LoadImage& load) {
     try {
-        const Look look(parseStyle(R"({"pattern": {"image": "a.png"}})", "looks/a.json"), 0, 1, load);
+        const Look look(lookOf(R"({"pattern": {"image": "a.png"}})"), 0, 1, load);
         return "";
     } catch (const StyleError& error) {
         return error.what();
     }
 }
 
-TEST(Look, PatternFaults_NameTheStyle) {
-    const std::string where = "style 'looks/a.json': pattern.image: ";
+TEST(Look, PatternFaults_NameTheKey) {
+    const std::string where = "pattern.image: ";
     EXPECT_EQ(faultWith([](const std::string& image) -> PatternImage {
                   throw StyleError(image + " is torn");
               }),

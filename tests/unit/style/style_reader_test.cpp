@@ -19,18 +19,25 @@ std::string faultOf(const std::string& json) {
     }
 }
 
+LookStyle onlyLook(const std::string& json) {
+    const Style style = parseStyle(json);
+    EXPECT_EQ(style.looks.size(), 1U);
+    return style.looks.at(0);
+}
+
 template <typename Kind>
 Kind only(const std::string& json) {
-    const Style style = parseStyle(json);
-    EXPECT_EQ(style.effects.size(), 1U);
-    return std::get<Kind>(style.effects.at(0));
+    const LookStyle look = onlyLook(json);
+    EXPECT_EQ(look.effects.size(), 1U);
+    return std::get<Kind>(look.effects.at(0));
 }
 
 TEST(StyleReader, EmptyObject_IsTextWithoutEffects) {
     const Style style = parseStyle("{}");
-    EXPECT_TRUE(style.effects.empty());
-    EXPECT_FALSE(style.color);
-    EXPECT_FALSE(style.textOpacity);
+    ASSERT_EQ(style.looks.size(), 1U);
+    EXPECT_TRUE(style.looks[0].effects.empty());
+    EXPECT_FALSE(style.looks[0].color);
+    EXPECT_FALSE(style.looks[0].textOpacity);
     EXPECT_TRUE(style.name.empty());
 }
 
@@ -50,45 +57,45 @@ TEST(StyleReader, StyleInsideADocument_IsReadFromItsValue) {
     const JsonDocument document(R"({"look": {"outerGlow": {"size": 3, "color": "#0000FF"}}})");
     const JsonObject around(document.root(), "", {"look"});
     const Style style = readStyle(around.value("look"));
-    ASSERT_EQ(style.effects.size(), 1U);
-    EXPECT_EQ(std::get<OuterGlow>(style.effects[0]).size, 3.0F);
+    ASSERT_EQ(style.looks.at(0).effects.size(), 1U);
+    EXPECT_EQ(std::get<OuterGlow>(style.looks[0].effects[0]).size, Length{3});
 }
 
 TEST(StyleReader, FillAndOpacity_AreTheTextsOwnElseTheStylesElseBlackAndOpaque) {
-    EXPECT_EQ(fillOf(parseStyle("{}")), 0U);
-    EXPECT_EQ(opacityOf(parseStyle("{}")), 1.0F);
-    EXPECT_EQ(fillOf(parseStyle(R"({"color": "#010203"})")), 0x010203U);
-    EXPECT_EQ(fillOf(parseStyle(R"({"text": {"color": "#040506"}})")), 0x040506U);
-    EXPECT_EQ(opacityOf(parseStyle(R"({"textOpacity": 0.5})")), 0.5F);
+    EXPECT_EQ(fillOf(onlyLook("{}")), 0U);
+    EXPECT_EQ(opacityOf(onlyLook("{}")), 1.0F);
+    EXPECT_EQ(fillOf(onlyLook(R"({"color": "#010203"})")), 0x010203U);
+    EXPECT_EQ(fillOf(onlyLook(R"({"text": {"color": "#040506"}})")), 0x040506U);
+    EXPECT_EQ(opacityOf(onlyLook(R"({"textOpacity": 0.5})")), 0.5F);
 }
 
 TEST(StyleReader, TopLevelKeys_AreTheTextsDefaults) {
     const Style style = parseStyle(R"({"description": "d", "color": "#0A0b0C", "textOpacity": 0.25})");
     EXPECT_EQ(style.description, "d");
-    EXPECT_EQ(style.color, 0x0A0B0CU);
-    EXPECT_EQ(style.textOpacity, 0.25F);
+    EXPECT_EQ(style.looks[0].color, 0x0A0B0CU);
+    EXPECT_EQ(style.looks[0].textOpacity, 0.25F);
 }
 
 TEST(StyleReader, Effects_KeepTheOrderOfTheFile) {
-    const Style style = parseStyle(R"({
+    const LookStyle look = onlyLook(R"({
         "text": {"color": "#000000"},
         "stroke": {"size": 1, "color": "#000000", "position": "center"},
         "bevel": {"size": 1, "angle": 0, "altitude": 0,
                   "highlightColor": "#000000", "shadowColor": "#000000"},
         "outerShadow": {"angle": 0, "distance": 0, "size": 0, "color": "#000000"}})");
-    ASSERT_EQ(style.effects.size(), 4U);
-    EXPECT_EQ(effectName(style.effects[0]), "text");
-    EXPECT_EQ(effectName(style.effects[1]), "stroke");
-    EXPECT_EQ(effectName(style.effects[2]), "bevel");
-    EXPECT_EQ(effectName(style.effects[3]), "outerShadow");
+    ASSERT_EQ(look.effects.size(), 4U);
+    EXPECT_EQ(effectName(look.effects[0]), "text");
+    EXPECT_EQ(effectName(look.effects[1]), "stroke");
+    EXPECT_EQ(effectName(look.effects[2]), "bevel");
+    EXPECT_EQ(effectName(look.effects[3]), "outerShadow");
 }
 
 TEST(StyleReader, OuterShadow_ReadsEveryArgument) {
     const auto shadow = only<OuterShadow>(
         R"({"outerShadow": {"angle": -45.5, "distance": 7, "size": 3, "color": "#123456", "opacity": 0.5}})");
     EXPECT_EQ(shadow.angle, -45.5F);
-    EXPECT_EQ(shadow.distance, 7.0F);
-    EXPECT_EQ(shadow.size, 3.0F);
+    EXPECT_EQ(shadow.distance, Length{7});
+    EXPECT_EQ(shadow.size, Length{3});
     EXPECT_EQ(shadow.color, 0x123456U);
     EXPECT_EQ(shadow.opacity, 0.5F);
 }
@@ -96,7 +103,7 @@ TEST(StyleReader, OuterShadow_ReadsEveryArgument) {
 TEST(StyleReader, InnerShadow_WithoutOpacityIsOpaque) {
     const auto shadow = only<InnerShadow>(
         R"({"innerShadow": {"angle": 90, "distance": 100, "size": 0, "color": "#FFFFFF"}})");
-    EXPECT_EQ(shadow.distance, 100.0F);
+    EXPECT_EQ(shadow.distance, Length{100});
     EXPECT_EQ(shadow.opacity, 1.0F);
 }
 
@@ -163,7 +170,7 @@ TEST(StyleReader, Relief_ReadsEveryArgument) {
                        "opacity": 0.1, "angle": 7, "altitude": 8, "highlightColor": "#000009",
                        "highlightOpacity": 0.2, "shadowColor": "#00000A", "shadowOpacity": 0.3}})");
     EXPECT_EQ(emboss.style, 1);
-    EXPECT_EQ(emboss.size, 2.0F);
+    EXPECT_EQ(emboss.size, Length{2});
     EXPECT_EQ(emboss.depth, 3.0F);
     EXPECT_EQ(emboss.technique, 4);
     EXPECT_EQ(emboss.direction, 5);
@@ -247,9 +254,9 @@ TEST(StyleReader, NumbersOutOfRange_AreNamedWithTheRange) {
 }
 
 TEST(StyleReader, WholeNumbers_MayBeSpelledWithAPoint) {
-    const Style style = parseStyle(
+    const auto stroke = only<Stroke>(
         R"({"stroke": {"size": 1, "color": "#000000", "strokeStyle": 7.0, "position": "inside"}})");
-    EXPECT_EQ(std::get<Stroke>(style.effects.at(0)).strokeStyle, 7);
+    EXPECT_EQ(stroke.strokeStyle, 7);
 }
 
 TEST(StyleReader, SchemaForEditors_IsReadPast) {
@@ -283,7 +290,7 @@ TEST(StyleReader, StopsThatStepBack_AreRefused) {
 }
 
 TEST(StyleReader, ShortColours_AreRead) {
-    EXPECT_EQ(parseStyle(R"({"color": "#F80"})").color, 0xFF8800U);
+    EXPECT_EQ(onlyLook(R"({"color": "#F80"})").color, 0xFF8800U);
 }
 
 TEST(StyleReader, BadColours_AreQuoted) {
