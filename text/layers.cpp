@@ -54,6 +54,14 @@ Image paintRun(VFEffect& effects, const Part& part, const Frame& frame) {
     return run.picture();
 }
 
+/// An outer glow ends twice its pad, which is its size + 1, from the glyphs: its faint end lies beyond the
+/// margins.
+int faintEndOf(VFEffect& effects) {
+    constexpr int kOuterGlowType = 3;
+    VFontEffect::VFECore* const glow = effects.getEffect(kOuterGlowType);
+    return glow == nullptr ? 0 : glow->getOffset() + 2;
+}
+
 /// The effects that paint the characters at this place of the text.
 const VFEffect* effectsAt(const Layer& layer, size_t cluster) {
     for (const Exchange& exchange : layer.exchanges) {
@@ -85,7 +93,7 @@ class LayerPainter {
 
     void paint(Image& canvas, const Canvas& place, const Part& part) {
         VFEffect& effects = copyOf(mLayer.effects);
-        const Frame frame{part.ink, marginsOf(effects), 0};
+        const Frame frame{part.ink, marginsOf(effects), faintEndOf(effects)};
         Image picture = paintRun(effects, part, frame);
         exchangeGlyphs(picture, part, frame);
         const int x = place.x + mLayer.x;

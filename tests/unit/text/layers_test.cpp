@@ -82,6 +82,17 @@ TEST(Layers, OneOfTheWholeText_IsThePictureOfItsEffects) {
     }
 }
 
+TEST(Layers, Glow_KeepsItsFaintEnd) {
+    const Sample sample("Halo");
+    VFEffect effects;
+    effects.addOuterGlowText(30, 0xFF8000, 1, 0, nullptr);
+    effects.addText(0, 1);
+    const Canvas canvas = placedOn({{}, {}, Anchor::center, 0, 60}, sample.layout().inkBox(),
+                                   marginsOf({{&effects}}));
+    EXPECT_EQ(paint({{&effects}}, sample.layout(), canvas).pixels,
+              paint(effects, sample.layout(), 60).pixels);
+}
+
 TEST(Layers, PaintedAgain_AreTheSamePicture) {
     const Sample sample("Again");
     VFEffect below = everything();
