@@ -46,7 +46,7 @@ def reader_faults(styles):
             for number, style in enumerate(styles))
     run = run_program(["--batch", "-"], "".join(json.dumps(job) + "\n" for job in jobs))
     faults = {}
-    for line, fault in re.findall(r"line (\d+): (?!warning: )(.*)", run.stderr):
+    for line, fault in re.findall(r"line (\d+): (?!note: )(.*)", run.stderr):
         # A missing image is no fault of the style.
         taken = fault.startswith("nothing to paint: ") or fault.startswith("pattern.image: '")
         faults[int(line)] = "" if taken else fault

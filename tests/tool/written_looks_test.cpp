@@ -7,7 +7,7 @@
 #include <string>
 
 #include "font_choice.h"
-#include "painting.h"
+#include "layer_set.h"
 
 #define VOREL_WRITTEN_LOOK(function, style) void function(VFontEffect::VFEffect& look);
 #include "written_looks.inc"
@@ -16,7 +16,6 @@
 namespace vorelpaint {
 namespace {
 
-using vorelstyle::Look;
 using voreltext::Align;
 using voreltext::Font;
 using voreltext::Fonts;
@@ -44,15 +43,16 @@ class WrittenLooks : public ::testing::TestWithParam<WrittenLook> {};
 TEST_P(WrittenLooks, PaintTheSamePixels) {
     Options options;
     options.style = GetParam().style;
-    Look look = makeLook(options, chosenStyle(options), [](const std::string&) {});
+    const LayerSet looks(options, chosenStyle(options), options.size, {}, [](const std::string&) {});
     VFontEffect::VFEffect written;
     GetParam().add(written);
     const std::unique_ptr<char[]> key(written.getMapKey());
-    EXPECT_EQ(look.key(), key.get());
+    EXPECT_EQ(looks.stack().key(), key.get());
 
     Fonts fonts{Font(findFont("DejaVu Sans"), 64)};
     const TextLayout text(fonts, voreltext::decodeUtf8("Quick\nfox"), {Align::center});
-    const Image expected = paint(look.effects(), text, 2);
+    VFontEffect::VFEffect effects(*looks.layers().front().effects);
+    const Image expected = paint(effects, text, 2);
     const Image painted = paint(written, text, 2);
     EXPECT_EQ(painted.width, expected.width);
     EXPECT_EQ(painted.height, expected.height);
