@@ -161,13 +161,12 @@ void writePlaces(std::ostream& out, const std::string& name, const Style& style)
         << "    int offsetY;  // in pixels, downwards\n"
         << "    const char* span;  // what is one run, with a text box of its own\n};\n\n";
     if (!style.description.empty()) out << "/// " << sentence(style.description) << '\n';
-    out << "/// In the order of painting. Each look paints the whole text, one run for each of its "
-           "spans\n"
-        << "/// (block, line, word or glyph), into a transparent picture of its own, which is then "
-           "moved by\n"
-        << "/// the offset and laid over the ones before: each premultiplied channel is that of the "
-           "upper\n"
-        << "/// picture plus that of the lower one times (1 - the upper alpha).\n"
+    out << "/// In the order of painting. A look paints each of its spans (block, line, word or glyph) "
+           "as a\n"
+        << "/// run into a transparent picture of its own, which, moved by the look's offset, is laid "
+           "over\n"
+        << "/// what is painted before: each premultiplied channel becomes\n"
+        << "/// source + destination * (255 - source alpha) / 255.\n"
         << "extern const " << type << " " << array << ";\nconst " << type << " " << array << " = {\n";
     for (size_t i = 0; i < style.looks.size(); ++i) {
         const Place place = placeOf(style.looks[i]);
