@@ -1,5 +1,6 @@
 #pragma once
 
+#include <algorithm>
 #include <cstdint>
 #include <vector>
 
@@ -14,6 +15,15 @@ struct Box {
 
     int width() const { return right - left; }
     int height() const { return bottom - top; }
+    bool isEmpty() const { return width() <= 0 || height() <= 0; }
+
+    /// Makes it hold the other box as well; an empty one has no place.
+    void grow(const Box& other) {
+        if (other.isEmpty()) return;
+        *this = isEmpty() ? other
+                          : Box{std::min(left, other.left), std::min(top, other.top),
+                                std::max(right, other.right), std::max(bottom, other.bottom)};
+    }
 };
 
 /// The coverage of one glyph and where it stands.
