@@ -142,11 +142,12 @@ TEST(Batch, WhatAJobSays_ReplacesTheOtherOfThePair) {
 }
 
 TEST(Batch, UnknownKeys_AreRefusedWithTheKnownOnes) {
-    EXPECT_EQ(faultOfMember(R"("colour": "#000000")"),
-              "colour: unknown key; did you mean color? Known are text, text-file, markup, align, "
-              "line-height, "
-              "letter-spacing, font, size, font-features, font-variations, style, preset, effect-scale, "
-              "color, opacity, width, height, anchor, margin, fit, box, padding, output, background");
+    EXPECT_EQ(
+        faultOfMember(R"("colour": "#000000")"),
+        "colour: unknown key; did you mean color? Known are text, text-file, markup, align, "
+        "line-height, "
+        "letter-spacing, font, size, font-features, font-variations, style, preset, effect-scale, "
+        "color, opacity, width, height, anchor, margin, fit, box, padding, output, background, png");
     EXPECT_EQ(faultOfMember(R"("batch": "b.jsonl")").rfind("batch: unknown key", 0), 0U);
     EXPECT_EQ(faultOfMember(R"("help": true)").rfind("help: unknown key", 0), 0U);
 }

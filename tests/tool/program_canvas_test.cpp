@@ -9,7 +9,7 @@
 #include <string>
 #include <vector>
 
-#include "png_io.h"
+#include "png_reader.h"
 #include "program.h"
 
 namespace vorelpaint {

@@ -5,7 +5,7 @@
 #include <string>
 #include <vector>
 
-#include "png_io.h"
+#include "png_reader.h"
 #include "program.h"
 #include "style_file.h"
 

@@ -13,7 +13,7 @@
 #include <tuple>
 #include <vector>
 
-#include "png_io.h"
+#include "png_reader.h"
 #include "program.h"
 #include "tests/support/thinned.h"
 

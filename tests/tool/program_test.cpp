@@ -8,7 +8,7 @@
 #include <string>
 #include <vector>
 
-#include "png_io.h"
+#include "png_reader.h"
 #include "voreleffect/VFVersion.h"
 
 namespace vorelpaint {

@@ -46,6 +46,7 @@ TEST(Settings, Initial_IsWhatAFreshRequestHolds) {
         EXPECT_EQ(options.canvas.padding, fresh.canvas.padding) << setting.name;
         EXPECT_EQ(options.canvas.margin, fresh.canvas.margin) << setting.name;
         EXPECT_EQ(options.canvas.anchor, fresh.canvas.anchor) << setting.name;
+        EXPECT_EQ(options.png, fresh.png) << setting.name;
         EXPECT_EQ(options.fit, fresh.fit) << setting.name;
         EXPECT_EQ(options.box, fresh.box) << setting.name;
         EXPECT_EQ(options.lineHeight, fresh.lineHeight) << setting.name;

@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "background.h"
+#include "png_writer.h"
 #include "style/vorelstyle.h"
 #include "text/voreltext.h"
 
@@ -47,6 +48,7 @@ struct Options {
 
     Background background;
     std::optional<std::string> output;
+    PngEffort png = PngEffort::normal;
     voreltext::CanvasRequest canvas{std::nullopt, std::nullopt, voreltext::Anchor::center, 0, 8};
     Fit fit = Fit::none;
     TextBox box = TextBox::ink;

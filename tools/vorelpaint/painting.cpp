@@ -9,7 +9,7 @@
 #include "console.h"
 #include "error.h"
 #include "file_io.h"
-#include "png_io.h"
+#include "png_writer.h"
 #include "report.h"
 
 namespace vorelpaint {
@@ -62,7 +62,7 @@ Image Composition::paint() const {
 
 void writePicture(const Options& options, Image picture) {
     layOn(picture, options.background);
-    writeFile(options.output.value(), [&](std::FILE* file) { writePng(file, picture); });
+    writeFile(options.output.value(), [&](std::FILE* file) { writePng(file, picture, options.png); });
 }
 
 void finish(const Options& options, const Composition& composition) {

@@ -68,6 +68,8 @@ constexpr std::array<Word<Anchor>, 9> kAnchors{{{"top-left", Anchor::topLeft},
                                                 {"bottom-right", Anchor::bottomRight}}};
 constexpr std::array<Word<Fit>, 3> kFits{
     {{"none", Fit::none}, {"shrink", Fit::shrink}, {"wrap", Fit::wrap}}};
+constexpr std::array<Word<PngEffort>, 3> kEfforts{
+    {{"fast", PngEffort::fast}, {"normal", PngEffort::normal}, {"small", PngEffort::small}}};
 constexpr std::array<Word<TextBox>, 2> kBoxes{{{"ink", TextBox::ink}, {"line", TextBox::line}}};
 
 template <typename Words, typename Member>
@@ -252,6 +254,9 @@ std::vector<Setting> outputSettings() {
                           "What lies behind the text",
                           parsed(parseBackground, &Options::background,
                                  "none of transparent, checkerboard, #RRGGBB, #RGB")),
+            pictureOption("png", listed(kEfforts, "|"), "normal", kGroup,
+                          "Whether time or bytes are spared; the pixels are the same",
+                          oneOf(kEfforts, &Options::png)),
             programOption("strict", "", kGroup, "Take every note for an error, and paint nothing",
                           flag(&Options::strict))};
 }

@@ -5,7 +5,7 @@
 
 #include "error.h"
 #include "file_io.h"
-#include "png_io.h"
+#include "png_reader.h"
 #include "ranges.h"
 
 namespace vorelpaint {

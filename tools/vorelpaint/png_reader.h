@@ -1,6 +1,5 @@
 #pragma once
 
-#include <cstdio>
 #include <filesystem>
 
 #include "text/voreltext.h"
@@ -10,8 +9,5 @@ namespace vorelpaint {
 /// Reads a PNG file as straight R, G, B, A. Throws ToolError when it cannot be read, is no PNG or
 /// has more than 4096 pixels on a side.
 voreltext::Image readPng(const std::filesystem::path& path);
-
-/// Writes a picture of straight R, G, B, A as a PNG. Throws ToolError.
-void writePng(std::FILE* file, const voreltext::Image& image);
 
 }  // namespace vorelpaint

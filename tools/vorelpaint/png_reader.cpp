@@ -1,9 +1,7 @@
-#include "png_io.h"
+#include "png_reader.h"
 
 #include <png.h>
 
-#include <cerrno>
-#include <cstring>
 #include <memory>
 #include <string>
 
@@ -52,18 +50,6 @@ Image readPng(const std::filesystem::path& path) {
         throw ToolError(name + " is no readable PNG: " + png->message);
     }
     return image;
-}
-
-void writePng(std::FILE* file, const Image& image) {
-    PngRecord png;
-    png->width = static_cast<png_uint_32>(image.width);
-    png->height = static_cast<png_uint_32>(image.height);
-    png->format = PNG_FORMAT_RGBA;
-    const bool written =
-        png_image_write_to_stdio(png.get(), file, 0, image.pixels.data(), 0, nullptr) != 0;
-    // The system's reason tells more than libpng's "Write Error".
-    if (std::ferror(file) != 0) throw ToolError(std::strerror(errno));
-    if (!written) throw ToolError(png->message);
 }
 
 }  // namespace vorelpaint

@@ -1,4 +1,4 @@
-#include "png_io.h"
+#include "png_reader.h"
 
 #include <gtest/gtest.h>
 #include <png.h>
@@ -17,7 +17,7 @@ using Bytes = std::vector<uint8_t>;
 using vorel_test::readBytes;
 using voreltext::Image;
 
-class PngIo : public ::testing::Test {
+class PngReader : public ::testing::Test {
   protected:
     /// A PNG of one row in one of libpng's formats.
     std::string write(png_uint_32 format, png_uint_32 width, const void* pixels,
@@ -45,20 +45,20 @@ class PngIo : public ::testing::Test {
     vorel_test::TempDir mDir;
 };
 
-TEST_F(PngIo, Grey_IsReadAsOpaqueColours) {
+TEST_F(PngReader, Grey_IsReadAsOpaqueColours) {
     const Bytes row{0, 100, 255};
     EXPECT_EQ(readPng(write(PNG_FORMAT_GRAY, 3, row.data())).pixels,
               (Bytes{0, 0, 0, 255, 100, 100, 100, 255, 255, 255, 255, 255}));
 }
 
-TEST_F(PngIo, Palette_IsReadAsItsColours) {
+TEST_F(PngReader, Palette_IsReadAsItsColours) {
     const Bytes palette{10, 20, 30, 40, 50, 60};
     const Bytes row{1, 0};
     EXPECT_EQ(readPng(write(PNG_FORMAT_RGB_COLORMAP, 2, row.data(), palette.data(), 2)).pixels,
               (Bytes{40, 50, 60, 255, 10, 20, 30, 255}));
 }
 
-TEST_F(PngIo, SixteenBits_AreReadAsEight) {
+TEST_F(PngReader, SixteenBits_AreReadAsEight) {
     const std::vector<uint16_t> row{0, 65535};
     const std::string path = write(PNG_FORMAT_LINEAR_Y, 2, row.data());
     constexpr size_t kBitDepth = 24;
@@ -66,26 +66,13 @@ TEST_F(PngIo, SixteenBits_AreReadAsEight) {
     EXPECT_EQ(readPng(path).pixels, (Bytes{0, 0, 0, 255, 255, 255, 255, 255}));
 }
 
-TEST_F(PngIo, WrittenPicture_IsReadBack) {
-    const Image image{1, 2, {1, 2, 3, 4, 5, 6, 7, 255}};
-    const std::string path = mDir.file("a.png");
-    std::FILE* file = std::fopen(path.c_str(), "wb");
-    ASSERT_NE(file, nullptr);
-    writePng(file, image);
-    std::fclose(file);
-    const Image read = readPng(path);
-    EXPECT_EQ(read.width, 1);
-    EXPECT_EQ(read.height, 2);
-    EXPECT_EQ(read.pixels, image.pixels);
-}
-
-TEST_F(PngIo, OtherFiles_AreRefusedByName) {
+TEST_F(PngReader, OtherFiles_AreRefusedByName) {
     const std::string path = mDir.write("a.png", "GIF89a");
     EXPECT_EQ(faultOf(path).rfind("'" + path + "' is no readable PNG: ", 0), 0U);
     EXPECT_NE(faultOf(mDir.write("b.png", "")).find("no readable PNG"), std::string::npos);
 }
 
-TEST_F(PngIo, TruncatedPicture_IsRefused) {
+TEST_F(PngReader, TruncatedPicture_IsRefused) {
     const Bytes row(600, 77);
     const std::string whole = readBytes(write(PNG_FORMAT_GRAY, 600, row.data()));
     constexpr size_t kHeader = 33;  // the signature and the first chunk
@@ -95,7 +82,7 @@ TEST_F(PngIo, TruncatedPicture_IsRefused) {
     }
 }
 
-TEST_F(PngIo, SideBeyondTheLimit_IsRefused) {
+TEST_F(PngReader, SideBeyondTheLimit_IsRefused) {
     const Bytes row(4097, 1);
     EXPECT_EQ(readPng(write(PNG_FORMAT_GRAY, 4096, row.data())).width, 4096);
     const std::string path = write(PNG_FORMAT_GRAY, 4097, row.data());

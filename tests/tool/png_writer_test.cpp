@@ -1,0 +1,140 @@
+#include "png_writer.h"
+
+#include <gtest/gtest.h>
+#include <png.h>
+
+#include <algorithm>
+#include <array>
+#include <random>
+#include <string>
+#include <vector>
+
+#include "png_reader.h"
+#include "program.h"
+
+namespace vorelpaint {
+namespace {
+
+using Bytes = std::vector<uint8_t>;
+using vorel_test::readBytes;
+using voreltext::Image;
+
+constexpr std::array<PngEffort, 3> kEfforts{PngEffort::fast, PngEffort::normal, PngEffort::small};
+constexpr size_t kKind = 25;  ///< where the file says what its samples are
+
+class PngWriter : public ::testing::Test {
+  protected:
+    /// What libpng, which checks every chunk, reads of a file.
+    Image readBack(const Bytes& file) {
+        return readPng(mDir.write("a.png", std::string(file.begin(), file.end())));
+    }
+
+    void expectReadBack(const Image& image) {
+        for (const PngEffort effort : kEfforts) {
+            const Image read = readBack(encodedPng(image, effort));
+            EXPECT_EQ(read.width, image.width);
+            EXPECT_EQ(read.height, image.height);
+            EXPECT_EQ(read.pixels, image.pixels) << static_cast<int>(effort);
+        }
+    }
+
+    vorel_test::TempDir mDir;
+};
+
+/// Pixels of one of `colours` colours each, of any alpha or opaque.
+Image randomImage(std::mt19937& random, int width, int height, size_t colours, bool opaque) {
+    std::vector<std::array<uint8_t, 4>> palette(colours);
+    for (auto& colour : palette) {
+        for (uint8_t& channel : colour)
+            channel = static_cast<uint8_t>(random());
+        if (opaque) colour[3] = 255;
+    }
+    Image image{width, height, {}};
+    for (int i = 0; i < width * height; ++i) {
+        const auto& colour = palette[random() % colours];
+        image.pixels.insert(image.pixels.end(), colour.begin(), colour.end());
+    }
+    return image;
+}
+
+/// Like a photograph: every channel a slow wave with a little noise.
+Image photograph(int width, int height) {
+    std::mt19937 random(3);
+    Image image{width, height, {}};
+    for (int y = 0; y < height; ++y) {
+        for (int x = 0; x < width; ++x) {
+            for (const int slope : {3, 5, 7})
+                image.pixels.push_back(
+                    static_cast<uint8_t>((x * slope + y * 2) / 4 + static_cast<int>(random() % 3)));
+            image.pixels.push_back(255);
+        }
+    }
+    return image;
+}
+
+TEST_F(PngWriter, OnePixel_IsReadBack) {
+    expectReadBack({1, 1, {1, 2, 3, 4}});
+    expectReadBack({1, 1, {0, 0, 0, 0}});
+    expectReadBack({1, 2, {1, 2, 3, 4, 5, 6, 7, 255}});
+}
+
+TEST_F(PngWriter, AnyPicture_IsReadBack) {
+    std::mt19937 random(20263);
+    for (int round = 0; round < 60; ++round) {
+        const int width = 1 + static_cast<int>(random() % 60);
+        const int height = 1 + static_cast<int>(random() % 60);
+        const size_t colours = size_t{1} << (random() % 12);
+        expectReadBack(randomImage(random, width, height, colours, random() % 2 == 0));
+    }
+}
+
+TEST_F(PngWriter, Photograph_IsReadBack) {
+    expectReadBack(photograph(200, 100));
+}
+
+/// 256 colours have a palette, the 257th takes it away.
+TEST_F(PngWriter, Palette_HasRoomFor256Colours) {
+    Image image{257, 1, {}};
+    for (int i = 0; i < 257; ++i) {
+        const auto low = static_cast<uint8_t>(i);
+        const auto high = static_cast<uint8_t>(i >> 8);
+        image.pixels.insert(image.pixels.end(), {low, high, 7, static_cast<uint8_t>(255 - low)});
+    }
+    expectReadBack(image);
+    EXPECT_EQ(encodedPng(image, PngEffort::normal)[kKind], 6);
+    image.width = 256;
+    image.pixels.resize(256 * 4);
+    expectReadBack(image);
+    EXPECT_EQ(encodedPng(image, PngEffort::normal)[kKind], 3);
+}
+
+TEST_F(PngWriter, OpaquePictureOfManyColours_HasNoAlpha) {
+    EXPECT_EQ(encodedPng(photograph(100, 100), PngEffort::normal)[kKind], 2);
+}
+
+TEST_F(PngWriter, Photograph_IsFiltered) {
+    const Image image = photograph(300, 200);
+    EXPECT_LT(encodedPng(image, PngEffort::normal).size(),
+              encodedPng(image, PngEffort::fast).size() / 2);
+}
+
+TEST_F(PngWriter, Small_IsTheSmallest) {
+    const Image image = photograph(300, 200);
+    const size_t small = encodedPng(image, PngEffort::small).size();
+    EXPECT_LT(small, encodedPng(image, PngEffort::normal).size());
+    EXPECT_LT(small, encodedPng(image, PngEffort::fast).size());
+}
+
+TEST_F(PngWriter, File_HoldsTheBytes) {
+    const Image image = photograph(20, 10);
+    const std::string path = mDir.file("b.png");
+    std::FILE* file = std::fopen(path.c_str(), "wb");
+    ASSERT_NE(file, nullptr);
+    writePng(file, image);
+    std::fclose(file);
+    const Bytes wanted = encodedPng(image, PngEffort::normal);
+    EXPECT_EQ(readBytes(path), std::string(wanted.begin(), wanted.end()));
+}
+
+}  // namespace
+}  // namespace vorelpaint

@@ -1,0 +1,21 @@
+#pragma once
+
+#include <cstdint>
+#include <cstdio>
+#include <vector>
+
+#include "text/voreltext.h"
+
+namespace vorelpaint {
+
+/// How much time is spent on making a PNG small. The pixels are the same in all.
+enum class PngEffort { fast, normal, small };
+
+/// A picture of straight R, G, B, A as a PNG: with a palette where it has at most 256 colours, without
+/// alpha where it is opaque. Its sides are above 0.
+std::vector<uint8_t> encodedPng(const voreltext::Image& image, PngEffort effort);
+
+/// Writes it. Throws ToolError.
+void writePng(std::FILE* file, const voreltext::Image& image, PngEffort effort = PngEffort::normal);
+
+}  // namespace vorelpaint
