@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cmath>
 #include <cstdint>
+#include <cstring>
 
 #include "text/run.h"
 
@@ -19,6 +20,26 @@ void layPixelOver(uint8_t* destination, const uint8_t* source) {
     for (int c = 0; c < 4; ++c) {
         const unsigned int below = dividedBy255(destination[c] * rest);
         destination[c] = static_cast<uint8_t>(std::min(255U, source[c] + below));
+    }
+}
+
+/// A pixel as one word.
+uint32_t wordAt(const uint8_t* pixel) {
+    uint32_t word = 0;
+    std::memcpy(&word, pixel, sizeof word);
+    return word;
+}
+
+/// What is clear in all channels changes nothing; opaque pixels, and those over nothing, are what they
+/// are.
+void layRowOver(uint8_t* destination, const uint8_t* source, int count) {
+    for (int i = 0; i < count; ++i, destination += 4, source += 4) {
+        if (wordAt(source) == 0) continue;
+        if (source[3] == 255 || wordAt(destination) == 0) {
+            std::memcpy(destination, source, 4);
+        } else {
+            layPixelOver(destination, source);
+        }
     }
 }
 
@@ -50,10 +71,8 @@ void layOver(Image& destination, const Image& source, int x, int y) {
     const Visible rows(source.height, destination.height, y);
     if (columns.begin == columns.end) return;
     for (int row = rows.begin; row < rows.end; ++row) {
-        const uint8_t* from = &source.pixels[offsetOf(source, columns.begin, row)];
-        uint8_t* to = &destination.pixels[offsetOf(destination, columns.begin + x, row + y)];
-        for (int column = columns.begin; column < columns.end; ++column, from += 4, to += 4)
-            layPixelOver(to, from);
+        layRowOver(&destination.pixels[offsetOf(destination, columns.begin + x, row + y)],
+                   &source.pixels[offsetOf(source, columns.begin, row)], columns.end - columns.begin);
     }
 }
 

@@ -11,6 +11,7 @@
 
 #include "png_reader.h"
 #include "program.h"
+#include "style_file.h"
 
 namespace vorelpaint {
 namespace {
@@ -123,6 +124,37 @@ TEST_F(PngWriter, Small_IsTheSmallest) {
     const size_t small = encodedPng(image, PngEffort::small).size();
     EXPECT_LT(small, encodedPng(image, PngEffort::normal).size());
     EXPECT_LT(small, encodedPng(image, PngEffort::fast).size());
+}
+
+/// The size of libpng's file by default.
+size_t sizeByLibpng(const Image& image) {
+    png_image record{};
+    record.version = PNG_IMAGE_VERSION;
+    record.width = static_cast<png_uint_32>(image.width);
+    record.height = static_cast<png_uint_32>(image.height);
+    record.format = PNG_FORMAT_RGBA;
+    png_alloc_size_t size = PNG_IMAGE_PNG_SIZE_MAX(record);
+    Bytes file(size);
+    EXPECT_NE(png_image_write_to_memory(&record, file.data(), &size, 0, image.pixels.data(), 0, nullptr),
+              0);
+    return size;
+}
+
+TEST_F(PngWriter, PresetsTogether_AreSmallerThanByLibpng) {
+    size_t byLibpng = 0;
+    size_t fast = 0;
+    size_t normal = 0;
+    for (const std::string& preset : presetNames()) {
+        const std::string path = mDir.file("preset.png");
+        vorel_test::runVorelpaint(
+            {"--preset", preset, "--font", VOREL_TEST_FONT, "-o", path, "Typefaces"});
+        const Image image = readPng(path);
+        byLibpng += sizeByLibpng(image);
+        fast += encodedPng(image, PngEffort::fast).size();
+        normal += encodedPng(image, PngEffort::normal).size();
+    }
+    EXPECT_LT(fast, byLibpng);
+    EXPECT_LE(normal, fast);
 }
 
 TEST_F(PngWriter, File_HoldsTheBytes) {

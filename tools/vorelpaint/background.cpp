@@ -1,6 +1,9 @@
 #include "background.h"
 
 #include <algorithm>
+#include <array>
+#include <cstddef>
+#include <vector>
 
 #include "style/vorelstyle.h"
 
@@ -15,25 +18,71 @@ uint8_t channelOf(uint32_t colour, int channel) {
     return static_cast<uint8_t>(colour >> (16 - 8 * channel));
 }
 
-void unpremultiply(uint8_t* pixel) {
-    const unsigned int alpha = pixel[3];
-    if (alpha == 0 || alpha == 255) return;
-    for (int c = 0; c < 3; ++c) {
-        pixel[c] = static_cast<uint8_t>(std::min(255U, (pixel[c] * 255U + alpha / 2) / alpha));
+/// For each alpha and channel the value with the alpha divided out, rounded to nearest and at most 255.
+class StraightChannels {
+  public:
+    StraightChannels() : mValues(256 * 256) {
+        for (unsigned int alpha = 1; alpha < 256; ++alpha) {
+            for (unsigned int channel = 0; channel < 256; ++channel) {
+                const unsigned int straight = (channel * 255U + alpha / 2) / alpha;
+                mValues[alpha * 256 + channel] = static_cast<uint8_t>(std::min(255U, straight));
+            }
+        }
+    }
+
+    const uint8_t* of(uint8_t alpha) const { return &mValues[size_t{alpha} * 256]; }
+
+  private:
+    std::vector<uint8_t> mValues;
+};
+
+/// Clear pixels become one value, whatever they were: equal pixels are small in a file.
+void straighten(uint8_t* pixels, size_t count) {
+    static const StraightChannels kStraight;
+    for (uint8_t* pixel = pixels; pixel != pixels + 4 * count; pixel += 4) {
+        if (pixel[3] == 255) continue;
+        const uint8_t* straight = kStraight.of(pixel[3]);
+        for (int c = 0; c < 3; ++c)
+            pixel[c] = straight[pixel[c]];
     }
 }
 
-void flatten(uint8_t* pixel, uint32_t colour) {
-    const unsigned int rest = 255U - pixel[3];
-    for (int c = 0; c < 3; ++c) {
-        const unsigned int under = (channelOf(colour, c) * rest + 127U) / 255U;
-        pixel[c] = static_cast<uint8_t>(std::min(255U, pixel[c] + under));
+/// A colour as it shows through pixels, by their alpha.
+class ColourBeneath {
+  public:
+    explicit ColourBeneath(uint32_t colour) {
+        for (unsigned int alpha = 0; alpha < 256; ++alpha) {
+            for (int c = 0; c < 3; ++c) {
+                const unsigned int shown = (channelOf(colour, c) * (255U - alpha) + 127U) / 255U;
+                mShown[alpha][static_cast<size_t>(c)] = static_cast<uint8_t>(shown);
+            }
+        }
     }
-    pixel[3] = 255;
-}
 
-uint32_t squareAt(int x, int y) {
-    return (x / kSquare + y / kSquare) % 2 == 0 ? kLightSquare : kDarkSquare;
+    void layUnder(uint8_t* pixels, size_t count) const {
+        for (uint8_t* pixel = pixels; pixel != pixels + 4 * count; pixel += 4) {
+            const std::array<uint8_t, 4>& shown = mShown[pixel[3]];
+            for (size_t c = 0; c < 3; ++c)
+                pixel[c] = static_cast<uint8_t>(std::min(255, pixel[c] + shown[c]));
+            pixel[3] = 255;
+        }
+    }
+
+  private:
+    std::array<std::array<uint8_t, 4>, 256> mShown{};
+};
+
+/// Squares of two colours.
+void layOnCheckerboard(voreltext::Image& image) {
+    const std::array<ColourBeneath, 2> colours{ColourBeneath(kLightSquare), ColourBeneath(kDarkSquare)};
+    uint8_t* pixel = image.pixels.data();
+    for (int y = 0; y < image.height; ++y) {
+        for (int x = 0; x < image.width; x += kSquare) {
+            const auto count = static_cast<size_t>(std::min(kSquare, image.width - x));
+            colours[static_cast<size_t>((x / kSquare + y / kSquare) % 2)].layUnder(pixel, count);
+            pixel += 4 * count;
+        }
+    }
 }
 
 }  // namespace
@@ -47,21 +96,14 @@ std::optional<Background> parseBackground(std::string_view text) {
 }
 
 void layOn(voreltext::Image& image, const Background& background) {
-    uint8_t* pixel = image.pixels.data();
-    for (int y = 0; y < image.height; ++y) {
-        for (int x = 0; x < image.width; ++x, pixel += 4) {
-            switch (background.kind) {
-                case Background::Kind::transparent:
-                    unpremultiply(pixel);
-                    break;
-                case Background::Kind::colour:
-                    flatten(pixel, background.colour);
-                    break;
-                case Background::Kind::checkerboard:
-                    flatten(pixel, squareAt(x, y));
-                    break;
-            }
-        }
+    const size_t count = image.pixels.size() / 4;
+    switch (background.kind) {
+        case Background::Kind::transparent:
+            return straighten(image.pixels.data(), count);
+        case Background::Kind::colour:
+            return ColourBeneath(background.colour).layUnder(image.pixels.data(), count);
+        case Background::Kind::checkerboard:
+            return layOnCheckerboard(image);
     }
 }
 

@@ -13,6 +13,8 @@
 #include <string_view>
 
 #include "error.h"
+#include "pixel_deflater.h"
+#include "png_rows.h"
 
 namespace vorelpaint {
 namespace {
@@ -65,160 +67,33 @@ class Palette {
     std::vector<uint16_t> mSlots = std::vector<uint16_t>(size_t{1} << kSlotBits, kEmpty);
 };
 
-/// The samples of a picture as they stand in the file, but for the filters.
-struct Samples {
-    uint8_t kind;
-    size_t bytesPerPixel;
-    Bytes bytes;  ///< packed rows
+/// A picture of few colours: an index a pixel.
+struct IndexedPicture {
+    Bytes indices;
     std::vector<uint32_t> palette;
 };
 
-std::optional<Samples> indexed(const Image& image) {
+std::optional<IndexedPicture> indexed(const Image& image) {
     const size_t count = image.pixels.size() / 4;
     Palette palette;
-    Samples samples{kIndexed, 1, Bytes(count), {}};
+    IndexedPicture picture{Bytes(count), {}};
     uint32_t before = ~wordAt(image, 0);
     for (size_t i = 0; i < count; ++i) {
         const uint32_t colour = wordAt(image, i);
         if (colour == before) {
-            samples.bytes[i] = samples.bytes[i - 1];
+            picture.indices[i] = picture.indices[i - 1];
             continue;
         }
         const std::optional<uint8_t> index = palette.indexOf(colour);
         if (!index) return std::nullopt;
-        samples.bytes[i] = *index;
+        picture.indices[i] = *index;
         before = colour;
     }
-    samples.palette = palette.colours();
-    return samples;
-}
-
-Samples samplesOf(const Image& image) {
-    if (std::optional<Samples> few = indexed(image)) return std::move(*few);
-    if (!isOpaque(image)) return {kRgba, 4, image.pixels, {}};
-    Samples samples{kRgb, 3, {}, {}};
-    samples.bytes.reserve(image.pixels.size() / 4 * 3);
-    for (size_t at = 0; at < image.pixels.size(); at += 4)
-        samples.bytes.insert(samples.bytes.end(), &image.pixels[at], &image.pixels[at] + 3);
-    return samples;
-}
-
-// --- filters ------------------------------------------------------------------------------------------
-
-/// The neighbours of a byte: the same channel to the left, above, and to the left of that.
-struct Neighbours {
-    uint8_t left;
-    uint8_t above;
-    uint8_t aboveLeft;
-};
-
-uint8_t paeth(const Neighbours& at) {
-    const int estimate = at.left + at.above - at.aboveLeft;
-    const int toLeft = std::abs(estimate - at.left);
-    const int toAbove = std::abs(estimate - at.above);
-    const int toAboveLeft = std::abs(estimate - at.aboveLeft);
-    if (toLeft <= toAbove && toLeft <= toAboveLeft) return at.left;
-    return toAbove <= toAboveLeft ? at.above : at.aboveLeft;
-}
-
-/// What a filter, by its number in the format, expects a byte to be.
-uint8_t expected(int filter, const Neighbours& at) {
-    switch (filter) {
-        case 1:
-            return at.left;
-        case 2:
-            return at.above;
-        case 3:
-            return static_cast<uint8_t>((at.left + at.above) / 2);
-        case 4:
-            return paeth(at);
-        default:
-            return 0;
-    }
-}
-
-constexpr int kFilters = 5;
-
-/// Rows with the number of their filter in front.
-class Rows {
-  public:
-    Rows(const uint8_t* samples, size_t rowBytes, size_t bytesPerPixel, size_t count)
-        : mSamples(samples), mRowBytes(rowBytes), mBytesPerPixel(bytesPerPixel), mCount(count) {}
-
-    Bytes unfiltered() const {
-        Bytes rows;
-        rows.reserve((mRowBytes + 1) * mCount);
-        for (size_t y = 0; y < mCount; ++y) {
-            rows.push_back(0);
-            rows.insert(rows.end(), rowAt(y), rowAt(y) + mRowBytes);
-        }
-        return rows;
-    }
-
-    /// Each row in the filter whose bytes, as signed numbers, are smallest in sum: what PNG itself
-    /// advises for pictures of many colours.
-    Bytes filtered() const {
-        Bytes rows;
-        rows.reserve((mRowBytes + 1) * mCount);
-        for (size_t y = 0; y < mCount; ++y) {
-            Bytes best;
-            uint64_t least = ~uint64_t{0};
-            for (int filter = 0; filter < kFilters; ++filter) {
-                Bytes row = filteredRow(y, filter);
-                const uint64_t size = sizeOf(row);
-                if (size >= least) continue;
-                least = size;
-                best = std::move(row);
-            }
-            rows.insert(rows.end(), best.begin(), best.end());
-        }
-        return rows;
-    }
-
-  private:
-    const uint8_t* rowAt(size_t y) const { return mSamples + y * mRowBytes; }
-
-    Bytes filteredRow(size_t y, int filter) const {
-        Bytes row{static_cast<uint8_t>(filter)};
-        row.reserve(mRowBytes + 1);
-        for (size_t i = 0; i < mRowBytes; ++i)
-            row.push_back(static_cast<uint8_t>(rowAt(y)[i] - expected(filter, neighboursOf(y, i))));
-        return row;
-    }
-
-    Neighbours neighboursOf(size_t y, size_t i) const {
-        const bool hasLeft = i >= mBytesPerPixel;
-        const uint8_t* above = y > 0 ? rowAt(y - 1) : nullptr;
-        return {hasLeft ? rowAt(y)[i - mBytesPerPixel] : uint8_t{0}, above ? above[i] : uint8_t{0},
-                hasLeft && above ? above[i - mBytesPerPixel] : uint8_t{0}};
-    }
-
-    static uint64_t sizeOf(const Bytes& row) {
-        uint64_t sum = 0;
-        for (size_t i = 1; i < row.size(); ++i)
-            sum += static_cast<uint64_t>(std::abs(static_cast<int8_t>(row[i])));
-        return sum;
-    }
-
-    const uint8_t* mSamples;
-    size_t mRowBytes;
-    size_t mBytesPerPixel;
-    size_t mCount;
-};
-
-Rows rowsOf(const Samples& samples, const Image& image, int count) {
-    return {samples.bytes.data(), static_cast<size_t>(image.width) * samples.bytesPerPixel,
-            samples.bytesPerPixel, static_cast<size_t>(count)};
+    picture.palette = palette.colours();
+    return picture;
 }
 
 // --- compression --------------------------------------------------------------------------------------
-
-/// libdeflate's levels, 1 to 12. At 4, without filters, text pictures take a fifth of the time of
-/// libpng's default and five sixths of its bytes (scripts/bench_png.sh).
-int levelOf(PngEffort effort) {
-    constexpr std::array<int, 3> kLevels{1, 4, 12};
-    return kLevels[static_cast<size_t>(effort)];
-}
 
 struct FreeCompressor {
     void operator()(libdeflate_compressor* compressor) const { libdeflate_free_compressor(compressor); }
@@ -234,29 +109,41 @@ Bytes deflated(const Bytes& bytes, int level) {
     return result;
 }
 
-/// Whether filters make a part of the picture smaller. Text with its effects repeats colours, which
-/// filters hide from the compressor; photographs do not.
-bool isWorthFiltering(const Samples& samples, const Image& image) {
-    constexpr int kTried = 24;
-    if (samples.kind == kIndexed) return false;
-    const int count = std::min(kTried, image.height);
-    const int first = (image.height - count) / 2;
-    const size_t rowBytes = static_cast<size_t>(image.width) * samples.bytesPerPixel;
-    const Rows middle(samples.bytes.data() + static_cast<size_t>(first) * rowBytes, rowBytes,
-                      samples.bytesPerPixel, static_cast<size_t>(count));
-    return deflated(middle.filtered(), 1).size() < deflated(middle.unfiltered(), 1).size();
+constexpr int kSmallestLevel = 12;  ///< of libdeflate's, 1 to 12
+
+/// Filters hide from the compressor which indices are the same.
+Bytes compressedIndices(const Bytes& indices, const Image& image, PngEffort effort) {
+    constexpr int kQuickLevel = 4;
+    const auto width = static_cast<size_t>(image.width);
+    Bytes rows;
+    rows.reserve(indices.size() + static_cast<size_t>(image.height));
+    for (size_t at = 0; at < indices.size(); at += width) {
+        rows.push_back(0);
+        rows.insert(rows.end(), &indices[at], &indices[at] + width);
+    }
+    return deflated(rows, effort == PngEffort::small ? kSmallestLevel : kQuickLevel);
 }
 
-Bytes compressed(const Samples& samples, const Image& image, PngEffort effort) {
-    const Rows rows = rowsOf(samples, image, image.height);
-    const int level = levelOf(effort);
-    if (effort == PngEffort::fast) return deflated(rows.unfiltered(), level);
-    if (effort == PngEffort::normal) {
-        return deflated(isWorthFiltering(samples, image) ? rows.filtered() : rows.unfiltered(), level);
+Bytes smaller(Bytes one, Bytes other) {
+    return other.size() < one.size() ? std::move(other) : std::move(one);
+}
+
+/// Text with its effects repeats pixels, which filters hide from the compressor; photographs, which
+/// repeat none, become smaller by them.
+Bytes compressed(const PngRows& rows, PngEffort effort) {
+    constexpr int kLevel = 6;
+    if (effort == PngEffort::small) {
+        return smaller(deflated(unfiltered(rows), kSmallestLevel),
+                       deflated(filtered(rows), kSmallestLevel));
     }
-    Bytes plain = deflated(rows.unfiltered(), level);
-    Bytes filtered = deflated(rows.filtered(), level);
-    return filtered.size() < plain.size() ? filtered : plain;
+    DeflatedPixels plain = deflatedPixels(rows);
+    if (effort == PngEffort::fast || !plain.isBetterFiltered) return std::move(plain.stream);
+    return smaller(std::move(plain.stream), deflated(filtered(rows), kLevel));
+}
+
+PngRows rowsOf(const Image& image) {
+    return {image.pixels.data(), static_cast<size_t>(image.width), static_cast<size_t>(image.height),
+            isOpaque(image) ? size_t{3} : size_t{4}};
 }
 
 // --- the file -----------------------------------------------------------------------------------------
@@ -303,13 +190,16 @@ void appendPalette(Bytes& file, const std::vector<uint32_t>& palette) {
 }  // namespace
 
 Bytes encodedPng(const Image& image, PngEffort effort) {
-    const Samples samples = samplesOf(image);
-    const Bytes pixels = compressed(samples, image, effort);
     Bytes file{0x89, 'P', 'N', 'G', '\r', '\n', 0x1A, '\n'};
-    file.reserve(pixels.size() + 2048);
-    appendHeader(file, image, samples.kind);
-    if (samples.kind == kIndexed) appendPalette(file, samples.palette);
-    appendChunk(file, "IDAT", pixels);
+    if (const std::optional<IndexedPicture> few = indexed(image)) {
+        appendHeader(file, image, kIndexed);
+        appendPalette(file, few->palette);
+        appendChunk(file, "IDAT", compressedIndices(few->indices, image, effort));
+    } else {
+        const PngRows rows = rowsOf(image);
+        appendHeader(file, image, rows.bytesPerPixel == 3 ? kRgb : kRgba);
+        appendChunk(file, "IDAT", compressed(rows, effort));
+    }
     appendChunk(file, "IEND", {});
     return file;
 }

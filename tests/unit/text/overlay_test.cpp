@@ -78,6 +78,30 @@ TEST(LayOver, AnyPlace_IsTheLiteralForm) {
     }
 }
 
+/// Mostly clear and opaque pixels, and clear ones that shine.
+Image textLikeImage(std::mt19937& random, int width, int height) {
+    Image image = randomImage(random, width, height);
+    for (size_t at = 0; at < image.pixels.size(); at += 4) {
+        const auto kind = random() % 5;
+        if (kind < 2) std::fill_n(&image.pixels[at], 4, uint8_t{0});
+        if (kind == 2) image.pixels[at + 3] = 255;
+        if (kind == 3) image.pixels[at + 3] = 0;
+    }
+    return image;
+}
+
+TEST(LayOver, ClearAndOpaquePixels_AreTheLiteralForm) {
+    std::mt19937 random(20264);
+    for (int round = 0; round < 1000; ++round) {
+        Image image = textLikeImage(random, 9, 7);
+        const Image source = textLikeImage(random, 9, 7);
+        Image wanted = image;
+        layOverLiterally(wanted, source, 1, -1);
+        layOver(image, source, 1, -1);
+        ASSERT_EQ(image.pixels, wanted.pixels) << "round " << round;
+    }
+}
+
 TEST(LayOver, FarAway_ChangesNothing) {
     constexpr int kMost = std::numeric_limits<int>::max();
     constexpr int kLeast = std::numeric_limits<int>::min();

@@ -1,0 +1,95 @@
+#include "png_rows.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <random>
+#include <vector>
+
+namespace vorelpaint {
+namespace {
+
+using Bytes = std::vector<uint8_t>;
+
+Bytes randomPixels(std::mt19937& random, size_t count, unsigned int most) {
+    Bytes pixels(4 * count);
+    for (uint8_t& byte : pixels)
+        byte = static_cast<uint8_t>(random() % (most + 1));
+    return pixels;
+}
+
+/// The predictor of the format's own text.
+int paethLiterally(int a, int b, int c) {
+    const int p = a + b - c;
+    const int pa = std::abs(p - a);
+    const int pb = std::abs(p - b);
+    const int pc = std::abs(p - c);
+    if (pa <= pb && pa <= pc) return a;
+    return pb <= pc ? b : c;
+}
+
+/// Undoes the filters, byte by byte.
+Bytes unfilteredLiterally(const Bytes& stream, size_t rowBytes, size_t bytesPerPixel) {
+    Bytes bytes;
+    const size_t count = rowBytes - 1;
+    for (size_t row = 0; row * rowBytes < stream.size(); ++row) {
+        const int filter = stream[row * rowBytes];
+        const size_t begin = bytes.size();
+        for (size_t i = 0; i < count; ++i) {
+            const int a = i >= bytesPerPixel ? bytes[begin + i - bytesPerPixel] : 0;
+            const int b = row > 0 ? bytes[begin + i - count] : 0;
+            const int c = row > 0 && i >= bytesPerPixel ? bytes[begin + i - count - bytesPerPixel] : 0;
+            const int guesses[]{0, a, b, (a + b) / 2, paethLiterally(a, b, c)};
+            bytes.push_back(static_cast<uint8_t>(stream[row * rowBytes + 1 + i] + guesses[filter]));
+        }
+    }
+    return bytes;
+}
+
+TEST(PngRows, Unfiltered_HasA0BeforeEachRow) {
+    const Bytes pixels{1, 2, 3, 4, 5, 6, 7, 8};
+    EXPECT_EQ(unfiltered({pixels.data(), 2, 1, 4}), (Bytes{0, 1, 2, 3, 4, 5, 6, 7, 8}));
+    EXPECT_EQ(unfiltered({pixels.data(), 1, 2, 4}), (Bytes{0, 1, 2, 3, 4, 0, 5, 6, 7, 8}));
+    EXPECT_EQ(unfiltered({pixels.data(), 1, 2, 3}), (Bytes{0, 1, 2, 3, 0, 5, 6, 7}));
+}
+
+TEST(PngRows, Filters_AreUndoneByTheirLiteralForm) {
+    std::mt19937 random(11);
+    for (int round = 0; round < 300; ++round) {
+        const size_t width = 1 + random() % 20;
+        const size_t height = 1 + random() % 8;
+        const Bytes pixels = randomPixels(random, width * height, round % 2 == 0 ? 255 : 3);
+        for (const size_t bytesPerPixel : {size_t{3}, size_t{4}}) {
+            const PngRows rows{pixels.data(), width, height, bytesPerPixel};
+            Bytes packed;
+            for (size_t i = 0; i < pixels.size(); ++i) {
+                if (i % 4 < bytesPerPixel) packed.push_back(pixels[i]);
+            }
+            ASSERT_EQ(unfilteredLiterally(filtered(rows), rows.rowBytes(), bytesPerPixel), packed);
+        }
+    }
+}
+
+TEST(PngRows, EachRow_HasTheFilterThatLeavesLeast) {
+    // Up leaves nothing of a row that is the one above, Sub next to nothing of a slope.
+    Bytes pixels;
+    for (int y = 0; y < 2; ++y) {
+        for (int x = 0; x < 32; ++x)
+            pixels.insert(pixels.end(), 4, static_cast<uint8_t>(7 * x));
+    }
+    const PngRows rows{pixels.data(), 32, 2, 4};
+    const Bytes stream = filtered(rows);
+    EXPECT_EQ(stream[0], 1);
+    EXPECT_EQ(stream[rows.rowBytes()], 2);
+}
+
+TEST(PngRows, FilteredBits_AreFewWhereNeighboursTell) {
+    const Bytes same(4 * 4, 200);
+    EXPECT_EQ(filteredBits({same.data(), 2, 2, 4}, 1, 1), 4U) << "one bit a channel";
+    Bytes other = same;
+    other[12] = 203;  // 3 off: two bits more
+    EXPECT_EQ(filteredBits({other.data(), 2, 2, 3}, 1, 1), 5U);
+}
+
+}  // namespace
+}  // namespace vorelpaint

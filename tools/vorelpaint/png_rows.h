@@ -1,0 +1,36 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <vector>
+
+namespace vorelpaint {
+
+/// The rows of a picture as a PNG has them: of each pixel's four bytes the first ones are in the file.
+/// The bytes are the owner's.
+struct PngRows {
+    const uint8_t* pixels;  ///< packed rows of four bytes a pixel
+    size_t width;           ///< of both sides at least 1
+    size_t height;
+    size_t bytesPerPixel;  ///< in the file: 4, or 3 where the fourth one says nothing
+
+    const uint8_t* row(size_t y) const { return pixels + y * width * 4; }
+    size_t rowBytes() const { return 1 + width * bytesPerPixel; }  ///< with the number of its filter
+};
+
+/// Adds a row as it is in the file to `stream`: the number of a filter, then of each of these pixels the
+/// bytes that are in the file.
+void appendRow(std::vector<uint8_t>& stream, const PngRows& rows, int filter, const uint8_t* pixels);
+
+/// What is compressed of them, each row behind the number of its filter: pixels as they are, filter 0.
+std::vector<uint8_t> unfiltered(const PngRows& rows);
+
+/// The same with the filter for each row that suits it, of the five that the format has: what remains of
+/// a byte when it is guessed from those to its left and above. The remains are smallest in sum, as
+/// signed numbers: what the format itself advises for pictures of many colours.
+std::vector<uint8_t> filtered(const PngRows& rows);
+
+/// About how many bits a pixel takes in `filtered`, (x, y) lying neither in the first row nor column.
+unsigned int filteredBits(const PngRows& rows, size_t x, size_t y);
+
+}  // namespace vorelpaint
