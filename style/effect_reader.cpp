@@ -11,7 +11,7 @@ constexpr Range kUnit{0, 1};
 constexpr Range kAngle{-360, 360};
 constexpr Range kAltitude{0, 90};
 constexpr LengthRange kPixels{{0, 100}, {0, 100}};
-constexpr LengthRange kTileWidth{{0, 1000}, {0, 1000}};
+constexpr LengthRange kTileWidth{{0.001, 1000}, {0.001, 1000}};
 constexpr Range kStopCount{1, 256};
 constexpr Range kCode{0, 255};
 // The library draws nothing below a scale of 0.1.
@@ -118,9 +118,7 @@ std::optional<Length> readTileWidth(const JsonObject& effect, int version) {
     if (!effect.has(kKey)) return std::nullopt;
     requireVersion2(effect, kKey, version);
     if (effect.has("scale")) effect.fail(kKey, "not beside scale, which it stands for");
-    const Length width = effect.length(kKey, kTileWidth);
-    if (width.value == 0) effect.fail(kKey, "must be more than 0");
-    return width;
+    return effect.length(kKey, kTileWidth);
 }
 
 Effect readPattern(const Source& source) {
