@@ -39,6 +39,21 @@ bool contains(const std::string& text, const std::string& part) {
     return text.find(part) != std::string::npos;
 }
 
+/// Everything that the calls of a look tell: numbers, colours, stops, a centred stroke.
+constexpr const char* kSoundWord = R"({
+  "description": "A sound word",
+  "outerShadow": { "angle": 135, "distance": 13, "size": 0, "color": "#2962C8" },
+  "linearGradient": {
+    "angle": 90,
+    "gradient": [
+      { "color": "#FF3D00", "location": 0 },
+      { "color": "#FFC400", "location": 0.5 },
+      { "color": "#FFF59D", "location": 1 }
+    ]
+  },
+  "stroke": { "size": 5, "color": "#101010", "position": "center" }
+})";
+
 /// The lines of the table of an explanation: from its headings to the blank line behind it.
 Words tableOf(const std::string& explanation) {
     std::istringstream lines(explanation.substr(explanation.find("topmost effect first:\n\n")));
@@ -54,7 +69,7 @@ Words tableOf(const std::string& explanation) {
 TEST(Explain, Text_IsMeasuredStepByStep) {
     const std::string text = printed({"--preset", "gold", "--size", "40", "--explain", "Ag"});
     EXPECT_TRUE(contains(text, "style       preset gold: Polished metal"));
-    EXPECT_TRUE(contains(text, "margins     left 7, top 2, right 9, bottom 14 pixels\n"));
+    EXPECT_TRUE(contains(text, "margins     left 3, top 1, right 3, bottom 5 pixels\n"));
     EXPECT_TRUE(contains(text, "layers      one: the text is opaque, and no stroke is centred\n"));
     EXPECT_TRUE(contains(text, "text        2 glyphs of 40 pixels in 1 line\n"));
     const Words table = tableOf(text);
@@ -67,7 +82,7 @@ TEST(Explain, Text_IsMeasuredStepByStep) {
         EXPECT_EQ(contains(table[i], " ms "), i > 0) << table[i];
     }
     EXPECT_TRUE(contains(table[6], "beneath the text"));
-    EXPECT_TRUE(contains(text, "\n  stroke          size 1, colour #CC"));
+    EXPECT_TRUE(contains(text, "\n  stroke          size 1, colour #5A"));
 }
 
 TEST(Explain, Picture_IsAsLargeAsItIsPainted) {
@@ -84,7 +99,8 @@ TEST(Explain, Picture_IsAsLargeAsItIsPainted) {
 }
 
 TEST(Explain, WithoutText_TellsTheOrderAlone) {
-    const std::string text = printed({"--preset", "comic", "--explain"});
+    const TempDir dir;
+    const std::string text = printed({"--style", dir.write("comic.json", kSoundWord), "--explain"});
     EXPECT_EQ(tableOf(text),
               (Words{"  effect          place", "  stroke          across the edge",
                      "  linearGradient  on the text", "  outerShadow     outside the text",
@@ -174,16 +190,17 @@ TEST(Sheet, WhatItCannotPaint_IsRefused) {
     expectRefused({"--sheet", "-o", "/dev/null"}, "give TEXT");
     expectRefused({"--sheet", "--preset", "gold", "-o", "/dev/null", "A"}, "--sheet");
     const TempDir dir;
-    expectRefused({"--sheet", "--size", "1000", "-o", dir.file("a.png"), "MMMM"},
+    expectRefused({"--sheet", "--padding", "1000", "-o", dir.file("a.png"), "M"},
                   "the picture would be");
     EXPECT_TRUE(dir.list().empty());
 }
 
 TEST(WriteCpp, Calls_HaveTheStylesNumbers) {
-    EXPECT_EQ(printed({"--preset", "comic", "--write-cpp"}),
+    const TempDir dir;
+    EXPECT_EQ(printed({"--style", dir.write("comic.json", kSoundWord), "--write-cpp"}),
               R"(#include <voreleffect/voreleffect.h>
 
-/// A sound word: sunny gradient, thick outline across the edge, hard blue shadow.
+/// A sound word.
 /// For an empty set; VFEffect.h shows how a set paints a run.
 void addComic(VFontEffect::VFEffect& look) {
     look.setTextOpacity(1);
@@ -201,8 +218,9 @@ void addComic(VFontEffect::VFEffect& look) {
 }
 
 TEST(WriteCpp, CommandLine_EntersTheCalls) {
-    const std::string text = printed({"--preset", "comic", "--effect-scale", "2", "--color", "#ABCDEF",
-                                      "--opacity", "0.3", "--write-cpp"});
+    const TempDir dir;
+    const std::string text = printed({"--style", dir.write("comic.json", kSoundWord), "--effect-scale",
+                                      "2", "--color", "#ABCDEF", "--opacity", "0.3", "--write-cpp"});
     EXPECT_TRUE(contains(text, "look.setTextOpacity(0.3F);"));
     EXPECT_TRUE(contains(text, "look.addStrokeText(10, 0x101010, 1, 0, 0);"));
     EXPECT_TRUE(contains(text, "look.addText(0xABCDEF, 0.3F);"));
