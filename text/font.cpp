@@ -2,12 +2,31 @@
 
 #include <ft2build.h>
 #include FT_FREETYPE_H
+#include FT_SIZES_H
 
 #include <utility>
 
 #include "text/error.h"
+#include "text/font_axes.h"
+#include "text/units.h"
 
 namespace voreltext {
+namespace {
+
+/// The smallest of the face's sizes of pictures that need not be enlarged, else the largest.
+int pictureSizeFor(FT_Face face, int sizePx) {
+    int best = 0;
+    for (int i = 1; i < face->num_fixed_sizes; ++i) {
+        const FT_Pos size = face->available_sizes[i].y_ppem;
+        const FT_Pos found = face->available_sizes[best].y_ppem;
+        const FT_Pos wanted = sizePx * kUnit;
+        const bool isBetter = found < wanted ? size > found : size >= wanted && size < found;
+        if (isBetter) best = i;
+    }
+    return best;
+}
+
+}  // namespace
 
 Font::Font(const FontFile& file, int sizePx, const std::vector<FontVariation>& variations)
     : mSizePx(sizePx) {
@@ -34,6 +53,8 @@ Font::Font(Font&& other) noexcept : mSizePx(other.mSizePx) {
 Font& Font::operator=(Font&& other) noexcept {
     std::swap(mLibrary, other.mLibrary);
     std::swap(mFace, other.mFace);
+    std::swap(mPictureSize, other.mPictureSize);
+    std::swap(mPicturePpem, other.mPicturePpem);
     std::swap(mSizePx, other.mSizePx);
     mName.swap(other.mName);
     std::swap(mAscender, other.mAscender);
@@ -57,7 +78,7 @@ void Font::open(const std::string& subject, const std::vector<FontVariation>& va
 }
 
 void Font::prepare(const std::string& subject, const std::vector<FontVariation>& variations) {
-    (void)variations;
+    if (!variations.empty()) setAxes(mFace, variations, subject);
     if (!chooseSize()) throw TextError(subject + "a font without outlines");
     measure();
     if (mLineHeight <= 0 || mAscender <= mDescender) {
@@ -68,14 +89,41 @@ void Font::prepare(const std::string& subject, const std::vector<FontVariation>&
 }
 
 bool Font::chooseSize() {
-    return FT_IS_SCALABLE(mFace) && FT_Set_Pixel_Sizes(mFace, 0, static_cast<FT_UInt>(mSizePx)) == 0;
+    if (!hasOutlines()) {
+        mPictureSize = mFace->size;
+        return choosePictures();
+    }
+    if (FT_HAS_COLOR(mFace) && FT_New_Size(mFace, &mPictureSize) == 0) {
+        const FT_Size outlines = mFace->size;
+        FT_Activate_Size(mPictureSize);
+        if (!choosePictures()) mPictureSize = nullptr;  // the face keeps it to its end
+        FT_Activate_Size(outlines);
+    }
+    return FT_Set_Pixel_Sizes(mFace, 0, static_cast<FT_UInt>(mSizePx)) == 0;
+}
+
+/// For the active size of the face.
+bool Font::choosePictures() {
+    const bool isChosen = FT_HAS_COLOR(mFace) && FT_HAS_FIXED_SIZES(mFace) &&
+                          FT_Select_Size(mFace, pictureSizeFor(mFace, mSizePx)) == 0;
+    if (isChosen) mPicturePpem = mFace->size->metrics.y_ppem;
+    return mPicturePpem > 0;
 }
 
 void Font::measure() {
     const FT_Size_Metrics& metrics = mFace->size->metrics;
-    mAscender = metrics.ascender;
-    mDescender = metrics.descender;
-    mLineHeight = metrics.height;
+    mAscender = ceilToPixel(scaled(metrics.ascender)) * kUnit;
+    mDescender = floorToPixel(scaled(metrics.descender)) * kUnit;
+    mLineHeight = floorToPixel(scaled(metrics.height) + kUnit / 2) * kUnit;
+}
+
+int64_t Font::scaled(int64_t units) const {
+    if (hasOutlines()) return units;
+    return floorOf(2 * units * mSizePx + mPicturePpem, 2 * int64_t{mPicturePpem});
+}
+
+bool Font::hasOutlines() const {
+    return FT_IS_SCALABLE(mFace);
 }
 
 bool Font::has(uint32_t code) const {

@@ -7,6 +7,7 @@
 
 struct FT_FaceRec_;
 struct FT_LibraryRec_;
+struct FT_SizeRec_;
 
 namespace voreltext {
 
@@ -57,17 +58,29 @@ class Font {
 
     bool has(uint32_t code) const;  ///< whether it has a glyph for the character
     bool isColour() const;          ///< whether some of its glyphs have colours of their own
-    FT_FaceRec_* face() const { return mFace; }  ///< FreeType's own
+    bool hasOutlines() const;       ///< else all of its glyphs are pictures of one size
+
+    /// FreeType's own: the face; and the size of the face's pictures, which is that of the face itself
+    /// where there are no outlines, null without pictures.
+    FT_FaceRec_* face() const { return mFace; }
+    FT_SizeRec_* pictureSize() const { return mPictureSize; }
+    int picturePpem() const { return mPicturePpem; }  ///< pixels of the em of the pictures, 0 without
+
+    /// A length of the face, as FreeType and shapers tell it, in the font's size.
+    int64_t scaled(int64_t units) const;
 
   private:
     template <typename Open>
     void open(const std::string& subject, const std::vector<FontVariation>& variations, Open openFace);
     void prepare(const std::string& subject, const std::vector<FontVariation>& variations);
     bool chooseSize();
+    bool choosePictures();
     void measure();
 
     FT_LibraryRec_* mLibrary = nullptr;
     FT_FaceRec_* mFace = nullptr;
+    FT_SizeRec_* mPictureSize = nullptr;
+    int mPicturePpem = 0;
     int mSizePx;
     std::string mName;
     long mAscender = 0;

@@ -16,15 +16,15 @@ struct Box {
     int width() const { return right - left; }
     int height() const { return bottom - top; }
     bool isEmpty() const { return width() <= 0 || height() <= 0; }
-};
 
-/// The smallest box around both; an empty one has no place.
-inline Box unionOf(const Box& one, const Box& other) {
-    if (one.isEmpty()) return other;
-    if (other.isEmpty()) return one;
-    return {std::min(one.left, other.left), std::min(one.top, other.top),
-            std::max(one.right, other.right), std::max(one.bottom, other.bottom)};
-}
+    /// Makes it hold the other box as well; an empty one has no place.
+    void grow(const Box& other) {
+        if (other.isEmpty()) return;
+        *this = isEmpty() ? other
+                          : Box{std::min(left, other.left), std::min(top, other.top),
+                                std::max(right, other.right), std::max(bottom, other.bottom)};
+    }
+};
 
 /// The coverage of one glyph and where it stands.
 struct GlyphMask {

@@ -39,7 +39,7 @@ Part partOf(const TextLayout& text, const std::vector<size_t>& glyphs) {
     for (const size_t i : glyphs) {
         part.masks.push_back(text.rasterise(i));
         part.clusters.push_back(text.glyph(i).cluster);
-        part.ink = unionOf(part.ink, text.glyph(i).box);
+        part.ink.grow(text.glyph(i).box);
     }
     return part;
 }

@@ -1,24 +1,135 @@
 #include "text/line_setter.h"
 
+#include <string>
 #include <utility>
 
+#include "text/error.h"
+#include "text/letter_spacing.h"
+#include "text/units.h"
+#include "text/wrapping.h"
+#include "unicode/characters.h"
+#include "unicode/utf8.h"
+
 namespace voreltext {
+namespace {
+
+/// The features that are asked for. With letters apart, those that join them come first, as what stands
+/// behind outdoes it.
+std::vector<std::string> featuresOf(const TextSettings& settings) {
+    std::vector<std::string> features;
+    if (settings.letterSpacing != 0) features = {"-liga", "-clig"};
+    features.insert(features.end(), settings.features.begin(), settings.features.end());
+    return features;
+}
+
+/// What shows that a word goes on in the next line, if the font has it.
+std::optional<uint32_t> hyphenOf(const Font& font) {
+    constexpr uint32_t kHyphen = 0x2010;
+    for (const uint32_t code : {kHyphen, uint32_t{'-'}}) {
+        if (font.has(code)) return code;
+    }
+    return std::nullopt;
+}
+
+[[noreturn]] void refuseWidth(const Paragraph& paragraph, size_t at, int width) {
+    throw TextError(vorelunicode::nameOf(paragraph.codes[at]) + " in line " +
+                    std::to_string(paragraph.number) + ", character " + std::to_string(at + 1) +
+                    " of the text is wider than " + std::to_string(width) + " pixels");
+}
+
+}  // namespace
+
+/// A source line with what it takes to set its parts.
+struct LineSetter::Source {
+    const Paragraph& paragraph;
+    const FontedParagraph& fonted;
+    const Wrapping& wrapping;
+    bool isRightToLeft;
+};
 
 LineSetter::LineSetter(Fonts& fonts, const TextSettings& settings)
-    : mSettings(settings), mShaper(fonts, settings.features), mChooser(fonts, mShaper) {}
+    : mFonts(fonts),
+      mSpacing(settings.letterSpacing),
+      mWidth(settings.wrapWidth),
+      mShaper(fonts, featuresOf(settings)),
+      mChooser(fonts, mShaper) {}
 
-std::vector<SetLine> LineSetter::set(const Paragraph& paragraph) {
-    (void)mSettings;
-    SetLine line;
-    line.begin = paragraph.begin;
-    line.end = line.begin + paragraph.codes.size();
-    line.isRightToLeft = isRightToLeft(paragraph);
-    line.glyphs = std::move(mChooser.choose(paragraph).glyphs);
+void LineSetter::set(const Paragraph& paragraph, const Take& take) {
+    FontedParagraph fonted = mChooser.choose(paragraph);
+    addLetterSpacing(fonted.glyphs, paragraph.codes, mSpacing);
+    const bool isRtl = isRightToLeft(paragraph);
+    const size_t end = paragraph.codes.size();
+    if (mWidth == 0 || end == 0) {
+        take(placed(std::move(fonted.glyphs), paragraph, 0, end, isRtl));
+        return;
+    }
+    const Wrapping wrapping(paragraph, fonted.glyphs);
+    const Source source{paragraph, fonted, wrapping, isRtl};
+    for (size_t begin = 0; begin < end;) {
+        SetLine line = nextLine(source, begin);
+        begin = line.end - paragraph.begin;
+        take(std::move(line));
+    }
+}
+
+/// The line that begins at `begin`.
+SetLine LineSetter::nextLine(const Source& source, size_t begin) const {
+    if (auto line = longestLine(source, Wrapping::Ends::ofWords, begin)) return *std::move(line);
+    if (auto line = longestLine(source, Wrapping::Ends::ofClusters, begin)) return *std::move(line);
+    refuseWidth(source.paragraph, begin, mWidth);
+}
+
+/// The longest line that begins at `begin` and is not too wide; none where all are.
+std::optional<SetLine> LineSetter::longestLine(const Source& source, Wrapping::Ends ends,
+                                               size_t begin) const {
+    const int64_t width = mWidth * kUnit;
+    size_t end = source.wrapping.lastFitting(ends, begin, width);
+    SetLine line = part(source, begin, end);
+    while (line.width > width) {
+        end = source.wrapping.endBefore(ends, end, begin);
+        if (end == begin) return std::nullopt;
+        line = part(source, begin, end);
+    }
+    while (end < source.paragraph.codes.size()) {
+        end = source.wrapping.endAfter(ends, end);
+        SetLine longer = part(source, begin, end);
+        if (longer.width > width) break;
+        line = std::move(longer);
+    }
+    return line;
+}
+
+/// A part of a source line, shaped by itself without the blanks behind it.
+SetLine LineSetter::part(const Source& source, size_t begin, size_t end) const {
+    const size_t inkEnd = source.wrapping.withoutBlanks(begin, end);
+    const auto from = static_cast<ptrdiff_t>(begin);
+    const auto to = static_cast<ptrdiff_t>(inkEnd);
+    const std::vector<uint32_t>& all = source.paragraph.codes;
+    std::vector<uint32_t> codes(all.begin() + from, all.begin() + to);
+    std::vector<size_t> fonts(source.fonted.fonts.begin() + from, source.fonted.fonts.begin() + to);
+    const bool isHyphenated =
+        end < all.size() && codes.size() > 1 && all[end - 1] == vorelunicode::kSoftHyphen;
+    if (isHyphenated) {
+        fonts.back() = fonts[fonts.size() - 2];
+        codes.back() = hyphenOf(mFonts[fonts.back()]).value_or(codes.back());
+    }
+    std::vector<ShapedGlyph> glyphs =
+        mShaper.shape({codes.data(), fonts.data(), codes.size(), source.isRightToLeft});
+    addLetterSpacing(glyphs, codes, mSpacing);
+    for (ShapedGlyph& glyph : glyphs)
+        glyph.cluster += begin;
+    return placed(std::move(glyphs), source.paragraph, begin, end, source.isRightToLeft);
+}
+
+/// The line of the glyphs of a part of a source line.
+SetLine LineSetter::placed(std::vector<ShapedGlyph> glyphs, const Paragraph& paragraph, size_t begin,
+                           size_t end, bool isRightToLeft) {
+    SetLine line{std::move(glyphs), 0, paragraph.begin + begin, paragraph.begin + end, isRightToLeft};
     for (ShapedGlyph& glyph : line.glyphs) {
-        glyph.cluster += line.begin;
+        glyph.cluster += paragraph.begin;
         line.width += glyph.advance;
     }
-    return {line};
+    return line;
 }
 
 }  // namespace voreltext

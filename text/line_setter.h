@@ -2,6 +2,8 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <functional>
+#include <optional>
 #include <vector>
 
 #include "text/font_chooser.h"
@@ -9,6 +11,7 @@
 #include "text/paragraphs.h"
 #include "text/shaper.h"
 #include "text/text_settings.h"
+#include "text/wrapping.h"
 
 namespace voreltext {
 
@@ -22,19 +25,36 @@ struct SetLine {
 };
 
 /// Sets source lines in lines for the eye.
+///
+/// To be wrapped, a source line is shaped whole first, which tells how wide each cluster is about; then
+/// each line is shaped by itself and, where it turns out wider than it may be or another word would fit,
+/// once more.
 class LineSetter {
   public:
-    /// The fonts must outlive it. Throws TextError for a setting that is out of its range.
+    /// Takes the lines one by one; may throw.
+    using Take = std::function<void(SetLine line)>;
+
+    /// The fonts must outlive it. Throws TextError for a feature that is misspelt.
     LineSetter(Fonts& fonts, const TextSettings& settings);
 
     /// At least one line. Throws TextError.
-    std::vector<SetLine> set(const Paragraph& paragraph);
+    void set(const Paragraph& paragraph, const Take& take);
 
     /// Of the lines so far.
     const std::vector<MissingCharacter>& missing() const { return mChooser.missing(); }
 
   private:
-    const TextSettings& mSettings;
+    struct Source;
+
+    SetLine nextLine(const Source& source, size_t begin) const;
+    std::optional<SetLine> longestLine(const Source& source, Wrapping::Ends ends, size_t begin) const;
+    SetLine part(const Source& source, size_t begin, size_t end) const;
+    static SetLine placed(std::vector<ShapedGlyph> glyphs, const Paragraph& paragraph, size_t begin,
+                          size_t end, bool isRightToLeft);
+
+    const Fonts& mFonts;
+    int64_t mSpacing;
+    int mWidth;
     Shaper mShaper;
     FontChooser mChooser;
 };

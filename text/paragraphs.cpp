@@ -19,16 +19,16 @@ namespace {
 }  // namespace
 
 std::vector<Paragraph> splitParagraphs(const std::vector<uint32_t>& text) {
-    std::vector<Paragraph> paragraphs{{0, {}}};
+    std::vector<Paragraph> paragraphs{{1, 0, {}}};
     for (size_t at = 0; at < text.size(); ++at) {
         const uint32_t code = text[at];
         std::vector<uint32_t>& codes = paragraphs.back().codes;
         if (vorelunicode::isLineEnd(code)) {
             const bool isTwo = code == '\r' && at + 1 < text.size() && text[at + 1] == '\n';
             if (isTwo) ++at;
-            paragraphs.push_back({at + 1, {}});
+            paragraphs.push_back({paragraphs.size() + 1, at + 1, {}});
         } else if (vorelunicode::isControl(code) && code != '\t') {
-            refuseControl(code, paragraphs.size(), codes.size() + 1);
+            refuseControl(code, paragraphs.back().number, codes.size() + 1);
         } else {
             codes.push_back(code == '\t' ? ' ' : code);
         }

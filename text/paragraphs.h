@@ -8,6 +8,7 @@ namespace voreltext {
 
 /// A line of the source, without its end.
 struct Paragraph {
+    size_t number;                ///< 1 for the first
     size_t begin;                 ///< where it stands in the text
     std::vector<uint32_t> codes;  ///< its characters, tabs as blanks
 };

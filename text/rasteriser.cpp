@@ -2,23 +2,36 @@
 
 #include <ft2build.h>
 #include FT_FREETYPE_H
+#include FT_COLOR_H
 #include FT_OUTLINE_H
+#include FT_SIZES_H
 
+#include <algorithm>
+#include <optional>
 #include <string>
+#include <vector>
 
+#include "text/colour_layers.h"
 #include "text/error.h"
+#include "text/picture_scaling.h"
 #include "text/units.h"
 
 namespace voreltext {
 
-const int32_t kLoadFlags = FT_LOAD_NO_HINTING | FT_LOAD_NO_BITMAP;
+const int32_t kOutlineFlags = FT_LOAD_NO_HINTING | FT_LOAD_NO_BITMAP;
 
 namespace {
+
+constexpr FT_Int32 kPictureFlags = FT_LOAD_NO_HINTING | FT_LOAD_COLOR;
+
+[[noreturn]] void refuse(const GlyphOrigin& glyph) {
+    throw TextError("glyph " + std::to_string(glyph.index) + " cannot be rasterised");
+}
 
 /// Leaves the outline in the face's slot, moved by the fraction of a pixel of its origin.
 FT_GlyphSlot loadOutline(const Font& font, const GlyphOrigin& glyph) {
     const FT_Face face = font.face();
-    if (FT_Load_Glyph(face, glyph.index, kLoadFlags) != 0 ||
+    if (FT_Load_Glyph(face, glyph.index, kOutlineFlags) != 0 ||
         face->glyph->format != FT_GLYPH_FORMAT_OUTLINE) {
         throw TextError("the font has no outline for glyph " + std::to_string(glyph.index));
     }
@@ -26,9 +39,7 @@ FT_GlyphSlot loadOutline(const Font& font, const GlyphOrigin& glyph) {
     return face->glyph;
 }
 
-}  // namespace
-
-Box inkOf(const Font& font, const GlyphOrigin& glyph) {
+Box outlineBox(const Font& font, const GlyphOrigin& glyph) {
     FT_BBox outline;
     FT_Outline_Get_CBox(&loadOutline(font, glyph)->outline, &outline);
     const int x = floorToPixel(glyph.x);
@@ -37,11 +48,9 @@ Box inkOf(const Font& font, const GlyphOrigin& glyph) {
             x + ceilToPixel(outline.xMax), -y - floorToPixel(outline.yMin)};
 }
 
-GlyphMask rasterised(const Font& font, const GlyphOrigin& glyph) {
+GlyphMask renderedOutline(const Font& font, const GlyphOrigin& glyph) {
     const FT_GlyphSlot slot = loadOutline(font, glyph);
-    if (FT_Render_Glyph(slot, FT_RENDER_MODE_NORMAL) != 0) {
-        throw TextError("glyph " + std::to_string(glyph.index) + " cannot be rasterised");
-    }
+    if (FT_Render_Glyph(slot, FT_RENDER_MODE_NORMAL) != 0) refuse(glyph);
     const FT_Bitmap& bitmap = slot->bitmap;
     const int left = floorToPixel(glyph.x) + slot->bitmap_left;
     const int top = -floorToPixel(glyph.y) - slot->bitmap_top;
@@ -53,6 +62,116 @@ GlyphMask rasterised(const Font& font, const GlyphOrigin& glyph) {
         mask.coverage.insert(mask.coverage.end(), pixels, pixels + bitmap.width);
     }
     return mask;
+}
+
+/// While it lives, the face has the size of its pictures.
+class AtPictureSize {
+  public:
+    explicit AtPictureSize(const Font& font) : mBefore(font.face()->size) {
+        FT_Activate_Size(font.pictureSize());
+    }
+    ~AtPictureSize() { FT_Activate_Size(mBefore); }
+    AtPictureSize(const AtPictureSize&) = delete;
+    AtPictureSize& operator=(const AtPictureSize&) = delete;
+
+  private:
+    FT_Size mBefore;
+};
+
+struct PlacedPicture {
+    PictureView picture;
+    PicturePlace place;
+};
+
+/// The picture of a glyph, which the face's slot holds; none where it has none. `flags` are added to
+/// FreeType's.
+std::optional<PlacedPicture> loadPicture(const Font& font, const GlyphOrigin& glyph, FT_Int32 flags) {
+    if (font.pictureSize() == nullptr) return std::nullopt;
+    const AtPictureSize size(font);
+    const FT_Face face = font.face();
+    const FT_Error error = FT_Load_Glyph(face, glyph.index, kPictureFlags | flags);
+    const FT_GlyphSlot slot = face->glyph;
+    if (error != 0 || slot->format != FT_GLYPH_FORMAT_BITMAP || slot->bitmap.width == 0 ||
+        slot->bitmap.rows == 0) {
+        return std::nullopt;
+    }
+    if (slot->bitmap.pixel_mode != FT_PIXEL_MODE_BGRA) refuse(glyph);
+    return PlacedPicture{
+        {slot->bitmap.buffer, slot->bitmap.pitch, static_cast<int>(slot->bitmap.width),
+         static_cast<int>(slot->bitmap.rows)},
+        {slot->bitmap_left, -slot->bitmap_top, font.sizePx(), font.picturePpem(), glyph.x, -glyph.y}};
+}
+
+/// One of the outlines of a glyph that lie one upon the other.
+struct Layer {
+    unsigned int index;
+    bool isOfText;  ///< in the colour of the text
+    LayerColour colour;
+};
+
+/// Of a glyph without layers none.
+std::vector<Layer> layersOf(const Font& font, unsigned int index) {
+    constexpr FT_UInt kColourOfText = 0xFFFF;
+    std::vector<Layer> layers;
+    FT_Color* colours = nullptr;
+    const bool areColours = font.isColour() && FT_Palette_Select(font.face(), 0, &colours) == 0;
+    if (!areColours || colours == nullptr) return layers;
+    FT_LayerIterator next{};
+    Layer layer{};
+    FT_UInt colour = 0;
+    while (FT_Get_Color_Glyph_Layer(font.face(), index, &layer.index, &colour, &next) != 0) {
+        layer.isOfText = colour == kColourOfText;
+        const FT_Color entry = layer.isOfText ? FT_Color{0, 0, 0, 255} : colours[colour];
+        layer.colour = {entry.red, entry.green, entry.blue, entry.alpha};
+        layers.push_back(layer);
+    }
+    return layers;
+}
+
+bool areAPicture(const std::vector<Layer>& layers) {
+    return std::any_of(layers.begin(), layers.end(), [](const Layer& layer) { return !layer.isOfText; });
+}
+
+Box layersBox(const Font& font, const GlyphOrigin& glyph, const std::vector<Layer>& layers) {
+    Box box;
+    for (const Layer& layer : layers)
+        box.grow(outlineBox(font, {layer.index, glyph.x, glyph.y}));
+    return box;
+}
+
+GlyphMask renderedLayers(const Font& font, const GlyphOrigin& glyph, const std::vector<Layer>& layers) {
+    GlyphMask picture;
+    picture.box = layersBox(font, glyph, layers);
+    const size_t area =
+        static_cast<size_t>(picture.box.width()) * static_cast<size_t>(picture.box.height());
+    picture.coverage.resize(area);
+    picture.pixels.resize(area * 4);
+    for (const Layer& layer : layers)
+        layOn(picture, renderedOutline(font, {layer.index, glyph.x, glyph.y}), layer.colour);
+    if (!areAPicture(layers)) picture.pixels.clear();
+    return picture;
+}
+
+}  // namespace
+
+GlyphInk inkOf(const Font& font, const GlyphOrigin& glyph) {
+    if (const auto placed = loadPicture(font, glyph, FT_LOAD_BITMAP_METRICS_ONLY)) {
+        return {boxOf(placed->picture, placed->place), true};
+    }
+    if (!font.hasOutlines()) return {{}, false};
+    const std::vector<Layer> layers = layersOf(font, glyph.index);
+    if (layers.empty()) return {outlineBox(font, glyph), false};
+    return {layersBox(font, glyph, layers), areAPicture(layers)};
+}
+
+GlyphMask rasterised(const Font& font, const GlyphOrigin& glyph) {
+    if (loadPicture(font, glyph, FT_LOAD_BITMAP_METRICS_ONLY)) {
+        const auto placed = loadPicture(font, glyph, 0);
+        if (!placed) refuse(glyph);
+        return scaledPicture(placed->picture, placed->place);
+    }
+    const std::vector<Layer> layers = layersOf(font, glyph.index);
+    return layers.empty() ? renderedOutline(font, glyph) : renderedLayers(font, glyph, layers);
 }
 
 }  // namespace voreltext

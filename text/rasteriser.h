@@ -8,8 +8,8 @@
 /// From a glyph of a font to its pixels.
 namespace voreltext {
 
-/// How every glyph is loaded: as its designer's outline, which lands on any fraction of a pixel.
-extern const int32_t kLoadFlags;
+/// FreeType's flags for every outline: as its designer drew it, which lands on any fraction of a pixel.
+extern const int32_t kOutlineFlags;
 
 /// A glyph and its origin in 64ths of a pixel, y upwards.
 struct GlyphOrigin {
@@ -18,10 +18,16 @@ struct GlyphOrigin {
     int64_t y;
 };
 
-/// Where the ink of a glyph lies; empty for one without. Throws TextError.
-Box inkOf(const Font& font, const GlyphOrigin& glyph);
+struct GlyphInk {
+    Box box;         ///< holds all that is rasterised; empty without ink
+    bool isPicture;  ///< it has colours of its own
+};
 
-/// Throws TextError.
+/// Where the ink of a glyph lies. Throws TextError.
+GlyphInk inkOf(const Font& font, const GlyphOrigin& glyph);
+
+/// A glyph with ink. What a colour glyph leaves to the colour of the text is black in it, unless all of
+/// it is: then it is no picture. Throws TextError.
 GlyphMask rasterised(const Font& font, const GlyphOrigin& glyph);
 
 }  // namespace voreltext

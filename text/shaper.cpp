@@ -57,8 +57,9 @@ Shaper::Shaper(const Fonts& fonts, std::vector<std::string> features)
     }
 }
 
-size_t Shaper::fontOf(const FT_FaceRec_* face) const {
-    size_t font = 0;
+/// The index of a face's font, which probably is `likely`.
+size_t Shaper::fontOf(const FT_FaceRec_* face, size_t likely) const {
+    size_t font = mFonts[likely].face() == face ? likely : 0;
     while (font + 1 < mFonts.count() && mFonts[font].face() != face)
         ++font;
     return font;
@@ -70,7 +71,7 @@ std::vector<ShapedGlyph> Shaper::shape(const ShapingRun& run) const {
     const Raqm shaper(raqm_create());
     const bool isShaped = shaper != nullptr && raqm_set_text(shaper.get(), run.codes, run.length) &&
                           setFonts(shaper.get(), mFonts, run) && addFeatures(shaper.get(), mFeatures) &&
-                          raqm_set_freetype_load_flags(shaper.get(), kLoadFlags) &&
+                          raqm_set_freetype_load_flags(shaper.get(), kOutlineFlags) &&
                           raqm_set_par_direction(shaper.get(), run.isRightToLeft ? RAQM_DIRECTION_RTL
                                                                                  : RAQM_DIRECTION_LTR) &&
                           raqm_layout(shaper.get());
@@ -81,8 +82,9 @@ std::vector<ShapedGlyph> Shaper::shape(const ShapingRun& run) const {
     shaped.reserve(count);
     for (size_t i = 0; i < count; ++i) {
         const raqm_glyph_t& glyph = glyphs[i];
-        shaped.push_back({glyph.index, fontOf(glyph.ftface), glyph.cluster, glyph.x_advance,
-                          glyph.x_offset, glyph.y_offset});
+        const size_t font = fontOf(glyph.ftface, shaped.empty() ? 0 : shaped.back().font);
+        shaped.push_back({glyph.index, font, glyph.cluster, mFonts[font].scaled(glyph.x_advance),
+                          mFonts[font].scaled(glyph.x_offset), mFonts[font].scaled(glyph.y_offset)});
     }
     return shaped;
 }

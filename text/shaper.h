@@ -37,7 +37,7 @@ class Shaper {
     std::vector<ShapedGlyph> shape(const ShapingRun& run) const;
 
   private:
-    size_t fontOf(const FT_FaceRec_* face) const;
+    size_t fontOf(const FT_FaceRec_* face, size_t likely) const;
 
     const Fonts& mFonts;
     std::vector<std::string> mFeatures;

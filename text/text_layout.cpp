@@ -54,7 +54,12 @@ void checkWidth(const SetLine& line) {
 /// From baseline to baseline, in whole pixels.
 int64_t lineAdvance(const Fonts& fonts, const TextSettings& settings) {
     const double units = static_cast<double>(fonts.main().lineHeight()) * double{settings.lineHeight};
-    return static_cast<int64_t>(std::floor(units / kUnit + 0.5)) * kUnit;
+    return std::max(int64_t{1}, static_cast<int64_t>(std::floor(units / kUnit + 0.5))) * kUnit;
+}
+
+/// An enlarged picture is kept as bytes, unlike an outline.
+void checkPicture(const GlyphInk& ink) {
+    if (ink.isPicture) checkSide(std::max(ink.box.width(), ink.box.height()) * kUnit);
 }
 
 /// The box of a line, from the main font's ascender to its descender with half of the leading above; it
@@ -84,17 +89,18 @@ std::vector<size_t> wordsOf(const std::vector<uint32_t>& text) {
 
 TextLayout::TextLayout(Fonts& fonts, const std::vector<uint32_t>& text, const TextSettings& settings)
     : mFonts(fonts) {
+    checkSettings(settings);
     LineSetter setter(fonts, settings);
     const int64_t advance = lineAdvance(fonts, settings);
     std::vector<SetLine> lines;
     int64_t width = 0;
     for (const Paragraph& paragraph : splitParagraphs(text)) {
-        for (SetLine& line : setter.set(paragraph)) {
+        setter.set(paragraph, [&](SetLine line) {
             checkWidth(line);
             width = std::max(width, line.width);
             lines.push_back(std::move(line));
             checkSide(static_cast<int64_t>(lines.size()) * advance);
-        }
+        });
     }
     mMissing = setter.missing();
     const std::vector<size_t> words = wordsOf(text);
@@ -119,15 +125,17 @@ void TextLayout::placeLine(const SetLine& set, int64_t shift, int64_t baseline,
         pen += each.advance;
         checkSide(origin.x);
         checkSide(origin.y);
-        const Box box = inkOf(mFonts[each.font], origin);
-        if (box.isEmpty()) continue;
-        line.ink = unionOf(line.ink, box);
-        mGlyphs.push_back({{box, mLines.size(), words[each.cluster], each.cluster, each.font, false},
-                           origin.index,
-                           origin.x,
-                           origin.y});
+        const GlyphInk ink = inkOf(mFonts[each.font], origin);
+        if (ink.box.isEmpty()) continue;
+        checkPicture(ink);
+        line.ink.grow(ink.box);
+        mGlyphs.push_back(
+            {{ink.box, mLines.size(), words[each.cluster], each.cluster, each.font, ink.isPicture},
+             origin.index,
+             origin.x,
+             origin.y});
     }
-    mInkBox = unionOf(mInkBox, line.ink);
+    mInkBox.grow(line.ink);
     mLines.push_back(line);
 }
 

@@ -7,6 +7,11 @@ namespace voreltext {
 
 constexpr int64_t kUnit = 64;
 
+/// Division that rounds downwards; the divisor is positive.
+inline int64_t floorOf(int64_t number, int64_t divisor) {
+    return number / divisor - (number % divisor < 0 ? 1 : 0);
+}
+
 inline int floorToPixel(int64_t units) {
     return static_cast<int>(units >> 6);
 }

@@ -15,7 +15,13 @@ using namespace vorelpaint;
 
 void require(const Options& options) {
     demandIn(options.size, 1, 1000, "size");
-    demandIn(options.padding, 0, 1000, "padding");
+    demandIn(options.canvas.padding, 0, 1000, "padding");
+    demandIn(options.canvas.margin, 0, 8000, "margin");
+    demandIn(options.canvas.width.value_or(1), 1, 16384, "width");
+    demandIn(options.canvas.height.value_or(1), 1, 16384, "height");
+    demandIn(double{options.lineHeight}, 0.5, 10, "line-height");
+    demandIn(double{options.letterSpacing.value}, -200, 200, "letter-spacing");
+    demandIn(static_cast<double>(options.fonts.size()), 1, 16, "fonts");
     demandIn(static_cast<double>(options.effectScale), static_cast<double>(0.05F), 20, "effect-scale");
     if (options.opacity) demandIn(static_cast<double>(*options.opacity), 0, 1, "opacity");
     if (options.color) demandColour(*options.color);

@@ -36,7 +36,7 @@ TEST(Batch, EachKey_IsRead) {
            "color": "#010203", "opacity": 0.25, "background": "checkerboard", "padding": 0)");
     EXPECT_EQ(job.text, "A");
     EXPECT_EQ(job.output, "a.png");
-    EXPECT_EQ(job.font, "DejaVu Serif");
+    EXPECT_EQ(job.fonts, std::vector<std::string>{"DejaVu Serif"});
     EXPECT_EQ(job.size, 12);
     EXPECT_EQ(job.align, voreltext::Align::right);
     EXPECT_EQ(job.preset, "gold");
@@ -44,7 +44,66 @@ TEST(Batch, EachKey_IsRead) {
     EXPECT_EQ(job.color, 0x010203U);
     EXPECT_EQ(job.opacity, 0.25F);
     EXPECT_EQ(job.background.kind, Background::Kind::checkerboard);
-    EXPECT_EQ(job.padding, 0);
+    EXPECT_EQ(job.canvas.padding, 0);
+}
+
+TEST(Batch, KeysOfTextAndCanvas_AreRead) {
+    const Options job = jobOf(
+        R"("font": ["DejaVu Sans", "DejaVu Serif"], "font-features": "liga=0,ss01",
+           "font-variations": "wght=700,wdth=80.5", "markup": true, "line-height": 1.5,
+           "letter-spacing": "2.5%", "width": 640, "height": 360, "anchor": "bottom-left",
+           "margin": 20, "fit": "wrap", "box": "line", "align": "end")");
+    EXPECT_EQ(job.fonts, (std::vector<std::string>{"DejaVu Sans", "DejaVu Serif"}));
+    EXPECT_EQ(job.features, (std::vector<std::string>{"liga=0", "ss01"}));
+    ASSERT_EQ(job.variations.size(), 2U);
+    EXPECT_EQ(job.variations[1].axis, "wdth");
+    EXPECT_EQ(job.variations[1].value, 80.5F);
+    EXPECT_TRUE(job.markup);
+    EXPECT_EQ(job.lineHeight, 1.5F);
+    EXPECT_EQ(job.letterSpacing, (vorelstyle::Length{2.5F, vorelstyle::Length::Unit::percent}));
+    EXPECT_EQ(job.canvas.width, 640);
+    EXPECT_EQ(job.canvas.height, 360);
+    EXPECT_EQ(job.canvas.anchor, voreltext::Anchor::bottomLeft);
+    EXPECT_EQ(job.canvas.margin, 20);
+    EXPECT_EQ(job.fit, Fit::wrap);
+    EXPECT_EQ(job.box, TextBox::line);
+    EXPECT_EQ(job.align, voreltext::Align::end);
+}
+
+TEST(Batch, LetterSpacing_IsANumberOrALength) {
+    EXPECT_EQ(jobOf(R"("letter-spacing": -3)").letterSpacing, (vorelstyle::Length{-3}));
+    EXPECT_EQ(jobOf(R"("letter-spacing": "4px")").letterSpacing, (vorelstyle::Length{4}));
+    EXPECT_EQ(faultOfMember(R"("letter-spacing": true)"),
+              "letter-spacing: must be a string, not a boolean");
+    EXPECT_EQ(faultOfMember(R"("letter-spacing": "4em")"),
+              "letter-spacing: '4em' is no length from -200 to 200 in pixels or, with a %, in percent");
+}
+
+TEST(Batch, FontsOfAJob_TakeThePlaceOfTheCommon) {
+    Options common;
+    common.fonts = {"A", "B"};
+    EXPECT_EQ(parseJob(R"({"text": "x", "output": "a.png", "font": "C"})", common).fonts,
+              std::vector<std::string>{"C"});
+    EXPECT_EQ(parseJob(R"({"text": "x", "output": "a.png"})", common).fonts,
+              (std::vector<std::string>{"A", "B"}));
+    EXPECT_EQ(faultOfMember(R"("font": [])"), "font: has 0 elements, 1 to 16 are allowed");
+    EXPECT_EQ(faultOfMember(R"("font": ["A", 1])"), "font[1]: must be a string, not a number");
+    EXPECT_EQ(faultOfMember(R"("font": ["-"])"),
+              "font: must name a file: jobs have no standard input or output");
+}
+
+TEST(Batch, Flags_AreTrueOrFalse) {
+    Options common;
+    common.markup = true;
+    EXPECT_FALSE(parseJob(R"({"text": "x", "output": "a.png", "markup": false})", common).markup);
+    EXPECT_EQ(faultOfMember(R"("markup": 1)"), "markup: must be true or false, not a number");
+}
+
+TEST(Batch, FitWithoutASide_IsRefused) {
+    EXPECT_EQ(faultOfMember(R"("fit": "wrap", "height": 9)"),
+              "fit: wrap breaks lines at a width; none is given");
+    EXPECT_EQ(faultOfMember(R"("fit": "shrink")"),
+              "fit: shrink makes a text fit a width or a height; neither is given");
 }
 
 TEST(Batch, Numbers_AreReadAsTheCommandLineReadsThem) {
@@ -84,9 +143,10 @@ TEST(Batch, WhatAJobSays_ReplacesTheOtherOfThePair) {
 
 TEST(Batch, UnknownKeys_AreRefusedWithTheKnownOnes) {
     EXPECT_EQ(faultOfMember(R"("colour": "#000000")"),
-              "colour: unknown key; did you mean color? Known are text, text-file, font, size, align, "
-              "style, preset, "
-              "effect-scale, color, opacity, output, background, padding");
+              "colour: unknown key; did you mean color? Known are text, text-file, markup, align, "
+              "line-height, "
+              "letter-spacing, font, size, font-features, font-variations, style, preset, effect-scale, "
+              "color, opacity, width, height, anchor, margin, fit, box, padding, output, background");
     EXPECT_EQ(faultOfMember(R"("batch": "b.jsonl")").rfind("batch: unknown key", 0), 0U);
     EXPECT_EQ(faultOfMember(R"("help": true)").rfind("help: unknown key", 0), 0U);
 }
@@ -102,7 +162,8 @@ TEST(Batch, WrongTypes_AreNamed) {
 TEST(Batch, WrongValues_AreNamedWithTheirRange) {
     EXPECT_EQ(faultOfMember(R"("size": 0)"), "size: '0' is no whole number from 1 to 1000");
     EXPECT_EQ(faultOfMember(R"("size": 12.5)"), "size: '12.5' is no whole number from 1 to 1000");
-    EXPECT_EQ(faultOfMember(R"("align": "middle")"), "align: 'middle' is none of left, center, right");
+    EXPECT_EQ(faultOfMember(R"("align": "middle")"),
+              "align: 'middle' is none of left, center, right, start, end");
     EXPECT_EQ(faultOfMember(R"("color": "red")"), "color: 'red' is no colour; write #RRGGBB or #RGB");
 }
 

@@ -46,7 +46,7 @@ offered() { "offered_$shell" vorelpaint "$@" | sort; }
 
 presets=$("$program" --list-presets | cut -d ' ' -f 1)
 expect "an option's beginning" $'--padding' "$(offered --pa)"
-expect "an option's words" $'center\nleft\nright' "$(offered --align '')"
+expect "an option's words" $'center\nend\nleft\nright\nstart' "$(offered --align '')"
 expect "the beginning of a word" 'checkerboard' "$(offered --background c)"
 expect "the presets" "$presets" "$(offered --preset '')"
 expect "a preset's beginning" 'gold' "$(offered --preset g | grep gold)"

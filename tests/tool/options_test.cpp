@@ -45,7 +45,51 @@ TEST(Options, EachValue_IsRead) {
     EXPECT_EQ(options.color, 0x010203U);
     EXPECT_EQ(options.opacity, 0.25F);
     EXPECT_EQ(options.background.kind, Background::Kind::checkerboard);
-    EXPECT_EQ(options.padding, 0);
+    EXPECT_EQ(options.canvas.padding, 0);
+}
+
+TEST(Options, FontsAreCollected_InTheirOrder) {
+    EXPECT_EQ(optionsOf({"A"}).fonts, std::vector<std::string>{"DejaVu Sans"});
+    EXPECT_EQ(optionsOf({"--font", "X", "A"}).fonts, std::vector<std::string>{"X"});
+    EXPECT_EQ(optionsOf({"--font", "X", "A", "--font", "Y, Z"}).fonts,
+              (std::vector<std::string>{"X", "Y, Z"}));
+    EXPECT_EQ(optionsOf({"--font", "X", "A"}).text, "A") << "one value behind each";
+}
+
+TEST(Options, LettersAndLines_AreRead) {
+    const Options options = optionsOf({"--letter-spacing", "-5%", "--line-height", "1.25", "--markup",
+                                       "--font-features", "ss01,-kern", "A"});
+    EXPECT_EQ(options.letterSpacing, (vorelstyle::Length{-5, vorelstyle::Length::Unit::percent}));
+    EXPECT_EQ(options.lineHeight, 1.25F);
+    EXPECT_TRUE(options.markup);
+    EXPECT_EQ(options.features, (std::vector<std::string>{"ss01", "-kern"}));
+    EXPECT_EQ(
+        faultOf({"--letter-spacing", "201", "A"}),
+        "--letter-spacing: '201' is no length from -200 to 200 in pixels or, with a %, in percent");
+    EXPECT_EQ(
+        faultOf({"--font-variations", "weight=700", "A"}),
+        "--font-variations: 'weight=700' is no list of AXIS=VALUE; an axis has four letters, as in "
+        "wght=700");
+}
+
+TEST(Options, Sizes_AreThoseOfASheet) {
+    EXPECT_EQ(optionsOf({"--sheet", "--sizes", "24,48", "A"}).sheetSizes, (std::vector<int>{24, 48}));
+    EXPECT_EQ(faultOf({"--sheet", "--sizes", "24,0", "A"}),
+              "--sizes: '0' is no whole number from 1 to 1000");
+    EXPECT_EQ(faultOf({"--sheet", "--sizes", "", "A"}), "--sizes: '' is no list of 1 to 16 sizes");
+    EXPECT_EQ(faultOf({"--sizes", "24", "A"}),
+              "--sizes are the columns of a --sheet; the size of one picture is --size");
+}
+
+TEST(Options, CanvasThatDoesNotGoTogether_IsRefused) {
+    EXPECT_EQ(optionsOf({"--fit", "wrap", "--width", "9", "A"}).fit, Fit::wrap);
+    EXPECT_EQ(faultOf({"--fit", "wrap", "A"}), "fit: wrap breaks lines at a width; none is given");
+    EXPECT_EQ(faultOf({"--sheet", "--width", "9", "A"}),
+              "a sheet has the size of its cells; no width or height can be given");
+    EXPECT_EQ(
+        faultOf({"--anchor", "middle", "A"}),
+        "--anchor: 'middle' is none of top-left, top, top-right, left, center, right, bottom-left, "
+        "bottom, bottom-right");
 }
 
 TEST(Options, Colours_MayBeShort) {

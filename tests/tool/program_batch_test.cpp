@@ -87,7 +87,10 @@ TEST_F(BatchProgram, BadLine_IsReportedAndTheNextGoesOn) {
 TEST_F(BatchProgram, Warnings_NameTheLineAndFailNothing) {
     const Outcome outcome = run("\n" + job("a.png", R"("text": "A\ud80c\udc00")"));
     EXPECT_EQ(outcome.exitCode, 0);
-    EXPECT_EQ(outcome.err, "vorelpaint: line 2: warning: characters missing from the font: 1\n");
+    EXPECT_EQ(
+        outcome.err,
+        "vorelpaint: line 2: note: no font has U+13000 (line 1, character 2); its sign for missing "
+        "characters is painted\n");
 }
 
 TEST_F(BatchProgram, FailedJob_KeepsTheOlderPicture) {

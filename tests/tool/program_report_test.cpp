@@ -56,7 +56,7 @@ TEST(Explain, Text_IsMeasuredStepByStep) {
     EXPECT_TRUE(contains(text, "style       preset gold: Polished metal"));
     EXPECT_TRUE(contains(text, "margins     left 7, top 2, right 9, bottom 14 pixels\n"));
     EXPECT_TRUE(contains(text, "layers      one: the text is opaque, and no stroke is centred\n"));
-    EXPECT_TRUE(contains(text, "text        2 glyphs of 40 pixels in 'DejaVu Sans'\n"));
+    EXPECT_TRUE(contains(text, "text        2 glyphs of 40 pixels in 1 line\n"));
     const Words table = tableOf(text);
     const Words steps{"  step ", "  glyphs ",      "  stroke ", "  innerShadow ", "  linearGradient ",
                       "  text ", "  outerShadow ", "  merge ",  "  whole run "};
@@ -164,7 +164,7 @@ TEST(Sheet, Terminal_ShowsABarThatGoesInTheEnd) {
     const Outcome outcome =
         runVorelpaintOnTerminal({"--sheet", "--size", "24", "-o", dir.file("a.png"), "Ag"}, 80);
     EXPECT_EQ(outcome.exitCode, 0);
-    EXPECT_TRUE(contains(outcome.err, "] 0 of " + std::to_string(presetNames().size()) + " presets"));
+    EXPECT_TRUE(contains(outcome.err, "] 0 of " + std::to_string(presetNames().size()) + " pictures"));
     const std::string erased = "\r\x1B[K";
     EXPECT_EQ(outcome.err.substr(outcome.err.size() - erased.size()), erased);
 }

@@ -173,7 +173,10 @@ TEST_F(Program, MixedDirections_PaintLikeTheirVisualOrder) {
 TEST_F(Program, MissingCharacters_AreAWarning) {
     const Outcome outcome = runVorelpaint({"-o", mDir.file("a.png"), "A\xF0\x93\x80\x80"});
     EXPECT_EQ(outcome.exitCode, 0);
-    EXPECT_EQ(outcome.err, "vorelpaint: warning: characters missing from the font: 1\n");
+    EXPECT_EQ(outcome.err,
+              "vorelpaint: note: no font has U+13000 (line 1, character 2); its sign for missing "
+              "characters is "
+              "painted\n");
 }
 
 TEST_F(Program, EffectsWithoutACore_AreAWarningEach) {
@@ -181,8 +184,7 @@ TEST_F(Program, EffectsWithoutACore_AreAWarningEach) {
         R"({"bevel": {"size": 1, "angle": 0, "altitude": 0, "highlightColor": "#000000", "shadowColor": "#000000"}})");
     const Outcome outcome = runVorelpaint({"--style", style, "-o", mDir.file("a.png"), "A"});
     EXPECT_EQ(outcome.exitCode, 0);
-    EXPECT_EQ(outcome.err,
-              "vorelpaint: warning: the library has no core for bevel; it is not painted\n");
+    EXPECT_EQ(outcome.err, "vorelpaint: note: the library has no core for bevel; it is not painted\n");
     EXPECT_EQ(readBytes(mDir.file("a.png")), (paint({"A"}), readBytes(mDir.file("picture.png"))));
 }
 

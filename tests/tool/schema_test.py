@@ -48,7 +48,7 @@ def reader_faults(styles):
             for number, style in enumerate(styles))
     run = run_program(["--batch", "-"], "".join(json.dumps(job) + "\n" for job in jobs))
     faults = {}
-    for line, fault in re.findall(r"line (\d+): (?!warning: )(.*)", run.stderr):
+    for line, fault in re.findall(r"line (\d+): (?!note: )(.*)", run.stderr):
         # A missing image is no fault of the style.
         taken = fault.startswith("nothing to paint: ") or re.match(r"(looks\[\d+\]\.)?pattern\.image: '", fault)
         faults[int(line)] = "" if taken else fault

@@ -35,14 +35,21 @@ TEST(Settings, Initial_IsWhatAFreshRequestHolds) {
     for (const Setting& setting : settings()) {
         if (setting.initial.empty()) continue;
         Options options;
+        if (setting.forget) setting.forget(options);
         setting.read(options, setting.initial);
         const Options fresh;
-        EXPECT_EQ(options.font, fresh.font) << setting.name;
+        EXPECT_EQ(options.fonts, fresh.fonts) << setting.name;
         EXPECT_EQ(options.size, fresh.size) << setting.name;
         EXPECT_EQ(options.align, fresh.align) << setting.name;
         EXPECT_EQ(options.effectScale, fresh.effectScale) << setting.name;
         EXPECT_EQ(options.background.kind, fresh.background.kind) << setting.name;
-        EXPECT_EQ(options.padding, fresh.padding) << setting.name;
+        EXPECT_EQ(options.canvas.padding, fresh.canvas.padding) << setting.name;
+        EXPECT_EQ(options.canvas.margin, fresh.canvas.margin) << setting.name;
+        EXPECT_EQ(options.canvas.anchor, fresh.canvas.anchor) << setting.name;
+        EXPECT_EQ(options.fit, fresh.fit) << setting.name;
+        EXPECT_EQ(options.box, fresh.box) << setting.name;
+        EXPECT_EQ(options.lineHeight, fresh.lineHeight) << setting.name;
+        EXPECT_EQ(options.letterSpacing, fresh.letterSpacing) << setting.name;
     }
 }
 
@@ -57,13 +64,14 @@ TEST(Settings, Descriptions_NameTheRangeThatIsTaken) {
         Options options;
         EXPECT_NO_THROW(setting.read(options, range[1])) << setting.name;
         EXPECT_NO_THROW(setting.read(options, range[2])) << setting.name;
-        const double beyond = setting.name == "size" || setting.name == "padding" ? 1 : 0.001;
+        const bool isWhole = setting.value == "PX";
+        const double beyond = isWhole ? 1 : 0.001;
         const std::string below = shortest(std::stod(range[1]) - beyond);
         const std::string above = shortest(std::stod(range[2]) + beyond);
         EXPECT_THROW(setting.read(options, below), ToolError) << setting.name << " " << below;
         EXPECT_THROW(setting.read(options, above), ToolError) << setting.name << " " << above;
     }
-    EXPECT_EQ(numbers, 4U);
+    EXPECT_EQ(numbers, 8U);
 }
 
 TEST(Help, NamesTheLimits) {
@@ -76,7 +84,9 @@ TEST(Help, NamesTheLimits) {
 }
 
 TEST(Settings, WordsOf_AreTheLiteralOnes) {
-    EXPECT_EQ(wordsOf(settingNamed("align")), (std::vector<std::string>{"left", "center", "right"}));
+    EXPECT_EQ(wordsOf(settingNamed("align")),
+              (std::vector<std::string>{"left", "center", "right", "start", "end"}));
+    EXPECT_EQ(wordsOf(settingNamed("anchor")).size(), 9U);
     EXPECT_EQ(wordsOf(settingNamed("background")),
               (std::vector<std::string>{"transparent", "checkerboard"}));
     EXPECT_TRUE(wordsOf(settingNamed("size")).empty());

@@ -202,7 +202,7 @@ std::vector<RunOfGlyphs> runsOf(const TextLayout& text, const voreltext::Layer& 
     for (const std::vector<size_t>& glyphs : spansOf(text, layer.span)) {
         RunOfGlyphs run{{text.glyph(glyphs.front()).box, margins, 0}, {}};
         for (const size_t i : glyphs) {
-            run.frame.ink = unionOf(run.frame.ink, text.glyph(i).box);
+            run.frame.ink.grow(text.glyph(i).box);
             run.masks.push_back(text.rasterise(i));
         }
         runs.push_back(std::move(run));

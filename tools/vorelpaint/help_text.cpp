@@ -32,6 +32,8 @@ const std::vector<std::string>& exampleCommands() {
         R"(vorelpaint --preset neon -o cold.png -- "-40 degrees")",
         R"(vorelpaint --batch titles.jsonl --font 'DejaVu Sans:bold')",
         R"(vorelpaint --sheet --background '#23272E' -o presets.png "Type")",
+        R"(vorelpaint --preset subtitle --width 1920 --height 1080 --anchor bottom --margin 60 --fit wrap -o frame.png "A line of dialogue")",
+        R"(vorelpaint --preset subtitle --box line --markup -o word.png "<c #FFD040>Sing</c> along")",
         R"(vorelpaint --preset gold --explain "Type")",
         R"(vorelpaint --preset gold --write-cpp > gold.cpp)",
         R"(vorelpaint --list-presets)"};
@@ -43,12 +45,27 @@ const std::vector<Note>& notes() {
         {"Style files",
          "A style file is a JSON object with one object per effect (outerShadow, innerShadow, "
          "outerGlow, innerGlow, linearGradient, radialGradient, stroke, pattern, text, bevel, "
-         "emboss); the last lies on top. The presets are style files to start from. Where they "
-         "and the page of every key lie stands under Files."},
+         "emboss), or with \"version\": 2 a list of such looks, painted one over the other; the "
+         "last lies on top. A length is in pixels, or in percent of the font size: \"4%\". The "
+         "presets are style files to start from. Where they and the page of every key lie stands "
+         "under Files."},
         {"Fonts",
          "A font is a file, or a family that fontconfig knows, with styles and properties behind "
          "colons: 'DejaVu Sans:bold:italic', 'DejaVu Sans:weight=200'. A style that is misspelt, "
-         "or that no face of the family has, is refused; italic and oblique stand for each other."},
+         "or that no face of the family has, is refused; italic and oblique stand for each other. "
+         "Characters that a font lacks are taken from the next one that is given, then from an "
+         "installed one; the first font alone sets baselines and line heights."},
+        {"Canvas",
+         "With a width or a height the text's box stands at the anchor within the margins, and what "
+         "reaches beyond the picture is cut off. A text whose box is larger is left so, set in a "
+         "smaller size (shrink) or in more lines (wrap), broken where UAX #14 allows it."},
+        {"Markup",
+         "With --markup, <c #F80>word</c> is painted in that colour. Tags may stand within each "
+         "other. &lt; and &amp; are < and & themselves."},
+        {"Notes",
+         "What is painted otherwise than asked for is noted on standard error: characters that no "
+         "font has, lengths beyond the library's 100 pixels, what a canvas cuts off, effects without "
+         "a core. With --strict the first note is an error, and the picture is not painted."},
         {"Batches",
          "Each line of a batch is a JSON object with the keys of one picture: " + jobKeys() +
              ". They mean what the options of these names mean; style may also be a style itself. "

@@ -79,7 +79,7 @@ void addSetting(CLI::App& app, const Setting& setting, Options& options) {
     } else if (setting.kind == Setting::Kind::list) {
         option =
             app.add_option_function<std::vector<std::string>>(names, assignAll, setting.description);
-        option->type_size(1)->expected(1)->multi_option_policy(CLI::MultiOptionPolicy::TakeAll);
+        option->allow_extra_args(false);  // one behind each of them; the next word may be the text
         option->type_name(setting.value)->default_str(setting.initial);
     } else {
         option = app.add_option_function<std::string>(names, assign, setting.description);

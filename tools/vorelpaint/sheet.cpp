@@ -92,7 +92,7 @@ CellSize sizeOf(const Column& column, int padding) {
     CellSize size;
     for (const Cell& cell : column.cells) {
         grow(size.margins, marginsOf(cell.looks.layers()));
-        size.label = unionOf(size.label, cell.label.layout().inkBox());
+        size.label.grow(cell.label.layout().inkBox());
     }
     const Canvas canvas = placedOn({{}, {}, {}, 0, padding}, column.text.box(), size.margins);
     size.width = std::max(canvas.width, size.label.width() + 2 * padding);
