@@ -16,10 +16,15 @@ bool isShare(const Length& length) {
     return length.unit == Length::Unit::percent;
 }
 
-/// The number of pixels, to 1/1024: what is left of decimals and binary fractions makes no half larger
-/// or smaller than it is spelled, as 0.7 % of 500 is.
+/// The number in the thousandths with which a file spells it: a float is a little more or less, which
+/// would turn halves of a pixel into less than halves.
+double thousandths(float value) {
+    return std::round(static_cast<double>(value) * 1000);
+}
+
+/// The number of pixels without the last bits of what a scale such as 0.7 adds to it, to 1/65536.
 double snapped(double pixels) {
-    constexpr double kSteps = 1024;
+    constexpr double kSteps = 65536;
     return std::round(pixels * kSteps) / kSteps;
 }
 
@@ -58,7 +63,8 @@ class Resolver {
 
   private:
     double pixelsOfShare(const Length& share) const {
-        return snapped(static_cast<double>(share.value) * mFontSize / 100 * static_cast<double>(mScale));
+        const double atScaleOne = thousandths(share.value) * mFontSize / (1000.0 * 100.0);
+        return snapped(atScaleOne * static_cast<double>(mScale));
     }
 
     /// Resolves the width of something drawn, and returns the part of its opacity that it keeps.

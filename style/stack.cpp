@@ -28,30 +28,38 @@ TextPaint textPaintOf(const Style& style, size_t position, std::optional<uint32_
     return {fill.value_or(fillOf(look)), textOpacity.value_or(opacityOf(look))};
 }
 
-Place placeOf(const LookStyle& look) {
-    return {wholeOffset(look.offsetX, "offset.x"), wholeOffset(look.offsetY, "offset.y"), look.span,
-            look.isFilled};
+std::vector<Place> placesOf(const Style& style) {
+    std::vector<Place> places;
+    for (size_t i = 0; i < style.looks.size(); ++i) {
+        const LookStyle& look = style.looks[i];
+        withFaultsUnder(faultPrefix(style.name) + lookPath(style, i), [&] {
+            places.push_back({wholeOffset(look.offsetX, "offset.x"),
+                              wholeOffset(look.offsetY, "offset.y"), look.span, look.isFilled});
+        });
+    }
+    return places;
 }
 
-bool isPlain(const Place& place) {
+bool isOneInItsPlace(const std::vector<Place>& places) {
+    if (places.size() != 1) return false;
+    const Place& place = places.front();
     return place.offsetX == 0 && place.offsetY == 0 && place.span == Span::block;
 }
 
 Stack::Stack(const Style& style, std::optional<uint32_t> fill, std::optional<float> textOpacity,
              const LoadImage& load)
     : mTopFill(vorelstyle::topFill(style)) {
-    mLooks.reserve(style.looks.size());
-    for (size_t i = 0; i < style.looks.size(); ++i) {
-        const LookStyle& look = style.looks[i];
+    const std::vector<Place> places = placesOf(style);
+    mLooks.reserve(places.size());
+    for (size_t i = 0; i < places.size(); ++i) {
         const TextPaint text = textPaintOf(style, i, fill, textOpacity);
         const std::string path = lookPath(style, i);
         withFaultsUnder(faultPrefix(style.name) + path, [&] {
-            add(path, {Look(look, text.fill, text.opacity, load), placeOf(look)});
+            add(path, {Look(style.looks[i], text.fill, text.opacity, load), places[i]});
         });
     }
-    const bool isPlainLook = mLooks.size() == 1 && isPlain(mLooks.front().place);
     for (const StackedLook& stacked : mLooks) {
-        if (!isPlainLook) mKey += placeFragment(stacked.place);
+        if (!isOneInItsPlace(places)) mKey += placeFragment(stacked.place);
         mKey += stacked.look.key();
     }
 }

@@ -23,12 +23,12 @@ struct TextPaint {
 TextPaint textPaintOf(const Style& style, size_t position, std::optional<uint32_t> fill,
                       std::optional<float> textOpacity);
 
-/// The place of a resolved look. Throws StyleError when an offset is no whole number of pixels within
-/// kMaxOffset.
-Place placeOf(const LookStyle& look);
+/// The places of the looks of a resolved style. Throws StyleError when an offset is no whole number of
+/// pixels within kMaxOffset.
+std::vector<Place> placesOf(const Style& style);
 
-/// Whether a place is that of the one look of a plain style: unmoved, of the whole block.
-bool isPlain(const Place& place);
+/// Whether these are the places of one look alone, which is not moved and of the whole block.
+bool isOneInItsPlace(const std::vector<Place>& places);
 
 /// One look of a stack and where it is painted: once for each span, a run with a text box of its own,
 /// into a transparent picture that is then laid, moved by the offset, over the looks beneath.

@@ -19,6 +19,14 @@ namespace {
 constexpr size_t kMaxPatternPixels = size_t{1} << 16;
 constexpr size_t kBytesPerLine = 16;
 
+constexpr const char* kHowToPaint =
+    "/// In the order of painting. A look paints each of its spans (block, line, word or glyph) as a "
+    "run\n"
+    "/// into a transparent picture of its own, which, moved by the look's offset, is laid over what "
+    "is\n"
+    "/// painted before: each premultiplied channel becomes\n"
+    "/// source + destination * (255 - source alpha) / 255.\n";
+
 /// The shortest spelling that is read as the very same float: 0.6F, 100.
 std::string literal(float value) {
     std::array<char, 32> text{};
@@ -151,25 +159,21 @@ void writeLook(std::ostream& out, const std::string& name, const LookStyle& look
 }
 
 /// Writes the array that tells the looks and their places.
-void writePlaces(std::ostream& out, const std::string& name, const Style& style) {
+void writePlaces(std::ostream& out, const std::string& name, const std::string& description,
+                 const std::vector<Place>& places) {
     std::string type = name + "Look";
-    if (type.front() >= 'a' && type.front() <= 'z') type.front() += 'A' - 'a';
-    const std::string array = name + "Looks[" + std::to_string(style.looks.size()) + "]";
+    if (type.front() >= 'a' && type.front() <= 'z')
+        type.front() = static_cast<char>(type.front() - 'a' + 'A');
+    const std::string array = type + " " + name + "Looks[" + std::to_string(places.size()) + "]";
     out << "/// One look of the stack and its place.\nstruct " << type << " {\n"
         << "    void (*add)(VFontEffect::VFEffect& look);\n"
         << "    int offsetX;  // in pixels, to the right\n"
         << "    int offsetY;  // in pixels, downwards\n"
         << "    const char* span;  // what is one run, with a text box of its own\n};\n\n";
-    if (!style.description.empty()) out << "/// " << sentence(style.description) << '\n';
-    out << "/// In the order of painting. A look paints each of its spans (block, line, word or glyph) "
-           "as a\n"
-        << "/// run into a transparent picture of its own, which, moved by the look's offset, is laid "
-           "over\n"
-        << "/// what is painted before: each premultiplied channel becomes\n"
-        << "/// source + destination * (255 - source alpha) / 255.\n"
-        << "extern const " << type << " " << array << ";\nconst " << type << " " << array << " = {\n";
-    for (size_t i = 0; i < style.looks.size(); ++i) {
-        const Place place = placeOf(style.looks[i]);
+    if (!description.empty()) out << "/// " << sentence(description) << '\n';
+    out << kHowToPaint << "extern const " << array << ";\nconst " << array << " = {\n";
+    for (size_t i = 0; i < places.size(); ++i) {
+        const Place& place = places[i];
         out << "    {" << name << i + 1 << ", " << place.offsetX << ", " << place.offsetY << ", \""
             << kSpanNames[static_cast<size_t>(place.span)] << "\"},\n";
     }
@@ -180,7 +184,8 @@ void writePlaces(std::ostream& out, const std::string& name, const Style& style)
 
 void writeCpp(std::ostream& out, const std::string& name, const Style& style,
               std::optional<uint32_t> fill, std::optional<float> textOpacity, const LoadImage& load) {
-    const bool isOne = style.looks.size() == 1 && isPlain(placeOf(style.looks.front()));
+    const std::vector<Place> places = placesOf(style);
+    const bool isOne = isOneInItsPlace(places);
     out << "#include <voreleffect/voreleffect.h>\n\n";
     for (size_t i = 0; i < style.looks.size(); ++i) {
         const LookStyle& look = style.looks[i];
@@ -192,7 +197,7 @@ void writeCpp(std::ostream& out, const std::string& name, const Style& style,
         });
         if (!isOne) out << '\n';
     }
-    if (!isOne) writePlaces(out, name, style);
+    if (!isOne) writePlaces(out, name, style.description, places);
 }
 
 std::string functionName(const std::string& look) {

@@ -80,6 +80,45 @@ TEST(KeyText, Fragments_StandInTheirOrderWithoutThePattern) {
     EXPECT_EQ(types, (std::vector<int>{12, 8, 4, 2}));
 }
 
+TEST(KeyText, Place_TellsOffsetsSpanAndFill) {
+    const auto wordsOf = [](const Place& place) {
+        const std::vector<KeyFragment> fragments = keyFragments(placeFragment(place));
+        EXPECT_EQ(fragments.size(), 1U);
+        EXPECT_EQ(fragments[0].type, 0);
+        EXPECT_EQ(fragments[0].letter, 'P');
+        EXPECT_EQ(fragments[0].name, "place");
+        return fragments[0].meaning;
+    };
+    EXPECT_EQ(wordsOf({3, -2, Span::word, true}), "moved by 3, -2, by word");
+    EXPECT_EQ(wordsOf({}), "moved by 0, 0");
+    EXPECT_EQ(wordsOf({-1, 127, Span::line, false}), "moved by -1, 127, by line, not filled");
+    EXPECT_EQ(wordsOf({32767, -32767, Span::glyph, true}), "moved by 32767, -32767, by glyph");
+    EXPECT_EQ(wordsOf({128, -129, Span::block, false}), "moved by 128, -129, not filled");
+}
+
+TEST(KeyText, Place_IsOneLetterAndCharactersWithTheirTopBit) {
+    // -2 of 2^20 is 2^20 - 2: 63, 127, 126 of seven bits each.
+    EXPECT_EQ(placeFragment({1, -2, Span::word, false}), "P\xC0\x80\x81\xBF\xFF\xFE\x86");
+    EXPECT_EQ(placeFragment({}), "P\xC0\x80\x80\xC0\x80\x80\x80");
+}
+
+TEST(KeyText, Places_AreEqualInAllOfTheirParts) {
+    const Place place{1, 2, Span::line, true};
+    EXPECT_EQ(place, (Place{1, 2, Span::line, true}));
+    for (const Place& other : {Place{0, 2, Span::line, true}, Place{1, 0, Span::line, true},
+                               Place{1, 2, Span::word, true}, Place{1, 2, Span::line, false}})
+        EXPECT_NE(place, other);
+}
+
+TEST(KeyText, Names_AreThoseOfAStyleFile) {
+    const std::vector<KeyFragment> fragments = keyFragments("K\x81T\x81?\x81P\x81");
+    ASSERT_EQ(fragments.size(), 4U);
+    EXPECT_EQ(fragments[0].name, "stroke");
+    EXPECT_EQ(fragments[1].name, "text");
+    EXPECT_EQ(fragments[2].name, "");
+    EXPECT_EQ(fragments[3].name, "place") << "cut off";
+}
+
 TEST(KeyText, Hexadecimal_SpellsEveryByte) {
     EXPECT_EQ(hexadecimal(std::string_view("\x00\x0F\xF0Z", 4)), "000ff05a");
 }

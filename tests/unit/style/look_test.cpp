@@ -71,6 +71,32 @@ TEST(Look, PatternFaults_NameTheKey) {
     EXPECT_EQ(faultWith(nullptr), where + "there is nothing to load 'a.png' with");
 }
 
+TEST(Look, Lengths_AreThePixelsOfItsEffects) {
+    const LookStyle look = lookOf(
+        R"({"outerShadow": {"angle": 90, "distance": 6, "size": 7, "color": "#000000"},
+            "innerGlow": {"size": 5, "color": "#FF0000"}})");
+    const std::string angle = "\x80\xDA";  // 90 in two characters
+    EXPECT_EQ(Look(look, 0, 1).key(), "S" + angle + "\x86\x87" + keyWord(0xFF000000) + "N\x85" +
+                                          keyWord(0xFFFF0000) + "T" + keyWord(0xFF000000));
+}
+
+TEST(Look, LengthsThatAreNotResolved_AreRefused) {
+    const LookStyle look = lookOf(R"({"version": 2, "outerGlow": {"size": "4%", "color": "#000000"}})");
+    EXPECT_THROW(Look(look, 0, 1), StyleError);
+}
+
+TEST(Look, WidthOfATile_BecomesTheScaleOfItsPicture) {
+    const LookStyle look = lookOf(R"({"version": 2, "pattern": {"image": "a.png", "width": 45}})");
+    const auto load = [](const std::string&) { return PatternImage{4, 1, std::vector<uint8_t>(16)}; };
+    const Look painted(look, 0, 1, load);
+    VFontEffect::VFEffect effects(painted.effects());
+    const auto* pattern = effects.getEffect(kPatternType);
+    ASSERT_NE(pattern, nullptr);
+    EXPECT_EQ(painted.notes(), std::vector<std::string>{
+                                   "pattern.width: 45 pixels of a picture of 4 are a scale of 11.25, "
+                                   "which is more than the library's 10; painted with 10"});
+}
+
 TEST(Look, PatternPictureOfAnotherSizeThanItsPixels_IsRefused) {
     const auto withPixels = [](int width, int height, size_t bytes) {
         return faultWith([=](const std::string&) {

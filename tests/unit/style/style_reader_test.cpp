@@ -1,6 +1,9 @@
 #include <gtest/gtest.h>
 
+#include <fstream>
+#include <iterator>
 #include <string>
+#include <vector>
 
 #include "style/error.h"
 #include "style/json_object.h"
@@ -344,6 +347,138 @@ TEST(StyleReader, SameKeyInTwoEffects_IsFine) {
 TEST(StyleReader, ColourBesideATextFill_IsRefused) {
     EXPECT_EQ(faultOf(R"({"color": "#000000", "text": {"color": "#000000"}})"),
               "color: the fill has its colour in text.color already");
+}
+
+TEST(StyleReader, Version_IsTheFirstWhereNoneIsSaid) {
+    EXPECT_EQ(parseStyle("{}").version, 1);
+    EXPECT_EQ(parseStyle(R"({"version": 1})").version, 1);
+    EXPECT_EQ(parseStyle(R"({"version": 2.0})").version, 2);
+    EXPECT_EQ(faultOf(R"({"version": 0})"), "version: 0 is out of range, 1 to 2");
+}
+
+TEST(StyleReader, BadStyles_AreRefusedInOneLineWithTheirPath) {
+    std::ifstream file(VOREL_REFUSED_STYLES);
+    const std::string text((std::istreambuf_iterator<char>(file)), {});
+    const JsonDocument document("{\"styles\": " + text + "}");
+    const auto cases = JsonObject(document.root(), "", {"styles"}).array("styles", {1, 1000});
+    EXPECT_GT(cases.size(), 30U);
+    for (const JsonValue value : cases) {
+        const JsonObject bad(value, "", {"refused", "style"});
+        const std::string refused = bad.string("refused");
+        try {
+            readStyle(bad.value("style"));
+            ADD_FAILURE() << "read, not refused: " << refused;
+        } catch (const StyleError& error) {
+            EXPECT_EQ(std::string(error.what()).substr(0, refused.size()), refused);
+            EXPECT_EQ(std::string(error.what()).find('\n'), std::string::npos);
+        }
+    }
+}
+
+TEST(StyleReader, Looks_KeepTheOrderOfTheFile) {
+    const Style style = parseStyle(R"({"version": 2, "$schema": "s", "description": "both", "looks": [
+        {"description": "low", "color": "#000001"},
+        {"textOpacity": 0.5, "outerGlow": {"size": "3%", "color": "#000000"}}]})");
+    EXPECT_TRUE(style.isList);
+    EXPECT_EQ(style.description, "both");
+    ASSERT_EQ(style.looks.size(), 2U);
+    EXPECT_EQ(style.looks[0].description, "low");
+    EXPECT_EQ(style.looks[0].color, 1U);
+    EXPECT_EQ(style.looks[1].description, "");
+    EXPECT_EQ(style.looks[1].textOpacity, 0.5F);
+    EXPECT_EQ(std::get<OuterGlow>(style.looks[1].effects.at(0)).size,
+              (Length{3, Length::Unit::percent}));
+}
+
+TEST(StyleReader, LookOfAFileWithoutAList_LeavesTheDescriptionToTheFile) {
+    const Style style = parseStyle(R"({"version": 2, "description": "d"})");
+    EXPECT_FALSE(style.isList);
+    EXPECT_EQ(style.description, "d");
+    EXPECT_EQ(style.looks.at(0).description, "");
+}
+
+TEST(StyleReader, ThirtyTwoLooks_AreTheMost) {
+    const auto withLooks = [](int count) {
+        std::string looks = "{}";
+        for (int i = 1; i < count; ++i)
+            looks += ", {}";
+        return R"({"version": 2, "looks": [)" + looks + "]}";
+    };
+    EXPECT_EQ(parseStyle(withLooks(32)).looks.size(), 32U);
+    EXPECT_EQ(faultOf(withLooks(33)), "looks: has 33 elements, 1 to 32 are allowed");
+    EXPECT_EQ(faultOf(withLooks(1000)), "looks: has 1000 elements, 1 to 32 are allowed");
+}
+
+TEST(StyleReader, LookKeys_HaveTheirDefaults) {
+    for (const char* json : {R"({"version": 2})", R"({"version": 2, "offset": {}})",
+                             R"({"version": 2, "looks": [{"fill": true, "span": "block"}]})"}) {
+        const LookStyle look = onlyLook(json);
+        EXPECT_TRUE(look.isFilled);
+        EXPECT_EQ(look.offsetX, Length{});
+        EXPECT_EQ(look.offsetY, Length{});
+        EXPECT_EQ(look.span, Span::block);
+    }
+}
+
+TEST(StyleReader, LookKeys_AreRead) {
+    const LookStyle look = onlyLook(
+        R"({"version": 2, "fill": false, "span": "word", "offset": {"x": -1000, "y": "-12.5%"}})");
+    EXPECT_FALSE(look.isFilled);
+    EXPECT_EQ(look.offsetX, Length{-1000});
+    EXPECT_EQ(look.offsetY, (Length{-12.5F, Length::Unit::percent}));
+    EXPECT_EQ(look.span, Span::word);
+    EXPECT_EQ(onlyLook(R"({"version": 2, "span": "line"})").span, Span::line);
+    EXPECT_EQ(onlyLook(R"({"version": 2, "span": "glyph"})").span, Span::glyph);
+}
+
+TEST(StyleReader, LookWithoutFill_IsInvisibleText) {
+    EXPECT_EQ(opacityOf(onlyLook(R"({"version": 2, "fill": false})")), 0.0F);
+    EXPECT_EQ(opacityOf(onlyLook(R"({"version": 2, "fill": true, "textOpacity": 0.5})")), 0.5F);
+}
+
+TEST(StyleReader, TopFill_IsThatOfTheLastFilledLook) {
+    const auto topOf = [](const std::string& looks) {
+        return topFill(parseStyle(R"({"version": 2, "looks": [)" + looks + "]}"));
+    };
+    EXPECT_EQ(topOf("{}, {}"), 1U);
+    EXPECT_EQ(topOf(R"({}, {}, {"fill": false})"), 1U);
+    EXPECT_EQ(topOf(R"({}, {"textOpacity": 0})"), 1U) << "a caller may choose another opacity";
+    EXPECT_EQ(topOf(R"({"fill": false})"), std::nullopt);
+}
+
+TEST(StyleReader, LengthsOfVersion2_AreNumbersOrStrings) {
+    const auto sizeOf = [](const std::string& size) {
+        return only<OuterGlow>(R"({"version": 2, "outerGlow": {"color": "#000000", "size": )" + size +
+                               "}}")
+            .size;
+    };
+    EXPECT_EQ(sizeOf("4"), Length{4});
+    EXPECT_EQ(sizeOf("\"4px\""), Length{4});
+    EXPECT_EQ(sizeOf("\"4%\""), (Length{4, Length::Unit::percent}));
+    const auto shadow = only<InnerShadow>(
+        R"({"version": 2, "innerShadow": {"angle": 0, "distance": "1%", "size": "2%", "color": "#000000"}})");
+    EXPECT_EQ(shadow.distance, (Length{1, Length::Unit::percent}));
+    EXPECT_EQ(shadow.size, (Length{2, Length::Unit::percent}));
+    const auto stroke = only<Stroke>(
+        R"({"version": 2, "stroke": {"size": "100%", "color": "#000000", "position": "inside"}})");
+    EXPECT_EQ(stroke.size, (Length{100, Length::Unit::percent}));
+}
+
+TEST(StyleReader, LengthsOfVersion1_AreNumbers) {
+    const auto faultOfSize = [](const std::string& size) {
+        return faultOf(R"({"outerGlow": {"color": "#000000", "size": )" + size + "}}");
+    };
+    EXPECT_EQ(faultOfSize("\"4px\""), "outerGlow.size: needs \"version\": 2");
+    EXPECT_EQ(faultOfSize("\"x\""), "outerGlow.size: must be a number from 0 to 100, not a string");
+    EXPECT_EQ(faultOf(R"({"outerGlow": {"color": "#000000"}})"),
+              "outerGlow.size: missing; a number from 0 to 100");
+}
+
+TEST(StyleReader, WidthOfATile_StandsInsteadOfTheScale) {
+    const auto pattern =
+        only<Pattern>(R"({"version": 2, "pattern": {"image": "a.png", "width": "12.5%"}})");
+    EXPECT_EQ(pattern.width, (Length{12.5F, Length::Unit::percent}));
+    EXPECT_FALSE(only<Pattern>(R"({"version": 2, "pattern": {"image": "a.png"}})").width);
 }
 
 TEST(StyleReader, DeepNesting_IsRefusedWithoutHarm) {

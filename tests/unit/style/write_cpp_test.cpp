@@ -4,6 +4,7 @@
 
 #include <sstream>
 #include <string>
+#include <vector>
 
 #include "style/error.h"
 
@@ -12,7 +13,7 @@ namespace {
 
 std::string writtenOf(const std::string& json) {
     std::ostringstream out;
-    writeCpp(out, "addLook", parseStyle(json), 0, 1);
+    writeCpp(out, "addLook", parseStyle(json));
     return out.str();
 }
 
@@ -63,6 +64,93 @@ TEST(WriteCppText, PatternWithTooManyPixels_IsRefused) {
             std::string(error.what()),
             "style 'b.json': pattern.image: has more than 65536 pixels, too many to be written as C++");
     }
+}
+
+size_t countOf(const std::string& text, const std::string& part) {
+    size_t count = 0;
+    for (size_t at = text.find(part); at != std::string::npos; at = text.find(part, at + 1))
+        ++count;
+    return count;
+}
+
+TEST(WriteCppText, OneLookInItsPlace_IsOneFunction) {
+    const std::string plain = writtenOf(R"({"description": "a", "color": "#000001"})");
+    EXPECT_EQ(plain, R"(#include <voreleffect/voreleffect.h>
+
+/// a.
+/// For an empty set; VFEffect.h shows how a set paints a run.
+void addLook(VFontEffect::VFEffect& look) {
+    look.setTextOpacity(1);
+    look.addText(0x000001, 1);
+}
+)");
+    EXPECT_EQ(writtenOf(R"({"version": 2, "description": "a", "looks": [{"color": "#000001"}]})"),
+              plain);
+    EXPECT_EQ(writtenOf(R"({"version": 2, "looks": [{"description": "a", "color": "#000001"}]})"),
+              plain);
+}
+
+TEST(WriteCppText, Stack_IsAFunctionForEachLookAndTheirPlaces) {
+    const std::string text = writtenOf(R"({"version": 2, "description": "all", "looks": [
+        {"description": "low", "color": "#000001"},
+        {"offset": {"x": 3, "y": -2}, "span": "word", "fill": false}]})");
+    EXPECT_NE(text.find("/// low.\n/// For an empty set; VFEffect.h shows how a set paints a run.\n"
+                        "void addLook1(VFontEffect::VFEffect& look) {\n    look.setTextOpacity(1);\n"
+                        "    look.addText(0x000001, 1);\n}\n"),
+              std::string::npos)
+        << text;
+    EXPECT_NE(text.find("void addLook2(VFontEffect::VFEffect& look) {\n    look.setTextOpacity(0);\n"
+                        "    look.addText(0x000000, 0);\n}\n"),
+              std::string::npos)
+        << text;
+    EXPECT_NE(text.find("/// all.\n/// In the order of painting."), std::string::npos) << text;
+    EXPECT_NE(text.find("const AddLookLook addLookLooks[2] = {\n    {addLook1, 0, 0, \"block\"},\n"
+                        "    {addLook2, 3, -2, \"word\"},\n};\n"),
+              std::string::npos)
+        << text;
+    EXPECT_EQ(countOf(text, "void addLook"), 2U);
+}
+
+TEST(WriteCppText, MovedLookOrOneInSpans_TellsItsPlace) {
+    for (const char* place : {R"("offset": {"x": 1})", R"("offset": {"y": 1})", R"("span": "line")"}) {
+        const std::string text = writtenOf(std::string(R"({"version": 2, )") + place + "}");
+        EXPECT_EQ(countOf(text, "AddLookLook addLookLooks[1] = {"), 1U) << text;
+    }
+}
+
+TEST(WriteCppText, ChosenFill_IsThatOfTheTopmostFilledLook) {
+    std::ostringstream out;
+    writeCpp(out, "addLook", parseStyle(R"({"version": 2, "looks": [{}, {}, {"fill": false}]})"),
+             0xABCDEF, 0.5F);
+    EXPECT_EQ(countOf(out.str(), "addText(0xABCDEF, 0.5F)"), 1U) << out.str();
+    EXPECT_LT(out.str().find("void addLook2("), out.str().find("0xABCDEF")) << out.str();
+}
+
+TEST(WriteCppText, WidthOfATile_IsWrittenAsItsScale) {
+    const auto load = [](const std::string&) { return PatternImage{4, 1, std::vector<uint8_t>(16)}; };
+    std::ostringstream out;
+    writeCpp(out, "addLook", parseStyle(R"({"version": 2, "pattern": {"image": "a.png", "width": 10}})"),
+             {}, {}, load);
+    EXPECT_NE(out.str().find("addPatternText(&pattern, 2.5F, 1);"), std::string::npos) << out.str();
+}
+
+/// The message with which the style is refused.
+std::string faultOf(const std::string& json) {
+    std::ostringstream out;
+    try {
+        writeCpp(out, "addLook", parseStyle(json, "a.json"));
+        return "";
+    } catch (const StyleError& error) {
+        return error.what();
+    }
+}
+
+TEST(WriteCppText, LengthsThatAreNotResolved_AreRefused) {
+    EXPECT_EQ(
+        faultOf(R"({"version": 2, "looks": [{}, {"outerGlow": {"size": "4%", "color": "#000000"}}]})"),
+        "style 'a.json': looks[1].outerGlow.size: is a share of the font's size, not in pixels");
+    EXPECT_EQ(faultOf(R"({"version": 2, "looks": [{}, {"offset": {"x": 0.5}}]})"),
+              "style 'a.json': looks[1].offset.x: is no whole number of pixels within 32767");
 }
 
 TEST(WriteCppText, TextFill_KeepsItsPlaceAndIsNotAddedTwice) {
