@@ -115,7 +115,7 @@ def picture_fault(page, picture, folder, paint):
 def page_faults(page, program, paint):
     with tempfile.TemporaryDirectory() as scratch:
         folder = Path(scratch)
-        environment = {**os.environ, "PATH": f"{program.parent}:{os.environ['PATH']}"}
+        environment = {**os.environ, "LC_ALL": "C.UTF-8", "PATH": f"{program.parent}:{os.environ['PATH']}"}
         for block in page.blocks:
             name = file_name(page, block)
             if name:
