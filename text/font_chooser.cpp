@@ -7,23 +7,9 @@
 namespace voreltext {
 namespace {
 
-using vorelunicode::isDefaultIgnorable;
-using vorelunicode::isRegionalIndicator;
-using vorelunicode::isSkinTone;
-using vorelunicode::isSymbol;
-
-bool contains(const Fonts::Cluster& cluster, uint32_t code) {
-    return std::find(cluster.begin(), cluster.end(), code) != cluster.end();
-}
-
-/// Whether a cluster is to be shown in colours: it says so, or it is a flag or made of several
-/// pictographs.
-bool wantsPicture(const Fonts::Cluster& cluster) {
-    if (contains(cluster, vorelunicode::kPicturePresentation)) return true;
-    if (cluster.size() < 2) return false;
-    if (isRegionalIndicator(cluster[0]) && isRegionalIndicator(cluster[1])) return true;
-    return isSymbol(cluster[0]) && (contains(cluster, vorelunicode::kZeroWidthJoiner) ||
-                                    std::any_of(cluster.begin() + 1, cluster.end(), isSkinTone));
+void assign(std::vector<size_t>& fonts, size_t begin, size_t end, size_t font) {
+    std::fill(fonts.begin() + static_cast<ptrdiff_t>(begin), fonts.begin() + static_cast<ptrdiff_t>(end),
+              font);
 }
 
 }  // namespace
@@ -43,7 +29,7 @@ struct FontChooser::Line {
 FontedParagraph FontChooser::choose(const Paragraph& paragraph) {
     Line line(paragraph);
     shape(line);
-    if (preferPictures(line)) shape(line);
+    if (preferPresentations(line)) shape(line);
     // Another font beside it may take a cluster's glyph from it: the passes are counted as well.
     for (size_t pass = 0; pass < mFonts.added().size() + 2 && replaceMissing(line); ++pass)
         shape(line);
@@ -76,35 +62,36 @@ std::vector<FontChooser::Span> FontChooser::spansOf(const Line& line) {
     return merged;
 }
 
-Fonts::Cluster FontChooser::clusterOf(const Line& line, const Span& span) {
+Cluster FontChooser::clusterOf(const Line& line, const Span& span) {
     const auto codes = line.paragraph.codes.begin();
     return {codes + static_cast<ptrdiff_t>(span.begin), codes + static_cast<ptrdiff_t>(span.end)};
 }
 
-/// Gives clusters that want to be pictures to fonts with colours; whether there were any.
-bool FontChooser::preferPictures(Line& line) {
+/// Gives clusters that ask for colours, or for none, to fonts that have them so; whether there were any.
+bool FontChooser::preferPresentations(Line& line) {
     bool hasChanged = false;
     for (const Span& span : spansOf(line)) {
-        const Fonts::Cluster cluster = clusterOf(line, span);
-        if (!wantsPicture(cluster)) continue;
-        const auto isFit = [&](size_t font) {
-            return mFonts[font].isColour() && hasCluster(mFonts[font], cluster);
-        };
-        const std::vector<size_t>& added = mFonts.added();
-        const auto found = std::find_if(added.begin(), added.end(), isFit);
-        std::optional<size_t> font;
-        if (found != added.end()) {
-            font = *found;
-        } else {
-            font = fallbackFor(cluster);
-            if (!font || !isFit(*font)) continue;
-        }
-        if (*font == 0) continue;
-        std::fill(line.result.fonts.begin() + static_cast<ptrdiff_t>(span.begin),
-                  line.result.fonts.begin() + static_cast<ptrdiff_t>(span.end), *font);
+        const Cluster cluster = clusterOf(line, span);
+        const Presentation presentation = presentationOf(cluster);
+        if (presentation == Presentation::any) continue;
+        const auto font = fontFor(cluster, presentation == Presentation::picture);
+        if (!font || *font == 0) continue;
+        assign(line.result.fonts, span.begin, span.end, *font);
         hasChanged = true;
     }
     return hasChanged;
+}
+
+/// The first font with colours, or the first without, that has the cluster.
+std::optional<size_t> FontChooser::fontFor(const Cluster& cluster, bool isColour) {
+    const auto isFit = [&](size_t font) {
+        return mFonts[font].isColour() == isColour && hasCluster(mFonts[font], cluster);
+    };
+    const std::vector<size_t>& added = mFonts.added();
+    const auto found = std::find_if(added.begin(), added.end(), isFit);
+    if (found != added.end()) return *found;
+    const auto fallback = fallbackFor(cluster);
+    return fallback && isFit(*fallback) ? fallback : std::nullopt;
 }
 
 /// Gives clusters that lack a glyph to the next font; whether there were any.
@@ -112,11 +99,10 @@ bool FontChooser::replaceMissing(Line& line) {
     bool hasChanged = false;
     for (const Span& span : spansOf(line)) {
         if (!span.isMissing) continue;
-        size_t& current = line.result.fonts[span.begin];
+        const size_t current = line.result.fonts[span.begin];
         const size_t font = nextFont(clusterOf(line, span), line.tried[span.begin]);
         if (font == current) continue;
-        std::fill(line.result.fonts.begin() + static_cast<ptrdiff_t>(span.begin),
-                  line.result.fonts.begin() + static_cast<ptrdiff_t>(span.end), font);
+        assign(line.result.fonts, span.begin, span.end, font);
         hasChanged = true;
     }
     return hasChanged;
@@ -124,7 +110,7 @@ bool FontChooser::replaceMissing(Line& line) {
 
 /// The first font behind those that were tried which has the cluster; in the end the main one, which
 /// shows its sign for what is missing.
-size_t FontChooser::nextFont(const Fonts::Cluster& cluster, size_t& tried) {
+size_t FontChooser::nextFont(const Cluster& cluster, size_t& tried) {
     const std::vector<size_t>& added = mFonts.added();
     while (tried < added.size()) {
         const size_t font = added[tried++];
@@ -134,7 +120,7 @@ size_t FontChooser::nextFont(const Fonts::Cluster& cluster, size_t& tried) {
     return 0;
 }
 
-std::optional<size_t> FontChooser::fallbackFor(const Fonts::Cluster& cluster) {
+std::optional<size_t> FontChooser::fallbackFor(const Cluster& cluster) {
     const auto known = mFallbacks.find(cluster);
     if (known != mFallbacks.end()) return known->second;
     return mFallbacks[cluster] = mFonts.fallbackFor(cluster);
@@ -145,20 +131,16 @@ void FontChooser::noteMissing(const Line& line) {
         if (!span.isMissing) continue;
         for (size_t i = span.begin; i < span.end; ++i) {
             const uint32_t code = line.paragraph.codes[i];
-            if (!isDefaultIgnorable(code) && !mFonts.main().has(code))
+            if (!vorelunicode::isDefaultIgnorable(code) && !mFonts.main().has(code))
                 noteMissing(code, line.paragraph.begin + i);
         }
     }
 }
 
 void FontChooser::noteMissing(uint32_t code, size_t place) {
-    const auto known = std::find_if(mMissing.begin(), mMissing.end(),
-                                    [&](const MissingCharacter& each) { return each.code == code; });
-    if (known == mMissing.end()) {
-        mMissing.push_back({code, 1, place});
-    } else {
-        ++known->count;
-    }
+    const auto [known, isNew] = mPlaces.emplace(code, mMissing.size());
+    if (isNew) mMissing.push_back({code, 0, place});
+    ++mMissing[known->second].count;
 }
 
 }  // namespace voreltext

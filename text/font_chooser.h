@@ -51,19 +51,21 @@ class FontChooser {
     struct Line;
 
     static std::vector<Span> spansOf(const Line& line);
-    static Fonts::Cluster clusterOf(const Line& line, const Span& span);
+    static Cluster clusterOf(const Line& line, const Span& span);
     void shape(Line& line) const;
-    bool preferPictures(Line& line);
+    bool preferPresentations(Line& line);
+    std::optional<size_t> fontFor(const Cluster& cluster, bool isColour);
     bool replaceMissing(Line& line);
-    size_t nextFont(const Fonts::Cluster& cluster, size_t& tried);
-    std::optional<size_t> fallbackFor(const Fonts::Cluster& cluster);
+    size_t nextFont(const Cluster& cluster, size_t& tried);
+    std::optional<size_t> fallbackFor(const Cluster& cluster);
     void noteMissing(const Line& line);
     void noteMissing(uint32_t code, size_t place);
 
     Fonts& mFonts;
     const Shaper& mShaper;
-    std::map<Fonts::Cluster, std::optional<size_t>> mFallbacks;
+    std::map<Cluster, std::optional<size_t>> mFallbacks;
     std::vector<MissingCharacter> mMissing;
+    std::map<uint32_t, size_t> mPlaces;  ///< of characters in mMissing
 };
 
 }  // namespace voreltext

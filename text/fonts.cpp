@@ -37,7 +37,7 @@ std::optional<size_t> Fonts::opened(const FontFile& file) {
     return mOpened.back().font;
 }
 
-bool hasCluster(const Font& font, const Fonts::Cluster& cluster) {
+bool hasCluster(const Font& font, const Cluster& cluster) {
     return std::all_of(cluster.begin(), cluster.end(), [&](uint32_t code) {
         return vorelunicode::isDefaultIgnorable(code) || font.has(code);
     });

@@ -8,6 +8,7 @@
 #include <utility>
 #include <vector>
 
+#include "text/clusters.h"
 #include "text/font.h"
 
 namespace voreltext {
@@ -16,9 +17,6 @@ namespace voreltext {
 /// the metrics of lines are its alone.
 class Fonts {
   public:
-    /// The characters that are one for the reader: a letter with its marks, a flag.
-    using Cluster = std::vector<uint32_t>;
-
     /// Names a font for a cluster; nothing when there is none.
     using Fallback = std::function<std::optional<FontFile>(const Cluster& cluster)>;
 
@@ -57,6 +55,6 @@ class Fonts {
 };
 
 /// Whether the font has the cluster; marks that show nothing by themselves do not count.
-bool hasCluster(const Font& font, const Fonts::Cluster& cluster);
+bool hasCluster(const Font& font, const Cluster& cluster);
 
 }  // namespace voreltext

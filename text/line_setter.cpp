@@ -83,7 +83,11 @@ SetLine LineSetter::nextLine(const Source& source, size_t begin) const {
 std::optional<SetLine> LineSetter::longestLine(const Source& source, Wrapping::Ends ends,
                                                size_t begin) const {
     const int64_t width = mWidth * kUnit;
+    // About as wide, it may turn out no wider; beyond that a long word would be shaped in vain for each
+    // of its lines.
+    const int64_t atMost = 2 * (width + mFonts.main().sizePx() * kUnit);
     size_t end = source.wrapping.lastFitting(ends, begin, width);
+    if (source.wrapping.width(begin, end) > atMost) return std::nullopt;
     SetLine line = part(source, begin, end);
     while (line.width > width) {
         end = source.wrapping.endBefore(ends, end, begin);
@@ -92,6 +96,7 @@ std::optional<SetLine> LineSetter::longestLine(const Source& source, Wrapping::E
     }
     while (end < source.paragraph.codes.size()) {
         end = source.wrapping.endAfter(ends, end);
+        if (source.wrapping.width(begin, end) > atMost) break;
         SetLine longer = part(source, begin, end);
         if (longer.width > width) break;
         line = std::move(longer);

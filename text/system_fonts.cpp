@@ -1,35 +1,21 @@
 #include "text/system_fonts.h"
 
-#include <fontconfig/fontconfig.h>
-
 #include <algorithm>
 #include <array>
 #include <map>
-#include <memory>
+#include <new>
 #include <sstream>
 #include <string>
 #include <string_view>
 #include <vector>
 
 #include "text/error.h"
+#include "text/font_coverage.h"
+#include "text/fontconfig.h"
+#include "unicode/nearest.h"
 
 namespace voreltext {
 namespace {
-
-template <auto kDestroy>
-struct Destroy {
-    template <typename T>
-    void operator()(T* object) const {
-        kDestroy(object);
-    }
-};
-using FontPattern = std::unique_ptr<FcPattern, Destroy<FcPatternDestroy>>;
-using FontList = std::unique_ptr<FcFontSet, Destroy<FcFontSetDestroy>>;
-using Objects = std::unique_ptr<FcObjectSet, Destroy<FcObjectSetDestroy>>;
-
-const FcChar8* fcText(const std::string& text) {
-    return reinterpret_cast<const FcChar8*>(text.c_str());
-}
 
 /// Names that stand for whatever family the system prefers.
 constexpr std::array<std::string_view, 4> kGenericFamilies{"sans-serif", "sans", "serif", "monospace"};
@@ -51,6 +37,11 @@ bool hasFamily(const FcPattern* font, const FcChar8* family) {
         if (FcStrCmpIgnoreCase(name, family) == 0) return true;
     }
     return false;
+}
+
+/// What the refusal of a misspelt name ends with.
+std::string meant(const std::string& name) {
+    return name.empty() ? "" : "; did you mean '" + name + "'?";
 }
 
 [[noreturn]] void fail(const std::string& request, const std::string& fault) {
@@ -94,6 +85,28 @@ bool isKnown(const std::string& property) {
     return type != nullptr && type->type != FcTypeUnknown;
 }
 
+/// The words that fontconfig knows for weights, widths and slants.
+constexpr std::array<std::string_view, 27> kStyles{
+    "thin",      "extralight",     "ultralight",     "demilight", "semilight",     "light",
+    "book",      "regular",        "medium",         "demibold",  "semibold",      "bold",
+    "extrabold", "ultrabold",      "black",          "heavy",     "roman",         "italic",
+    "oblique",   "ultracondensed", "extracondensed", "condensed", "semicondensed", "semiexpanded",
+    "expanded",  "extraexpanded",  "ultraexpanded"};
+constexpr std::array<std::string_view, 8> kProperties{"style", "weight",  "width",    "slant",
+                                                      "lang",  "spacing", "variable", "color"};
+
+/// The style or property that is meant by a misspelt one, "bold" or "weight=200"; empty without.
+std::string nearestProperty(const std::string& property) {
+    const size_t equals = property.find('=');
+    if (equals == std::string::npos) return vorelunicode::nearest(property, kStyles);
+    const std::string name = vorelunicode::nearest(property.substr(0, equals), kProperties);
+    const std::string value = property.substr(equals + 1);
+    if (name.empty()) return "";
+    if (isKnown(name + "=" + value)) return name + "=" + value;
+    const std::string style = vorelunicode::nearest(value, kStyles);
+    return style.empty() ? "" : name + "=" + style;
+}
+
 /// fontconfig reads past what it does not know, and a regular font would stand for a misspelt bold.
 void refuseWhatIsNotKnown(const std::string& request, const std::vector<std::string>& parts) {
     if (sizeIn(parts.front()) != std::string::npos && !isGeneric(parts.front())) {
@@ -103,7 +116,8 @@ void refuseWhatIsNotKnown(const std::string& request, const std::vector<std::str
     }
     for (size_t i = 1; i < parts.size(); ++i) {
         if (!parts[i].empty() && !isKnown(parts[i])) {
-            fail(request, "'" + parts[i] + "' is no style and no property of fonts");
+            fail(request, "'" + parts[i] + "' is no style and no property of fonts" +
+                              meant(nearestProperty(parts[i])));
         }
     }
 }
@@ -188,10 +202,23 @@ bool hasProperties(FcConfig* config, const FcPattern* wanted, const std::vector<
     return isListed(config, exact.get(), font);
 }
 
+/// The installed family that is meant by a misspelt one; empty without.
+std::string nearestFamily(FcConfig* config, const std::string& family) {
+    const FontPattern any(FcPatternCreate());
+    const Objects objects(FcObjectSetBuild(FC_FAMILY, nullptr));
+    const FontList listed(FcFontList(config, any.get(), objects.get()));
+    std::vector<std::string> families;
+    for (int i = 0; listed && i < listed->nfont; ++i)
+        families.push_back(textOf(listed->fonts[i], FC_FAMILY));
+    std::sort(families.begin(), families.end());
+    return vorelunicode::nearest(family, families);
+}
+
 }  // namespace
 
 struct SystemFonts::Config {
-    std::unique_ptr<FcConfig, Destroy<FcConfigDestroy>> fonts{FcInitLoadConfigAndFonts()};
+    FontConfig fonts{FcInitLoadConfigAndFonts()};
+    FontCoverage coverage{fonts.get()};
 };
 
 SystemFonts::SystemFonts() : mConfig(new Config) {}
@@ -199,31 +226,34 @@ SystemFonts::SystemFonts() : mConfig(new Config) {}
 SystemFonts::~SystemFonts() = default;
 
 FontFile SystemFonts::find(const std::string& request) const {
-    const TextError noSuchFont("no font file or family '" + request + "'");
     const std::vector<std::string> parts = partsOf(request);
     refuseWhatIsNotKnown(request, parts);
     FcConfig* const config = mConfig->fonts.get();
     const FontPattern wanted(FcNameParse(fcText(request)));
-    if (config == nullptr || !wanted) throw noSuchFont;
-    FcChar8* found = nullptr;
-    if (FcPatternGetString(wanted.get(), FC_FAMILY, 0, &found) != FcResultMatch) throw noSuchFont;
-    const std::string family = reinterpret_cast<const char*>(found);
+    const std::string family = wanted ? textOf(wanted.get(), FC_FAMILY) : "";
+    const auto refuse = [&]() {
+        throw TextError("no font file or family '" + request + "'" +
+                        meant(nearestFamily(config, family)));
+    };
+    if (config == nullptr || family.empty()) refuse();
 
     const FontPattern completed(FcPatternDuplicate(wanted.get()));
-    if (!completed) throw noSuchFont;
+    if (!completed) throw std::bad_alloc();
     FcConfigSubstitute(config, completed.get(), FcMatchPattern);
     FcDefaultSubstitute(completed.get());
     FcResult result = FcResultNoMatch;
     const FontPattern font(FcFontMatch(config, completed.get(), &result));
-    if (!font || !hasFamily(font.get(), fcText(family))) throw noSuchFont;
+    if (!font || !hasFamily(font.get(), fcText(family))) refuse();
     if (!hasProperties(config, wanted.get(), {parts.begin() + 1, parts.end()}, font.get())) {
         fail(request, "the family is there, but no face of it is as asked for");
     }
-    FcChar8* file = nullptr;
-    if (FcPatternGetString(font.get(), FC_FILE, 0, &file) != FcResultMatch) throw noSuchFont;
-    int index = 0;
-    FcPatternGetInteger(font.get(), FC_INDEX, 0, &index);
-    return {reinterpret_cast<const char*>(file), index};
+    const FontFile file = fileOf(font.get());
+    if (file.path.empty()) refuse();
+    return file;
+}
+
+std::optional<FontFile> SystemFonts::findFor(const Cluster& cluster, const FontFile& like) const {
+    return mConfig->coverage.find(cluster, like);
 }
 
 }  // namespace voreltext

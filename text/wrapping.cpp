@@ -43,10 +43,10 @@ void Wrapping::measure(const std::vector<ShapedGlyph>& glyphs) {
     }
 }
 
-size_t Wrapping::lastFitting(Ends ends, size_t begin, int64_t width) const {
+size_t Wrapping::lastFitting(Ends ends, size_t begin, int64_t atMost) const {
     size_t fitting = endAfter(ends, begin);
     for (size_t at = fitting; at > begin; at = endAfter(ends, at)) {
-        if (mReach[withoutBlanks(begin, at)] - mReach[begin] > width) break;
+        if (this->width(begin, at) > atMost) break;
         fitting = at;
         if (at + 1 == mReach.size()) break;
     }

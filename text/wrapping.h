@@ -22,12 +22,17 @@ class Wrapping {
     /// Where lines may end: between words, or, in words that are too wide, between all clusters.
     enum class Ends { ofWords, ofClusters };
 
-    /// The last end behind `begin` up to which a part is no wider than `width`, else the first end.
-    size_t lastFitting(Ends ends, size_t begin, int64_t width) const;
+    /// The last end behind `begin` up to which a part is no wider than `atMost`, else the first end.
+    size_t lastFitting(Ends ends, size_t begin, int64_t atMost) const;
 
     /// The end after or before `end`; `end` itself at the end of the line, `begin` where there is none.
     size_t endAfter(Ends ends, size_t end) const;
     size_t endBefore(Ends ends, size_t end, size_t begin) const;
+
+    /// About how wide a part is without the blanks behind it, in 64ths of a pixel.
+    int64_t width(size_t begin, size_t end) const {
+        return mReach[withoutBlanks(begin, end)] - mReach[begin];
+    }
 
     /// The end of a part without the blanks behind it, which are not seen.
     size_t withoutBlanks(size_t begin, size_t end) const { return std::max(begin, mInkEnds[end]); }

@@ -53,9 +53,9 @@ voreltext::FontFile findFont(const std::string& request) {
     return systemFonts().find(request);
 }
 
-std::optional<voreltext::FontFile> findFontFor(const std::vector<uint32_t>& /*cluster*/,
-                                               const voreltext::FontFile& /*main*/) {
-    return std::nullopt;
+std::optional<voreltext::FontFile> findFontFor(const voreltext::Cluster& cluster,
+                                               const voreltext::FontFile& main) {
+    return systemFonts().findFor(cluster, main);
 }
 
 }  // namespace vorelpaint

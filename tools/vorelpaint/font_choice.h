@@ -1,9 +1,7 @@
 #pragma once
 
-#include <cstdint>
 #include <optional>
 #include <string>
-#include <vector>
 
 #include "text/voreltext.h"
 
@@ -15,7 +13,7 @@ voreltext::FontFile findFont(const std::string& request);
 
 /// An installed font that has all characters of a cluster, in a style like that of the main font;
 /// nothing when there is none.
-std::optional<voreltext::FontFile> findFontFor(const std::vector<uint32_t>& cluster,
+std::optional<voreltext::FontFile> findFontFor(const voreltext::Cluster& cluster,
                                                const voreltext::FontFile& main);
 
 }  // namespace vorelpaint

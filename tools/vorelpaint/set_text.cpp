@@ -49,7 +49,7 @@ std::unique_ptr<Fonts> openFonts(const Options& options, int size) {
     for (size_t i = 1; i < options.fonts.size(); ++i)
         fonts->add(Font(findFont(options.fonts[i]), size));
     fonts->setFallback(
-        [main](const std::vector<uint32_t>& cluster) { return findFontFor(cluster, main); });
+        [main](const voreltext::Cluster& cluster) { return findFontFor(cluster, main); });
     return fonts;
 }
 
