@@ -44,7 +44,6 @@ struct LineSetter::Source {
     const Paragraph& paragraph;
     const FontedParagraph& fonted;
     const Wrapping& wrapping;
-    bool isRightToLeft;
 };
 
 LineSetter::LineSetter(Fonts& fonts, const TextSettings& settings)
@@ -57,14 +56,13 @@ LineSetter::LineSetter(Fonts& fonts, const TextSettings& settings)
 void LineSetter::set(const Paragraph& paragraph, const Take& take) {
     FontedParagraph fonted = mChooser.choose(paragraph);
     addLetterSpacing(fonted.glyphs, paragraph.codes, mSpacing);
-    const bool isRtl = isRightToLeft(paragraph);
     const size_t end = paragraph.codes.size();
     if (mWidth == 0 || end == 0) {
-        take(placed(std::move(fonted.glyphs), paragraph, 0, end, isRtl));
+        take(placed(std::move(fonted.glyphs), paragraph, 0, end));
         return;
     }
     const Wrapping wrapping(paragraph, fonted.glyphs);
-    const Source source{paragraph, fonted, wrapping, isRtl};
+    const Source source{paragraph, fonted, wrapping};
     for (size_t begin = 0; begin < end;) {
         SetLine line = nextLine(source, begin);
         begin = line.end - paragraph.begin;
@@ -119,17 +117,18 @@ SetLine LineSetter::part(const Source& source, size_t begin, size_t end) const {
         codes.back() = hyphenOf(mFonts[fonts.back()]).value_or(codes.back());
     }
     std::vector<ShapedGlyph> glyphs =
-        mShaper.shape({codes.data(), fonts.data(), codes.size(), source.isRightToLeft});
+        mShaper.shape({codes.data(), fonts.data(), codes.size(), source.paragraph.isRightToLeft});
     addLetterSpacing(glyphs, codes, mSpacing);
     for (ShapedGlyph& glyph : glyphs)
         glyph.cluster += begin;
-    return placed(std::move(glyphs), source.paragraph, begin, end, source.isRightToLeft);
+    return placed(std::move(glyphs), source.paragraph, begin, end);
 }
 
 /// The line of the glyphs of a part of a source line.
 SetLine LineSetter::placed(std::vector<ShapedGlyph> glyphs, const Paragraph& paragraph, size_t begin,
-                           size_t end, bool isRightToLeft) {
-    SetLine line{std::move(glyphs), 0, paragraph.begin + begin, paragraph.begin + end, isRightToLeft};
+                           size_t end) {
+    SetLine line{std::move(glyphs), 0, paragraph.begin + begin, paragraph.begin + end,
+                 paragraph.isRightToLeft};
     for (ShapedGlyph& glyph : line.glyphs) {
         glyph.cluster += paragraph.begin;
         line.width += glyph.advance;

@@ -50,7 +50,7 @@ class LineSetter {
     std::optional<SetLine> longestLine(const Source& source, Wrapping::Ends ends, size_t begin) const;
     SetLine part(const Source& source, size_t begin, size_t end) const;
     static SetLine placed(std::vector<ShapedGlyph> glyphs, const Paragraph& paragraph, size_t begin,
-                          size_t end, bool isRightToLeft);
+                          size_t end);
 
     const Fonts& mFonts;
     int64_t mSpacing;

@@ -11,13 +11,11 @@ struct Paragraph {
     size_t number;                ///< 1 for the first
     size_t begin;                 ///< where it stands in the text
     std::vector<uint32_t> codes;  ///< its characters, tabs as blanks
+    bool isRightToLeft;           ///< the direction of its first letter that has one (UAX #9, P2 and P3)
 };
 
 /// Cuts a text at its line ends, of which CR LF is one. Throws TextError where it has another control
 /// character.
 std::vector<Paragraph> splitParagraphs(const std::vector<uint32_t>& text);
-
-/// Whether the first letter that has a direction goes from right to left (UAX #9, P2 and P3).
-bool isRightToLeft(const Paragraph& paragraph);
 
 }  // namespace voreltext

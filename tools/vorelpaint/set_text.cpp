@@ -48,8 +48,7 @@ std::unique_ptr<Fonts> openFonts(const Options& options, int size) {
     auto fonts = std::make_unique<Fonts>(Font(main, size, options.variations));
     for (size_t i = 1; i < options.fonts.size(); ++i)
         fonts->add(Font(findFont(options.fonts[i]), size));
-    fonts->setFallback(
-        [main](const voreltext::Cluster& cluster) { return findFontFor(cluster, main); });
+    fonts->setFallback([main](const voreltext::Cluster& cluster) { return findFontFor(cluster, main); });
     return fonts;
 }
 
