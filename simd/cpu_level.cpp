@@ -5,9 +5,10 @@
 #endif
 
 namespace VFontEffect::internal {
-namespace {
 
 #if defined(__x86_64__)
+
+namespace {
 
 bool has(int supported) { return supported != 0; }
 CpuFeatures featuresHere() {
@@ -16,23 +17,7 @@ CpuFeatures featuresHere() {
             has(__builtin_cpu_supports("avx512vl")), has(__builtin_cpu_supports("avx512vnni"))};
 }
 
-#elif defined(__aarch64__)
-
-CpuFeatures featuresHere() {
-    // The dot product's bit in the Linux kernel's first word of CPU features.
-    constexpr unsigned long kDotProduct = 1UL << 20;
-    return {(getauxval(AT_HWCAP) & kDotProduct) != 0};
-}
-
-#else
-
-CpuFeatures featuresHere() { return {}; }
-
-#endif
-
 }  // namespace
-
-#if defined(__x86_64__)
 
 bool suffices(const CpuFeatures& features, CpuLevel level) {
     switch (level) {
@@ -48,11 +33,27 @@ bool suffices(const CpuFeatures& features, CpuLevel level) {
 
 #elif defined(__aarch64__)
 
+namespace {
+
+CpuFeatures featuresHere() {
+    // The dot product's bit in the Linux kernel's first word of CPU features.
+    constexpr unsigned long kDotProduct = 1UL << 20;
+    return {(getauxval(AT_HWCAP) & kDotProduct) != 0};
+}
+
+}  // namespace
+
 bool suffices(const CpuFeatures& features, CpuLevel level) {
     return level != CpuLevel::dotprod || features.dotProducts;
 }
 
 #else
+
+namespace {
+
+CpuFeatures featuresHere() { return {}; }
+
+}  // namespace
 
 bool suffices(const CpuFeatures& /*features*/, CpuLevel /*level*/) { return true; }
 

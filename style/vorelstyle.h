@@ -5,6 +5,7 @@
 #include "style/json_object.h"
 #include "style/key_text.h"
 #include "style/look.h"
+#include "style/markup.h"
 #include "style/message.h"
 #include "style/nearest.h"
 #include "style/pattern_image.h"

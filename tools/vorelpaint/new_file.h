@@ -15,8 +15,7 @@ class NewFile {
     enum class Kind { unnamed, named };
 
     /// A replaced file's permissions stay, and its owner and group where the process may give files
-    /// away. A named one is made where an unnamed one was asked for and
-    /// cannot be had. Throws ToolError.
+    /// away. A named one is made where an unnamed one was asked for and cannot be had. Throws ToolError.
     explicit NewFile(std::filesystem::path target, Kind kind = Kind::unnamed);
 
     ~NewFile();
