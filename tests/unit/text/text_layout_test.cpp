@@ -419,9 +419,7 @@ TEST_F(MadeLayoutTest, LetterSpacing_CountsForTheWidth) {
 }
 
 TEST_F(MadeLayoutTest, SoftHyphen_IsSeenWhereALineEndsWithIt) {
-    const std::string word =
-        "ab\xC2\xAD"
-        "cd";
+    const std::string word = "ab\u00ADcd";
     EXPECT_EQ(layOut(word).glyphCount(), 4U);
     EXPECT_EQ(layOut(word).lines()[0].box.width(), 40) << "elsewhere it is nothing";
     const TextLayout broken = layOut(word, wrappedAt(25));
@@ -433,7 +431,7 @@ TEST_F(MadeLayoutTest, SoftHyphen_IsSeenWhereALineEndsWithIt) {
     const TextLayout narrow = layOut(word, wrappedAt(24));
     EXPECT_EQ(narrow.lines()[0].end, 2U);
     EXPECT_EQ(narrow.glyphCount(), 4U) << "without room for a hyphen, the word is broken like any";
-    const TextLayout last = layOut("ab\xC2\xAD", wrappedAt(25));
+    const TextLayout last = layOut("ab\u00AD", wrappedAt(25));
     EXPECT_EQ(last.glyphCount(), 2U) << "none at the end of the text";
 }
 
@@ -441,22 +439,14 @@ TEST_F(MadeLayoutTest, WithoutAHyphen_TheSoftOneStaysUnseen) {
     MadeFont made = letters();
     made.glyphs.erase(made.glyphs.end() - 2);
     mFonts = Fonts{openMade(made)};
-    const TextLayout broken = layOut(
-        "ab\xC2\xAD"
-        "cd",
-        wrappedAt(20));
+    const TextLayout broken = layOut("ab\u00ADcd", wrappedAt(20));
     EXPECT_EQ(broken.lines().size(), 2U);
     EXPECT_EQ(broken.glyphCount(), 4U);
     EXPECT_TRUE(broken.missing().empty());
 }
 
 TEST_F(MadeLayoutTest, ZeroWidthSpace_AllowsABreak) {
-    EXPECT_EQ(layOut("abc\xE2\x80\x8B"
-                     "def",
-                     wrappedAt(45))
-                  .lines()[0]
-                  .end,
-              4U);
+    EXPECT_EQ(layOut("abc\u200Bdef", wrappedAt(45)).lines()[0].end, 4U);
     EXPECT_EQ(layOut("abcdef", wrappedAt(45)).lines()[0].end, 4U) << "else between any";
 }
 

@@ -65,11 +65,7 @@ TEST(Wrapping, Cluster_IsNotCut) {
 
 TEST(Wrapping, SoftHyphen_PartsALigature) {
     const std::vector<ShapedGlyph> glyphs{{1, 0, 0, 30, 0, 0}};
-    const Wrapping wrapping({1, 0,
-                             decodeUtf8("f\xC2\xAD"
-                                        "i"),
-                             false},
-                            glyphs);
+    const Wrapping wrapping({1, 0, decodeUtf8("f\u00ADi"), false}, glyphs);
     EXPECT_EQ(wrapping.endAfter(Ends::ofWords, 0), 2U);
     EXPECT_EQ(wrapping.endAfter(Ends::ofClusters, 0), 3U);
 }
