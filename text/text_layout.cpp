@@ -67,7 +67,8 @@ void checkPicture(const GlyphInk& ink) {
 Box boxOf(const Font& main, int64_t left, int64_t width, int64_t baseline, int64_t advance) {
     const int64_t leading = advance - (main.ascender() - main.descender());
     const int top = floorToPixel(-baseline - main.ascender()) - floorToPixel(leading / 2);
-    return {floorToPixel(left), top, ceilToPixel(left + width), top + floorToPixel(advance)};
+    return {floorToPixel(left), top, ceilToPixel(left + std::max<int64_t>(width, 0)),
+            top + floorToPixel(advance)};
 }
 
 /// For each character which word it is of; those between words count to the one before.

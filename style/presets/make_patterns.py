@@ -52,8 +52,8 @@ def stripes(size):
 
 
 def tiles(size):
-    """Four glazed squares in pale joints. The joints lie beside the multiples of 8 pixels, the only ones
-    that are seen of a tile made eight times smaller: without them small tiles are brighter."""
+    """Four glazed squares in pale joints. The joints lie beside the multiples of 6 pixels, the only ones
+    that are seen of a tile made six times smaller: small tiles keep their glaze."""
     half, joint = size // 2, size // 16
     glazes = ((38, 132, 176), (120, 200, 206), (246, 200, 92), (38, 132, 176))
 
@@ -106,7 +106,7 @@ def main():
     write_png(here / "halftone.png", 16, halftone(16))
     write_png(here / "spray.png", 96, spray(96))
     write_png(here / "stripes.png", 32, stripes(32))
-    write_png(here / "tiles.png", 64, tiles(64))
+    write_png(here / "tiles.png", 48, tiles(48))
 
 
 if __name__ == "__main__":
