@@ -3,19 +3,13 @@
 #include <fribidi.h>
 
 #include <new>
-#include <string>
 
 #include "text/error.h"
-#include "unicode/characters.h"
+#include "unicode/lines.h"
 #include "unicode/utf8.h"
 
 namespace voreltext {
 namespace {
-
-[[noreturn]] void refuseControl(uint32_t code, size_t line, size_t character) {
-    throw TextError("the text has the control character " + vorelunicode::nameOf(code) + " in line " +
-                    std::to_string(line) + ", character " + std::to_string(character));
-}
 
 /// FriBidi tells it along with the levels alone: its question for the direction looks into isolates too.
 bool isRightToLeft(const std::vector<uint32_t>& codes) {
@@ -40,12 +34,13 @@ std::vector<Paragraph> splitParagraphs(const std::vector<uint32_t>& text) {
     for (size_t at = 0; at < text.size(); ++at) {
         const uint32_t code = text[at];
         std::vector<uint32_t>& codes = paragraphs.back().codes;
-        if (vorelunicode::isLineEnd(code)) {
+        if (vorelunicode::endsLine(code)) {
             const bool isTwo = code == '\r' && at + 1 < text.size() && text[at + 1] == '\n';
             if (isTwo) ++at;
             paragraphs.push_back({paragraphs.size() + 1, at + 1, {}, false});
         } else if (vorelunicode::isControl(code) && code != '\t') {
-            refuseControl(code, paragraphs.back().number, codes.size() + 1);
+            throw TextError("the text has the control character " + vorelunicode::nameOf(code) + " in " +
+                            vorelunicode::placeName(text, at));
         } else {
             codes.push_back(code == '\t' ? ' ' : code);
         }

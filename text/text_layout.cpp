@@ -12,12 +12,13 @@
 #include "text/rasteriser.h"
 #include "text/units.h"
 #include "unicode/characters.h"
+#include "unicode/lines.h"
 
 namespace voreltext {
 namespace {
 
+using vorelunicode::endsLine;
 using vorelunicode::isBlank;
-using vorelunicode::isLineEnd;
 
 /// A font may step backwards as well as forwards.
 void checkSide(int64_t units) {
@@ -67,7 +68,8 @@ void checkPicture(const GlyphInk& ink) {
 Box boxOf(const Font& main, int64_t left, int64_t width, int64_t baseline, int64_t advance) {
     const int64_t leading = advance - (main.ascender() - main.descender());
     const int top = floorToPixel(-baseline - main.ascender()) - floorToPixel(leading / 2);
-    return {floorToPixel(left), top, ceilToPixel(left + width), top + floorToPixel(advance)};
+    return {floorToPixel(left), top, ceilToPixel(left + std::max<int64_t>(width, 0)),
+            top + floorToPixel(advance)};
 }
 
 /// For each character which word it is of; those between words count to the one before.
@@ -77,7 +79,7 @@ std::vector<size_t> wordsOf(const std::vector<uint32_t>& text) {
     size_t begun = 0;
     bool isWithin = false;
     for (const uint32_t code : text) {
-        const bool isGap = isBlank(code) || isLineEnd(code);
+        const bool isGap = isBlank(code) || endsLine(code);
         if (!isGap && !isWithin) ++begun;
         isWithin = !isGap;
         words.push_back(begun == 0 ? 0 : begun - 1);

@@ -1,5 +1,5 @@
 #!/usr/bin/python3
-"""Paints the pictures of the guide, the effect pages and the README: paint.py VORELPAINT FOLDER."""
+"""Paints the strips of pictures of the documents: paint.py VORELPAINT FOLDER."""
 
 import copy
 import json
@@ -9,6 +9,7 @@ from pathlib import Path
 from PIL import Image
 
 from strips import Cell, Strip, paint_strips
+from tool_pages import TOOL_PAGES
 
 PRESETS = Path(__file__).resolve().parents[2] / "style" / "presets"
 
@@ -339,7 +340,7 @@ README = [
 ]
 
 STRIPS = (SIGNS + README + GUIDE + TEXT_FILL + STROKES + OUTER_SHADOWS + INNER_SHADOWS + OUTER_GLOWS
-          + INNER_GLOWS + LINEAR_GRADIENTS + RADIAL_GRADIENTS + PATTERNS_SWEPT)
+          + INNER_GLOWS + LINEAR_GRADIENTS + RADIAL_GRADIENTS + PATTERNS_SWEPT + TOOL_PAGES)
 
 
 def main(program, folder):

@@ -49,11 +49,12 @@ Note noteTaker(const Options& options, const Note& note) {
 Composition::Composition(const Options& options, const Note& note)
     : mSource(chosenText(options)),
       mText(setToFit(options, mSource.text)),
-      mLooks(options, chosenStyle(options), mText.size(), mSource.colours, note),
+      mLooks(options, chosenStyle(options), mText.size(), mSource.colours, mNotes.taker()),
       mMargins(marginsOf(mLooks.layers())),
       mCanvas(placedOn(options.canvas, mText.box(), mMargins)) {
-    noteMissing(mText.layout(), mSource.text, note);
-    noteCut(mCanvas, mText.layout().inkBox(), mMargins, note);
+    noteMissing(mText.layout(), mSource.text, mNotes.taker());
+    noteCut(mCanvas, mText.layout().inkBox(), mMargins, mNotes.taker());
+    mNotes.giveTo(note);
 }
 
 Image Composition::paint() const {

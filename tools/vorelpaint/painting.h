@@ -17,6 +17,7 @@ Note noteTaker(const Options& options, const Note& note);
 /// A picture before it is painted: a text in its fonts, its looks, and the canvas on which they meet.
 class Composition {
   public:
+    /// Notes are taken when there is nothing more that it could fail for: a fault stands alone.
     Composition(const Options& options, const Note& note);
 
     const std::vector<uint32_t>& source() const { return mSource.text; }  ///< without markup
@@ -28,6 +29,7 @@ class Composition {
     voreltext::Image paint() const;
 
   private:
+    HeldNotes mNotes;
     vorelstyle::MarkedText mSource;
     SetText mText;
     LayerSet mLooks;

@@ -28,13 +28,6 @@ TEST(Characters, Blank_SeparatesWords) {
         EXPECT_FALSE(isBlank(code)) << "no line may end at it, or it has no width: " << code;
 }
 
-TEST(Characters, LineEnds_AreFiveCharacters) {
-    size_t count = 0;
-    for (uint32_t code = 0; code <= 0x10FFFF; ++code)
-        count += isLineEnd(code) ? 1 : 0;
-    EXPECT_EQ(count, 5U) << "LF, CR, NEL, LS, PS; CR LF is two of them";
-}
-
 TEST(Characters, Pictures_AreSymbols) {
     for (uint32_t code = 0; code <= 0x10FFFF; ++code) {
         // The watch and its kin stand among technical signs, which are symbols as well.
