@@ -42,16 +42,31 @@ Layer layerOf(const StackedLook& stacked) {
     return layer;
 }
 
-/// The effect of a look that leaves nothing to be seen of the fill; empty when there is none.
-std::string coverOf(const LookStyle& look) {
-    for (const Effect& effect : look.effects) {
-        const auto* linear = std::get_if<vorelstyle::LinearGradient>(&effect);
-        const auto* radial = std::get_if<vorelstyle::RadialGradient>(&effect);
-        const bool covers = (linear != nullptr && linear->opacity >= 1.0F) ||
-                            (radial != nullptr && radial->opacity >= 1.0F);
-        if (covers) return std::string(effectName(effect));
+/// Whether an effect may leave nothing to be seen of the fill.
+struct CoversFill {
+    static bool isOpaque(float opacity, const vorelstyle::Stops& stops) {
+        return opacity >= 1.0F && std::all_of(stops.begin(), stops.end(),
+                                              [](const auto& stop) { return stop.mOpacity >= 1.0F; });
     }
-    return "";
+    bool operator()(const vorelstyle::LinearGradient& e) const {
+        return isOpaque(e.opacity, e.gradient);
+    }
+    bool operator()(const vorelstyle::RadialGradient& e) const {
+        return isOpaque(e.opacity, e.gradient);
+    }
+    bool operator()(const vorelstyle::Pattern& e) const { return e.opacity >= 1.0F; }
+    template <typename Other>
+    bool operator()(const Other& /*effect*/) const {
+        return false;
+    }
+};
+
+/// The first effect of a look that covers its fill; empty when there is none.
+std::string coverOf(const LookStyle& look) {
+    const auto cover = std::find_if(look.effects.begin(), look.effects.end(), [](const Effect& effect) {
+        return std::visit(CoversFill(), effect);
+    });
+    return cover == look.effects.end() ? "" : std::string(effectName(*cover));
 }
 
 }  // namespace
