@@ -122,6 +122,16 @@ TEST(Canvas, Shrink_FindsTheLargestSizeThatFits) {
     EXPECT_GT(widthAt(size + 1), 300);
 }
 
+TEST(Canvas, Shrink_TakesATextThatCouldNotBeSetInItsOwnSize) {
+    const std::string wide(400, 'm');
+    EXPECT_NE(faultOf({wide}).find("more than 16384 pixels wide"), std::string::npos);
+    const Json report = reported({"--width", "3000", "--fit", "shrink", wide});
+    EXPECT_GT(report["size"], 1);
+    EXPECT_LT(report["size"], 10);
+    EXPECT_EQ(faultOf({"--width", "3000", "--fit", "shrink", "one\ntwo\033"}),
+              "vorelpaint: the text has the control character U+001B in line 2, character 4\n");
+}
+
 TEST(Canvas, TextThatFits_IsNotShrunk) {
     EXPECT_EQ(reported({"--width", "3000", "--fit", "shrink", "Hi"})["size"], 96);
 }

@@ -1,7 +1,6 @@
 #include "layer_set.h"
 
 #include <algorithm>
-#include <map>
 #include <optional>
 #include <string>
 #include <variant>
@@ -13,7 +12,6 @@ namespace {
 
 using vorelstyle::ColourRange;
 using vorelstyle::Effect;
-using vorelstyle::Look;
 using vorelstyle::LookStyle;
 using vorelstyle::Stack;
 using vorelstyle::StackedLook;
@@ -103,20 +101,13 @@ void LayerSet::addColours(const Options& options, const std::vector<ColourRange>
         return;
     }
     const LookStyle& look = mStyle.looks[*top];
-    const float opacity = textPaintOf(mStyle, *top, options.color, options.opacity).opacity;
-    layer.pictureOpacity = opacity;
+    layer.pictureOpacity = textPaintOf(mStyle, *top, options.color, options.opacity).opacity;
     if (!colours.empty() && !coverOf(look).empty()) {
         note("the look's " + coverOf(look) + " covers the colours of the markup");
     }
-    std::map<uint32_t, const Look*> looks;
-    for (const ColourRange& range : colours) {
-        const Look*& coloured = looks[range.colour];
-        if (coloured == nullptr) {
-            mColoured.push_back(std::make_unique<Look>(look, range.colour, opacity, imagesOf(mStyle)));
-            coloured = mColoured.back().get();
-        }
-        layer.exchanges.push_back({range.begin, range.end, &coloured->effects()});
-    }
+    layer.fillOpacity = mStack->looks()[*top].look.fillOpacity();
+    for (const ColourRange& range : colours)
+        layer.colours.push_back({range.begin, range.end, range.colour});
 }
 
 }  // namespace vorelpaint
