@@ -263,6 +263,28 @@ TEST(Strict, MissingCharacter_IsAnError) {
         "painted\n");
 }
 
+TEST(Notes, FaultStandsAlone) {
+    const TempDir dir;
+    const auto linesOf = [](const Words& arguments) {
+        const Outcome outcome = runVorelpaint(arguments);
+        EXPECT_EQ(outcome.exitCode, 2);
+        return std::count(outcome.err.begin(), outcome.err.end(), '\n');
+    };
+    const std::string missing = "a\xF0\x93\x80\x80";
+    EXPECT_EQ(linesOf({"-o", dir.file("none/a.png"), missing}), 1) << "what cannot be written";
+    EXPECT_EQ(linesOf({"--sheet", "-o", dir.file("none/a.png"), missing}), 1);
+    const std::string style = dir.write("a.json", R"({"version": 2, "looks": [
+        {"stroke": {"size": "40%", "color": "#000", "position": "outside"}},
+        {"pattern": {"image": "none.png"}}]})");
+    EXPECT_EQ(linesOf({"--style", style, "--size", "300", "--print-key"}), 1) << "and no text";
+    const std::string glow = dir.write("b.json", R"({"outerGlow": {"size": 100, "color": "#000"}})");
+    EXPECT_EQ(linesOf({"--style", glow, "--size", "23", "--width", "900", "--height", "900", "-o",
+                       dir.file("a.png"), missing + std::string(720, 'm')}),
+              1)
+        << "what is too large with its effects";
+    EXPECT_EQ(dir.list(), (Words{"a.json", "b.json"}));
+}
+
 TEST(Strict, Batch_FailsTheJobAlone) {
     const TempDir dir;
     const std::string jobs = dir.write(
