@@ -353,6 +353,19 @@ TEST(Markup, CoveredByAGradient_IsNoted) {
               "vorelpaint: note: the look's linearGradient covers the colours of the markup\n");
 }
 
+TEST(Markup, UnderATranslucentGradient_IsSeen) {
+    const TempDir dir;
+    const std::string style = dir.write("g.json", R"({"radialGradient": {"gradient": [
+        {"color": "#00F", "location": 0}, {"color": "#00F", "location": 1, "opacity": 0.5}]}})");
+    const Words look{"--markup", "--style", style};
+    const auto of = [&](const char* text) {
+        Words words = look;
+        words.emplace_back(text);
+        return painted(dir, words).pixels;
+    };
+    EXPECT_NE(of("a <c #f80>b</c>"), of("a b"));
+}
+
 // --- stacks -------------------------------------------------------------------------------------------
 
 constexpr const char* kStack = R"({"version": 2, "looks": [

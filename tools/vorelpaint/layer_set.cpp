@@ -40,14 +40,21 @@ Layer layerOf(const StackedLook& stacked) {
     return layer;
 }
 
+template <typename Gradient>
+bool isOpaque(const Effect& effect) {
+    const auto* gradient = std::get_if<Gradient>(&effect);
+    return gradient != nullptr && gradient->opacity >= 1.0F &&
+           std::all_of(gradient->gradient.begin(), gradient->gradient.end(),
+                       [](const VFontEffect::VFGradient& stop) { return stop.mOpacity >= 1.0F; });
+}
+
 /// The effect of a look that leaves nothing to be seen of the fill; empty when there is none.
 std::string coverOf(const LookStyle& look) {
     for (const Effect& effect : look.effects) {
-        const auto* linear = std::get_if<vorelstyle::LinearGradient>(&effect);
-        const auto* radial = std::get_if<vorelstyle::RadialGradient>(&effect);
-        const bool covers = (linear != nullptr && linear->opacity >= 1.0F) ||
-                            (radial != nullptr && radial->opacity >= 1.0F);
-        if (covers) return std::string(effectName(effect));
+        if (isOpaque<vorelstyle::LinearGradient>(effect) ||
+            isOpaque<vorelstyle::RadialGradient>(effect)) {
+            return std::string(effectName(effect));
+        }
     }
     return "";
 }
