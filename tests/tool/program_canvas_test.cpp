@@ -256,6 +256,18 @@ TEST(Report, Batch_HasALineForEachJob) {
     EXPECT_EQ(Json::parse(outcome.out.substr(end))["size"], 20);
 }
 
+TEST(Report, Batch_DoesNotMixWithAPicture) {
+    const TempDir dir;
+    const std::string jobs = dir.write("jobs.jsonl", R"({"text": "A", "output": "/dev/stdout"})");
+    const Outcome outcome = runVorelpaint({"--batch", jobs, "--report", "json"});
+    EXPECT_EQ(outcome.exitCode, 2);
+    EXPECT_EQ(outcome.out, "");
+    EXPECT_EQ(outcome.err,
+              "vorelpaint: line 1: standard output cannot take both the picture and what is printed\n"
+              "vorelpaint: 1 of 1 jobs failed\n");
+    EXPECT_EQ(runVorelpaint({"--batch", jobs}).out.substr(1, 3), "PNG");
+}
+
 TEST(Strict, MissingCharacter_IsAnError) {
     EXPECT_EQ(
         faultOf({"--strict", "a\xF0\x93\x80\x80"}),
