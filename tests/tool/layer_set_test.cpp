@@ -23,7 +23,7 @@ Options optionsOf(const std::string& style, const std::string& text) {
 
 /// The most memory that painting takes at one time.
 size_t mostMemoryOf(const Options& options) {
-    const Composition composition(options, [](const std::string&) {});
+    const Composition composition(options);
     const MemoryMeter meter;
     composition.paint();
     return meter.peak();

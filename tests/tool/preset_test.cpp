@@ -40,7 +40,9 @@ Image painted(Style style, int size) {
     options.canvas.width = 3 * size;
     options.canvas.height = 2 * size;
     options.inlineStyle = std::move(style);
-    return Composition(options, failOn).paint();
+    const Composition composition(options);
+    composition.notes().giveTo(failOn);
+    return composition.paint();
 }
 
 /// Whether the style paints other pixels than the one that lacks a part of it.

@@ -179,7 +179,7 @@ void paintSheet(const Options& options, const Note& note) {
     const Grid grid = gridOf(columns, options.canvas.padding);
 
     Image sheet = voreltext::transparentImage(grid.left(grid.columns), grid.rows * grid.height());
-    notes.giveTo(noteTaker(options, note));
+    if (options.strict) notes.refuse();
     CellPainter painter(sheet, options);
     const size_t count = columns.front().cells.size();
     Progress progress("pictures", count * columns.size());
@@ -192,6 +192,7 @@ void paintSheet(const Options& options, const Note& note) {
         progress.advance();
     }
     writePicture(options, std::move(sheet));
+    notes.giveTo(note);
 }
 
 }  // namespace vorelpaint
