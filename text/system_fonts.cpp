@@ -246,7 +246,7 @@ FontFile SystemFonts::find(const std::string& request) const {
     if (!hasProperties(config, wanted.get(), {parts.begin() + 1, parts.end()}, font.get())) {
         fail(request, "the family is there, but no face of it is as asked for");
     }
-    const FontFile file = fileOf(font.get());
+    FontFile file = fileOf(font.get());
     if (file.path.empty()) refuse();
     return file;
 }

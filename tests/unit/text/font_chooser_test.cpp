@@ -73,7 +73,7 @@ TEST_F(FontChooserTest, GivenFonts_ComeBeforeTheFallback) {
 TEST_F(FontChooserTest, WhatNobodyHas_StaysWithTheMainFont) {
     mFonts.add(fontOf("d"));
     EXPECT_EQ(chosen("xdy"), (Indices{0, 1, 0}));
-    mChooser.choose({2, 10, decodeUtf8("ayx"), false});
+    mChooser.choose(splitParagraphs(decodeUtf8("0123456789\nayx"))[1]);
     ASSERT_EQ(mChooser.missing().size(), 2U);
     const MissingCharacter x = mChooser.missing()[0];
     const MissingCharacter y = mChooser.missing()[1];
@@ -101,7 +101,7 @@ TEST_F(FontChooserTest, AskedForColours_AFontWithColoursIsPreferred) {
     Fonts fonts{fontOf("a❤👍🏽")};
     fonts.add(fontOf("❤"));
     fonts.add(fontOf("❤👍🏽", true));
-    const Shaper shaper(fonts, {});
+    Shaper shaper(fonts, {});
     FontChooser chooser(fonts, shaper);
     const auto chosen = [&](const char* text) {
         return chooser.choose(splitParagraphs(decodeUtf8(text)).front()).fonts;
@@ -116,7 +116,7 @@ TEST_F(FontChooserTest, AskedForColours_AFontWithColoursIsPreferred) {
 TEST_F(FontChooserTest, AskedForNoColours_AFontWithoutIsPreferred) {
     Fonts fonts{fontOf("a❤", true)};
     fonts.add(fontOf("❤"));
-    const Shaper shaper(fonts, {});
+    Shaper shaper(fonts, {});
     FontChooser chooser(fonts, shaper);
     EXPECT_EQ(chooser.choose(splitParagraphs(decodeUtf8("❤❤\uFE0E")).front()).fonts, (Indices{0, 1, 1}));
 }
@@ -124,7 +124,7 @@ TEST_F(FontChooserTest, AskedForNoColours_AFontWithoutIsPreferred) {
 TEST_F(FontChooserTest, FallbackWithoutColours_IsNotPreferred) {
     Fonts fonts{fontOf("❤")};
     fonts.setFallback([](const Cluster&) { return FontFile{VOREL_TEST_FONT}; });
-    const Shaper shaper(fonts, {});
+    Shaper shaper(fonts, {});
     FontChooser chooser(fonts, shaper);
     EXPECT_EQ(chooser.choose(splitParagraphs(decodeUtf8("❤\uFE0F")).front()).fonts, (Indices{0, 0}));
 }

@@ -109,12 +109,14 @@ TEST(PlainLayout, Glyphs_StandInTheirOrderAndPlace) {
 }
 
 TEST(PlainLayout, RandomTexts_StandInPlaceToo) {
-    constexpr uint32_t kCodes[]{'a',    'b',    ' ',    '1',    '(',    ')',    '!',    '\n',
-                                0x5D0,  0x5D1,  0x627,  0x628,  0x64E,  0x200D, 0x200E, 0x200F,
-                                0x202B, 0x202A, 0x202E, 0x202C, 0x2066, 0x2067, 0x2068, 0x2069};
+    constexpr uint32_t kCodes[]{
+        'a',    'b',    ' ',    '1',    '(',    ')',    '!',    '\n',   0x5D0,  0x5D1,  0x627,  0x628,
+        0x64E,  0x661,  0x301,  0x3B1,  0x905,  0x915,  0x93F,  0x94D,  0xE01,  0xE33,  0x4E00, 0x1F600,
+        0xAB,   0xBB,   0x201C, 0x201D, 0x300C, 0x300D, '[',    ']',    0xA0,   0xAD,   0x200B, 0x200C,
+        0x200D, 0x200E, 0x200F, 0x202B, 0x202A, 0x202E, 0x202C, 0x2066, 0x2067, 0x2068, 0x2069, 0xFE0F};
     Fonts fonts{Font(FontFile{VOREL_TEST_FONT}, 24)};
     vorel_test::Random random(5);
-    for (int round = 0; round < 400; ++round) {
+    for (int round = 0; round < 1000; ++round) {
         std::vector<uint32_t> text;
         for (int i = random.between(0, 20); i > 0; --i)
             text.push_back(kCodes[random.next() % std::size(kCodes)]);

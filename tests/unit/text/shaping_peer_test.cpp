@@ -65,7 +65,8 @@ std::vector<ShapedGlyph> ownGlyphs(const Case& each) {
     std::vector<std::string> features;
     if (*each.features != '\0') features.emplace_back(each.features);
     return Shaper(fonts, features)
-        .shape({line.codes.data(), main.data(), line.codes.size(), line.isRightToLeft});
+        .shape({line.codes.data(), main.data(), line.scripts.data(), line.levels.data(),
+                line.codes.size(), line.isRightToLeft});
 }
 
 class ShapingPeer : public ::testing::Test {

@@ -483,6 +483,28 @@ TEST_F(TextLayoutTest, LatinAmongHebrew_IsBrokenAtItsEnd) {
     EXPECT_EQ(text.lines()[0].end, 9U) << "abc is in the first line, though def stands left of it";
 }
 
+TEST_F(TextLayoutTest, HyphenOfALatinWord_StandsAtItsRight) {
+    TextSettings settings;
+    settings.wrapWidth = layOut("אב abc-").lines()[0].box.width();
+    const TextLayout text(mFonts, decodeUtf8("אב abc\u00ADdef"), settings);
+    ASSERT_EQ(text.lines().size(), 2U);
+    std::vector<size_t> clusters;
+    for (size_t i = 0; i < 6; ++i)
+        clusters.push_back(text.glyph(i).cluster);
+    EXPECT_EQ(clusters, (std::vector<size_t>{3, 4, 5, 6, 1, 0})) << "abc- and then the Hebrew word";
+}
+
+TEST_F(TextLayoutTest, OverriddenDirection_GoesOnInTheNextLine) {
+    TextSettings settings;
+    settings.wrapWidth = layOut("abc").lines()[0].box.width();
+    const TextLayout text(mFonts, decodeUtf8("\u202Eabc def\u202C"), settings);
+    ASSERT_EQ(text.lines().size(), 2U);
+    std::vector<size_t> clusters;
+    for (size_t i = 0; i < text.glyphCount(); ++i)
+        clusters.push_back(text.glyph(i).cluster);
+    EXPECT_EQ(clusters, (std::vector<size_t>{3, 2, 1, 7, 6, 5}));
+}
+
 TEST_F(TextLayoutTest, LetterSpacing_PartsLigatures) {
     TextSettings spaced = spacedBy(64);
     EXPECT_EQ(layOut("ffi").glyphCount(), 1U);

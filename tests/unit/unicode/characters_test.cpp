@@ -7,9 +7,9 @@ namespace {
 
 TEST(Characters, Ranges_HoldTheirEnds) {
     constexpr CodeRange kRanges[]{{3, 5}, {9, 9}};
-    for (const uint32_t code : {3, 4, 5, 9})
+    for (const uint32_t code : {3U, 4U, 5U, 9U})
         EXPECT_TRUE(isIn(code, kRanges)) << code;
-    for (const uint32_t code : {0, 2, 6, 8, 10})
+    for (const uint32_t code : {0U, 2U, 6U, 8U, 10U})
         EXPECT_FALSE(isIn(code, kRanges)) << code;
 }
 
