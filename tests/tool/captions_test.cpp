@@ -21,7 +21,9 @@ Options optionsOf(const std::string& text, const std::string& style = "{}") {
 }
 
 Composition composed(const Options& options) {
-    return Composition(options, [](const std::string& note) { ADD_FAILURE() << note; });
+    Composition composition(options);
+    composition.notes().giveTo([](const std::string& note) { ADD_FAILURE() << note; });
+    return composition;
 }
 
 std::vector<uint8_t> alphasOf(const Image& image) {
@@ -71,8 +73,9 @@ TEST(Captions, WrappedBeyondTheHeight_IsCutOffWithANote) {
     options.canvas.width = 300;
     options.canvas.height = 120;
     options.fit = Fit::wrap;
+    const Composition wrapped(options);
     std::vector<std::string> notes;
-    const Composition wrapped(options, [&](const std::string& note) { notes.push_back(note); });
+    wrapped.notes().giveTo([&](const std::string& note) { notes.push_back(note); });
     EXPECT_GT(wrapped.text().layout().lines().size(), 2U);
     EXPECT_EQ(wrapped.canvas().height, 120);
     ASSERT_EQ(notes.size(), 1U);
