@@ -94,6 +94,9 @@ TEST_F(FontChooserTest, MissingCharacter_OfAClusterIsNamedAlone) {
     chosen("a\u0326");
     ASSERT_EQ(mChooser.missing().size(), 1U);
     EXPECT_EQ(mChooser.missing()[0].code, 0x326U);
+    chosen("x\u200D");
+    ASSERT_EQ(mChooser.missing().size(), 2U) << "not what joins";
+    EXPECT_EQ(mChooser.missing()[1].code, uint32_t{'x'});
     EXPECT_EQ(mChooser.missing()[0].first, 1U);
 }
 

@@ -64,7 +64,7 @@ TEST(Shaper, Ranges_AreShapedInTheirFonts) {
 TEST(Shaper, FontOfPictures_AdvancesInItsOwnSize) {
     vorel_test::MadeFont made = letters();
     made.pictures = vorel_test::Pictures::withoutOutlines;
-    made.ppem = 64;
+    made.ppems = {64};
     const Fonts fonts{openMade(made, 20)};
     // 640 of 1024 units are 40 of the picture's 64 pixels, 12.5 of 20.
     EXPECT_EQ(shaped(fonts, "a").front().advance, 800);
@@ -95,7 +95,8 @@ TEST(Shaper, Features_AreSwitchedOnAndOff) {
 
 TEST(Shaper, MisspeltFeature_IsRefusedByItsName) {
     const Fonts fonts{openMade(letters())};
-    for (const std::string feature : {"", "ligatures", "liga=x", "=1", "liga=0 kern=0", "liga[2:3]=0"}) {
+    for (const std::string feature :
+         {"", "ligatures", "liga=x", "=1", "liga=0 kern=0", "liga[2:3]=0", "liga[:2]=0"}) {
         EXPECT_EQ(vorel_test::faultOf([&] {
                       const Shaper shaper(fonts, {"kern", feature});
                   }),

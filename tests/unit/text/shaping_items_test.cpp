@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <string>
 
 #include "text/paragraphs.h"
@@ -10,14 +11,16 @@
 namespace voreltext {
 namespace {
 
-/// The items of a line from left to right: "0-3 < 1" is from 0 to 3, to the left, in font 1.
-std::vector<std::string> items(const std::string& text, std::vector<size_t> fonts = {}) {
+/// The items of a line from left to right, or of its first `length` characters: "0-3 < 1" is from 0 to
+/// 3, to the left, in font 1.
+std::vector<std::string> items(const std::string& text, std::vector<size_t> fonts = {},
+                               size_t length = std::string::npos) {
     const Paragraph line = splitParagraphs(decodeUtf8(text)).front();
     fonts.resize(line.codes.size());
+    length = std::min(length, line.codes.size());
     std::vector<std::string> result;
-    for (const ShapingItem& item :
-         itemsOf({line.codes.data(), fonts.data(), line.scripts.data(), line.levels.data(),
-                  line.codes.size(), line.isRightToLeft})) {
+    for (const ShapingItem& item : itemsOf({line.codes.data(), fonts.data(), line.scripts.data(),
+                                            line.levels.data(), length, line.isRightToLeft})) {
         result.push_back(std::to_string(item.begin) + "-" + std::to_string(item.end) +
                          (item.isRightToLeft ? " < " : " > ") + std::to_string(item.font));
     }
@@ -47,6 +50,8 @@ TEST(ShapingItems, RightToLeft_StandTheOtherWayRound) {
 TEST(ShapingItems, BlanksAtTheEnd_HaveTheLinesDirection) {
     // The blanks behind the Hebrew word stand at the right, the end of a line of English.
     EXPECT_EQ(items("aא  "), (Items{"0-1 > 0", "1-2 < 0", "2-4 > 0"}));
+    EXPECT_EQ(items("aא ב"), (Items{"0-1 > 0", "1-4 < 0"}));
+    EXPECT_EQ(items("aא ב", {}, 3), (Items{"0-1 > 0", "1-2 < 0", "2-3 > 0"})) << "of a part, too";
 }
 
 }  // namespace

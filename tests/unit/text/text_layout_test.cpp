@@ -415,6 +415,7 @@ TEST_F(MadeLayoutTest, ClusterThatIsTooWide_IsRefused) {
 TEST_F(MadeLayoutTest, LetterSpacing_CountsForTheWidth) {
     EXPECT_EQ(wrapped("abc de", 34, 2 * 64), (Lines{"abc ", "de"}));
     EXPECT_EQ(wrapped("abc de", 33, 2 * 64), (Lines{"ab", "c ", "de"}));
+    EXPECT_EQ(wrapped("ab cd ef", 53, 2 * 64), (Lines{"ab cd ", "ef"})) << "no gap at the end";
     EXPECT_EQ(wrapped("abc de", 40, -4 * 64), Lines{"abc de"}) << "50 + 5 - 5 * 4 is 35";
 }
 
@@ -451,10 +452,35 @@ TEST_F(MadeLayoutTest, ZeroWidthSpace_AllowsABreak) {
 }
 
 TEST_F(MadeLayoutTest, LongWord_IsNotShapedAnewForEachOfItsLines) {
-    // 20,000 letters in as many lines: minutes, were it.
-    EXPECT_EQ(faultOf(std::string(20000, 'a'), wrappedAt(10)),
+    // 16 letters a line, of which the picture has room for 1024: hours, were it.
+    const TextSettings narrow = wrappedAt(160);
+    EXPECT_EQ(faultOf(std::string(1000000, 'a'), narrow),
               "the text would be more than 16384 pixels wide or high");
-    EXPECT_EQ(layOut(std::string(100000, 'a'), wrappedAt(16000)).lines().size(), 63U);
+    EXPECT_EQ(layOut(std::string(16000, 'a'), narrow).lines().size(), 1000U);
+}
+
+TEST_F(MadeLayoutTest, Hyphen_IsOfTheFontOfItsWord) {
+    MadeFont digits;
+    for (uint32_t code = '0'; code <= '9'; ++code)
+        digits.glyphs.push_back({code, 640, vorel_test::Rectangle{64, 0, 576, 512}});
+    digits.glyphs.push_back({'-', 320, vorel_test::Rectangle{0, 0, 64, 64}});
+    mFonts.add(openMade(digits));
+    const TextLayout text = layOut("12\u00AD34", wrappedAt(25));
+    ASSERT_EQ(text.glyphCount(), 5U);
+    EXPECT_EQ(text.glyph(2).cluster, 2U);
+    EXPECT_EQ(text.glyph(2).font, 1U);
+}
+
+TEST(LargePicture, BeyondTheLimit_IsRefused) {
+    MadeFont made;
+    made.pictures = vorel_test::Pictures::withoutOutlines;
+    made.ppems = {1};
+    made.glyphs = {{'a', 64, {}, {}, {{3, 1, 0, 1, std::vector<uint8_t>(12, 255)}}}};
+    Fonts fonts{openMade(made, 5000)};
+    EXPECT_EQ(TextLayout(fonts, {'a'}).glyph(0).box.width(), 15000);
+    Fonts larger{openMade(made, 6000)};
+    EXPECT_EQ(vorel_test::faultOf([&] { TextLayout(larger, {'a'}); }),
+              "the text would be more than 16384 pixels wide or high");
 }
 
 TEST_F(TextLayoutTest, WrappedMixedDirections_AreOrderedLineByLine) {
