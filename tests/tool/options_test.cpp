@@ -90,6 +90,8 @@ TEST(Options, CanvasThatDoesNotGoTogether_IsRefused) {
         faultOf({"--anchor", "middle", "A"}),
         "--anchor: 'middle' is none of top-left, top, top-right, left, center, right, bottom-left, "
         "bottom, bottom-right");
+    EXPECT_EQ(faultOf({"--fit", "shrnk", "A"}),
+              "--fit: 'shrnk' is none of none, shrink, wrap; did you mean shrink?");
 }
 
 TEST(Options, Colours_MayBeShort) {
