@@ -82,9 +82,8 @@ void readSheetSizes(Options& options, const std::string& given) {
     options.sheetSizes.clear();
     for (const std::string& size : partsOf(given))
         options.sheetSizes.push_back(readNumber(kFontSize, size));
-    const Limits<size_t> counts{1, kMostSheetSizes};
-    if (!contains(counts, options.sheetSizes.size()))
-        refuse(given, "no list of " + spelled(counts) + " sizes");
+    if (!contains(kSheetSizes, options.sheetSizes.size()))
+        refuse(given, "no list of " + spelled(kSheetSizes) + " sizes");
 }
 
 void readVariations(Options& options, const std::string& given) {
@@ -134,7 +133,7 @@ Setting pictureNumber(const char* name, const char* value, const char* initial, 
 
 /// An option of the command line alone.
 Setting programOption(const char* name, const std::string& value, const char* group,
-                      const char* description, Read read) {
+                      const std::string& description, Read read) {
     const auto kind = value.empty() ? Setting::Kind::flag : Setting::Kind::text;
     return {name, "", value, "", group, description, kind, false, false, std::move(read)};
 }
@@ -172,8 +171,8 @@ std::vector<Setting> fontSettings() {
     constexpr const char* kGroup = "Font";
     Setting fonts =
         pictureOption("font", "FONT", "DejaVu Sans", kGroup,
-                      "Font file, or family such as 'DejaVu Sans:bold'; given several times, "
-                      "each has what those before it lack",
+                      "Font file, or family such as 'DejaVu Sans:bold'; given up to " +
+                          std::to_string(kMostFonts) + " times, each has what those before it lack",
                       addFont, Setting::Kind::list);
     fonts.forget = [](Options& options) { options.fonts.clear(); };
     return {
@@ -259,7 +258,9 @@ std::vector<Setting> seriesSettings() {
                           text(&Options::batch)),
             programOption("sheet", "", kGroup, "Paint TEXT in every preset, with their names",
                           flag(&Options::sheet)),
-            programOption("sizes", "LIST", kGroup, "Sizes of a sheet's columns, such as 24,48,96",
+            programOption("sizes", "LIST", kGroup,
+                          "Sizes of a sheet's columns, such as 24,48,96: " + spelled(kSheetSizes) +
+                              " of " + spelled(kFontSize) + " pixels",
                           readSheetSizes)};
 }
 
