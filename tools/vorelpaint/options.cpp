@@ -19,26 +19,17 @@ namespace vorelpaint {
 namespace {
 
 /// What cannot be asked for together, beside what checkCombination explains.
-constexpr std::array<std::pair<const char*, const char*>, 19> kExclusions{{
-    {"--text-file", "TEXT"},
-    {"--preset", "--style"},
-    {"--batch", "--output"},
-    {"--batch", "--sheet"},
-    {"--batch", "--explain"},
-    {"--batch", "--write-cpp"},
-    {"--batch", "--print-key"},
-    {"--batch", "--print-margins"},
-    {"--sheet", "--style"},
-    {"--sheet", "--preset"},
-    {"--sheet", "--explain"},
-    {"--sheet", "--write-cpp"},
-    {"--sheet", "--print-key"},
-    {"--sheet", "--print-margins"},
-    {"--sheet", "--report"},
-    {"--write-cpp", "--report"},
-    {"--write-cpp", "--explain"},
-    {"--write-cpp", "--print-key"},
-    {"--write-cpp", "--print-margins"},
+constexpr std::array<std::pair<const char*, const char*>, 20> kExclusions{{
+    {"--text-file", "TEXT"},        {"--preset", "--style"},
+    {"--batch", "--output"},        {"--batch", "--sheet"},
+    {"--batch", "--sizes"},         {"--batch", "--explain"},
+    {"--batch", "--write-cpp"},     {"--batch", "--print-key"},
+    {"--batch", "--print-margins"}, {"--sheet", "--style"},
+    {"--sheet", "--preset"},        {"--sheet", "--explain"},
+    {"--sheet", "--write-cpp"},     {"--sheet", "--print-key"},
+    {"--sheet", "--print-margins"}, {"--sheet", "--report"},
+    {"--write-cpp", "--report"},    {"--write-cpp", "--explain"},
+    {"--write-cpp", "--print-key"}, {"--write-cpp", "--print-margins"},
 }};
 
 /// The value behind the name, and the default behind the description; the rest that CLI11 would tell,

@@ -35,6 +35,10 @@ class Composition {
     voreltext::Canvas mCanvas;
 };
 
+/// Notes what of the text and its effects, which are `margins` around the ink, the canvas cuts off.
+void noteCut(const voreltext::Canvas& canvas, const voreltext::Box& ink,
+             const voreltext::Margins& margins, const Note& note);
+
 /// The picture on its background into its file.
 void writePicture(const Options& options, voreltext::Image picture);
 
