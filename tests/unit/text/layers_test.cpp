@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <cstdint>
+#include <limits>
 #include <string_view>
 #include <vector>
 
@@ -133,6 +134,24 @@ TEST(Layers, MovedOne_IsTheSamePictureElsewhere) {
     layOver(wanted, still, 7, -5);
     EXPECT_EQ(moved.pixels, wanted.pixels);
     EXPECT_NE(moved.pixels, still.pixels);
+}
+
+TEST(Layers, MovedFarAway_AreNotSeen) {
+    constexpr int kMost = std::numeric_limits<int>::max();
+    constexpr int kLeast = std::numeric_limits<int>::min();
+    const Sample sample("I");
+    VFEffect effects = everything();
+    for (const int far : {kLeast, kMost}) {
+        Layer layer{&effects, far, far};
+        layer.takesPictures = true;
+        for (const int place : {kLeast / 2, 0, kMost / 2}) {
+            const Image image = paint({layer}, sample.layout(), {9, 9, place, place});
+            EXPECT_EQ(image.pixels, std::vector<uint8_t>(9 * 9 * 4)) << far;
+        }
+        const Margins margins = marginsOf({layer});
+        EXPECT_GT(far < 0 ? margins.left : margins.right, TextLayout::kMaxSide);
+        EXPECT_EQ(far < 0 ? margins.right : margins.left, 0);
+    }
 }
 
 TEST(Layers, SmallerCanvas_IsAPartOfThePicture) {
