@@ -372,6 +372,15 @@ TEST(Markup, ThatDoesNotClose_IsRefusedWithItsPlace) {
         << "without --markup";
 }
 
+TEST(Markup, Places_AreThoseOfTheWrittenText) {
+    const std::string missing = "<c #f80>a</c>\xF0\x93\x80\x80";
+    EXPECT_EQ(reported({"--markup", missing})["missing"][0]["first"], "line 1, character 14");
+    EXPECT_NE(faultOf({"--strict", "--markup", missing}).find("(line 1, character 14)"),
+              std::string::npos);
+    EXPECT_NE(faultOf({"--width", "60", "--markup", "i<c #f80>W</c>"}).find("line 1, character 10"),
+              std::string::npos);
+}
+
 TEST(Markup, CoveredByAnOpaqueEffect_IsNoted) {
     const auto errorsOf = [](const std::string& style) {
         const TempDir dir;

@@ -20,12 +20,12 @@ using voreltext::Image;
 using voreltext::Margins;
 
 Composition::Composition(const Options& options)
-    : mSource(chosenText(options)),
-      mText(setToFit(options, mSource.text)),
-      mLooks(options, chosenStyle(options), mText.size(), mSource.colours, mNotes.taker()),
+    : mSource(options),
+      mText(setToFit(options, mSource)),
+      mLooks(options, chosenStyle(options), mText.size(), mSource.colours(), mNotes.taker()),
       mMargins(marginsOf(mLooks.layers())),
       mCanvas(placedOn(options.canvas, mText.box(), mMargins)) {
-    noteMissing(mText.layout(), mSource.text, mNotes.taker());
+    noteMissing(mText.layout(), mSource, mNotes.taker());
     noteCut(mCanvas, mText.layout().inkBox(), mMargins, mNotes.taker());
     if (options.strict) mNotes.refuse();
 }

@@ -18,7 +18,7 @@ class Composition {
     explicit Composition(const Options& options);
 
     const HeldNotes& notes() const { return mNotes; }
-    const std::vector<uint32_t>& source() const { return mSource.text; }  ///< without markup
+    const SourceText& source() const { return mSource; }
     const SetText& text() const { return mText; }
     const LayerSet& looks() const { return mLooks; }
     const voreltext::Margins& margins() const { return mMargins; }
@@ -28,7 +28,7 @@ class Composition {
 
   private:
     HeldNotes mNotes;
-    vorelstyle::MarkedText mSource;
+    SourceText mSource;
     SetText mText;
     LayerSet mLooks;
     voreltext::Margins mMargins;

@@ -17,7 +17,6 @@ namespace vorelpaint {
 namespace {
 
 using vorelstyle::Look;
-using vorelstyle::MarkedText;
 using voreltext::Box;
 using voreltext::Canvas;
 using voreltext::Image;
@@ -69,16 +68,16 @@ SetText labelOf(const Options& options, const std::string& preset, int size) {
     return {plain, voreltext::decodeUtf8(preset), labelSize};
 }
 
-Column columnOf(const Options& options, const MarkedText& source, int size, const Note& note) {
+Column columnOf(const Options& options, const SourceText& source, int size, const Note& note) {
     Options chosen = options;
     chosen.size = size;
-    Column column{setToFit(chosen, source.text), {}};
+    Column column{setToFit(chosen, source), {}};
     for (const std::string& preset : presetNames()) {
         chosen.preset = preset;
         const std::string prefix = preset + ": ";
         const Note noteOfPreset = [&](const std::string& line) { note(prefix + line); };
         column.cells.push_back(
-            {LayerSet(chosen, chosenStyle(chosen), size, source.colours, noteOfPreset),
+            {LayerSet(chosen, chosenStyle(chosen), size, source.colours(), noteOfPreset),
              labelOf(chosen, preset, size)});
     }
     return column;
@@ -159,9 +158,9 @@ Grid gridOf(const std::vector<Column>& columns, int padding) {
 }
 
 /// Notes what is told of the text itself, whatever its look. What the fonts lack they lack in any size.
-void noteText(const std::vector<Column>& columns, const Grid& grid, const std::vector<uint32_t>& text,
+void noteText(const std::vector<Column>& columns, const Grid& grid, const SourceText& source,
               const Note& note) {
-    noteMissing(columns.front().text.layout(), text, note);
+    noteMissing(columns.front().text.layout(), source, note);
     for (size_t i = 0; i < columns.size(); ++i) {
         const CellSize& size = grid.sizes[i];
         noteCut(size.canvas, columns[i].text.layout().inkBox(), size.margins, note);
@@ -194,7 +193,7 @@ int sheetColumns(int count, int cellWidth, int cellHeight) {
 }
 
 void paintSheet(const Options& options, const Note& note) {
-    const MarkedText source = chosenText(options);
+    const SourceText source(options);
     const std::vector<int> sizes =
         options.sheetSizes.empty() ? std::vector<int>{options.size} : options.sheetSizes;
     HeldNotes notes;
@@ -203,7 +202,7 @@ void paintSheet(const Options& options, const Note& note) {
     for (const int size : sizes)
         columns.push_back(columnOf(options, source, size, notes.taker()));
     const Grid grid = gridOf(columns, options.canvas.padding);
-    noteText(columns, grid, source.text, notes.taker());
+    noteText(columns, grid, source, notes.taker());
     Image sheet = voreltext::transparentImage(grid.left(grid.columns), grid.rows * grid.height());
     if (options.strict) notes.refuse();
     paintCells(sheet, columns, grid, options);

@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <cstdint>
+#include <limits>
 #include <string_view>
 #include <vector>
 
@@ -136,6 +137,24 @@ TEST(Layers, MovedOne_IsTheSamePictureElsewhere) {
     EXPECT_NE(moved.pixels, still.pixels);
 }
 
+TEST(Layers, MovedFarAway_AreNotSeen) {
+    constexpr int kMost = std::numeric_limits<int>::max();
+    constexpr int kLeast = std::numeric_limits<int>::min();
+    const Sample sample("I");
+    VFEffect effects = everything();
+    for (const int far : {kLeast, kMost}) {
+        Layer layer{&effects, far, far};
+        layer.takesPictures = true;
+        for (const int place : {kLeast / 2, 0, kMost / 2}) {
+            const Image image = paint({layer}, sample.layout(), {9, 9, place, place});
+            EXPECT_EQ(image.pixels, std::vector<uint8_t>(9 * 9 * 4)) << far;
+        }
+        const Margins margins = marginsOf({layer});
+        EXPECT_GT(far < 0 ? margins.left : margins.right, TextLayout::kMaxSide);
+        EXPECT_EQ(far < 0 ? margins.right : margins.left, 0);
+    }
+}
+
 TEST(Layers, SmallerCanvas_IsAPartOfThePicture) {
     const Sample sample("Cut off");
     VFEffect effects = everything();
@@ -217,7 +236,7 @@ TEST(ColouredParts, ChangeTheirGlyphsAlone) {
 
     Image covered{image.width, image.height, std::vector<uint8_t>(image.pixels.size())};
     const Canvas canvas = around(sample.layout(), {layer});
-    for (const size_t i : {1, 2}) {
+    for (const size_t i : {1U, 2U}) {
         const GlyphMask mask = sample.layout().rasterise(i);
         Image glyph{mask.box.width(), mask.box.height(), {}};
         for (const uint8_t each : mask.coverage)
