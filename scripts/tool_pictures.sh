@@ -1,8 +1,11 @@
 #!/usr/bin/env bash
-# Paints the picture of docs/vorelpaint.md anew.
+# Paints the pictures that the commands of the tool's pages paint anew: docs/vorelpaint.
 set -euo pipefail
 cd "$(dirname "$0")/.."
+. scripts/packages.sh
 
+need_packages python3 fonts-dejavu-core fonts-noto-color-emoji fonts-vlgothic
 scripts/demo.sh > /dev/null
-build/demo/tools/vorelpaint --sheet --font "DejaVu Sans:bold" --background "#23272E" \
-    -o docs/vorelpaint-sheet.png "Type"
+for page in vorelpaint style-files layer-styles captions; do
+    python3 -B scripts/docs/page_commands.py build/demo/tools/vorelpaint "docs/$page.md" --paint
+done

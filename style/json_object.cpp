@@ -318,8 +318,9 @@ int JsonObject::choice(std::string_view key, const std::vector<std::string_view>
     const Json* value = find(*this, nodeAt(mObject.mNode), key, fallback.has_value(), &Json::is_string,
                              "one of " + joined(names));
     if (value == nullptr) return *fallback;
-    const auto found = std::find(names.begin(), names.end(), value->get_ref<const std::string&>());
-    if (found == names.end()) fail(key, quoted(*value) + " is none of " + joined(names));
+    const auto& given = value->get_ref<const std::string&>();
+    const auto found = std::find(names.begin(), names.end(), given);
+    if (found == names.end()) fail(key, quoted(*value) + " is " + noneOf(given, names));
     return static_cast<int>(found - names.begin());
 }
 

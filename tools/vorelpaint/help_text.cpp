@@ -40,8 +40,8 @@ const std::vector<std::string>& exampleCommands() {
     return commands;
 }
 
-const std::vector<Note>& notes() {
-    static const std::vector<Note> all{
+const std::vector<Topic>& topics() {
+    static const std::vector<Topic> all{
         {"Style files",
          "A style file is a JSON object with one object per effect (outerShadow, innerShadow, "
          "outerGlow, innerGlow, linearGradient, radialGradient, stroke, pattern, text, bevel, "
@@ -87,6 +87,8 @@ const std::vector<Note>& notes() {
          "Where the program is installed, in /usr for a package: "
          "share/doc/vorelpaint/style-files.md lists every key of a style file, "
          "share/doc/vorelpaint/vorelpaint.md tells of batches and reports, "
+         "share/doc/vorelpaint/captions.md has recipes for titles and captions, "
+         "share/doc/vorelpaint/layer-styles.md translates the layer styles of design tools, "
          "share/voreleffect/presets has the presets, and "
          "share/voreleffect/vorelpaint-style.schema.json tells editors what a style file may hold."},
         {"Exit codes",
@@ -106,8 +108,8 @@ std::string helpFooter() {
     std::string footer = "Examples:";
     for (const std::string& command : exampleCommands())
         footer += "\n  " + command;
-    for (const Note& note : notes())
-        footer += "\n\n" + note.heading + ":\n" + wrapped(note.text, kHelpWidth, 2);
+    for (const Topic& topic : topics())
+        footer += "\n\n" + topic.heading + ":\n" + wrapped(topic.text, kHelpWidth, 2);
     return footer;
 }
 

@@ -107,8 +107,8 @@ std::string manualPage() {
             "]\n";
     roff += ".SH DESCRIPTION\n" + paragraph(kPurpose);
     roff += allSettings();
-    for (const Note& note : notes())
-        roff += ".SH " + upperCase(note.heading) + "\n" + paragraph(note.text);
+    for (const Topic& topic : topics())
+        roff += ".SH " + upperCase(topic.heading) + "\n" + paragraph(topic.text);
     return roff + allExamples();
 }
 

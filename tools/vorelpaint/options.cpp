@@ -19,26 +19,17 @@ namespace vorelpaint {
 namespace {
 
 /// What cannot be asked for together, beside what checkCombination explains.
-constexpr std::array<std::pair<const char*, const char*>, 19> kExclusions{{
-    {"--text-file", "TEXT"},
-    {"--preset", "--style"},
-    {"--batch", "--output"},
-    {"--batch", "--sheet"},
-    {"--batch", "--explain"},
-    {"--batch", "--write-cpp"},
-    {"--batch", "--print-key"},
-    {"--batch", "--print-margins"},
-    {"--sheet", "--style"},
-    {"--sheet", "--preset"},
-    {"--sheet", "--explain"},
-    {"--sheet", "--write-cpp"},
-    {"--sheet", "--print-key"},
-    {"--sheet", "--print-margins"},
-    {"--sheet", "--report"},
-    {"--write-cpp", "--report"},
-    {"--write-cpp", "--explain"},
-    {"--write-cpp", "--print-key"},
-    {"--write-cpp", "--print-margins"},
+constexpr std::array<std::pair<const char*, const char*>, 20> kExclusions{{
+    {"--text-file", "TEXT"},        {"--preset", "--style"},
+    {"--batch", "--output"},        {"--batch", "--sheet"},
+    {"--batch", "--sizes"},         {"--batch", "--explain"},
+    {"--batch", "--write-cpp"},     {"--batch", "--print-key"},
+    {"--batch", "--print-margins"}, {"--sheet", "--style"},
+    {"--sheet", "--preset"},        {"--sheet", "--explain"},
+    {"--sheet", "--write-cpp"},     {"--sheet", "--print-key"},
+    {"--sheet", "--print-margins"}, {"--sheet", "--report"},
+    {"--write-cpp", "--report"},    {"--write-cpp", "--explain"},
+    {"--write-cpp", "--print-key"}, {"--write-cpp", "--print-margins"},
 }};
 
 /// The value behind the name, and the default behind the description; the rest that CLI11 would tell,
@@ -89,15 +80,16 @@ void addSetting(CLI::App& app, const Setting& setting, Options& options) {
     option->group(setting.group);
 }
 
+bool prints(const Options& options) {
+    return options.printKey || options.printMargins || options.explain || options.writeCpp ||
+           options.report;
+}
+
 void checkOutput(const Options& options) {
-    const bool prints = options.printKey || options.printMargins || options.explain ||
-                        options.writeCpp || options.report;
-    if (!options.output && !prints) {
+    if (!options.output && !prints(options)) {
         throw ToolError("nowhere to paint: give -o FILE, or -o - for standard output");
     }
-    if (prints && options.output && isStandardOutput(*options.output)) {
-        throw ToolError("standard output cannot take both the picture and what is printed");
-    }
+    checkStandardOutput(options);
     if ((options.output || options.report) && !options.text && !options.textFile) {
         throw ToolError("nothing to paint: give TEXT, or --text-file FILE");
     }
@@ -152,6 +144,12 @@ void checkCanvas(const Options& options) {
     }
     if (options.sheet && (canvas.width || canvas.height)) {
         throw ToolError("a sheet has the size of its cells; no width or height can be given");
+    }
+}
+
+void checkStandardOutput(const Options& options) {
+    if (prints(options) && options.output && isStandardOutput(*options.output)) {
+        throw ToolError("standard output cannot take both the picture and what is printed");
     }
 }
 

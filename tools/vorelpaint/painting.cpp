@@ -13,14 +13,27 @@
 #include "report.h"
 
 namespace vorelpaint {
-namespace {
 
 using voreltext::Box;
 using voreltext::Canvas;
 using voreltext::Image;
 using voreltext::Margins;
 
-/// Notes what of the text and its effects, which are `margins` around the ink, the canvas cuts off.
+Composition::Composition(const Options& options)
+    : mSource(options),
+      mText(setToFit(options, mSource)),
+      mLooks(options, chosenStyle(options), mText.size(), mSource.colours(), mNotes.taker()),
+      mMargins(marginsOf(mLooks.layers())),
+      mCanvas(placedOn(options.canvas, mText.box(), mMargins)) {
+    noteMissing(mText.layout(), mSource, mNotes.taker());
+    noteCut(mCanvas, mText.layout().inkBox(), mMargins, mNotes.taker());
+    if (options.strict) mNotes.refuse();
+}
+
+Image Composition::paint() const {
+    return voreltext::paint(mLooks.layers(), mText.layout(), mCanvas);
+}
+
 void noteCut(const Canvas& canvas, const Box& ink, const Margins& margins, const Note& note) {
     struct Side {
         const char* name;
@@ -39,27 +52,6 @@ void noteCut(const Canvas& canvas, const Box& ink, const Margins& margins, const
     if (!places.empty()) note("the picture cuts pixels of the text or its effects off: " + places);
 }
 
-}  // namespace
-
-Note noteTaker(const Options& options, const Note& note) {
-    if (!options.strict) return note;
-    return [](const std::string& line) { throw ToolError(line); };
-}
-
-Composition::Composition(const Options& options, const Note& note)
-    : mSource(chosenText(options)),
-      mText(setToFit(options, mSource.text)),
-      mLooks(options, chosenStyle(options), mText.size(), mSource.colours, note),
-      mMargins(marginsOf(mLooks.layers())),
-      mCanvas(placedOn(options.canvas, mText.box(), mMargins)) {
-    noteMissing(mText.layout(), mSource.text, note);
-    noteCut(mCanvas, mText.layout().inkBox(), mMargins, note);
-}
-
-Image Composition::paint() const {
-    return voreltext::paint(mLooks.layers(), mText.layout(), mCanvas);
-}
-
 void writePicture(const Options& options, Image picture) {
     layOn(picture, options.background);
     writeFile(options.output.value(), [&](std::FILE* file) { writePng(file, picture, options.png); });
@@ -71,7 +63,9 @@ void finish(const Options& options, const Composition& composition) {
 }
 
 void paintPicture(const Options& options, const Note& note) {
-    finish(options, Composition(options, noteTaker(options, note)));
+    const Composition composition(options);
+    finish(options, composition);
+    composition.notes().giveTo(note);
 }
 
 }  // namespace vorelpaint

@@ -11,15 +11,14 @@
 /// TextError.
 namespace vorelpaint {
 
-/// Takes notes as is asked for: a strict request throws them as ToolError, others go to `note`.
-Note noteTaker(const Options& options, const Note& note);
-
 /// A picture before it is painted: a text in its fonts, its looks, and the canvas on which they meet.
 class Composition {
   public:
-    Composition(const Options& options, const Note& note);
+    /// A strict request's first note is thrown as ToolError.
+    explicit Composition(const Options& options);
 
-    const std::vector<uint32_t>& source() const { return mSource.text; }  ///< without markup
+    const HeldNotes& notes() const { return mNotes; }
+    const SourceText& source() const { return mSource; }
     const SetText& text() const { return mText; }
     const LayerSet& looks() const { return mLooks; }
     const voreltext::Margins& margins() const { return mMargins; }
@@ -28,12 +27,17 @@ class Composition {
     voreltext::Image paint() const;
 
   private:
-    vorelstyle::MarkedText mSource;
+    HeldNotes mNotes;
+    SourceText mSource;
     SetText mText;
     LayerSet mLooks;
     voreltext::Margins mMargins;
     voreltext::Canvas mCanvas;
 };
+
+/// Notes what of the text and its effects, which are `margins` around the ink, the canvas cuts off.
+void noteCut(const voreltext::Canvas& canvas, const voreltext::Box& ink,
+             const voreltext::Margins& margins, const Note& note);
 
 /// The picture on its background into its file.
 void writePicture(const Options& options, voreltext::Image picture);
@@ -41,7 +45,7 @@ void writePicture(const Options& options, voreltext::Image picture);
 /// Writes the picture, where an output is asked for, and prints its report, where one is.
 void finish(const Options& options, const Composition& composition);
 
-/// All of these steps.
+/// All of these steps, and then the notes.
 void paintPicture(const Options& options, const Note& note);
 
 }  // namespace vorelpaint

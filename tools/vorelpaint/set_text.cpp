@@ -48,8 +48,7 @@ std::unique_ptr<Fonts> openFonts(const Options& options, int size) {
     auto fonts = std::make_unique<Fonts>(Font(main, size, options.variations));
     for (size_t i = 1; i < options.fonts.size(); ++i)
         fonts->add(Font(findFont(options.fonts[i]), size));
-    fonts->setFallback(
-        [main](const voreltext::Cluster& cluster) { return findFontFor(cluster, main); });
+    fonts->setFallback([main](const voreltext::Cluster& cluster) { return findFontFor(cluster, main); });
     return fonts;
 }
 
@@ -60,38 +59,51 @@ const Glyph* glyphBeyond(const Room& room, const TextLayout& layout) {
     return nullptr;
 }
 
-void requireRoomForGlyphs(const Room& room, const TextLayout& layout,
-                          const std::vector<uint32_t>& text) {
+void requireRoomForGlyphs(const Room& room, const TextLayout& layout, const SourceText& source) {
     const Glyph* glyph = glyphBeyond(room, layout);
     if (glyph == nullptr) return;
-    throw ToolError(
-        "the canvas is too small for one glyph: that of " + vorelunicode::nameOf(text[glyph->cluster]) +
-        " at " + vorelunicode::placeName(text, glyph->cluster) + " is " +
-        std::to_string(glyph->box.width()) + " x " + std::to_string(glyph->box.height()) + " pixels");
+    throw ToolError("the canvas is too small for one glyph: that of " +
+                    vorelunicode::nameOf(source.text()[glyph->cluster]) + " at " +
+                    source.placeName(glyph->cluster) + " is " + std::to_string(glyph->box.width()) +
+                    " x " + std::to_string(glyph->box.height()) + " pixels");
+}
+
+SetText shrunk(const Options& options, const Room& room, const std::vector<uint32_t>& text) {
+    std::optional<SetText> best;
+    std::string fault;
+    voreltext::largestThatFits(options.size, [&](int size) {
+        try {
+            SetText set(options, text, size);
+            fault.clear();
+            if (!room.holds(set.box())) return false;
+            best = std::move(set);
+            return true;
+        } catch (const voreltext::TextError& error) {  // in a smaller size it may not be too wide
+            fault = error.what();
+            return false;
+        }
+    });
+    if (best) return std::move(*best);
+    throw ToolError(fault.empty() ? "the text does not fit the canvas at any size" : fault);
 }
 
 SetText setInCanvas(const Options& options, const Room& room, const std::vector<uint32_t>& text) {
-    if (options.fit == Fit::wrap) return {options, text, options.size, *room.width};
-    SetText whole(options, text, options.size);
-    if (options.fit == Fit::none || room.holds(whole.box())) return whole;
-    std::optional<SetText> best;
-    voreltext::largestThatFits(options.size - 1, [&](int size) {
-        if (size < 1) return false;
-        SetText smaller(options, text, size);
-        const bool fits = room.holds(smaller.box());
-        if (fits && (!best || size > best->size())) best.emplace(std::move(smaller));
-        return fits;
-    });
-    if (best) return std::move(*best);
-    throw ToolError("the text does not fit the canvas at any size");
+    if (options.fit == Fit::shrink) return shrunk(options, room, text);
+    return {options, text, options.size, options.fit == Fit::wrap ? *room.width : 0};
 }
 
 }  // namespace
 
-vorelstyle::MarkedText chosenText(const Options& options) {
-    std::vector<uint32_t> text = voreltext::decodeUtf8(bytesOfText(options));
-    if (options.markup) return vorelstyle::parseMarkup(text);
-    return {std::move(text), {}};
+SourceText::SourceText(const Options& options) : mGiven(voreltext::decodeUtf8(bytesOfText(options))) {
+    if (options.markup) {
+        mMarked = vorelstyle::parseMarkup(mGiven);
+    } else {
+        mMarked.text = mGiven;
+    }
+}
+
+std::string SourceText::placeName(size_t at) const {
+    return vorelunicode::placeName(mGiven, mMarked.places.empty() ? at : mMarked.places[at]);
 }
 
 SetText::SetText(const Options& options, const std::vector<uint32_t>& text, int size, int wrapWidth)
@@ -103,23 +115,23 @@ SetText::SetText(const Options& options, const std::vector<uint32_t>& text, int 
                        options.features})),
       mBox(options.box == TextBox::ink ? mLayout->inkBox() : mLayout->lineBox()) {}
 
-SetText setToFit(const Options& options, const std::vector<uint32_t>& text) {
+SetText setToFit(const Options& options, const SourceText& source) {
     const Room room = voreltext::roomOf(options.canvas);
-    SetText set = setInCanvas(options, room, text);
+    SetText set = setInCanvas(options, room, source.text());
     if (set.layout().glyphCount() == 0) {
         throw ToolError("nothing to paint: the text has no visible character");
     }
-    requireRoomForGlyphs(room, set.layout(), text);
+    requireRoomForGlyphs(room, set.layout(), source);
     return set;
 }
 
-void noteMissing(const TextLayout& layout, const std::vector<uint32_t>& text, const Note& note) {
+void noteMissing(const TextLayout& layout, const SourceText& source, const Note& note) {
     std::string names;
     size_t named = 0;
     for (const voreltext::MissingCharacter& missing : layout.missing()) {
         if (++named > kMostMissingNamed) continue;
         names += (names.empty() ? "" : ", ") + vorelunicode::nameOf(missing.code) + " (" +
-                 vorelunicode::placeName(text, missing.first) + ")";
+                 source.placeName(missing.first) + ")";
     }
     if (named == 0) return;
     if (named > kMostMissingNamed) {
