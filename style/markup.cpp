@@ -55,7 +55,7 @@ class MarkupReader {
     void readCharacter() {
         const uint32_t code = mSource[mAt];
         const bool isAllowed =
-            !vorelunicode::isControl(code) || code == '\t' || vorelunicode::isLineEnd(code);
+            !vorelunicode::isControl(code) || code == '\t' || vorelunicode::endsLine(code);
         if (!isAllowed) fail(mAt, "the control character " + vorelunicode::nameOf(code));
         add(code);
         ++mAt;

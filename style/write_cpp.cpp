@@ -128,9 +128,10 @@ class CallWriter {
         }
         mOut << "    // " << printable(e.image)
              << " as A, R, G, B\n    static unsigned char pixels[] = {";
-        for (size_t at = 0; at < image.pixels.size(); ++at)
+        for (size_t at = 0; at < image.pixels.size(); ++at) {
             mOut << (at % kBytesPerLine == 0 ? "\n        " : " ") << literal(int{image.pixels[at]})
                  << ',';
+        }
         mOut << "\n    };\n    VFontEffect::VFBitmap pattern(" << literal(image.width) << ", "
              << literal(image.height) << ", pixels, 4);\n";
     }

@@ -35,9 +35,11 @@ FontedParagraph FontChooser::choose(const Paragraph& paragraph) {
     return std::move(line.result);
 }
 
-void FontChooser::shape(Line& line) const {
-    line.result.glyphs = mShaper.shape({line.paragraph.codes.data(), line.result.fonts.data(),
-                                        line.paragraph.codes.size(), line.paragraph.isRightToLeft});
+void FontChooser::shape(Line& line) {
+    const Paragraph& paragraph = line.paragraph;
+    line.result.glyphs =
+        mShaper.shape({paragraph.codes.data(), line.result.fonts.data(), paragraph.scripts.data(),
+                       paragraph.levels.data(), paragraph.codes.size(), paragraph.isRightToLeft});
 }
 
 /// In the order of the text.

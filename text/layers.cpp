@@ -155,6 +155,7 @@ std::vector<std::vector<size_t>> spansOf(const TextLayout& text, Span span) {
     for (size_t i = 0; i < text.glyphCount(); ++i)
         places[placeOf(text.glyph(i), span)].push_back(i);
     std::vector<std::vector<size_t>> spans;
+    spans.reserve(places.size());
     for (auto& [place, glyphs] : places)
         spans.push_back(std::move(glyphs));
     return spans;

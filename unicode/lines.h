@@ -5,9 +5,12 @@
 #include <string>
 #include <vector>
 
-#include "unicode/characters.h"
-
 namespace vorelunicode {
+
+/// Line feed, carriage return, next line, line separator and paragraph separator.
+inline bool endsLine(uint32_t code) {
+    return code == '\n' || code == '\r' || code == 0x85 || code == 0x2028 || code == 0x2029;
+}
 
 /// Whether the character at a place of the text is the second of CR LF, which end one line together.
 inline bool isSecondOfLineEnd(const std::vector<uint32_t>& text, size_t at) {
@@ -20,7 +23,7 @@ inline std::string placeName(const std::vector<uint32_t>& text, size_t at) {
     size_t character = 1;
     for (size_t i = 0; i < at; ++i) {
         ++character;
-        if (!isLineEnd(text[i])) continue;
+        if (!endsLine(text[i])) continue;
         if (!isSecondOfLineEnd(text, i)) ++line;
         character = 1;
     }

@@ -2,13 +2,16 @@
 """Paints the gallery: gallery.py VORELPAINT FOLDER.
 
 NAME-160-SHADE.png and NAME-48-SHADE.png are what the program paints; NAME-sizes.png has four sizes side by
-side over a ground that is like a photograph, in fewer colours.
+side over a ground that is like a photograph, its colours rounded to steps of 5.
 """
 
+import io
 import json
+import struct
 import subprocess
 import sys
 import tempfile
+import zlib
 from pathlib import Path
 
 from PIL import Image
@@ -19,8 +22,9 @@ FONT = "DejaVu Sans:bold"
 SHADES = {"dark": "#23272E", "light": "#F4F1EA"}
 BOARD = "#2F4F3F"  # for chalk, in place of the light shade
 SHORT, LONG = "Type", "Summer Sale: 50% Off"
-CELLS = {24: 120, 48: 190, 96: 320, 160: 510}  # the size of the font and the width that it has, in pixels
-COLOURS = 192  # of a picture of sizes, which keeps it small
+# The cells of a picture of sizes: the size of the font, the text, and the width that it has in pixels.
+CELLS = ((24, SHORT, 90), (48, SHORT, 156), (96, SHORT, 296), (160, "Ag", 328))
+ROUNDED = [5 * round(value / 5) for value in range(256)]
 
 
 def preset_names(program):
@@ -36,8 +40,8 @@ def shade_jobs(name):
 
 
 def cell_jobs(name):
-    for size, width in CELLS.items():
-        yield {"preset": name, "text": SHORT, "size": size, "width": width, "height": ground.SIZE[1],
+    for size, text, width in CELLS:
+        yield {"preset": name, "text": text, "size": size, "width": width, "height": ground.SIZE[1],
                "output": f"{name}-{size}.png"}
 
 
@@ -50,11 +54,33 @@ def in_a_row(folder, name):
     """The cells of a preset beside each other, on nothing."""
     row = Image.new("RGBA", ground.SIZE, (0, 0, 0, 0))
     left = 0
-    for size, width in CELLS.items():
+    for size, _, width in CELLS:
         with Image.open(folder / f"{name}-{size}.png") as cell:
             row.paste(cell.convert("RGBA"), (left, 0))
         left += width
     return row
+
+
+def chunk(kind, data):
+    return struct.pack(">I", len(data)) + kind + data + struct.pack(">I", zlib.crc32(kind + data))
+
+
+def unfiltered(image):
+    """The image as a PNG whose rows are stored as they are: often smaller, as effects repeat themselves."""
+    width, height = image.size
+    pixels = image.tobytes()
+    rows = b"".join(b"\0" + pixels[y * width * 3:(y + 1) * width * 3] for y in range(height))
+    header = struct.pack(">IIBBBBB", width, height, 8, 2, 0, 0, 0)
+    return (b"\x89PNG\r\n\x1a\n" + chunk(b"IHDR", header) + chunk(b"IDAT", zlib.compress(rows, 9))
+            + chunk(b"IEND", b""))
+
+
+def save(image, path):
+    """Saves it without alpha, the smaller of two ways."""
+    opaque = image.convert("RGB")
+    filtered = io.BytesIO()
+    opaque.save(filtered, "PNG", optimize=True)
+    path.write_bytes(min(filtered.getvalue(), unfiltered(opaque), key=len))
 
 
 def main(program, folder):
@@ -66,11 +92,10 @@ def main(program, folder):
         paint(program, shades + [job for name in names for job in cell_jobs(name)], painted)
         for job in shades:
             with Image.open(painted / job["output"]) as picture:
-                picture.convert("RGB").save(folder / job["output"], optimize=True)
+                save(picture, folder / job["output"])
         for name in names:
-            picture = Image.alpha_composite(behind, in_a_row(painted, name)).convert("RGB")
-            fewer = picture.quantize(COLOURS, method=Image.Quantize.MEDIANCUT, dither=Image.Dither.NONE)
-            fewer.save(folder / f"{name}-sizes.png", optimize=True)
+            row = Image.alpha_composite(behind, in_a_row(painted, name)).convert("RGB")
+            save(row.point(3 * ROUNDED), folder / f"{name}-sizes.png")
 
 
 if __name__ == "__main__":

@@ -3,28 +3,26 @@ dark houses and lamps. Always the same pixels."""
 
 from PIL import Image
 
-SIZE = (1140, 250)
+SIZE = (870, 246)
 
 # Colours of the sky from the top down, and where each stands.
 SKY = ((0.0, (52, 70, 122)), (0.3, (206, 128, 132)), (0.52, (250, 214, 160)), (0.64, (120, 84, 90)),
        (1.0, (22, 24, 38)))
 
 # The houses: the middle, half the width and the top of each.
-HOUSES = ((40, 70, 120), (190, 60, 84), (330, 75, 138), (480, 60, 60), (640, 90, 126), (800, 55, 92),
-          (930, 70, 150), (1080, 75, 104))
+HOUSES = ((40, 62, 108), (180, 52, 78), (318, 64, 126), (458, 54, 56), (600, 78, 116), (748, 50, 86),
+          (862, 58, 132))
 HOUSE = (34, 36, 54)
-HOUSE_EDGE = 14  # over which a house fades into the sky
+HOUSE_EDGE = 5  # over which a house fades into the sky
 
 # The lamps: place, radius and colour of each.
-LAMPS = ((30, 205, 22, (255, 196, 92)), (92, 60, 26, (255, 238, 214)), (150, 178, 30, (90, 190, 214)),
-         (236, 214, 20, (255, 120, 84)), (270, 120, 26, (255, 214, 130)), (352, 190, 34, (214, 82, 110)),
-         (428, 84, 24, (255, 246, 230)), (452, 226, 26, (96, 214, 160)), (540, 170, 32, (255, 206, 96)),
-         (600, 48, 28, (255, 226, 190)), (668, 214, 28, (120, 150, 255)), (736, 130, 24, (255, 140, 90)),
-         (786, 212, 36, (255, 180, 84)), (866, 176, 26, (90, 206, 206)), (900, 40, 30, (255, 236, 210)),
-         (972, 214, 30, (230, 90, 130)), (1040, 150, 34, (255, 220, 140)), (1104, 208, 24, (130, 200, 110)))
-LAMP_EDGE = 4
+LAMPS = ((28, 186, 20, (255, 196, 92)), (96, 52, 24, (255, 238, 214)), (134, 166, 28, (90, 190, 214)),
+         (214, 196, 18, (255, 120, 84)), (248, 108, 24, (255, 214, 130)), (328, 176, 30, (214, 82, 110)),
+         (404, 74, 22, (255, 246, 230)), (426, 206, 24, (96, 214, 160)), (508, 158, 30, (255, 206, 96)),
+         (566, 40, 26, (255, 226, 190)), (628, 196, 26, (120, 150, 255)), (700, 124, 24, (255, 140, 90)),
+         (744, 196, 32, (255, 180, 84)), (806, 58, 28, (255, 236, 210)), (842, 166, 30, (230, 90, 130)))
+LAMP_EDGE = 2
 LAMP_STRENGTH = 0.72
-STEP = 4  # of the colours, which keeps pictures small
 
 
 def mix(first, second, part):
@@ -51,7 +49,7 @@ def colour_at(x, y):
     for lamp_x, lamp_y, radius, light in LAMPS:
         distance = ((x - lamp_x) ** 2 + (y - lamp_y) ** 2) ** 0.5
         colour = mix(colour, light, LAMP_STRENGTH * ramp(distance - radius, LAMP_EDGE))
-    return tuple(min(255, STEP * round(channel / STEP)) for channel in colour)
+    return tuple(round(channel) for channel in colour)
 
 
 def painted():

@@ -33,6 +33,7 @@ class Cell:
     text: str = ""  # the strip's, unless given
     size: int = 0  # the strip's, unless given
     cut: bool = False  # show what is left without the margins
+    window: tuple = ()  # show this part alone: left, top, width and height, from the margins' corner
 
 
 @dataclass
@@ -51,6 +52,7 @@ class Strip:
     font: str = "DejaVu Sans:bold"
     align: str = "left"
     boxes: bool = False  # outline the box of the glyphs and the box with the margins
+    enlarged: int = 1  # the side of the square that shows a pixel
 
 
 @dataclass
@@ -88,7 +90,13 @@ class Painter:
         with Image.open(picture) as file:
             image = file.convert("RGBA")
         inner = (PAINT_PADDING, PAINT_PADDING, image.width - PAINT_PADDING, image.height - PAINT_PADDING)
-        return Painted(image.crop(inner), left, top, right, bottom, cell)
+        image = image.crop(inner)
+        if not cell.window:
+            return Painted(image, left, top, right, bottom, cell)
+        x, y, width, height = cell.window
+        part = image.crop((x, y, x + width, y + height))
+        shown = (width * strip.enlarged, height * strip.enlarged)
+        return Painted(part.resize(shown, Image.Resampling.NEAREST), 0, 0, 0, 0, cell)
 
 
 def checks(size):

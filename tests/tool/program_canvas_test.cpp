@@ -381,16 +381,26 @@ TEST(Markup, Places_AreThoseOfTheWrittenText) {
               std::string::npos);
 }
 
-TEST(Markup, CoveredByAGradient_IsNoted) {
+TEST(Markup, CoveredByAnOpaqueEffect_IsNoted) {
+    const auto errorsOf = [](const std::string& style) {
+        const TempDir dir;
+        return runVorelpaint({"--markup", "--style", dir.write("g.json", style), "-o", dir.file("a.png"),
+                              "a <c #f80>b</c>"})
+            .err;
+    };
+    const std::string note =
+        "vorelpaint: note: the look's linearGradient covers the colours of the markup\n";
+    const auto gradient = [](const std::string& stop, const std::string& opacity) {
+        return R"({"linearGradient": {"angle": 90, "opacity": )" + opacity +
+               R"(, "gradient": [{"color": "#00F", "location": 0, "opacity": )" + stop + "}]}}";
+    };
+    EXPECT_EQ(errorsOf(gradient("1", "1")), note);
+    EXPECT_EQ(errorsOf(gradient("0.9", "1")), "");
+    EXPECT_EQ(errorsOf(gradient("1", "0.9")), "");
     const TempDir dir;
-    const std::string style = dir.write(
-        "g.json",
-        R"({"linearGradient": {"angle": 90, "gradient": [{"color": "#00F", "location": 0}]}})");
-    const Outcome outcome =
-        runVorelpaint({"--markup", "--style", style, "-o", dir.file("a.png"), "a <c #f80>b</c>"});
-    EXPECT_EQ(outcome.exitCode, 0);
-    EXPECT_EQ(outcome.err,
-              "vorelpaint: note: the look's linearGradient covers the colours of the markup\n");
+    EXPECT_EQ(
+        runVorelpaint({"--markup", "--preset", "candy", "-o", dir.file("a.png"), "<c #f80>b</c>"}).err,
+        "vorelpaint: note: the look's pattern covers the colours of the markup\n");
 }
 
 TEST(Markup, UnderATranslucentGradient_IsSeen) {

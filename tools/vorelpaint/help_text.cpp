@@ -87,6 +87,8 @@ const std::vector<Topic>& topics() {
          "Where the program is installed, in /usr for a package: "
          "share/doc/vorelpaint/style-files.md lists every key of a style file, "
          "share/doc/vorelpaint/vorelpaint.md tells of batches and reports, "
+         "share/doc/vorelpaint/captions.md has recipes for titles and captions, "
+         "share/doc/vorelpaint/layer-styles.md translates the layer styles of design tools, "
          "share/voreleffect/presets has the presets, and "
          "share/voreleffect/vorelpaint-style.schema.json tells editors what a style file may hold."},
         {"Exit codes",

@@ -40,23 +40,31 @@ Layer layerOf(const StackedLook& stacked) {
     return layer;
 }
 
-template <typename Gradient>
-bool isOpaque(const Effect& effect) {
-    const auto* gradient = std::get_if<Gradient>(&effect);
-    return gradient != nullptr && gradient->opacity >= 1.0F &&
-           std::all_of(gradient->gradient.begin(), gradient->gradient.end(),
-                       [](const VFontEffect::VFGradient& stop) { return stop.mOpacity >= 1.0F; });
-}
-
-/// The effect of a look that leaves nothing to be seen of the fill; empty when there is none.
-std::string coverOf(const LookStyle& look) {
-    for (const Effect& effect : look.effects) {
-        if (isOpaque<vorelstyle::LinearGradient>(effect) ||
-            isOpaque<vorelstyle::RadialGradient>(effect)) {
-            return std::string(effectName(effect));
-        }
+/// Whether an effect may leave nothing to be seen of the fill.
+struct CoversFill {
+    static bool isOpaque(float opacity, const vorelstyle::Stops& stops) {
+        return opacity >= 1.0F && std::all_of(stops.begin(), stops.end(),
+                                              [](const auto& stop) { return stop.mOpacity >= 1.0F; });
     }
-    return "";
+    bool operator()(const vorelstyle::LinearGradient& e) const {
+        return isOpaque(e.opacity, e.gradient);
+    }
+    bool operator()(const vorelstyle::RadialGradient& e) const {
+        return isOpaque(e.opacity, e.gradient);
+    }
+    bool operator()(const vorelstyle::Pattern& e) const { return e.opacity >= 1.0F; }
+    template <typename Other>
+    bool operator()(const Other& /*effect*/) const {
+        return false;
+    }
+};
+
+/// The first effect of a look that covers its fill; empty when there is none.
+std::string coverOf(const LookStyle& look) {
+    const auto cover = std::find_if(look.effects.begin(), look.effects.end(), [](const Effect& effect) {
+        return std::visit(CoversFill(), effect);
+    });
+    return cover == look.effects.end() ? "" : std::string(effectName(*cover));
 }
 
 }  // namespace

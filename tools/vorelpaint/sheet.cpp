@@ -74,7 +74,8 @@ Column columnOf(const Options& options, const SourceText& source, int size, cons
     Column column{setToFit(chosen, source), {}};
     for (const std::string& preset : presetNames()) {
         chosen.preset = preset;
-        const Note noteOfPreset = [&](const std::string& line) { note(preset + ": " + line); };
+        const std::string prefix = preset + ": ";
+        const Note noteOfPreset = [&](const std::string& line) { note(prefix + line); };
         column.cells.push_back(
             {LayerSet(chosen, chosenStyle(chosen), size, source.colours(), noteOfPreset),
              labelOf(chosen, preset, size)});
@@ -197,6 +198,7 @@ void paintSheet(const Options& options, const Note& note) {
         options.sheetSizes.empty() ? std::vector<int>{options.size} : options.sheetSizes;
     HeldNotes notes;
     std::vector<Column> columns;
+    columns.reserve(sizes.size());
     for (const int size : sizes)
         columns.push_back(columnOf(options, source, size, notes.taker()));
     const Grid grid = gridOf(columns, options.canvas.padding);

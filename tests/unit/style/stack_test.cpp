@@ -135,7 +135,9 @@ std::vector<std::string> wordsOf(const Description& looks) {
     std::vector<std::string> words;
     for (const auto& [x, y, span, isFilled, fill] : looks) {
         if (!isPlain(looks)) {
-            words.push_back("place: moved by " + std::to_string(x) + ", " + std::to_string(y) +
+            const bool moved = x != 0 || y != 0;
+            const std::string offset = std::to_string(x) + ", " + std::to_string(y);
+            words.push_back("place: " + (moved ? "moved by " + offset : "not moved") +
                             spans[static_cast<size_t>(span)] + (isFilled ? "" : ", not filled"));
         }
         words.push_back(std::string("text: colour #") + (!isFilled   ? "00000000"

@@ -90,7 +90,7 @@ TEST(Font, WithoutVerticalMetrics_IsRefused) {
 TEST(Font, WithoutOutlinesOrPictures_IsRefused) {
     MadeFont made = letters();
     made.pictures = Pictures::withoutOutlines;
-    made.ppem = 8;
+    made.ppems = {8};
     EXPECT_EQ(faultOf(viewOf(made.bytes())), "");
     std::string plain = made.bytes();
     // Bitmaps without colours are kept in tables of other names.
@@ -127,7 +127,7 @@ TEST(Font, Colours_AreThoseOfPicturesAndOfLayers) {
 TEST(Font, OfPictures_HasTheMetricsOfItsSize) {
     MadeFont made = letters();
     made.pictures = Pictures::withoutOutlines;
-    made.ppem = 64;
+    made.ppems = {64};
     // 48 pixels up and 16 down at 64 pixels to the em: at 20 it is 15 and 5, at 18 13.5 and 4.5.
     const Font font = openMade(made, 20);
     EXPECT_EQ(font.picturePpem(), 64);
@@ -138,6 +138,19 @@ TEST(Font, OfPictures_HasTheMetricsOfItsSize) {
     EXPECT_EQ(font.scaled(-64), -20);
     EXPECT_EQ(openMade(made, 18).ascender(), 14 * 64);
     EXPECT_EQ(openMade(made, 18).descender(), -5 * 64);
+}
+
+TEST(Font, SeveralSizesOfPictures_TheNextLargerIsTaken) {
+    MadeFont made = letters();
+    made.pictures = Pictures::withoutOutlines;
+    made.ppems = {20, 64, 10, 32};
+    const auto taken = [&](int sizePx) { return openMade(made, sizePx).picturePpem(); };
+    EXPECT_EQ(taken(1), 10);
+    EXPECT_EQ(taken(10), 10);
+    EXPECT_EQ(taken(11), 20);
+    EXPECT_EQ(taken(32), 32);
+    EXPECT_EQ(taken(33), 64);
+    EXPECT_EQ(taken(100), 64) << "the largest where none is large enough";
 }
 
 TEST(Font, Moved_IsTheSameFont) {

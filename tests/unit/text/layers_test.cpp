@@ -10,6 +10,7 @@
 
 #include "text/overlay.h"
 #include "text/utf8.h"
+#include "unit/text/test_font.h"
 
 namespace voreltext {
 namespace {
@@ -235,7 +236,7 @@ TEST(ColouredParts, ChangeTheirGlyphsAlone) {
 
     Image covered{image.width, image.height, std::vector<uint8_t>(image.pixels.size())};
     const Canvas canvas = around(sample.layout(), {layer});
-    for (const size_t i : {1, 2}) {
+    for (const size_t i : {1U, 2U}) {
         const GlyphMask mask = sample.layout().rasterise(i);
         Image glyph{mask.box.width(), mask.box.height(), {}};
         for (const uint8_t each : mask.coverage)
@@ -247,6 +248,52 @@ TEST(ColouredParts, ChangeTheirGlyphsAlone) {
         ASSERT_TRUE(std::equal(&image.pixels[at], &image.pixels[at] + 4, &wanted.pixels[at])) << at;
     }
     EXPECT_NE(image.pixels, asRed.pixels);
+}
+
+/// A glyph of a colour font: the effects are made of its coverage, and its picture lies on them.
+class PictureLayer : public ::testing::Test {
+  protected:
+    PictureLayer() {
+        mEffects.addStrokeText(5, 0x0000FF, 1, 0, 1);
+        mEffects.addText(0x00FF00, 1);
+    }
+
+    Image painted(bool takesPictures, float opacity = 1) {
+        Layer layer{&mEffects};
+        layer.takesPictures = takesPictures;
+        layer.pictureOpacity = opacity;
+        return paint({layer}, mLayout, around(mLayout, {layer}));
+    }
+
+    VFEffect mEffects;
+    Fonts mFonts{Font(FontFile{vorel_test::kEmojiFont}, kSize)};
+    TextLayout mLayout{mFonts, {0x1F600}};
+};
+
+TEST_F(PictureLayer, CoverageIsPaintedLikeThatOfText) {
+    const Image image = painted(false);
+    const uint8_t* middle = pixelAt(image, image.width / 2, image.height / 2);
+    EXPECT_EQ(std::vector<int>(middle, middle + 4), (std::vector<int>{0, 255, 0, 255}));
+    int top = 0;
+    while (pixelAt(image, image.width / 2, top)[3] < 255)
+        ++top;
+    const uint8_t* rim = pixelAt(image, image.width / 2, top);
+    EXPECT_EQ(std::vector<int>(rim, rim + 4), (std::vector<int>{0, 0, 255, 255}));
+}
+
+TEST_F(PictureLayer, PictureLiesOverTheFill) {
+    const Image image = painted(true);
+    Image wanted = painted(false);
+    const GlyphMask mask = mLayout.rasterise(0);
+    ASSERT_FALSE(mask.pixels.empty());
+    layOver(wanted, {mask.box.width(), mask.box.height(), mask.pixels}, 5, 5);
+    EXPECT_EQ(image.pixels, wanted.pixels);
+    EXPECT_NE(image.pixels, painted(false).pixels);
+}
+
+TEST_F(PictureLayer, PictureFadesWithTheText) {
+    EXPECT_EQ(painted(true, 0).pixels, painted(false).pixels);
+    EXPECT_NE(painted(true, 0.5F).pixels, painted(true).pixels);
 }
 
 TEST(ColouredParts, OfGlyphsThatOverlap_TheLastIsSeen) {

@@ -41,12 +41,12 @@ TEST(LineBreaks, Punctuation_StaysWithItsWord) {
 
 TEST(LineBreaks, GlueAndWordJoiner_ForbidOne) {
     EXPECT_EQ(barred("10\xC2\xA0km"), "10\xC2\xA0km");
-    EXPECT_EQ(barred("a-\xE2\x81\xA0z"), "a-\xE2\x81\xA0z");
+    EXPECT_EQ(barred("a-\u2060z"), "a-\u2060z");
 }
 
 TEST(LineBreaks, SoftHyphenAndZeroWidthSpace_AllowOne) {
-    EXPECT_EQ(barred("ex\xC2\xADtra"), "ex\xC2\xAD|tra");
-    EXPECT_EQ(barred("สวัส\xE2\x80\x8Bดี"), "สวัส\xE2\x80\x8B|ดี") << "Thai breaks nowhere else";
+    EXPECT_EQ(barred("ex\u00ADtra"), "ex\u00AD|tra");
+    EXPECT_EQ(barred("สวัส\u200Bดี"), "สวัส\u200B|ดี") << "Thai breaks nowhere else";
 }
 
 TEST(LineBreaks, Ideographs_AllowOneBetweenThem) {
@@ -60,8 +60,8 @@ TEST(LineBreaks, Pictographs_BreakBetweenEachOther) {
     EXPECT_EQ(barred("😀😀"), "😀|😀");
     EXPECT_EQ(barred("😀🫠"), "😀|🫠") << "one of Unicode 14";
     EXPECT_EQ(barred("👍🏽👍"), "👍🏽|👍") << "its tone stays with it";
-    EXPECT_EQ(barred("👩‍👧"), "👩‍👧") << "what is joined stays together";
-    EXPECT_EQ(barred("❤️ a"), "❤️ |a");
+    EXPECT_EQ(barred("👩\u200D👧"), "👩\u200D👧") << "what is joined stays together";
+    EXPECT_EQ(barred("❤\uFE0F a"), "❤\uFE0F |a");
 }
 
 TEST(LineBreaks, AnyCharacter_IsTaken) {

@@ -208,35 +208,47 @@ void addLayers(Tables& tables, const MadeFont& font, const std::vector<MadeGlyph
     tables["CPAL"] = palette.bytes();
 }
 
-/// One size of pictures in CBDT, their places in CBLC.
-void addBitmaps(Tables& tables, const MadeFont& font, const std::vector<MadeGlyph>& all) {
-    Table data;
-    data.u32(0x30000);
+/// The pictures of a size in CBDT, which follow on `data`; the table of their places.
+std::string addBitmapData(Table& data, const MadeFont& font, const std::vector<MadeGlyph>& all,
+                          int ppem) {
     Table places;
-    places.u16(1).u16(17).u32(4);
+    places.u16(0).u16(all.size() - 1).u32(8);
+    places.u16(1).u16(17).u32(data.size());
+    const size_t begin = data.size();
     for (const MadeGlyph& glyph : all) {
-        places.u32(data.size() - 4);
+        places.u32(data.size() - begin);
         if (!glyph.picture) continue;
         const MadePicture& picture = *glyph.picture;
         const std::string png = pngOf(picture);
         data.i8(picture.height).i8(picture.width).i8(picture.left).i8(picture.top);
-        data.i8(glyph.advance * font.ppem / font.unitsPerEm).u32(png.size()).text(png);
+        data.i8(glyph.advance * ppem / font.unitsPerEm).u32(png.size()).text(png);
     }
-    places.u32(data.size() - 4);
-    tables["CBDT"] = data.bytes();
-    Table sizes;
-    sizes.u32(0x30000).u32(1);
-    sizes.u32(56).u32(8 + places.size()).u32(1).u32(0);
-    const int ascender = font.ascender * font.ppem / font.unitsPerEm;
-    const int descender = font.descender * font.ppem / font.unitsPerEm;
-    for (int direction = 0; direction < 2; ++direction)
-        sizes.i8(ascender).i8(descender).i8(font.ppem).zeros(9);
-    sizes.u16(0).u16(all.size() - 1).i8(font.ppem).i8(font.ppem).u8(32).u8(1);
-    sizes.u16(0).u16(all.size() - 1).u32(8).text(places.bytes());
-    tables["CBLC"] = sizes.bytes();
+    places.u32(data.size() - begin);
+    return places.bytes();
 }
 
-/// One size of pictures in sbix.
+/// The same pictures at each size in CBDT, their places in CBLC.
+void addBitmaps(Tables& tables, const MadeFont& font, const std::vector<MadeGlyph>& all) {
+    Table data;
+    data.u32(0x30000);
+    Table sizes;
+    sizes.u32(0x30000).u32(font.ppems.size());
+    Table places;
+    for (const int ppem : font.ppems) {
+        const std::string table = addBitmapData(data, font, all, ppem);
+        sizes.u32(8 + 48 * font.ppems.size() + places.size()).u32(table.size()).u32(1).u32(0);
+        places.text(table);
+        for (int direction = 0; direction < 2; ++direction) {
+            sizes.i8(font.ascender * ppem / font.unitsPerEm).i8(font.descender * ppem / font.unitsPerEm);
+            sizes.i8(ppem).zeros(9);
+        }
+        sizes.u16(0).u16(all.size() - 1).i8(ppem).i8(ppem).u8(32).u8(1);
+    }
+    tables["CBDT"] = data.bytes();
+    tables["CBLC"] = sizes.text(places.bytes()).bytes();
+}
+
+/// The first size of pictures in sbix.
 void addApplesPictures(Tables& tables, const MadeFont& font, const std::vector<MadeGlyph>& all) {
     Table places;
     Table data;
@@ -253,7 +265,7 @@ void addApplesPictures(Tables& tables, const MadeFont& font, const std::vector<M
                          .u16(1)
                          .u32(1)
                          .u32(12)
-                         .i16(font.ppem)
+                         .i16(font.ppems.front())
                          .u16(72)
                          .text(places.bytes())
                          .text(data.bytes())

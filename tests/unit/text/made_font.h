@@ -54,7 +54,7 @@ struct MadeFont {
     std::vector<MadeGlyph> glyphs;
     std::vector<uint32_t> colours;  ///< 0xRRGGBBAA
     Pictures pictures = Pictures::none;
-    int ppem = 0;  ///< of the pictures
+    std::vector<int> ppems;  ///< of the pictures, which are the same in each
 
     std::string bytes() const;
 };

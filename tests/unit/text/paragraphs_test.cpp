@@ -41,8 +41,8 @@ TEST(Paragraphs, FirstLetterWithADirection_Decides) {
     EXPECT_FALSE(goesLeft("abc שלום"));
     EXPECT_TRUE(goesLeft("שלום abc"));
     EXPECT_TRUE(goesLeft("123 (بسم abc"));
-    EXPECT_TRUE(goesLeft("\xE2\x80\x8F!")) << "a mark without a glyph";
-    EXPECT_FALSE(goesLeft("\xE2\x81\xA7שלום\xE2\x81\xA9 abc")) << "what is isolated does not count";
+    EXPECT_TRUE(goesLeft("\u200F!")) << "a mark without a glyph";
+    EXPECT_FALSE(goesLeft("\u2067שלום\u2069 abc")) << "what is isolated does not count";
 }
 
 }  // namespace

@@ -41,7 +41,7 @@ std::vector<uint8_t> literalPixel(const Source& source, const PicturePlace& plac
         }
     }
     std::vector<uint8_t> colour;
-    for (const size_t channel : {2, 1, 0, 3})
+    for (const size_t channel : {2U, 1U, 0U, 3U})
         colour.push_back(static_cast<uint8_t>(sums[channel] / (pixel * pixel)));
     return colour;
 }

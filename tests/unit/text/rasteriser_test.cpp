@@ -33,7 +33,7 @@ MadeFont layered() {
 MadeFont pictured(Pictures kind) {
     MadeFont font;
     font.pictures = kind;
-    font.ppem = 8;
+    font.ppems = {8};
     const std::vector<uint8_t> pixels{255, 0, 0, 255, 0, 0, 200, 51};
     font.glyphs = {{'a', 640, Rectangle{0, 0, 64, 64}, {}, {{2, 1, 1, 3, pixels}}},
                    {'b', 640, Rectangle{0, 0, 64, 64}}};

@@ -415,13 +415,12 @@ TEST_F(MadeLayoutTest, ClusterThatIsTooWide_IsRefused) {
 TEST_F(MadeLayoutTest, LetterSpacing_CountsForTheWidth) {
     EXPECT_EQ(wrapped("abc de", 34, 2 * 64), (Lines{"abc ", "de"}));
     EXPECT_EQ(wrapped("abc de", 33, 2 * 64), (Lines{"ab", "c ", "de"}));
+    EXPECT_EQ(wrapped("ab cd ef", 53, 2 * 64), (Lines{"ab cd ", "ef"})) << "no gap at the end";
     EXPECT_EQ(wrapped("abc de", 40, -4 * 64), Lines{"abc de"}) << "50 + 5 - 5 * 4 is 35";
 }
 
 TEST_F(MadeLayoutTest, SoftHyphen_IsSeenWhereALineEndsWithIt) {
-    const std::string word =
-        "ab\xC2\xAD"
-        "cd";
+    const std::string word = "ab\u00ADcd";
     EXPECT_EQ(layOut(word).glyphCount(), 4U);
     EXPECT_EQ(layOut(word).lines()[0].box.width(), 40) << "elsewhere it is nothing";
     const TextLayout broken = layOut(word, wrappedAt(25));
@@ -433,7 +432,7 @@ TEST_F(MadeLayoutTest, SoftHyphen_IsSeenWhereALineEndsWithIt) {
     const TextLayout narrow = layOut(word, wrappedAt(24));
     EXPECT_EQ(narrow.lines()[0].end, 2U);
     EXPECT_EQ(narrow.glyphCount(), 4U) << "without room for a hyphen, the word is broken like any";
-    const TextLayout last = layOut("ab\xC2\xAD", wrappedAt(25));
+    const TextLayout last = layOut("ab\u00AD", wrappedAt(25));
     EXPECT_EQ(last.glyphCount(), 2U) << "none at the end of the text";
 }
 
@@ -441,30 +440,47 @@ TEST_F(MadeLayoutTest, WithoutAHyphen_TheSoftOneStaysUnseen) {
     MadeFont made = letters();
     made.glyphs.erase(made.glyphs.end() - 2);
     mFonts = Fonts{openMade(made)};
-    const TextLayout broken = layOut(
-        "ab\xC2\xAD"
-        "cd",
-        wrappedAt(20));
+    const TextLayout broken = layOut("ab\u00ADcd", wrappedAt(20));
     EXPECT_EQ(broken.lines().size(), 2U);
     EXPECT_EQ(broken.glyphCount(), 4U);
     EXPECT_TRUE(broken.missing().empty());
 }
 
 TEST_F(MadeLayoutTest, ZeroWidthSpace_AllowsABreak) {
-    EXPECT_EQ(layOut("abc\xE2\x80\x8B"
-                     "def",
-                     wrappedAt(45))
-                  .lines()[0]
-                  .end,
-              4U);
+    EXPECT_EQ(layOut("abc\u200Bdef", wrappedAt(45)).lines()[0].end, 4U);
     EXPECT_EQ(layOut("abcdef", wrappedAt(45)).lines()[0].end, 4U) << "else between any";
 }
 
 TEST_F(MadeLayoutTest, LongWord_IsNotShapedAnewForEachOfItsLines) {
-    // 20,000 letters in as many lines: minutes, were it.
-    EXPECT_EQ(faultOf(std::string(20000, 'a'), wrappedAt(10)),
+    // 16 letters a line, of which the picture has room for 1024: hours, were it.
+    const TextSettings narrow = wrappedAt(160);
+    EXPECT_EQ(faultOf(std::string(1000000, 'a'), narrow),
               "the text would be more than 16384 pixels wide or high");
-    EXPECT_EQ(layOut(std::string(100000, 'a'), wrappedAt(16000)).lines().size(), 63U);
+    EXPECT_EQ(layOut(std::string(16000, 'a'), narrow).lines().size(), 1000U);
+}
+
+TEST_F(MadeLayoutTest, Hyphen_IsOfTheFontOfItsWord) {
+    MadeFont digits;
+    for (uint32_t code = '0'; code <= '9'; ++code)
+        digits.glyphs.push_back({code, 640, vorel_test::Rectangle{64, 0, 576, 512}});
+    digits.glyphs.push_back({'-', 320, vorel_test::Rectangle{0, 0, 64, 64}});
+    mFonts.add(openMade(digits));
+    const TextLayout text = layOut("12\u00AD34", wrappedAt(25));
+    ASSERT_EQ(text.glyphCount(), 5U);
+    EXPECT_EQ(text.glyph(2).cluster, 2U);
+    EXPECT_EQ(text.glyph(2).font, 1U);
+}
+
+TEST(LargePicture, BeyondTheLimit_IsRefused) {
+    MadeFont made;
+    made.pictures = vorel_test::Pictures::withoutOutlines;
+    made.ppems = {1};
+    made.glyphs = {{'a', 64, {}, {}, {{3, 1, 0, 1, std::vector<uint8_t>(12, 255)}}}};
+    Fonts fonts{openMade(made, 5000)};
+    EXPECT_EQ(TextLayout(fonts, {'a'}).glyph(0).box.width(), 15000);
+    Fonts larger{openMade(made, 6000)};
+    EXPECT_EQ(vorel_test::faultOf([&] { TextLayout(larger, {'a'}); }),
+              "the text would be more than 16384 pixels wide or high");
 }
 
 TEST_F(TextLayoutTest, WrappedMixedDirections_AreOrderedLineByLine) {
@@ -491,6 +507,28 @@ TEST_F(TextLayoutTest, LatinAmongHebrew_IsBrokenAtItsEnd) {
     ASSERT_EQ(text.lines().size(), 2U);
     EXPECT_EQ(text.lines()[0].begin, 0U);
     EXPECT_EQ(text.lines()[0].end, 9U) << "abc is in the first line, though def stands left of it";
+}
+
+TEST_F(TextLayoutTest, HyphenOfALatinWord_StandsAtItsRight) {
+    TextSettings settings;
+    settings.wrapWidth = layOut("אב abc-").lines()[0].box.width();
+    const TextLayout text(mFonts, decodeUtf8("אב abc\u00ADdef"), settings);
+    ASSERT_EQ(text.lines().size(), 2U);
+    std::vector<size_t> clusters;
+    for (size_t i = 0; i < 6; ++i)
+        clusters.push_back(text.glyph(i).cluster);
+    EXPECT_EQ(clusters, (std::vector<size_t>{3, 4, 5, 6, 1, 0})) << "abc- and then the Hebrew word";
+}
+
+TEST_F(TextLayoutTest, OverriddenDirection_GoesOnInTheNextLine) {
+    TextSettings settings;
+    settings.wrapWidth = layOut("abc").lines()[0].box.width();
+    const TextLayout text(mFonts, decodeUtf8("\u202Eabc def\u202C"), settings);
+    ASSERT_EQ(text.lines().size(), 2U);
+    std::vector<size_t> clusters;
+    for (size_t i = 0; i < text.glyphCount(); ++i)
+        clusters.push_back(text.glyph(i).cluster);
+    EXPECT_EQ(clusters, (std::vector<size_t>{3, 2, 1, 7, 6, 5}));
 }
 
 TEST_F(TextLayoutTest, LetterSpacing_PartsLigatures) {

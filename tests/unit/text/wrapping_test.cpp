@@ -17,7 +17,7 @@ Wrapping wrappingOf(const std::string& text) {
     std::vector<ShapedGlyph> glyphs;
     for (size_t i = 0; i < codes.size(); ++i)
         glyphs.push_back({1, 0, i, 10, 0, 0});
-    return {{1, 0, codes, false}, glyphs};
+    return {splitParagraphs(codes).front(), glyphs};
 }
 
 TEST(Wrapping, LastFittingEnd_IsThatOfAWord) {
@@ -57,7 +57,7 @@ TEST(Wrapping, Blanks_EndNoPart) {
 
 TEST(Wrapping, Cluster_IsNotCut) {
     const std::vector<ShapedGlyph> glyphs{{1, 0, 0, 10, 0, 0}, {1, 0, 1, 30, 0, 0}, {1, 0, 4, 10, 0, 0}};
-    const Wrapping wrapping({1, 0, decodeUtf8("a日本語b"), false}, glyphs);
+    const Wrapping wrapping(splitParagraphs(decodeUtf8("a日本語b")).front(), glyphs);
     EXPECT_EQ(wrapping.endAfter(Ends::ofWords, 1), 4U);
     EXPECT_EQ(wrapping.endAfter(Ends::ofClusters, 1), 4U);
     EXPECT_EQ(wrapping.width(0, 2), 20) << "each of its characters has a third of it";
@@ -65,11 +65,7 @@ TEST(Wrapping, Cluster_IsNotCut) {
 
 TEST(Wrapping, SoftHyphen_PartsALigature) {
     const std::vector<ShapedGlyph> glyphs{{1, 0, 0, 30, 0, 0}};
-    const Wrapping wrapping({1, 0,
-                             decodeUtf8("f\xC2\xAD"
-                                        "i"),
-                             false},
-                            glyphs);
+    const Wrapping wrapping(splitParagraphs(decodeUtf8("f\u00ADi")).front(), glyphs);
     EXPECT_EQ(wrapping.endAfter(Ends::ofWords, 0), 2U);
     EXPECT_EQ(wrapping.endAfter(Ends::ofClusters, 0), 3U);
 }
