@@ -217,7 +217,7 @@ TEST(ColouredParts, ChangeTheirGlyphsAlone) {
 
     Image covered{image.width, image.height, std::vector<uint8_t>(image.pixels.size())};
     const Canvas canvas = around(sample.layout(), {layer});
-    for (const size_t i : {1, 2}) {
+    for (const size_t i : {1U, 2U}) {
         const GlyphMask mask = sample.layout().rasterise(i);
         Image glyph{mask.box.width(), mask.box.height(), {}};
         for (const uint8_t each : mask.coverage)
