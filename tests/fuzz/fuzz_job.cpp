@@ -3,7 +3,7 @@
 #include <cstdint>
 #include <string>
 
-#include "batch.h"
+#include "batch_job.h"
 #include "demand.h"
 #include "error.h"
 #include "settings.h"

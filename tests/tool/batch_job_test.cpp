@@ -1,4 +1,4 @@
-#include "batch.h"
+#include "batch_job.h"
 
 #include <gtest/gtest.h>
 
@@ -30,7 +30,7 @@ std::string faultOfMember(const std::string& member) {
     return faultOf(R"({"text": "A", "output": "a.png", )" + member + "}");
 }
 
-TEST(Batch, EachKey_IsRead) {
+TEST(BatchJob, EachKey_IsRead) {
     const Options job = jobOf(
         R"("font": "DejaVu Serif", "size": 12, "align": "right", "preset": "gold", "effect-scale": 2.5,
            "color": "#010203", "opacity": 0.25, "background": "checkerboard", "padding": 0)");
@@ -47,7 +47,7 @@ TEST(Batch, EachKey_IsRead) {
     EXPECT_EQ(job.canvas.padding, 0);
 }
 
-TEST(Batch, KeysOfTextAndCanvas_AreRead) {
+TEST(BatchJob, KeysOfTextAndCanvas_AreRead) {
     const Options job = jobOf(
         R"("font": ["DejaVu Sans", "DejaVu Serif"], "font-features": "liga=0,ss01",
            "font-variations": "wght=700,wdth=80.5", "markup": true, "line-height": 1.5,
@@ -70,7 +70,7 @@ TEST(Batch, KeysOfTextAndCanvas_AreRead) {
     EXPECT_EQ(job.align, voreltext::Align::end);
 }
 
-TEST(Batch, LetterSpacing_IsANumberOrALength) {
+TEST(BatchJob, LetterSpacing_IsANumberOrALength) {
     EXPECT_EQ(jobOf(R"("letter-spacing": -3)").letterSpacing, (vorelstyle::Length{-3}));
     EXPECT_EQ(jobOf(R"("letter-spacing": "4px")").letterSpacing, (vorelstyle::Length{4}));
     EXPECT_EQ(faultOfMember(R"("letter-spacing": true)"),
@@ -79,7 +79,7 @@ TEST(Batch, LetterSpacing_IsANumberOrALength) {
               "letter-spacing: '4em' is no length from -200 to 200 in pixels or, with a %, in percent");
 }
 
-TEST(Batch, FontsOfAJob_TakeThePlaceOfTheCommon) {
+TEST(BatchJob, FontsOfAJob_TakeThePlaceOfTheCommon) {
     Options common;
     common.fonts = {"A", "B"};
     EXPECT_EQ(parseJob(R"({"text": "x", "output": "a.png", "font": "C"})", common).fonts,
@@ -92,28 +92,28 @@ TEST(Batch, FontsOfAJob_TakeThePlaceOfTheCommon) {
               "font: must name a file: jobs have no standard input or output");
 }
 
-TEST(Batch, Flags_AreTrueOrFalse) {
+TEST(BatchJob, Flags_AreTrueOrFalse) {
     Options common;
     common.markup = true;
     EXPECT_FALSE(parseJob(R"({"text": "x", "output": "a.png", "markup": false})", common).markup);
     EXPECT_EQ(faultOfMember(R"("markup": 1)"), "markup: must be true or false, not a number");
 }
 
-TEST(Batch, FitWithoutASide_IsRefused) {
+TEST(BatchJob, FitWithoutASide_IsRefused) {
     EXPECT_EQ(faultOfMember(R"("fit": "wrap", "height": 9)"),
               "fit: wrap breaks lines at a width; none is given");
     EXPECT_EQ(faultOfMember(R"("fit": "shrink")"),
               "fit: shrink makes a text fit a width or a height; neither is given");
 }
 
-TEST(Batch, Numbers_AreReadAsTheCommandLineReadsThem) {
+TEST(BatchJob, Numbers_AreReadAsTheCommandLineReadsThem) {
     EXPECT_EQ(jobOf(R"("opacity": 1e-1)").opacity, 0.1F);
     EXPECT_EQ(jobOf(R"("effect-scale": 0.7)").effectScale, 0.7F);
     EXPECT_EQ(jobOf(R"("size": 96.0)").size, 96);
     EXPECT_EQ(jobOf(R"("width": 1e3)").canvas.width, 1000);
 }
 
-TEST(Batch, Style_IsAFileOrAnObject) {
+TEST(BatchJob, Style_IsAFileOrAnObject) {
     EXPECT_EQ(jobOf(R"("style": "look.json")").style, "look.json");
     const Options job = jobOf(R"("style": {"outerGlow": {"size": 3, "color": "#0000FF"}})");
     ASSERT_TRUE(job.inlineStyle);
@@ -121,7 +121,7 @@ TEST(Batch, Style_IsAFileOrAnObject) {
     EXPECT_EQ(std::get<vorelstyle::OuterGlow>(job.inlineStyle->looks[0].effects[0]).size.value, 3.0F);
 }
 
-TEST(Batch, WhatAJobDoesNotSay_IsTheCommandLines) {
+TEST(BatchJob, WhatAJobDoesNotSay_IsTheCommandLines) {
     Options common;
     common.size = 33;
     common.preset = "gold";
@@ -132,7 +132,7 @@ TEST(Batch, WhatAJobDoesNotSay_IsTheCommandLines) {
     EXPECT_EQ(job.text, "common");
 }
 
-TEST(Batch, WhatAJobSays_ReplacesTheOtherOfThePair) {
+TEST(BatchJob, WhatAJobSays_ReplacesTheOtherOfThePair) {
     Options common;
     common.preset = "gold";
     common.textFile = "words.txt";
@@ -143,7 +143,7 @@ TEST(Batch, WhatAJobSays_ReplacesTheOtherOfThePair) {
     EXPECT_FALSE(jobOf(R"("preset": "neon")", common).style);
 }
 
-TEST(Batch, UnknownKeys_AreRefusedWithTheKnownOnes) {
+TEST(BatchJob, UnknownKeys_AreRefusedWithTheKnownOnes) {
     EXPECT_EQ(
         faultOfMember(R"("colour": "#000000")"),
         "colour: unknown key; did you mean color? Known are text, text-file, markup, align, "
@@ -154,7 +154,7 @@ TEST(Batch, UnknownKeys_AreRefusedWithTheKnownOnes) {
     EXPECT_EQ(faultOfMember(R"("help": true)").rfind("help: unknown key", 0), 0U);
 }
 
-TEST(Batch, WrongTypes_AreNamed) {
+TEST(BatchJob, WrongTypes_AreNamed) {
     EXPECT_EQ(faultOf("[]"), "must be an object, not an array");
     EXPECT_EQ(faultOfMember(R"("size": "12")"), "size: must be a number, not a string");
     EXPECT_EQ(faultOfMember(R"("align": 1)"), "align: must be a string, not a number");
@@ -162,7 +162,7 @@ TEST(Batch, WrongTypes_AreNamed) {
     EXPECT_EQ(faultOf(R"({"text": null, "output": "a.png"})"), "text: must be a string, not null");
 }
 
-TEST(Batch, WrongValues_AreNamedWithTheirRange) {
+TEST(BatchJob, WrongValues_AreNamedWithTheirRange) {
     EXPECT_EQ(faultOfMember(R"("size": 0)"), "size: '0' is no whole number from 1 to 1000");
     EXPECT_EQ(faultOfMember(R"("size": 12.5)"), "size: '12.5' is no whole number from 1 to 1000");
     EXPECT_EQ(faultOfMember(R"("align": "middle")"),
@@ -170,7 +170,7 @@ TEST(Batch, WrongValues_AreNamedWithTheirRange) {
     EXPECT_EQ(faultOfMember(R"("color": "red")"), "color: 'red' is no colour; write #RRGGBB or #RGB");
 }
 
-TEST(Batch, FaultsOfAnInlineStyle_HaveTheirPath) {
+TEST(BatchJob, FaultsOfAnInlineStyle_HaveTheirPath) {
     EXPECT_EQ(faultOfMember(R"("style": {"stroke": {"size": 200}})"),
               "style.stroke.size: 200 is out of range, 0 to 100");
     EXPECT_EQ(faultOfMember(R"("style": {"stroke": {"size": 1, "size": 2}})"),
@@ -178,17 +178,17 @@ TEST(Batch, FaultsOfAnInlineStyle_HaveTheirPath) {
     EXPECT_EQ(faultOfMember(R"("style": {"glow": {}})").rfind("style.glow: unknown key", 0), 0U);
 }
 
-TEST(Batch, Pairs_AreRefused) {
+TEST(BatchJob, Pairs_AreRefused) {
     EXPECT_EQ(faultOfMember(R"("text-file": "t")"), "text-file: stands beside text");
     EXPECT_EQ(faultOfMember(R"("style": {}, "preset": "gold")"), "preset: stands beside style");
 }
 
-TEST(Batch, MissingOutputOrText_IsNamed) {
+TEST(BatchJob, MissingOutputOrText_IsNamed) {
     EXPECT_EQ(faultOf(R"({"text": "A"})"), "output: missing; the PNG file to write");
     EXPECT_EQ(faultOf(R"({"output": "a.png"})"), "text: missing; a job has text or text-file");
 }
 
-TEST(Batch, StandardInputAndOutput_AreNotForJobs) {
+TEST(BatchJob, StandardInputAndOutput_AreNotForJobs) {
     const std::string refusal = "must name a file: jobs have no standard input or output";
     EXPECT_EQ(faultOf(R"({"text": "A", "output": "-"})"), "output: " + refusal);
     EXPECT_EQ(faultOf(R"({"text-file": "-", "output": "a.png"})"), "text-file: " + refusal);
@@ -196,11 +196,11 @@ TEST(Batch, StandardInputAndOutput_AreNotForJobs) {
     EXPECT_EQ(parseJob(R"({"text": "-", "output": "a.png"})", kCommon).text, "-");
 }
 
-TEST(Batch, NulInAName_IsRefused) {
+TEST(BatchJob, NulInAName_IsRefused) {
     EXPECT_EQ(faultOf(R"({"text": "A", "output": "a.png\u0000.txt"})"), "output: has a NUL character");
 }
 
-TEST(Batch, SyntaxErrors_NameTheColumn) {
+TEST(BatchJob, SyntaxErrors_NameTheColumn) {
     EXPECT_EQ(faultOf(R"({"text": })").rfind("no valid JSON: column 10: ", 0), 0U)
         << faultOf(R"({"text": })");
     EXPECT_EQ(faultOf(R"({"text": "A"} {})").rfind("no valid JSON: column 15: ", 0), 0U)
@@ -208,7 +208,7 @@ TEST(Batch, SyntaxErrors_NameTheColumn) {
     EXPECT_EQ(faultOf(R"({"text": "A", "text": "B"})"), "text: key given twice");
 }
 
-TEST(Batch, OverlongLine_IsRefused) {
+TEST(BatchJob, OverlongLine_IsRefused) {
     EXPECT_EQ(faultOf(std::string((1 << 18) + 1, ' ')), "longer than 262144 bytes");
 }
 
