@@ -17,7 +17,6 @@ namespace vorelpaint {
 namespace {
 
 using Bytes = std::vector<uint8_t>;
-using vorel_test::readBytes;
 using voreltext::Image;
 
 constexpr std::array<PngEffort, 3> kEfforts{PngEffort::fast, PngEffort::normal, PngEffort::small};
@@ -155,17 +154,6 @@ TEST_F(PngWriter, PresetsTogether_AreSmallerThanByLibpng) {
     }
     EXPECT_LT(fast, byLibpng);
     EXPECT_LE(normal, fast);
-}
-
-TEST_F(PngWriter, File_HoldsTheBytes) {
-    const Image image = photograph(20, 10);
-    const std::string path = mDir.file("b.png");
-    std::FILE* file = std::fopen(path.c_str(), "wb");
-    ASSERT_NE(file, nullptr);
-    writePng(file, image);
-    std::fclose(file);
-    const Bytes wanted = encodedPng(image, PngEffort::normal);
-    EXPECT_EQ(readBytes(path), std::string(wanted.begin(), wanted.end()));
 }
 
 }  // namespace

@@ -207,6 +207,17 @@ void RunningVorelpaint::send(int signal) const {
     ::kill(mChild, signal);
 }
 
+bool RunningVorelpaint::freeze() const {
+    send(SIGSTOP);
+    siginfo_t info{};
+    ::waitid(P_PID, static_cast<id_t>(mChild), &info, WSTOPPED | WEXITED | WNOWAIT);
+    return info.si_code == CLD_STOPPED;
+}
+
+void RunningVorelpaint::thaw() const {
+    send(SIGCONT);
+}
+
 bool RunningVorelpaint::isWritingIn(const fs::path& directory) const {
     const std::string begin = (directory / ".vorelpaint.").string();
     const std::string unnamed = (directory / "#").string();

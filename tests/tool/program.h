@@ -63,6 +63,9 @@ class RunningVorelpaint {
 
     void send(int signal) const;
 
+    bool freeze() const;  ///< whether it stands still; it may have ended instead
+    void thaw() const;
+
     /// Whether it has a file in this directory open that is not finished: of a passing name, or of none.
     bool isWritingIn(const std::filesystem::path& directory) const;
 

@@ -7,7 +7,6 @@
 #include <csignal>
 #include <cstdlib>
 #include <filesystem>
-#include <random>
 #include <string>
 #include <thread>
 #include <tuple>
@@ -84,7 +83,8 @@ class StoppedProgram : public ::testing::TestWithParam<std::tuple<int, bool>> {
     TempDir mInputs;
 
   private:
-    /// Whether the signal found it at work; it has ended it then.
+    /// Whether the signal found it writing; it has ended it then. A picture is written in an instant:
+    /// the program is frozen as soon as it is seen to write, which may be too late.
     bool stop(const Words& arguments) {
         Surroundings surroundings;
         surroundings.unnamedFiles = unnamedFiles();
@@ -95,22 +95,16 @@ class StoppedProgram : public ::testing::TestWithParam<std::tuple<int, bool>> {
                 ADD_FAILURE() << "nothing was written";
                 return false;
             }
-            std::this_thread::sleep_for(kLook);
         }
-        std::this_thread::sleep_for(std::chrono::microseconds(mDelay(mRandom)));
-        program.send(signal());
+        const bool isCaught = program.freeze() && program.isWritingIn(mDir.path());
+        if (isCaught) program.send(signal());
+        program.thaw();
         const int status = program.wait();
-        if (WIFEXITED(status)) {
-            EXPECT_EQ(WEXITSTATUS(status), 0);
-            return false;
-        }
+        if (!isCaught) return false;
+        EXPECT_TRUE(WIFSIGNALED(status));
         EXPECT_EQ(WTERMSIG(status), signal());
         return true;
     }
-
-    std::minstd_rand mRandom{
-        static_cast<unsigned int>(::testing::UnitTest::GetInstance()->random_seed())};
-    std::uniform_int_distribution<int> mDelay{0, 1500};
 };
 
 TEST_P(StoppedProgram, LeavesNoHalfWrittenPicture) {

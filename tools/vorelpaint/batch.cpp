@@ -35,12 +35,14 @@ void sayOfLine(size_t number, const std::string& what) {
     say("line " + std::to_string(number) + ": " + what);
 }
 
-bool paintJob(const std::string& line, size_t number, const Options& common, OutputNames& outputs) {
+bool paintJob(const std::string& line, size_t number, const Options& common, OutputNames& outputs,
+              Workbench& bench) {
     const auto sayHere = [&](const std::string& what) { sayOfLine(number, what); };
     try {
         const Options job = parseJob(line, common);
         claimOutput(outputs, job, number);
-        paintPicture(job, [&](const std::string& note) { sayHere("note: " + note); });
+        handOver(job, painted(job, Composition(job, bench)),
+                 [&](const std::string& note) { sayHere("note: " + note); });
         return true;
     } catch (const std::bad_alloc&) {
         sayHere("not enough memory");
@@ -92,9 +94,10 @@ BatchResult paintBatch(const Options& common) {
     Progress progress("pictures", jobs);
     OutputNames outputs;
     BatchResult result;
+    Workbench bench;
     while (const std::optional<std::string> line = nextJob(lines)) {
         ++result.jobs;
-        if (!paintJob(*line, lines.number(), common, outputs)) ++result.failed;
+        if (!paintJob(*line, lines.number(), common, outputs, bench)) ++result.failed;
         progress.advance();
     }
     return result;

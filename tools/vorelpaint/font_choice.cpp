@@ -4,12 +4,14 @@
 #include <unistd.h>
 
 #include <filesystem>
+#include <mutex>
 
 #include "error.h"
 
 namespace vorelpaint {
 namespace {
 
+using voreltext::FontFile;
 using voreltext::SystemFonts;
 
 /// While it lives, what is written to standard error is lost.
@@ -38,24 +40,49 @@ SystemFonts loadFonts() {
     return SystemFonts();
 }
 
-/// Loaded once: the jobs of a batch share them.
-const SystemFonts& systemFonts() {
-    static const SystemFonts fonts = loadFonts();
+/// The jobs of a batch share them, one thread at a time.
+class InstalledFonts {
+  public:
+    FontFile find(const std::string& request) const {
+        const std::lock_guard<std::mutex> alone(mMutex);
+        return mFonts.find(request);
+    }
+    std::optional<FontFile> findFor(const voreltext::Cluster& cluster, const FontFile& main) const {
+        const std::lock_guard<std::mutex> alone(mMutex);
+        return mFonts.findFor(cluster, main);
+    }
+
+  private:
+    SystemFonts mFonts = loadFonts();
+    mutable std::mutex mMutex;
+};
+
+/// Loaded once.
+const InstalledFonts& installedFonts() {
+    static const InstalledFonts fonts;
     return fonts;
 }
 
 }  // namespace
 
-voreltext::FontFile findFont(const std::string& request) {
-    std::error_code ignored;
-    if (std::filesystem::is_regular_file(request, ignored)) return {request, 0};
-    if (request.find('/') != std::string::npos) throw ToolError("no font file '" + request + "'");
-    return systemFonts().find(request);
+void loadInstalledFonts() {
+    installedFonts();
 }
 
-std::optional<voreltext::FontFile> findFontFor(const voreltext::Cluster& cluster,
-                                               const voreltext::FontFile& main) {
-    return systemFonts().findFor(cluster, main);
+bool namesFontFile(const std::string& request) {
+    std::error_code ignored;
+    return request.find('/') != std::string::npos || std::filesystem::is_regular_file(request, ignored);
+}
+
+FontFile findFont(const std::string& request) {
+    std::error_code ignored;
+    if (std::filesystem::is_regular_file(request, ignored)) return {request, 0};
+    if (namesFontFile(request)) throw ToolError("no font file '" + request + "'");
+    return installedFonts().find(request);
+}
+
+std::optional<FontFile> findFontFor(const voreltext::Cluster& cluster, const FontFile& main) {
+    return installedFonts().findFor(cluster, main);
 }
 
 }  // namespace vorelpaint

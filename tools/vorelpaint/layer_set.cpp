@@ -69,11 +69,16 @@ std::string coverOf(const LookStyle& look) {
 
 }  // namespace
 
+std::optional<std::filesystem::path> chosenStyleFile(const Options& options) {
+    if (options.inlineStyle) return std::nullopt;
+    if (options.preset) return findPreset(*options.preset);
+    return options.style;
+}
+
 Style chosenStyle(const Options& options) {
     if (options.inlineStyle) return *options.inlineStyle;
-    if (options.preset) return loadStyle(findPreset(*options.preset));
-    if (options.style) return loadStyle(*options.style);
-    return {};
+    const std::optional<std::filesystem::path> file = chosenStyleFile(options);
+    return file ? loadStyle(*file) : Style{};
 }
 
 LayerSet::LayerSet(const Options& options, const Style& style, int size,

@@ -1,6 +1,8 @@
 #pragma once
 
+#include <filesystem>
 #include <memory>
+#include <optional>
 #include <vector>
 
 #include "note.h"
@@ -9,6 +11,10 @@
 #include "text/voreltext.h"
 
 namespace vorelpaint {
+
+/// The file of the style that is asked for; nothing where it stands in a job, or nowhere. Throws
+/// ToolError or StyleError.
+std::optional<std::filesystem::path> chosenStyleFile(const Options& options);
 
 /// The style that is asked for, as its file has it; an empty one when none is. Throws ToolError or
 /// StyleError.

@@ -76,8 +76,7 @@ void present(const Options& options) {
     const Composition composition(options);
     printFacts(options, composition.looks(), composition.margins());
     if (options.explain) print(explanationOf(options, composition));
-    finish(options, composition);
-    composition.notes().giveTo(sayNote);
+    handOver(options, painted(options, composition), sayNote);
 }
 
 void runBatch(const Options& options) {

@@ -2,6 +2,9 @@
 
 #include <algorithm>
 #include <array>
+#include <cerrno>
+#include <cstdio>
+#include <cstring>
 #include <string>
 #include <utility>
 
@@ -19,19 +22,42 @@ using voreltext::Canvas;
 using voreltext::Image;
 using voreltext::Margins;
 
-Composition::Composition(const Options& options)
+namespace {
+
+/// The bytes of the file of a picture on its background.
+std::vector<uint8_t> fileOf(const Options& options, Image picture) {
+    layOn(picture, options.background);
+    return encodedPng(picture, options.png);
+}
+
+void writeOutput(const Options& options, const std::vector<uint8_t>& bytes) {
+    writeFile(options.output.value(), [&](std::FILE* file) {
+        if (std::fwrite(bytes.data(), 1, bytes.size(), file) != bytes.size()) {
+            throw ToolError(std::strerror(errno));
+        }
+    });
+}
+
+}  // namespace
+
+Composition::Composition(const Options& options, Workbench& bench)
     : mSource(options),
-      mText(setToFit(options, mSource)),
-      mLooks(options, chosenStyle(options), mText.size(), mSource.colours(), mNotes.taker()),
-      mMargins(marginsOf(mLooks.layers())),
-      mCanvas(placedOn(options.canvas, mText.box(), mMargins)) {
-    noteMissing(mText.layout(), mSource, mNotes.taker());
-    noteCut(mCanvas, mText.layout().inkBox(), mMargins, mNotes.taker());
+      mText(bench.texts.text(options, bench.fonts, mSource)),
+      mLooks(bench.styles.looks(options, mText->size(), mSource.colours(), mNotes.taker())),
+      mMargins(marginsOf(mLooks->layers())),
+      mCanvas(placedOn(options.canvas, mText->box(), mMargins)) {
+    noteMissing(mText->layout(), mSource, mNotes.taker());
+    noteCut(mCanvas, mText->layout().inkBox(), mMargins, mNotes.taker());
     if (options.strict) mNotes.refuse();
 }
 
+Composition::Composition(const Options& options) : Composition(options, std::make_unique<Workbench>()) {}
+
+Composition::Composition(const Options& options, std::unique_ptr<Workbench> bench)
+    : Composition(options, *bench) {}
+
 Image Composition::paint() const {
-    return voreltext::paint(mLooks.layers(), mText.layout(), mCanvas);
+    return voreltext::paint(mLooks->layers(), mText->layout(), mCanvas);
 }
 
 void noteCut(const Canvas& canvas, const Box& ink, const Margins& margins, const Note& note) {
@@ -53,19 +79,21 @@ void noteCut(const Canvas& canvas, const Box& ink, const Margins& margins, const
 }
 
 void writePicture(const Options& options, Image picture) {
-    layOn(picture, options.background);
-    writeFile(options.output.value(), [&](std::FILE* file) { writePng(file, picture, options.png); });
+    writeOutput(options, fileOf(options, std::move(picture)));
 }
 
-void finish(const Options& options, const Composition& composition) {
-    if (options.output) writePicture(options, composition.paint());
-    if (options.report) print(reportOf(options, composition) + "\n");
+PaintedPicture painted(const Options& options, const Composition& composition) {
+    PaintedPicture picture;
+    if (options.output) picture.file = fileOf(options, composition.paint());
+    if (options.report) picture.report = reportOf(options, composition) + "\n";
+    picture.notes = composition.notes();
+    return picture;
 }
 
-void paintPicture(const Options& options, const Note& note) {
-    const Composition composition(options);
-    finish(options, composition);
-    composition.notes().giveTo(note);
+void handOver(const Options& options, const PaintedPicture& picture, const Note& note) {
+    if (options.output) writeOutput(options, picture.file);
+    if (options.report) print(picture.report);
+    picture.notes.giveTo(note);
 }
 
 }  // namespace vorelpaint

@@ -4,15 +4,12 @@
 
 #include <algorithm>
 #include <array>
-#include <cerrno>
-#include <cstdlib>
 #include <cstring>
 #include <memory>
 #include <new>
 #include <optional>
 #include <string_view>
 
-#include "error.h"
 #include "pixel_deflater.h"
 #include "png_rows.h"
 
@@ -202,13 +199,6 @@ Bytes encodedPng(const Image& image, PngEffort effort) {
     }
     appendChunk(file, "IEND", {});
     return file;
-}
-
-void writePng(std::FILE* file, const Image& image, PngEffort effort) {
-    const Bytes bytes = encodedPng(image, effort);
-    if (std::fwrite(bytes.data(), 1, bytes.size(), file) != bytes.size()) {
-        throw ToolError(std::strerror(errno));
-    }
 }
 
 }  // namespace vorelpaint

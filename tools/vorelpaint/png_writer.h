@@ -1,7 +1,6 @@
 #pragma once
 
 #include <cstdint>
-#include <cstdio>
 #include <vector>
 
 #include "text/voreltext.h"
@@ -12,10 +11,7 @@ namespace vorelpaint {
 enum class PngEffort { fast, normal, small };
 
 /// A picture of straight R, G, B, A as a PNG: with a palette where it has at most 256 colours, without
-/// alpha where it is opaque. Its sides are above 0.
+/// alpha where it is opaque. Its sides are above 0, and it has fewer than 2^32 pixels.
 std::vector<uint8_t> encodedPng(const voreltext::Image& image, PngEffort effort);
-
-/// Writes it. Throws ToolError.
-void writePng(std::FILE* file, const voreltext::Image& image, PngEffort effort = PngEffort::normal);
 
 }  // namespace vorelpaint

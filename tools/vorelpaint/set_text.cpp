@@ -8,7 +8,6 @@
 
 #include "error.h"
 #include "file_io.h"
-#include "font_choice.h"
 #include "ranges.h"
 #include "unicode/lines.h"
 #include "unicode/utf8.h"
@@ -16,10 +15,7 @@
 namespace vorelpaint {
 namespace {
 
-using voreltext::Align;
 using voreltext::Box;
-using voreltext::Font;
-using voreltext::FontFile;
 using voreltext::Fonts;
 using voreltext::Glyph;
 using voreltext::Room;
@@ -43,13 +39,12 @@ int64_t letterSpacing(const Options& options, int size) {
     return std::llround(pixels * 64.0);
 }
 
-std::unique_ptr<Fonts> openFonts(const Options& options, int size) {
-    const FontFile main = findFont(options.fonts.front());
-    auto fonts = std::make_unique<Fonts>(Font(main, size, options.variations));
-    for (size_t i = 1; i < options.fonts.size(); ++i)
-        fonts->add(Font(findFont(options.fonts[i]), size));
-    fonts->setFallback([main](const voreltext::Cluster& cluster) { return findFontFor(cluster, main); });
-    return fonts;
+std::unique_ptr<TextLayout> laidOut(const Options& options, OpenFonts& fonts,
+                                    const std::vector<uint32_t>& text, int size, int wrapWidth) {
+    return std::make_unique<TextLayout>(
+        fonts.fonts(), text,
+        TextSettings{options.align, options.lineHeight, letterSpacing(options, size), wrapWidth,
+                     options.features});
 }
 
 const Glyph* glyphBeyond(const Room& room, const TextLayout& layout) {
@@ -68,12 +63,13 @@ void requireRoomForGlyphs(const Room& room, const TextLayout& layout, const Sour
                     " x " + std::to_string(glyph->box.height()) + " pixels");
 }
 
-SetText shrunk(const Options& options, const Room& room, const std::vector<uint32_t>& text) {
+SetText shrunk(const Options& options, FontShelf& shelf, const Room& room,
+               const std::vector<uint32_t>& text) {
     std::optional<SetText> best;
     std::string fault;
     voreltext::largestThatFits(options.size, [&](int size) {
         try {
-            SetText set(options, text, size);
+            SetText set(options, shelf, text, size);
             fault.clear();
             if (!room.holds(set.box())) return false;
             best = std::move(set);
@@ -87,9 +83,10 @@ SetText shrunk(const Options& options, const Room& room, const std::vector<uint3
     throw ToolError(fault.empty() ? "the text does not fit the canvas at any size" : fault);
 }
 
-SetText setInCanvas(const Options& options, const Room& room, const std::vector<uint32_t>& text) {
-    if (options.fit == Fit::shrink) return shrunk(options, room, text);
-    return {options, text, options.size, options.fit == Fit::wrap ? *room.width : 0};
+SetText setInCanvas(const Options& options, FontShelf& shelf, const Room& room,
+                    const std::vector<uint32_t>& text) {
+    if (options.fit == Fit::shrink) return shrunk(options, shelf, room, text);
+    return {options, shelf, text, options.size, options.fit == Fit::wrap ? *room.width : 0};
 }
 
 }  // namespace
@@ -106,18 +103,24 @@ std::string SourceText::placeName(size_t at) const {
     return vorelunicode::placeName(mGiven, mMarked.places.empty() ? at : mMarked.places[at]);
 }
 
-SetText::SetText(const Options& options, const std::vector<uint32_t>& text, int size, int wrapWidth)
-    : mSize(size),
-      mFonts(openFonts(options, size)),
-      mLayout(std::make_unique<TextLayout>(
-          *mFonts, text,
-          TextSettings{options.align, options.lineHeight, letterSpacing(options, size), wrapWidth,
-                       options.features})),
-      mBox(options.box == TextBox::ink ? mLayout->inkBox() : mLayout->lineBox()) {}
+SetText::SetText(const Options& options, FontShelf& shelf, const std::vector<uint32_t>& text, int size,
+                 int wrapWidth)
+    : mSize(size) {
+    const FontsKey key = shelf.keyOf(options);
+    mFonts = shelf.open(key, size);
+    mLayout = laidOut(options, *mFonts, text, size, wrapWidth);
+    if (mFonts->fallbacks() > Fonts::kMostFallbacks) {
+        // Texts before this one may have taken the places of its fonts.
+        mLayout.reset();
+        mFonts = shelf.fresh(key, size);
+        mLayout = laidOut(options, *mFonts, text, size, wrapWidth);
+    }
+    mBox = options.box == TextBox::ink ? mLayout->inkBox() : mLayout->lineBox();
+}
 
-SetText setToFit(const Options& options, const SourceText& source) {
+SetText setToFit(const Options& options, FontShelf& shelf, const SourceText& source) {
     const Room room = voreltext::roomOf(options.canvas);
-    SetText set = setInCanvas(options, room, source.text());
+    SetText set = setInCanvas(options, shelf, room, source.text());
     if (set.layout().glyphCount() == 0) {
         throw ToolError("nothing to paint: the text has no visible character");
     }

@@ -5,6 +5,7 @@
 #include <string>
 #include <vector>
 
+#include "font_shelf.h"
 #include "note.h"
 #include "options.h"
 #include "style/vorelstyle.h"
@@ -32,8 +33,10 @@ class SourceText {
 /// A text set in its fonts at one size.
 class SetText {
   public:
-    /// Lines are broken at `wrapWidth` pixels, at 0 never. Throws ToolError or TextError.
-    SetText(const Options& options, const std::vector<uint32_t>& text, int size, int wrapWidth = 0);
+    /// Lines are broken at `wrapWidth` pixels, at 0 never. Its fonts come from
+    /// `shelf`. Throws ToolError or TextError.
+    SetText(const Options& options, FontShelf& shelf, const std::vector<uint32_t>& text, int size,
+            int wrapWidth = 0);
 
     int size() const { return mSize; }  ///< of the font, in pixels
     const voreltext::TextLayout& layout() const { return *mLayout; }
@@ -41,14 +44,14 @@ class SetText {
 
   private:
     int mSize;
-    std::unique_ptr<voreltext::Fonts> mFonts;
+    std::shared_ptr<OpenFonts> mFonts;
     std::unique_ptr<voreltext::TextLayout> mLayout;
     voreltext::Box mBox;
 };
 
 /// Sets the text so that it fits its canvas as is asked for: in broken lines, or in a smaller font.
 /// Throws ToolError when nothing of it is visible, or the canvas is too small for one of its glyphs.
-SetText setToFit(const Options& options, const SourceText& source);
+SetText setToFit(const Options& options, FontShelf& shelf, const SourceText& source);
 
 /// Notes the characters that no font has.
 void noteMissing(const voreltext::TextLayout& layout, const SourceText& source, const Note& note);

@@ -2,16 +2,17 @@
 
 #include <algorithm>
 #include <memory>
+#include <memory>
 #include <string>
 #include <utility>
 #include <vector>
 
-#include "font_choice.h"
 #include "layer_set.h"
 #include "painting.h"
 #include "progress.h"
 #include "set_text.h"
 #include "style_file.h"
+#include "workbench.h"
 
 namespace vorelpaint {
 namespace {
@@ -35,7 +36,7 @@ struct Cell {
 
 /// The cells of one size.
 struct Column {
-    SetText text;
+    std::shared_ptr<const SetText> text;
     std::vector<Cell> cells;
 };
 
@@ -61,24 +62,25 @@ uint32_t labelColour(const Background& background) {
 }
 
 /// A preset's name, set plainly in the first font.
-SetText labelOf(const Options& options, const std::string& preset, int size) {
+SetText labelOf(const Options& options, Workbench& bench, const std::string& preset, int size) {
     Options plain;
     plain.fonts = options.fonts;
     const int labelSize = std::clamp(size / kLabelShare, kSmallestLabel, kLargestLabel);
-    return {plain, voreltext::decodeUtf8(preset), labelSize};
+    return {plain, bench.fonts, voreltext::decodeUtf8(preset), labelSize};
 }
 
-Column columnOf(const Options& options, const SourceText& source, int size, const Note& note) {
+Column columnOf(const Options& options, Workbench& bench, const SourceText& source, int size,
+                const Note& note) {
     Options chosen = options;
     chosen.size = size;
-    Column column{setToFit(chosen, source), {}};
+    Column column{bench.texts.text(chosen, bench.fonts, source), {}};
     for (const std::string& preset : presetNames()) {
         chosen.preset = preset;
         const std::string prefix = preset + ": ";
         const Note noteOfPreset = [&](const std::string& line) { note(prefix + line); };
         column.cells.push_back(
             {LayerSet(chosen, chosenStyle(chosen), size, source.colours(), noteOfPreset),
-             labelOf(chosen, preset, size)});
+             labelOf(chosen, bench, preset, size)});
     }
     return column;
 }
@@ -94,7 +96,7 @@ CellSize sizeOf(const Column& column, int padding) {
         grow(size.margins, marginsOf(cell.looks.layers()));
         size.label.grow(cell.label.layout().inkBox());
     }
-    size.canvas = placedOn({{}, {}, {}, 0, padding}, column.text.box(), size.margins);
+    size.canvas = placedOn({{}, {}, {}, 0, padding}, column.text->box(), size.margins);
     size.width = std::max(size.canvas.width, size.label.width() + 2 * padding);
     size.height = size.canvas.height + size.label.height() + padding;
     return size;
@@ -107,7 +109,7 @@ class CellPainter {
 
     void paint(const Column& column, const CellSize& size, const Cell& cell, int left, int top) {
         const int slack = size.width - size.canvas.width;
-        layOver(mSheet, voreltext::paint(cell.looks.layers(), column.text.layout(), size.canvas),
+        layOver(mSheet, voreltext::paint(cell.looks.layers(), column.text->layout(), size.canvas),
                 left + slack / 2, top);
 
         const Box& name = cell.label.box();
@@ -160,10 +162,10 @@ Grid gridOf(const std::vector<Column>& columns, int padding) {
 /// Notes what is told of the text itself, whatever its look. What the fonts lack they lack in any size.
 void noteText(const std::vector<Column>& columns, const Grid& grid, const SourceText& source,
               const Note& note) {
-    noteMissing(columns.front().text.layout(), source, note);
+    noteMissing(columns.front().text->layout(), source, note);
     for (size_t i = 0; i < columns.size(); ++i) {
         const CellSize& size = grid.sizes[i];
-        noteCut(size.canvas, columns[i].text.layout().inkBox(), size.margins, note);
+        noteCut(size.canvas, columns[i].text->layout().inkBox(), size.margins, note);
     }
 }
 
@@ -197,10 +199,11 @@ void paintSheet(const Options& options, const Note& note) {
     const std::vector<int> sizes =
         options.sheetSizes.empty() ? std::vector<int>{options.size} : options.sheetSizes;
     HeldNotes notes;
+    Workbench bench;
     std::vector<Column> columns;
     columns.reserve(sizes.size());
     for (const int size : sizes)
-        columns.push_back(columnOf(options, source, size, notes.taker()));
+        columns.push_back(columnOf(options, bench, source, size, notes.taker()));
     const Grid grid = gridOf(columns, options.canvas.padding);
     noteText(columns, grid, source, notes.taker());
     Image sheet = voreltext::transparentImage(grid.left(grid.columns), grid.rows * grid.height());

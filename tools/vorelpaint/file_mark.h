@@ -1,0 +1,22 @@
+#pragma once
+
+#include <cstdint>
+#include <filesystem>
+
+namespace vorelpaint {
+
+/// What tells that a file is still the one that was read, with the same in it: its place in the file
+/// system, size and time of change. All 0 where there is no file.
+struct FileMark {
+    uint64_t device = 0;
+    uint64_t number = 0;
+    int64_t size = 0;
+    int64_t seconds = 0;
+    int64_t nanoseconds = 0;
+
+    bool operator==(const FileMark& other) const;
+};
+
+FileMark markOf(const std::filesystem::path& path);
+
+}  // namespace vorelpaint
