@@ -1,12 +1,16 @@
 #include "batch.h"
 
+#include <deque>
 #include <exception>
+#include <memory>
 #include <new>
 #include <optional>
 #include <string>
+#include <utility>
 
 #include "batch_job.h"
 #include "console.h"
+#include "crew.h"
 #include "error.h"
 #include "line_reader.h"
 #include "output_name.h"
@@ -35,72 +39,172 @@ void sayOfLine(size_t number, const std::string& what) {
     say("line " + std::to_string(number) + ": " + what);
 }
 
-bool paintJob(const std::string& line, size_t number, const Options& common, OutputNames& outputs,
-              Workbench& bench) {
-    const auto sayHere = [&](const std::string& what) { sayOfLine(number, what); };
+/// What went wrong in `action`, if anything did.
+template <typename Action>
+std::optional<std::string> faultOf(Action action) {
     try {
-        const Options job = parseJob(line, common);
-        claimOutput(outputs, job, number);
-        handOver(job, painted(job, Composition(job, bench)),
-                 [&](const std::string& note) { sayHere("note: " + note); });
-        return true;
+        action();
+        return std::nullopt;
     } catch (const std::bad_alloc&) {
-        sayHere("not enough memory");
+        return "not enough memory";
     } catch (const std::exception& error) {
-        sayHere(error.what());
+        return error.what();
     }
-    return false;
 }
 
-std::optional<std::string> nextJob(LineReader& lines) {
-    std::optional<std::string> line = lines.next(kMaxJobBytes);
-    while (line && isBlank(*line))
-        line = lines.next(kMaxJobBytes);
-    return line;
-}
+/// The lines that are jobs, each with its number among them: blank ones are none.
+class JobReader {
+  public:
+    explicit JobReader(const std::string& path) : mLines(path) {}
 
-/// The number of jobs. Throws when two of them have one output, before anything is painted. Other faults
-/// are found where the jobs are painted.
-size_t checkAhead(LineReader& lines, const Options& common) {
+    /// Reads a line if it is there; whether there is another.
+    bool read() {
+        mLine = mLines.next(kMaxJobBytes);
+        if (mLine && isBlank(*mLine)) mLine->clear();
+        if (isJob()) ++mJobs;
+        return mLine.has_value();
+    }
+
+    bool isJob() const { return mLine && !mLine->empty(); }  ///< what was read
+    const std::string& line() const { return *mLine; }
+    size_t lineNumber() const { return mLines.number(); }
+    size_t jobNumber() const { return mJobs; }
+
+    LineReader& lines() { return mLines; }
+    void rewind() {
+        mLines.rewind();
+        mJobs = 0;
+    }
+
+  private:
+    LineReader mLines;
+    std::optional<std::string> mLine;
+    size_t mJobs = 0;
+};
+
+/// The number of jobs. Throws when two of all have one output, before anything is
+/// painted. Other faults are found where the jobs are painted.
+size_t checkAhead(JobReader& reader, const Options& common) {
     OutputNames outputs;
-    size_t jobs = 0;
     size_t clashes = 0;
-    while (const std::optional<std::string> line = nextJob(lines)) {
-        ++jobs;
+    while (reader.read()) {
+        if (!reader.isJob()) continue;
         std::optional<Options> job;
-        try {
-            job = parseJob(*line, common);
-        } catch (const ToolError&) {
-            continue;
-        }
-        try {
-            claimOutput(outputs, *job, lines.number());
-        } catch (const ToolError& error) {
-            sayOfLine(lines.number(), error.what());
-            ++clashes;
-        }
+        if (faultOf([&] { job = parseJob(reader.line(), common); })) continue;
+        const auto clash = faultOf([&] { claimOutput(outputs, *job, reader.lineNumber()); });
+        if (!clash) continue;
+        sayOfLine(reader.lineNumber(), *clash);
+        ++clashes;
     }
-    lines.rewind();
+    const size_t jobs = reader.jobNumber();
+    reader.rewind();
     if (clashes == 0) return jobs;
     throw ToolError("nothing is painted: of " + std::to_string(jobs) + " jobs " +
                     std::to_string(clashes) + " would replace the picture of another");
 }
 
+/// Reads the jobs and hands their pictures over, in the order of the lines. What lies between, the
+/// painting, is done by a crew.
+class BatchRun {
+  public:
+    BatchRun(const Options& common, JobReader& reader, size_t jobs)
+        : mCommon(common), mReader(reader), mProgress("pictures", jobs), mCrew(threadsFor(common)) {}
+
+    BatchResult run() {
+        try {
+            while (readOn())
+                handOverDone();
+        } catch (...) {  // of the batch itself: the jobs before that are done all the same
+            handOverAll();
+            throw;
+        }
+        handOverAll();
+        return mResult;
+    }
+
+  private:
+    struct Job {
+        size_t line = 0;
+        Options options;
+        PaintedPicture picture;
+        std::optional<std::string> fault;
+
+        void paint(Workbench& bench) {
+            if (fault) return;
+            fault = faultOf([&] { picture = painted(options, Composition(options, bench)); });
+        }
+    };
+
+    /// Takes the next line, or waits until it can; whether there may be more.
+    bool readOn() {
+        if (mCrew.isFull()) {
+            mCrew.wait();
+            return true;
+        }
+        if (!mCrew.isEmpty() && !mReader.lines().isReady()) {
+            mCrew.wait(mReader.lines().descriptor());
+            return true;
+        }
+        if (!mReader.read()) return false;
+        if (mReader.isJob()) begin();
+        return true;
+    }
+
+    void begin() {
+        auto job = std::make_unique<Job>();
+        job->line = mReader.lineNumber();
+        job->fault = faultOf([&] {
+            job->options = parseJob(mReader.line(), mCommon);
+            claimOutput(mOutputs, job->options, job->line);
+        });
+        mCrew.give([given = job.get()](Workbench& bench) { given->paint(bench); });
+        mJobs.push_back(std::move(job));
+    }
+
+    void handOverDone() {
+        while (!mCrew.isEmpty() && mCrew.isFirstDone())
+            handOverFirst();
+    }
+
+    void handOverAll() {
+        while (!mCrew.isEmpty())
+            handOverFirst();
+    }
+
+    void handOverFirst() {
+        mCrew.take();
+        const std::unique_ptr<Job> job = std::move(mJobs.front());
+        mJobs.pop_front();
+        const auto sayHere = [&](const std::string& what) { sayOfLine(job->line, what); };
+        if (!job->fault) {
+            job->fault = faultOf([&] {
+                handOver(job->options, job->picture,
+                         [&](const std::string& note) { sayHere("note: " + note); });
+            });
+        }
+        if (job->fault) {
+            sayHere(*job->fault);
+            ++mResult.failed;
+        }
+        ++mResult.jobs;
+        mProgress.advance();
+    }
+
+    const Options& mCommon;
+    JobReader& mReader;
+    Progress mProgress;
+    OutputNames mOutputs;
+    BatchResult mResult;
+    std::deque<std::unique_ptr<Job>> mJobs;
+    Crew mCrew;  ///< ends before the jobs do that it works at
+};
+
 }  // namespace
 
 BatchResult paintBatch(const Options& common) {
-    LineReader lines(common.batch.value());
-    const size_t jobs = lines.canRewind() ? checkAhead(lines, common) : 0;
-    Progress progress("pictures", jobs);
-    OutputNames outputs;
-    BatchResult result;
-    Workbench bench;
-    while (const std::optional<std::string> line = nextJob(lines)) {
-        ++result.jobs;
-        if (!paintJob(*line, lines.number(), common, outputs, bench)) ++result.failed;
-        progress.advance();
-    }
-    return result;
+    JobReader reader(common.batch.value());
+    const size_t jobs = reader.lines().canRewind() ? checkAhead(reader, common) : 0;
+    return BatchRun(common, reader, jobs).run();
 }
 
 }  // namespace vorelpaint

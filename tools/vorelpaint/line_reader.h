@@ -1,7 +1,8 @@
 #pragma once
 
+#include <sys/types.h>
+
 #include <cstddef>
-#include <cstdio>
 #include <optional>
 #include <string>
 
@@ -22,6 +23,13 @@ class LineReader {
     /// The number of the line that was read last, from 1.
     size_t number() const { return mNumber; }
 
+    /// Whether next() has what it needs, so that it need not wait for who writes into a pipe. It may say
+    /// so of a very long line that has not ended yet.
+    bool isReady();
+
+    /// What to wait for until isReady() can have changed.
+    int descriptor() const { return mFile; }
+
     /// Whether it can be read anew: a pipe cannot.
     bool canRewind() const;
 
@@ -29,9 +37,15 @@ class LineReader {
     void rewind();
 
   private:
+    bool hasLine() const;
+    void fill();
+
     std::string mName;
-    std::FILE* mFile;
-    long mStart = 0;  ///< in a file that others may have read before
+    int mFile;
+    off_t mStart = 0;     ///< in a file that others may have read before
+    std::string mBuffer;  ///< what was read ahead
+    size_t mAt = 0;       ///< how much of it is used
+    bool mIsEnded = false;
     size_t mNumber = 0;
 };
 

@@ -98,6 +98,13 @@ void checkOutput(const Options& options) {
     }
 }
 
+/// What is asked for beside what it is about.
+void checkSeries(const Options& options) {
+    if (options.jobs && !options.batch && !options.sheet) {
+        throw ToolError("--jobs is for the pictures of a --batch or a --sheet");
+    }
+}
+
 /// What is wrong with words that nothing was found for: an option, or else a second text.
 std::string faultOf(const std::vector<std::string>& words) {
     const auto option = std::find_if(words.begin(), words.end(),
@@ -127,6 +134,7 @@ void checkBatch(const Options& options) {
 void checkCombination(const Options& options) {
     const bool tells = options.listPresets || options.version || options.manual || options.completion;
     if (tells) return;
+    checkSeries(options);
     if (options.batch) return checkBatch(options);
     checkOutput(options);
     checkCanvas(options);

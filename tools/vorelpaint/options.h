@@ -54,6 +54,7 @@ struct Options {
     TextBox box = TextBox::ink;
 
     std::optional<std::string> batch;
+    std::optional<int> jobs;  ///< at a time; as many as there are cores without
     bool sheet = false;
     std::vector<int> sheetSizes;  ///< empty: the one size
     bool explain = false;

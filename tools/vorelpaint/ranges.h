@@ -26,6 +26,8 @@ constexpr Limits<float> kEffectScale{0.05F, 20.0F};
 constexpr Limits<float> kOpacity{0.0F, 1.0F};
 constexpr Limits<size_t> kSheetSizes{1, 16};  ///< how many a sheet has
 
+constexpr Limits<int> kJobs{1, 64};  ///< at a time
+
 constexpr size_t kMostFonts = 16;  ///< that a text asks in turn
 constexpr size_t kMaxTextBytes = size_t{1} << 16;
 constexpr size_t kMaxStyleBytes = size_t{1} << 17;
