@@ -2,11 +2,11 @@
 
 #include <algorithm>
 #include <memory>
-#include <memory>
 #include <string>
 #include <utility>
 #include <vector>
 
+#include "crew.h"
 #include "layer_set.h"
 #include "painting.h"
 #include "progress.h"
@@ -30,12 +30,20 @@ constexpr int kLabelShare = 6;  ///< the text's size in sizes of its label
 
 /// The presets' text in one size with its effects above, the preset's name below.
 struct Cell {
+    std::string preset;
     LayerSet looks;
-    SetText label;
+    Box label;  ///< the ink of the name, from the start of its baseline
+};
+
+/// A cell that is painted.
+struct CellPicture {
+    Image text;
+    Image label;
 };
 
 /// The cells of one size.
 struct Column {
+    Options options;
     std::shared_ptr<const SetText> text;
     std::vector<Cell> cells;
 };
@@ -62,25 +70,25 @@ uint32_t labelColour(const Background& background) {
 }
 
 /// A preset's name, set plainly in the first font.
-SetText labelOf(const Options& options, Workbench& bench, const std::string& preset, int size) {
+SetText labelOf(const Options& options, Workbench& bench, const std::string& preset) {
     Options plain;
     plain.fonts = options.fonts;
-    const int labelSize = std::clamp(size / kLabelShare, kSmallestLabel, kLargestLabel);
-    return {plain, bench.fonts, voreltext::decodeUtf8(preset), labelSize};
+    const int size = std::clamp(options.size / kLabelShare, kSmallestLabel, kLargestLabel);
+    return {plain, bench.fonts, voreltext::decodeUtf8(preset), size};
 }
 
 Column columnOf(const Options& options, Workbench& bench, const SourceText& source, int size,
                 const Note& note) {
     Options chosen = options;
     chosen.size = size;
-    Column column{bench.texts.text(chosen, bench.fonts, source), {}};
+    Column column{chosen, bench.texts.text(chosen, bench.fonts, source), {}};
     for (const std::string& preset : presetNames()) {
         chosen.preset = preset;
         const std::string prefix = preset + ": ";
         const Note noteOfPreset = [&](const std::string& line) { note(prefix + line); };
         column.cells.push_back(
-            {LayerSet(chosen, chosenStyle(chosen), size, source.colours(), noteOfPreset),
-             labelOf(chosen, bench, preset, size)});
+            {preset, LayerSet(chosen, chosenStyle(chosen), size, source.colours(), noteOfPreset),
+             labelOf(chosen, bench, preset).layout().inkBox()});
     }
     return column;
 }
@@ -94,7 +102,7 @@ CellSize sizeOf(const Column& column, int padding) {
     CellSize size;
     for (const Cell& cell : column.cells) {
         grow(size.margins, marginsOf(cell.looks.layers()));
-        size.label.grow(cell.label.layout().inkBox());
+        size.label.grow(cell.label);
     }
     size.canvas = placedOn({{}, {}, {}, 0, padding}, column.text->box(), size.margins);
     size.width = std::max(size.canvas.width, size.label.width() + 2 * padding);
@@ -102,29 +110,18 @@ CellSize sizeOf(const Column& column, int padding) {
     return size;
 }
 
-/// Paints into the cell whose top left corner is at (left, top) of the sheet.
-class CellPainter {
-  public:
-    CellPainter(Image& sheet, const Options& options) : mSheet(sheet), mOptions(options) {}
-
-    void paint(const Column& column, const CellSize& size, const Cell& cell, int left, int top) {
-        const int slack = size.width - size.canvas.width;
-        layOver(mSheet, voreltext::paint(cell.looks.layers(), column.text->layout(), size.canvas),
-                left + slack / 2, top);
-
-        const Box& name = cell.label.box();
-        const Look plain({}, labelColour(mOptions.background), 1);
-        const std::vector<Layer> layers{{&plain.effects()}};
-        const Canvas band{size.width, size.label.height(), (size.width - name.width()) / 2 - name.left,
-                          -size.label.top};
-        layOver(mSheet, voreltext::paint(layers, cell.label.layout(), band), left,
-                top + size.canvas.height);
-    }
-
-  private:
-    Image& mSheet;
-    const Options& mOptions;
-};
+/// Fonts are for one thread: the text and the name are set in those of the workbench.
+CellPicture paintedCell(const Column& column, const SourceText& source, const CellSize& size,
+                        const Cell& cell, Workbench& bench) {
+    const auto text = bench.texts.text(column.options, bench.fonts, source);
+    const SetText name = labelOf(column.options, bench, cell.preset);
+    const Look plain({}, labelColour(column.options.background), 1);
+    const std::vector<Layer> layers{{&plain.effects()}};
+    const Canvas band{size.width, size.label.height(),
+                      (size.width - name.box().width()) / 2 - name.box().left, -size.label.top};
+    return {voreltext::paint(cell.looks.layers(), text->layout(), size.canvas),
+            voreltext::paint(layers, name.layout(), band)};
+}
 
 /// Where the cells of a sheet stand: those of one size beside and below each other, those of several
 /// sizes in a column for each.
@@ -169,20 +166,65 @@ void noteText(const std::vector<Column>& columns, const Grid& grid, const Source
     }
 }
 
-void paintCells(Image& sheet, const std::vector<Column>& columns, const Grid& grid,
-                const Options& options) {
-    CellPainter painter(sheet, options);
-    const size_t count = columns.front().cells.size();
-    Progress progress("pictures", count * columns.size());
-    for (size_t i = 0; i < count * columns.size(); ++i) {
-        const int column = static_cast<int>(i) % grid.columns;
-        const int row = static_cast<int>(i) / grid.columns;
-        const size_t of = columns.size() == 1 ? 0 : static_cast<size_t>(column);
-        const Cell& cell = columns[of].cells[columns.size() == 1 ? i : static_cast<size_t>(row)];
-        painter.paint(columns[of], grid.sizes[of], cell, grid.left(column), row * grid.height());
-        progress.advance();
+/// Paints the cells on threads, and lays them on the sheet in their order.
+class SheetPainter {
+  public:
+    SheetPainter(const std::vector<Column>& columns, const SourceText& source, const Grid& grid)
+        : mColumns(columns),
+          mSource(source),
+          mGrid(grid),
+          mCount(columns.front().cells.size() * columns.size()),
+          mPictures(mCount),
+          mCrew(threadsFor(columns.front().options)) {}
+
+    void paintOn(Image& sheet) {
+        Progress progress("pictures", mCount);
+        size_t begun = 0;
+        for (size_t i = 0; i < mCount; ++i) {
+            for (; begun < mCount && !mCrew.isFull(); ++begun)
+                begin(begun);
+            mCrew.take();
+            lay(sheet, i);
+            progress.advance();
+        }
     }
-}
+
+  private:
+    /// The column and the row of a cell in the grid.
+    int columnOf(size_t i) const { return static_cast<int>(i) % mGrid.columns; }
+    int rowOf(size_t i) const { return static_cast<int>(i) / mGrid.columns; }
+
+    /// Its size among the columns, which are one or as many as those of the grid.
+    size_t sizeOf(size_t i) const { return mColumns.size() == 1 ? 0 : static_cast<size_t>(columnOf(i)); }
+
+    const Cell& cell(size_t i) const {
+        return mColumns[sizeOf(i)].cells[mColumns.size() == 1 ? i : static_cast<size_t>(rowOf(i))];
+    }
+
+    void begin(size_t i) {
+        mCrew.give([this, i](Workbench& bench) {
+            const size_t size = sizeOf(i);
+            mPictures[i] = paintedCell(mColumns[size], mSource, mGrid.sizes[size], cell(i), bench);
+        });
+    }
+
+    /// And frees its picture.
+    void lay(Image& sheet, size_t i) {
+        const CellPicture picture = std::move(mPictures[i]);
+        const CellSize& size = mGrid.sizes[sizeOf(i)];
+        const int left = mGrid.left(columnOf(i));
+        const int top = rowOf(i) * mGrid.height();
+        layOver(sheet, picture.text, left + (size.width - size.canvas.width) / 2, top);
+        layOver(sheet, picture.label, left, top + size.canvas.height);
+    }
+
+    const std::vector<Column>& mColumns;
+    const SourceText& mSource;
+    const Grid& mGrid;
+    size_t mCount;
+    std::vector<CellPicture> mPictures;
+    Crew mCrew;  ///< ends before what it works at
+};
 
 }  // namespace
 
@@ -208,7 +250,7 @@ void paintSheet(const Options& options, const Note& note) {
     noteText(columns, grid, source, notes.taker());
     Image sheet = voreltext::transparentImage(grid.left(grid.columns), grid.rows * grid.height());
     if (options.strict) notes.refuse();
-    paintCells(sheet, columns, grid, options);
+    SheetPainter(columns, source, grid).paintOn(sheet);
     writePicture(options, std::move(sheet));
     notes.giveTo(note);
 }
