@@ -82,13 +82,21 @@ class JobReader {
     size_t mJobs = 0;
 };
 
-/// The number of jobs. Throws when two of all have one output, before anything is
+bool isInShard(const Options& common, size_t jobNumber) {
+    if (!common.shard) return true;
+    const auto count = static_cast<size_t>(common.shard->count);
+    return (jobNumber - 1) % count + 1 == static_cast<size_t>(common.shard->index);
+}
+
+/// The number of jobs that are to be done. Throws when two of all have one output, before anything is
 /// painted. Other faults are found where the jobs are painted.
 size_t checkAhead(JobReader& reader, const Options& common) {
     OutputNames outputs;
+    size_t jobs = 0;
     size_t clashes = 0;
     while (reader.read()) {
         if (!reader.isJob()) continue;
+        if (isInShard(common, reader.jobNumber())) ++jobs;
         std::optional<Options> job;
         if (faultOf([&] { job = parseJob(reader.line(), common); })) continue;
         const auto clash = faultOf([&] { claimOutput(outputs, *job, reader.lineNumber()); });
@@ -96,10 +104,10 @@ size_t checkAhead(JobReader& reader, const Options& common) {
         sayOfLine(reader.lineNumber(), *clash);
         ++clashes;
     }
-    const size_t jobs = reader.jobNumber();
+    const size_t all = reader.jobNumber();
     reader.rewind();
     if (clashes == 0) return jobs;
-    throw ToolError("nothing is painted: of " + std::to_string(jobs) + " jobs " +
+    throw ToolError("nothing is painted: of " + std::to_string(all) + " jobs " +
                     std::to_string(clashes) + " would replace the picture of another");
 }
 
@@ -126,11 +134,12 @@ class BatchRun {
     struct Job {
         size_t line = 0;
         Options options;
+        bool isToDo = true;
         PaintedPicture picture;
         std::optional<std::string> fault;
 
         void paint(Workbench& bench) {
-            if (fault) return;
+            if (!isToDo || fault) return;
             fault = faultOf([&] { picture = painted(options, Composition(options, bench)); });
         }
     };
@@ -150,13 +159,16 @@ class BatchRun {
         return true;
     }
 
+    /// Of a job of another shard the output is claimed all the same.
     void begin() {
         auto job = std::make_unique<Job>();
         job->line = mReader.lineNumber();
         job->fault = faultOf([&] {
             job->options = parseJob(mReader.line(), mCommon);
             claimOutput(mOutputs, job->options, job->line);
+            job->isToDo = !mCommon.skipExisting || !isWritten(*job->options.output);
         });
+        if (!isInShard(mCommon, mReader.jobNumber())) return;
         mCrew.give([given = job.get()](Workbench& bench) { given->paint(bench); });
         mJobs.push_back(std::move(job));
     }
@@ -176,7 +188,7 @@ class BatchRun {
         const std::unique_ptr<Job> job = std::move(mJobs.front());
         mJobs.pop_front();
         const auto sayHere = [&](const std::string& what) { sayOfLine(job->line, what); };
-        if (!job->fault) {
+        if (!job->fault && job->isToDo) {
             job->fault = faultOf([&] {
                 handOver(job->options, job->picture,
                          [&](const std::string& note) { sayHere("note: " + note); });

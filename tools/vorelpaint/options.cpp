@@ -100,6 +100,10 @@ void checkOutput(const Options& options) {
 
 /// What is asked for beside what it is about.
 void checkSeries(const Options& options) {
+    if (options.shard && !options.batch) throw ToolError("--shard is a part of a --batch");
+    if (options.skipExisting && !options.batch) {
+        throw ToolError("--skip-existing leaves out jobs of a --batch");
+    }
     if (options.jobs && !options.batch && !options.sheet) {
         throw ToolError("--jobs is for the pictures of a --batch or a --sheet");
     }

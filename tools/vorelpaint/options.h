@@ -25,6 +25,12 @@ enum class TextBox {
     line,  ///< the line boxes: one height for every text of a font, one width for what is written
 };
 
+/// One of `count` parts of a batch.
+struct Shard {
+    int index;  ///< from 1
+    int count;
+};
+
 /// What is asked for, by the command line or by one job of a batch.
 struct Options {
     std::optional<std::string> text;
@@ -54,6 +60,8 @@ struct Options {
     TextBox box = TextBox::ink;
 
     std::optional<std::string> batch;
+    std::optional<Shard> shard;
+    bool skipExisting = false;
     std::optional<int> jobs;  ///< at a time; as many as there are cores without
     bool sheet = false;
     std::vector<int> sheetSizes;  ///< empty: the one size

@@ -32,6 +32,15 @@ std::string resolved(const fs::path& path) {
     return (error ? whole : file).lexically_normal().string();
 }
 
+/// Nothing where nothing can be written, of which who tries says why.
+std::optional<fs::path> targetOf(const std::string& path) {
+    try {
+        return followLinks(path);
+    } catch (const ToolError&) {
+        return std::nullopt;
+    }
+}
+
 /// Whether every job may write there: into a device, a pipe or an open file.
 bool isForAll(const fs::path& path) {
     std::error_code ignored;
@@ -48,15 +57,16 @@ bool namesOtherKind(std::string_view path) {
                        [&](std::string_view other) { return vorelstyle::isSameWord(kind, other); });
 }
 
+bool isWritten(const std::string& path) {
+    const std::optional<fs::path> target = targetOf(path);
+    std::error_code ignored;
+    return target && !isForAll(*target) && fs::exists(*target, ignored);
+}
+
 std::optional<size_t> OutputNames::claim(const std::string& path, size_t line) {
-    fs::path target;
-    try {
-        target = followLinks(path);
-    } catch (const ToolError&) {
-        return std::nullopt;  // nothing is written there, and who tries says why
-    }
-    if (isForAll(target)) return std::nullopt;
-    const auto [first, isNew] = mLines.try_emplace(resolved(target), line);
+    const std::optional<fs::path> target = targetOf(path);
+    if (!target || isForAll(*target)) return std::nullopt;
+    const auto [first, isNew] = mLines.try_emplace(resolved(*target), line);
     return isNew ? std::nullopt : std::optional<size_t>(first->second);
 }
 

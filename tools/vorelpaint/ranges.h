@@ -27,6 +27,7 @@ constexpr Limits<float> kOpacity{0.0F, 1.0F};
 constexpr Limits<size_t> kSheetSizes{1, 16};  ///< how many a sheet has
 
 constexpr Limits<int> kJobs{1, 64};  ///< at a time
+constexpr Limits<int> kShards{1, 100000};
 
 constexpr size_t kMostFonts = 16;  ///< that a text asks in turn
 constexpr size_t kMaxTextBytes = size_t{1} << 16;

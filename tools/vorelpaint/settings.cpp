@@ -88,6 +88,18 @@ void readSheetSizes(Options& options, const std::string& given) {
         refuse(given, "no list of " + spelled(kSheetSizes) + " sizes");
 }
 
+void readShard(Options& options, const std::string& given) {
+    const size_t slash = given.find('/');
+    const std::optional<int> index = numberIn<int>(std::string_view(given).substr(0, slash));
+    const std::optional<int> count = slash == std::string::npos
+                                         ? std::nullopt
+                                         : numberIn<int>(std::string_view(given).substr(slash + 1));
+    if (!index || !count || !contains(kShards, *count) || !contains({1, *count}, *index)) {
+        refuse(given, "no shard I/N, as 2/8 is: N is " + spelled(kShards) + ", I is 1 to N");
+    }
+    options.shard = Shard{*index, *count};
+}
+
 void readVariations(Options& options, const std::string& given) {
     options.variations.clear();
     for (const std::string& part : partsOf(given)) {
@@ -262,6 +274,12 @@ std::vector<Setting> seriesSettings() {
         programOption("batch", "FILE", kGroup,
                       "Paint the jobs of FILE, one JSON object a line; - for standard input",
                       text(&Options::batch)),
+        programOption("shard", "I/N", kGroup,
+                      "Of a batch every N-th job alone, from job I on, for other processes to do "
+                      "the others",
+                      readShard),
+        programOption("skip-existing", "", kGroup, "Leave the jobs of a batch out whose output is there",
+                      flag(&Options::skipExisting)),
         programOption("jobs", "N", kGroup,
                       "Paint " + spelled(kJobs) +
                           " pictures of a batch or a sheet at a time "
