@@ -83,20 +83,12 @@ class StoppedProgram : public ::testing::TestWithParam<std::tuple<int, bool>> {
     TempDir mInputs;
 
   private:
-    /// Whether the signal found it writing; it has ended it then. A picture is written in an instant:
-    /// the program is frozen as soon as it is seen to write, which may be too late.
+    /// Whether the signal found it writing; it has ended it then.
     bool stop(const Words& arguments) {
         Surroundings surroundings;
         surroundings.unnamedFiles = unnamedFiles();
         RunningVorelpaint program(arguments, surroundings);
-        const Clock::time_point end = Clock::now() + std::chrono::seconds(60);
-        while (!program.isWritingIn(mDir.path()) && !program.hasEnded()) {
-            if (Clock::now() > end) {
-                ADD_FAILURE() << "nothing was written";
-                return false;
-            }
-        }
-        const bool isCaught = program.freeze() && program.isWritingIn(mDir.path());
+        const bool isCaught = freezeInWriting(program);
         if (isCaught) program.send(signal());
         program.thaw();
         const int status = program.wait();
@@ -104,6 +96,22 @@ class StoppedProgram : public ::testing::TestWithParam<std::tuple<int, bool>> {
         EXPECT_TRUE(WIFSIGNALED(status));
         EXPECT_EQ(WTERMSIG(status), signal());
         return true;
+    }
+
+    /// A picture is written in an instant: the program is frozen as soon as it is seen to write, which
+    /// may be too late for this picture, and for all.
+    bool freezeInWriting(const RunningVorelpaint& program) const {
+        const Clock::time_point end = Clock::now() + std::chrono::seconds(60);
+        while (!program.hasEnded()) {
+            if (Clock::now() > end) {
+                ADD_FAILURE() << "nothing was written";
+                return false;
+            }
+            if (!program.isWritingIn(mDir.path())) continue;
+            if (program.freeze() && program.isWritingIn(mDir.path())) return true;
+            program.thaw();
+        }
+        return false;
     }
 };
 
