@@ -9,7 +9,8 @@ cd "$(dirname "$0")/.."
 . scripts/quietly.sh
 
 need_packages cmake ninja-build g++ pkg-config libbenchmark-dev libfreetype-dev libharfbuzz-dev \
-    libfribidi-dev libfontconfig-dev libunibreak-dev libpng-dev libdeflate-dev nlohmann-json3-dev libcli11-dev fontconfig fonts-dejavu-core
+    libfribidi-dev libfontconfig-dev libunibreak-dev libpng-dev libdeflate-dev \
+    nlohmann-json3-dev libcli11-dev fontconfig fonts-dejavu-core
 
 build=build/bench_png
 quietly cmake -S . -B "$build" -G Ninja -DCMAKE_BUILD_TYPE=Release -DVOREL_BUILD_TOOLS=ON \
