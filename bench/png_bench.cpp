@@ -12,6 +12,7 @@
 #include <functional>
 #include <random>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "background.h"
@@ -33,7 +34,7 @@ struct Group {
 // --- pictures -----------------------------------------------------------------------------------------
 
 Image painted(const Options& options) {
-    Image picture = vorelpaint::Composition(options, [](const std::string&) {}).paint();
+    Image picture = vorelpaint::Composition(options).paint();
     layOn(picture, options.background);
     return picture;
 }
@@ -93,14 +94,28 @@ Group gradients() {
     return {"gradients, 800 x 600", {drawn(800, 600, slope), drawn(800, 600, disc)}};
 }
 
-Group photograph() {
+Image photograph(int width, int height) {
     std::mt19937 random(7);
     std::uniform_real_distribution<double> noise(-0.02, 0.02);
     const auto channel = [&](int c, double x, double y) {
         const double waves = std::sin(7 * x + c) * std::cos(5 * y - 2 * x) + std::sin(23 * x * y + c);
         return c == 3 ? 1.0 : 0.5 + 0.22 * waves + noise(random);
     };
-    return {"like a photograph, 800 x 600", {drawn(800, 600, channel)}};
+    return drawn(width, height, channel);
+}
+
+/// Letters through which a photograph shows.
+Group photographInLetters() {
+    Group group{"a photograph in letters", {}};
+    for (const char* text : {"Harbour", "Evening", "Distant"}) {
+        Image letters = painted(textOptions(text, 160));
+        const Image within = photograph(letters.width, letters.height);
+        for (size_t i = 0; i < letters.pixels.size(); ++i) {
+            if (i % 4 != 3 && letters.pixels[i / 4 * 4 + 3] != 0) letters.pixels[i] = within.pixels[i];
+        }
+        group.pictures.push_back(std::move(letters));
+    }
+    return group;
 }
 
 Group largeAndFlat() {
@@ -199,7 +214,8 @@ int main() {
         styled("soft glows", R"({"color": "#FFFFFF", "outerGlow": {"size": 60, "color": "#33AAFF"}})",
                60),
         gradients(),
-        photograph(),
+        {"like a photograph, 800 x 600", {photograph(800, 600)}},
+        photographInLetters(),
         largeAndFlat()};
     printHead();
     for (const Group& group : groups) {

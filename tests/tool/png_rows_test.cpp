@@ -83,12 +83,25 @@ TEST(PngRows, EachRow_HasTheFilterThatLeavesLeast) {
     EXPECT_EQ(stream[rows.rowBytes()], 2);
 }
 
-TEST(PngRows, FilteredBits_AreFewWhereNeighboursTell) {
-    const Bytes same(4 * 4, 200);
-    EXPECT_EQ(filteredBits({same.data(), 2, 2, 4}, 1, 1), 4U) << "one bit a channel";
-    Bytes other = same;
-    other[12] = 203;  // 3 off: two bits more
-    EXPECT_EQ(filteredBits({other.data(), 2, 2, 3}, 1, 1), 5U);
+bool isOfNew(const Bytes& numbers, size_t width) {
+    Bytes pixels;
+    for (const uint8_t number : numbers)
+        pixels.insert(pixels.end(), {1, 2, number, 4});
+    return isOfNewPixels({pixels.data(), width, numbers.size() / width, 4});
+}
+
+/// The first row and column are only looked at.
+TEST(PngRows, PixelsAreNew_WhereMostCameNotBefore) {
+    EXPECT_TRUE(isOfNew({0, 0, 0, 0, 0, 1, 2, 3}, 4)) << "three new ones";
+    EXPECT_TRUE(isOfNew({0, 0, 0, 0, 0, 1, 2, 1}, 4)) << "two of three";
+    EXPECT_FALSE(isOfNew({0, 0, 0, 0, 0, 0, 1, 2, 1, 2}, 5)) << "two of four";
+}
+
+TEST(PngRows, PixelsLikeANeighbour_AreNotCounted) {
+    EXPECT_FALSE(isOfNew({0, 1, 2, 3, 0, 1, 2, 3}, 4)) << "above";
+    EXPECT_FALSE(isOfNew({0, 0, 0, 0, 5, 5, 5, 5}, 4)) << "on the left";
+    EXPECT_FALSE(isOfNew({1, 2, 3, 4}, 4)) << "one row";
+    EXPECT_FALSE(isOfNew({1, 2, 3, 4}, 1)) << "one column";
 }
 
 }  // namespace

@@ -2,19 +2,13 @@
 
 #include <algorithm>
 #include <cstdlib>
+#include <cstring>
 
 namespace vorelpaint {
 namespace {
 
 constexpr size_t kChannels = 4;
 constexpr int kFilters = 5;
-
-/// The bits of a number, 0 for 0.
-unsigned int widthOf(int number) {
-    return number == 0
-               ? 0
-               : 32U - static_cast<unsigned int>(__builtin_clz(static_cast<unsigned int>(number)));
-}
 
 /// A row and the one above it, each behind a clear pixel.
 struct RowPair {
@@ -62,6 +56,17 @@ uint32_t filterRow(int filter, const RowPair& pair, size_t count, uint8_t* remai
 
 }  // namespace
 
+uint32_t wordAt(const uint8_t* pixel) {
+    uint32_t word = 0;
+    std::memcpy(&word, pixel, sizeof word);
+    return word;
+}
+
+size_t spread(uint32_t word, int bits) {
+    constexpr uint32_t kGolden = 2654435761U;  // 2^32 over the golden ratio, as Knuth hashes
+    return (word * kGolden) >> (32 - bits);
+}
+
 void appendRow(std::vector<uint8_t>& stream, const PngRows& rows, int filter, const uint8_t* pixels) {
     stream.push_back(static_cast<uint8_t>(filter));
     if (rows.bytesPerPixel == kChannels) {
@@ -105,15 +110,24 @@ std::vector<uint8_t> filtered(const PngRows& rows) {
     return stream;
 }
 
-unsigned int filteredBits(const PngRows& rows, size_t x, size_t y) {
-    const uint8_t* pixel = rows.row(y) + kChannels * x;
-    const uint8_t* above = rows.row(y - 1) + kChannels * x;
-    unsigned int bits = 0;
-    for (size_t i = 0; i < rows.bytesPerPixel; ++i) {
-        const uint8_t guessed = paeth((pixel - kChannels)[i], above[i], (above - kChannels)[i]);
-        bits += 1 + widthOf(std::abs(static_cast<int8_t>(pixel[i] - guessed)));
+bool isOfNewPixels(const PngRows& rows) {
+    constexpr int kSlotBits = 12;
+    std::vector<uint32_t> lastOf(size_t{1} << kSlotBits);  // pixels, each where its bits are spread to
+    size_t edges = 0;
+    size_t fresh = 0;
+    for (size_t y = 1; y < rows.height; ++y) {
+        const uint8_t* above = rows.row(y - 1);
+        const uint8_t* row = rows.row(y);
+        for (size_t i = kChannels; i < kChannels * rows.width; i += kChannels) {
+            const uint32_t pixel = wordAt(row + i);
+            if (pixel == wordAt(row + i - kChannels) || pixel == wordAt(above + i)) continue;
+            ++edges;
+            uint32_t& last = lastOf[spread(pixel, kSlotBits)];
+            fresh += last == pixel ? 0 : 1;
+            last = pixel;
+        }
     }
-    return bits;
+    return fresh > edges / 2;
 }
 
 }  // namespace vorelpaint

@@ -30,7 +30,14 @@ std::vector<uint8_t> unfiltered(const PngRows& rows);
 /// signed numbers: what the format itself advises for pictures of many colours.
 std::vector<uint8_t> filtered(const PngRows& rows);
 
-/// About how many bits a pixel takes in `filtered`, (x, y) lying neither in the first row nor column.
-unsigned int filteredBits(const PngRows& rows, size_t x, size_t y);
+/// Whether most pixels are new, of those that are neither the one on their left nor the one above: as
+/// far as a table of 4,096 tells in which later ones push out earlier ones. So they are in photographs.
+bool isOfNewPixels(const PngRows& rows);
+
+/// A pixel as one word, equal where its four channels are.
+uint32_t wordAt(const uint8_t* pixel);
+
+/// A number below 2^bits for a word; `bits` is from 1 to 31.
+size_t spread(uint32_t word, int bits);
 
 }  // namespace vorelpaint

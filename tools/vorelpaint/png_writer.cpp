@@ -10,7 +10,6 @@
 #include <optional>
 #include <string_view>
 
-#include "pixel_deflater.h"
 #include "png_rows.h"
 
 namespace vorelpaint {
@@ -24,13 +23,6 @@ constexpr uint8_t kRgb = 2;
 constexpr uint8_t kIndexed = 3;
 constexpr uint8_t kRgba = 6;
 
-/// A pixel as one word, equal where its four channels are.
-uint32_t wordAt(const Image& image, size_t pixel) {
-    uint32_t word = 0;
-    std::memcpy(&word, &image.pixels[pixel * 4], sizeof word);
-    return word;
-}
-
 bool isOpaque(const Image& image) {
     for (size_t at = 3; at < image.pixels.size(); at += 4) {
         if (image.pixels[at] != 255) return false;
@@ -43,7 +35,7 @@ class Palette {
   public:
     /// The index of a colour, which is added if it is new; nothing when there is no room for it.
     std::optional<uint8_t> indexOf(uint32_t colour) {
-        size_t slot = (colour * kSpread) >> (32 - kSlotBits);
+        size_t slot = spread(colour, kSlotBits);
         for (; mSlots[slot] != kEmpty; slot = (slot + 1) % mSlots.size()) {
             if (mColours[mSlots[slot]] == colour) return static_cast<uint8_t>(mSlots[slot]);
         }
@@ -57,7 +49,6 @@ class Palette {
 
   private:
     static constexpr int kSlotBits = 10;
-    static constexpr uint32_t kSpread = 2654435761U;  ///< 2^32 over the golden ratio, as Knuth hashes
     static constexpr uint16_t kEmpty = 0xFFFF;
 
     std::vector<uint32_t> mColours;
@@ -74,9 +65,9 @@ std::optional<IndexedPicture> indexed(const Image& image) {
     const size_t count = image.pixels.size() / 4;
     Palette palette;
     IndexedPicture picture{Bytes(count), {}};
-    uint32_t before = ~wordAt(image, 0);
+    uint32_t before = ~wordAt(image.pixels.data());
     for (size_t i = 0; i < count; ++i) {
-        const uint32_t colour = wordAt(image, i);
+        const uint32_t colour = wordAt(&image.pixels[4 * i]);
         if (colour == before) {
             picture.indices[i] = picture.indices[i - 1];
             continue;
@@ -92,6 +83,13 @@ std::optional<IndexedPicture> indexed(const Image& image) {
 
 // --- compression --------------------------------------------------------------------------------------
 
+/// libdeflate's levels, 1 to 12. Beyond 4 a text picture becomes a few hundredths smaller and takes
+/// twice the time (scripts/bench_png.sh).
+int levelOf(PngEffort effort) {
+    constexpr std::array<int, 3> kLevels{1, 4, 12};
+    return kLevels[static_cast<size_t>(effort)];
+}
+
 struct FreeCompressor {
     void operator()(libdeflate_compressor* compressor) const { libdeflate_free_compressor(compressor); }
 };
@@ -106,11 +104,8 @@ Bytes deflated(const Bytes& bytes, int level) {
     return result;
 }
 
-constexpr int kSmallestLevel = 12;  ///< of libdeflate's, 1 to 12
-
 /// Filters hide from the compressor which indices are the same.
 Bytes compressedIndices(const Bytes& indices, const Image& image, PngEffort effort) {
-    constexpr int kQuickLevel = 4;
     const auto width = static_cast<size_t>(image.width);
     Bytes rows;
     rows.reserve(indices.size() + static_cast<size_t>(image.height));
@@ -118,24 +113,19 @@ Bytes compressedIndices(const Bytes& indices, const Image& image, PngEffort effo
         rows.push_back(0);
         rows.insert(rows.end(), &indices[at], &indices[at] + width);
     }
-    return deflated(rows, effort == PngEffort::small ? kSmallestLevel : kQuickLevel);
+    return deflated(rows, levelOf(effort));
 }
 
-Bytes smaller(Bytes one, Bytes other) {
-    return other.size() < one.size() ? std::move(other) : std::move(one);
-}
-
-/// Text with its effects repeats pixels, which filters hide from the compressor; photographs, which
-/// repeat none, become smaller by them.
+/// The pixels of text and its effects come again, in letters and along edges, and filters hide that from
+/// the compressor. Those of photographs are all different, and become smaller by filters.
 Bytes compressed(const PngRows& rows, PngEffort effort) {
-    constexpr int kLevel = 6;
     if (effort == PngEffort::small) {
-        return smaller(deflated(unfiltered(rows), kSmallestLevel),
-                       deflated(filtered(rows), kSmallestLevel));
+        Bytes plain = deflated(unfiltered(rows), levelOf(effort));
+        Bytes guessed = deflated(filtered(rows), levelOf(effort));
+        return guessed.size() < plain.size() ? guessed : plain;
     }
-    DeflatedPixels plain = deflatedPixels(rows);
-    if (effort == PngEffort::fast || !plain.isBetterFiltered) return std::move(plain.stream);
-    return smaller(std::move(plain.stream), deflated(filtered(rows), kLevel));
+    const bool isFiltered = effort == PngEffort::normal && isOfNewPixels(rows);
+    return deflated(isFiltered ? filtered(rows) : unfiltered(rows), levelOf(effort));
 }
 
 PngRows rowsOf(const Image& image) {
