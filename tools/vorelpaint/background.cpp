@@ -47,8 +47,13 @@ std::optional<Background> parseBackground(std::string_view text) {
 }
 
 void layOn(voreltext::Image& image, const Background& background) {
-    uint8_t* pixel = image.pixels.data();
-    for (int y = 0; y < image.height; ++y) {
+    layOn(image, background, 0, image.height);
+}
+
+void layOn(voreltext::Image& image, const Background& background, int top, int bottom) {
+    uint8_t* pixel =
+        image.pixels.data() + static_cast<size_t>(top) * static_cast<size_t>(image.width) * 4;
+    for (int y = top; y < bottom; ++y) {
         for (int x = 0; x < image.width; ++x, pixel += 4) {
             switch (background.kind) {
                 case Background::Kind::transparent:

@@ -4,12 +4,14 @@
 #include <algorithm>
 #include <array>
 #include <memory>
+#include <string_view>
 #include <utility>
 #include <vector>
 
 #include "console.h"
 #include "error.h"
 #include "file_io.h"
+#include "film_request.h"
 #include "help_text.h"
 #include "settings.h"
 #include "style/vorelstyle.h"
@@ -19,7 +21,7 @@ namespace vorelpaint {
 namespace {
 
 /// What cannot be asked for together, beside what checkCombination explains.
-constexpr std::array<std::pair<const char*, const char*>, 19> kExclusions{{
+constexpr std::array<std::pair<const char*, const char*>, 32> kExclusions{{
     {"--text-file", "TEXT"},
     {"--preset", "--style"},
     {"--batch", "--output"},
@@ -39,7 +41,24 @@ constexpr std::array<std::pair<const char*, const char*>, 19> kExclusions{{
     {"--write-cpp", "--explain"},
     {"--write-cpp", "--print-key"},
     {"--write-cpp", "--print-margins"},
+    {"--subtitles", "TEXT"},
+    {"--subtitles", "--text-file"},
+    {"--subtitles", "--markup"},
+    {"--subtitles", "--batch"},
+    {"--subtitles", "--sheet"},
+    {"--subtitles", "--explain"},
+    {"--subtitles", "--write-cpp"},
+    {"--subtitles", "--print-key"},
+    {"--subtitles", "--print-margins"},
+    {"--subtitles", "--padding"},
+    {"--over", "--width"},
+    {"--over", "--height"},
+    {"--over", "--background"},
 }};
+
+/// What is asked of a film alone.
+constexpr std::array<const char*, 7> kOfFilms{"--over",      "--fps",   "--fade-in", "--fade-out",
+                                              "--cue-style", "--codec", "--each"};
 
 /// The value behind the name, and the default behind the description; the rest that CLI11 would tell,
 /// such as what excludes what, is told when it matters.
@@ -136,6 +155,7 @@ void checkCombination(const Options& options) {
     const bool tells = options.listPresets || options.version || options.manual || options.completion;
     if (tells) return;
     if (options.batch) return checkBatch(options);
+    if (options.film.subtitles) return checkFilm(options);
     checkOutput(options);
     checkCanvas(options);
 }
@@ -164,6 +184,8 @@ std::optional<Options> parseOptions(int argc, const char* const* argv) {
         addSetting(app, setting, options);
     for (const auto& [one, other] : kExclusions)
         app.get_option(one)->excludes(app.get_option(other));
+    for (const char* name : kOfFilms)
+        app.get_option(name)->needs(app.get_option("--subtitles"));
     try {
         app.parse(argc, argv);
     } catch (const CLI::Success&) {
@@ -173,6 +195,11 @@ std::optional<Options> parseOptions(int argc, const char* const* argv) {
         throw ToolError(faultOf(app.remaining()));
     } catch (const CLI::ParseError& error) {
         throw ToolError(error.what());
+    }
+    if (options.film.subtitles) {
+        takeFilmDefaults(options, [&](std::string_view name) {
+            return app.get_option(optionName(settingNamed(name)))->count() > 0;
+        });
     }
     checkCombination(options);
     return options;

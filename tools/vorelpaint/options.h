@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "background.h"
+#include "film_options.h"
 #include "png_writer.h"
 #include "style/vorelstyle.h"
 #include "text/voreltext.h"
@@ -52,6 +53,8 @@ struct Options {
     voreltext::CanvasRequest canvas{std::nullopt, std::nullopt, voreltext::Anchor::center, 0, 8};
     Fit fit = Fit::none;
     TextBox box = TextBox::ink;
+
+    FilmOptions film;
 
     std::optional<std::string> batch;
     bool sheet = false;

@@ -4,6 +4,7 @@
 #include <sstream>
 #include <string>
 
+#include "film_rate.h"
 #include "text/voreltext.h"
 
 /// What can be asked for at most; help and manual name the same.
@@ -24,6 +25,9 @@ constexpr Limits<float> kLineHeight{0.5F, 10.0F};
 constexpr Limits<float> kLetterSpacing{-200.0F, 200.0F};  ///< pixels, or percent of the font size
 constexpr Limits<float> kEffectScale{0.05F, 20.0F};
 constexpr Limits<float> kOpacity{0.0F, 1.0F};
+
+constexpr Limits<int> kFade{0, 60000};  ///< milliseconds
+constexpr Limits<int64_t> kFrameRates{1, FrameRate::kMost};
 
 constexpr size_t kMostFonts = 16;  ///< that a text asks in turn
 constexpr size_t kMostSheetSizes = 16;

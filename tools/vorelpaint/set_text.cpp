@@ -6,7 +6,6 @@
 #include <string>
 #include <utility>
 
-#include "error.h"
 #include "file_io.h"
 #include "font_choice.h"
 #include "ranges.h"
@@ -48,8 +47,7 @@ std::unique_ptr<Fonts> openFonts(const Options& options, int size) {
     auto fonts = std::make_unique<Fonts>(Font(main, size, options.variations));
     for (size_t i = 1; i < options.fonts.size(); ++i)
         fonts->add(Font(findFont(options.fonts[i]), size));
-    fonts->setFallback(
-        [main](const voreltext::Cluster& cluster) { return findFontFor(cluster, main); });
+    fonts->setFallback([main](const voreltext::Cluster& cluster) { return findFontFor(cluster, main); });
     return fonts;
 }
 
@@ -106,9 +104,7 @@ SetText::SetText(const Options& options, const std::vector<uint32_t>& text, int 
 SetText setToFit(const Options& options, const std::vector<uint32_t>& text) {
     const Room room = voreltext::roomOf(options.canvas);
     SetText set = setInCanvas(options, room, text);
-    if (set.layout().glyphCount() == 0) {
-        throw ToolError("nothing to paint: the text has no visible character");
-    }
+    if (set.layout().glyphCount() == 0) throw InvisibleText();
     requireRoomForGlyphs(room, set.layout(), text);
     return set;
 }

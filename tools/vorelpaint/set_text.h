@@ -4,12 +4,19 @@
 #include <memory>
 #include <vector>
 
+#include "error.h"
 #include "note.h"
 #include "options.h"
 #include "style/vorelstyle.h"
 #include "text/voreltext.h"
 
 namespace vorelpaint {
+
+/// A text without a visible character, which is nothing to paint.
+class InvisibleText : public ToolError {
+  public:
+    InvisibleText() : ToolError("nothing to paint: the text has no visible character") {}
+};
 
 /// The text that is asked for, without its markup. Throws ToolError, TextError or StyleError.
 vorelstyle::MarkedText chosenText(const Options& options);
@@ -32,7 +39,8 @@ class SetText {
 };
 
 /// Sets the text so that it fits its canvas as is asked for: in broken lines, or in a smaller font.
-/// Throws ToolError when nothing of it is visible, or the canvas is too small for one of its glyphs.
+/// Throws InvisibleText when nothing of it is visible, and ToolError when the canvas is too small for
+/// one of its glyphs.
 SetText setToFit(const Options& options, const std::vector<uint32_t>& text);
 
 /// Notes the characters that no font has.
