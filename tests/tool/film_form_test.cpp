@@ -60,7 +60,8 @@ TEST(FilmForm, Codec_IsTheContainersFirst) {
     EXPECT_EQ(name("a.webm", false), "vp9");
     EXPECT_EQ(name("a.mov", true), "prores");
     EXPECT_EQ(name("a.webm", true), "vp9");
-    EXPECT_STREQ(filmCodec("a.mkv", "ffv1", true).name, "ffv1");
+    EXPECT_EQ(name("a.mkv", true), "ffv1");
+    EXPECT_STREQ(filmCodec("a.mkv", "vp9", true).name, "vp9");
 }
 
 TEST(FilmForm, CodecThatTheContainerDoesNotHold_IsRefused) {

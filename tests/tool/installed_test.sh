@@ -17,7 +17,7 @@ for text in "$help" "${manual//\\-/-}"; do
 done
 
 pages=("$prefix"/share/doc/vorelpaint/*.md)
-[[ ${#pages[@]} -eq 2 ]] || fail "not the two pages"
+[[ ${#pages[@]} -eq 3 ]] || fail "not the three pages"
 for page in "${pages[@]}"; do
     mapfile -t links < <(grep -oE '\]\([^)#]+' "$page" | cut -c 3-)
     [[ ${#links[@]} -ge 2 ]] || fail "$page: not the links that were counted"

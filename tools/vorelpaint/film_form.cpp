@@ -36,7 +36,16 @@ const std::array<Container, 4>& containers() {
     return all;
 }
 
-/// Those of a container stand in the order in which they are chosen from.
+Words vp9In(const char* pixels) {
+    return {"-c:v", "libvpx-vp9", "-crf", "24", "-b:v", "0", "-row-mt", "1", "-pix_fmt", pixels};
+}
+
+Words proresIn(const char* pixels, const char* profile) {
+    return {"-c:v", "prores_ks", "-profile:v", profile, "-vendor", "apl0", "-pix_fmt", pixels};
+}
+
+/// Those of a container stand in the order in which they are chosen from. FFV1 keeps the pixels as they
+/// come where there is nothing to see through.
 const std::array<FilmCodec, 5>& codecs() {
     static const std::array<FilmCodec, 5> all{
         {{"h264",
@@ -45,25 +54,20 @@ const std::array<FilmCodec, 5>& codecs() {
           {},
           true,
           true},
-         {"vp9",
-          {"webm", "mkv"},
-          {"-c:v", "libvpx-vp9", "-crf", "24", "-b:v", "0", "-row-mt", "1", "-pix_fmt", "yuv420p"},
-          {"-c:v", "libvpx-vp9", "-crf", "24", "-b:v", "0", "-row-mt", "1", "-pix_fmt", "yuva420p"},
-          true,
-          false},
          {"prores",
           {"mov"},
-          {"-c:v", "prores_ks", "-profile:v", "hq", "-vendor", "apl0", "-pix_fmt", "yuv422p10le"},
-          {"-c:v", "prores_ks", "-profile:v", "4444", "-vendor", "apl0", "-pix_fmt", "yuva444p10le"},
+          proresIn("yuv422p10le", "hq"),
+          proresIn("yuva444p10le", "4444"),
           true,
           false},
-         {"png", {"mov", "mkv"}, {}, {"-c:v", "png", "-pix_fmt", "rgba"}, false, false},
          {"ffv1",
           {"mkv"},
           {"-c:v", "ffv1", "-level", "3"},
           {"-c:v", "ffv1", "-level", "3", "-pix_fmt", "bgra"},
           false,
-          false}}};
+          false},
+         {"png", {"mov", "mkv"}, {}, {"-c:v", "png", "-pix_fmt", "rgba"}, false, false},
+         {"vp9", {"webm", "mkv"}, vp9In("yuv420p"), vp9In("yuva420p"), true, false}}};
     return all;
 }
 
