@@ -38,7 +38,7 @@ BELOW = {
     "unicode": set(),
     "style": {"unicode"},
     "text": {"unicode"},
-    "tools": {"style", "text"},
+    "tools": {"style", "text", "unicode"},
     "examples": set(),
     "include": set(),
 }

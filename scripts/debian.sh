@@ -6,7 +6,8 @@ cd "$(dirname "$0")/.."
 . scripts/quietly.sh
 
 need_packages cmake ninja-build g++ pkg-config dpkg-dev file gzip \
-    libraqm-dev libfreetype-dev libfontconfig-dev libpng-dev nlohmann-json3-dev libcli11-dev
+    libfreetype-dev libfribidi-dev libharfbuzz-dev libunibreak-dev libfontconfig-dev libpng-dev \
+    nlohmann-json3-dev libcli11-dev
 
 build=build/debian
 # In /usr the multiarch directories are chosen, and programs need no search path of their own. No path

@@ -10,7 +10,7 @@ A mistake is a paragraph of tests/mutants/*.txt:
     tests: MaskBlend*:ColourBlend*  filter of the tests that belong to the file
 
 The text of `line` stands exactly once in the file; `with` takes its place, and may be empty. Further
-keys: `program`, of the tests where it is not voreleffect_tests; `needs`, the level (avx2, avx512), or
+keys: `program`, of the tests where it is not the room's; `needs`, the level (avx2, avx512), or
 arm64, that the machine must have; and `equal`, the reason why no test can see it.
 """
 import argparse
@@ -28,8 +28,10 @@ import time
 ROOT = pathlib.Path(__file__).resolve().parent.parent
 LISTS = ROOT / "tests/mutants"
 BUILDS = ROOT / "build/mutants"
-ROOMS = ["core", "simd", "property", "blend", "ops", "cores", "effect"]
+ROOMS = ["core", "simd", "property", "blend", "ops", "cores", "effect", "style"]
 UNIT = "voreleffect_tests"
+# The unit tests of rooms that are not the library's; their sources are linked into them.
+OWN_UNITS = {"style": "vorelstyle_tests"}
 LIBRARY = "voreleffect_tested"
 CPU_FLAGS = {"avx2": "avx2", "avx512": "avx512_vnni"}
 # Longer than any test takes on a loaded machine: a mistake that never ends is caught.
@@ -49,6 +51,10 @@ class Mutant:
     @property
     def room(self):
         return self.name.split(".")[0]
+
+    @property
+    def unit(self):
+        return OWN_UNITS.get(self.room, UNIT)
 
     def source(self, root):
         return root / self.file
@@ -112,8 +118,9 @@ def lacks(mutant, arm64):
 class Tree:
     """A copy of the sources with a build of its own."""
 
-    def __init__(self, number, arm64):
+    def __init__(self, number, arm64, units):
         self.home = BUILDS / (f"arm64-{number}" if arm64 else str(number))
+        self.units = units
         self.source = self.home / "source"
         self.build = self.home / "build"
         self.arm64 = arm64
@@ -136,7 +143,8 @@ class Tree:
     def configure(self):
         options = ["-DVOREL_BUILD_TESTS=ON", "-DCMAKE_BUILD_TYPE=Release", "-DVOREL_THINNED=8",
                    # A test need not be linked anew because the library has changed.
-                   "-DCMAKE_LINK_DEPENDS_NO_SHARED=ON"]
+                   "-DCMAKE_LINK_DEPENDS_NO_SHARED=ON",
+                   f"-DVOREL_BUILD_TOOLS={'ON' if self.units - {UNIT} else 'OFF'}"]
         if self.arm64:
             options = ["--preset", "arm64"] + options + ["-DVOREL_WERROR=OFF", "-DVOREL_ASSERTIONS=OFF"]
         else:
@@ -182,12 +190,13 @@ class Tree:
         text = path.read_text()
         path.write_text(mutant.mutated(text))
         try:
-            program = mutant.program or UNIT
+            program = mutant.program or mutant.unit
+            in_library = program == UNIT
             # The tests themselves rarely know the mutated source: first without building them anew.
             for targets, program, tests, thinned, by in [
-                    ([LIBRARY] if not mutant.program else [program], program, mutant.tests, 16, "its tests"),
+                    ([LIBRARY if in_library else program], program, mutant.tests, 16, "its tests"),
                     ([program], program, mutant.tests, 1, "its tests, all cases"),
-                    ([UNIT], UNIT, "*", 4, "another test")]:
+                    ([mutant.unit], mutant.unit, "*", 4, "another test")]:
                 built, output = self.make(*targets)
                 if not built:
                     return "broken", output[-1500:]
@@ -247,11 +256,12 @@ def main():
         try:
             tree.copy()
             tree.configure()
-            built, output = tree.make(LIBRARY, UNIT)
+            built, output = tree.make(LIBRARY, *tree.units)
             if not built:
                 raise RuntimeError(output[-3000:])
-            if not tree.passes(UNIT, "*", 16):
-                raise RuntimeError("the tests fail without a mistake")
+            for unit in tree.units:
+                if not tree.passes(unit, "*", 16):
+                    raise RuntimeError("the tests fail without a mistake")
             while True:
                 mutant = todo.get_nowait()
                 start = time.monotonic()
@@ -268,7 +278,8 @@ def main():
                 todo.get_nowait()
 
     count = max(1, min(arguments.jobs, todo.qsize()))
-    workers = [threading.Thread(target=work, args=(Tree(i, arguments.arm64),)) for i in range(count)]
+    units = {m.unit for m in todo.queue}
+    workers = [threading.Thread(target=work, args=(Tree(i, arguments.arm64, units),)) for i in range(count)]
     for worker in workers:
         worker.start()
     for worker in workers:

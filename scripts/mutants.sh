@@ -1,5 +1,5 @@
 #!/usr/bin/env bash
-# Plants the mistakes of tests/mutants in the library, one at a time, and runs the tests that belong to
+# Plants the mistakes of tests/mutants in the sources, one at a time, and runs the tests that belong to
 # each: all must be caught. Installs what it needs on Debian (as root). By hand and before releases.
 #
 #     scripts/mutants.sh                    all of them, on as many copies of the tree as there are cores
@@ -20,6 +20,7 @@ case " $* " in
     *" --arm64 "*) need_packages cmake ninja-build g++ pkg-config googletest libfreetype-dev fonts-dejavu-core \
         python3 g++-aarch64-linux-gnu qemu-user-static ;;
     *) need_packages cmake ninja-build g++ pkg-config libgtest-dev libfreetype-dev fonts-dejavu-core \
-        android-liblog-dev python3 ;;
+        android-liblog-dev libraqm-dev libfribidi-dev libharfbuzz-dev libfontconfig-dev libpng-dev \
+        nlohmann-json3-dev libcli11-dev python3 python3-jsonschema zsh fish mandoc locales ;;
 esac
 exec python3 -B scripts/mutants.py "$@"

@@ -188,6 +188,7 @@ std::string_view effectName(int type) {
 
 std::vector<std::string_view> effectNames() {
     std::vector<std::string_view> names;
+    names.reserve(kEffectKinds.size());
     for (const EffectKind& kind : kEffectKinds)
         names.emplace_back(kind.name);
     return names;

@@ -98,8 +98,10 @@ std::string readStroke(FragmentReader& reader) {
 }
 
 std::string readPlace(FragmentReader& reader) {
-    std::string text = "moved by " + std::to_string(reader.offset());
-    text += ", " + std::to_string(reader.offset());
+    const int x = reader.offset();
+    const int y = reader.offset();
+    std::string text =
+        x == 0 && y == 0 ? "not moved" : "moved by " + std::to_string(x) + ", " + std::to_string(y);
     const unsigned int last = reader.small();
     const unsigned int span = last & kSpanBits;
     if (span != 0) text += ", by " + std::string(kSpanNames[span]);

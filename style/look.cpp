@@ -30,10 +30,10 @@ VFGradient* dataOf(const Stops& stops) {
 /// Makes the add-call of one effect and returns its result.
 class AddCall {
   public:
-    AddCall(VFEffect& effects, uint32_t fill, float textOpacity, const LoadImage& load, Note note)
+    AddCall(VFEffect& effects, uint32_t fill, float fillOpacity, const LoadImage& load, Note note)
         : mEffects(effects),
           mFill(fill),
-          mTextOpacity(textOpacity),
+          mFillOpacity(fillOpacity),
           mLoad(load),
           mNote(std::move(note)) {}
 
@@ -70,9 +70,7 @@ class AddCall {
                         image.pixels.data(), 4);
         return mEffects.addPatternText(&bitmap, patternScale(e, image, mNote), e.opacity);
     }
-    unsigned int operator()(const TextFill& e) const {
-        return mEffects.addText(mFill, e.opacity * mTextOpacity);
-    }
+    unsigned int operator()(const TextFill&) const { return mEffects.addText(mFill, mFillOpacity); }
 
   private:
     template <typename Call>
@@ -84,17 +82,25 @@ class AddCall {
 
     VFEffect& mEffects;
     uint32_t mFill;
-    float mTextOpacity;
+    float mFillOpacity;
     const LoadImage& mLoad;
     Note mNote;
 };
 
+float fillOpacityOf(const LookStyle& look, float textOpacity) {
+    for (const Effect& effect : look.effects) {
+        if (const auto* text = std::get_if<TextFill>(&effect)) return text->opacity * textOpacity;
+    }
+    return textOpacity;
+}
+
 }  // namespace
 
-Look::Look(const LookStyle& look, uint32_t fill, float textOpacity, const LoadImage& load) {
+Look::Look(const LookStyle& look, uint32_t fill, float textOpacity, const LoadImage& load)
+    : mFillOpacity(fillOpacityOf(look, textOpacity)) {
     requireResolved(look);
     mEffects.setTextOpacity(textOpacity);
-    const AddCall add(mEffects, fill, textOpacity, load,
+    const AddCall add(mEffects, fill, mFillOpacity, load,
                       [this](const std::string& line) { mNotes.push_back(line); });
     for (const Effect& effect : look.effects) {
         if (std::visit(add, effect) == kNoCore) {

@@ -33,12 +33,16 @@ class Look {
     VFontEffect::VFEffect& effects() { return mEffects; }
     const VFontEffect::VFEffect& effects() const { return mEffects; }
 
+    /// The opacity of the text's fill: that of the text, multiplied with that of the effect `text`.
+    float fillOpacity() const { return mFillOpacity; }
+
     /// The types of its effects (VFEffect.h) in the order in which they were added.
     const std::vector<int>& added() const { return mAdded; }
 
   private:
     VFontEffect::VFEffect mEffects;
     std::vector<int> mAdded;
+    float mFillOpacity;
     std::string mKey;
     std::vector<std::string> mUnpainted;
     std::vector<std::string> mNotes;

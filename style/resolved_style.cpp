@@ -89,9 +89,9 @@ class Resolver {
     }
 
     template <typename Number>
-    float limited(Number pixels, const char* key) const {
-        if (!(pixels > static_cast<Number>(kMaxPixels))) return static_cast<float>(pixels);
-        note(key, spelled(pixels) + " pixels are more than the library's 100; painted with 100");
+    float limited(Number asked, const char* key) const {
+        if (!(asked > static_cast<Number>(kMaxPixels))) return static_cast<float>(asked);
+        note(key, spelled(asked) + " pixels are more than the library's 100; painted with 100");
         return kMaxPixels;
     }
 

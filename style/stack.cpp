@@ -58,8 +58,9 @@ Stack::Stack(const Style& style, std::optional<uint32_t> fill, std::optional<flo
             add(path, {Look(style.looks[i], text.fill, text.opacity, load), places[i]});
         });
     }
+    const bool isPlain = isOneInItsPlace(places) && places.front().isFilled;
     for (const StackedLook& stacked : mLooks) {
-        if (!isOneInItsPlace(places)) mKey += placeFragment(stacked.place);
+        if (!isPlain) mKey += placeFragment(stacked.place);
         mKey += stacked.look.key();
     }
 }

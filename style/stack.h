@@ -54,8 +54,9 @@ class Stack {
     std::optional<size_t> topFill() const { return mTopFill; }
 
     /// The cache key: the keys of the looks, the lowest first, each behind the fragment of its place
-    /// (placeFragment). One look that is not moved, of the whole block, has its own key alone. Two
-    /// stacks of one key paint the same, but for their patterns.
+    /// (placeFragment). One look that is filled and not moved, of the whole block, has its own key
+    /// alone. Stacks that differ in the offset or the span of a look, or in whether it is filled, never
+    /// share a key.
     const std::string& key() const { return mKey; }
 
     /// Effects that this library has no core for, with their paths; they are not painted.

@@ -2,7 +2,7 @@
 
 #include <ft2build.h>
 #include FT_FREETYPE_H
-#include FT_SIZES_H
+#include FT_PARAMETER_TAGS_H
 
 #include <utility>
 
@@ -28,18 +28,29 @@ int pictureSizeFor(FT_Face face, int sizePx) {
 
 }  // namespace
 
+/// Where a face is opened from; a message begins with `subject`.
+struct Font::Source {
+    std::string subject;
+    long faceIndex;
+    FT_Open_Args arguments;
+};
+
 Font::Font(const FontFile& file, int sizePx, const std::vector<FontVariation>& variations)
     : mSizePx(sizePx) {
-    open("'" + file.path + "' is ", variations,
-         [&] { return FT_New_Face(mLibrary, file.path.c_str(), file.faceIndex, &mFace); });
+    std::string path = file.path;
+    Source source{"'" + path + "' is ", file.faceIndex, {}};
+    source.arguments.flags = FT_OPEN_PATHNAME;
+    source.arguments.pathname = path.data();
+    open(source, variations);
 }
 
 Font::Font(const FontBytes& bytes, int sizePx, const std::vector<FontVariation>& variations)
     : mSizePx(sizePx) {
-    open("the bytes are ", variations, [&] {
-        return FT_New_Memory_Face(mLibrary, bytes.data, static_cast<FT_Long>(bytes.size),
-                                  bytes.faceIndex, &mFace);
-    });
+    Source source{"the bytes are ", bytes.faceIndex, {}};
+    source.arguments.flags = FT_OPEN_MEMORY;
+    source.arguments.memory_base = bytes.data;
+    source.arguments.memory_size = static_cast<FT_Long>(bytes.size);
+    open(source, variations);
 }
 
 Font::~Font() {
@@ -53,7 +64,7 @@ Font::Font(Font&& other) noexcept : mSizePx(other.mSizePx) {
 Font& Font::operator=(Font&& other) noexcept {
     std::swap(mLibrary, other.mLibrary);
     std::swap(mFace, other.mFace);
-    std::swap(mPictureSize, other.mPictureSize);
+    std::swap(mPictures, other.mPictures);
     std::swap(mPicturePpem, other.mPicturePpem);
     std::swap(mSizePx, other.mSizePx);
     mName.swap(other.mName);
@@ -63,50 +74,56 @@ Font& Font::operator=(Font&& other) noexcept {
     return *this;
 }
 
-/// Opens the face by `openFace`; a message begins with `subject`.
-template <typename Open>
-void Font::open(const std::string& subject, const std::vector<FontVariation>& variations,
-                Open openFace) {
+void Font::open(const Source& source, const std::vector<FontVariation>& variations) {
     if (FT_Init_FreeType(&mLibrary) != 0) throw TextError("cannot start FreeType");
     try {
-        if (openFace() != 0) throw TextError(subject + "no font that can be read");
-        prepare(subject, variations);
+        openFaces(source);
+        if (!variations.empty()) setAxes(mFace, variations, source.subject);
+        if (!chooseSizes()) throw TextError(source.subject + "a font without outlines");
+        measure();
+        if (mLineHeight <= 0 || mAscender <= mDescender) {
+            throw TextError(source.subject + "a font without vertical metrics");
+        }
     } catch (...) {
         FT_Done_FreeType(mLibrary);
         throw;
-    }
-}
-
-void Font::prepare(const std::string& subject, const std::vector<FontVariation>& variations) {
-    if (!variations.empty()) setAxes(mFace, variations, subject);
-    if (!chooseSize()) throw TextError(subject + "a font without outlines");
-    measure();
-    if (mLineHeight <= 0 || mAscender <= mDescender) {
-        throw TextError(subject + "a font without vertical metrics");
     }
     mName = mFace->family_name == nullptr ? "unnamed" : mFace->family_name;
     if (mFace->style_name != nullptr) mName.append(" ").append(mFace->style_name);
 }
 
-bool Font::chooseSize() {
-    if (!hasOutlines()) {
-        mPictureSize = mFace->size;
-        return choosePictures();
+/// A second face for the pictures of one that has outlines: each keeps its size. What has pictures in
+/// Apple's table has outlines for FreeType only when the pictures are ignored.
+void Font::openFaces(const Source& source) {
+    const auto openFace = [&](FT_Face& face, std::vector<FT_Parameter> parameters) {
+        FT_Open_Args arguments = source.arguments;
+        arguments.flags |= FT_OPEN_PARAMS;
+        arguments.num_params = static_cast<FT_Int>(parameters.size());
+        arguments.params = parameters.data();
+        if (FT_Open_Face(mLibrary, &arguments, source.faceIndex, &face) != 0) {
+            throw TextError(source.subject + "no font that can be read");
+        }
+    };
+    openFace(mFace, {});
+    const bool hasPictures = FT_HAS_COLOR(mFace) && FT_HAS_FIXED_SIZES(mFace);
+    if (!hasPictures) return;
+    mPictures = mFace;
+    if (FT_HAS_SBIX(mFace)) {
+        openFace(mFace, {{FT_PARAM_TAG_IGNORE_SBIX, nullptr}});
+    } else if (FT_IS_SCALABLE(mFace)) {
+        openFace(mPictures, {});
     }
-    if (FT_HAS_COLOR(mFace) && FT_New_Size(mFace, &mPictureSize) == 0) {
-        const FT_Size outlines = mFace->size;
-        FT_Activate_Size(mPictureSize);
-        if (!choosePictures()) mPictureSize = nullptr;  // the face keeps it to its end
-        FT_Activate_Size(outlines);
-    }
-    return FT_Set_Pixel_Sizes(mFace, 0, static_cast<FT_UInt>(mSizePx)) == 0;
 }
 
-/// For the active size of the face.
+bool Font::chooseSizes() {
+    if (mPictures != nullptr && !choosePictures()) return false;
+    return !hasOutlines() ||
+           (FT_IS_SCALABLE(mFace) && FT_Set_Pixel_Sizes(mFace, 0, static_cast<FT_UInt>(mSizePx)) == 0);
+}
+
 bool Font::choosePictures() {
-    const bool isChosen = FT_HAS_COLOR(mFace) && FT_HAS_FIXED_SIZES(mFace) &&
-                          FT_Select_Size(mFace, pictureSizeFor(mFace, mSizePx)) == 0;
-    if (isChosen) mPicturePpem = mFace->size->metrics.y_ppem;
+    if (FT_Select_Size(mPictures, pictureSizeFor(mPictures, mSizePx)) != 0) return false;
+    mPicturePpem = mPictures->size->metrics.y_ppem;
     return mPicturePpem > 0;
 }
 
@@ -122,16 +139,12 @@ int64_t Font::scaled(int64_t units) const {
     return floorOf(2 * units * mSizePx + mPicturePpem, 2 * int64_t{mPicturePpem});
 }
 
-bool Font::hasOutlines() const {
-    return FT_IS_SCALABLE(mFace);
-}
-
 bool Font::has(uint32_t code) const {
     return FT_Get_Char_Index(mFace, code) != 0;
 }
 
 bool Font::isColour() const {
-    return FT_HAS_COLOR(mFace);
+    return mPictures != nullptr || FT_HAS_COLOR(mFace);
 }
 
 }  // namespace voreltext

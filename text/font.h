@@ -7,7 +7,6 @@
 
 struct FT_FaceRec_;
 struct FT_LibraryRec_;
-struct FT_SizeRec_;
 
 namespace voreltext {
 
@@ -58,28 +57,29 @@ class Font {
 
     bool has(uint32_t code) const;  ///< whether it has a glyph for the character
     bool isColour() const;          ///< whether some of its glyphs have colours of their own
-    bool hasOutlines() const;       ///< else all of its glyphs are pictures of one size
+    bool hasOutlines() const { return mPictures != mFace; }  ///< else all of its glyphs are pictures
 
-    /// FreeType's own: the face; and the size of the face's pictures, which is that of the face itself
-    /// where there are no outlines, null without pictures.
+    /// FreeType's own: the face, and the face with the pictures, which are of one size; null without,
+    /// and the same where there is nothing else.
     FT_FaceRec_* face() const { return mFace; }
-    FT_SizeRec_* pictureSize() const { return mPictureSize; }
+    FT_FaceRec_* pictures() const { return mPictures; }
     int picturePpem() const { return mPicturePpem; }  ///< pixels of the em of the pictures, 0 without
 
     /// A length of the face, as FreeType and shapers tell it, in the font's size.
     int64_t scaled(int64_t units) const;
 
   private:
-    template <typename Open>
-    void open(const std::string& subject, const std::vector<FontVariation>& variations, Open openFace);
-    void prepare(const std::string& subject, const std::vector<FontVariation>& variations);
-    bool chooseSize();
+    struct Source;
+
+    void open(const Source& source, const std::vector<FontVariation>& variations);
+    void openFaces(const Source& source);
+    bool chooseSizes();
     bool choosePictures();
     void measure();
 
     FT_LibraryRec_* mLibrary = nullptr;
     FT_FaceRec_* mFace = nullptr;
-    FT_SizeRec_* mPictureSize = nullptr;
+    FT_FaceRec_* mPictures = nullptr;
     int mPicturePpem = 0;
     int mSizePx;
     std::string mName;

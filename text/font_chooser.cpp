@@ -15,13 +15,11 @@ void assign(std::vector<size_t>& fonts, size_t begin, size_t end, size_t font) {
 }  // namespace
 
 struct FontChooser::Line {
-    explicit Line(const Paragraph& from)
-        : paragraph(from), isRtl(isRightToLeft(from)), tried(from.codes.size()) {
+    explicit Line(const Paragraph& from) : paragraph(from), tried(from.codes.size()) {
         result.fonts.resize(from.codes.size());
     }
 
     const Paragraph& paragraph;
-    bool isRtl;
     std::vector<size_t> tried;  ///< for the first character of each cluster how many fonts had it
     FontedParagraph result;
 };
@@ -37,9 +35,11 @@ FontedParagraph FontChooser::choose(const Paragraph& paragraph) {
     return std::move(line.result);
 }
 
-void FontChooser::shape(Line& line) const {
-    line.result.glyphs = mShaper.shape({line.paragraph.codes.data(), line.result.fonts.data(),
-                                        line.paragraph.codes.size(), line.isRtl});
+void FontChooser::shape(Line& line) {
+    const Paragraph& paragraph = line.paragraph;
+    line.result.glyphs =
+        mShaper.shape({paragraph.codes.data(), line.result.fonts.data(), paragraph.scripts.data(),
+                       paragraph.levels.data(), paragraph.codes.size(), paragraph.isRightToLeft});
 }
 
 /// In the order of the text.

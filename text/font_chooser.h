@@ -33,7 +33,7 @@ struct FontedParagraph {
 class FontChooser {
   public:
     /// Both must outlive it.
-    FontChooser(Fonts& fonts, const Shaper& shaper) : mFonts(fonts), mShaper(shaper) {}
+    FontChooser(Fonts& fonts, Shaper& shaper) : mFonts(fonts), mShaper(shaper) {}
 
     /// Throws TextError.
     FontedParagraph choose(const Paragraph& paragraph);
@@ -52,7 +52,7 @@ class FontChooser {
 
     static std::vector<Span> spansOf(const Line& line);
     static Cluster clusterOf(const Line& line, const Span& span);
-    void shape(Line& line) const;
+    void shape(Line& line);
     bool preferPresentations(Line& line);
     std::optional<size_t> fontFor(const Cluster& cluster, bool isColour);
     bool replaceMissing(Line& line);
@@ -62,7 +62,7 @@ class FontChooser {
     void noteMissing(uint32_t code, size_t place);
 
     Fonts& mFonts;
-    const Shaper& mShaper;
+    Shaper& mShaper;
     std::map<Cluster, std::optional<size_t>> mFallbacks;
     std::vector<MissingCharacter> mMissing;
     std::map<uint32_t, size_t> mPlaces;  ///< of characters in mMissing

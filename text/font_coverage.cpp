@@ -66,7 +66,7 @@ FontPattern FontCoverage::wantedLike(const FontFile& like) const {
     FontPattern wanted(FcPatternCreate());
     int count = 0;
     const FontPattern font(
-        FcFreeTypeQuery(fcText(like.path), static_cast<int>(like.faceIndex), nullptr, &count));
+        FcFreeTypeQuery(fcText(like.path), static_cast<unsigned int>(like.faceIndex), nullptr, &count));
     if (!wanted || !font) return wanted;
     for (const char* object : {FC_FAMILY, FC_WEIGHT, FC_SLANT, FC_WIDTH, FC_SPACING})
         copy(wanted.get(), font.get(), object);

@@ -5,18 +5,12 @@
 #include <memory>
 #include <string>
 
+#include "text/destroy.h"
 #include "text/font.h"
 
 /// Owners of what fontconfig hands out.
 namespace voreltext {
 
-template <auto kDestroy>
-struct Destroy {
-    template <typename T>
-    void operator()(T* object) const {
-        kDestroy(object);
-    }
-};
 using FontConfig = std::unique_ptr<FcConfig, Destroy<FcConfigDestroy>>;
 using FontPattern = std::unique_ptr<FcPattern, Destroy<FcPatternDestroy>>;
 using FontList = std::unique_ptr<FcFontSet, Destroy<FcFontSetDestroy>>;

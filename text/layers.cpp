@@ -1,9 +1,9 @@
 #include "text/layers.h"
 
 #include <algorithm>
+#include <iterator>
 #include <map>
-#include <memory>
-#include <new>
+#include <set>
 #include <utility>
 
 #include "text/overlay.h"
@@ -54,48 +54,54 @@ Image paintRun(VFEffect& effects, const Part& part, const Frame& frame) {
     return run.picture();
 }
 
-/// An outer glow ends twice its pad, which is its size + 1, from the glyphs: its faint end lies beyond the
-/// margins.
+/// An outer glow ends twice its pad, which is its size + 1, from the glyphs: its faint end lies beyond
+/// the margins.
 int faintEndOf(VFEffect& effects) {
     constexpr int kOuterGlowType = 3;
     VFontEffect::VFECore* const glow = effects.getEffect(kOuterGlowType);
     return glow == nullptr ? 0 : glow->getOffset() + 2;
 }
 
-/// The effects that paint the characters at this place of the text.
-const VFEffect* effectsAt(const Layer& layer, size_t cluster) {
-    for (const Exchange& exchange : layer.exchanges) {
-        if (cluster >= exchange.begin && cluster < exchange.end) return exchange.effects;
-    }
-    return layer.effects;
+constexpr uint32_t kOwnFill = 0xFFFFFFFF;  ///< that of the layer; no colour 0xRRGGBB
+
+/// The colour of the fill of the characters at this place of the text.
+uint32_t fillAt(const Layer& layer, size_t cluster) {
+    const auto next = std::upper_bound(
+        layer.colours.begin(), layer.colours.end(), cluster,
+        [](size_t place, const ColouredPart& coloured) { return place < coloured.begin; });
+    if (next == layer.colours.begin()) return kOwnFill;
+    const ColouredPart& coloured = *std::prev(next);
+    return cluster < coloured.end ? coloured.colour & 0xFFFFFF : kOwnFill;
 }
 
-/// Takes the pixels that a glyph covers from another picture of the same frame.
-void takeGlyph(Image& picture, const Image& other, const GlyphMask& mask, const Frame& frame) {
-    const uint8_t* coverage = mask.coverage.data();
-    for (int y = mask.box.top; y < mask.box.bottom; ++y) {
-        for (int x = mask.box.left; x < mask.box.right; ++x, ++coverage) {
-            if (*coverage == 0) continue;
-            const size_t at = offsetOf(picture, x + frame.shiftX(), y + frame.shiftY());
-            std::copy_n(&other.pixels[at], 4, &picture.pixels[at]);
+/// For each pixel of a run's picture the fill of the last glyph that covers it.
+std::vector<uint32_t> fillsShown(const Part& part, const std::vector<uint32_t>& fills,
+                                 const Frame& frame) {
+    const auto width = static_cast<size_t>(frame.width());
+    std::vector<uint32_t> shown(width * static_cast<size_t>(frame.height()), kOwnFill);
+    for (size_t i = 0; i < part.masks.size(); ++i) {
+        const Box& box = part.masks[i].box;
+        const uint8_t* coverage = part.masks[i].coverage.data();
+        for (int y = box.top; y < box.bottom; ++y) {
+            uint32_t* pixel = &shown[static_cast<size_t>(y + frame.shiftY()) * width +
+                                     static_cast<size_t>(box.left + frame.shiftX())];
+            for (int x = box.left; x < box.right; ++x, ++coverage, ++pixel) {
+                if (*coverage != 0) *pixel = fills[i];
+            }
         }
     }
+    return shown;
 }
 
 /// Paints parts of the text in one layer.
 class LayerPainter {
   public:
-    explicit LayerPainter(const Layer& layer) : mLayer(layer) {
-        copyOf(layer.effects);
-        for (const Exchange& exchange : layer.exchanges)
-            copyOf(exchange.effects);
-    }
+    explicit LayerPainter(const Layer& layer) : mLayer(layer), mEffects(*layer.effects) {}
 
     void paint(Image& canvas, const Canvas& place, const Part& part) {
-        VFEffect& effects = copyOf(mLayer.effects);
-        const Frame frame{part.ink, marginsOf(effects), faintEndOf(effects)};
-        Image picture = paintRun(effects, part, frame);
-        exchangeGlyphs(picture, part, frame);
+        const Frame frame{part.ink, marginsOf(mEffects), faintEndOf(mEffects)};
+        Image picture = paintRun(mEffects, part, frame);
+        colour(picture, part, frame);
         const int x = place.x + mLayer.x;
         const int y = place.y + mLayer.y;
         layOver(canvas, picture, x - frame.shiftX(), y - frame.shiftY());
@@ -105,26 +111,28 @@ class LayerPainter {
     }
 
   private:
-    /// A set to paint with: painting plans a set, and a planned one may paint in another order once its
-    /// effects are changed.
-    VFEffect& copyOf(const VFEffect* effects) {
-        return mCopies.try_emplace(effects, *effects).first->second;
+    /// One colour after the other: a text may have thousands.
+    void colour(Image& picture, const Part& part, const Frame& frame) const {
+        std::vector<uint32_t> fills;
+        fills.reserve(part.clusters.size());
+        for (const size_t cluster : part.clusters)
+            fills.push_back(fillAt(mLayer, cluster));
+        std::set<uint32_t> colours(fills.begin(), fills.end());
+        colours.erase(kOwnFill);
+        if (colours.empty()) return;
+        const std::vector<uint32_t> shown = fillsShown(part, fills, frame);
+        for (const uint32_t colour : colours) {
+            const Image coloured = paintedIn(colour, part, frame);
+            for (size_t i = 0; i < shown.size(); ++i) {
+                if (shown[i] == colour) std::copy_n(&coloured.pixels[i * 4], 4, &picture.pixels[i * 4]);
+            }
+        }
     }
 
-    /// Glyphs may overlap: every one is taken, in their order, from the picture that is its own.
-    void exchangeGlyphs(Image& picture, const Part& part, const Frame& frame) {
-        std::map<const VFEffect*, Image> pictures;
-        for (const size_t cluster : part.clusters) {
-            const VFEffect* effects = effectsAt(mLayer, cluster);
-            if (effects == mLayer.effects || pictures.count(effects) != 0) continue;
-            pictures[effects] = paintRun(copyOf(effects), part, frame);
-        }
-        if (pictures.empty()) return;
-        const Image own = picture;
-        for (size_t i = 0; i < part.masks.size(); ++i) {
-            const auto found = pictures.find(effectsAt(mLayer, part.clusters[i]));
-            takeGlyph(picture, found == pictures.end() ? own : found->second, part.masks[i], frame);
-        }
+    Image paintedIn(uint32_t colour, const Part& part, const Frame& frame) const {
+        VFEffect effects(*mLayer.effects);
+        effects.addText(colour, mLayer.fillOpacity);
+        return paintRun(effects, part, frame);
     }
 
     void layPicture(Image& canvas, const GlyphMask& mask, int x, int y) const {
@@ -135,7 +143,9 @@ class LayerPainter {
     }
 
     const Layer& mLayer;
-    std::map<const VFEffect*, VFEffect> mCopies;
+    /// Painting plans a set, and a planned one may paint in another order once its effects are changed:
+    /// that of the layer is copied.
+    VFEffect mEffects;
 };
 
 }  // namespace

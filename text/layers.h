@@ -3,6 +3,7 @@
 #include <voreleffect/VFEffect.h>
 
 #include <cstddef>
+#include <cstdint>
 #include <vector>
 
 #include "text/canvas.h"
@@ -20,21 +21,25 @@ enum class Span { block, line, word, glyph };
 /// The glyphs of a text by their spans, in reading order.
 std::vector<std::vector<size_t>> spansOf(const TextLayout& text, Span span);
 
-/// A part of a text whose glyphs are taken from the picture that other effects paint.
-struct Exchange {
-    size_t begin;  ///< code points of the text, half-open; parts do not overlap
+/// A part of a text whose fill has a colour of its own.
+struct ColouredPart {
+    size_t begin;  ///< code points of the text, half-open
     size_t end;
-    const VFontEffect::VFEffect* effects;  ///< of the reach of the layer's own
+    uint32_t colour;  ///< 0xRRGGBB
 };
 
-/// One look of a stack. The sets of effects must outlive it and are not planned by painting: they can be
+/// One look of a stack. The set of effects must outlive it and is not planned by painting: it can be
 /// painted again.
 struct Layer {
     const VFontEffect::VFEffect* effects;
     int x = 0;  ///< how far it is moved, in pixels to the right and downwards
     int y = 0;
     Span span = Span::block;  ///< spans are painted in reading order, later ones over earlier ones
-    std::vector<Exchange> exchanges = {};
+
+    /// In the order of the text, none over another. A span is painted once more for each colour in it,
+    /// one after the other, and the glyphs of that colour are taken from there; all else stays.
+    std::vector<ColouredPart> colours = {};
+    float fillOpacity = 1;  ///< of these colours
 
     /// Whether the pictures of colour fonts are laid over what the effects make of their coverage, and
     /// at which opacity.

@@ -44,7 +44,6 @@ struct LineSetter::Source {
     const Paragraph& paragraph;
     const FontedParagraph& fonted;
     const Wrapping& wrapping;
-    bool isRightToLeft;
 };
 
 LineSetter::LineSetter(Fonts& fonts, const TextSettings& settings)
@@ -57,14 +56,13 @@ LineSetter::LineSetter(Fonts& fonts, const TextSettings& settings)
 void LineSetter::set(const Paragraph& paragraph, const Take& take) {
     FontedParagraph fonted = mChooser.choose(paragraph);
     addLetterSpacing(fonted.glyphs, paragraph.codes, mSpacing);
-    const bool isRtl = isRightToLeft(paragraph);
     const size_t end = paragraph.codes.size();
     if (mWidth == 0 || end == 0) {
-        take(placed(std::move(fonted.glyphs), paragraph, 0, end, isRtl));
+        take(placed(std::move(fonted.glyphs), paragraph, 0, end));
         return;
     }
     const Wrapping wrapping(paragraph, fonted.glyphs);
-    const Source source{paragraph, fonted, wrapping, isRtl};
+    const Source source{paragraph, fonted, wrapping};
     for (size_t begin = 0; begin < end;) {
         SetLine line = nextLine(source, begin);
         begin = line.end - paragraph.begin;
@@ -73,15 +71,14 @@ void LineSetter::set(const Paragraph& paragraph, const Take& take) {
 }
 
 /// The line that begins at `begin`.
-SetLine LineSetter::nextLine(const Source& source, size_t begin) const {
+SetLine LineSetter::nextLine(const Source& source, size_t begin) {
     if (auto line = longestLine(source, Wrapping::Ends::ofWords, begin)) return *std::move(line);
     if (auto line = longestLine(source, Wrapping::Ends::ofClusters, begin)) return *std::move(line);
     refuseWidth(source.paragraph, begin, mWidth);
 }
 
 /// The longest line that begins at `begin` and is not too wide; none where all are.
-std::optional<SetLine> LineSetter::longestLine(const Source& source, Wrapping::Ends ends,
-                                               size_t begin) const {
+std::optional<SetLine> LineSetter::longestLine(const Source& source, Wrapping::Ends ends, size_t begin) {
     const int64_t width = mWidth * kUnit;
     // About as wide, it may turn out no wider; beyond that a long word would be shaped in vain for each
     // of its lines.
@@ -105,31 +102,33 @@ std::optional<SetLine> LineSetter::longestLine(const Source& source, Wrapping::E
 }
 
 /// A part of a source line, shaped by itself without the blanks behind it.
-SetLine LineSetter::part(const Source& source, size_t begin, size_t end) const {
+SetLine LineSetter::part(const Source& source, size_t begin, size_t end) {
     const size_t inkEnd = source.wrapping.withoutBlanks(begin, end);
     const auto from = static_cast<ptrdiff_t>(begin);
     const auto to = static_cast<ptrdiff_t>(inkEnd);
-    const std::vector<uint32_t>& all = source.paragraph.codes;
-    std::vector<uint32_t> codes(all.begin() + from, all.begin() + to);
+    const Paragraph& whole = source.paragraph;
+    std::vector<uint32_t> codes(whole.codes.begin() + from, whole.codes.begin() + to);
     std::vector<size_t> fonts(source.fonted.fonts.begin() + from, source.fonted.fonts.begin() + to);
-    const bool isHyphenated =
-        end < all.size() && codes.size() > 1 && all[end - 1] == vorelunicode::kSoftHyphen;
+    const bool isHyphenated = end < whole.codes.size() && codes.size() > 1 &&
+                              whole.codes[end - 1] == vorelunicode::kSoftHyphen;
     if (isHyphenated) {
         fonts.back() = fonts[fonts.size() - 2];
         codes.back() = hyphenOf(mFonts[fonts.back()]).value_or(codes.back());
     }
     std::vector<ShapedGlyph> glyphs =
-        mShaper.shape({codes.data(), fonts.data(), codes.size(), source.isRightToLeft});
+        mShaper.shape({codes.data(), fonts.data(), whole.scripts.data() + begin,
+                       whole.levels.data() + begin, codes.size(), whole.isRightToLeft});
     addLetterSpacing(glyphs, codes, mSpacing);
     for (ShapedGlyph& glyph : glyphs)
         glyph.cluster += begin;
-    return placed(std::move(glyphs), source.paragraph, begin, end, source.isRightToLeft);
+    return placed(std::move(glyphs), whole, begin, end);
 }
 
 /// The line of the glyphs of a part of a source line.
 SetLine LineSetter::placed(std::vector<ShapedGlyph> glyphs, const Paragraph& paragraph, size_t begin,
-                           size_t end, bool isRightToLeft) {
-    SetLine line{std::move(glyphs), 0, paragraph.begin + begin, paragraph.begin + end, isRightToLeft};
+                           size_t end) {
+    SetLine line{std::move(glyphs), 0, paragraph.begin + begin, paragraph.begin + end,
+                 paragraph.isRightToLeft};
     for (ShapedGlyph& glyph : line.glyphs) {
         glyph.cluster += paragraph.begin;
         line.width += glyph.advance;

@@ -46,11 +46,11 @@ class LineSetter {
   private:
     struct Source;
 
-    SetLine nextLine(const Source& source, size_t begin) const;
-    std::optional<SetLine> longestLine(const Source& source, Wrapping::Ends ends, size_t begin) const;
-    SetLine part(const Source& source, size_t begin, size_t end) const;
+    SetLine nextLine(const Source& source, size_t begin);
+    std::optional<SetLine> longestLine(const Source& source, Wrapping::Ends ends, size_t begin);
+    SetLine part(const Source& source, size_t begin, size_t end);
     static SetLine placed(std::vector<ShapedGlyph> glyphs, const Paragraph& paragraph, size_t begin,
-                          size_t end, bool isRightToLeft);
+                          size_t end);
 
     const Fonts& mFonts;
     int64_t mSpacing;

@@ -4,7 +4,6 @@
 #include FT_FREETYPE_H
 #include FT_COLOR_H
 #include FT_OUTLINE_H
-#include FT_SIZES_H
 
 #include <algorithm>
 #include <optional>
@@ -28,7 +27,8 @@ constexpr FT_Int32 kPictureFlags = FT_LOAD_NO_HINTING | FT_LOAD_COLOR;
     throw TextError("glyph " + std::to_string(glyph.index) + " cannot be rasterised");
 }
 
-/// Leaves the outline in the face's slot, moved by the fraction of a pixel of its origin.
+/// Leaves the outline in the face's slot, moved by the fraction of a pixel
+/// of its origin.
 FT_GlyphSlot loadOutline(const Font& font, const GlyphOrigin& glyph) {
     const FT_Face face = font.face();
     if (FT_Load_Glyph(face, glyph.index, kOutlineFlags) != 0 ||
@@ -64,38 +64,26 @@ GlyphMask renderedOutline(const Font& font, const GlyphOrigin& glyph) {
     return mask;
 }
 
-/// While it lives, the face has the size of its pictures.
-class AtPictureSize {
-  public:
-    explicit AtPictureSize(const Font& font) : mBefore(font.face()->size) {
-        FT_Activate_Size(font.pictureSize());
-    }
-    ~AtPictureSize() { FT_Activate_Size(mBefore); }
-    AtPictureSize(const AtPictureSize&) = delete;
-    AtPictureSize& operator=(const AtPictureSize&) = delete;
-
-  private:
-    FT_Size mBefore;
-};
-
 struct PlacedPicture {
     PictureView picture;
     PicturePlace place;
 };
 
-/// The picture of a glyph, which the face's slot holds; none where it has none. `flags` are added to
-/// FreeType's.
+/// The picture of a glyph, which a slot of FreeType's holds; none where it has none. `flags` are added
+/// to FreeType's.
 std::optional<PlacedPicture> loadPicture(const Font& font, const GlyphOrigin& glyph, FT_Int32 flags) {
-    if (font.pictureSize() == nullptr) return std::nullopt;
-    const AtPictureSize size(font);
-    const FT_Face face = font.face();
+    const FT_Face face = font.pictures();
+    if (face == nullptr) return std::nullopt;
     const FT_Error error = FT_Load_Glyph(face, glyph.index, kPictureFlags | flags);
     const FT_GlyphSlot slot = face->glyph;
     if (error != 0 || slot->format != FT_GLYPH_FORMAT_BITMAP || slot->bitmap.width == 0 ||
         slot->bitmap.rows == 0) {
         return std::nullopt;
     }
-    if (slot->bitmap.pixel_mode != FT_PIXEL_MODE_BGRA) refuse(glyph);
+    if (slot->bitmap.pixel_mode != FT_PIXEL_MODE_BGRA) {
+        if (font.hasOutlines()) return std::nullopt;
+        refuse(glyph);
+    }
     return PlacedPicture{
         {slot->bitmap.buffer, slot->bitmap.pitch, static_cast<int>(slot->bitmap.width),
          static_cast<int>(slot->bitmap.rows)},

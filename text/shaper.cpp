@@ -1,90 +1,86 @@
 #include "text/shaper.h"
 
+#include <hb-ft.h>
 #include <hb.h>
-#include <raqm.h>
 
-#include <memory>
+#include <new>
 #include <utility>
 
+#include "text/destroy.h"
 #include "text/error.h"
 #include "text/rasteriser.h"
 
 namespace voreltext {
 namespace {
 
-struct DestroyRaqm {
-    void operator()(raqm_t* shaper) const { raqm_destroy(shaper); }
-};
-using Raqm = std::unique_ptr<raqm_t, DestroyRaqm>;
-
-/// A range would be one of the characters of every line anew.
-bool isFeatureOfAll(const std::string& feature) {
-    hb_feature_t parsed;
-    return hb_feature_from_string(feature.data(), static_cast<int>(feature.size()), &parsed) != 0 &&
-           parsed.start == HB_FEATURE_GLOBAL_START && parsed.end == HB_FEATURE_GLOBAL_END;
-}
-
-bool setFonts(raqm_t* shaper, const Fonts& fonts, const ShapingRun& run) {
-    for (size_t begin = 0; begin < run.length;) {
-        size_t end = begin;
-        while (end < run.length && run.fonts[end] == run.fonts[begin])
-            ++end;
-        const bool isSet =
-            raqm_set_freetype_face_range(shaper, fonts[run.fonts[begin]].face(), begin, end - begin);
-        if (!isSet) return false;
-        begin = end;
-    }
-    return true;
-}
-
-bool addFeatures(raqm_t* shaper, const std::vector<std::string>& features) {
-    for (const std::string& feature : features) {
-        if (!raqm_add_font_feature(shaper, feature.data(), static_cast<int>(feature.size())))
-            return false;
-    }
-    return true;
+/// A feature for the whole text: a range would be one of the characters of every line anew.
+hb_feature_t parsed(const std::string& feature) {
+    hb_feature_t result;
+    const bool isFeature =
+        hb_feature_from_string(feature.data(), static_cast<int>(feature.size()), &result) != 0 &&
+        result.start == HB_FEATURE_GLOBAL_START && result.end == HB_FEATURE_GLOBAL_END;
+    if (isFeature) return result;
+    throw TextError("'" + feature + "' is no feature of a font for a whole text, as 'liga=0' is");
 }
 
 }  // namespace
 
-Shaper::Shaper(const Fonts& fonts, std::vector<std::string> features)
-    : mFonts(fonts), mFeatures(std::move(features)) {
-    for (const std::string& feature : mFeatures) {
-        if (!isFeatureOfAll(feature)) {
-            throw TextError("'" + feature +
-                            "' is no feature of a font for a whole text, as 'liga=0' is");
-        }
+/// HarfBuzz's own.
+struct Shaper::HarfBuzz {
+    std::vector<hb_feature_t> features;
+    std::vector<std::unique_ptr<hb_font_t, Destroy<hb_font_destroy>>>
+        fonts;  ///< null until they are used
+    std::unique_ptr<hb_buffer_t, Destroy<hb_buffer_destroy>> buffer{hb_buffer_create()};
+};
+
+Shaper::Shaper(const Fonts& fonts, const std::vector<std::string>& features)
+    : mFonts(fonts), mHarfBuzz(new HarfBuzz) {
+    for (const std::string& feature : features)
+        mHarfBuzz->features.push_back(parsed(feature));
+}
+
+Shaper::~Shaper() = default;
+
+hb_font_t* Shaper::fontFor(size_t index) {
+    auto& fonts = mHarfBuzz->fonts;
+    if (fonts.size() <= index) fonts.resize(index + 1);
+    if (!fonts[index]) {
+        fonts[index].reset(hb_ft_font_create_referenced(mFonts[index].face()));
+        hb_ft_font_set_load_flags(fonts[index].get(), kOutlineFlags);
     }
+    return fonts[index].get();
 }
 
-/// The index of a face's font, which probably is `likely`.
-size_t Shaper::fontOf(const FT_FaceRec_* face, size_t likely) const {
-    size_t font = mFonts[likely].face() == face ? likely : 0;
-    while (font + 1 < mFonts.count() && mFonts[font].face() != face)
-        ++font;
-    return font;
+/// Leaves the glyphs in the buffer.
+void Shaper::shapeItem(const ShapingRun& run, const ShapingItem& item) {
+    hb_buffer_t* const buffer = mHarfBuzz->buffer.get();
+    hb_buffer_reset(buffer);
+    hb_buffer_add_utf32(buffer, run.codes, static_cast<int>(run.length),
+                        static_cast<unsigned int>(item.begin), static_cast<int>(item.end - item.begin));
+    // Of the line: what is around the item is its context.
+    hb_buffer_set_flags(buffer, static_cast<hb_buffer_flags_t>(HB_BUFFER_FLAG_BOT | HB_BUFFER_FLAG_EOT));
+    hb_buffer_set_script(buffer, static_cast<hb_script_t>(item.script));
+    hb_buffer_set_language(buffer, hb_language_get_default());
+    hb_buffer_set_direction(buffer, item.isRightToLeft ? HB_DIRECTION_RTL : HB_DIRECTION_LTR);
+    hb_shape(fontFor(item.font), buffer, mHarfBuzz->features.data(),
+             static_cast<unsigned int>(mHarfBuzz->features.size()));
+    if (!hb_buffer_allocation_successful(buffer)) throw std::bad_alloc();
 }
 
-std::vector<ShapedGlyph> Shaper::shape(const ShapingRun& run) const {
+std::vector<ShapedGlyph> Shaper::shape(const ShapingRun& run) {
     std::vector<ShapedGlyph> shaped;
-    if (run.length == 0) return shaped;
-    const Raqm shaper(raqm_create());
-    const bool isShaped = shaper != nullptr && raqm_set_text(shaper.get(), run.codes, run.length) &&
-                          setFonts(shaper.get(), mFonts, run) && addFeatures(shaper.get(), mFeatures) &&
-                          raqm_set_freetype_load_flags(shaper.get(), kOutlineFlags) &&
-                          raqm_set_par_direction(shaper.get(), run.isRightToLeft ? RAQM_DIRECTION_RTL
-                                                                                 : RAQM_DIRECTION_LTR) &&
-                          raqm_layout(shaper.get());
-    if (!isShaped) throw TextError("the text cannot be shaped");
-
-    size_t count = 0;
-    const raqm_glyph_t* glyphs = raqm_get_glyphs(shaper.get(), &count);
-    shaped.reserve(count);
-    for (size_t i = 0; i < count; ++i) {
-        const raqm_glyph_t& glyph = glyphs[i];
-        const size_t font = fontOf(glyph.ftface, shaped.empty() ? 0 : shaped.back().font);
-        shaped.push_back({glyph.index, font, glyph.cluster, mFonts[font].scaled(glyph.x_advance),
-                          mFonts[font].scaled(glyph.x_offset), mFonts[font].scaled(glyph.y_offset)});
+    for (const ShapingItem& item : itemsOf(run)) {
+        shapeItem(run, item);
+        unsigned int count = 0;
+        const hb_glyph_info_t* glyphs = hb_buffer_get_glyph_infos(mHarfBuzz->buffer.get(), &count);
+        const hb_glyph_position_t* places =
+            hb_buffer_get_glyph_positions(mHarfBuzz->buffer.get(), &count);
+        const Font& font = mFonts[item.font];
+        for (unsigned int i = 0; i < count; ++i) {
+            shaped.push_back({glyphs[i].codepoint, item.font, glyphs[i].cluster,
+                              font.scaled(places[i].x_advance), font.scaled(places[i].x_offset),
+                              font.scaled(places[i].y_offset)});
+        }
     }
     return shaped;
 }

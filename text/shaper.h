@@ -2,10 +2,15 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <memory>
 #include <string>
 #include <vector>
 
 #include "text/fonts.h"
+#include "text/shaping_items.h"
+
+struct hb_buffer_t;
+struct hb_font_t;
 
 namespace voreltext {
 
@@ -19,28 +24,26 @@ struct ShapedGlyph {
     int64_t y;
 };
 
-/// What is shaped at once.
-struct ShapingRun {
-    const uint32_t* codes;
-    const size_t* fonts;  ///< for each character the index of its font
-    size_t length;
-    bool isRightToLeft;
-};
-
 /// Shapes lines in one set of fonts with the same features.
 class Shaper {
   public:
     /// The fonts must outlive the shaper. Throws TextError for a feature that is misspelt.
-    Shaper(const Fonts& fonts, std::vector<std::string> features);
+    Shaper(const Fonts& fonts, const std::vector<std::string>& features);
+    ~Shaper();
+    Shaper(const Shaper&) = delete;
+    Shaper& operator=(const Shaper&) = delete;
 
     /// The glyphs from left to right; those of one cluster stand beside each other. Throws TextError.
-    std::vector<ShapedGlyph> shape(const ShapingRun& run) const;
+    std::vector<ShapedGlyph> shape(const ShapingRun& run);
 
   private:
-    size_t fontOf(const FT_FaceRec_* face, size_t likely) const;
+    struct HarfBuzz;
+
+    hb_font_t* fontFor(size_t index);
+    void shapeItem(const ShapingRun& run, const ShapingItem& item);
 
     const Fonts& mFonts;
-    std::vector<std::string> mFeatures;
+    std::unique_ptr<HarfBuzz> mHarfBuzz;
 };
 
 }  // namespace voreltext

@@ -40,7 +40,7 @@ bool hasFamily(const FcPattern* font, const FcChar8* family) {
 }
 
 /// What the refusal of a misspelt name ends with.
-std::string meant(const std::string& name) {
+std::string suggestion(const std::string& name) {
     return name.empty() ? "" : "; did you mean '" + name + "'?";
 }
 
@@ -101,10 +101,9 @@ std::string nearestProperty(const std::string& property) {
     if (equals == std::string::npos) return vorelunicode::nearest(property, kStyles);
     const std::string name = vorelunicode::nearest(property.substr(0, equals), kProperties);
     const std::string value = property.substr(equals + 1);
-    if (name.empty()) return "";
-    if (isKnown(name + "=" + value)) return name + "=" + value;
     const std::string style = vorelunicode::nearest(value, kStyles);
-    return style.empty() ? "" : name + "=" + style;
+    const std::string meant = name + "=" + (style.empty() ? value : style);
+    return !name.empty() && isKnown(meant) ? meant : "";
 }
 
 /// fontconfig reads past what it does not know, and a regular font would stand for a misspelt bold.
@@ -117,7 +116,7 @@ void refuseWhatIsNotKnown(const std::string& request, const std::vector<std::str
     for (size_t i = 1; i < parts.size(); ++i) {
         if (!parts[i].empty() && !isKnown(parts[i])) {
             fail(request, "'" + parts[i] + "' is no style and no property of fonts" +
-                              meant(nearestProperty(parts[i])));
+                              suggestion(nearestProperty(parts[i])));
         }
     }
 }
@@ -233,7 +232,7 @@ FontFile SystemFonts::find(const std::string& request) const {
     const std::string family = wanted ? textOf(wanted.get(), FC_FAMILY) : "";
     const auto refuse = [&]() {
         throw TextError("no font file or family '" + request + "'" +
-                        meant(nearestFamily(config, family)));
+                        suggestion(nearestFamily(config, family)));
     };
     if (config == nullptr || family.empty()) refuse();
 
@@ -247,7 +246,7 @@ FontFile SystemFonts::find(const std::string& request) const {
     if (!hasProperties(config, wanted.get(), {parts.begin() + 1, parts.end()}, font.get())) {
         fail(request, "the family is there, but no face of it is as asked for");
     }
-    const FontFile file = fileOf(font.get());
+    FontFile file = fileOf(font.get());
     if (file.path.empty()) refuse();
     return file;
 }

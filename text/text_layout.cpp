@@ -12,12 +12,13 @@
 #include "text/rasteriser.h"
 #include "text/units.h"
 #include "unicode/characters.h"
+#include "unicode/lines.h"
 
 namespace voreltext {
 namespace {
 
+using vorelunicode::endsLine;
 using vorelunicode::isBlank;
-using vorelunicode::isLineEnd;
 
 /// A font may step backwards as well as forwards.
 void checkSide(int64_t units) {
@@ -62,12 +63,14 @@ void checkPicture(const GlyphInk& ink) {
     if (ink.isPicture) checkSide(std::max(ink.box.width(), ink.box.height()) * kUnit);
 }
 
-/// The box of a line, from the main font's ascender to its descender with half of the leading above; it
-/// reaches to that of the next line.
-Box boxOf(const Font& main, int64_t left, int64_t width, int64_t baseline, int64_t advance) {
-    const int64_t leading = advance - (main.ascender() - main.descender());
-    const int top = floorToPixel(-baseline - main.ascender()) - floorToPixel(leading / 2);
-    return {floorToPixel(left), top, ceilToPixel(left + width), top + floorToPixel(advance)};
+/// The box of a line: from the main font's ascender to its descender, with half of what the line height
+/// has beyond that above and the rest below. It reaches to that of the next line.
+Box boxOf(const Font& main, int64_t left, int64_t width, int baseline, int64_t advance) {
+    const int height = floorToPixel(advance);
+    const int leading = height - floorToPixel(main.ascender() - main.descender());
+    const int top = baseline - floorToPixel(main.ascender()) - static_cast<int>(floorOf(leading, 2));
+    const int64_t right = left + std::max<int64_t>(width, 0);
+    return {floorToPixel(left), top, ceilToPixel(right), top + height};
 }
 
 /// For each character which word it is of; those between words count to the one before.
@@ -77,7 +80,7 @@ std::vector<size_t> wordsOf(const std::vector<uint32_t>& text) {
     size_t begun = 0;
     bool isWithin = false;
     for (const uint32_t code : text) {
-        const bool isGap = isBlank(code) || isLineEnd(code);
+        const bool isGap = isBlank(code) || endsLine(code);
         if (!isGap && !isWithin) ++begun;
         isWithin = !isGap;
         words.push_back(begun == 0 ? 0 : begun - 1);
@@ -107,8 +110,8 @@ TextLayout::TextLayout(Fonts& fonts, const std::vector<uint32_t>& text, const Te
     for (const SetLine& line : lines) {
         const int64_t shift = leftShare(settings.align, line.isRightToLeft, width - line.width);
         placeLine(line, shift, -static_cast<int64_t>(mLines.size()) * advance, words);
-        mLines.back().box =
-            boxOf(fonts.main(), shift, line.width, -int64_t{mLines.back().baseline} * kUnit, advance);
+        Line& placed = mLines.back();
+        placed.box = boxOf(fonts.main(), shift, line.width, placed.baseline, advance);
     }
 }
 
@@ -155,6 +158,7 @@ std::vector<std::string> TextLayout::fontsUsed() const {
             fonts.push_back(glyph.font);
     }
     std::vector<std::string> names;
+    names.reserve(fonts.size());
     for (const size_t font : fonts)
         names.push_back(mFonts[font].name());
     return names;

@@ -28,8 +28,8 @@ struct TextSettings {
     /// #14); 0: none is. Blanks at the end of a line do not count and are not aligned. A word that is
     /// wider is broken between clusters; for a cluster that is wider, TextLayout throws. A soft hyphen
     /// (U+00AD) is seen as a hyphen where a line ends with it. Thai, Lao, Khmer and Burmese break at
-    /// zero width spaces (U+200B) alone. Each line is ordered by itself in the direction of its source
-    /// line.
+    /// zero width spaces (U+200B) alone. Letters are shaped line by line and have the direction that
+    /// they have in the source line.
     int wrapWidth = 0;
 
     /// Features of the fonts as HarfBuzz writes them, for the whole text: "liga=0", "ss01", "-kern".

@@ -42,11 +42,6 @@ constexpr bool isBlank(uint32_t code) {
     return isIn(code, kRanges);
 }
 
-/// The ends of a source line: LF, CR, next line, line and paragraph separator.
-constexpr bool isLineEnd(uint32_t code) {
-    return code == '\n' || code == '\r' || code == 0x85 || code == 0x2028 || code == 0x2029;
-}
-
 /// The five tones of skin, which belong to the pictograph before.
 constexpr bool isSkinTone(uint32_t code) {
     return code >= 0x1F3FB && code <= 0x1F3FF;

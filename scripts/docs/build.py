@@ -11,6 +11,7 @@ from compiled import code_faults
 from links import link_faults
 from pages import ROOT, all_pages
 from site_pages import copy_pictures, site_faults, write_layout, write_pages
+from style_tables import table_faults
 
 
 def fail_on(faults):
@@ -34,6 +35,7 @@ def build_site(pages, folder):
 def main(library, folder):
     pages = all_pages()
     fail_on(link_faults(pages))
+    fail_on(table_faults())
     faults, blocks = code_faults(pages, library)
     fail_on(faults)
     shutil.rmtree(folder / "html", ignore_errors=True)

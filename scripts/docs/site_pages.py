@@ -17,8 +17,8 @@ NAVIGATION = [
                  "docs/effects/linear-gradient.md", "docs/effects/radial-gradient.md",
                  "docs/effects/pattern.md"]),
     ("Using it", ["docs/limits.md", "examples/README.md", "docs/android.md", "packaging/README.md",
-                  "docs/looks.md", "docs/vorelpaint.md",
-                  "docs/film.md", "docs/style-files.md"]),
+                  "docs/looks.md", "docs/vorelpaint.md", "docs/captions.md", "docs/film.md",
+                  "docs/style-files.md", "docs/layer-styles.md"]),
     ("How it works", ["docs/architecture.md", "docs/pixels.md", "docs/fixed-point.md", "docs/quirks.md",
                       "docs/determinism.md", "docs/reliability.md", "docs/benchmarks.md",
                       "docs/adding-a-core.md", "docs/adding-a-level.md"]),
@@ -71,8 +71,8 @@ class SitePage:
         line = CODE_SPAN.sub(set_aside, line)
         line = IMAGE_SOURCE.sub(lambda m: m[1] + self.picture(m[2]) + m[3], line)
         line = MARKDOWN_LINK.sub(self.link, line)
-        # In double backticks: Doxygen would end a span of single ones at an apostrophe.
-        return ASIDE.sub(lambda m: f"``{self.code[int(m[1])]}``", line)
+        # In double backticks: Doxygen would end a span of single ones at an apostrophe. It reads entities there.
+        return ASIDE.sub(lambda m: f"``{self.code[int(m[1])].replace('&', '&amp;')}``", line)
 
     def picture(self, target):
         """Pictures stand beside the pages of the site, in folders of their last name."""
@@ -117,9 +117,14 @@ def write_pages(pages, folder):
     return pictures
 
 
+def attribute(text):
+    """As Doxygen reads it between double quotes: it knows no number of an apostrophe."""
+    return escape(text, quote=False).replace('"', "&quot;")
+
+
 def tab(kind, title, url="", inside=""):
     where = f' url="{url}"' if url else ""
-    head = f'<tab type="{kind}" visible="yes"{where} title="{escape(title)}"'
+    head = f'<tab type="{kind}" visible="yes"{where} title="{attribute(title)}"'
     return f"{head}>{inside}</tab>\n" if inside else f"{head}/>\n"
 
 

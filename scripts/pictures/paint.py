@@ -1,5 +1,5 @@
 #!/usr/bin/python3
-"""Paints the pictures of the guide, the effect pages and the README: paint.py VORELPAINT FOLDER."""
+"""Paints the strips of pictures of the documents: paint.py VORELPAINT FOLDER."""
 
 import copy
 import json
@@ -9,6 +9,7 @@ from pathlib import Path
 from PIL import Image
 
 from strips import Cell, Strip, paint_strips
+from tool_pages import TOOL_PAGES
 
 PRESETS = Path(__file__).resolve().parents[2] / "style" / "presets"
 
@@ -212,6 +213,17 @@ def with_stops(effect, key, *choices):
     return [Cell(caption, with_value(effect, f"{key}.gradient", chosen)) for caption, chosen in choices]
 
 
+def edge_strip(name, effect, key, middle, colour, widths, **how):
+    """The corner of a letter whose glow changes its colour at `middle`, over ramps of these widths."""
+    def cell(width):
+        start, end = round(middle - width / 2, 2), round(middle + width / 2, 2)
+        chosen = stops((0, colour), (start, colour), (end, "#E8412C"), (1, "#E8412C"))
+        caption = f"{start} and {end}" if width else f"a hard edge at {middle}"
+        return Cell(caption, with_value(effect, f"{key}.gradient", chosen), window=(4, 4, 60, 48))
+
+    return Strip(name, [cell(width) for width in widths], columns=3, enlarged=4, **how)
+
+
 OUTER_GLOWS = [
     sweep("outer-glow-size", OUTER_GLOW, "outerGlow.size", (0, 4, 8, 16, 32, 64), columns=3, ground="night"),
     sweep("outer-glow-opacity", OUTER_GLOW, "outerGlow.opacity", OPACITIES, columns=5, ground="night"),
@@ -225,6 +237,8 @@ OUTER_GLOWS = [
                      ("stops at 0.5 and 1", stops((0.5, "#FFF36B"), (1, "#E8412C"))),
                      ("a clear stop at 0.3", RING)),
           ground="night", columns=3),
+    edge_strip("outer-glow-edge", with_value(OUTER_GLOW, "outerGlow.size", 24), "outerGlow", 0.5, "#FFF36B",
+               (0, 0.04, 0.12), ground="night"),
 ]
 
 INNER_GLOWS = [
@@ -238,6 +252,8 @@ INNER_GLOWS = [
                      ("a hard edge at 0.3", stops((0, "#FFE08A"), (0.3, "#FFE08A"), (0.3, "#E8412C"),
                                                   (1, "#E8412C")))),
           columns=4, most=0),
+    edge_strip("inner-glow-edge", with_value(INNER_GLOW, "innerGlow.size", 12), "innerGlow", 0.3, "#FFE08A",
+               (0, 0.08, 0.24)),
 ]
 
 FILL_STOPS = (
@@ -249,6 +265,14 @@ FILL_STOPS = (
     ("a clear last stop", stops((0, "#5B2A86"), (1, "#5B2A86", 0))),
 )
 SCALES = (0.1, 0.25, 0.5, 1, 1.5, 2)
+
+# Around the circle of hues, whose steps are large: alone, and as a look whose steps lie between them.
+HUES = stops((0, "#FF0000"), (0.17, "#FFFF00"), (0.33, "#00FF00"), (0.5, "#00FFFF"), (0.67, "#0000FF"),
+             (0.83, "#FF00FF"), (1, "#FF0000"))
+WHEEL_ALONE = {"linearGradient": {"angle": 0, "gradient": HUES}}
+WHEEL_BETWEEN = {"fill": False, "linearGradient": {"angle": 0, "scale": 0.98, "opacity": 0.5,
+                                                   "gradient": HUES}}
+WHEEL = {"version": 2, **WHEEL_ALONE}
 
 LINEAR_GRADIENTS = [
     sweep("linear-gradient-angle", {"linearGradient": {"gradient": DUSK}}, "linearGradient.angle", ANGLES,
@@ -262,6 +286,11 @@ LINEAR_GRADIENTS = [
           "linearGradient.opacity", OPACITIES, columns=5),
     sweep("linear-gradient-wide", {"linearGradient": {"gradient": DUSK}}, "linearGradient.angle",
           (0, 45, 90), text="Summer Sale", size=56, columns=1),
+    Strip("linear-gradient-steps",
+          [Cell(caption, style, window=(1345, 66, 110, 70)) for caption, style in (
+              ("one ramp across 2300 pixels", WHEEL), ("a ramp for each word", {**WHEEL, "span": "word"}),
+              ("two ramps in a stack", {"version": 2, "looks": [WHEEL_ALONE, WHEEL_BETWEEN]}))],
+          text="Summer Sale", size=320, columns=3, enlarged=3),
 ]
 
 RADIAL_STOPS = stops((0, "#FFE99A"), (1, "#7A1F5C"))
@@ -294,22 +323,24 @@ PATTERNS_SWEPT = [
 
 
 def preset(name, text):
-    """A preset with its picture found from anywhere."""
+    """A preset with its pictures found from anywhere."""
     style = json.loads((PRESETS / f"{name}.json").read_text())
-    if "pattern" in style:
-        style["pattern"]["image"] = str(PRESETS / style["pattern"]["image"])
+    for look in style.get("looks", [style]):
+        if "pattern" in look:
+            look["pattern"]["image"] = str(PRESETS / look["pattern"]["image"])
     return Cell("", style, text=text)
 
 
 README = [
-    Strip("looks", [preset("gold", "Gold"), preset("neon", "Neon"), preset("comic", "Pow!"),
-                    preset("candy", "Sweet"), preset("sticker", "Cut"), preset("ice", "Frost"),
-                    preset("lava", "Lava"), preset("glass", "Glass"), preset("chalk", "Chalk")],
-          size=88, ground="night", columns=3, most=16),
+    Strip("looks", [preset("gold", "Gold"), preset("neon-sign", "Open"), preset("comic-double", "Pow!"),
+                    preset("varsity", "Class"), preset("chrome", "Turbo"), preset("retro-3d", "Disco"),
+                    preset("candy", "Sweet"), preset("ice", "Frost"), preset("graffiti", "Street"),
+                    preset("lower-third", "Live"), preset("sticker", "Cut"), preset("lava", "Lava")],
+          size=88, ground="night", columns=3, most=18),
 ]
 
 STRIPS = (SIGNS + README + GUIDE + TEXT_FILL + STROKES + OUTER_SHADOWS + INNER_SHADOWS + OUTER_GLOWS
-          + INNER_GLOWS + LINEAR_GRADIENTS + RADIAL_GRADIENTS + PATTERNS_SWEPT)
+          + INNER_GLOWS + LINEAR_GRADIENTS + RADIAL_GRADIENTS + PATTERNS_SWEPT + TOOL_PAGES)
 
 
 def main(program, folder):

@@ -16,7 +16,8 @@ SPACE = 10  # around each text and its effects
 PAINT_PADDING = 2
 
 # What lies behind the text, and the colour of the captions on it.
-GROUNDS = {"paper": ("#F4F1EA", "#33373D"), "night": ("#23272E", "#D7D9DC"), "checks": ("#FFFFFF", "#33373D")}
+GROUNDS = {"paper": ("#F4F1EA", "#33373D"), "night": ("#23272E", "#D7D9DC"), "slate": ("#9AA7B3", "#23272E"),
+           "checks": ("#FFFFFF", "#33373D")}
 CHECK_SIDE = 8
 CHECK_COLOUR = "#D5D5D5"
 
@@ -30,7 +31,9 @@ class Cell:
     caption: str
     style: dict
     text: str = ""  # the strip's, unless given
+    size: int = 0  # the strip's, unless given
     cut: bool = False  # show what is left without the margins
+    window: tuple = ()  # show this part alone: left, top, width and height, from the margins' corner
 
 
 @dataclass
@@ -49,6 +52,7 @@ class Strip:
     font: str = "DejaVu Sans:bold"
     align: str = "left"
     boxes: bool = False  # outline the box of the glyphs and the box with the margins
+    enlarged: int = 1  # the side of the square that shows a pixel
 
 
 @dataclass
@@ -77,7 +81,7 @@ class Painter:
             style.flush()
             picture = Path(style.name).with_suffix(".png")
             said = subprocess.run(
-                [self.program, "--style", style.name, "--font", strip.font, "--size", str(strip.size),
+                [self.program, "--style", style.name, "--font", strip.font, "--size", str(cell.size or strip.size),
                  "--align", strip.align, "--padding", str(PAINT_PADDING), "--print-margins",
                  "-o", picture, "--", cell.text or strip.text],
                 check=True, capture_output=True, text=True).stdout.split()
@@ -86,7 +90,13 @@ class Painter:
         with Image.open(picture) as file:
             image = file.convert("RGBA")
         inner = (PAINT_PADDING, PAINT_PADDING, image.width - PAINT_PADDING, image.height - PAINT_PADDING)
-        return Painted(image.crop(inner), left, top, right, bottom, cell)
+        image = image.crop(inner)
+        if not cell.window:
+            return Painted(image, left, top, right, bottom, cell)
+        x, y, width, height = cell.window
+        part = image.crop((x, y, x + width, y + height))
+        shown = (width * strip.enlarged, height * strip.enlarged)
+        return Painted(part.resize(shown, Image.Resampling.NEAREST), 0, 0, 0, 0, cell)
 
 
 def checks(size):

@@ -2,11 +2,13 @@
 /// Either the file is read, with every number in its range and one fill a look at most, resolved, and
 /// becomes a stack of sets of effects and a C++ source, or it is refused with a StyleError of one line;
 /// nothing else may be thrown.
+#include <algorithm>
 #include <cmath>
 #include <cstdint>
 #include <sstream>
 #include <string>
 #include <string_view>
+#include <vector>
 
 #include "decoder.h"
 #include "demand.h"
@@ -110,12 +112,20 @@ PatternImage load(const std::string& image) {
     return {1, 1, {1, 2, 3, 4}};
 }
 
-/// A pattern leaves no trace in a key, every other effect that is painted one fragment.
+/// The key tells of every look, and of no more effects than there are: a pattern leaves no trace in it.
 void demandKey(const Stack& stack) {
-    size_t most = 0;
+    size_t effects = 0;
     for (const StackedLook& stacked : stack.looks())
-        most += stacked.look.added().size() + 1;
-    demand(keyFragments(stack.key()).size() <= most, "a key has too many fragments");
+        effects += stacked.look.added().size();
+    size_t places = 0;
+    const std::vector<KeyFragment> fragments = keyFragments(stack.key());
+    for (const KeyFragment& fragment : fragments) {
+        demand(!fragment.name.empty(), "a fragment has no name");
+        if (fragment.name == "place") ++places;
+    }
+    const bool isOne = stack.looks().size() == 1 && places == 0;
+    demand(isOne || places == stack.looks().size(), "a look has no place in the key");
+    demand(fragments.size() - places <= effects, "a key has too many fragments");
 }
 
 void demandStack(const Style& style) {

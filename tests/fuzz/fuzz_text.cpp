@@ -106,14 +106,12 @@ void paintStack(Decoder& in, const TextLayout& layout, const MarkedText& marked)
     below.addOuterGlowText(in.real(0, 12), 0x3366CC, 1, 0, nullptr);
     below.addText(0x102030, 1);
     VFEffect above = topLook(in);
-    VFEffect coloured(above);
-    coloured.addText(0x00FF00, 1);
     Layer top{&above};
     top.x = in.between(-5, 5);
     top.y = in.between(-5, 5);
     top.span = static_cast<Span>(in.between(0, 3));
     for (const ColourRange& range : marked.colours)
-        top.exchanges.push_back({range.begin, range.end, &coloured});
+        top.colours.push_back({range.begin, range.end, range.colour});
     top.takesPictures = true;
     const std::vector<Layer> layers{{&below}, top};
     const CanvasRequest request = canvasOf(in);

@@ -382,6 +382,25 @@ void Glow::expectOneColourWithoutStops() const {
     }
 }
 
+void Glow::expectHardStopsNotSmoothed(const Scene& disc) const {
+    // The pixels of both colours; the border of an inner glow, which is white, has green, too.
+    const auto mixedOf = [&](float start, float end) {
+        const Stops stops{
+            {kRed, 1.0F, 0.0F}, {kRed, 1.0F, start}, {kBlue, 1.0F, end}, {kBlue, 1.0F, 1.0F}};
+        const literal::Picture picture = painted(disc, 12.0F, 0, stops).dst;
+        const std::vector<int> red = channelOf(picture, 0);
+        const std::vector<int> green = channelOf(picture, 1);
+        const std::vector<int> blue = channelOf(picture, 2);
+        int count = 0;
+        for (size_t i = 0; i < red.size(); ++i)
+            count += red[i] > 0 && green[i] == 0 && blue[i] > 0 ? 1 : 0;
+        return count;
+    };
+    EXPECT_EQ(0, mixedOf(0.4F, 0.4F));
+    // A twelfth of the way is a pixel: an edge around a disc of more than 50 pixels.
+    EXPECT_LT(50, mixedOf(0.36F, 0.44F));
+}
+
 void Glow::expectLiteralFormOfSmallNegativeAndUnorderedSizes() const {
     const Scene scene = sceneOf(discMask(14, 14, 7.0F, 7.0F, 4.0F, true));
     for (float size : {-0.0F, -0.5F, -0.99F, std::nanf("")}) {

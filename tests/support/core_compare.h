@@ -271,6 +271,7 @@ struct Glow {
     void expectNothingOfSizesOutOfProportion() const;
     void expectOpacityNotRead() const;
     void expectOneColourWithoutStops() const;
+    void expectHardStopsNotSmoothed(const Scene& disc) const;
 
     void expectLiteralFormOfSmallNegativeAndUnorderedSizes() const;
     void expectLiteralFormOfSmallScenes() const;

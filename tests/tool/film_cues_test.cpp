@@ -31,7 +31,9 @@ class FilmCuesOf : public ::testing::Test {
 
     FilmCues cuesOf(const std::string& bytes, const char* name = "a.srt") {
         mOptions.film.subtitles = mDir.write(name, bytes);
-        return FilmCues(mOptions, kTen, [&](const std::string& line) { mNotes.push_back(line); });
+        const FilmCues cues(mOptions, kTen);
+        cues.notes().giveTo([&](const std::string& line) { mNotes.push_back(line); });
+        return cues;
     }
 
     std::string faultOf(const std::string& bytes) {

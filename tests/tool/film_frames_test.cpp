@@ -39,7 +39,7 @@ uint8_t alphaAt(const Image& image, int x, int y) {
 }
 
 TEST_F(FilmFramesOf, Frames_ChangeWhereACueBeginsOrEnds) {
-    const FilmCues cues(mOptions, kTen, [](const std::string&) {});
+    const FilmCues cues(mOptions, kTen);
     FilmFrames frames(mOptions, cues, kTen);
     std::vector<bool> changes;
     std::vector<bool> blanks;
@@ -56,7 +56,7 @@ TEST_F(FilmFramesOf, Frames_ChangeWhereACueBeginsOrEnds) {
 TEST_F(FilmFramesOf, Frame_DoesNotDependOnThoseBefore) {
     mOptions.film.fadeInMs = 150;
     mOptions.background = {Background::Kind::checkerboard, 0};
-    const FilmCues cues(mOptions, kTen, [](const std::string&) {});
+    const FilmCues cues(mOptions, kTen);
     FilmFrames frames(mOptions, cues, kTen);
     for (int frame = 0; frame < 12; ++frame) {
         frames.advanceTo(frame);
@@ -67,7 +67,7 @@ TEST_F(FilmFramesOf, Frame_DoesNotDependOnThoseBefore) {
 }
 
 TEST_F(FilmFramesOf, Frame_HasTheCuesInTheirPlaces) {
-    const FilmCues cues(mOptions, kTen, [](const std::string&) {});
+    const FilmCues cues(mOptions, kTen);
     FilmFrames frames(mOptions, cues, kTen);
     const auto inkIn = [&](int frame, const voreltext::Box& box) {
         frames.advanceTo(frame);
@@ -91,7 +91,7 @@ TEST_F(FilmFramesOf, Frame_HasTheCuesInTheirPlaces) {
 }
 
 TEST_F(FilmFramesOf, Fading_MultipliesThePremultipliedPicture) {
-    const FilmCues cues(mOptions, kTen, [](const std::string&) {});
+    const FilmCues cues(mOptions, kTen);
     const Image whole = cues.paint(cues.all()[0]);
     mOptions.film.fadeInMs = 500;  // at 0.3 seconds a fifth: 51 of 255
     FilmFrames frames(mOptions, cues, kTen);

@@ -17,9 +17,9 @@ for text in "$help" "${manual//\\-/-}"; do
 done
 
 pages=("$prefix"/share/doc/vorelpaint/*.md)
-[[ ${#pages[@]} -eq 3 ]] || fail "not the three pages"
+[[ ${#pages[@]} -eq 5 ]] || fail "not the five pages"
 for page in "${pages[@]}"; do
-    mapfile -t links < <(grep -oE '\]\([^)#]+' "$page" | cut -c 3-)
+    mapfile -t links < <(grep -oE '(\]\(|<img src=")[^)#"]+' "$page" | sed -E 's/^(\]\(|<img src=")//')
     [[ ${#links[@]} -ge 2 ]] || fail "$page: not the links that were counted"
     for link in "${links[@]}"; do
         [[ -e ${page%/*}/$link ]] || fail "$page links to $link, which is not installed"

@@ -37,21 +37,21 @@ class MeasuredRunTest : public ::testing::Test {
     }
 
     /// The run in steps paints what the run in one paints, in the order in which the set is planned.
-    void expectThePlannedPicture(const Style& style, float opacity) {
-        Look look(style.looks.front(), 0x336699, opacity, imagesOf(style));
+    void expectThePlannedPicture(const Style& style, float opacity, size_t at = 0) {
+        Look look(style.looks[at], 0x336699, opacity, imagesOf(style));
         const Plan plan = planOf(look);
+        const std::vector<int> planned = plannedOrder(look);
         Image inSteps;
         measuredRun(look, plan, frameOf(look), glyphs(), &inSteps);
         const Image inOne = paint(look.effects(), mText, 3);
         EXPECT_EQ(inSteps.width, inOne.width);
         EXPECT_EQ(inSteps.pixels, inOne.pixels);
-        EXPECT_EQ(withoutPattern(plan.order), plannedOrder(style, opacity));
+        EXPECT_EQ(withoutPattern(plan.order), planned);
     }
 
     /// The order of the key after planning, which follows the set's list.
-    static std::vector<int> plannedOrder(const Style& style, float opacity) {
-        VFontEffect::VFEffect effects(
-            Look(style.looks.front(), 0x336699, opacity, imagesOf(style)).effects());
+    static std::vector<int> plannedOrder(const Look& look) {
+        VFontEffect::VFEffect effects(look.effects());
         effects.initEffect(1, 1);
         const std::unique_ptr<char[]> key(effects.getMapKey());
         std::vector<int> types;
@@ -72,9 +72,11 @@ class MeasuredRunTest : public ::testing::Test {
 TEST_F(MeasuredRunTest, EveryPreset_IsPaintedAsInOneRun) {
     for (const std::string& name : presetNames()) {
         SCOPED_TRACE(name);
-        const Style style = loadStyle(findPreset(name));
-        expectThePlannedPicture(style, 1);
-        expectThePlannedPicture(style, 0.5F);
+        const Style style = resolvedStyle(loadStyle(findPreset(name)), mFonts.main().sizePx(), 1);
+        for (size_t i = 0; i < style.looks.size(); ++i) {
+            expectThePlannedPicture(style, 1, i);
+            expectThePlannedPicture(style, 0.5F, i);
+        }
     }
 }
 

@@ -122,6 +122,16 @@ TEST(Canvas, Shrink_FindsTheLargestSizeThatFits) {
     EXPECT_GT(widthAt(size + 1), 300);
 }
 
+TEST(Canvas, Shrink_TakesATextThatCouldNotBeSetInItsOwnSize) {
+    const std::string wide(400, 'm');
+    EXPECT_NE(faultOf({wide}).find("more than 16384 pixels wide"), std::string::npos);
+    const Json report = reported({"--width", "3000", "--fit", "shrink", wide});
+    EXPECT_GT(report["size"], 1);
+    EXPECT_LT(report["size"], 10);
+    EXPECT_EQ(faultOf({"--width", "3000", "--fit", "shrink", "one\ntwo\033"}),
+              "vorelpaint: the text has the control character U+001B in line 2, character 4\n");
+}
+
 TEST(Canvas, TextThatFits_IsNotShrunk) {
     EXPECT_EQ(reported({"--width", "3000", "--fit", "shrink", "Hi"})["size"], 96);
 }
@@ -246,11 +256,45 @@ TEST(Report, Batch_HasALineForEachJob) {
     EXPECT_EQ(Json::parse(outcome.out.substr(end))["size"], 20);
 }
 
+TEST(Report, Batch_DoesNotMixWithAPicture) {
+    const TempDir dir;
+    const std::string jobs = dir.write("jobs.jsonl", R"({"text": "A", "output": "/dev/stdout"})");
+    const Outcome outcome = runVorelpaint({"--batch", jobs, "--report", "json"});
+    EXPECT_EQ(outcome.exitCode, 2);
+    EXPECT_EQ(outcome.out, "");
+    EXPECT_EQ(outcome.err,
+              "vorelpaint: line 1: standard output cannot take both the picture and what is printed\n"
+              "vorelpaint: 1 of 1 jobs failed\n");
+    EXPECT_EQ(runVorelpaint({"--batch", jobs}).out.substr(1, 3), "PNG");
+}
+
 TEST(Strict, MissingCharacter_IsAnError) {
     EXPECT_EQ(
         faultOf({"--strict", "a\xF0\x93\x80\x80"}),
         "vorelpaint: no font has U+13000 (line 1, character 2); its sign for missing characters is "
         "painted\n");
+}
+
+TEST(Notes, FaultStandsAlone) {
+    const TempDir dir;
+    const auto linesOf = [](const Words& arguments) {
+        const Outcome outcome = runVorelpaint(arguments);
+        EXPECT_EQ(outcome.exitCode, 2);
+        return std::count(outcome.err.begin(), outcome.err.end(), '\n');
+    };
+    const std::string missing = "a\xF0\x93\x80\x80";
+    EXPECT_EQ(linesOf({"-o", dir.file("none/a.png"), missing}), 1) << "what cannot be written";
+    EXPECT_EQ(linesOf({"--sheet", "-o", dir.file("none/a.png"), missing}), 1);
+    const std::string style = dir.write("a.json", R"({"version": 2, "looks": [
+        {"stroke": {"size": "40%", "color": "#000", "position": "outside"}},
+        {"pattern": {"image": "none.png"}}]})");
+    EXPECT_EQ(linesOf({"--style", style, "--size", "300", "--print-key"}), 1) << "and no text";
+    const std::string glow = dir.write("b.json", R"({"outerGlow": {"size": 100, "color": "#000"}})");
+    EXPECT_EQ(linesOf({"--style", glow, "--size", "23", "--width", "900", "--height", "900", "-o",
+                       dir.file("a.png"), missing + std::string(720, 'm')}),
+              1)
+        << "what is too large with its effects";
+    EXPECT_EQ(dir.list(), (Words{"a.json", "b.json"}));
 }
 
 TEST(Strict, Batch_FailsTheJobAlone) {
@@ -309,16 +353,39 @@ TEST(Markup, ThatDoesNotClose_IsRefusedWithItsPlace) {
         << "without --markup";
 }
 
-TEST(Markup, CoveredByAGradient_IsNoted) {
+TEST(Markup, CoveredByAnOpaqueEffect_IsNoted) {
+    const auto errorsOf = [](const std::string& style) {
+        const TempDir dir;
+        return runVorelpaint({"--markup", "--style", dir.write("g.json", style), "-o", dir.file("a.png"),
+                              "a <c #f80>b</c>"})
+            .err;
+    };
+    const std::string note =
+        "vorelpaint: note: the look's linearGradient covers the colours of the markup\n";
+    const auto gradient = [](const std::string& stop, const std::string& opacity) {
+        return R"({"linearGradient": {"angle": 90, "opacity": )" + opacity +
+               R"(, "gradient": [{"color": "#00F", "location": 0, "opacity": )" + stop + "}]}}";
+    };
+    EXPECT_EQ(errorsOf(gradient("1", "1")), note);
+    EXPECT_EQ(errorsOf(gradient("0.9", "1")), "");
+    EXPECT_EQ(errorsOf(gradient("1", "0.9")), "");
     const TempDir dir;
-    const std::string style = dir.write(
-        "g.json",
-        R"({"linearGradient": {"angle": 90, "gradient": [{"color": "#00F", "location": 0}]}})");
-    const Outcome outcome =
-        runVorelpaint({"--markup", "--style", style, "-o", dir.file("a.png"), "a <c #f80>b</c>"});
-    EXPECT_EQ(outcome.exitCode, 0);
-    EXPECT_EQ(outcome.err,
-              "vorelpaint: note: the look's linearGradient covers the colours of the markup\n");
+    EXPECT_EQ(
+        runVorelpaint({"--markup", "--preset", "candy", "-o", dir.file("a.png"), "<c #f80>b</c>"}).err,
+        "vorelpaint: note: the look's pattern covers the colours of the markup\n");
+}
+
+TEST(Markup, UnderATranslucentGradient_IsSeen) {
+    const TempDir dir;
+    const std::string style = dir.write("g.json", R"({"radialGradient": {"gradient": [
+        {"color": "#00F", "location": 0}, {"color": "#00F", "location": 1, "opacity": 0.5}]}})");
+    const Words look{"--markup", "--style", style};
+    const auto of = [&](const char* text) {
+        Words words = look;
+        words.emplace_back(text);
+        return painted(dir, words).pixels;
+    };
+    EXPECT_NE(of("a <c #f80>b</c>"), of("a b"));
 }
 
 // --- stacks -------------------------------------------------------------------------------------------

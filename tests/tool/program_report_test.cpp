@@ -51,9 +51,35 @@ Words tableOf(const std::string& explanation) {
     return table;
 }
 
+/// Effects of every place, in pixels.
+constexpr const char* kMetal = R"({
+  "outerShadow": { "angle": 100, "distance": 6, "size": 8, "color": "#201000", "opacity": 0.6 },
+  "linearGradient": { "angle": 90, "gradient": [ { "color": "#7A4A08", "location": 0 } ] },
+  "innerShadow": { "angle": 270, "distance": 2, "size": 2, "color": "#6B3B00", "opacity": 0.7 },
+  "stroke": { "size": 1, "color": "#FFF3C0", "opacity": 0.8, "position": "inside" } })";
+
+/// A stroke across the edge, for which a run has two layers.
+constexpr const char* kSoundWord = R"({
+  "description": "A sound word",
+  "outerShadow": { "angle": 135, "distance": 13, "size": 0, "color": "#2962C8" },
+  "linearGradient": {
+    "angle": 90,
+    "gradient": [
+      { "color": "#FF3D00", "location": 0 },
+      { "color": "#FFC400", "location": 0.5 },
+      { "color": "#FFF59D", "location": 1 } ] },
+  "stroke": { "size": 5, "color": "#101010", "position": "center" } })";
+
+TEST(Explain, Preset_IsNamedAndDescribed) {
+    EXPECT_TRUE(
+        contains(printed({"--preset", "gold", "--explain"}), "style       preset gold: Polished metal"));
+}
+
 TEST(Explain, Text_IsMeasuredStepByStep) {
-    const std::string text = printed({"--preset", "gold", "--size", "40", "--explain", "Ag"});
-    EXPECT_TRUE(contains(text, "style       preset gold: Polished metal"));
+    const TempDir dir;
+    const std::string style = dir.write("metal.json", kMetal);
+    const std::string text = printed({"--style", style, "--size", "40", "--explain", "Ag"});
+    EXPECT_TRUE(contains(text, "style       file '" + style + "'\n"));
     EXPECT_TRUE(contains(text, "margins     left 7, top 2, right 9, bottom 14 pixels\n"));
     EXPECT_TRUE(contains(text, "layers      one: the text is opaque, and no stroke is centred\n"));
     EXPECT_TRUE(contains(text, "text        2 glyphs of 40 pixels in 1 line\n"));
@@ -84,7 +110,8 @@ TEST(Explain, Picture_IsAsLargeAsItIsPainted) {
 }
 
 TEST(Explain, WithoutText_TellsTheOrderAlone) {
-    const std::string text = printed({"--preset", "comic", "--explain"});
+    const TempDir dir;
+    const std::string text = printed({"--style", dir.write("sound word.json", kSoundWord), "--explain"});
     EXPECT_EQ(tableOf(text),
               (Words{"  effect          place", "  stroke          across the edge",
                      "  linearGradient  on the text", "  outerShadow     outside the text",
@@ -180,12 +207,13 @@ TEST(Sheet, WhatItCannotPaint_IsRefused) {
 }
 
 TEST(WriteCpp, Calls_HaveTheStylesNumbers) {
-    EXPECT_EQ(printed({"--preset", "comic", "--write-cpp"}),
+    const TempDir dir;
+    EXPECT_EQ(printed({"--style", dir.write("sound word.json", kSoundWord), "--write-cpp"}),
               R"(#include <voreleffect/voreleffect.h>
 
-/// A sound word: sunny gradient, thick outline across the edge, hard blue shadow.
+/// A sound word.
 /// For an empty set; VFEffect.h shows how a set paints a run.
-void addComic(VFontEffect::VFEffect& look) {
+void addSoundWord(VFontEffect::VFEffect& look) {
     look.setTextOpacity(1);
     look.addOuterShadowText(135, 13, 0, 0x2962C8, 1);
     VFontEffect::VFGradient linearStops[] = {
@@ -201,8 +229,10 @@ void addComic(VFontEffect::VFEffect& look) {
 }
 
 TEST(WriteCpp, CommandLine_EntersTheCalls) {
-    const std::string text = printed({"--preset", "comic", "--effect-scale", "2", "--color", "#ABCDEF",
-                                      "--opacity", "0.3", "--write-cpp"});
+    const TempDir dir;
+    const std::string text =
+        printed({"--style", dir.write("sound word.json", kSoundWord), "--effect-scale", "2", "--color",
+                 "#ABCDEF", "--opacity", "0.3", "--write-cpp"});
     EXPECT_TRUE(contains(text, "look.setTextOpacity(0.3F);"));
     EXPECT_TRUE(contains(text, "look.addStrokeText(10, 0x101010, 1, 0, 0);"));
     EXPECT_TRUE(contains(text, "look.addText(0xABCDEF, 0.3F);"));

@@ -135,6 +135,7 @@ Options readJob(const JsonObject& job, const Options& common) {
     }
     requirePicture(options);
     checkCanvas(options);
+    checkStandardOutput(options);
     return options;
 }
 

@@ -70,18 +70,20 @@ Options sized(const Options& asked, const std::optional<Clip>& clip) {
 
 /// A film that is set, and not yet painted.
 struct Film {
-    Film(const Options& asked, const Note& note)
+    explicit Film(const Options& asked)
         : clip(asked.film.over ? std::optional<Clip>(readClip(*asked.film.over)) : std::nullopt),
           options(sized(asked, clip)),
           rate(rateOf(options, clip)),
-          cues(options, rate, note) {
-        if (clip) noteOddities(options, *clip, cues, noteTaker(options, note));
+          cues(options, rate) {
+        if (clip) noteOddities(options, *clip, cues, notes.taker());
+        if (options.strict) notes.refuse();
     }
 
     std::optional<Clip> clip;
     Options options;
     FrameRate rate;
     FilmCues cues;
+    HeldNotes notes;  ///< of the clip
 };
 
 void writeAll(std::FILE* file, const Bytes& bytes) {
@@ -226,9 +228,11 @@ void write(const Film& film) {
 }  // namespace
 
 void makeFilm(const Options& options, const Note& note) {
-    const Film film(options, note);
+    const Film film(options);
     if (options.output) write(film);
     if (options.report) print(filmReport(film.options, film.cues));
+    film.cues.notes().giveTo(note);
+    film.notes.giveTo(note);
 }
 
 }  // namespace vorelpaint

@@ -76,17 +76,17 @@ float PlacedCue::opacityAt(double ms, const FilmOptions& film) const {
     return static_cast<float>(std::max(opacity, 0.0));
 }
 
-FilmCues::FilmCues(const Options& options, const FrameRate& rate, const Note& note)
-    : mOptions(options), mRate(rate), mNote(noteTaker(options, note)) {
+FilmCues::FilmCues(const Options& options, const FrameRate& rate) : mOptions(options), mRate(rate) {
     const std::vector<Cue> cues = readSubtitles(options.film.subtitles.value());
     addStyles();
-    noteUnusedNames(options.film, cues, mNote);
+    noteUnusedNames(options.film, cues, mNotes.taker());
     for (const Cue& cue : cues)
         add(cue);
     if (mCues.empty()) {
         throw ToolError("nothing to show: " + inQuotes(*options.film.subtitles) +
                         " has no cue that is seen");
     }
+    if (options.strict) mNotes.refuse();
 }
 
 int64_t FilmCues::frameCount() const {
@@ -105,10 +105,7 @@ Box FilmCues::rows() const {
 }
 
 Image FilmCues::paint(const PlacedCue& placed) const {
-    const auto silent = [](const std::string&) {};
-    Options options = optionsOf(placed.cue, placed.look);
-    options.strict = false;  // what there is to note was noted when it was placed
-    const Composition composition(options, silent);
+    const Composition composition(optionsOf(placed.cue, placed.look));
     const Box& area = placed.area;
     const Canvas canvas{area.width(), area.height(), composition.canvas().x - area.left,
                         composition.canvas().y + placed.down - area.top};
@@ -157,10 +154,11 @@ void FilmCues::add(const Cue& cue) {
 }
 
 void FilmCues::place(const Cue& cue, const std::string& look) {
-    const Note note = noteTaker(mOptions, [&](const std::string& line) {
-        if (mNoted.insert(line).second) mNote(placeOf(cue) + line);
-    });
-    const Composition composition(optionsOf(cue, look), note);
+    const Note note = [&](const std::string& line) {
+        if (mNoted.insert(line).second) mNotes.taker()(placeOf(cue) + line);
+    };
+    const Composition composition(optionsOf(cue, look));
+    composition.notes().giveTo(note);
     const Canvas& canvas = composition.canvas();
     const Box box = movedBy(composition.text().box(), canvas.x, canvas.y);
     const int down = roomFor(box, cue);

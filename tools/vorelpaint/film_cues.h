@@ -34,10 +34,11 @@ class FilmCues {
   public:
     /// Sets every cue in a frame of the canvas's width and height, which must be given. Cues that are
     /// seen together do not overlap: the later one makes way, upwards, or downwards at an anchor at the
-    /// top, and stays there. What is odd is noted once. Throws ToolError with the place of a cue that
-    /// cannot be painted, and when nothing is left to show.
-    FilmCues(const Options& options, const FrameRate& rate, const Note& note);
+    /// top, and stays there. Throws ToolError with the place of a cue that cannot be painted, when
+    /// nothing is left to show, and in a strict request for the first note.
+    FilmCues(const Options& options, const FrameRate& rate);
 
+    const HeldNotes& notes() const { return mNotes; }  ///< each line of a cue once, with its place
     const std::vector<PlacedCue>& all() const { return mCues; }
     int64_t frameCount() const;  ///< up to the end of the last cue
 
@@ -59,7 +60,7 @@ class FilmCues {
 
     Options mOptions;
     FrameRate mRate;
-    Note mNote;
+    HeldNotes mNotes;
     std::set<std::string> mNoted;  ///< what was said of a cue once
     std::map<std::string, vorelstyle::Style> mStyles;
     std::vector<PlacedCue> mCues;

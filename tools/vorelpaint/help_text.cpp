@@ -77,9 +77,8 @@ const std::vector<Note>& notes() {
              "When two jobs have one output, nothing is painted."},
         {"Films",
          "The cues of --subtitles are painted in frames of 1920 x 1080 pixels, or of the clip's sides; "
-         "centred lines stand at the bottom, broken where they are too wide (--align, --anchor, --fit, "
-         "--box). The font has an eighteenth of the frame's shorter side and the margin a twentieth, "
-         "the "
+         "centred lines stand at the bottom, broken where they are too wide. The font has an "
+         "eighteenth of the frame's shorter side, the margin a twentieth, and the "
          "look is the preset subtitle; options change all of it. A cue is seen in the frames that "
          "begin within its times. One that begins while others are seen stands above them. Of the "
          "files, times, texts and names are read, not their styles and places. A film has the alpha "
@@ -104,7 +103,9 @@ const std::vector<Note>& notes() {
          "Where the program is installed, in /usr for a package: "
          "share/doc/vorelpaint/style-files.md lists every key of a style file, "
          "share/doc/vorelpaint/vorelpaint.md tells of batches and reports, "
-         "share/doc/vorelpaint/film.md of films, "
+         "share/doc/vorelpaint/captions.md has recipes for titles and captions, "
+         "share/doc/vorelpaint/layer-styles.md translates the layer styles of design tools, "
+         "share/doc/vorelpaint/film.md tells of films, "
          "share/voreleffect/presets has the presets, and "
          "share/voreleffect/vorelpaint-style.schema.json tells editors what a style file may hold."},
         {"Exit codes",

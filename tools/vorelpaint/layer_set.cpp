@@ -1,7 +1,6 @@
 #include "layer_set.h"
 
 #include <algorithm>
-#include <map>
 #include <optional>
 #include <string>
 #include <variant>
@@ -13,7 +12,6 @@ namespace {
 
 using vorelstyle::ColourRange;
 using vorelstyle::Effect;
-using vorelstyle::Look;
 using vorelstyle::LookStyle;
 using vorelstyle::Stack;
 using vorelstyle::StackedLook;
@@ -42,16 +40,31 @@ Layer layerOf(const StackedLook& stacked) {
     return layer;
 }
 
-/// The effect of a look that leaves nothing to be seen of the fill; empty when there is none.
-std::string coverOf(const LookStyle& look) {
-    for (const Effect& effect : look.effects) {
-        const auto* linear = std::get_if<vorelstyle::LinearGradient>(&effect);
-        const auto* radial = std::get_if<vorelstyle::RadialGradient>(&effect);
-        const bool covers = (linear != nullptr && linear->opacity >= 1.0F) ||
-                            (radial != nullptr && radial->opacity >= 1.0F);
-        if (covers) return std::string(effectName(effect));
+/// Whether an effect may leave nothing to be seen of the fill.
+struct CoversFill {
+    static bool isOpaque(float opacity, const vorelstyle::Stops& stops) {
+        return opacity >= 1.0F && std::all_of(stops.begin(), stops.end(),
+                                              [](const auto& stop) { return stop.mOpacity >= 1.0F; });
     }
-    return "";
+    bool operator()(const vorelstyle::LinearGradient& e) const {
+        return isOpaque(e.opacity, e.gradient);
+    }
+    bool operator()(const vorelstyle::RadialGradient& e) const {
+        return isOpaque(e.opacity, e.gradient);
+    }
+    bool operator()(const vorelstyle::Pattern& e) const { return e.opacity >= 1.0F; }
+    template <typename Other>
+    bool operator()(const Other& /*effect*/) const {
+        return false;
+    }
+};
+
+/// The first effect of a look that covers its fill; empty when there is none.
+std::string coverOf(const LookStyle& look) {
+    const auto cover = std::find_if(look.effects.begin(), look.effects.end(), [](const Effect& effect) {
+        return std::visit(CoversFill(), effect);
+    });
+    return cover == look.effects.end() ? "" : std::string(effectName(*cover));
 }
 
 }  // namespace
@@ -88,20 +101,13 @@ void LayerSet::addColours(const Options& options, const std::vector<ColourRange>
         return;
     }
     const LookStyle& look = mStyle.looks[*top];
-    const float opacity = textPaintOf(mStyle, *top, options.color, options.opacity).opacity;
-    layer.pictureOpacity = opacity;
+    layer.pictureOpacity = textPaintOf(mStyle, *top, options.color, options.opacity).opacity;
     if (!colours.empty() && !coverOf(look).empty()) {
         note("the look's " + coverOf(look) + " covers the colours of the markup");
     }
-    std::map<uint32_t, const Look*> looks;
-    for (const ColourRange& range : colours) {
-        const Look*& coloured = looks[range.colour];
-        if (coloured == nullptr) {
-            mColoured.push_back(std::make_unique<Look>(look, range.colour, opacity, imagesOf(mStyle)));
-            coloured = mColoured.back().get();
-        }
-        layer.exchanges.push_back({range.begin, range.end, &coloured->effects()});
-    }
+    layer.fillOpacity = mStack->looks()[*top].look.fillOpacity();
+    for (const ColourRange& range : colours)
+        layer.colours.push_back({range.begin, range.end, range.colour});
 }
 
 }  // namespace vorelpaint

@@ -31,7 +31,6 @@ class LayerSet {
 
     vorelstyle::Style mStyle;
     std::unique_ptr<vorelstyle::Stack> mStack;
-    std::vector<std::unique_ptr<vorelstyle::Look>> mColoured;  ///< the topmost filled look, by colour
     std::vector<voreltext::Layer> mLayers;
 };
 

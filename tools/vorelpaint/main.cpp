@@ -55,25 +55,30 @@ void sayNote(const std::string& note) {
     say("note: " + note);
 }
 
-/// What is printed about a look that no text is given for.
-void presentLook(const Options& options) {
-    const LayerSet looks(options, chosenStyle(options), options.size, {}, noteTaker(options, sayNote));
+void printFacts(const Options& options, const LayerSet& looks, const Margins& margins) {
     if (options.writeCpp) printCpp(options, looks.style());
     if (options.printKey) print("key " + vorelstyle::hexadecimal(looks.stack().key()) + "\n");
-    if (options.printMargins) printMargins(voreltext::marginsOf(looks.layers()));
+    if (options.printMargins) printMargins(margins);
+}
+
+/// What is printed about a look that no text is given for.
+void presentLook(const Options& options) {
+    HeldNotes notes;
+    const LayerSet looks(options, chosenStyle(options), options.size, {}, notes.taker());
+    if (options.strict) notes.refuse();
+    printFacts(options, looks, voreltext::marginsOf(looks.layers()));
     if (options.explain) print(explanationOf(options, looks));
+    notes.giveTo(sayNote);
 }
 
 /// What is printed about a look and its picture.
 void present(const Options& options) {
     if (!options.text && !options.textFile) return presentLook(options);
-    const Composition composition(options, noteTaker(options, sayNote));
-    if (options.writeCpp) printCpp(options, composition.looks().style());
-    if (options.printKey)
-        print("key " + vorelstyle::hexadecimal(composition.looks().stack().key()) + "\n");
-    if (options.printMargins) printMargins(composition.margins());
+    const Composition composition(options);
+    printFacts(options, composition.looks(), composition.margins());
     if (options.explain) print(explanationOf(options, composition));
     finish(options, composition);
+    composition.notes().giveTo(sayNote);
 }
 
 void runBatch(const Options& options) {

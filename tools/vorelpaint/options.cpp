@@ -108,15 +108,16 @@ void addSetting(CLI::App& app, const Setting& setting, Options& options) {
     option->group(setting.group);
 }
 
+bool prints(const Options& options) {
+    return options.printKey || options.printMargins || options.explain || options.writeCpp ||
+           options.report;
+}
+
 void checkOutput(const Options& options) {
-    const bool prints = options.printKey || options.printMargins || options.explain ||
-                        options.writeCpp || options.report;
-    if (!options.output && !prints) {
+    if (!options.output && !prints(options)) {
         throw ToolError("nowhere to paint: give -o FILE, or -o - for standard output");
     }
-    if (prints && options.output && isStandardOutput(*options.output)) {
-        throw ToolError("standard output cannot take both the picture and what is printed");
-    }
+    checkStandardOutput(options);
     if ((options.output || options.report) && !options.text && !options.textFile) {
         throw ToolError("nothing to paint: give TEXT, or --text-file FILE");
     }
@@ -172,6 +173,12 @@ void checkCanvas(const Options& options) {
     }
     if (options.sheet && (canvas.width || canvas.height)) {
         throw ToolError("a sheet has the size of its cells; no width or height can be given");
+    }
+}
+
+void checkStandardOutput(const Options& options) {
+    if (prints(options) && options.output && isStandardOutput(*options.output)) {
+        throw ToolError("standard output cannot take both the picture and what is printed");
     }
 }
 

@@ -77,4 +77,7 @@ std::optional<Options> parseOptions(int argc, const char* const* argv);
 /// Refuses what is asked of a canvas that has no such side. Throws ToolError.
 void checkCanvas(const Options& options);
 
+/// Refuses to print where the picture is written. Throws ToolError.
+void checkStandardOutput(const Options& options);
+
 }  // namespace vorelpaint

@@ -41,19 +41,15 @@ void noteCut(const Canvas& canvas, const Box& ink, const Margins& margins, const
 
 }  // namespace
 
-Note noteTaker(const Options& options, const Note& note) {
-    if (!options.strict) return note;
-    return [](const std::string& line) { throw ToolError(line); };
-}
-
-Composition::Composition(const Options& options, const Note& note)
+Composition::Composition(const Options& options)
     : mSource(chosenText(options)),
       mText(setToFit(options, mSource.text)),
-      mLooks(options, chosenStyle(options), mText.size(), mSource.colours, note),
+      mLooks(options, chosenStyle(options), mText.size(), mSource.colours, mNotes.taker()),
       mMargins(marginsOf(mLooks.layers())),
       mCanvas(placedOn(options.canvas, mText.box(), mMargins)) {
-    noteMissing(mText.layout(), mSource.text, note);
-    noteCut(mCanvas, mText.layout().inkBox(), mMargins, note);
+    noteMissing(mText.layout(), mSource.text, mNotes.taker());
+    noteCut(mCanvas, mText.layout().inkBox(), mMargins, mNotes.taker());
+    if (options.strict) mNotes.refuse();
 }
 
 Image Composition::paint() const {
@@ -71,7 +67,9 @@ void finish(const Options& options, const Composition& composition) {
 }
 
 void paintPicture(const Options& options, const Note& note) {
-    finish(options, Composition(options, noteTaker(options, note)));
+    const Composition composition(options);
+    finish(options, composition);
+    composition.notes().giveTo(note);
 }
 
 }  // namespace vorelpaint

@@ -11,14 +11,13 @@
 /// TextError.
 namespace vorelpaint {
 
-/// Takes notes as is asked for: a strict request throws them as ToolError, others go to `note`.
-Note noteTaker(const Options& options, const Note& note);
-
 /// A picture before it is painted: a text in its fonts, its looks, and the canvas on which they meet.
 class Composition {
   public:
-    Composition(const Options& options, const Note& note);
+    /// A strict request's first note is thrown as ToolError.
+    explicit Composition(const Options& options);
 
+    const HeldNotes& notes() const { return mNotes; }
     const std::vector<uint32_t>& source() const { return mSource.text; }  ///< without markup
     const SetText& text() const { return mText; }
     const LayerSet& looks() const { return mLooks; }
@@ -28,6 +27,7 @@ class Composition {
     voreltext::Image paint() const;
 
   private:
+    HeldNotes mNotes;
     vorelstyle::MarkedText mSource;
     SetText mText;
     LayerSet mLooks;
@@ -41,7 +41,7 @@ void writePicture(const Options& options, voreltext::Image picture);
 /// Writes the picture, where an output is asked for, and prints its report, where one is.
 void finish(const Options& options, const Composition& composition);
 
-/// All of these steps.
+/// All of these steps, and then the notes.
 void paintPicture(const Options& options, const Note& note);
 
 }  // namespace vorelpaint

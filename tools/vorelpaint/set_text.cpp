@@ -68,20 +68,28 @@ void requireRoomForGlyphs(const Room& room, const TextLayout& layout,
         std::to_string(glyph->box.width()) + " x " + std::to_string(glyph->box.height()) + " pixels");
 }
 
-SetText setInCanvas(const Options& options, const Room& room, const std::vector<uint32_t>& text) {
-    if (options.fit == Fit::wrap) return {options, text, options.size, *room.width};
-    SetText whole(options, text, options.size);
-    if (options.fit == Fit::none || room.holds(whole.box())) return whole;
+SetText shrunk(const Options& options, const Room& room, const std::vector<uint32_t>& text) {
     std::optional<SetText> best;
-    voreltext::largestThatFits(options.size - 1, [&](int size) {
-        if (size < 1) return false;
-        SetText smaller(options, text, size);
-        const bool fits = room.holds(smaller.box());
-        if (fits && (!best || size > best->size())) best.emplace(std::move(smaller));
-        return fits;
+    std::string fault;
+    voreltext::largestThatFits(options.size, [&](int size) {
+        try {
+            SetText set(options, text, size);
+            fault.clear();
+            if (!room.holds(set.box())) return false;
+            best = std::move(set);
+            return true;
+        } catch (const voreltext::TextError& error) {  // in a smaller size it may not be too wide
+            fault = error.what();
+            return false;
+        }
     });
     if (best) return std::move(*best);
-    throw ToolError("the text does not fit the canvas at any size");
+    throw ToolError(fault.empty() ? "the text does not fit the canvas at any size" : fault);
+}
+
+SetText setInCanvas(const Options& options, const Room& room, const std::vector<uint32_t>& text) {
+    if (options.fit == Fit::shrink) return shrunk(options, room, text);
+    return {options, text, options.size, options.fit == Fit::wrap ? *room.width : 0};
 }
 
 }  // namespace

@@ -172,12 +172,14 @@ void paintSheet(const Options& options, const Note& note) {
     const MarkedText source = chosenText(options);
     const std::vector<int> sizes =
         options.sheetSizes.empty() ? std::vector<int>{options.size} : options.sheetSizes;
+    HeldNotes notes;
     std::vector<Column> columns;
     for (const int size : sizes)
-        columns.push_back(columnOf(options, source, size, note));
+        columns.push_back(columnOf(options, source, size, notes.taker()));
     const Grid grid = gridOf(columns, options.canvas.padding);
 
     Image sheet = voreltext::transparentImage(grid.left(grid.columns), grid.rows * grid.height());
+    if (options.strict) notes.refuse();
     CellPainter painter(sheet, options);
     const size_t count = columns.front().cells.size();
     Progress progress("pictures", count * columns.size());
@@ -190,6 +192,7 @@ void paintSheet(const Options& options, const Note& note) {
         progress.advance();
     }
     writePicture(options, std::move(sheet));
+    notes.giveTo(note);
 }
 
 }  // namespace vorelpaint

@@ -77,6 +77,10 @@ TEST(InnerGlow, Strength_FallsFromTheCornersInwards) {
     EXPECT_EQ(190, channelOf(result.dst, 0)[2 * 9 + 4]);  // 191 * 255 >> 8
 }
 
+TEST(InnerGlow, HardStops_AreNotSmoothed) {
+    kGlow.expectHardStopsNotSmoothed(sceneOf(discMask(90, 90, 45.0F, 44.0F, 30.0F, true)));
+}
+
 TEST(InnerGlow, UnreachedBorder_IsOpaqueWhite) {
     // Padding 2, radius 1: the image starts 4 pixels before the box and its outermost ring is white,
     // even where the colour of the glow is transparent.

@@ -129,6 +129,18 @@ TEST(LinearGradient, Length_FollowsTheSideThatTheLineLeavesBy) {
     EXPECT_EQ(greyOf(128 + 25), tall[20 * 10 + 7]);
 }
 
+TEST(LinearGradient, Steps_AreStripesInABoxWiderThan256) {
+    // 2048 columns show the 256 colours of a box of 256: each for 8 columns, and the middle one, to
+    // which both sides are cut, for 15.
+    const std::vector<uint32_t> table = tableOf(kRamp);
+    const std::vector<uint32_t> row =
+        rowOf(kGradient.painted(sceneOf(filledMask(2048, 1, 255)), 0.0F, 1.0F, kRamp).dst, 0);
+    for (int x = 0; x < 2048; ++x)
+        EXPECT_EQ(table[static_cast<size_t>(128 + (x - 1024) / 8)], row[static_cast<size_t>(x)]) << x;
+    EXPECT_EQ(row[1024 - 7], row[1024 + 7]);
+    EXPECT_NE(row[1024], row[1024 + 8]);
+}
+
 TEST(LinearGradient, Scale_StretchesOrCompressesTheRamp) {
     const Scene line = sceneOf(filledMask(4, 1, 255));
     EXPECT_EQ(greys({64, 96, 128, 160}), channelOf(kGradient.painted(line, 0.0F, 2.0F, kRamp).dst, 0));

@@ -106,6 +106,10 @@ TEST(OuterGlow, FullStrength_TakesEntryOneNeverEntryZero) {
         std::vector<uint8_t>(result.dst.bytes.begin() + middle, result.dst.bytes.begin() + middle + 4));
 }
 
+TEST(OuterGlow, HardStops_AreNotSmoothed) {
+    kGlow.expectHardStopsNotSmoothed(sceneOf(discMask(90, 90, 45.0F, 44.0F, 14.0F, true)));
+}
+
 TEST(OuterGlow, SizeTen_StaysInsideItsImageAndItsBorder) {
     // Padding 11: the image reaches 22 pixels beyond the box, its outermost 9 stay transparent.
     Scene scene = sceneOf(filledMask(80, 80, 255), {35, 33, 47, 45});

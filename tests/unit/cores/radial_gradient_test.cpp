@@ -93,6 +93,18 @@ TEST(RadialGradient, Centre_HasTheFirstEntryAndTheSidesTheLast) {
     EXPECT_EQ(row[256 + 100], row[256 - 100]);
 }
 
+TEST(RadialGradient, Steps_AreRingsHalfAsWideAsTheStripesOfALine) {
+    // The radius of 1024 columns shows the 256 colours that one of 256 has a column each for.
+    const std::vector<uint32_t> table =
+        rowOf(filled(sceneOf(filledMask(512, 2, 255)), 1.0F, kRamp).dst, 1);
+    const std::vector<uint32_t> row =
+        rowOf(filled(sceneOf(filledMask(2048, 2, 255)), 1.0F, kRamp).dst, 1);
+    for (int x = 1024; x < 2048; ++x) {
+        const int entry = (x - 1024) / 4;
+        EXPECT_EQ(table[static_cast<size_t>(256 + entry)], row[static_cast<size_t>(x)]) << x;
+    }
+}
+
 TEST(RadialGradient, ScaleTwo_ReachesTheMiddleOfTheTableAtTheSides) {
     const std::vector<uint32_t> row =
         rowOf(filled(sceneOf(filledMask(512, 2, 255)), 2.0F, kRamp).dst, 1);

@@ -90,7 +90,8 @@ TEST(KeyText, Place_TellsOffsetsSpanAndFill) {
         return fragments[0].meaning;
     };
     EXPECT_EQ(wordsOf({3, -2, Span::word, true}), "moved by 3, -2, by word");
-    EXPECT_EQ(wordsOf({}), "moved by 0, 0");
+    EXPECT_EQ(wordsOf({}), "not moved");
+    EXPECT_EQ(wordsOf({0, 1, Span::block, true}), "moved by 0, 1");
     EXPECT_EQ(wordsOf({-1, 127, Span::line, false}), "moved by -1, 127, by line, not filled");
     EXPECT_EQ(wordsOf({32767, -32767, Span::glyph, true}), "moved by 32767, -32767, by glyph");
     EXPECT_EQ(wordsOf({128, -129, Span::block, false}), "moved by 128, -129, not filled");

@@ -38,6 +38,13 @@ TEST(Look, TextFillOfTheStyle_KeepsItsPlaceAndTakesTheChosenColour) {
     EXPECT_EQ(Look(style, 0x00FF00, 1).key(), "T" + keyWord(0xFF00FF00) + stroke);
 }
 
+TEST(Look, OpacityOfTheFill_IsThatOfTheTextAndOfItsEffect) {
+    EXPECT_EQ(Look(lookOf("{}"), 0, 0.5F).fillOpacity(), 0.5F);
+    const LookStyle style = lookOf(R"({"text": {"color": "#000000", "opacity": 0.5}})");
+    EXPECT_EQ(Look(style, 0, 1).fillOpacity(), 0.5F);
+    EXPECT_EQ(Look(style, 0, 0.5F).fillOpacity(), 0.25F);
+}
+
 TEST(Look, FillWithoutAPlace_ComesLast) {
     const LookStyle style =
         lookOf(R"({"stroke": {"size": 2, "color": "#0000FF", "position": "outside"}})");

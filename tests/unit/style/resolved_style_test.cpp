@@ -242,6 +242,7 @@ TEST(ResolvedStyle, Offsets_AreRoundedInEitherUnit) {
     EXPECT_EQ(offsetOf("3", 96, 0.5F), Length{2});
     EXPECT_EQ(offsetOf("\"-50%\"", 33, 2), Length{-33});
     EXPECT_EQ(offsetOf("1000", 96, 20), Length{20000});
+    EXPECT_EQ(offsetOf("\"83.7%\"", 500, 1), Length{419}) << "418.5, though 83.7F is less than 83.7";
 }
 
 TEST(ResolvedStyle, OffsetsPastTheFarthest_AreCutAndNoted) {

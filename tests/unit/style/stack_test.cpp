@@ -69,8 +69,11 @@ TEST(Stack, OneLookThatIsMovedOrInSpans_TellsItsPlace) {
               "P\xC0\x80\x80\xC0\x80\x80\x87" + fillKey(0, 0));
 }
 
-TEST(Stack, LookWithoutFill_HasTheKeyOfTextOpacityZero) {
-    EXPECT_EQ(stackOf(R"({"version": 2, "fill": false})").key(), stackOf(R"({"textOpacity": 0})").key());
+/// Its effects are those of an invisible fill, but the pictures of colour fonts do not fade with it.
+TEST(Stack, LookWithoutFill_HasAnotherKeyThanAnInvisibleFill) {
+    EXPECT_EQ(stackOf(R"({"textOpacity": 0})").key(), fillKey(0, 0));
+    EXPECT_EQ(stackOf(R"({"version": 2, "fill": false})").key(),
+              "P\xC0\x80\x80\xC0\x80\x80\x84" + fillKey(0, 0));
     const Stack stack = stackOf(R"({"version": 2, "fill": false})");
     EXPECT_FALSE(stack.looks()[0].place.isFilled);
     VFontEffect::VFEffect effects(stack.looks()[0].look.effects());
@@ -109,10 +112,9 @@ Style styleOf(const Description& looks) {
     return style;
 }
 
-/// Without an offset and spans, a look without a fill is one with an invisible one.
 bool isPlain(const Description& looks) {
     const auto& [x, y, span, isFilled, fill] = looks.front();
-    return looks.size() == 1 && x == 0 && y == 0 && span == 0;
+    return looks.size() == 1 && x == 0 && y == 0 && span == 0 && isFilled;
 }
 
 TEST(Stack, StacksThatDiffer_HaveDifferentKeys) {
@@ -133,7 +135,9 @@ std::vector<std::string> wordsOf(const Description& looks) {
     std::vector<std::string> words;
     for (const auto& [x, y, span, isFilled, fill] : looks) {
         if (!isPlain(looks)) {
-            words.push_back("place: moved by " + std::to_string(x) + ", " + std::to_string(y) +
+            const bool moved = x != 0 || y != 0;
+            const std::string offset = std::to_string(x) + ", " + std::to_string(y);
+            words.push_back("place: " + (moved ? "moved by " + offset : "not moved") +
                             spans[static_cast<size_t>(span)] + (isFilled ? "" : ", not filled"));
         }
         words.push_back(std::string("text: colour #") + (!isFilled   ? "00000000"

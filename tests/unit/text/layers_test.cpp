@@ -9,6 +9,7 @@
 
 #include "text/overlay.h"
 #include "text/utf8.h"
+#include "unit/text/test_font.h"
 
 namespace voreltext {
 namespace {
@@ -21,7 +22,8 @@ constexpr int kSize = 40;
 /// A text in the font of the tests.
 class Sample {
   public:
-    explicit Sample(std::string_view text) : mLayout(mFonts, decodeUtf8(text)) {}
+    explicit Sample(std::string_view text, const TextSettings& settings = {})
+        : mLayout(mFonts, decodeUtf8(text), settings) {}
     const TextLayout& layout() const { return mLayout; }
 
   private:
@@ -87,8 +89,8 @@ TEST(Layers, Glow_KeepsItsFaintEnd) {
     VFEffect effects;
     effects.addOuterGlowText(30, 0xFF8000, 1, 0, nullptr);
     effects.addText(0, 1);
-    const Canvas canvas = placedOn({{}, {}, Anchor::center, 0, 60}, sample.layout().inkBox(),
-                                   marginsOf({{&effects}}));
+    const Canvas canvas =
+        placedOn({{}, {}, Anchor::center, 0, 60}, sample.layout().inkBox(), marginsOf({{&effects}}));
     EXPECT_EQ(paint({{&effects}}, sample.layout(), canvas).pixels,
               paint(effects, sample.layout(), 60).pixels);
 }
@@ -202,13 +204,13 @@ TEST(Spans, LaterOnes_LieOverEarlierOnes) {
 }
 
 /// Half of a text in another colour: only its glyphs are taken from the other picture.
-TEST(Exchange, ChangesTheGlyphsAlone) {
+TEST(ColouredParts, ChangeTheirGlyphsAlone) {
     const Sample sample("abcd");
     VFEffect red = everything();
     VFEffect green = everything();
     green.addText(0x00FF00, 1);
     Layer layer{&red};
-    layer.exchanges.push_back({1, 3, &green});
+    layer.colours.push_back({1, 3, 0x00FF00});
     const Image image = painted(sample, {layer});
     const Image asRed = painted(sample, {{&red}});
     const Image asGreen = painted(sample, {{&green}});
@@ -227,6 +229,84 @@ TEST(Exchange, ChangesTheGlyphsAlone) {
         ASSERT_TRUE(std::equal(&image.pixels[at], &image.pixels[at] + 4, &wanted.pixels[at])) << at;
     }
     EXPECT_NE(image.pixels, asRed.pixels);
+}
+
+/// A glyph of a colour font: the effects are made of its coverage, and its picture lies on them.
+class PictureLayer : public ::testing::Test {
+  protected:
+    PictureLayer() {
+        mEffects.addStrokeText(5, 0x0000FF, 1, 0, 1);
+        mEffects.addText(0x00FF00, 1);
+    }
+
+    Image painted(bool takesPictures, float opacity = 1) {
+        Layer layer{&mEffects};
+        layer.takesPictures = takesPictures;
+        layer.pictureOpacity = opacity;
+        return paint({layer}, mLayout, around(mLayout, {layer}));
+    }
+
+    VFEffect mEffects;
+    Fonts mFonts{Font(FontFile{vorel_test::kEmojiFont}, kSize)};
+    TextLayout mLayout{mFonts, {0x1F600}};
+};
+
+TEST_F(PictureLayer, CoverageIsPaintedLikeThatOfText) {
+    const Image image = painted(false);
+    const uint8_t* middle = pixelAt(image, image.width / 2, image.height / 2);
+    EXPECT_EQ(std::vector<int>(middle, middle + 4), (std::vector<int>{0, 255, 0, 255}));
+    int top = 0;
+    while (pixelAt(image, image.width / 2, top)[3] < 255)
+        ++top;
+    const uint8_t* rim = pixelAt(image, image.width / 2, top);
+    EXPECT_EQ(std::vector<int>(rim, rim + 4), (std::vector<int>{0, 0, 255, 255}));
+}
+
+TEST_F(PictureLayer, PictureLiesOverTheFill) {
+    const Image image = painted(true);
+    Image wanted = painted(false);
+    const GlyphMask mask = mLayout.rasterise(0);
+    ASSERT_FALSE(mask.pixels.empty());
+    layOver(wanted, {mask.box.width(), mask.box.height(), mask.pixels}, 5, 5);
+    EXPECT_EQ(image.pixels, wanted.pixels);
+    EXPECT_NE(image.pixels, painted(false).pixels);
+}
+
+TEST_F(PictureLayer, PictureFadesWithTheText) {
+    EXPECT_EQ(painted(true, 0).pixels, painted(false).pixels);
+    EXPECT_NE(painted(true, 0.5F).pixels, painted(true).pixels);
+}
+
+TEST(ColouredParts, OfGlyphsThatOverlap_TheLastIsSeen) {
+    TextSettings close;
+    close.letterSpacing = -10 * 64;
+    const Sample sample("mmmm", close);
+    VFEffect red = everything();
+    Layer layer{&red};
+    layer.colours = {{0, 1, 0x00FF00}, {1, 2, 0x0000FF}, {3, 4, 0x00FF00}};
+    const Image image = painted(sample, {layer});
+
+    VFEffect green = everything();
+    green.addText(0x00FF00, 1);
+    VFEffect blue = everything();
+    blue.addText(0x0000FF, 1);
+    const std::vector<Image> whole{painted(sample, {{&green}}), painted(sample, {{&blue}}),
+                                   painted(sample, {{&red}}), painted(sample, {{&green}})};
+    Image wanted = whole[2];
+    const Canvas canvas = around(sample.layout(), {layer});
+    ASSERT_EQ(sample.layout().glyphCount(), 4U);
+    EXPECT_LT(sample.layout().glyph(1).box.left, sample.layout().glyph(0).box.right);
+    for (size_t i = 0; i < 4; ++i) {
+        const GlyphMask mask = sample.layout().rasterise(i);
+        const auto width = static_cast<size_t>(mask.box.width());
+        for (size_t at = 0; at < mask.coverage.size(); ++at) {
+            if (mask.coverage[at] == 0) continue;
+            const int x = mask.box.left + static_cast<int>(at % width) + canvas.x;
+            const int y = mask.box.top + static_cast<int>(at / width) + canvas.y;
+            std::copy_n(pixelAt(whole[i], x, y), 4, &wanted.pixels[offsetOf(wanted, x, y)]);
+        }
+    }
+    EXPECT_EQ(image.pixels, wanted.pixels);
 }
 
 TEST(Layers, WithoutGlyphs_AreATransparentPicture) {

@@ -4,8 +4,12 @@
 
 #include <filesystem>
 #include <string>
+#include <utility>
+#include <vector>
 
 #include "text/error.h"
+#include "text/text_layout.h"
+#include "text/utf8.h"
 
 namespace voreltext {
 namespace {
@@ -54,16 +58,37 @@ TEST(SystemFonts, WordsOfAFacesOwnStyle_ChooseIt) {
             << style;
 }
 
-TEST(SystemFonts, MisspeltStyle_IsRefused) {
-    for (const std::string style :
-         {"blod", "italics", "weight=blod", "wieght=200", "foo=bar", "=", "size"}) {
-        EXPECT_EQ(faultOf("DejaVu Sans:" + style), "font 'DejaVu Sans:" + style + "': '" + style +
-                                                       "' is no style and no property of fonts");
+TEST(SystemFonts, MisspeltStyle_IsRefusedWithTheNearest) {
+    const std::string none = "' is no style and no property of fonts";
+    const std::vector<std::pair<std::string, std::string>> meant{{"blod", "bold"},
+                                                                 {"Itallic", "italic"},
+                                                                 {"semi-condensed", "semicondensed"},
+                                                                 {"weight=blod", "weight=bold"},
+                                                                 {"wieght=200", "weight=200"},
+                                                                 {"slnat=itlaic", "slant=italic"}};
+    for (const auto& [style, nearest] : meant) {
+        EXPECT_EQ(faultOf("DejaVu Sans:" + style), "font 'DejaVu Sans:" + style + "': '" + style + none +
+                                                       "; did you mean '" + nearest + "'?");
     }
+    for (const std::string style : {"foo=bar", "=", "size", "weight=xyz"})
+        EXPECT_EQ(faultOf("DejaVu Sans:" + style), "font 'DejaVu Sans:" + style + "': '" + style + none);
     EXPECT_EQ(faultOf("DejaVu Sans:bold:blod"),
-              "font 'DejaVu Sans:bold:blod': 'blod' is no style and no property of fonts");
+              "font 'DejaVu Sans:bold:blod': 'blod" + none + "; did you mean 'bold'?");
     EXPECT_EQ(faultOf("No Such Family:blod"),
-              "font 'No Such Family:blod': 'blod' is no style and no property of fonts");
+              "font 'No Such Family:blod': 'blod" + none + "; did you mean 'bold'?");
+}
+
+TEST(SystemFonts, EveryStyleThatIsMeant_IsKnown) {
+    // Each is refused for its face, if at all, and not for its name.
+    for (const std::string style :
+         {"thin",          "extralight",     "ultralight",     "demilight",     "semilight",
+          "light",         "book",           "regular",        "medium",        "demibold",
+          "semibold",      "bold",           "extrabold",      "ultrabold",     "black",
+          "heavy",         "roman",          "italic",         "oblique",       "condensed",
+          "expanded",      "ultracondensed", "extracondensed", "semicondensed", "semiexpanded",
+          "extraexpanded", "ultraexpanded"}) {
+        EXPECT_EQ(faultOf("DejaVu Sans:" + style).find("is no style"), std::string::npos) << style;
+    }
 }
 
 TEST(SystemFonts, StyleThatTheFamilyHasNot_IsNotReplacedByTheNearest) {
@@ -100,6 +125,80 @@ TEST(SystemFonts, FamilyThatIsNotInstalled_IsNotReplacedByTheNearest) {
     } catch (const TextError& error) {
         EXPECT_STREQ(error.what(), "no font file or family 'No Such Family:bold'");
     }
+}
+
+TEST(SystemFonts, MisspeltFamily_IsRefusedWithTheNearest) {
+    EXPECT_EQ(faultOf("DejaVu Snas"),
+              "no font file or family 'DejaVu Snas'; did you mean 'DejaVu Sans'?");
+    EXPECT_EQ(faultOf("dejavu serfi:bold"),
+              "no font file or family 'dejavu serfi:bold'; did you mean 'DejaVu Serif'?");
+    EXPECT_EQ(faultOf(""), "no font file or family ''");
+}
+
+class SystemFontsFor : public ::testing::Test {
+  protected:
+    /// The file of the font for a cluster of a text in `request`.
+    std::string fileFor(const Cluster& cluster, const std::string& request = "DejaVu Sans") {
+        const auto found = mFonts.findFor(cluster, mFonts.find(request));
+        return found ? std::filesystem::path(found->path).filename().string() : "";
+    }
+
+    SystemFonts mFonts;
+};
+
+TEST_F(SystemFontsFor, Scripts_AreFoundInTheFontsThatHaveThem) {
+    for (const uint32_t code : {0x905U, 0xE01U, 0x65E5U, 0xD55CU, 0x5D0U}) {
+        const auto found = mFonts.findFor({code}, mFonts.find("DejaVu Serif"));
+        ASSERT_TRUE(found) << code;
+        EXPECT_TRUE(Font(*found, 20).has(code)) << found->path;
+    }
+}
+
+TEST_F(SystemFontsFor, WhatNoFontHas_IsNotFound) {
+    EXPECT_EQ(fileFor({0x10FFFD}), "");
+    EXPECT_EQ(fileFor({'a', 0x10FFFD}), "");
+}
+
+TEST_F(SystemFontsFor, StyleOfTheMainFont_IsPreferred) {
+    EXPECT_EQ(fileFor({'a'}, "DejaVu Sans:bold"), "DejaVuSans-Bold.ttf");
+    EXPECT_EQ(fileFor({'a'}, "DejaVu Serif:italic"), "DejaVuSerif-Italic.ttf");
+    EXPECT_EQ(fileFor({0xE01}, "DejaVu Sans:bold"), "Loma-Bold.ttf");
+    EXPECT_EQ(fileFor({0xE01}), "Loma.ttf");
+}
+
+TEST_F(SystemFontsFor, Emoji_AreFoundInColours) {
+    const std::string emoji = "NotoColorEmoji.ttf";
+    EXPECT_EQ(fileFor({0x1F600}), emoji) << "though DejaVu Sans has it";
+    EXPECT_EQ(fileFor({0x2764, 0xFE0F}), emoji);
+    EXPECT_EQ(fileFor({0x1F468, 0x200D, 0x1F469}), emoji);
+    EXPECT_EQ(fileFor({0x1F600, 0xFE0E}), "DejaVuSans.ttf") << "it asks for none";
+    EXPECT_EQ(fileFor({0x2764}), "DejaVuSans.ttf") << "a black heart";
+    EXPECT_EQ(fileFor({'1'}), "DejaVuSans.ttf");
+}
+
+TEST_F(SystemFontsFor, FontThatIsNotInstalled_HasAFallbackToo) {
+    const auto found = mFonts.findFor({'a'}, {"no/such.ttf"});
+    ASSERT_TRUE(found);
+    EXPECT_TRUE(Font(*found, 20).has('a'));
+}
+
+TEST_F(SystemFontsFor, ManyClusters_AreQuick) {
+    const FontFile like = mFonts.find("DejaVu Sans");
+    size_t found = 0;
+    for (uint32_t code = 0x4E00; code < 0x4E00 + 10000; ++code)
+        found += mFonts.findFor({code}, like) ? 1 : 0;  // each its own search: hours, were it
+    EXPECT_GT(found, 3000U);
+}
+
+TEST_F(SystemFontsFor, AsAFallback_EveryScriptIsSet) {
+    const FontFile main = mFonts.find("DejaVu Sans");
+    Fonts fonts{Font(main, 32)};
+    fonts.setFallback([&](const Cluster& cluster) { return mFonts.findFor(cluster, main); });
+    const TextLayout text(
+        fonts, decodeUtf8("abc नमस्ते สวัสดี 日本語 한국어 👍🏽"));
+    EXPECT_TRUE(text.missing().empty());
+    EXPECT_EQ(text.fontsUsed().front(), "DejaVu Sans Book");
+    EXPECT_GE(text.fontsUsed().size(), 6U);
 }
 
 }  // namespace
