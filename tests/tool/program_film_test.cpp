@@ -74,11 +74,11 @@ std::string probed(const std::string& film, const std::string& entries) {
                      "compact=p=0:nk=1", fileUrl(film)});
 }
 
-/// Two seconds of a moving test picture.
+/// A moving test picture.
 std::string makeClip(const std::string& path, const std::string& rate, const Words& codec,
-                     const std::string& size = "320x180") {
+                     const std::string& size = "320x180", const std::string& seconds = "2") {
     outputOf(Words{"ffmpeg", "-nostdin", "-v", "error", "-f", "lavfi", "-i",
-                   "testsrc2=duration=2:size=" + size + ":rate=" + rate} +
+                   "testsrc2=duration=" + seconds + ":size=" + size + ":rate=" + rate} +
              codec + Words{"-y", fileUrl(path)});
     return path;
 }
@@ -297,11 +297,37 @@ TEST_F(Films, BurntInto_CuesAreSeenInTheFramesThatBeginWithinTheirTimes) {
     }
 }
 
-TEST_F(Films, BurntInto_SoundIsKept) {
-    const std::string clip = mDir.file("clip.mp4");
-    outputOf({"ffmpeg", "-nostdin", "-v", "error", "-f", "lavfi", "-i",
-              "testsrc2=duration=2:size=320x180:rate=10", "-f", "lavfi", "-i", "sine=duration=2", "-c:v",
-              "libx264", "-c:a", "aac", "-y", fileUrl(clip)});
+TEST_F(Films, BurntInto_PixelsStayInTheirFormat) {
+    for (const char* pixels : {"yuv420p10le", "yuv422p", "yuv444p", "bgr0"}) {
+        const std::string clip =
+            makeClip(mDir.file("clip.mkv"), "5", {"-c:v", "ffv1", "-pix_fmt", pixels}, "64x64", "0.6");
+        const std::string film = mDir.file("film.mkv");
+        made({"--subtitles", mDir.write("a.srt", "00:00:00,200 --> 00:00:00,400\nGold\n"), "--preset",
+              "outline", "--size", "16", "--over", clip, "--codec", "ffv1", "-o", film});
+        EXPECT_EQ(probed(film, "stream=pix_fmt"), std::string(pixels) + "\n");
+        const std::string below = framesOf(clip, pixels);
+        const std::string frames = framesOf(film, pixels);
+        EXPECT_EQ(differences(frames, below, below.size() / 3), (std::vector<bool>{false, true, false}))
+            << pixels;
+        EXPECT_EQ(frames.compare(below.size() / 3, 64, below, below.size() / 3, 64), 0)
+            << pixels << ", above the cue";
+    }
+}
+
+TEST_F(Films, BurntInto_SoundIsKeptAlone) {
+    const std::string clip = mDir.file("clip.mkv");
+    outputOf({"ffmpeg", "-nostdin",
+              "-v",     "error",
+              "-f",     "lavfi",
+              "-i",     "testsrc2=duration=2:size=320x180:rate=10",
+              "-f",     "lavfi",
+              "-i",     "sine=duration=2",
+              "-i",     fileUrl(mDir.write("b.srt", kTwoCues)),
+              "-c:v",   "libx264",
+              "-c:a",   "aac",
+              "-c:s",   "srt",
+              "-y",     fileUrl(clip)});
+    ASSERT_EQ(probed(clip, "stream=codec_type"), "video\naudio\nsubtitle\n");
     const std::string film = mDir.file("film.mp4");
     made(asked({"--over", clip, "-o", film}));
     const auto sound = [](const std::string& of) {
@@ -309,30 +335,43 @@ TEST_F(Films, BurntInto_SoundIsKept) {
                          "copy", "-f", "md5", "pipe:1"});
     };
     EXPECT_EQ(sound(film), sound(clip));
-    EXPECT_EQ(probed(film, "stream=codec_name,pix_fmt,nb_read_frames").substr(0, 15), "h264|yuv420p|20");
+    EXPECT_EQ(probed(film, "stream=codec_name"), "h264\naac\n");
+    EXPECT_EQ(probed(film, "stream=nb_read_frames").substr(0, 3), "20\n");
     const std::string other = mDir.file("film.webm");
     made(asked({"--over", clip, "-o", other}));
     EXPECT_EQ(probed(other, "stream=codec_name"), "vp9\nopus\n");
 }
 
-TEST_F(Films, BurntInto_CuesHaveTheirColours) {
-    // In the other matrix green would be off by tens.
-    const std::string clip =
-        makeClip(mDir.file("clip.mkv"), "5", {"-c:v", "ffv1", "-pix_fmt", "yuv420p"}, "1280x720");
+/// In the other matrix of the two, green would be off by tens.
+TEST_F(Films, BurntInto_CuesHaveTheirColoursAsPlayersTakeThem) {
     const std::string style = mDir.write("s.json", R"({"color": "#20C040"})");
-    const std::string film = mDir.file("film.mkv");
-    // Blocks of ink: U+2588.
-    made({"--subtitles",
-          mDir.write("a.srt", "00:00:00,000 --> 00:00:02,000\n\xE2\x96\x88\xE2\x96\x88\n"), "--style",
-          style, "--size", "200", "--over", clip, "--codec", "ffv1", "-o", film});
-    const std::string frames =
-        outputOf({"ffmpeg", "-nostdin", "-v", "error", "-i", fileUrl(film), "-frames:v", "1", "-vf",
-                  "scale=in_color_matrix=bt709,format=rgb24", "-f", "rawvideo", "pipe:1"});
-    ASSERT_EQ(frames.size(), size_t{1280} * 720 * 3);
-    const size_t pixel = (size_t{600} * 1280 + 640) * 3;
-    EXPECT_NEAR(static_cast<uint8_t>(frames[pixel]), 0x20, 3);
-    EXPECT_NEAR(static_cast<uint8_t>(frames[pixel + 1]), 0xC0, 3);
-    EXPECT_NEAR(static_cast<uint8_t>(frames[pixel + 2]), 0x40, 3);
+    for (const auto& [size, matrix] : {std::pair{"320x180", "bt601"}, std::pair{"1280x720", "bt709"}}) {
+        const std::string clip =
+            makeClip(mDir.file("clip.mkv"), "5", {"-c:v", "ffv1", "-pix_fmt", "yuv420p"}, size, "0.2");
+        const std::string film = mDir.file("film.mkv");
+        // Blocks of ink, U+2588, as large as most of the frame.
+        made({"--subtitles", mDir.write("a.srt", "00:00:00,000 --> 00:00:02,000\n\xE2\x96\x88\n"),
+              "--style", style, "--size", "130", "--anchor", "center", "--over", clip, "--codec", "ffv1",
+              "-o", film});
+        const std::string pixel =
+            outputOf({"ffmpeg", "-nostdin", "-v", "error", "-i", fileUrl(film), "-vf",
+                      std::string("crop=2:2,scale=in_color_matrix=") + matrix + ",format=rgb24", "-f",
+                      "rawvideo", "pipe:1"});
+        ASSERT_GE(pixel.size(), 3U);
+        EXPECT_NEAR(static_cast<uint8_t>(pixel[0]), 0x20, 3) << size;
+        EXPECT_NEAR(static_cast<uint8_t>(pixel[1]), 0xC0, 3) << size;
+        EXPECT_NEAR(static_cast<uint8_t>(pixel[2]), 0x40, 3) << size;
+    }
+}
+
+TEST_F(Films, BurntInto_PixelsThatAreNotSquareAreNoted) {
+    const std::string clip =
+        makeClip(mDir.file("clip.mkv"), "5", {"-vf", "setsar=16/11", "-c:v", "ffv1"}, "320x180", "2");
+    const Outcome outcome = runVorelpaint(asked({"--over", clip, "-o", mDir.file("film.mkv")}));
+    EXPECT_EQ(outcome.exitCode, 0);
+    EXPECT_EQ(outcome.err,
+              "vorelpaint: note: the clip's pixels are not square: the text is stretched with its "
+              "pictures\n");
 }
 
 TEST_F(Films, BurntInto_ATurnedClipIsTurned) {
@@ -438,6 +477,9 @@ TEST_F(RefusedFilms, Clips_ThatCannotBeRead) {
     const std::string sound = mDir.file("sound.wav");
     outputOf(
         {"ffmpeg", "-nostdin", "-v", "error", "-f", "lavfi", "-i", "sine=duration=1", fileUrl(sound)});
+    const std::string fast = makeClip(mDir.file("fast.mkv"), "500", {"-c:v", "ffv1"}, "64x64", "0.1");
+    EXPECT_EQ(faultOf(asked(to + Words{"--over", fast})),
+              "'" + fast + "' has no steady frame rate; give one by --fps");
     EXPECT_EQ(faultOf(asked(to + Words{"--over", sound})),
               "cannot read '" + sound + "': it has no moving pictures");
 }
