@@ -119,6 +119,7 @@ void ChildProgram::become(std::vector<std::string>& words, Stream stream, int th
                          ::dup2(errors, STDERR_FILENO) >= 0 &&
                          (given < 0 || ::dup2(kept, kGivenFile) >= 0);
     std::vector<char*> argv;
+    argv.reserve(words.size() + 1);
     for (std::string& word : words)
         argv.push_back(word.data());
     argv.push_back(nullptr);

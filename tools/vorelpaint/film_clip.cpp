@@ -23,9 +23,9 @@ constexpr const char* kWhatIsAsked =
 /// What ffprobe tells of a file or of one stream, by the last part of the keys.
 using Told = std::map<std::string, std::string, std::less<>>;
 
-std::string valueOf(const Told& told, std::string_view key) {
+std::string_view valueOf(const Told& told, std::string_view key) {
     const auto found = told.find(key);
-    return found == told.end() ? "" : found->second;
+    return found == told.end() ? std::string_view() : found->second;
 }
 
 std::string unquoted(std::string_view value) {
@@ -72,7 +72,7 @@ bool isTurned(const Told& stream) {
 
 /// Where a clip does not say, players go by its height.
 std::string matrixOf(const Told& stream, int height) {
-    const std::string named = valueOf(stream, "color_space");
+    const std::string_view named = valueOf(stream, "color_space");
     if (named == "bt2020nc" || named == "bt2020c") return "bt2020";
     for (const char* known : {"bt709", "fcc", "bt470bg", "smpte170m", "smpte240m"}) {
         if (named == known) return known;
@@ -83,18 +83,18 @@ std::string matrixOf(const Told& stream, int height) {
 /// The clip's pixels are to stay what they are where no cue is: of the formats that can be blended, the
 /// first of which a part of the name tells. What has none of them, such as grey, is blended in the
 /// first.
-std::string blendingOf(const std::string& pixelFormat) {
+std::string blendingOf(std::string_view pixelFormat) {
     constexpr std::pair<std::string_view, const char*> kBlendings[]{
         {"420p1", "yuv420p10"}, {"p01", "yuv420p10"}, {"422p1", "yuv422p10"},
         {"422", "yuv422"},      {"444", "yuv444"},    {"gbr", "gbrp"},
         {"rgb", "gbrp"},        {"bgr", "gbrp"},      {"pal8", "gbrp"}};
     for (const auto& [part, blending] : kBlendings) {
-        if (pixelFormat.find(part) != std::string::npos) return blending;
+        if (pixelFormat.find(part) != std::string_view::npos) return blending;
     }
     return "yuv420";
 }
 
-std::optional<int64_t> millisecondsIn(const std::string& seconds) {
+std::optional<int64_t> millisecondsIn(std::string_view seconds) {
     constexpr Limits<double> kDurations{0, 1e9};
     const std::optional<double> number = numberIn<double>(seconds);
     if (!number || !contains(kDurations, *number)) return std::nullopt;
@@ -116,7 +116,7 @@ Clip pictured(const Told& stream) {
     clip.width = sideIn(stream, "width");
     clip.height = sideIn(stream, "height");
     if (isTurned(stream)) std::swap(clip.width, clip.height);
-    const std::string aspect = valueOf(stream, "sample_aspect_ratio");
+    const std::string_view aspect = valueOf(stream, "sample_aspect_ratio");
     clip.hasSquarePixels = aspect.empty() || aspect == "1:1" || aspect == "0:1" || aspect == "N/A";
     clip.rate = parseFrameRate(valueOf(stream, "r_frame_rate"));
     if (!clip.rate) clip.rate = parseFrameRate(valueOf(stream, "avg_frame_rate"));
@@ -133,8 +133,8 @@ Clip clipIn(std::string_view told) {
     std::vector<std::string> audioCodecs;
     std::map<int, Told> streams = streamsIn(told);
     for (const auto& [index, stream] : streams) {
-        const std::string kind = valueOf(stream, "codec_type");
-        if (kind == "audio") audioCodecs.push_back(valueOf(stream, "codec_name"));
+        const std::string_view kind = valueOf(stream, "codec_type");
+        if (kind == "audio") audioCodecs.emplace_back(valueOf(stream, "codec_name"));
         if (kind == "video" && !clip) clip = pictured(stream);
     }
     if (!clip) throw ToolError("it has no moving pictures");
