@@ -46,6 +46,15 @@ TEST(FilmClip, FirstPicturesAndAllSounds_AreTold) {
     EXPECT_FALSE(clip.isFullRange);
 }
 
+TEST(FilmClip, CoverOfASound_IsNoMovingPicture) {
+    std::string told = video("streams.stream.0.disposition.attached_pic=1\n");
+    EXPECT_EQ(faultOf(told), "it has no moving pictures");
+    told +=
+        "streams.stream.1.codec_type=\"video\"\nstreams.stream.1.width=64\n"
+        "streams.stream.1.height=48\nstreams.stream.1.disposition.attached_pic=0\n";
+    EXPECT_EQ(clipIn(told).width, 64);
+}
+
 TEST(FilmClip, TurnedPictures_HaveTheirSidesAsTheyAreSeen) {
     for (const char* degrees : {"90", "-90", "270"}) {
         const Clip clip = clipIn(video(

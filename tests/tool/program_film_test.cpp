@@ -273,7 +273,14 @@ TEST_F(Films, BurntInto_CuesAreSeenInTheFramesThatBeginWithinTheirTimes) {
     const std::vector<Kind> kinds{
         {"a.mkv", "24000/1001", {"-c:v", "ffv1", "-pix_fmt", "yuv420p"}, "yuv420p", 86400},
         {"b.mkv", "30", {"-c:v", "ffv1", "-pix_fmt", "yuv422p10le"}, "yuv422p10le", 230400},
-        {"c.mp4", "25", {"-c:v", "libx264", "-qp", "0"}, "yuv420p", 86400}};
+        {"c.mp4", "25", {"-c:v", "libx264", "-qp", "0"}, "yuv420p", 86400},
+        // Times that were cut to whole milliseconds, of a length that the file does not tell.
+        {"d.mkv",
+         "24000/1001",
+         {"-vf", "settb=1/1000,setpts=floor(N*1001/24)", "-vsync", "passthrough", "-enc_time_base",
+          "1/1000", "-c:v", "ffv1", "-pix_fmt", "yuv420p", "-live", "1"},
+         "yuv420p",
+         86400}};
     const std::vector<std::pair<int, int>> times{{200, 700}, {1000, 1033}, {1501, 1950}};
     for (const Kind& kind : kinds) {
         const std::string clip = makeClip(mDir.file(kind.name), kind.rate, kind.codec);

@@ -18,7 +18,7 @@ namespace {
 constexpr size_t kMaxToldBytes = size_t{1} << 20;
 constexpr const char* kWhatIsAsked =
     "stream=codec_type,codec_name,width,height,pix_fmt,r_frame_rate,avg_frame_rate,sample_aspect_ratio,"
-    "color_space,color_range:stream_side_data=rotation:format=duration";
+    "color_space,color_range:stream_disposition=attached_pic:stream_side_data=rotation:format=duration";
 
 /// What ffprobe tells of a file or of one stream, by the last part of the keys.
 using Told = std::map<std::string, std::string, std::less<>>;
@@ -135,7 +135,8 @@ Clip clipIn(std::string_view told) {
     for (const auto& [index, stream] : streams) {
         const std::string_view kind = valueOf(stream, "codec_type");
         if (kind == "audio") audioCodecs.emplace_back(valueOf(stream, "codec_name"));
-        if (kind == "video" && !clip) clip = pictured(stream);
+        const bool isCover = valueOf(stream, "attached_pic") == "1";
+        if (kind == "video" && !isCover && !clip) clip = pictured(stream);
     }
     if (!clip) throw ToolError("it has no moving pictures");
     clip->audioCodecs = std::move(audioCodecs);

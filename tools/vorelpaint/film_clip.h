@@ -23,7 +23,7 @@ struct Clip {
     std::vector<std::string> audioCodecs;  ///< as FFmpeg names them, one of each stream of sound
 };
 
-/// Asks ffprobe for the first stream of pictures and all of sound. Throws ToolError, naming the clip,
+/// Asks ffprobe for the first stream of moving pictures, not of a cover, and all of sound. Throws ToolError, naming the clip,
 /// when it cannot be read or has no pictures.
 Clip readClip(const std::string& path);
 

@@ -25,7 +25,7 @@ struct Container {
 
 const std::array<Container, 4>& containers() {
     static const std::array<Container, 4> all{
-        {{"mp4", "mp4", {"aac", "mp3", "ac3", "eac3", "alac", "opus", "flac"}, "aac"},
+        {{"mp4", "mp4", {"aac", "mp3", "ac3", "eac3", "alac", "opus"}, "aac"},
          {"mov",
           "mov",
           {"aac", "mp3", "ac3", "eac3", "alac", "pcm_s16le", "pcm_s16be", "pcm_s24le", "pcm_s24be",
@@ -115,7 +115,7 @@ std::string overlayFilter(const FilmPlan& plan) {
     const std::string toYuv =
         isRgb(*plan.clip) ? "" : "," + scaleTo(plan.clip->matrix, plan.clip->isFullRange);
     return "[1:v]settb=intb/2,setpts=PTS-1" + toYuv +
-           "[cues];[0:v:0][cues]overlay=x=0:y=" + std::to_string(plan.rows.top) +
+           "[cues];[0:V:0][cues]overlay=x=0:y=" + std::to_string(plan.rows.top) +
            ":format=" + plan.clip->blending + ":eof_action=pass";
 }
 
