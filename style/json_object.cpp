@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <functional>
 #include <locale>
 #include <nlohmann/json.hpp>
 #include <set>
@@ -87,8 +88,9 @@ bool contains(Range range, double value) {
     return value >= range.low && value <= range.high;
 }
 
-/// Refuses a second key of the same name: the later one would silently replace the earlier.
-class DuplicateKeys {
+/// Follows the parser. Refuses a second key of the same name: the later one would silently replace the
+/// earlier.
+class ParserGuard {
   public:
     bool operator()(int depth, Json::parse_event_t event, const Json& parsed) {
         const auto level = static_cast<size_t>(depth);
@@ -98,6 +100,11 @@ class DuplicateKeys {
                 countElement(level);
                 mLevels.resize(std::max(mLevels.size(), level + 2));
                 mLevels[level + 1] = {};
+                mLevel = level + 1;
+                break;
+            case Json::parse_event_t::object_end:
+            case Json::parse_event_t::array_end:
+                mLevel = level;
                 break;
             case Json::parse_event_t::value:
                 countElement(level);
@@ -109,6 +116,16 @@ class DuplicateKeys {
                 break;
         }
         return true;
+    }
+
+    /// The path of the value that comes next.
+    std::string nextPath() const {
+        if (mLevel == 0) return "";
+        const Level& level = mLevels[mLevel];
+        const std::string path = pathTo(mLevel);
+        return shortened(level.keys.empty() ? path + "[" + std::to_string(level.elements) + "]"
+                                            : under(path, escaped(level.key)),
+                         kMaxPath);
     }
 
   private:
@@ -144,21 +161,24 @@ class DuplicateKeys {
     }
 
     std::vector<Level> mLevels = std::vector<Level>(1);  ///< by depth; the first holds the root
+    size_t mLevel = 0;                                   ///< the innermost that is open
 };
 
 /// "[json.exception.parse_error.101] parse error at line 3, column 5: fault" without its preface.
-std::string syntaxFault(const std::string& message) {
-    const size_t line = message.find("line ");
-    if (line != std::string::npos) return message.substr(line);
-    const size_t bracket = message.find("] ");
-    return bracket == std::string::npos ? message : message.substr(bracket + 2);
+std::string withoutPreface(const std::string& message, const char* preface) {
+    const size_t at = message.find(preface);
+    return at == std::string::npos ? message : message.substr(at);
 }
 
 Json parse(std::string_view text) {
+    ParserGuard guard;
     try {
-        return Json::parse(text.begin(), text.end(), DuplicateKeys());
-    } catch (const Json::exception& error) {
-        throw StyleError("no valid JSON: " + syntaxFault(error.what()));
+        return Json::parse(text.begin(), text.end(), std::ref(guard));
+    } catch (const Json::parse_error& error) {
+        throw StyleError("no valid JSON: " + withoutPreface(error.what(), "line "));
+    } catch (const Json::out_of_range& error) {  // of a number, without its place
+        const std::string path = guard.nextPath();
+        throw StyleError((path.empty() ? "" : path + ": ") + withoutPreface(error.what(), "number "));
     }
 }
 
@@ -310,7 +330,12 @@ std::string JsonObject::string(std::string_view key) const {
 }
 
 std::string JsonObject::numeral(std::string_view key) const {
-    return find(*this, nodeAt(mObject.mNode), key, false, &Json::is_number, "a number")->dump();
+    const Json* value = find(*this, nodeAt(mObject.mNode), key, false, &Json::is_number, "a number");
+    // JSON knows one kind of number: 96.0 is as whole as 96.
+    constexpr double kMostWhole = 1e15;
+    const auto number = value->get<double>();
+    const bool isWhole = number == std::trunc(number) && std::abs(number) <= kMostWhole;
+    return isWhole ? std::to_string(static_cast<int64_t>(number)) : value->dump();
 }
 
 int JsonObject::choice(std::string_view key, const std::vector<std::string_view>& names,
@@ -318,8 +343,9 @@ int JsonObject::choice(std::string_view key, const std::vector<std::string_view>
     const Json* value = find(*this, nodeAt(mObject.mNode), key, fallback.has_value(), &Json::is_string,
                              "one of " + joined(names));
     if (value == nullptr) return *fallback;
-    const auto found = std::find(names.begin(), names.end(), value->get_ref<const std::string&>());
-    if (found == names.end()) fail(key, quoted(*value) + " is none of " + joined(names));
+    const auto& given = value->get_ref<const std::string&>();
+    const auto found = std::find(names.begin(), names.end(), given);
+    if (found == names.end()) fail(key, quoted(*value) + " is " + noneOf(given, names));
     return static_cast<int>(found - names.begin());
 }
 

@@ -43,7 +43,7 @@ class JsonValue {
 class JsonDocument {
   public:
     /// Throws StyleError with the line of a syntax error, or with the path of a key that stands twice in
-    /// one object.
+    /// one object or of a number that is larger than any can be.
     explicit JsonDocument(std::string_view text);
     ~JsonDocument();
     JsonDocument(const JsonDocument&) = delete;
@@ -78,7 +78,8 @@ class JsonObject {
     Length length(std::string_view key, const LengthRange& range,
                   std::optional<Length> fallback = {}) const;
 
-    std::string numeral(std::string_view key) const;  ///< a number as JSON spells it
+    /// A number as JSON spells it, a whole one without a fraction.
+    std::string numeral(std::string_view key) const;
 
     /// The position of the key's value, a string, among `names`.
     int choice(std::string_view key, const std::vector<std::string_view>& names,

@@ -10,6 +10,7 @@
 #include "style/colour.h"
 #include "style/error.h"
 #include "unicode/lines.h"
+#include "unicode/utf8.h"
 
 namespace vorelstyle {
 namespace {
@@ -47,8 +48,17 @@ class MarkupReader {
         } else if (mSource[mAt] == '&') {
             readEntity();
         } else {
-            add(mSource[mAt++]);
+            readCharacter();
         }
+    }
+
+    void readCharacter() {
+        const uint32_t code = mSource[mAt];
+        const bool isAllowed =
+            !vorelunicode::isControl(code) || code == '\t' || vorelunicode::endsLine(code);
+        if (!isAllowed) fail(mAt, "the control character " + vorelunicode::nameOf(code));
+        add(code);
+        ++mAt;
     }
 
     void readTag() {
@@ -74,15 +84,18 @@ class MarkupReader {
     void readEntity() {
         for (const Entity& entity : kEntities) {
             if (!startsWith(entity.name)) continue;
+            add(static_cast<unsigned char>(entity.character));
             mAt += entity.name.size();
-            return add(static_cast<unsigned char>(entity.character));
+            return;
         }
         fail(mAt, "& begins neither &lt; nor &gt; nor &amp;; & itself is written &amp;");
     }
 
+    /// Adds a character, which is written here, to the text.
     void add(uint32_t code) {
         const size_t at = mMarked.text.size();
         mMarked.text.push_back(code);
+        mMarked.places.push_back(mAt);
         if (mOpen.empty()) return;
         const uint32_t colour = mOpen.back().colour;
         std::vector<ColourRange>& ranges = mMarked.colours;
@@ -117,7 +130,7 @@ class MarkupReader {
         return tag.substr(0, tag.find_last_not_of(' ') + 1);
     }
 
-    [[noreturn]] void fail(size_t at, const char* fault) const {
+    [[noreturn]] void fail(size_t at, const std::string& fault) const {
         throw StyleError("markup, " + vorelunicode::placeName(mSource, at) + ": " + fault);
     }
 

@@ -25,4 +25,12 @@ std::string choices(std::string_view word, const Names& names, const std::string
     return "; did you mean " + meant + "? " + sentence + " " + joined(names);
 }
 
+/// What a refusal of a word says that is not among the few that may stand: "none of a, b", or, where one
+/// is resembled, "none of a, b; did you mean a?".
+template <typename Names>
+std::string noneOf(std::string_view word, const Names& names) {
+    const std::string meant = nearest(word, names);
+    return "none of " + joined(names) + (meant.empty() ? "" : "; did you mean " + meant + "?");
+}
+
 }  // namespace vorelstyle

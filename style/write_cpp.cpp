@@ -1,15 +1,14 @@
 #include "style/write_cpp.h"
 
 #include <array>
-#include <charconv>
 #include <cstdio>
 #include <ostream>
-#include <string_view>
 #include <utility>
 #include <variant>
 
 #include "style/error.h"
 #include "style/message.h"
+#include "style/note.h"
 #include "style/resolved_style.h"
 #include "style/stack.h"
 
@@ -20,20 +19,17 @@ constexpr size_t kMaxPatternPixels = size_t{1} << 16;
 constexpr size_t kBytesPerLine = 16;
 
 constexpr const char* kHowToPaint =
-    "/// In the order of painting. A look paints each of its spans (block, line, word or glyph) as a "
-    "run\n"
-    "/// into a transparent picture of its own, which, moved by the look's offset, is laid over what "
-    "is\n"
-    "/// painted before: each premultiplied channel becomes\n"
-    "/// source + destination * (255 - source alpha) / 255.\n";
+    R"(/// In the order of painting. A look paints each of its spans (block, line, word or glyph), in
+/// reading order, as a run into a transparent picture of its own, which, moved by the look's offset,
+/// is laid over what is painted before: each premultiplied channel becomes
+/// source + destination * (255 - source alpha) / 255, rounded to nearest.
+)";
 
 /// The shortest spelling that is read as the very same float: 0.6F, 100.
 std::string literal(float value) {
-    std::array<char, 32> text{};
-    const auto [end, error] = std::to_chars(text.data(), text.data() + text.size(), value);
-    const std::string_view digits(text.data(), static_cast<size_t>(end - text.data()));
-    const bool whole = digits.find_first_of(".e") == std::string_view::npos;
-    return std::string(digits) + (whole ? "" : "F");
+    const std::string digits = spelled(value);
+    const bool whole = digits.find_first_of(".e") == std::string::npos;
+    return digits + (whole ? "" : "F");
 }
 
 std::string literal(int value) {
@@ -132,10 +128,12 @@ class CallWriter {
         }
         mOut << "    // " << printable(e.image)
              << " as A, R, G, B\n    static unsigned char pixels[] = {";
-        for (size_t at = 0; at < image.pixels.size(); ++at)
-            mOut << (at % kBytesPerLine == 0 ? "\n        " : " ") << int{image.pixels[at]} << ',';
-        mOut << "\n    };\n    VFontEffect::VFBitmap pattern(" << image.width << ", " << image.height
-             << ", pixels, 4);\n";
+        for (size_t at = 0; at < image.pixels.size(); ++at) {
+            mOut << (at % kBytesPerLine == 0 ? "\n        " : " ") << literal(int{image.pixels[at]})
+                 << ',';
+        }
+        mOut << "\n    };\n    VFontEffect::VFBitmap pattern(" << literal(image.width) << ", "
+             << literal(image.height) << ", pixels, 4);\n";
     }
 
     std::ostream& mOut;
@@ -158,6 +156,10 @@ void writeLook(std::ostream& out, const std::string& name, const LookStyle& look
     out << "}\n";
 }
 
+std::string nameOfLook(const std::string& name, size_t position) {
+    return name + std::to_string(position + 1);
+}
+
 /// Writes the array that tells the looks and their places.
 void writePlaces(std::ostream& out, const std::string& name, const std::string& description,
                  const std::vector<Place>& places) {
@@ -174,8 +176,9 @@ void writePlaces(std::ostream& out, const std::string& name, const std::string& 
     out << kHowToPaint << "extern const " << array << ";\nconst " << array << " = {\n";
     for (size_t i = 0; i < places.size(); ++i) {
         const Place& place = places[i];
-        out << "    {" << name << i + 1 << ", " << place.offsetX << ", " << place.offsetY << ", \""
-            << kSpanNames[static_cast<size_t>(place.span)] << "\"},\n";
+        out << "    {" << nameOfLook(name, i) << ", " << literal(place.offsetX) << ", "
+            << literal(place.offsetY) << ", \"" << kSpanNames[static_cast<size_t>(place.span)]
+            << "\"},\n";
     }
     out << "};\n";
 }
@@ -192,7 +195,7 @@ void writeCpp(std::ostream& out, const std::string& name, const Style& style,
         withFaultsUnder(faultPrefix(style.name) + lookPath(style, i), [&] {
             const TextPaint text = textPaintOf(style, i, fill, textOpacity);
             const bool takesStyles = isOne && look.description.empty();
-            writeLook(out, isOne ? name : name + std::to_string(i + 1), look,
+            writeLook(out, isOne ? name : nameOfLook(name, i), look,
                       takesStyles ? style.description : look.description, text, load);
         });
         if (!isOne) out << '\n';

@@ -1,9 +1,10 @@
 #include "text/canvas.h"
 
-#include <cstdint>
+#include <algorithm>
 #include <string>
 
 #include "text/error.h"
+#include "text/units.h"
 
 namespace voreltext {
 namespace {
@@ -16,11 +17,6 @@ int rowOf(Anchor anchor) {
     return static_cast<int>(anchor) / 3;
 }
 
-/// Half of a number, rounded down also below 0.
-int halved(int number) {
-    return number >= 0 ? number / 2 : (number - 1) / 2;
-}
-
 /// One side of a canvas: its length and the place of the text's origin.
 struct Side {
     int length;
@@ -28,21 +24,23 @@ struct Side {
 };
 
 struct Extent {
-    int begin;
-    int end;
-    int before;  ///< of the effects
-    int after;
+    int64_t begin;
+    int64_t end;
+    int64_t before;  ///< of the effects
+    int64_t after;
 };
 
 Side sideOf(std::optional<int> asked, const CanvasRequest& request, int third, const Extent& box) {
-    const int length = box.end - box.begin;
+    const int64_t length = box.end - box.begin;
+    const int64_t margin = request.margin;
+    const int64_t padding = request.padding;
     if (!asked) {
-        const int before = box.before + request.padding;
-        return {before + length + box.after + request.padding, before - box.begin};
+        const int64_t before = box.before + padding;
+        return {notTooFar(before + length + box.after + padding), notTooFar(before - box.begin)};
     }
-    const int free = *asked - 2 * request.margin - length;
-    const int shift = third == 0 ? 0 : third == 1 ? halved(free) : free;
-    return {*asked, request.margin + shift - box.begin};
+    const int64_t free = *asked - 2 * margin - length;
+    const int64_t shift = third == 0 ? 0 : third == 1 ? floorOf(free, 2) : free;
+    return {*asked, notTooFar(margin + shift - box.begin)};
 }
 
 std::optional<int> within(std::optional<int> length, int margin) {
@@ -54,6 +52,10 @@ std::optional<int> within(std::optional<int> length, int margin) {
 }
 
 }  // namespace
+
+int notTooFar(int64_t place) {
+    return static_cast<int>(std::clamp<int64_t>(place, -kFarAway, kFarAway));
+}
 
 bool Room::holds(const Box& box) const {
     return box.width() <= width.value_or(box.width()) && box.height() <= height.value_or(box.height());

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <functional>
 #include <optional>
 
@@ -12,9 +13,15 @@ namespace voreltext {
 struct Canvas {
     int width;
     int height;
-    int x;
+    int x;  ///< may lie outside, and beyond kFarAway counts as there
     int y;
 };
+
+/// Farther from a picture than any text reaches.
+constexpr int kFarAway = 1 << 30;
+
+/// The place, or the nearest one within kFarAway.
+int notTooFar(int64_t place);
 
 /// Which part of the canvas a text's box stands at.
 enum class Anchor { topLeft, top, topRight, left, center, right, bottomLeft, bottom, bottomRight };
@@ -41,7 +48,7 @@ Room roomOf(const CanvasRequest& request);
 /// Where a text whose box is `box` stands, with the pixels `effects` around it. In a width or height
 /// that is asked for the box stands at the anchor, an odd pixel on its right or below, and the effects
 /// reach into the margin; it may be larger than its room. Throws TextError for a picture that is too
-/// large, or without pixels.
+/// large, or of a negative size.
 Canvas placedOn(const CanvasRequest& request, const Box& box, const Margins& effects);
 
 /// The largest whole size from 1 to `size` that fits. `fits` is asked for some of them, and it is taken

@@ -75,6 +75,10 @@ Font& Font::operator=(Font&& other) noexcept {
 }
 
 void Font::open(const Source& source, const std::vector<FontVariation>& variations) {
+    if (mSizePx < 1 || mSizePx > kMostSize) {
+        throw TextError("the size of a font is " + std::to_string(mSizePx) + "; it may be 1 to " +
+                        std::to_string(kMostSize) + " pixels");
+    }
     if (FT_Init_FreeType(&mLibrary) != 0) throw TextError("cannot start FreeType");
     try {
         openFaces(source);
@@ -84,12 +88,12 @@ void Font::open(const Source& source, const std::vector<FontVariation>& variatio
         if (mLineHeight <= 0 || mAscender <= mDescender) {
             throw TextError(source.subject + "a font without vertical metrics");
         }
+        mName = mFace->family_name == nullptr ? "unnamed" : mFace->family_name;
+        if (mFace->style_name != nullptr) mName.append(" ").append(mFace->style_name);
     } catch (...) {
         FT_Done_FreeType(mLibrary);
         throw;
     }
-    mName = mFace->family_name == nullptr ? "unnamed" : mFace->family_name;
-    if (mFace->style_name != nullptr) mName.append(" ").append(mFace->style_name);
 }
 
 /// A second face for the pictures of one that has outlines: each keeps its size. What has pictures in

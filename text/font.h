@@ -31,14 +31,16 @@ struct FontVariation {
 /// An open font at one size. For one thread at a time, with all that is laid out in it.
 class Font {
   public:
-    /// `sizePx` is the size of the em in pixels, at least 1. Axes that are not named stay as the font
-    /// has them; of one that is named twice the last value counts. Throws TextError when the file is no
-    /// font with outlines or pictures in colour, when it has no vertical metrics, and when it has no
-    /// such axis or the value is beyond the axis's range.
+    /// `sizePx` is the size of the em in pixels, 1 to kMostSize. Axes that are not named stay as the
+    /// font has them; of one that is named twice the last value counts. Throws TextError when the file
+    /// is no font with outlines or pictures in colour, when it has no vertical metrics, when it has no
+    /// such axis or the value is beyond the axis's range, and for a size out of its own.
     Font(const FontFile& file, int sizePx, const std::vector<FontVariation>& variations = {});
 
     /// The same of bytes, which must outlive the font.
     Font(const FontBytes& bytes, int sizePx, const std::vector<FontVariation>& variations = {});
+
+    static constexpr int kMostSize = 16384;
 
     ~Font();
     Font(Font&& other) noexcept;

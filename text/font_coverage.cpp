@@ -76,8 +76,7 @@ FontPattern FontCoverage::wantedLike(const FontFile& like) const {
 void FontCoverage::rank(Ranking& ranking, const FontFile& like) const {
     const FontPattern wanted = wantedLike(like);
     if (!wanted) return;
-    FcConfigSubstitute(mConfig, wanted.get(), FcMatchPattern);
-    FcDefaultSubstitute(wanted.get());
+    complete(mConfig, wanted.get());
     FcResult result = FcResultNoMatch;
     ranking.fonts.reset(FcFontSort(mConfig, wanted.get(), FcFalse, nullptr, &result));
     if (!ranking.fonts) return;

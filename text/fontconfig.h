@@ -34,4 +34,14 @@ inline FontFile fileOf(const FcPattern* pattern) {
     return {textOf(pattern, FC_FILE), index};
 }
 
+/// Completes a request as the configuration has it. fontconfig would add the language of the
+/// environment, by which it prefers fonts, and does so unless it finds an undetermined one; every
+/// environment has English instead, as the one without a language has.
+inline void complete(FcConfig* config, FcPattern* wanted) {
+    for (const char* language : {"en", "und"})
+        FcPatternAddWeak(wanted, FC_LANG, {FcTypeString, {fcText(language)}}, FcTrue);
+    FcConfigSubstitute(config, wanted, FcMatchPattern);
+    FcDefaultSubstitute(wanted);
+}
+
 }  // namespace voreltext

@@ -102,8 +102,8 @@ class LayerPainter {
         const Frame frame{part.ink, marginsOf(mEffects), faintEndOf(mEffects)};
         Image picture = paintRun(mEffects, part, frame);
         colour(picture, part, frame);
-        const int x = place.x + mLayer.x;
-        const int y = place.y + mLayer.y;
+        const int x = notTooFar(int64_t{place.x} + mLayer.x);
+        const int y = notTooFar(int64_t{place.y} + mLayer.y);
         layOver(canvas, picture, x - frame.shiftX(), y - frame.shiftY());
         if (!mLayer.takesPictures) return;
         for (const GlyphMask& mask : part.masks)
@@ -155,6 +155,7 @@ std::vector<std::vector<size_t>> spansOf(const TextLayout& text, Span span) {
     for (size_t i = 0; i < text.glyphCount(); ++i)
         places[placeOf(text.glyph(i), span)].push_back(i);
     std::vector<std::vector<size_t>> spans;
+    spans.reserve(places.size());
     for (auto& [place, glyphs] : places)
         spans.push_back(std::move(glyphs));
     return spans;
@@ -165,8 +166,11 @@ Margins marginsOf(const std::vector<Layer>& layers) {
     for (const Layer& layer : layers) {
         VFEffect effects(*layer.effects);
         const Margins own = marginsOf(effects);
-        most = {std::max(most.left, own.left - layer.x), std::max(most.top, own.top - layer.y),
-                std::max(most.right, own.right + layer.x), std::max(most.bottom, own.bottom + layer.y)};
+        const int64_t x = layer.x;
+        const int64_t y = layer.y;
+        most = {std::max(most.left, notTooFar(own.left - x)), std::max(most.top, notTooFar(own.top - y)),
+                std::max(most.right, notTooFar(own.right + x)),
+                std::max(most.bottom, notTooFar(own.bottom + y))};
     }
     return most;
 }

@@ -37,7 +37,8 @@ struct Layer {
     Span span = Span::block;  ///< spans are painted in reading order, later ones over earlier ones
 
     /// In the order of the text, none over another. A span is painted once more for each colour in it,
-    /// one after the other, and the glyphs of that colour are taken from there; all else stays.
+    /// one after the other, and the glyphs of that colour are taken from there; all else stays. A glyph
+    /// of several characters has the colour of the first.
     std::vector<ColouredPart> colours = {};
     float fillOpacity = 1;  ///< of these colours
 

@@ -87,12 +87,12 @@ std::optional<SetLine> LineSetter::longestLine(const Source& source, Wrapping::E
     if (source.wrapping.width(begin, end) > atMost) return std::nullopt;
     SetLine line = part(source, begin, end);
     while (line.width > width) {
-        end = source.wrapping.endBefore(ends, end, begin);
+        end = source.wrapping.shorter(ends, begin, end);
         if (end == begin) return std::nullopt;
         line = part(source, begin, end);
     }
     while (end < source.paragraph.codes.size()) {
-        end = source.wrapping.endAfter(ends, end);
+        end = source.wrapping.longer(ends, begin, end);
         if (source.wrapping.width(begin, end) > atMost) break;
         SetLine longer = part(source, begin, end);
         if (longer.width > width) break;
@@ -109,9 +109,7 @@ SetLine LineSetter::part(const Source& source, size_t begin, size_t end) {
     const Paragraph& whole = source.paragraph;
     std::vector<uint32_t> codes(whole.codes.begin() + from, whole.codes.begin() + to);
     std::vector<size_t> fonts(source.fonted.fonts.begin() + from, source.fonted.fonts.begin() + to);
-    const bool isHyphenated = end < whole.codes.size() && codes.size() > 1 &&
-                              whole.codes[end - 1] == vorelunicode::kSoftHyphen;
-    if (isHyphenated) {
+    if (source.wrapping.isHyphenated(end) && codes.size() > 1) {
         fonts.back() = fonts[fonts.size() - 2];
         codes.back() = hyphenOf(mFonts[fonts.back()]).value_or(codes.back());
     }

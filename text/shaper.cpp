@@ -60,7 +60,6 @@ void Shaper::shapeItem(const ShapingRun& run, const ShapingItem& item) {
     // Of the line: what is around the item is its context.
     hb_buffer_set_flags(buffer, static_cast<hb_buffer_flags_t>(HB_BUFFER_FLAG_BOT | HB_BUFFER_FLAG_EOT));
     hb_buffer_set_script(buffer, static_cast<hb_script_t>(item.script));
-    hb_buffer_set_language(buffer, hb_language_get_default());
     hb_buffer_set_direction(buffer, item.isRightToLeft ? HB_DIRECTION_RTL : HB_DIRECTION_LTR);
     hb_shape(fontFor(item.font), buffer, mHarfBuzz->features.data(),
              static_cast<unsigned int>(mHarfBuzz->features.size()));

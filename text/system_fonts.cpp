@@ -238,8 +238,7 @@ FontFile SystemFonts::find(const std::string& request) const {
 
     const FontPattern completed(FcPatternDuplicate(wanted.get()));
     if (!completed) throw std::bad_alloc();
-    FcConfigSubstitute(config, completed.get(), FcMatchPattern);
-    FcDefaultSubstitute(completed.get());
+    complete(config, completed.get());
     FcResult result = FcResultNoMatch;
     const FontPattern font(FcFontMatch(config, completed.get(), &result));
     if (!font || !hasFamily(font.get(), fcText(family))) refuse();

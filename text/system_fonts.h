@@ -10,6 +10,7 @@
 namespace voreltext {
 
 /// The fonts that are installed, as fontconfig knows them; the one part of this library that needs it.
+/// They are chosen alike whatever the language of the environment.
 /// For one thread at a time.
 class SystemFonts {
   public:

@@ -13,11 +13,13 @@ Wrapping::Wrapping(const Paragraph& paragraph, const std::vector<ShapedGlyph>& g
     measure(glyphs);
     const std::vector<bool> breaks = lineBreaks(codes);
     mWords.resize(places);
+    mHyphens.resize(places);
     mInkEnds.resize(places);
     for (size_t at = 1; at < places; ++at) {
+        const bool isHyphen = codes[at - 1] == vorelunicode::kSoftHyphen;
         // A ligature may bridge a soft hyphen, which is asked to part it.
-        const bool isWhole = mClusters[at] || codes[at - 1] == vorelunicode::kSoftHyphen;
-        mWords[at] = breaks[at - 1] && isWhole;
+        mWords[at] = breaks[at - 1] && (mClusters[at] || isHyphen);
+        mHyphens[at] = isHyphen && at + 1 < places;
         mInkEnds[at] = vorelunicode::isBlank(codes[at - 1]) ? mInkEnds[at - 1] : at;
     }
 }
@@ -66,6 +68,28 @@ size_t Wrapping::endBefore(Ends ends, size_t end, size_t begin) const {
     while (end > begin && !isEnd(ends, end))
         --end;
     return end;
+}
+
+/// Whether the longer part shows nothing that the shorter one does not.
+bool Wrapping::isAsWide(size_t begin, size_t end, size_t longer) const {
+    return width(begin, end) == width(begin, longer) && mHyphens[end] >= mHyphens[longer];
+}
+
+size_t Wrapping::longer(Ends ends, size_t begin, size_t end) const {
+    size_t at = endAfter(ends, end);
+    size_t next = endAfter(ends, at);
+    while (next > at && isAsWide(begin, at, next)) {
+        at = next;
+        next = endAfter(ends, at);
+    }
+    return at;
+}
+
+size_t Wrapping::shorter(Ends ends, size_t begin, size_t end) const {
+    size_t at = endBefore(ends, end, begin);
+    while (at > begin && isAsWide(begin, at, end))
+        at = endBefore(ends, at, begin);
+    return at;
 }
 
 }  // namespace voreltext

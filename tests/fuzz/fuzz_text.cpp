@@ -34,6 +34,7 @@ Fonts& fonts() {
 
 void demandRanges(const MarkedText& marked, size_t sourceLength) {
     demand(marked.text.size() <= sourceLength, "markup adds characters");
+    demand(marked.places.size() == marked.text.size(), "a character has no place");
     size_t before = 0;
     for (const ColourRange& range : marked.colours) {
         demand(before <= range.begin && range.begin < range.end, "ranges overlap or are empty");

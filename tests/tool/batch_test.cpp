@@ -109,6 +109,8 @@ TEST(Batch, FitWithoutASide_IsRefused) {
 TEST(Batch, Numbers_AreReadAsTheCommandLineReadsThem) {
     EXPECT_EQ(jobOf(R"("opacity": 1e-1)").opacity, 0.1F);
     EXPECT_EQ(jobOf(R"("effect-scale": 0.7)").effectScale, 0.7F);
+    EXPECT_EQ(jobOf(R"("size": 96.0)").size, 96);
+    EXPECT_EQ(jobOf(R"("width": 1e3)").canvas.width, 1000);
 }
 
 TEST(Batch, Style_IsAFileOrAnObject) {

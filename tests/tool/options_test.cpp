@@ -77,6 +77,8 @@ TEST(Options, Sizes_AreThoseOfASheet) {
     EXPECT_EQ(faultOf({"--sheet", "--sizes", "24,0", "A"}),
               "--sizes: '0' is no whole number from 1 to 1000");
     EXPECT_EQ(faultOf({"--sheet", "--sizes", "", "A"}), "--sizes: '' is no list of 1 to 16 sizes");
+    std::vector<const char*> batch{"vorelpaint", "--batch", "a.jsonl", "--sizes", "24"};
+    EXPECT_THROW(parseOptions(static_cast<int>(batch.size()), batch.data()), ToolError);
     EXPECT_EQ(faultOf({"--sizes", "24", "A"}),
               "--sizes are the columns of a --sheet; the size of one picture is --size");
 }
@@ -90,6 +92,8 @@ TEST(Options, CanvasThatDoesNotGoTogether_IsRefused) {
         faultOf({"--anchor", "middle", "A"}),
         "--anchor: 'middle' is none of top-left, top, top-right, left, center, right, bottom-left, "
         "bottom, bottom-right");
+    EXPECT_EQ(faultOf({"--fit", "shrnk", "A"}),
+              "--fit: 'shrnk' is none of none, shrink, wrap; did you mean shrink?");
 }
 
 TEST(Options, Colours_MayBeShort) {

@@ -297,6 +297,25 @@ TEST(Notes, FaultStandsAlone) {
     EXPECT_EQ(dir.list(), (Words{"a.json", "b.json"}));
 }
 
+TEST(Notes, OfASheet_AreToldOnce) {
+    const TempDir dir;
+    const auto notesOf = [&](const Words& words, const char* note) {
+        Words arguments{"--sheet", "-o", dir.file("a.png")};
+        arguments.insert(arguments.end(), words.begin(), words.end());
+        const Outcome outcome = runVorelpaint(arguments);
+        EXPECT_EQ(outcome.exitCode, 0) << outcome.err;
+        int count = 0;
+        for (size_t at = outcome.err.find(note); at != std::string::npos;
+             at = outcome.err.find(note, at + 1))
+            ++count;
+        return count;
+    };
+    EXPECT_EQ(notesOf({"--sizes", "20,40", "a\xF0\x93\x80\x80"}, "no font has U+13000"), 1);
+    const std::string high = "\xC3\x81\n\xC3\x81";
+    EXPECT_EQ(notesOf({"--box", "line", "--line-height", "0.5", high}, "cuts pixels"), 1);
+    EXPECT_EQ(notesOf({"--box", "ink", "--line-height", "0.5", high}, "cuts pixels"), 0);
+}
+
 TEST(Strict, Batch_FailsTheJobAlone) {
     const TempDir dir;
     const std::string jobs = dir.write(
@@ -351,6 +370,15 @@ TEST(Markup, ThatDoesNotClose_IsRefusedWithItsPlace) {
     const TempDir dir;
     EXPECT_EQ(coloursOf(painted(dir, {"one <c #f80>"})), std::set<std::string>{"000000"})
         << "without --markup";
+}
+
+TEST(Markup, Places_AreThoseOfTheWrittenText) {
+    const std::string missing = "<c #f80>a</c>\xF0\x93\x80\x80";
+    EXPECT_EQ(reported({"--markup", missing})["missing"][0]["first"], "line 1, character 14");
+    EXPECT_NE(faultOf({"--strict", "--markup", missing}).find("(line 1, character 14)"),
+              std::string::npos);
+    EXPECT_NE(faultOf({"--width", "60", "--markup", "i<c #f80>W</c>"}).find("line 1, character 10"),
+              std::string::npos);
 }
 
 TEST(Markup, CoveredByAnOpaqueEffect_IsNoted) {

@@ -75,6 +75,15 @@ TEST(Settings, Descriptions_NameTheRangeThatIsTaken) {
     EXPECT_EQ(numbers, 8U);
 }
 
+TEST(Settings, DescriptionsOfLists_NameTheirRanges) {
+    const auto tells = [](const char* name, const char* range) {
+        return settingNamed(name).description.find(range) != std::string::npos;
+    };
+    EXPECT_TRUE(tells("font", "up to 16 times"));
+    EXPECT_TRUE(tells("sizes", "1 to 16 of 1 to 1000 pixels"));
+    EXPECT_TRUE(tells("letter-spacing", "-200 to 200"));
+}
+
 TEST(Help, NamesTheLimits) {
     const std::string help = helpFooter();
     for (const char* limit : {"16384 pixels on a side", "33554432 in all", "4096 pixels on a side",

@@ -43,8 +43,8 @@ const std::vector<std::string>& exampleCommands() {
     return commands;
 }
 
-const std::vector<Note>& notes() {
-    static const std::vector<Note> all{
+const std::vector<Topic>& topics() {
+    static const std::vector<Topic> all{
         {"Style files",
          "A style file is a JSON object with one object per effect (outerShadow, innerShadow, "
          "outerGlow, innerGlow, linearGradient, radialGradient, stroke, pattern, text, bevel, "
@@ -125,8 +125,8 @@ std::string helpFooter() {
     std::string footer = "Examples:";
     for (const std::string& command : exampleCommands())
         footer += "\n  " + command;
-    for (const Note& note : notes())
-        footer += "\n\n" + note.heading + ":\n" + wrapped(note.text, kHelpWidth, 2);
+    for (const Topic& topic : topics())
+        footer += "\n\n" + topic.heading + ":\n" + wrapped(topic.text, kHelpWidth, 2);
     return footer;
 }
 

@@ -11,13 +11,13 @@ constexpr const char* kPurpose = "Paints text with effects into a PNG file.";
 const std::vector<std::string>& exampleCommands();
 
 /// A paragraph under its heading.
-struct Note {
+struct Topic {
     std::string heading;
     std::string text;  ///< one line, to be wrapped
 };
-const std::vector<Note>& notes();
+const std::vector<Topic>& topics();
 
-/// Examples and notes as they end the help.
+/// Examples and topics as they end the help.
 std::string helpFooter();
 
 }  // namespace vorelpaint

@@ -35,10 +35,10 @@ std::string escaped(const std::string& text) {
 
 /// A paragraph in lines of a decent length. A line that begins with a full stop would be a command.
 std::string paragraph(const std::string& text) {
-    std::istringstream lines(wrapped(text, kLineWidth, 0));
+    std::istringstream lines(wrapped(escaped(text), kLineWidth, 0));
     std::string roff;
     for (std::string line; std::getline(lines, line);)
-        roff += (line.front() == '.' ? "\\&" : "") + escaped(line) + "\n";
+        roff += (line.front() == '.' ? "\\&" : "") + line + "\n";
     return roff;
 }
 
@@ -107,8 +107,8 @@ std::string manualPage() {
             "]\n";
     roff += ".SH DESCRIPTION\n" + paragraph(kPurpose);
     roff += allSettings();
-    for (const Note& note : notes())
-        roff += ".SH " + upperCase(note.heading) + "\n" + paragraph(note.text);
+    for (const Topic& topic : topics())
+        roff += ".SH " + upperCase(topic.heading) + "\n" + paragraph(topic.text);
     return roff + allExamples();
 }
 

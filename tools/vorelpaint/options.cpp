@@ -21,11 +21,12 @@ namespace vorelpaint {
 namespace {
 
 /// What cannot be asked for together, beside what checkCombination explains.
-constexpr std::array<std::pair<const char*, const char*>, 32> kExclusions{{
+constexpr std::array<std::pair<const char*, const char*>, 33> kExclusions{{
     {"--text-file", "TEXT"},
     {"--preset", "--style"},
     {"--batch", "--output"},
     {"--batch", "--sheet"},
+    {"--batch", "--sizes"},
     {"--batch", "--explain"},
     {"--batch", "--write-cpp"},
     {"--batch", "--print-key"},

@@ -13,14 +13,27 @@
 #include "report.h"
 
 namespace vorelpaint {
-namespace {
 
 using voreltext::Box;
 using voreltext::Canvas;
 using voreltext::Image;
 using voreltext::Margins;
 
-/// Notes what of the text and its effects, which are `margins` around the ink, the canvas cuts off.
+Composition::Composition(const Options& options)
+    : mSource(options),
+      mText(setToFit(options, mSource)),
+      mLooks(options, chosenStyle(options), mText.size(), mSource.colours(), mNotes.taker()),
+      mMargins(marginsOf(mLooks.layers())),
+      mCanvas(placedOn(options.canvas, mText.box(), mMargins)) {
+    noteMissing(mText.layout(), mSource, mNotes.taker());
+    noteCut(mCanvas, mText.layout().inkBox(), mMargins, mNotes.taker());
+    if (options.strict) mNotes.refuse();
+}
+
+Image Composition::paint() const {
+    return voreltext::paint(mLooks.layers(), mText.layout(), mCanvas);
+}
+
 void noteCut(const Canvas& canvas, const Box& ink, const Margins& margins, const Note& note) {
     struct Side {
         const char* name;
@@ -37,23 +50,6 @@ void noteCut(const Canvas& canvas, const Box& ink, const Margins& margins, const
         places += (places.empty() ? "" : ", ") + std::to_string(side.beyond) + " " + side.name;
     }
     if (!places.empty()) note("the picture cuts pixels of the text or its effects off: " + places);
-}
-
-}  // namespace
-
-Composition::Composition(const Options& options)
-    : mSource(chosenText(options)),
-      mText(setToFit(options, mSource.text)),
-      mLooks(options, chosenStyle(options), mText.size(), mSource.colours, mNotes.taker()),
-      mMargins(marginsOf(mLooks.layers())),
-      mCanvas(placedOn(options.canvas, mText.box(), mMargins)) {
-    noteMissing(mText.layout(), mSource.text, mNotes.taker());
-    noteCut(mCanvas, mText.layout().inkBox(), mMargins, mNotes.taker());
-    if (options.strict) mNotes.refuse();
-}
-
-Image Composition::paint() const {
-    return voreltext::paint(mLooks.layers(), mText.layout(), mCanvas);
 }
 
 void writePicture(const Options& options, Image picture) {

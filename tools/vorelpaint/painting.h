@@ -18,7 +18,7 @@ class Composition {
     explicit Composition(const Options& options);
 
     const HeldNotes& notes() const { return mNotes; }
-    const std::vector<uint32_t>& source() const { return mSource.text; }  ///< without markup
+    const SourceText& source() const { return mSource; }
     const SetText& text() const { return mText; }
     const LayerSet& looks() const { return mLooks; }
     const voreltext::Margins& margins() const { return mMargins; }
@@ -28,12 +28,16 @@ class Composition {
 
   private:
     HeldNotes mNotes;
-    vorelstyle::MarkedText mSource;
+    SourceText mSource;
     SetText mText;
     LayerSet mLooks;
     voreltext::Margins mMargins;
     voreltext::Canvas mCanvas;
 };
+
+/// Notes what of the text and its effects, which are `margins` around the ink, the canvas cuts off.
+void noteCut(const voreltext::Canvas& canvas, const voreltext::Box& ink,
+             const voreltext::Margins& margins, const Note& note);
 
 /// The picture on its background into its file.
 void writePicture(const Options& options, voreltext::Image picture);

@@ -25,12 +25,12 @@ constexpr Limits<float> kLineHeight{0.5F, 10.0F};
 constexpr Limits<float> kLetterSpacing{-200.0F, 200.0F};  ///< pixels, or percent of the font size
 constexpr Limits<float> kEffectScale{0.05F, 20.0F};
 constexpr Limits<float> kOpacity{0.0F, 1.0F};
+constexpr Limits<size_t> kSheetSizes{1, 16};  ///< how many a sheet has
 
 constexpr Limits<int> kFade{0, 60000};  ///< milliseconds
 constexpr Limits<int64_t> kFrameRates{1, FrameRate::kMost};
 
 constexpr size_t kMostFonts = 16;  ///< that a text asks in turn
-constexpr size_t kMostSheetSizes = 16;
 constexpr size_t kMaxTextBytes = size_t{1} << 16;
 constexpr size_t kMaxStyleBytes = size_t{1} << 17;
 constexpr size_t kMaxJobBytes = size_t{1} << 18;  ///< room for the largest text and the largest style

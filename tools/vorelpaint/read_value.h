@@ -12,6 +12,7 @@
 
 #include "error.h"
 #include "ranges.h"
+#include "style/vorelstyle.h"
 
 /// How the values of settings are spelled. What is none of them throws ToolError: "'0' is no whole
 /// number from 1 to 1000".
@@ -59,10 +60,12 @@ std::string listed(const Words& words, const char* separator) {
 
 template <typename Words>
 auto wordAmong(const Words& words, const std::string& given) {
+    std::vector<std::string_view> names;
     for (const auto& [word, value] : words) {
         if (given == word) return value;
+        names.emplace_back(word);
     }
-    refuse(given, "none of " + listed(words, ", "));
+    refuse(given, vorelstyle::noneOf(given, names));
 }
 
 /// The parts of a list in one text, between its commas.

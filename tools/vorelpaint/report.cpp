@@ -5,7 +5,6 @@
 #include <string>
 #include <vector>
 
-#include "unicode/lines.h"
 #include "unicode/utf8.h"
 
 namespace vorelpaint {
@@ -47,11 +46,11 @@ Json lineJson(const Line& line, const std::vector<uint32_t>& text, const Canvas&
             {"ink", boxJson(line.ink, canvas)}};
 }
 
-Json missingJson(const MissingCharacter& missing, const std::vector<uint32_t>& text) {
+Json missingJson(const MissingCharacter& missing, const SourceText& source) {
     return {{"code", vorelunicode::nameOf(missing.code)},
             {"text", vorelunicode::encoded(missing.code)},
             {"count", missing.count},
-            {"first", vorelunicode::placeName(text, missing.first)}};
+            {"first", source.placeName(missing.first)}};
 }
 
 }  // namespace
@@ -59,7 +58,6 @@ Json missingJson(const MissingCharacter& missing, const std::vector<uint32_t>& t
 std::string reportOf(const Options& options, const Composition& composition) {
     const Canvas& canvas = composition.canvas();
     const voreltext::TextLayout& layout = composition.text().layout();
-    const std::vector<uint32_t>& text = composition.source();
     Json report;
     if (options.output) report["output"] = *options.output;
     report["width"] = canvas.width;
@@ -71,12 +69,12 @@ std::string reportOf(const Options& options, const Composition& composition) {
     report["margins"] = marginsJson(composition.margins());
     report["lines"] = Json::array();
     for (const Line& line : layout.lines())
-        report["lines"].push_back(lineJson(line, text, canvas));
+        report["lines"].push_back(lineJson(line, composition.source().text(), canvas));
     report["key"] = vorelstyle::hexadecimal(composition.looks().stack().key());
     report["fonts"] = layout.fontsUsed();
     report["missing"] = Json::array();
     for (const MissingCharacter& missing : layout.missing())
-        report["missing"].push_back(missingJson(missing, text));
+        report["missing"].push_back(missingJson(missing, composition.source()));
     // Names of files and fonts may have any bytes.
     return report.dump(-1, ' ', false, Json::error_handler_t::replace);
 }

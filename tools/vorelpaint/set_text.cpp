@@ -58,14 +58,13 @@ const Glyph* glyphBeyond(const Room& room, const TextLayout& layout) {
     return nullptr;
 }
 
-void requireRoomForGlyphs(const Room& room, const TextLayout& layout,
-                          const std::vector<uint32_t>& text) {
+void requireRoomForGlyphs(const Room& room, const TextLayout& layout, const SourceText& source) {
     const Glyph* glyph = glyphBeyond(room, layout);
     if (glyph == nullptr) return;
-    throw ToolError(
-        "the canvas is too small for one glyph: that of " + vorelunicode::nameOf(text[glyph->cluster]) +
-        " at " + vorelunicode::placeName(text, glyph->cluster) + " is " +
-        std::to_string(glyph->box.width()) + " x " + std::to_string(glyph->box.height()) + " pixels");
+    throw ToolError("the canvas is too small for one glyph: that of " +
+                    vorelunicode::nameOf(source.text()[glyph->cluster]) + " at " +
+                    source.placeName(glyph->cluster) + " is " + std::to_string(glyph->box.width()) +
+                    " x " + std::to_string(glyph->box.height()) + " pixels");
 }
 
 SetText shrunk(const Options& options, const Room& room, const std::vector<uint32_t>& text) {
@@ -94,10 +93,16 @@ SetText setInCanvas(const Options& options, const Room& room, const std::vector<
 
 }  // namespace
 
-vorelstyle::MarkedText chosenText(const Options& options) {
-    std::vector<uint32_t> text = voreltext::decodeUtf8(bytesOfText(options));
-    if (options.markup) return vorelstyle::parseMarkup(text);
-    return {std::move(text), {}};
+SourceText::SourceText(const Options& options) : mGiven(voreltext::decodeUtf8(bytesOfText(options))) {
+    if (options.markup) {
+        mMarked = vorelstyle::parseMarkup(mGiven);
+    } else {
+        mMarked.text = mGiven;
+    }
+}
+
+std::string SourceText::placeName(size_t at) const {
+    return vorelunicode::placeName(mGiven, mMarked.places.empty() ? at : mMarked.places[at]);
 }
 
 SetText::SetText(const Options& options, const std::vector<uint32_t>& text, int size, int wrapWidth)
@@ -109,21 +114,21 @@ SetText::SetText(const Options& options, const std::vector<uint32_t>& text, int 
                        options.features})),
       mBox(options.box == TextBox::ink ? mLayout->inkBox() : mLayout->lineBox()) {}
 
-SetText setToFit(const Options& options, const std::vector<uint32_t>& text) {
+SetText setToFit(const Options& options, const SourceText& source) {
     const Room room = voreltext::roomOf(options.canvas);
-    SetText set = setInCanvas(options, room, text);
+    SetText set = setInCanvas(options, room, source.text());
     if (set.layout().glyphCount() == 0) throw InvisibleText();
-    requireRoomForGlyphs(room, set.layout(), text);
+    requireRoomForGlyphs(room, set.layout(), source);
     return set;
 }
 
-void noteMissing(const TextLayout& layout, const std::vector<uint32_t>& text, const Note& note) {
+void noteMissing(const TextLayout& layout, const SourceText& source, const Note& note) {
     std::string names;
     size_t named = 0;
     for (const voreltext::MissingCharacter& missing : layout.missing()) {
         if (++named > kMostMissingNamed) continue;
         names += (names.empty() ? "" : ", ") + vorelunicode::nameOf(missing.code) + " (" +
-                 vorelunicode::placeName(text, missing.first) + ")";
+                 source.placeName(missing.first) + ")";
     }
     if (named == 0) return;
     if (named > kMostMissingNamed) {

@@ -2,6 +2,7 @@
 
 #include <cstdint>
 #include <memory>
+#include <string>
 #include <vector>
 
 #include "error.h"
@@ -18,8 +19,22 @@ class InvisibleText : public ToolError {
     InvisibleText() : ToolError("nothing to paint: the text has no visible character") {}
 };
 
-/// The text that is asked for, without its markup. Throws ToolError, TextError or StyleError.
-vorelstyle::MarkedText chosenText(const Options& options);
+/// The text that is asked for.
+class SourceText {
+  public:
+    /// Throws ToolError, TextError or StyleError.
+    explicit SourceText(const Options& options);
+
+    const std::vector<uint32_t>& text() const { return mMarked.text; }  ///< without markup
+    const std::vector<vorelstyle::ColourRange>& colours() const { return mMarked.colours; }
+
+    /// "line 2, character 5": where a character of the text stands in what was given.
+    std::string placeName(size_t at) const;
+
+  private:
+    std::vector<uint32_t> mGiven;
+    vorelstyle::MarkedText mMarked;
+};
 
 /// A text set in its fonts at one size.
 class SetText {
@@ -41,10 +56,9 @@ class SetText {
 /// Sets the text so that it fits its canvas as is asked for: in broken lines, or in a smaller font.
 /// Throws InvisibleText when nothing of it is visible, and ToolError when the canvas is too small for
 /// one of its glyphs.
-SetText setToFit(const Options& options, const std::vector<uint32_t>& text);
+SetText setToFit(const Options& options, const SourceText& source);
 
 /// Notes the characters that no font has.
-void noteMissing(const voreltext::TextLayout& layout, const std::vector<uint32_t>& text,
-                 const Note& note);
+void noteMissing(const voreltext::TextLayout& layout, const SourceText& source, const Note& note);
 
 }  // namespace vorelpaint

@@ -74,6 +74,7 @@ constexpr std::array<Word<PngEffort>, 3> kEfforts{
 constexpr std::array<Word<PictureOf>, 2> kPicturesOf{
     {{"frame", PictureOf::frame}, {"cue", PictureOf::cue}}};
 constexpr std::array<Word<TextBox>, 2> kBoxes{{{"ink", TextBox::ink}, {"line", TextBox::line}}};
+constexpr std::array<Word<const char*>, 3> kShells{{{"bash", "bash"}, {"zsh", "zsh"}, {"fish", "fish"}}};
 
 template <typename Words, typename Member>
 Read oneOf(const Words& words, Member Options::*member) {
@@ -86,9 +87,8 @@ void readSheetSizes(Options& options, const std::string& given) {
     options.sheetSizes.clear();
     for (const std::string& size : partsOf(given))
         options.sheetSizes.push_back(readNumber(kFontSize, size));
-    const Limits<size_t> counts{1, kMostSheetSizes};
-    if (!contains(counts, options.sheetSizes.size()))
-        refuse(given, "no list of " + spelled(counts) + " sizes");
+    if (!contains(kSheetSizes, options.sheetSizes.size()))
+        refuse(given, "no list of " + spelled(kSheetSizes) + " sizes");
 }
 
 void readVariations(Options& options, const std::string& given) {
@@ -118,11 +118,6 @@ void addFont(Options& options, const std::string& given) {
     options.fonts.push_back(given);
 }
 
-std::optional<std::string> parseShell(const std::string& text) {
-    if (text == "bash" || text == "zsh" || text == "fish") return text;
-    return std::nullopt;
-}
-
 /// Films have other endings. They are asked for by --subtitles, which stands before --output in the list
 /// of settings, and so is read before it.
 void readOutput(Options& options, const std::string& given) {
@@ -146,9 +141,9 @@ Setting pictureNumber(const char* name, const char* value, const char* initial, 
 }
 
 /// An option of the command line alone.
-Setting programOption(const char* name, const char* value, const char* group, const char* description,
-                      Read read) {
-    const auto kind = *value == '\0' ? Setting::Kind::flag : Setting::Kind::text;
+Setting programOption(const char* name, const std::string& value, const char* group,
+                      const std::string& description, Read read) {
+    const auto kind = value.empty() ? Setting::Kind::flag : Setting::Kind::text;
     return {name, "", value, "", group, description, kind, false, false, std::move(read)};
 }
 
@@ -185,8 +180,8 @@ std::vector<Setting> fontSettings() {
     constexpr const char* kGroup = "Font";
     Setting fonts =
         pictureOption("font", "FONT", "DejaVu Sans", kGroup,
-                      "Font file, or family such as 'DejaVu Sans:bold'; given several times, "
-                      "each has what those before it lack",
+                      "Font file, or family such as 'DejaVu Sans:bold'; given up to " +
+                          std::to_string(kMostFonts) + " times, each has what those before it lack",
                       addFont, Setting::Kind::list);
     fonts.forget = [](Options& options) { options.fonts.clear(); };
     return {
@@ -354,7 +349,9 @@ std::vector<Setting> seriesSettings() {
                           text(&Options::batch)),
             programOption("sheet", "", kGroup, "Paint TEXT in every preset, with their names",
                           flag(&Options::sheet)),
-            programOption("sizes", "LIST", kGroup, "Sizes of a sheet's columns, such as 24,48,96",
+            programOption("sizes", "LIST", kGroup,
+                          "Sizes of a sheet's columns, such as 24,48,96: " + spelled(kSheetSizes) +
+                              " of " + spelled(kFontSize) + " pixels",
                           readSheetSizes)};
 }
 
@@ -390,8 +387,8 @@ std::vector<Setting> helpSettings() {
         help,
         programOption("version", "", kGroup, "Print the version and exit", flag(&Options::version)),
         programOption("man", "", kGroup, "Print the manual page, for man -l -", flag(&Options::manual)),
-        programOption("completion", "bash|zsh|fish", kGroup, "Print the completions of a shell",
-                      parsed(parseShell, &Options::completion, "none of bash, zsh, fish"))};
+        programOption("completion", listed(kShells, "|"), kGroup, "Print the completions of a shell",
+                      oneOf(kShells, &Options::completion))};
 }
 
 std::vector<Setting> allSettings() {

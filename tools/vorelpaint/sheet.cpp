@@ -17,7 +17,6 @@ namespace vorelpaint {
 namespace {
 
 using vorelstyle::Look;
-using vorelstyle::MarkedText;
 using voreltext::Box;
 using voreltext::Canvas;
 using voreltext::Image;
@@ -44,7 +43,8 @@ struct Column {
 /// a band for the name.
 struct CellSize {
     Margins margins{0, 0, 0, 0};
-    Box label;  ///< around every name, from the start of its baseline
+    Canvas canvas{};  ///< of the text and its effects
+    Box label;        ///< around every name, from the start of its baseline
     int width = 0;
     int height = 0;
 };
@@ -68,16 +68,16 @@ SetText labelOf(const Options& options, const std::string& preset, int size) {
     return {plain, voreltext::decodeUtf8(preset), labelSize};
 }
 
-Column columnOf(const Options& options, const MarkedText& source, int size, const Note& note) {
+Column columnOf(const Options& options, const SourceText& source, int size, const Note& note) {
     Options chosen = options;
     chosen.size = size;
-    Column column{setToFit(chosen, source.text), {}};
-    noteMissing(column.text.layout(), source.text, note);
+    Column column{setToFit(chosen, source), {}};
     for (const std::string& preset : presetNames()) {
         chosen.preset = preset;
-        const Note noteOfPreset = [&](const std::string& line) { note(preset + ": " + line); };
+        const std::string prefix = preset + ": ";
+        const Note noteOfPreset = [&](const std::string& line) { note(prefix + line); };
         column.cells.push_back(
-            {LayerSet(chosen, chosenStyle(chosen), size, source.colours, noteOfPreset),
+            {LayerSet(chosen, chosenStyle(chosen), size, source.colours(), noteOfPreset),
              labelOf(chosen, preset, size)});
     }
     return column;
@@ -94,9 +94,9 @@ CellSize sizeOf(const Column& column, int padding) {
         grow(size.margins, marginsOf(cell.looks.layers()));
         size.label.grow(cell.label.layout().inkBox());
     }
-    const Canvas canvas = placedOn({{}, {}, {}, 0, padding}, column.text.box(), size.margins);
-    size.width = std::max(canvas.width, size.label.width() + 2 * padding);
-    size.height = canvas.height + size.label.height() + padding;
+    size.canvas = placedOn({{}, {}, {}, 0, padding}, column.text.box(), size.margins);
+    size.width = std::max(size.canvas.width, size.label.width() + 2 * padding);
+    size.height = size.canvas.height + size.label.height() + padding;
     return size;
 }
 
@@ -106,10 +106,8 @@ class CellPainter {
     CellPainter(Image& sheet, const Options& options) : mSheet(sheet), mOptions(options) {}
 
     void paint(const Column& column, const CellSize& size, const Cell& cell, int left, int top) {
-        const int padding = mOptions.canvas.padding;
-        const Canvas whole = placedOn({{}, {}, {}, 0, padding}, column.text.box(), size.margins);
-        const int slack = size.width - whole.width;
-        layOver(mSheet, voreltext::paint(cell.looks.layers(), column.text.layout(), whole),
+        const int slack = size.width - size.canvas.width;
+        layOver(mSheet, voreltext::paint(cell.looks.layers(), column.text.layout(), size.canvas),
                 left + slack / 2, top);
 
         const Box& name = cell.label.box();
@@ -117,7 +115,8 @@ class CellPainter {
         const std::vector<Layer> layers{{&plain.effects()}};
         const Canvas band{size.width, size.label.height(), (size.width - name.width()) / 2 - name.left,
                           -size.label.top};
-        layOver(mSheet, voreltext::paint(layers, cell.label.layout(), band), left, top + whole.height);
+        layOver(mSheet, voreltext::paint(layers, cell.label.layout(), band), left,
+                top + size.canvas.height);
     }
 
   private:
@@ -158,28 +157,18 @@ Grid gridOf(const std::vector<Column>& columns, int padding) {
     return grid;
 }
 
-}  // namespace
-
-int sheetColumns(int count, int cellWidth, int cellHeight) {
-    int columns = 1;
-    while (columns < count && columns * cellWidth < (count + columns - 1) / columns * cellHeight) {
-        ++columns;
+/// Notes what is told of the text itself, whatever its look. What the fonts lack they lack in any size.
+void noteText(const std::vector<Column>& columns, const Grid& grid, const SourceText& source,
+              const Note& note) {
+    noteMissing(columns.front().text.layout(), source, note);
+    for (size_t i = 0; i < columns.size(); ++i) {
+        const CellSize& size = grid.sizes[i];
+        noteCut(size.canvas, columns[i].text.layout().inkBox(), size.margins, note);
     }
-    return columns;
 }
 
-void paintSheet(const Options& options, const Note& note) {
-    const MarkedText source = chosenText(options);
-    const std::vector<int> sizes =
-        options.sheetSizes.empty() ? std::vector<int>{options.size} : options.sheetSizes;
-    HeldNotes notes;
-    std::vector<Column> columns;
-    for (const int size : sizes)
-        columns.push_back(columnOf(options, source, size, notes.taker()));
-    const Grid grid = gridOf(columns, options.canvas.padding);
-
-    Image sheet = voreltext::transparentImage(grid.left(grid.columns), grid.rows * grid.height());
-    if (options.strict) notes.refuse();
+void paintCells(Image& sheet, const std::vector<Column>& columns, const Grid& grid,
+                const Options& options) {
     CellPainter painter(sheet, options);
     const size_t count = columns.front().cells.size();
     Progress progress("pictures", count * columns.size());
@@ -191,6 +180,32 @@ void paintSheet(const Options& options, const Note& note) {
         painter.paint(columns[of], grid.sizes[of], cell, grid.left(column), row * grid.height());
         progress.advance();
     }
+}
+
+}  // namespace
+
+int sheetColumns(int count, int cellWidth, int cellHeight) {
+    int columns = 1;
+    while (columns < count && columns * cellWidth < (count + columns - 1) / columns * cellHeight) {
+        ++columns;
+    }
+    return columns;
+}
+
+void paintSheet(const Options& options, const Note& note) {
+    const SourceText source(options);
+    const std::vector<int> sizes =
+        options.sheetSizes.empty() ? std::vector<int>{options.size} : options.sheetSizes;
+    HeldNotes notes;
+    std::vector<Column> columns;
+    columns.reserve(sizes.size());
+    for (const int size : sizes)
+        columns.push_back(columnOf(options, source, size, notes.taker()));
+    const Grid grid = gridOf(columns, options.canvas.padding);
+    noteText(columns, grid, source, notes.taker());
+    Image sheet = voreltext::transparentImage(grid.left(grid.columns), grid.rows * grid.height());
+    if (options.strict) notes.refuse();
+    paintCells(sheet, columns, grid, options);
     writePicture(options, std::move(sheet));
     notes.giveTo(note);
 }

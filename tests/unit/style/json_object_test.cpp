@@ -18,10 +18,31 @@ TEST(JsonObject, Keys_KeepTheOrderOfTheText) {
 }
 
 TEST(JsonObject, Numeral_IsSpelledShortest) {
-    const JsonDocument document(R"({"a": 1.50, "b": 3})");
-    const JsonObject object(document.root(), "", {"a", "b"});
+    const JsonDocument document(R"({"a": 1.50, "b": 3, "c": -96.0, "d": 1e3, "e": 1e300})");
+    const JsonObject object(document.root(), "", {"a", "b", "c", "d", "e"});
     EXPECT_EQ(object.numeral("a"), "1.5");
     EXPECT_EQ(object.numeral("b"), "3");
+    EXPECT_EQ(object.numeral("c"), "-96");
+    EXPECT_EQ(object.numeral("d"), "1000");
+    EXPECT_EQ(object.numeral("e"), "1e+300");
+}
+
+/// The message with which a text is refused.
+std::string faultOfText(const std::string& text) {
+    try {
+        const JsonDocument document(text);
+        return "";
+    } catch (const StyleError& error) {
+        return error.what();
+    }
+}
+
+TEST(JsonDocument, NumberTooLarge_IsRefusedWithItsPath) {
+    const std::string fault = "number overflow parsing '1e999'";
+    EXPECT_EQ(faultOfText("1e999"), fault);
+    EXPECT_EQ(faultOfText(R"({"a": 1e999})"), "a: " + fault);
+    EXPECT_EQ(faultOfText(R"([1, {}, 1e999])"), "[2]: " + fault);
+    EXPECT_EQ(faultOfText(R"({"a": {"b": [0]}, "c": [{"d": [[], 5, 1e999]}]})"), "c[0].d[2]: " + fault);
 }
 
 TEST(JsonObject, Array_GivesItsElements) {

@@ -54,6 +54,18 @@ TEST(Markup, TextWithoutTags_IsTheText) {
     EXPECT_TRUE(parseMarkup({}).text.empty());
 }
 
+TEST(Markup, Places_AreThoseOfTheWrittenText) {
+    EXPECT_EQ(parseMarkup(codes("a<c #f80>b&lt;c</c>d")).places,
+              (std::vector<size_t>{0, 9, 10, 14, 19}));
+}
+
+TEST(Markup, ControlCharacters_AreRefusedWhereTheyAreWritten) {
+    EXPECT_EQ(faultOf("<c #f80>a</c>\r\n<c #f80>\tb\033</c>"),
+              "markup, line 2, character 11: the control character U+001B");
+    EXPECT_EQ(faultOf({'a', 0x85, '\t', 0x2028, '\n', 'b', 0x9F}),
+              "markup, line 4, character 2: the control character U+009F");
+}
+
 TEST(Markup, Tag_ColoursWhatItEncloses) {
     const MarkedText marked = parseMarkup(codes("so <c #f80>hot</c> it <c #123456>is</c>"));
     EXPECT_EQ(ascii(marked.text), "so hot it is");
@@ -116,6 +128,7 @@ TEST(Markup, WrittenText_IsReadBack) {
     for (int round = 0; round < 2000; ++round) {
         std::vector<uint32_t> text;
         std::vector<uint32_t> written;
+        std::vector<size_t> places;
         std::vector<int> wanted;  // the colour of each character, -1 for none
         std::vector<int> open;
         const auto append = [&](const std::string& part) {
@@ -134,6 +147,7 @@ TEST(Markup, WrittenText_IsReadBack) {
             } else {
                 constexpr uint32_t kCharacters[]{'<', '>', '&', ';', 'c', '#', '\n', 0x5D0, 0x1F600};
                 text.push_back(kCharacters[random() % std::size(kCharacters)]);
+                places.push_back(written.size());
                 wanted.push_back(open.empty() ? -1 : open.back());
                 if (text.back() == '<') {
                     append("&lt;");
@@ -148,6 +162,7 @@ TEST(Markup, WrittenText_IsReadBack) {
             append("</c>");
         const MarkedText marked = parseMarkup(written);
         ASSERT_EQ(marked.text, text) << "round " << round;
+        ASSERT_EQ(marked.places, places) << "round " << round;
         std::vector<int> colours(text.size(), -1);
         size_t before = 0;
         for (const ColourRange& range : marked.colours) {

@@ -14,5 +14,11 @@ TEST(Nearest, Choices_BeginWithTheOneThatIsMeant) {
     EXPECT_EQ(choices("none", names, "there are"), "; there are gold, neon");
 }
 
+TEST(Nearest, NoneOf_EndsWithTheOneThatIsMeant) {
+    const std::vector<std::string> names{"left", "center"};
+    EXPECT_EQ(noneOf("centre", names), "none of left, center; did you mean center?");
+    EXPECT_EQ(noneOf("middle", names), "none of left, center");
+}
+
 }  // namespace
 }  // namespace vorelstyle

@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include <locale>
 #include <sstream>
 #include <string>
 #include <vector>
@@ -88,6 +89,36 @@ void addLook(VFontEffect::VFEffect& look) {
               plain);
     EXPECT_EQ(writtenOf(R"({"version": 2, "looks": [{"description": "a", "color": "#000001"}]})"),
               plain);
+}
+
+TEST(WriteCppText, Stack_TellsHowItIsPaintedToTheLastBit) {
+    const std::string text = writtenOf(R"({"version": 2, "looks": [{}, {}]})");
+    EXPECT_NE(
+        text.find("\n/// source + destination * (255 - source alpha) / 255, rounded to nearest.\n"),
+        std::string::npos)
+        << text;
+    EXPECT_NE(text.find("in\n/// reading order"), std::string::npos) << text;
+}
+
+struct Grouped : std::numpunct<char> {
+    char do_thousands_sep() const override { return '.'; }
+    std::string do_grouping() const override { return "\1"; }
+};
+
+TEST(WriteCppText, Numbers_AreThoseOfCppInAnyLocale) {
+    const auto wide = [](const std::string&) {
+        return PatternImage{300, 1, std::vector<uint8_t>(1200, 99)};
+    };
+    std::ostringstream out;
+    out.imbue(std::locale(std::locale::classic(), new Grouped));
+    writeCpp(out, "addLook", parseStyle(R"({"version": 2, "looks": [{"pattern": {"image": "a.png"}},
+             {}, {}, {}, {}, {}, {}, {}, {}, {"offset": {"x": 1000}}]})"),
+             {}, {}, wide);
+    const std::string text = out.str();
+    EXPECT_NE(text.find("\n        99, 99, "), std::string::npos);
+    EXPECT_NE(text.find("pattern(300, 1, pixels, 4);"), std::string::npos);
+    EXPECT_NE(text.find("void addLook10("), std::string::npos);
+    EXPECT_NE(text.find("{addLook10, 1000, 0, \"block\"}"), std::string::npos);
 }
 
 TEST(WriteCppText, Stack_IsAFunctionForEachLookAndTheirPlaces) {

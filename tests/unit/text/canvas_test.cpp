@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <array>
+#include <limits>
 #include <string>
 #include <vector>
 
@@ -85,6 +86,33 @@ TEST(Canvas, BeyondTheLargestPicture_IsRefused) {
     EXPECT_THROW(placedOn(request, {0, 0, 1, 1}, kNoEffects), TextError);
     request.height = 10;
     EXPECT_NO_THROW(placedOn(request, {0, 0, 1, 1}, kNoEffects));
+}
+
+TEST(Canvas, NumbersOfAnySize_AreRefusedOrFarOutside) {
+    constexpr int kMost = std::numeric_limits<int>::max();
+    constexpr int kLeast = std::numeric_limits<int>::min();
+    CanvasRequest request;
+    request.padding = kMost;
+    EXPECT_THROW(placedOn(request, {0, 0, 1, 1}, kNoEffects), TextError);
+    request.padding = kLeast;
+    EXPECT_THROW(placedOn(request, {0, 0, 1, 1}, kNoEffects), TextError);
+    request.padding = 0;
+    EXPECT_THROW(placedOn(request, {0, 0, 1, 1}, {kMost, 0, kMost, 0}), TextError);
+    request.width = 100;
+    request.height = 100;
+    request.anchor = Anchor::topLeft;
+    request.margin = kMost;
+    EXPECT_GT(placedOn(request, {0, 0, 1, 1}, kNoEffects).x, TextLayout::kMaxSide);
+    request.anchor = Anchor::bottomRight;
+    EXPECT_LT(placedOn(request, {0, 0, 1, 1}, kNoEffects).y, -TextLayout::kMaxSide);
+    request.margin = kLeast;
+    EXPECT_GT(placedOn(request, {0, 0, 1, 1}, kNoEffects).y, TextLayout::kMaxSide);
+}
+
+TEST(Canvas, WithoutABox_MayBeEmpty) {
+    const Canvas canvas = placedOn({}, {}, kNoEffects);
+    EXPECT_EQ(canvas.width, 0);
+    EXPECT_EQ(canvas.height, 0);
 }
 
 TEST(Room, IsWhatTheMarginsLeave) {

@@ -54,6 +54,17 @@ TEST(Font, WhatIsNoFont_IsRefused) {
     EXPECT_EQ(faultOf(FontBytes{nullptr, 0}), "the bytes are no font that can be read");
 }
 
+TEST(Font, SizeOutOfItsRange_IsRefused) {
+    // Of pictures, FreeType knows nothing of the size that they are brought to.
+    for (const char* file : {VOREL_TEST_FONT, vorel_test::kEmojiFont}) {
+        for (const int size : {0, -1, 16385, 1 << 30}) {
+            EXPECT_EQ(vorel_test::faultOf([&] { Font(FontFile{file}, size); }),
+                      "the size of a font is " + std::to_string(size) + "; it may be 1 to 16384 pixels");
+        }
+        EXPECT_EQ(Font(FontFile{file}, 16384).sizePx(), 16384);
+    }
+}
+
 TEST(Font, CutBytes_AreRefused) {
     const std::string bytes = vorel_test::testFontBytes().substr(0, 100);
     EXPECT_NE(faultOf(viewOf(bytes)), "");

@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <cstdint>
+#include <limits>
 #include <string_view>
 #include <vector>
 
@@ -136,6 +137,24 @@ TEST(Layers, MovedOne_IsTheSamePictureElsewhere) {
     EXPECT_NE(moved.pixels, still.pixels);
 }
 
+TEST(Layers, MovedFarAway_AreNotSeen) {
+    constexpr int kMost = std::numeric_limits<int>::max();
+    constexpr int kLeast = std::numeric_limits<int>::min();
+    const Sample sample("I");
+    VFEffect effects = everything();
+    for (const int far : {kLeast, kMost}) {
+        Layer layer{&effects, far, far};
+        layer.takesPictures = true;
+        for (const int place : {kLeast / 2, 0, kMost / 2}) {
+            const Image image = paint({layer}, sample.layout(), {9, 9, place, place});
+            EXPECT_EQ(image.pixels, std::vector<uint8_t>(9 * 9 * 4)) << far;
+        }
+        const Margins margins = marginsOf({layer});
+        EXPECT_GT(far < 0 ? margins.left : margins.right, TextLayout::kMaxSide);
+        EXPECT_EQ(far < 0 ? margins.right : margins.left, 0);
+    }
+}
+
 TEST(Layers, SmallerCanvas_IsAPartOfThePicture) {
     const Sample sample("Cut off");
     VFEffect effects = everything();
@@ -188,6 +207,38 @@ TEST(Spans, EachGlyphHasARampOfItsOwn) {
     EXPECT_EQ(rampAtTheFootOf(sample, byGlyph, 0), rampAtTheFootOf(sample, byWord, 0));
 }
 
+using Spans = std::vector<std::vector<size_t>>;
+
+/// The clusters of the glyphs of each span.
+Spans clustersOf(const Sample& sample, Span span) {
+    Spans clusters;
+    for (const std::vector<size_t>& glyphs : spansOf(sample.layout(), span)) {
+        clusters.emplace_back();
+        for (const size_t i : glyphs)
+            clusters.back().push_back(sample.layout().glyph(i).cluster);
+        std::sort(clusters.back().begin(), clusters.back().end());
+    }
+    return clusters;
+}
+
+TEST(Spans, WordThatALineCuts_IsTwo) {
+    TextSettings narrow;
+    narrow.wrapWidth = 3 * kSize;
+    const Sample sample("mmmm i", narrow);
+    ASSERT_EQ(sample.layout().lines().size(), 2U);
+    EXPECT_EQ(clustersOf(sample, Span::word), (Spans{{0, 1, 2}, {3}, {5}}));
+    EXPECT_EQ(clustersOf(sample, Span::line), (Spans{{0, 1, 2}, {3, 5}}));
+    EXPECT_EQ(clustersOf(sample, Span::block), (Spans{{0, 1, 2, 3, 5}}));
+}
+
+TEST(Spans, OfTextFromTheRight_StandInReadingOrder) {
+    const Sample sample("\xD7\x90\xD7\x91 \xD7\x92");
+    EXPECT_GT(sample.layout().glyph(sample.layout().glyphCount() - 1).box.left,
+              sample.layout().glyph(0).box.left);
+    EXPECT_EQ(clustersOf(sample, Span::word), (Spans{{0, 1}, {3}}));
+    EXPECT_EQ(clustersOf(sample, Span::glyph), (Spans{{0}, {1}, {3}}));
+}
+
 TEST(Spans, LaterOnes_LieOverEarlierOnes) {
     const Sample sample("II");
     VFEffect effects;
@@ -217,7 +268,7 @@ TEST(ColouredParts, ChangeTheirGlyphsAlone) {
 
     Image covered{image.width, image.height, std::vector<uint8_t>(image.pixels.size())};
     const Canvas canvas = around(sample.layout(), {layer});
-    for (const size_t i : {1, 2}) {
+    for (const size_t i : {1U, 2U}) {
         const GlyphMask mask = sample.layout().rasterise(i);
         Image glyph{mask.box.width(), mask.box.height(), {}};
         for (const uint8_t each : mask.coverage)
@@ -307,6 +358,33 @@ TEST(ColouredParts, OfGlyphsThatOverlap_TheLastIsSeen) {
         }
     }
     EXPECT_EQ(image.pixels, wanted.pixels);
+}
+
+TEST(ColouredParts, InTheFillsColourAndOpacity_ChangeNothing) {
+    const Sample sample("abcd");
+    VFEffect effects;
+    effects.setTextOpacity(0.5F);
+    effects.addOuterShadowText(135, 6, 5, 0x203040, 0.7F);
+    effects.addText(0xFFE080, 0.5F);
+    Layer layer{&effects};
+    const Image plain = painted(sample, {layer});
+    layer.colours = {{0, 4, 0xFFE080}};
+    layer.fillOpacity = 0.5F;
+    EXPECT_EQ(painted(sample, {layer}).pixels, plain.pixels);
+    layer.fillOpacity = 1;
+    EXPECT_NE(painted(sample, {layer}).pixels, plain.pixels);
+}
+
+TEST(ColouredParts, WithinALigature_HaveTheColourOfItsFirstLetter) {
+    const Sample sample("fi");
+    ASSERT_EQ(sample.layout().glyphCount(), 1U);
+    VFEffect red = fill(0xFF0000);
+    VFEffect green = fill(0x00FF00);
+    Layer layer{&red};
+    layer.colours = {{1, 2, 0x00FF00}};
+    EXPECT_EQ(painted(sample, {layer}).pixels, painted(sample, {{&red}}).pixels);
+    layer.colours = {{0, 1, 0x00FF00}};
+    EXPECT_EQ(painted(sample, {layer}).pixels, painted(sample, {{&green}}).pixels);
 }
 
 TEST(Layers, WithoutGlyphs_AreATransparentPicture) {

@@ -7,6 +7,9 @@
 #include <cstdint>
 #include <limits>
 #include <random>
+#include <vector>
+
+#include "text/error.h"
 
 namespace voreltext {
 namespace {
@@ -76,6 +79,14 @@ TEST(LayOver, AnyPlace_IsTheLiteralForm) {
         layOver(image, source, x, y);
         ASSERT_EQ(image.pixels, wanted.pixels) << "round " << round;
     }
+}
+
+TEST(TransparentImage, OfAnySizeButTooLarge_IsMade) {
+    EXPECT_EQ(transparentImage(3, 2).pixels, std::vector<uint8_t>(24));
+    EXPECT_TRUE(transparentImage(0, 5).pixels.empty());
+    EXPECT_THROW(transparentImage(-1, 1), TextError);
+    EXPECT_THROW(transparentImage(1, 16385), TextError);
+    EXPECT_THROW(transparentImage(16384, 2049), TextError);
 }
 
 TEST(LayOver, FarAway_ChangesNothing) {

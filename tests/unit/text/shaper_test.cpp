@@ -1,7 +1,11 @@
 #include "text/shaper.h"
 
+#include <ft2build.h>
+#include FT_FREETYPE_H
 #include <gtest/gtest.h>
 
+#include <clocale>
+#include <cstdlib>
 #include <memory>
 
 #include "text/paragraphs.h"
@@ -91,6 +95,22 @@ TEST(Shaper, Features_AreSwitchedOnAndOff) {
     EXPECT_EQ(shaped(fonts, "ffi", {"-liga", "liga"}).size(), 1U) << "the last counts";
     EXPECT_LT(shaped(fonts, "AV")[0].advance, shaped(fonts, "AV", {"kern=0"})[0].advance);
     EXPECT_EQ(shaped(fonts, "ffi", {"ss01", "zzzz=3"}).size(), 1U) << "unknown to the font";
+}
+
+/// Whether a digit that has a form of its own in Urdu is shaped without it where the program is Urdu.
+[[noreturn]] void shapeInUrdu() {
+    std::setlocale(LC_ALL, "ur_PK.UTF-8");
+    const Fonts fonts{Font(FontFile{vorel_test::kArabicFont}, 20)};
+    const std::vector<ShapedGlyph> four = shaped(fonts, "۴");
+    const bool isPlain = four.front().index == FT_Get_Char_Index(fonts.main().face(), 0x6F4);
+    std::_Exit(isPlain ? 0 : 1);
+}
+
+TEST(ShaperDeathTest, LocaleOfTheProgram_ChangesNoGlyph) {
+    if (std::getenv("LOCPATH") == nullptr) GTEST_SKIP() << "LOCPATH names no folder of locales";
+    // In a program of its own: HarfBuzz looks at the locale once.
+    ::testing::FLAGS_gtest_death_test_style = "threadsafe";
+    EXPECT_EXIT(shapeInUrdu(), ::testing::ExitedWithCode(0), "");
 }
 
 TEST(Shaper, MisspeltFeature_IsRefusedByItsName) {

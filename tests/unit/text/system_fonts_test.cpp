@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include <cstdlib>
 #include <filesystem>
 #include <string>
 #include <utility>
@@ -180,6 +181,23 @@ TEST_F(SystemFontsFor, FontThatIsNotInstalled_HasAFallbackToo) {
     const auto found = mFonts.findFor({'a'}, {"no/such.ttf"});
     ASSERT_TRUE(found);
     EXPECT_TRUE(Font(*found, 20).has('a'));
+}
+
+/// Ends the program with 0 when fonts are chosen as in English where the language is another one.
+[[noreturn]] void chooseIn(const char* language) {
+    setenv("FC_LANG", language, 1);
+    const SystemFonts fonts;
+    const auto hebrew = fonts.findFor({0x5D0}, fonts.find("DejaVu Serif"));
+    const bool areAlike = fileOf("serif") == "DejaVuSerif.ttf" &&
+                          fileOf("monospace:bold") == "DejaVuSansMono-Bold.ttf" && hebrew &&
+                          std::filesystem::path(hebrew->path).filename() == "FrankRuehlCLM-Medium.ttf";
+    std::_Exit(areAlike ? 0 : 1);
+}
+
+TEST(SystemFontsDeathTest, LanguageOfTheEnvironment_ChangesNoChoice) {
+    ::testing::FLAGS_gtest_death_test_style = "threadsafe";  // fontconfig asks for it once
+    for (const char* language : {"en", "ja", "ko", "ar", "he", "hi", "th", "zh-tw"})
+        EXPECT_EXIT(chooseIn(language), ::testing::ExitedWithCode(0), "") << language;
 }
 
 TEST_F(SystemFontsFor, ManyClusters_AreQuick) {

@@ -483,6 +483,16 @@ TEST(LargePicture, BeyondTheLimit_IsRefused) {
               "the text would be more than 16384 pixels wide or high");
 }
 
+TEST_F(MadeLayoutTest, ManySoftHyphens_AreNotTriedOneByOne) {
+    // Each try shapes all of them: minutes, were they.
+    std::string hyphens;
+    for (int i = 0; i < 50000; ++i)
+        hyphens += "\u00AD";
+    const TextLayout text = layOut("ab" + hyphens + "cd", wrappedAt(20));
+    ASSERT_EQ(text.lines().size(), 2U);
+    EXPECT_EQ(text.lines()[0].end, 2U) << "without room for a hyphen";
+}
+
 TEST_F(TextLayoutTest, WrappedMixedDirections_AreOrderedLineByLine) {
     // Each line keeps the direction of the source line: the Hebrew words stand right of the Latin ones.
     TextSettings settings;

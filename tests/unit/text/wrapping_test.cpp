@@ -70,5 +70,26 @@ TEST(Wrapping, SoftHyphen_PartsALigature) {
     EXPECT_EQ(wrapping.endAfter(Ends::ofClusters, 0), 3U);
 }
 
+/// A text whose letters have an advance of 10 and whose other characters show nothing.
+Wrapping wrappingOfLetters(const std::string& text) {
+    const std::vector<uint32_t> codes = decodeUtf8(text);
+    std::vector<ShapedGlyph> glyphs;
+    for (size_t i = 0; i < codes.size(); ++i)
+        glyphs.push_back({1, 0, i, codes[i] < 0x80 ? 10 : 0, 0, 0});
+    return {splitParagraphs(codes).front(), glyphs};
+}
+
+TEST(Wrapping, EndsThatShowNoMore_AreOneStep) {
+    const Wrapping spaces = wrappingOfLetters("a\u200B\u200B\u200Bb\u200Bc");
+    EXPECT_EQ(spaces.longer(Ends::ofWords, 0, 0), 4U);
+    EXPECT_EQ(spaces.longer(Ends::ofClusters, 0, 4), 6U);
+    EXPECT_EQ(spaces.shorter(Ends::ofWords, 0, 6), 4U);
+    EXPECT_EQ(spaces.shorter(Ends::ofWords, 0, 4), 0U);
+    const Wrapping hyphens = wrappingOfLetters("a\u00AD\u00AD\u00ADb");
+    EXPECT_EQ(hyphens.shorter(Ends::ofClusters, 0, 4), 1U) << "without a hyphen it may fit";
+    EXPECT_EQ(hyphens.longer(Ends::ofClusters, 0, 0), 1U) << "with one it may not";
+    EXPECT_EQ(hyphens.longer(Ends::ofClusters, 0, 1), 4U);
+}
+
 }  // namespace
 }  // namespace voreltext
