@@ -77,5 +77,21 @@ TEST(SubtitleText, Ass_DrawingsAreDropped) {
     EXPECT_EQ(textOfAss("{\\p1}m 0 0 l 9 9"), "");
 }
 
+/// A search for the end of each of them from its beginning would take hours.
+TEST(SubtitleText, BeginningsWithoutAnEnd_TakeNoTime) {
+    const auto repeated = [](const std::string& text) {
+        std::string all;
+        for (int i = 0; i < 4000000; ++i)
+            all += text;
+        return all;
+    };
+    for (const std::string& beginning : {std::string("&"), std::string("{\\"), std::string("<")}) {
+        const std::string written = repeated(beginning);
+        EXPECT_TRUE(textOfSrt(written) == written) << beginning;
+    }
+    EXPECT_TRUE(textOfVtt(repeated("&")).text == repeated("&"));
+    EXPECT_TRUE(textOfAss(repeated("{")) == repeated("{"));
+}
+
 }  // namespace
 }  // namespace vorelpaint

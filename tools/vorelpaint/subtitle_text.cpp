@@ -52,11 +52,15 @@ std::optional<std::string> numbered(std::string_view name) {
     return vorelunicode::encoded(code);
 }
 
+/// With the & and the ; of it. Further on none is looked for.
+constexpr size_t kLongestReference = 16;
+
 /// The character of the reference whose & stands at `at`, which is moved behind it; nothing when none
 /// does.
 std::optional<std::string> takeReference(std::string_view written, size_t& at) {
-    const size_t end = written.find(';', at);
-    if (end == std::string_view::npos || end == at + 1) return std::nullopt;
+    const size_t length = written.substr(at, kLongestReference).find(';');
+    if (length == std::string_view::npos || length == 1) return std::nullopt;
+    const size_t end = at + length;
     const std::string_view name = written.substr(at + 1, end - at - 1);
     std::optional<std::string> character;
     if (name.front() == '#') character = numbered(name);
@@ -101,8 +105,9 @@ std::optional<std::string> takeSrtTag(std::string_view written, size_t& at) {
     return isBreak ? "\n" : "";
 }
 
-bool isOverrideBlock(std::string_view written, size_t at) {
-    return written.substr(at, 2) == "{\\" && written.find('}', at) != std::string_view::npos;
+/// Whether one begins at `at`, where `lastEnd` is the place of the last } of the text.
+bool isOverrideBlock(std::string_view written, size_t at, size_t lastEnd) {
+    return written.substr(at, 2) == "{\\" && lastEnd != std::string_view::npos && at < lastEnd;
 }
 
 // --- WebVTT -----------------------------------------------------------------------------------------
@@ -144,13 +149,14 @@ std::optional<const char*> escapeAt(std::string_view written, size_t at) {
 }  // namespace
 
 std::string textOfSrt(std::string_view written) {
+    const size_t lastEnd = written.rfind('}');
     std::string text;
     for (size_t at = 0; at < written.size();) {
         const std::optional<std::string> tag =
             written[at] == '<' ? takeSrtTag(written, at) : std::nullopt;
         if (tag) {
             text += *tag;
-        } else if (isOverrideBlock(written, at)) {
+        } else if (isOverrideBlock(written, at, lastEnd)) {
             at = written.find('}', at) + 1;
         } else {
             text += takeText(written, at);
@@ -175,11 +181,12 @@ VttText textOfVtt(std::string_view written) {
 }
 
 std::string textOfAss(std::string_view written) {
+    const size_t lastEnd = written.rfind('}');
     std::string text;
     bool isDrawing = false;
     for (size_t at = 0; at < written.size();) {
-        const size_t end = written[at] == '{' ? written.find('}', at) : std::string_view::npos;
-        if (end != std::string_view::npos) {
+        if (written[at] == '{' && lastEnd != std::string_view::npos && at < lastEnd) {
+            const size_t end = written.find('}', at);
             isDrawing = startsDrawing(written.substr(at, end - at), isDrawing);
             at = end + 1;
             continue;
