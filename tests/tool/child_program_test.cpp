@@ -7,6 +7,7 @@
 #include <cstdio>
 #include <memory>
 #include <string>
+#include <vector>
 
 #include "error.h"
 #include "interrupt.h"
@@ -21,9 +22,9 @@ using Stream = ChildProgram::Stream;
 
 constexpr size_t kPlenty = 1 << 20;
 
-std::string faultOf(ChildProgram& program) {
+std::string faultOf(ChildProgram& program, const std::vector<std::string>& faults = {}) {
     try {
-        program.finish();
+        program.finish(faults);
         return "";
     } catch (const ToolError& error) {
         return error.what();
@@ -76,6 +77,16 @@ TEST(ChildProgram, FailureIsToldWithItsFirstLine) {
     EXPECT_EQ(faultOf(silent), "false failed: it does not say why");
     ChildProgram killed({"sh", "-c", "kill -9 $$"}, Stream::output);
     EXPECT_EQ(faultOf(killed), "sh was ended by signal 9");
+}
+
+TEST(ChildProgram, FailureThatItDoesNotEndWith_IsAmongItsLastLines) {
+    const std::vector<std::string> words{
+        "sh", "-c",
+        "yes noise | head -n 100000 >&2; echo '[out @ 0x5] Error writing: x' >&2; echo b >&2"};
+    ChildProgram program(words, Stream::output);
+    EXPECT_EQ(faultOf(program, {"Error reading", "Error writing"}), "sh failed: Error writing: x");
+    ChildProgram other(words, Stream::output);
+    EXPECT_EQ(faultOf(other, {"writing"}), "") << "within a line it is another one's word";
 }
 
 TEST(ChildProgram, ManyComplaints_DoNotBlockIt) {

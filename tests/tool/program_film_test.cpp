@@ -226,6 +226,43 @@ TEST_F(Films, TransparentFilms_KeepTheirAlphaNearly) {
     }
 }
 
+TEST_F(Films, FilmsWithoutAClip_SayThatTheyAreInBt709) {
+    for (const Words& form :
+         {Words{"-o", mDir.file("a.mov")}, Words{"-o", mDir.file("a.webm")},
+          Words{"--background", "#204060", "-o", mDir.file("a.mp4")},
+          Words{"--background", "#204060", "--codec", "prores", "-o", mDir.file("b.mov")}}) {
+        made(inFrames(Words{"--fps", "2"} + form));
+        EXPECT_EQ(probed(form.back(), "stream=color_range,color_space,color_transfer,color_primaries"),
+                  "tv|bt709|bt709|bt709\n")
+            << form.back();
+    }
+}
+
+/// In red letters the samples of colour are those of red, where one of their four pixels has alpha
+/// enough to be seen: Cr = 128 + 112 / (1 - 0.2126) * (R - Y) / 255 with Y = 0.2126 R.
+TEST_F(Films, TransparentFilms_HaveTheTextsColourAtItsEdges) {
+    const std::string film = mDir.file("a.webm");
+    made({"--subtitles", mDir.write("a.srt", kTwoCues), "--preset", "plain", "--color", "#E00000",
+          "--size", "40", "--width", "320", "--height", "180", "--fps", "5", "-o", film});
+    const std::string frames = framesOf(film, "yuva420p", {"-c:v", "libvpx-vp9"});
+    constexpr size_t kPixels = size_t{kWidth} * kHeight;
+    const auto* frame = reinterpret_cast<const uint8_t*>(frames.data()) + kPixels * 5 / 2;
+    const uint8_t* alpha = frame + kPixels * 3 / 2;
+    const double red = 128 + 112 / 0.7874 * 0.7874 * 0xE0 / 255;
+    int seen = 0;
+    double sum = 0;
+    for (size_t y = 0; y < kHeight / 2; ++y) {
+        for (size_t x = 0; x < kWidth / 2; ++x) {
+            const uint8_t* block = alpha + 2 * y * kWidth + 2 * x;
+            if (std::max({block[0], block[1], block[kWidth], block[kWidth + 1]}) < 128) continue;
+            ++seen;
+            sum += std::abs(frame[kPixels * 5 / 4 + y * (kWidth / 2) + x] - red);
+        }
+    }
+    ASSERT_GT(seen, 200);
+    EXPECT_LT(sum / seen, 5) << "of 98 that it is away from grey";
+}
+
 TEST_F(Films, Background_MakesThemOpaque) {
     const std::string film = mDir.file("a.mkv");
     made(inFrames({"--fps", "10", "--background", "#204060", "--codec", "ffv1", "-o", film}));
@@ -259,6 +296,33 @@ TEST_F(Films, BurntInto_RgbPixelsAreBlendedWithTheClips) {
     }
     EXPECT_TRUE(frames.compare(raw.size(), std::string::npos, below, raw.size()) == 0)
         << "behind the last cue the clip goes on";
+}
+
+/// Colours of halved planes are those of a film whose planes were halved after the cues were laid over
+/// it.
+TEST_F(Films, BurntInto_EdgesAreNotDarkened) {
+    const Words white{"-vf", "drawbox=color=white:t=fill", "-c:v", "ffv1", "-pix_fmt"};
+    const auto burnt = [&](const char* pixels) {
+        const std::string clip = makeClip(mDir.file("clip.mkv"), "5", white + Words{pixels});
+        const std::string film = mDir.file("film.mkv");
+        made({"--subtitles", mDir.write("a.srt", kTwoCues), "--preset", "plain", "--color", "#E00000",
+              "--size", "40", "--over", clip, "--codec", "ffv1", "-o", film});
+        return framesOf(film, "yuv420p");
+    };
+    const std::string halvedBefore = burnt("yuv420p");
+    const std::string halvedAfter = burnt("gbrp");
+    ASSERT_EQ(halvedBefore.size(), halvedAfter.size());
+    constexpr size_t kPixels = size_t{kWidth} * kHeight;
+    int seen = 0;
+    double lost = 0;
+    for (size_t i = 3 * kPixels / 2 + kPixels * 5 / 4; i < 3 * kPixels; ++i) {  // Cr of the second frame
+        const int red = static_cast<uint8_t>(halvedAfter[i]);
+        if (red < 150) continue;
+        ++seen;
+        lost += red - static_cast<uint8_t>(halvedBefore[i]);
+    }
+    ASSERT_GT(seen, 200);
+    EXPECT_LT(lost / seen, 3) << "of 98 that it is away from grey";
 }
 
 /// Whatever the clip's rate, container and pixels are: outside of the cues' times it is left as it is.
@@ -435,8 +499,7 @@ TEST_F(Films, InItsOwnPlace_AClipMayBeReplaced) {
     EXPECT_EQ(probed(clip, "stream=codec_name,nb_read_frames"), "h264|20\n");
 }
 
-// --- what cannot be done
-// --------------------------------------------------------------------------------
+// --- what cannot be done ------------------------------------------------------------------------------
 
 /// One line on standard error, exit code 2, nothing written.
 class RefusedFilms : public Films {
@@ -509,6 +572,35 @@ TEST_F(RefusedFilms, Outputs_ThatAreNoFilms) {
     EXPECT_EQ(faultOf(asked({"--width", "321", "--background", "#000", "-o", output("a.mp4")})),
               "the sides of a film in h264 are even; these are 321 x 1080");
     EXPECT_EQ(faultOf(asked({})), "nowhere to show the subtitles: give -o FILE, or -o - for raw frames");
+}
+
+/// At the end of a file, too, which ffmpeg by itself takes lightly.
+TEST_F(RefusedFilms, Outputs_WithoutRoom) {
+    for (const char* name : {"a.mov", "a.mkv", "a.webm", "a.mp4", "a.rgba"}) {
+        const Words films = inFrames({"--background", "#204060", "--fade-in", "500", "-o"});
+        const std::string whole = mDir.file(name);
+        made(films + Words{whole});
+        const size_t size = fs::file_size(whole);
+        for (const size_t room : {size - 1, size / 2, size_t{1000}}) {
+            Surroundings surroundings;
+            surroundings.largestFile = room;
+            const Outcome outcome = runVorelpaintIn(surroundings, films + Words{output(name)});
+            EXPECT_EQ(outcome.exitCode, 2) << name << ", " << room << " of " << size;
+            EXPECT_EQ(outcome.err.find("vorelpaint: cannot write '" + output(name) + "': "), 0U)
+                << outcome.err;
+            EXPECT_NE(outcome.err.find("File too large\n"), std::string::npos) << outcome.err;
+            EXPECT_EQ(std::count(outcome.err.begin(), outcome.err.end(), '\n'), 1) << outcome.err;
+            EXPECT_TRUE(mOutputs.list().empty()) << name;
+        }
+    }
+}
+
+TEST_F(RefusedFilms, StandardOutput_ThatNobodyReads) {
+    Surroundings surroundings;
+    surroundings.closedOutput = true;
+    const Outcome outcome = runVorelpaintIn(surroundings, inFrames({"-o", "-"}));
+    EXPECT_EQ(outcome.exitCode, 2);
+    EXPECT_EQ(outcome.err, "vorelpaint: cannot write standard output: Broken pipe\n");
 }
 
 TEST_F(RefusedFilms, Requests_ThatDoNotFitTogether) {
@@ -612,8 +704,7 @@ INSTANTIATE_TEST_SUITE_P(Signals, StoppedFilms,
                          ::testing::Combine(::testing::Values(SIGINT, SIGTERM, SIGHUP, SIGQUIT, SIGKILL),
                                             ::testing::Bool()));
 
-// --- the readers
-// ----------------------------------------------------------------------------------------
+// --- the readers --------------------------------------------------------------------------------------
 
 /// Of files that FFmpeg reads without a loss.
 TEST(SubtitleReader, AgreesWithFFmpeg) {

@@ -51,11 +51,29 @@ int reasonIn(int report) {
     return count == static_cast<ssize_t>(sizeof reason) ? reason : 0;
 }
 
-std::string startOf(int file) {
+std::string partOf(int file, off_t begin) {
     std::string text(kMaxComplaintBytes, '\0');
-    const ssize_t count = ::pread(file, text.data(), text.size(), 0);
+    const ssize_t count = ::pread(file, text.data(), text.size(), begin);
     text.resize(static_cast<size_t>(std::max<ssize_t>(count, 0)));
     return text;
+}
+
+std::string startOf(int file) {
+    return partOf(file, 0);
+}
+
+std::string endOf(int file) {
+    return partOf(file, std::max<off_t>(::lseek(file, 0, SEEK_END) - off_t{kMaxComplaintBytes}, 0));
+}
+
+/// As a program is given them: they stay those of `words`.
+std::vector<char*> pointersTo(std::vector<std::string>& words) {
+    std::vector<char*> pointers;
+    pointers.reserve(words.size() + 1);
+    for (std::string& word : words)
+        pointers.push_back(word.data());
+    pointers.push_back(nullptr);
+    return pointers;
 }
 
 /// Without what FFmpeg writes before a complaint, the name and the address of a part of it:
@@ -78,11 +96,12 @@ ChildProgram::ChildProgram(std::vector<std::string> words, Stream stream, int gi
     int theirs = feeds ? data.reading : data.writing;
     ::fcntl(mStream, F_SETPIPE_SZ, kPipeBytes);
 
+    const std::vector<char*> pointers = pointersTo(words);  // the child must not ask for memory
     const pid_t parent = ::getpid();
     mChild = ::fork();
     if (mChild == 0) {
         ::prctl(PR_SET_PDEATHSIG, SIGKILL);
-        if (::getppid() == parent) become(words, stream, theirs, given, report.writing);
+        if (::getppid() == parent) become(pointers.data(), stream, theirs, given, report.writing);
         ::_exit(kNotStarted);
     }
     const int fault = errno;
@@ -103,8 +122,7 @@ void ChildProgram::failToStart(int reason) {
     failWithErrno("cannot run " + mName);
 }
 
-void ChildProgram::become(std::vector<std::string>& words, Stream stream, int theirs, int given,
-                          int report) const {
+void ChildProgram::become(char* const* words, Stream stream, int theirs, int given, int report) const {
     const int nowhere = aside(::open("/dev/null", O_RDWR | O_CLOEXEC));
     const int data = aside(theirs);
     const int errors = aside(mErrors);
@@ -118,12 +136,7 @@ void ChildProgram::become(std::vector<std::string>& words, Stream stream, int th
                          ::dup2(feeds ? nowhere : data, STDOUT_FILENO) >= 0 &&
                          ::dup2(errors, STDERR_FILENO) >= 0 &&
                          (given < 0 || ::dup2(kept, kGivenFile) >= 0);
-    std::vector<char*> argv;
-    argv.reserve(words.size() + 1);
-    for (std::string& word : words)
-        argv.push_back(word.data());
-    argv.push_back(nullptr);
-    if (isReady) ::execvp(argv[0], argv.data());
+    if (isReady) ::execvp(words[0], words);
     const int reason = errno;
     [[maybe_unused]] const ssize_t count = ::write(told, &reason, sizeof reason);
 }
@@ -161,13 +174,15 @@ std::string ChildProgram::readAll(size_t maxBytes) {
     }
 }
 
-void ChildProgram::finish() {
+void ChildProgram::finish(const std::vector<std::string>& faults) {
     closeIfOpen(mStream);
     const int status = waitForEnd();
     if (WIFSIGNALED(status)) {
         throw ToolError(mName + " was ended by signal " + std::to_string(WTERMSIG(status)));
     }
     if (WEXITSTATUS(status) != 0) throw ToolError(mName + " failed: " + complaint());
+    const std::string fault = complaintAmong(faults);
+    if (!fault.empty()) throw ToolError(mName + " failed: " + fault);
 }
 
 int ChildProgram::waitForEnd() {
@@ -184,6 +199,18 @@ std::string ChildProgram::complaint() const {
     if (begin == std::string::npos) return "it does not say why";
     const size_t end = std::min(text.find_first_of("\r\n", begin), text.size());
     return withoutOrigin(text.substr(begin, end - begin));
+}
+
+std::string ChildProgram::complaintAmong(const std::vector<std::string>& faults) const {
+    const std::string text = faults.empty() ? "" : endOf(mErrors);
+    for (size_t at = 0; at < text.size();) {
+        const size_t end = std::min(text.find_first_of("\r\n", at), text.size());
+        const std::string line = withoutOrigin(text.substr(at, end - at));
+        const auto begins = [&](const std::string& fault) { return line.rfind(fault, 0) == 0; };
+        if (std::any_of(faults.begin(), faults.end(), begins)) return line;
+        at = end + 1;
+    }
+    return "";
 }
 
 }  // namespace vorelpaint

@@ -34,14 +34,16 @@ class ChildProgram {
     std::string readAll(size_t maxBytes);
 
     /// Closes the stream and waits for its end. Throws ToolError, with the first line that it wrote to
-    /// standard error, when it did not end well.
-    void finish();
+    /// standard error, when it did not end well, and with one of its last lines, which begins with one
+    /// of `faults`, when it ended as if it had.
+    void finish(const std::vector<std::string>& faults = {});
 
   private:
     [[noreturn]] void failToStart(int reason);
-    void become(std::vector<std::string>& words, Stream stream, int theirs, int given, int report) const;
+    void become(char* const* words, Stream stream, int theirs, int given, int report) const;
     int waitForEnd();
     std::string complaint() const;
+    std::string complaintAmong(const std::vector<std::string>& faults) const;
 
     std::string mName;
     pid_t mChild = -1;

@@ -22,6 +22,7 @@
 #include "painting.h"
 #include "png_writer.h"
 #include "progress.h"
+#include "spread_colours.h"
 
 namespace vorelpaint {
 namespace {
@@ -162,17 +163,26 @@ int64_t framesToSend(const Film& film) {
     return std::min(count, film.rate.framesBefore(*film.clip->durationMs)) + 1;
 }
 
+/// The rows of a frame as ffmpeg is to take them.
+Image rowsIn(const Image& picture, const FilmPlan& plan) {
+    constexpr int kReach = 8;  // as far as a block of a codec is wide
+    const auto row = [&](int y) {
+        return picture.pixels.begin() + static_cast<std::ptrdiff_t>(offsetOf(picture, 0, y));
+    };
+    Image rows{picture.width, plan.rows.height(), {row(plan.rows.top), row(plan.rows.bottom)}};
+    if (mixesColours(plan)) spreadColours(rows, kReach);
+    return rows;
+}
+
 /// ffmpeg may close its input early, when the clip ends before the cues do.
-void feed(const Film& film, const Box& rows, ChildProgram& ffmpeg) {
+void feed(const Film& film, const FilmPlan& plan, ChildProgram& ffmpeg) {
     FilmFrames frames(film.options, film.cues, film.rate);
-    const Image& picture = frames.picture();
-    const size_t begin = offsetOf(picture, 0, rows.top);
-    const size_t size = offsetOf(picture, 0, rows.bottom) - begin;
     const int64_t count = framesToSend(film);
     Progress progress("frames", static_cast<size_t>(count));
+    Image rows;
     for (int64_t frame = 0; frame < count; ++frame) {
-        frames.advanceTo(frame);
-        if (!ffmpeg.write(picture.pixels.data() + begin, size)) break;
+        if (frames.advanceTo(frame)) rows = rowsIn(frames.picture(), plan);
+        if (!ffmpeg.write(rows.pixels.data(), rows.pixels.size())) break;
         progress.advance();
     }
 }
@@ -196,14 +206,20 @@ FilmPlan planOf(const Film& film) {
             film.clip};
 }
 
+/// In version 5.1 ffmpeg ends as if all were well when there is no room for the end of a file.
+const std::vector<std::string>& unfinishedFile() {
+    static const std::vector<std::string> faults{"Error writing trailer", "Error closing file"};
+    return faults;
+}
+
 void writeFilm(const Film& film) {
     const std::string& output = *film.options.output;
     const FilmPlan plan = planOf(film);
     NewFile file(followLinks(output));
     ChildProgram ffmpeg(ffmpegWords(plan), ChildProgram::Stream::input, ::fileno(file.get()));
-    feed(film, plan.rows, ffmpeg);
+    feed(film, plan, ffmpeg);
     try {
-        ffmpeg.finish();
+        ffmpeg.finish(unfinishedFile());
     } catch (const ToolError& error) {
         throw ToolError("cannot write " + inQuotes(output) + ": " + error.what());
     }

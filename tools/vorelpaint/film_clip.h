@@ -23,8 +23,8 @@ struct Clip {
     std::vector<std::string> audioCodecs;  ///< as FFmpeg names them, one of each stream of sound
 };
 
-/// Asks ffprobe for the first stream of moving pictures, not of a cover, and all of sound. Throws ToolError, naming the clip,
-/// when it cannot be read or has no pictures.
+/// Asks ffprobe for the first stream of moving pictures, not of a cover, and all of sound. Throws
+/// ToolError, naming the clip, when it cannot be read or has no pictures.
 Clip readClip(const std::string& path);
 
 /// The clip that ffprobe tells of in its "flat" form, a key and a value a line. Throws ToolError.

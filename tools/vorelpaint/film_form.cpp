@@ -125,10 +125,14 @@ std::string padFilter(const FilmPlan& plan) {
            ":x=0:y=" + std::to_string(plan.rows.top) + ":color=black@0";
 }
 
-/// What the codec is to find: colours of its kind, and no alpha where there is nothing to see through.
+/// What the codec is to find: colours of its kind, which say what they are, and no alpha where there is
+/// nothing to see through. Options of the encoder would say it too, but what the frames say counts.
 std::string coloursFilter(const FilmPlan& plan) {
     if (isYuvBlended(plan)) return "";
-    if (plan.codec.isYuv) return "," + scaleTo("bt709", false);
+    if (plan.codec.isYuv) {
+        return "," + scaleTo("bt709", false) +
+               ",setparams=range=tv:colorspace=bt709:color_primaries=bt709:color_trc=bt709";
+    }
     return plan.isTransparent ? "" : ",format=bgr0";
 }
 
@@ -193,6 +197,10 @@ const FilmCodec& filmCodec(const std::string& output, const std::optional<std::s
                     vorelstyle::joined(others));
 }
 
+bool mixesColours(const FilmPlan& plan) {
+    return plan.clip ? !isRgb(*plan.clip) : plan.isTransparent && plan.codec.isYuv;
+}
+
 std::vector<std::string> ffmpegWords(const FilmPlan& plan) {
     const Container& container = *containerOf(plan.output);
     Words words{"ffmpeg", "-hide_banner", "-nostdin", "-v", "error", "-y"};
@@ -205,10 +213,6 @@ std::vector<std::string> ffmpegWords(const FilmPlan& plan) {
     add(words, {"-filter_complex", filterOf(plan), "-map", "[film]"});
     if (plan.clip) add(words, soundWords(plan));
     add(words, plan.isTransparent ? plan.codec.transparent : plan.codec.opaque);
-    if (plan.codec.isYuv && !isYuvBlended(plan)) {
-        add(words, {"-colorspace", "bt709", "-color_primaries", "bt709", "-color_trc", "bt709",
-                    "-color_range", "tv"});
-    }
     if (container.ending == "mp4" || container.ending == "mov") add(words, {"-movflags", "+faststart"});
     add(words,
         {"-f", container.format, fileUrl("/proc/self/fd/" + std::to_string(ChildProgram::kGivenFile))});

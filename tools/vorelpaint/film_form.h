@@ -42,8 +42,7 @@ const std::vector<std::string>& filmCodecNames();
 const FilmCodec& filmCodec(const std::string& output, const std::optional<std::string>& asked,
                            bool isTransparent);
 
-/// What ffmpeg is run with: frames of `rows` alone come to its standard input, raw, and the film goes to
-/// the file that it is given.
+/// A film that ffmpeg is to make.
 struct FilmPlan {
     std::string output;
     const FilmCodec& codec;
@@ -54,6 +53,12 @@ struct FilmPlan {
     std::string over;     ///< a clip's path, empty for none
     std::optional<Clip> clip;
 };
+
+/// Whether the colours of neighbouring pixels are mixed before their alpha counts.
+bool mixesColours(const FilmPlan& plan);
+
+/// What ffmpeg is run with: frames of `rows` alone come to its standard input, raw, and the film goes to
+/// the file that it is given.
 std::vector<std::string> ffmpegWords(const FilmPlan& plan);
 
 }  // namespace vorelpaint
