@@ -7,7 +7,7 @@ cd "$(dirname "$0")/.."
 
 need_packages cmake ninja-build g++ pkg-config dpkg-dev file gzip \
     libfreetype-dev libfribidi-dev libharfbuzz-dev libunibreak-dev libfontconfig-dev libpng-dev \
-    nlohmann-json3-dev libcli11-dev
+    libdeflate-dev nlohmann-json3-dev libcli11-dev
 
 build=build/debian
 # In /usr the multiarch directories are chosen, and programs need no search path of their own. No path

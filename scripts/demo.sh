@@ -40,7 +40,7 @@ build() {
 echo "demo.sh: building vorelpaint in $build" >&2
 need_packages cmake ninja-build g++ pkg-config fonts-dejavu-core \
     libfreetype-dev libfribidi-dev libharfbuzz-dev libfontconfig-dev libpng-dev \
-    libunibreak-dev nlohmann-json3-dev libcli11-dev
+    libdeflate-dev libunibreak-dev nlohmann-json3-dev libcli11-dev
 
 # The Release build of scripts/test.sh has the same program: where there is one, it is this build as well.
 [[ -e $build ]] || rm -f "$build"

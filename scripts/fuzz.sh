@@ -28,7 +28,7 @@ targets=("$@")
 
 packages=(cmake ninja-build g++ clang-14 libclang-rt-14-dev llvm-14 pkg-config libgtest-dev
     libraqm-dev libfreetype-dev libfribidi-dev libharfbuzz-dev libunibreak-dev libfontconfig-dev
-    libpng-dev nlohmann-json3-dev libcli11-dev fonts-dejavu-core android-liblog-dev)
+    libpng-dev libdeflate-dev nlohmann-json3-dev libcli11-dev fonts-dejavu-core android-liblog-dev)
 
 if [[ $seconds = --coverage ]]; then
     [[ $# -eq 0 || $* = committed ]] || usage

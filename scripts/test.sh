@@ -12,7 +12,7 @@ cd "$(dirname "$0")/.."
 need_packages cmake ninja-build g++ clang-14 libclang-rt-14-dev pkg-config \
     libc++-14-dev libc++abi-14-dev googletest libgtest-dev libbenchmark-dev libstb-dev android-liblog-dev \
     libraqm-dev libfreetype-dev libfribidi-dev libharfbuzz-dev libfontconfig-dev libpng-dev \
-    libunibreak-dev nlohmann-json3-dev libcli11-dev libharfbuzz-bin fontconfig fonts-dejavu-core \
+    libdeflate-dev libunibreak-dev nlohmann-json3-dev libcli11-dev libharfbuzz-bin fontconfig fonts-dejavu-core \
     fonts-hosny-amiri culmus fonts-lohit-deva fonts-tlwg-loma-ttf fonts-vlgothic fonts-alee \
     fonts-noto-color-emoji fonts-inter-variable \
     python3 python3-jsonschema zsh fish mandoc bsdextrautils ffmpeg \
