@@ -549,7 +549,7 @@ TEST_F(RefusedFilms, Clips_ThatCannotBeRead) {
         {"ffmpeg", "-nostdin", "-v", "error", "-f", "lavfi", "-i", "sine=duration=1", fileUrl(sound)});
     const std::string fast = makeClip(mDir.file("fast.mkv"), "500", {"-c:v", "ffv1"}, "64x64", "0.1");
     EXPECT_EQ(faultOf(asked(to + Words{"--over", fast})),
-              "'" + fast + "' has no steady frame rate; give one by --fps");
+              "'" + fast + "' has no steady frame rate of 1 to 240; give one by --fps");
     EXPECT_EQ(faultOf(asked(to + Words{"--over", sound})),
               "cannot read '" + sound + "': it has no moving pictures");
 }

@@ -22,6 +22,7 @@
 #include "painting.h"
 #include "png_writer.h"
 #include "progress.h"
+#include "ranges.h"
 #include "spread_colours.h"
 
 namespace vorelpaint {
@@ -52,7 +53,8 @@ FrameRate rateOf(const Options& options, const std::optional<Clip>& clip) {
     if (options.film.rate) return *options.film.rate;
     if (!clip) return kFilmRate;
     if (clip->rate) return *clip->rate;
-    throw ToolError(inQuotes(*options.film.over) + " has no steady frame rate; give one by --fps");
+    throw ToolError(inQuotes(*options.film.over) + " has no steady frame rate of " +
+                    spelled(kFrameRates) + "; give one by --fps");
 }
 
 Options sized(const Options& asked, const std::optional<Clip>& clip) {

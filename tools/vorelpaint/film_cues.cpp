@@ -3,10 +3,10 @@
 #include <algorithm>
 #include <filesystem>
 #include <new>
-#include <string_view>
 
 #include "error.h"
 #include "painting.h"
+#include "path_ending.h"
 #include "style_file.h"
 #include "subtitle_reader.h"
 
@@ -26,10 +26,7 @@ constexpr const char* kUsualPreset = "subtitle";
 const std::string kCommonLook;  ///< the name of the look of all cues that have no other
 
 bool isFile(const std::string& look) {
-    constexpr std::string_view kEnding = ".json";
-    const bool endsSo = look.size() > kEnding.size() &&
-                        look.compare(look.size() - kEnding.size(), kEnding.size(), kEnding) == 0;
-    return endsSo || look.find('/') != std::string::npos;
+    return vorelstyle::isSameWord(endingOf(look), "json") || look.find('/') != std::string::npos;
 }
 
 Style commonStyle(const Options& options) {

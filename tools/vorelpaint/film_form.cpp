@@ -7,6 +7,7 @@
 #include "child_program.h"
 #include "error.h"
 #include "file_io.h"
+#include "path_ending.h"
 #include "style/vorelstyle.h"
 
 namespace vorelpaint {
@@ -71,12 +72,6 @@ const std::array<FilmCodec, 5>& codecs() {
          {"png", {"mov", "mkv"}, {}, {"-c:v", "png", "-pix_fmt", "rgba"}, false, false},
          {"vp9", {"webm", "mkv"}, vp9In("yuv420p"), vp9In("yuva420p"), true, false}}};
     return all;
-}
-
-std::string_view endingOf(const std::string& path) {
-    const size_t dot = path.find_last_of("./");
-    if (dot == std::string::npos || path[dot] != '.') return {};
-    return std::string_view(path).substr(dot + 1);
 }
 
 const Container* containerOf(const std::string& output) {

@@ -284,8 +284,8 @@ std::vector<Setting> cueSettings() {
     Setting styles =
         programOption("cue-style", "NAME=LOOK", kGroup,
                       "Paint cues of this name (WebVTT: class, voice or identifier; ASS: style or "
-                      "speaker) in a preset "
-                      "or a style file, or with none not at all; of several that fit, the first counts",
+                      "speaker) in a preset or a style file, or with none not at all; of several "
+                      "that fit, the first counts",
                       addCueStyle);
     styles.kind = Setting::Kind::list;
     styles.forget = [](Options& options) { options.film.cueStyles.clear(); };
@@ -326,8 +326,8 @@ std::vector<Setting> outputSettings() {
     constexpr const char* kGroup = "Picture";
     Setting output = pictureOption(
         "output", "FILE", "", kGroup,
-        "The PNG file to write, - for standard output; of --subtitles a .mp4, .mov, .mkv or "
-        ".webm, numbered pictures (frame_%05d.png) or raw frames (-, .rgba)",
+        "The PNG file to write, - for standard output; of --subtitles a .mp4, .mov, .mkv or .webm, "
+        "numbered pictures (frame_%05d.png) or raw frames (-, .rgba)",
         readOutput);
     output.letter = "o";
     return {output,

@@ -8,6 +8,7 @@
 
 #include "error.h"
 #include "file_io.h"
+#include "path_ending.h"
 #include "read_value.h"
 #include "style/vorelstyle.h"
 #include "subtitle_text.h"
@@ -299,11 +300,8 @@ constexpr std::array<std::pair<std::string_view, Reader>, 4> kReaders{
     {{"srt", readSrt}, {"vtt", readVtt}, {"ass", readAss}, {"ssa", readAss}}};
 
 Reader readerOf(const std::string& path) {
-    const size_t dot = path.find_last_of("./");
-    const std::string_view ending =
-        dot == std::string::npos || path[dot] != '.' ? "" : std::string_view(path).substr(dot + 1);
     for (const auto& [known, reader] : kReaders) {
-        if (isSameWord(ending, known)) return reader;
+        if (isSameWord(endingOf(path), known)) return reader;
     }
     throw ToolError(inQuotes(path) + " is no subtitle file; .srt, .vtt, .ass and .ssa are read");
 }

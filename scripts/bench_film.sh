@@ -20,16 +20,18 @@ work=$(mktemp -d)
 trap 'rm -rf "$work"' EXIT
 cd "$work"
 
-# A minute with a cue of two lines every two seconds, each of 1.8 seconds; and its first ten.
-minute() {
+# cues COUNT: one of two lines every two seconds, each of 1.8 seconds.
+cues() {
     local i begin='%02d:%02d:%02d,%03d'
-    for i in {0..29}; do
-        printf "%d\n$begin --> $begin\n%s\n%s\n\n" $((i + 1)) 0 0 $((2 * i)) 0 0 0 $((2 * i + 1)) 800 \
+    for ((i = 0; i < $1; ++i)); do
+        printf "%d\n$begin --> $begin\n%s\n%s\n\n" $((i + 1)) 0 $((i / 30)) $((2 * i % 60)) 0 \
+            0 $((i / 30)) $((2 * i % 60 + 1)) 800 \
             "The light goes, the road is long ($i)," "and then we walk until it comes again."
     done
 }
-minute > minute.srt
-head -n 25 minute.srt > ten.srt
+cues 300 > ten_minutes.srt
+cues 30 > minute.srt
+cues 5 > ten_seconds.srt
 ffmpeg -nostdin -v error -f lavfi -i testsrc2=duration=10:size=1920x1080:rate=30 -c:v libx264 \
     -preset ultrafast -qp 10 clip.mp4
 
@@ -58,15 +60,15 @@ model=$(sed -n 's/^model name[^:]*: //p' /proc/cpuinfo | head -n 1)
     echo "| 1920 x 1080 at 30 frames a second, one core of ${model:-this machine} | seconds | frames a second | times real time |"
     echo "|---|---|---|---|"
     for preset in subtitle neon; do
-        row "a minute of \`$preset\`, made and written to /dev/null" 1800 \
-            "$(seconds "$vorelpaint" --subtitles minute.srt --preset $preset -o /dev/null)"
-        row "the same with fades of 250 ms" 1800 \
-            "$(seconds "$vorelpaint" --subtitles minute.srt --preset $preset "${fades[@]}" -o /dev/null)"
+        row "ten minutes of \`$preset\`, made and written to /dev/null" 18000 \
+            "$(seconds "$vorelpaint" --subtitles ten_minutes.srt --preset $preset -o /dev/null)"
+        row "the same with fades of 250 ms" 18000 \
+            "$(seconds "$vorelpaint" --subtitles ten_minutes.srt --preset $preset "${fades[@]}" -o /dev/null)"
     done
     row "a minute of \`subtitle\` with fades, through a pipe to \`cat\`" 1800 \
         "$(seconds bash -c 'through_pipe "$@"' - --subtitles minute.srt "${fades[@]}")"
     row "ten seconds burnt into a clip, H.264" 300 \
-        "$(seconds "$vorelpaint" --subtitles ten.srt "${fades[@]}" --over clip.mp4 -o film.mp4)"
+        "$(seconds "$vorelpaint" --subtitles ten_seconds.srt "${fades[@]}" --over clip.mp4 -o film.mp4)"
     row "the clip encoded in the same way without cues, by ffmpeg" 300 \
         "$(seconds ffmpeg -nostdin -v error -i clip.mp4 -c:v libx264 -preset medium -crf 18 -y plain.mp4)"
 } > figures.md
