@@ -2,8 +2,8 @@
 // output: raw premultiplied R, G, B, A of 640 x 360 pixels, 25 a second, for FFmpeg to lay over a film.
 //
 //     subtitles FILE.srt [FONT_FILE] | ffmpeg -i film.mp4
-//         -f rawvideo -pixel_format rgba -video_size 640x360 -framerate 25 -i -
-//         -filter_complex "[1:v]format=gbrap,unpremultiply=inplace=1[cues];[0:v][cues]overlay=format=gbrp"
+//         -f rawvideo -pixel_format rgba -video_size 640x360 -framerate 25 -i - -filter_complex
+//         "[1:v]format=gbrap,unpremultiply=inplace=1[cues]; [0:v][cues]overlay=format=gbrp"
 //         subtitled.mp4
 //
 // What files of films have besides (tags, other formats, lines that are too long) is left to

@@ -205,7 +205,7 @@ std::string ChildProgram::complaintAmong(const std::vector<std::string>& faults)
     const std::string text = faults.empty() ? "" : endOf(mErrors);
     for (size_t at = 0; at < text.size();) {
         const size_t end = std::min(text.find_first_of("\r\n", at), text.size());
-        const std::string line = withoutOrigin(text.substr(at, end - at));
+        std::string line = withoutOrigin(text.substr(at, end - at));
         const auto begins = [&](const std::string& fault) { return line.rfind(fault, 0) == 0; };
         if (std::any_of(faults.begin(), faults.end(), begins)) return line;
         at = end + 1;

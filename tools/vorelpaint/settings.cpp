@@ -295,7 +295,7 @@ std::vector<Setting> cueSettings() {
             "subtitles", "FILE", kGroup, "Paint the cues of a .srt, .vtt or .ass file as a film",
             ofFilm([](FilmOptions& film, const std::string& given) { film.subtitles = given; })),
         styles,
-        programOption("fade-in", "MS", kGroup, fades.c_str(),
+        programOption("fade-in", "MS", kGroup, fades,
                       ofFilm([](FilmOptions& film, const std::string& given) {
                           film.fadeInMs = readNumber(kFade, given);
                       })),
@@ -313,9 +313,9 @@ std::vector<Setting> filmSettings() {
         programOption("fps", "RATE", kGroup,
                       "Frames a second, such as 24 or 24000/1001 (the clip's, else 30)",
                       ofFilm(readFrameRate)),
-        programOption("codec", codecWords().c_str(), kGroup,
+        programOption("codec", codecWords(), kGroup,
                       "How the film is stored, where its ending leaves a choice", ofFilm(readCodec)),
-        programOption("each", listed(kPicturesOf, "|").c_str(), kGroup,
+        programOption("each", listed(kPicturesOf, "|"), kGroup,
                       "What a numbered output has a picture of (frame)",
                       ofFilm([](FilmOptions& film, const std::string& given) {
                           film.pictureOf = wordAmong(kPicturesOf, given);
