@@ -491,6 +491,17 @@ TEST_F(Films, Names_MayBeAnything) {
     EXPECT_EQ(here.list(), Words{"clip.mp4"});
 }
 
+TEST_F(Films, WhereFilesMustHaveNames_TheyAreMadeToo) {
+    Surroundings surroundings;
+    surroundings.unnamedFiles = false;
+    const TempDir films;
+    const Words asIs = inFrames({"--fps", "5", "-o"});
+    const Outcome outcome = runVorelpaintIn(surroundings, asIs + Words{films.file("a.mkv")});
+    EXPECT_EQ(outcome.exitCode, 0) << outcome.err;
+    EXPECT_EQ(films.list(), Words{"a.mkv"});
+    EXPECT_TRUE(framesOf(films.file("a.mkv"), "rgba") == made(asIs + Words{"-"}));
+}
+
 TEST_F(Films, InItsOwnPlace_AClipMayBeReplaced) {
     const std::string clip = makeClip(mDir.file("clip.mkv"), "10", {"-c:v", "ffv1"});
     const std::string old = readBytes(clip);
