@@ -26,7 +26,8 @@ set(CPACK_DEBIAN_PACKAGE_GENERATE_SHLIBS_POLICY ">=")
 set(CPACK_DEBIAN_RUNTIME_PACKAGE_CONTROL_EXTRA ${PROJECT_SOURCE_DIR}/packaging/debian/triggers)
 set(runtime libvoreleffect${VOREL_ABI})
 set(CPACK_DEBIAN_DEVELOPMENT_PACKAGE_DEPENDS "${runtime} (= ${PROJECT_VERSION})")
-set(CPACK_DEBIAN_TOOL_PACKAGE_DEPENDS "${runtime} (>= ${PROJECT_VERSION})")
+# ffmpeg is run for films; nothing that is read from the program tells so.
+set(CPACK_DEBIAN_TOOL_PACKAGE_DEPENDS "${runtime} (>= ${PROJECT_VERSION}), ffmpeg")
 set(CPACK_DEBIAN_TOOL_PACKAGE_RECOMMENDS fonts-dejavu-core)
 
 set(about "voreleffect paints strokes, shadows, glows, gradients and patterns\naround and into \

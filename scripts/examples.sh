@@ -10,7 +10,7 @@ cd "$(dirname "$0")/.."
 . scripts/quietly.sh
 
 need_packages cmake ninja-build g++ pkg-config libfreetype-dev libharfbuzz-dev libpng-dev \
-    fonts-dejavu-core file
+    fonts-dejavu-core file ffmpeg
 
 root=$PWD
 build=$root/build/examples
@@ -22,16 +22,22 @@ if [[ $# -eq 0 ]]; then
     quietly cmake --build "$build/library" --target install
 fi
 
-# paint NAME PICTURE ARGUMENT...: builds an example and runs it among the pictures
-paint() {
-    local name=$1 picture=$2
-    shift 2
+# compile NAME: builds an example
+compile() {
+    local name=$1
     # A new prefix, a new search for the library.
     quietly cmake --fresh -S "examples/$name" -B "$build/$name" -G Ninja -DCMAKE_BUILD_TYPE=Release \
         -DCMAKE_PREFIX_PATH="$prefix" -DCMAKE_CXX_FLAGS="-Wall -Wextra -Wconversion -Wshadow -Werror"
     grep -q "^voreleffect_DIR:PATH=$prefix/" "$build/$name/CMakeCache.txt" ||
         { echo "$name: not built with the library in $prefix" >&2; return 1; }
     quietly cmake --build "$build/$name"
+}
+
+# paint NAME PICTURE ARGUMENT...: builds an example and runs it among the pictures
+paint() {
+    local name=$1 picture=$2
+    shift 2
+    compile "$name"
     (cd "$pictures" && "$build/$name/$name" "$@")
     [[ $(file -b "$pictures/$picture") == *"image data"* ]] || { echo "$name: no picture" >&2; return 1; }
     echo "$name: build/examples/pictures/$picture"
@@ -43,8 +49,21 @@ paint hello_effect hello_effect.ppm
 paint freetype_text freetype_text.png
 paint glyph_cache glyph_cache.png
 paint stacked_looks stacked_looks.png
-paint subtitles subtitles/frame_00000.png "$root/examples/subtitles/sample.srt" subtitles 6
 
-# From 0 to the end of the last cue and half a second more: 8 seconds of 6 frames.
-frames=$(find "$pictures/subtitles" -name '*.png' | wc -l)
-[[ $frames -eq 48 ]] || { echo "subtitles: $frames frames, not 48" >&2; exit 1; }
+# Laid over a film, as the program's source says, the cues of the sample are seen in the frames of their
+# times, from 0.5, 3.0 and 5.3 seconds to 2.5, 5.0 and 7.5; the others stay what they are.
+compile subtitles
+film=$build/subtitles/film.mkv
+subtitled=$build/subtitles/subtitled.mkv
+lossless=(-c:v ffv1 -pix_fmt gbrp -y)
+ffmpeg -nostdin -v error -f lavfi -i testsrc2=size=640x360:rate=25:duration=8 "${lossless[@]}" "$film"
+"$build/subtitles/subtitles" examples/subtitles/sample.srt |
+    ffmpeg -v error -i "$film" -f rawvideo -pixel_format rgba -video_size 640x360 -framerate 25 -i - \
+        -filter_complex "[1:v]format=gbrap,unpremultiply=inplace=1[cues];[0:v][cues]overlay=format=gbrp" \
+        "${lossless[@]}" "$subtitled"
+frames_of() { ffmpeg -nostdin -v error -i "$1" -f framemd5 - | sed '/^#/d; s/.*, *//'; }
+seen=$(paste <(frames_of "$film") <(frames_of "$subtitled") | awk '$1 != $2 { print NR - 1 }')
+[[ $seen == "$(seq 13 62; seq 75 124; seq 133 187)" ]] ||
+    { echo "subtitles: seen in the frames ${seen//$'\n'/ }" >&2; exit 1; }
+ffmpeg -nostdin -v error -ss 4 -i "$subtitled" -frames:v 1 -y "$pictures/subtitles.png"
+echo "subtitles: build/examples/pictures/subtitles.png"

@@ -22,7 +22,7 @@ usage() { sed -n '2,/^set/s/^# \{0,1\}//p' "$0" >&2; exit 2; }
 [[ ${1:-} =~ ^([1-9][0-9]*|--merge|--coverage)$ ]] || usage
 seconds=$1
 shift
-all_targets=(fuzz_effect_set fuzz_differential fuzz_blender fuzz_style fuzz_job fuzz_text)
+all_targets=(fuzz_effect_set fuzz_differential fuzz_blender fuzz_style fuzz_job fuzz_subtitles fuzz_text)
 targets=("$@")
 [[ $# -gt 0 ]] || targets=("${all_targets[@]}")
 
@@ -65,8 +65,8 @@ export ASAN_SYMBOLIZER_PATH=/usr/bin/llvm-symbolizer-14
 logs=build/fuzz/logs
 mkdir -p "$logs"
 
-# Longest input of a target: style files and jobs are text, the others are short programs of calls.
-longest() { [[ $1 = fuzz_style || $1 = fuzz_job ]] && echo 4096 || echo 1024; }
+# Longest input of a target: style files, jobs and subtitles are text, the others are short programs of calls.
+longest() { [[ $1 = fuzz_style || $1 = fuzz_job || $1 = fuzz_subtitles ]] && echo 4096 || echo 1024; }
 
 if [[ $seconds = --merge ]]; then
     for target in "${targets[@]}"; do

@@ -6,7 +6,7 @@ set -euo pipefail
 cd "$(dirname "$0")/.."
 . scripts/packages.sh
 . scripts/quietly.sh
-need_packages cmake ninja-build g++ pkg-config binutils python3
+need_packages cmake ninja-build g++ pkg-config binutils python3 ffmpeg
 
 source=$PWD
 build=$source/build/install
@@ -117,8 +117,10 @@ files=$(scripts/debian.sh)
 mapfile -t files <<< "$files"
 names=(libvoreleffect1 libvoreleffect-dev vorelpaint)
 for file in "${files[@]}"; do
-    [[ $file == */libvoreleffect1_* || $(dpkg-deb --field "$file" Depends) == *"libvoreleffect1 ("* ]] ||
+    depends=$(dpkg-deb --field "$file" Depends)
+    [[ $file == */libvoreleffect1_* || $depends == *"libvoreleffect1 ("* ]] ||
         fail "$file does not depend on libvoreleffect1"
+    [[ $file != */vorelpaint_* || ", $depends," == *", ffmpeg,"* ]] || fail "$file does not depend on ffmpeg"
 done
 ! dpkg-query -W "${names[@]}" 2> /dev/null | grep . || fail "a package is installed already: not touched"
 packages=("${names[@]}")
@@ -128,6 +130,9 @@ by_pkg_config "Debian, pkg-config" shared
 picture=$outside/picture.png
 (cd / && vorelpaint --preset gold -o "$picture" "Installed")
 [[ $(file -b "$picture") == PNG* ]] || fail "Debian: vorelpaint paints no picture"
+printf '00:00:00,000 --> 00:00:00,200\nInstalled\n' > "$outside/film.srt"
+(cd / && vorelpaint --subtitles "$outside/film.srt" --background "#204060" -o "$outside/film.mp4")
+[[ $(file -b "$outside/film.mp4") == *MP4* ]] || fail "Debian: vorelpaint makes no film"
 [[ $(vorelpaint --version) == "vorelpaint $version" ]] || fail "Debian: vorelpaint tells another version"
 # Kept whole before it is searched: a search that ends at its first match would break ldd's pipe.
 taken=$(ldd "$(command -v vorelpaint)")

@@ -21,6 +21,6 @@ case " $* " in
         python3 g++-aarch64-linux-gnu qemu-user-static ;;
     *) need_packages cmake ninja-build g++ pkg-config libgtest-dev libfreetype-dev fonts-dejavu-core \
         android-liblog-dev libraqm-dev libfribidi-dev libharfbuzz-dev libfontconfig-dev libpng-dev \
-        nlohmann-json3-dev libcli11-dev python3 python3-jsonschema zsh fish mandoc locales ;;
+        libdeflate-dev nlohmann-json3-dev libcli11-dev python3 python3-jsonschema zsh fish mandoc ffmpeg locales ;;
 esac
 exec python3 -B scripts/mutants.py "$@"

@@ -15,7 +15,7 @@ need_packages cmake ninja-build g++ clang-14 libclang-rt-14-dev pkg-config \
     libdeflate-dev libunibreak-dev nlohmann-json3-dev libcli11-dev libharfbuzz-bin fontconfig fonts-dejavu-core \
     fonts-hosny-amiri culmus fonts-lohit-deva fonts-tlwg-loma-ttf fonts-vlgothic fonts-alee \
     fonts-noto-color-emoji fonts-inter-variable \
-    python3 python3-jsonschema zsh fish mandoc bsdextrautils \
+    python3 python3-jsonschema zsh fish mandoc bsdextrautils ffmpeg \
     locales g++-aarch64-linux-gnu qemu-user-static
 
 presets=("$@")

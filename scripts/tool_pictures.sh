@@ -4,8 +4,8 @@ set -euo pipefail
 cd "$(dirname "$0")/.."
 . scripts/packages.sh
 
-need_packages python3 fonts-dejavu-core fonts-noto-color-emoji fonts-vlgothic
+need_packages python3 fonts-dejavu-core fonts-noto-color-emoji fonts-vlgothic ffmpeg
 scripts/demo.sh > /dev/null
-for page in vorelpaint style-files layer-styles captions; do
+for page in vorelpaint style-files layer-styles captions film; do
     python3 -B scripts/docs/page_commands.py build/demo/tools/vorelpaint "docs/$page.md" --paint
 done

@@ -1,40 +1,37 @@
-// Burns subtitles into a film: reads an SRT file, paints each cue once with an outline and a shadow, and
-// lays it over every frame in which it is shown. The frames, drawn by this program in place of a
-// decoder's, are written as DIRECTORY/frame_00000.png and so on.
+// Paints the cues of an SRT file, each of them once, and writes the frames that show them to standard
+// output: raw premultiplied R, G, B, A of 640 x 360 pixels, 25 a second, for FFmpeg to lay over a film.
 //
-//     subtitles FILE.srt DIRECTORY [FRAMES_PER_SECOND [FONT_FILE]]
+//     subtitles FILE.srt [FONT_FILE] | ffmpeg -i film.mp4
+//         -f rawvideo -pixel_format rgba -video_size 640x360 -framerate 25 -i - -filter_complex
+//         "[1:v]format=gbrap,unpremultiply=inplace=1[cues]; [0:v][cues]overlay=format=gbrp"
+//         subtitled.mp4
 //
-// A cue that cannot be read is reported and left out; the exit code is then 1.
+// What files of films have besides (tags, other formats, lines that are too long) is left to
+// vorelpaint --subtitles.
 #include <ft2build.h>
 #include <hb-ft.h>
-#include <png.h>
-#include <unistd.h>
 #include <voreleffect/voreleffect.h>
 
 #include <algorithm>
-#include <cmath>
+#include <cstdint>
 #include <cstdio>
-#include <cstdlib>
-#include <filesystem>
 #include <fstream>
 #include <istream>
-#include <memory>
+#include <map>
 #include <string>
 #include <utility>
 #include <vector>
 #include FT_FREETYPE_H
 
 using namespace VFontEffect;
-namespace fs = std::filesystem;
 
 namespace {
 
 constexpr int kWidth = 640;
 constexpr int kHeight = 360;
+constexpr int kFramesPerSecond = 25;
 constexpr int kTextPixels = 28;
 constexpr int kFromBottom = 18;
-constexpr int kFromSides = 40;
-constexpr int kTailMs = 500;
 
 // --- The SRT file -----------------------------------------------------------------------------------
 
@@ -44,73 +41,36 @@ struct Cue {
     std::vector<std::string> lines;
 };
 
-struct Script {
-    std::vector<Cue> cues;
-    int faults = 0;
-};
-
-/// The lines of a file of any system, without their ends.
-class LineReader {
-  public:
-    explicit LineReader(std::istream& file) : mFile(file) {}
-
-    bool next(std::string& line) {
-        if (!std::getline(mFile, line)) return false;
-        if (!line.empty() && line.back() == '\r') line.pop_back();
-        if (++number == 1 && line.compare(0, 3, "\xEF\xBB\xBF") == 0) line.erase(0, 3);
-        return true;
-    }
-
-    int number = 0;
-
-  private:
-    std::istream& mFile;
-};
-
-/// "00:01:02,500 --> 00:01:05,000"; some programs write a point for the comma.
+/// "00:01:02,500 --> 00:01:05,000"
 bool parseTimes(const std::string& line, Cue& cue) {
     int h[2], m[2], s[2], ms[2];
-    if (std::sscanf(line.c_str(), "%2d:%2d:%2d%*1[,.]%3d --> %2d:%2d:%2d%*1[,.]%3d", &h[0], &m[0], &s[0],
-                    &ms[0], &h[1], &m[1], &s[1], &ms[1]) != 8) {
+    if (std::sscanf(line.c_str(), "%2d:%2d:%2d,%3d --> %2d:%2d:%2d,%3d", &h[0], &m[0], &s[0], &ms[0],
+                    &h[1], &m[1], &s[1], &ms[1]) != 8) {
         return false;
     }
     cue.startMs = ((h[0] * 60 + m[0]) * 60 + s[0]) * 1000 + ms[0];
     cue.endMs = ((h[1] * 60 + m[1]) * 60 + s[1]) * 1000 + ms[1];
-    return 0 <= cue.startMs && cue.startMs < cue.endMs;
+    return true;
 }
 
-/// Drops tags such as <i>.
-std::string withoutTags(const std::string& line) {
-    std::string text;
-    bool inTag = false;
-    for (const char c : line) {
-        if (c == '<') inTag = true;
-        if (!inTag) text += c;
-        if (c == '>') inTag = false;
-    }
-    return text;
+bool nextLine(std::istream& file, std::string& line) {
+    if (!std::getline(file, line)) return false;
+    if (!line.empty() && line.back() == '\r') line.pop_back();
+    return true;
 }
 
-/// A block is a counter, the times, the text and an empty line.
-Script readScript(std::istream& file) {
-    Script script;
-    LineReader reader(file);
+/// A cue is a line with its times and those behind it up to an empty one.
+std::vector<Cue> readCues(std::istream& file) {
+    std::vector<Cue> cues;
     std::string line;
-    while (reader.next(line)) {
-        if (line.empty()) continue;
-        const int blockAt = reader.number;
+    while (nextLine(file, line)) {
         Cue cue = {};
-        const bool timed = reader.next(line) && parseTimes(line, cue);
-        while (reader.next(line) && !line.empty())
-            cue.lines.push_back(withoutTags(line));
-        if (timed && !cue.lines.empty()) {
-            script.cues.push_back(std::move(cue));
-        } else {
-            std::fprintf(stderr, "line %d: no cue with times and a text, left out\n", blockAt);
-            ++script.faults;
-        }
+        if (!parseTimes(line, cue)) continue;  // its number
+        while (nextLine(file, line) && !line.empty())
+            cue.lines.push_back(line);
+        if (!cue.lines.empty()) cues.push_back(std::move(cue));
     }
-    return script;
+    return cues;
 }
 
 // --- A painted cue ----------------------------------------------------------------------------------
@@ -140,14 +100,11 @@ class CuePainter {
         const int left = mLook.getLeftOffset();
         const int top = mLook.getTopOffset();
 
-        std::vector<std::string> lines;
-        for (const std::string& line : cue.lines)
-            wrap(line, lines);
         std::vector<int> widths;
-        for (const std::string& line : lines)
-            widths.push_back(widthOf(line));
+        for (const std::string& line : cue.lines)
+            widths.push_back(forEachGlyph(line, [](int, int, unsigned) {}));
         const int textWidth = *std::max_element(widths.begin(), widths.end());
-        const int textHeight = lineHeight * static_cast<int>(lines.size());
+        const int textHeight = lineHeight * static_cast<int>(cue.lines.size());
         const int width = left + textWidth + mLook.getRightOffset();
         const int height = top + textHeight + mLook.getBottomOffset();
 
@@ -155,10 +112,10 @@ class CuePainter {
                            VFBitmap(static_cast<unsigned>(width), static_cast<unsigned>(height), 4)};
         mLook.initEffect(width, height);
         mLook.setDstBitmap(&overlay.pixels);
-        for (size_t i = 0; i < lines.size(); ++i) {
+        for (size_t i = 0; i < cue.lines.size(); ++i) {
             const int lineLeft = left + (textWidth - widths[i]) / 2;
             const int baseline = top + static_cast<int>(i) * lineHeight + ascent;
-            forEachGlyph(lines[i], [&](int x, int y, unsigned glyph) {
+            forEachGlyph(cue.lines[i], [&](int x, int y, unsigned glyph) {
                 addGlyph(lineLeft + x, baseline + y, glyph);
             });
         }
@@ -188,28 +145,6 @@ class CuePainter {
         return (pen + 63) >> 6;
     }
 
-    int widthOf(const std::string& line) {
-        return forEachGlyph(line, [](int, int, unsigned) {});
-    }
-
-    /// Breaks a line that is too wide at its blanks; a single word that is too wide stays whole.
-    void wrap(const std::string& line, std::vector<std::string>& lines) {
-        std::string fitting;
-        for (size_t at = 0; at < line.size();) {
-            const size_t end = std::min(line.find(' ', at), line.size());
-            const std::string word = line.substr(at, end - at);
-            const std::string longer = fitting.empty() ? word : fitting + ' ' + word;
-            if (!fitting.empty() && widthOf(longer) > kWidth - 2 * kFromSides) {
-                lines.push_back(fitting);
-                fitting = word;
-            } else {
-                fitting = longer;
-            }
-            at = end + 1;
-        }
-        lines.push_back(fitting);
-    }
-
     void addGlyph(int x, int y, unsigned index) {
         if (FT_Load_Glyph(mFace, index, FT_LOAD_RENDER) != 0) return;
         const FT_Bitmap& bitmap = mFace->glyph->bitmap;
@@ -230,39 +165,18 @@ class CuePainter {
 
 // --- Frames -----------------------------------------------------------------------------------------
 
-unsigned char toByte(double value) {
-    return static_cast<unsigned char>(std::clamp(value, 0.0, 255.0));
-}
+using Frame = std::vector<unsigned char>;
 
-/// A stand-in for a decoded frame: an evening sky that brightens to white and darkens again, with hills
-/// that pass by, so that the text is seen on light and on dark.
-std::vector<unsigned char> drawFrame(double seconds) {
-    const double light = 0.5 - 0.5 * std::cos(seconds * 0.8);
-    std::vector<unsigned char> rgb;
-    rgb.reserve(size_t{3} * kWidth * kHeight);
-    for (int y = 0; y < kHeight; ++y) {
-        const double down = static_cast<double>(y) / kHeight;
-        for (int x = 0; x < kWidth; ++x) {
-            const double hill = 0.72 + 0.08 * std::sin(x * 0.011 + seconds) + 0.03 * std::sin(x * 0.037);
-            const double shade = down > hill ? 0.35 + 0.5 * light : 1;
-            rgb.push_back(toByte(shade * (60 + 150 * down + 120 * light)));
-            rgb.push_back(toByte(shade * (50 + 60 * down + 170 * light)));
-            rgb.push_back(toByte(shade * (110 - 30 * down + 160 * light)));
-        }
-    }
-    return rgb;
-}
-
-/// Lays the overlay over the opaque frame, clipped.
-void layOver(std::vector<unsigned char>& rgb, const Overlay& overlay) {
+/// Lays the overlay over the frame, both premultiplied, clipped.
+void layOver(Frame& frame, const Overlay& overlay) {
     const int width = static_cast<int>(overlay.pixels.mWidth);
     const int height = static_cast<int>(overlay.pixels.mHeight);
     for (int row = std::max(0, -overlay.y); row < std::min(height, kHeight - overlay.y); ++row) {
         for (int column = std::max(0, -overlay.x); column < std::min(width, kWidth - overlay.x);
              ++column) {
             const unsigned char* source = overlay.pixels.mData + 4 * (row * width + column);
-            unsigned char* target = rgb.data() + 3 * ((overlay.y + row) * kWidth + overlay.x + column);
-            for (int channel = 0; channel < 3; ++channel) {
+            unsigned char* target = frame.data() + 4 * ((overlay.y + row) * kWidth + overlay.x + column);
+            for (int channel = 0; channel < 4; ++channel) {
                 const int through = target[channel] * (255 - source[3]) / 255;
                 target[channel] = static_cast<unsigned char>(std::min(source[channel] + through, 255));
             }
@@ -270,81 +184,48 @@ void layOver(std::vector<unsigned char>& rgb, const Overlay& overlay) {
     }
 }
 
-/// Written beside its place and then moved there: no frame is ever half written.
-bool writePng(const fs::path& path, const std::vector<unsigned char>& rgb) {
-    const fs::path part = path.string() + ".part";
-    png_image png = {};
-    png.version = PNG_IMAGE_VERSION;
-    png.width = kWidth;
-    png.height = kHeight;
-    png.format = PNG_FORMAT_RGB;
-    png.flags = PNG_IMAGE_FLAG_FAST;
-    if (png_image_write_to_file(&png, part.c_str(), 0, rgb.data(), 0, nullptr) == 0) return false;
-    std::error_code error;
-    fs::rename(part, path, error);
-    return !error;
-}
-
-/// Only for a person who is looking.
-void showProgress(int done, int all) {
-    if (isatty(STDERR_FILENO) == 0) return;
-    constexpr int kCells = 40;
-    const int filled = kCells * done / all;
-    std::fprintf(stderr, "\r[%s%s] %d of %d frames%s",
-                 std::string(static_cast<size_t>(filled), '#').c_str(),
-                 std::string(static_cast<size_t>(kCells - filled), '.').c_str(), done, all,
-                 done == all ? "\n" : "");
-}
-
-bool writeFilm(const std::vector<Cue>& cues, FT_Face face, const fs::path& directory,
-               int framesPerSecond) {
+/// A cue is painted once and kept while it is seen; a frame like the one before is written again. The
+/// last frame is clear: FFmpeg shows it for the rest of the film.
+bool writeFrames(const std::vector<Cue>& cues, CuePainter& painter) {
     int endMs = 0;
     for (const Cue& cue : cues)
         endMs = std::max(endMs, cue.endMs);
-    const int frames = static_cast<int>((endMs + kTailMs) * 1LL * framesPerSecond / 1000);
+    const int64_t frames = int64_t{endMs} * kFramesPerSecond / 1000 + 2;
 
-    CuePainter painter(face);
-    std::vector<std::unique_ptr<Overlay>> overlays(cues.size());
-    for (int frame = 0; frame < frames; ++frame) {
-        const int nowMs = static_cast<int>(1000LL * frame / framesPerSecond);
-        std::vector<unsigned char> rgb = drawFrame(nowMs / 1000.0);
+    std::map<size_t, Overlay> seen;
+    Frame frame(size_t{4} * kWidth * kHeight);
+    for (int64_t number = 0; number < frames; ++number) {
+        const int64_t nowMs = 1000 * number / kFramesPerSecond;
+        bool changes = false;
         for (size_t i = 0; i < cues.size(); ++i) {
-            if (nowMs < cues[i].startMs || nowMs >= cues[i].endMs) {
-                overlays[i].reset();  // kept while it is shown: memory does not grow with the film
-                continue;
+            const bool isSeen = cues[i].startMs <= nowMs && nowMs < cues[i].endMs;
+            if (isSeen == (seen.count(i) != 0)) continue;
+            changes = true;
+            if (isSeen) {
+                seen.emplace(i, painter.paint(cues[i]));
+            } else {
+                seen.erase(i);
             }
-            if (!overlays[i]) overlays[i] = std::make_unique<Overlay>(painter.paint(cues[i]));
-            layOver(rgb, *overlays[i]);
         }
-        char name[32];
-        std::snprintf(name, sizeof name, "frame_%05d.png", frame);
-        if (!writePng(directory / name, rgb)) {
-            std::fprintf(stderr, "cannot write %s\n", (directory / name).c_str());
-            return false;
+        if (changes) {
+            std::fill(frame.begin(), frame.end(), static_cast<unsigned char>(0));
+            for (const auto& [cue, overlay] : seen)
+                layOver(frame, overlay);
         }
-        showProgress(frame + 1, frames);
+        if (std::fwrite(frame.data(), frame.size(), 1, stdout) != 1) return false;
     }
-    return true;
+    return std::fflush(stdout) == 0;
 }
 
 }  // namespace
 
 int main(int argc, char** argv) {
-    const int framesPerSecond = argc > 3 ? std::atoi(argv[3]) : 12;
-    const char* font = argc > 4 ? argv[4] : "/usr/share/fonts/truetype/dejavu/DejaVuSans-Bold.ttf";
-    if (argc < 3 || framesPerSecond < 1 || framesPerSecond > 120) {
-        std::fprintf(stderr, "usage: subtitles FILE.srt DIRECTORY [FRAMES_PER_SECOND [FONT_FILE]]\n");
+    const char* font = argc > 2 ? argv[2] : "/usr/share/fonts/truetype/dejavu/DejaVuSans-Bold.ttf";
+    std::ifstream file(argc > 1 ? argv[1] : "");
+    if (!file) {
+        std::fprintf(stderr, "usage: subtitles FILE.srt [FONT_FILE]\n");
         return 2;
     }
-    std::ifstream file(argv[1], std::ios::binary);
-    std::error_code error;
-    fs::create_directories(argv[2], error);
-    if (!file || error) {
-        std::fprintf(stderr, "cannot %s\n", error ? "make the directory" : "read the subtitles");
-        return 1;
-    }
-    const Script script = readScript(file);
-
     FT_Library library = nullptr;
     FT_Face face = nullptr;
     if (FT_Init_FreeType(&library) != 0 || FT_New_Face(library, font, 0, &face) != 0 ||
@@ -352,8 +233,13 @@ int main(int argc, char** argv) {
         std::fprintf(stderr, "cannot read the font %s\n", font);
         return 1;
     }
-    const bool written = writeFilm(script.cues, face, argv[2], framesPerSecond);
+    bool isWritten = false;
+    {
+        CuePainter painter(face);
+        isWritten = writeFrames(readCues(file), painter);
+    }
     FT_Done_Face(face);
     FT_Done_FreeType(library);
-    return written && script.faults == 0 ? 0 : 1;
+    if (!isWritten) std::fprintf(stderr, "cannot write the frames\n");
+    return isWritten ? 0 : 1;
 }

@@ -105,6 +105,16 @@ TEST(Background, ClearPixels_AreOfOneValue) {
     EXPECT_EQ(laid({9, 8, 7, 0}, "transparent"), (Pixel{0, 0, 0, 0}));
 }
 
+TEST(Background, Rows_AloneAreTouched) {
+    voreltext::Image image{1, 4, Pixel(16, 0)};
+    layOn(image, parseBackground("#102030").value(), 1, 3);
+    EXPECT_EQ(image.pixels,
+              (Pixel{0, 0, 0, 0, 0x10, 0x20, 0x30, 255, 0x10, 0x20, 0x30, 255, 0, 0, 0, 0}));
+    voreltext::Image board{1, 9, Pixel(36, 0)};
+    layOn(board, parseBackground("checkerboard").value(), 8, 9);
+    EXPECT_EQ(board.pixels[8 * 4], 0xCC) << "squares are counted from the top of the picture";
+}
+
 TEST(Background, OtherWords_AreRefused) {
     for (const char* text : {"", "white", "#FF", "Transparent"}) {
         EXPECT_FALSE(parseBackground(text)) << text;

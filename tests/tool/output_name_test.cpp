@@ -16,7 +16,7 @@ using vorel_test::TempDir;
 
 TEST(OutputName, OtherKinds_AreToldByTheirEnding) {
     for (const char* path : {"a.jpg", "a.JPEG", "dir/a.Gif", "a.png.webp", "a.svg", "a.pdf", "look.json",
-                             ".txt", "font.ttc"})
+                             ".txt", "font.ttc", "talk.srt", "film.mov"})
         EXPECT_TRUE(namesOtherKind(path)) << path;
 }
 

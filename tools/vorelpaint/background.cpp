@@ -73,10 +73,10 @@ class ColourBeneath {
 };
 
 /// Squares of two colours.
-void layOnCheckerboard(voreltext::Image& image) {
+void layOnCheckerboard(voreltext::Image& image, int top, int bottom) {
     const std::array<ColourBeneath, 2> colours{ColourBeneath(kLightSquare), ColourBeneath(kDarkSquare)};
-    uint8_t* pixel = image.pixels.data();
-    for (int y = 0; y < image.height; ++y) {
+    uint8_t* pixel = image.pixels.data() + offsetOf(image, 0, top);
+    for (int y = top; y < bottom; ++y) {
         for (int x = 0; x < image.width; x += kSquare) {
             const auto count = static_cast<size_t>(std::min(kSquare, image.width - x));
             colours[static_cast<size_t>((x / kSquare + y / kSquare) % 2)].layUnder(pixel, count);
@@ -96,14 +96,19 @@ std::optional<Background> parseBackground(std::string_view text) {
 }
 
 void layOn(voreltext::Image& image, const Background& background) {
-    const size_t count = image.pixels.size() / 4;
+    layOn(image, background, 0, image.height);
+}
+
+void layOn(voreltext::Image& image, const Background& background, int top, int bottom) {
+    uint8_t* pixels = image.pixels.data() + offsetOf(image, 0, top);
+    const size_t count = (offsetOf(image, 0, bottom) - offsetOf(image, 0, top)) / 4;
     switch (background.kind) {
         case Background::Kind::transparent:
-            return straighten(image.pixels.data(), count);
+            return straighten(pixels, count);
         case Background::Kind::colour:
-            return ColourBeneath(background.colour).layUnder(image.pixels.data(), count);
+            return ColourBeneath(background.colour).layUnder(pixels, count);
         case Background::Kind::checkerboard:
-            return layOnCheckerboard(image);
+            return layOnCheckerboard(image, top, bottom);
     }
 }
 

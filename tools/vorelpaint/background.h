@@ -20,4 +20,7 @@ std::optional<Background> parseBackground(std::string_view text);
 /// Lays a premultiplied picture on the background; the result is straight, as a PNG stores it.
 void layOn(voreltext::Image& image, const Background& background);
 
+/// The same with the rows from `top` on and above `bottom`.
+void layOn(voreltext::Image& image, const Background& background, int top, int bottom);
+
 }  // namespace vorelpaint

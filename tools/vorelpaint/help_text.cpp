@@ -3,6 +3,7 @@
 #include "ranges.h"
 #include "settings.h"
 #include "style/vorelstyle.h"
+#include "subtitle_reader.h"
 #include "text/voreltext.h"
 #include "wrap.h"
 
@@ -34,6 +35,8 @@ const std::vector<std::string>& exampleCommands() {
         R"(vorelpaint --sheet --background '#23272E' -o presets.png "Type")",
         R"(vorelpaint --preset subtitle --width 1920 --height 1080 --anchor bottom --margin 60 --fit wrap -o frame.png "A line of dialogue")",
         R"(vorelpaint --preset subtitle --box line --markup -o word.png "<c #FFD040>Sing</c> along")",
+        R"(vorelpaint --subtitles talk.srt --over talk.mp4 --fade-in 150 --fade-out 150 -o film.mp4)",
+        R"(vorelpaint --subtitles talk.vtt --cue-style Narrator=chalk -o cues.mov)",
         R"(vorelpaint --preset gold --explain "Type")",
         R"(vorelpaint --preset gold --write-cpp > gold.cpp)",
         R"(vorelpaint --list-presets)"};
@@ -72,16 +75,29 @@ const std::vector<Topic>& topics() {
              "What a job does not say, it takes from the command line. Paths start at the working "
              "directory. A line that fails is reported with its number, and the next one goes on. "
              "When two jobs have one output, nothing is painted."},
+        {"Films",
+         "The cues of --subtitles are painted in frames of 1920 x 1080 pixels, or of the clip's sides; "
+         "centred lines stand at the bottom, broken where they are too wide. The font has an "
+         "eighteenth of the frame's shorter side, the margin a twentieth, and the "
+         "look is the preset subtitle; options change all of it. A cue is seen in the frames that "
+         "begin within its times. One that begins while others are seen stands above them. Of the "
+         "files, times, texts and names are read, not their styles and places. A film has the alpha "
+         "of its cues unless there is a clip or a background: .mov (prores, png), .webm (vp9), .mkv "
+         "(ffv1, png, vp9); with either .mp4, .mov, .mkv (h264) and .webm (vp9). Raw frames (-, .rgba) "
+         "are straight R, G, B, A. FFmpeg, which must be installed, reads clips and writes films; "
+         "frames and numbered pictures do without."},
         {"Text",
          "Text is UTF-8; text that begins with - stands behind --. A line ends with LF, CR, CR "
          "LF, or one of U+0085, U+2028 and U+2029; a tab is painted as a blank. Any other control "
          "character is refused, with its place."},
-        {"Limits", "A picture has at most " + std::to_string(TextLayout::kMaxSide) +
-                       " pixels on a side and " + std::to_string(voreltext::kMaxPixels) +
-                       " in all; a pattern's picture has at most " + std::to_string(kMaxPatternSide) +
-                       " pixels on a side. A text has at most " + std::to_string(kMaxTextBytes) +
-                       " bytes, a style file " + std::to_string(kMaxStyleBytes) +
-                       " and a line of a batch " + std::to_string(kMaxJobBytes) + "."},
+        {"Limits",
+         "A picture has at most " + std::to_string(TextLayout::kMaxSide) + " pixels on a side and " +
+             std::to_string(voreltext::kMaxPixels) + " in all; a pattern's picture has at most " +
+             std::to_string(kMaxPatternSide) + " pixels on a side. A text has at most " +
+             std::to_string(kMaxTextBytes) + " bytes, a style file " + std::to_string(kMaxStyleBytes) +
+             " and a line of a batch " + std::to_string(kMaxJobBytes) + ". A film has at most " +
+             std::to_string(kLongestFilmMs / 3600000) + " hours and " + std::to_string(kMostCues) +
+             " cues, in a file of at most " + std::to_string(kMaxSubtitleBytes) + " bytes."},
         {"Colours", "#RGB is short for #RRGGBB with twice the same digits: #F80 is #FF8800."},
         {"Files",
          "Where the program is installed, in /usr for a package: "
@@ -89,6 +105,7 @@ const std::vector<Topic>& topics() {
          "share/doc/vorelpaint/vorelpaint.md tells of batches and reports, "
          "share/doc/vorelpaint/captions.md has recipes for titles and captions, "
          "share/doc/vorelpaint/layer-styles.md translates the layer styles of design tools, "
+         "share/doc/vorelpaint/film.md tells of films, "
          "share/voreleffect/presets has the presets, and "
          "share/voreleffect/vorelpaint-style.schema.json tells editors what a style file may hold."},
         {"Exit codes",
@@ -96,7 +113,7 @@ const std::vector<Topic>& topics() {
          "that failed and their count. A reader that went away is a failure of writing like any "
          "other."},
         {"Interruption",
-         "A picture takes its name when it is whole: whatever signal ends the program, no "
+         "A picture or a film takes its name when it is whole: whatever signal ends the program, no "
          "half-written one is left and an older one stays. Only SIGKILL and a loss of power can "
          "leave something: on a file system without unnamed files (O_TMPFILE), such as NFS or "
          "FAT, the begun picture as .vorelpaint.XXXXXX in its directory; on others, in the "

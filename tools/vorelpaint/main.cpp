@@ -10,6 +10,7 @@
 #include "console.h"
 #include "error.h"
 #include "explain.h"
+#include "film.h"
 #include "interrupt.h"
 #include "manual.h"
 #include "options.h"
@@ -95,6 +96,8 @@ void run(const Options& options) {
         print(completionScript(*options.completion));
     } else if (options.listPresets) {
         printPresets();
+    } else if (options.film.subtitles) {
+        makeFilm(options, sayNote);
     } else if (options.batch) {
         runBatch(options);
     } else if (options.sheet) {

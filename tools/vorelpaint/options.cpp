@@ -4,12 +4,14 @@
 #include <algorithm>
 #include <array>
 #include <memory>
+#include <string_view>
 #include <utility>
 #include <vector>
 
 #include "console.h"
 #include "error.h"
 #include "file_io.h"
+#include "film_request.h"
 #include "help_text.h"
 #include "settings.h"
 #include "style/vorelstyle.h"
@@ -19,18 +21,45 @@ namespace vorelpaint {
 namespace {
 
 /// What cannot be asked for together, beside what checkCombination explains.
-constexpr std::array<std::pair<const char*, const char*>, 20> kExclusions{{
-    {"--text-file", "TEXT"},        {"--preset", "--style"},
-    {"--batch", "--output"},        {"--batch", "--sheet"},
-    {"--batch", "--sizes"},         {"--batch", "--explain"},
-    {"--batch", "--write-cpp"},     {"--batch", "--print-key"},
-    {"--batch", "--print-margins"}, {"--sheet", "--style"},
-    {"--sheet", "--preset"},        {"--sheet", "--explain"},
-    {"--sheet", "--write-cpp"},     {"--sheet", "--print-key"},
-    {"--sheet", "--print-margins"}, {"--sheet", "--report"},
-    {"--write-cpp", "--report"},    {"--write-cpp", "--explain"},
-    {"--write-cpp", "--print-key"}, {"--write-cpp", "--print-margins"},
+constexpr std::array<std::pair<const char*, const char*>, 33> kExclusions{{
+    {"--text-file", "TEXT"},
+    {"--preset", "--style"},
+    {"--batch", "--output"},
+    {"--batch", "--sheet"},
+    {"--batch", "--sizes"},
+    {"--batch", "--explain"},
+    {"--batch", "--write-cpp"},
+    {"--batch", "--print-key"},
+    {"--batch", "--print-margins"},
+    {"--sheet", "--style"},
+    {"--sheet", "--preset"},
+    {"--sheet", "--explain"},
+    {"--sheet", "--write-cpp"},
+    {"--sheet", "--print-key"},
+    {"--sheet", "--print-margins"},
+    {"--sheet", "--report"},
+    {"--write-cpp", "--report"},
+    {"--write-cpp", "--explain"},
+    {"--write-cpp", "--print-key"},
+    {"--write-cpp", "--print-margins"},
+    {"--subtitles", "TEXT"},
+    {"--subtitles", "--text-file"},
+    {"--subtitles", "--markup"},
+    {"--subtitles", "--batch"},
+    {"--subtitles", "--sheet"},
+    {"--subtitles", "--explain"},
+    {"--subtitles", "--write-cpp"},
+    {"--subtitles", "--print-key"},
+    {"--subtitles", "--print-margins"},
+    {"--subtitles", "--padding"},
+    {"--over", "--width"},
+    {"--over", "--height"},
+    {"--over", "--background"},
 }};
+
+/// What is asked of a film alone.
+constexpr std::array<const char*, 7> kOfFilms{"--over",      "--fps",   "--fade-in", "--fade-out",
+                                              "--cue-style", "--codec", "--each"};
 
 /// The value behind the name, and the default behind the description; the rest that CLI11 would tell,
 /// such as what excludes what, is told when it matters.
@@ -140,6 +169,7 @@ void checkCombination(const Options& options) {
     if (tells) return;
     checkSeries(options);
     if (options.batch) return checkBatch(options);
+    if (options.film.subtitles) return checkFilm(options);
     checkOutput(options);
     checkCanvas(options);
 }
@@ -174,6 +204,8 @@ std::optional<Options> parseOptions(int argc, const char* const* argv) {
         addSetting(app, setting, options);
     for (const auto& [one, other] : kExclusions)
         app.get_option(one)->excludes(app.get_option(other));
+    for (const char* name : kOfFilms)
+        app.get_option(name)->needs(app.get_option("--subtitles"));
     try {
         app.parse(argc, argv);
     } catch (const CLI::Success&) {
@@ -183,6 +215,11 @@ std::optional<Options> parseOptions(int argc, const char* const* argv) {
         throw ToolError(faultOf(app.remaining()));
     } catch (const CLI::ParseError& error) {
         throw ToolError(error.what());
+    }
+    if (options.film.subtitles) {
+        takeFilmDefaults(options, [&](std::string_view name) {
+            return app.get_option(optionName(settingNamed(name)))->count() > 0;
+        });
     }
     checkCombination(options);
     return options;

@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "background.h"
+#include "film_options.h"
 #include "png_writer.h"
 #include "style/vorelstyle.h"
 #include "text/voreltext.h"
@@ -58,6 +59,8 @@ struct Options {
     voreltext::CanvasRequest canvas{std::nullopt, std::nullopt, voreltext::Anchor::center, 0, 8};
     Fit fit = Fit::none;
     TextBox box = TextBox::ink;
+
+    FilmOptions film;
 
     std::optional<std::string> batch;
     std::optional<Shard> shard;

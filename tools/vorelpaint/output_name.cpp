@@ -7,6 +7,7 @@
 
 #include "error.h"
 #include "file_io.h"
+#include "path_ending.h"
 #include "style/vorelstyle.h"
 
 namespace vorelpaint {
@@ -16,12 +17,12 @@ namespace fs = std::filesystem;
 
 /// Pictures, documents and films; and what the program itself reads and prints, which a forgotten value
 /// would let it overwrite.
-constexpr std::array<std::string_view, 53> kOtherKinds{
-    "jpg",  "jpeg", "jpe", "jfif", "jp2",  "jxl",  "gif",   "webp",  "avif", "heic", "heif",
-    "bmp",  "dib",  "ico", "tif",  "tiff", "tga",  "ppm",   "pgm",   "pbm",  "pnm",  "pam",
-    "qoi",  "dds",  "exr", "hdr",  "psd",  "xcf",  "svg",   "svgz",  "pdf",  "ps",   "eps",
-    "apng", "mng",  "mp4", "webm", "html", "json", "jsonl", "txt",   "cpp",  "ttf",  "otf",
-    "ttc",  "otc",  "pfa", "pfb",  "pcf",  "bdf",  "woff",  "woff2", "md"};
+constexpr std::array<std::string_view, 60> kOtherKinds{
+    "jpg",  "jpeg", "jpe",  "jfif",  "jp2", "jxl",  "gif", "webp", "avif", "heic", "heif", "bmp",
+    "dib",  "ico",  "tif",  "tiff",  "tga", "ppm",  "pgm", "pbm",  "pnm",  "pam",  "qoi",  "dds",
+    "exr",  "hdr",  "psd",  "xcf",   "svg", "svgz", "pdf", "ps",   "eps",  "apng", "mng",  "mp4",
+    "webm", "html", "json", "jsonl", "txt", "cpp",  "ttf", "otf",  "ttc",  "otc",  "pfa",  "pfb",
+    "pcf",  "bdf",  "woff", "woff2", "md",  "mov",  "mkv", "rgba", "srt",  "vtt",  "ass",  "ssa"};
 
 /// The file itself that a path without a link at its end leads to; the path as far as that cannot be
 /// told.
@@ -50,9 +51,7 @@ bool isForAll(const fs::path& path) {
 }  // namespace
 
 bool namesOtherKind(std::string_view path) {
-    const size_t dot = path.find_last_of("./");
-    if (dot == std::string_view::npos || path[dot] != '.') return false;
-    const std::string_view kind = path.substr(dot + 1);
+    const std::string_view kind = endingOf(path);
     return std::any_of(kOtherKinds.begin(), kOtherKinds.end(),
                        [&](std::string_view other) { return vorelstyle::isSameWord(kind, other); });
 }

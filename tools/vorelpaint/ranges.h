@@ -4,6 +4,7 @@
 #include <sstream>
 #include <string>
 
+#include "film_rate.h"
 #include "text/voreltext.h"
 
 /// What can be asked for at most; help and manual name the same.
@@ -28,6 +29,8 @@ constexpr Limits<size_t> kSheetSizes{1, 16};  ///< how many a sheet has
 
 constexpr Limits<int> kJobs{1, 64};  ///< at a time
 constexpr Limits<int> kShards{1, 100000};
+constexpr Limits<int> kFade{0, 60000};  ///< milliseconds
+constexpr Limits<int64_t> kFrameRates{1, FrameRate::kMost};
 
 constexpr size_t kMostFonts = 16;  ///< that a text asks in turn
 constexpr size_t kMaxTextBytes = size_t{1} << 16;

@@ -6,7 +6,6 @@
 #include <string>
 #include <utility>
 
-#include "error.h"
 #include "file_io.h"
 #include "ranges.h"
 #include "unicode/lines.h"
@@ -121,9 +120,7 @@ SetText::SetText(const Options& options, FontShelf& shelf, const std::vector<uin
 SetText setToFit(const Options& options, FontShelf& shelf, const SourceText& source) {
     const Room room = voreltext::roomOf(options.canvas);
     SetText set = setInCanvas(options, shelf, room, source.text());
-    if (set.layout().glyphCount() == 0) {
-        throw ToolError("nothing to paint: the text has no visible character");
-    }
+    if (set.layout().glyphCount() == 0) throw InvisibleText();
     requireRoomForGlyphs(room, set.layout(), source);
     return set;
 }

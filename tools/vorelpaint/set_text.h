@@ -5,6 +5,7 @@
 #include <string>
 #include <vector>
 
+#include "error.h"
 #include "font_shelf.h"
 #include "note.h"
 #include "options.h"
@@ -12,6 +13,12 @@
 #include "text/voreltext.h"
 
 namespace vorelpaint {
+
+/// A text without a visible character, which is nothing to paint.
+class InvisibleText : public ToolError {
+  public:
+    InvisibleText() : ToolError("nothing to paint: the text has no visible character") {}
+};
 
 /// The text that is asked for.
 class SourceText {
@@ -50,7 +57,8 @@ class SetText {
 };
 
 /// Sets the text so that it fits its canvas as is asked for: in broken lines, or in a smaller font.
-/// Throws ToolError when nothing of it is visible, or the canvas is too small for one of its glyphs.
+/// Throws InvisibleText when nothing of it is visible, and ToolError when the canvas is too small for
+/// one of its glyphs.
 SetText setToFit(const Options& options, FontShelf& shelf, const SourceText& source);
 
 /// Notes the characters that no font has.

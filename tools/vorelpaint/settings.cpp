@@ -7,6 +7,7 @@
 #include <utility>
 
 #include "error.h"
+#include "film_form.h"
 #include "output_name.h"
 #include "ranges.h"
 #include "read_value.h"
@@ -70,6 +71,8 @@ constexpr std::array<Word<Fit>, 3> kFits{
     {{"none", Fit::none}, {"shrink", Fit::shrink}, {"wrap", Fit::wrap}}};
 constexpr std::array<Word<PngEffort>, 3> kEfforts{
     {{"fast", PngEffort::fast}, {"normal", PngEffort::normal}, {"small", PngEffort::small}}};
+constexpr std::array<Word<PictureOf>, 2> kPicturesOf{
+    {{"frame", PictureOf::frame}, {"cue", PictureOf::cue}}};
 constexpr std::array<Word<TextBox>, 2> kBoxes{{{"ink", TextBox::ink}, {"line", TextBox::line}}};
 constexpr std::array<Word<const char*>, 3> kShells{{{"bash", "bash"}, {"zsh", "zsh"}, {"fish", "fish"}}};
 
@@ -127,9 +130,13 @@ void addFont(Options& options, const std::string& given) {
     options.fonts.push_back(given);
 }
 
-std::optional<std::string> parseOutput(const std::string& text) {
-    if (namesOtherKind(text)) return std::nullopt;
-    return text;
+/// Films have other endings. They are asked for by --subtitles, which stands before --output in the list
+/// of settings, and so is read before it.
+void readOutput(Options& options, const std::string& given) {
+    if (!options.film.subtitles && namesOtherKind(given)) {
+        refuse(given, "named like another kind of file; only PNG is written: end it with .png");
+    }
+    options.output = given;
 }
 
 /// An option that paints a picture, of a job as well as of the command line.
@@ -249,12 +256,91 @@ std::vector<Setting> canvasSettings() {
                           pixelsOfCanvas(kPadding, &CanvasRequest::padding))};
 }
 
+void addCueStyle(Options& options, const std::string& given) {
+    const size_t equals = given.find('=');
+    if (equals == 0 || equals == std::string::npos || equals + 1 == given.size()) {
+        refuse(given, "no NAME=LOOK, such as Narrator=chalk");
+    }
+    options.film.cueStyles.push_back({given.substr(0, equals), given.substr(equals + 1)});
+}
+
+/// Takes a value over into what is asked of films.
+Read ofFilm(const std::function<void(FilmOptions&, const std::string&)>& take) {
+    return [take](Options& options, const std::string& given) { take(options.film, given); };
+}
+
+void readFrameRate(FilmOptions& film, const std::string& given) {
+    film.rate = parseFrameRate(given);
+    if (film.rate) return;
+    refuse(given, "no frame rate from " + spelled(kFrameRates) + "; write 30 or 24000/1001");
+}
+
+void readCodec(FilmOptions& film, const std::string& given) {
+    const std::vector<std::string>& names = filmCodecNames();
+    if (std::find(names.begin(), names.end(), given) == names.end()) {
+        refuse(given, "none of " + vorelstyle::joined(names));
+    }
+    film.codec = given;
+}
+
+/// "h264|vp9".
+std::string codecWords() {
+    std::string words;
+    for (const std::string& name : filmCodecNames())
+        words.append(words.empty() ? "" : "|").append(name);
+    return words;
+}
+
+std::vector<Setting> cueSettings() {
+    constexpr const char* kGroup = "Films";
+    Setting styles =
+        programOption("cue-style", "NAME=LOOK", kGroup,
+                      "Paint cues of this name (WebVTT: class, voice or identifier; ASS: style or "
+                      "speaker) in a preset or a style file, or with none not at all; of several "
+                      "that fit, the first counts",
+                      addCueStyle);
+    styles.kind = Setting::Kind::list;
+    styles.forget = [](Options& options) { options.film.cueStyles.clear(); };
+    const std::string fades = "Milliseconds in which a cue appears, " + spelled(kFade);
+    return {
+        programOption(
+            "subtitles", "FILE", kGroup, "Paint the cues of a .srt, .vtt or .ass file as a film",
+            ofFilm([](FilmOptions& film, const std::string& given) { film.subtitles = given; })),
+        styles,
+        programOption("fade-in", "MS", kGroup, fades,
+                      ofFilm([](FilmOptions& film, const std::string& given) {
+                          film.fadeInMs = readNumber(kFade, given);
+                      })),
+        programOption("fade-out", "MS", kGroup, "Milliseconds in which it disappears, before its end",
+                      ofFilm([](FilmOptions& film, const std::string& given) {
+                          film.fadeOutMs = readNumber(kFade, given);
+                      }))};
+}
+
+std::vector<Setting> filmSettings() {
+    constexpr const char* kGroup = "Films";
+    return {
+        programOption("over", "FILE", kGroup, "Burn the cues into the pictures of this clip",
+                      ofFilm([](FilmOptions& film, const std::string& given) { film.over = given; })),
+        programOption("fps", "RATE", kGroup,
+                      "Frames a second, such as 24 or 24000/1001 (the clip's, else 30)",
+                      ofFilm(readFrameRate)),
+        programOption("codec", codecWords(), kGroup,
+                      "How the film is stored, where its ending leaves a choice", ofFilm(readCodec)),
+        programOption("each", listed(kPicturesOf, "|"), kGroup,
+                      "What a numbered output has a picture of (frame)",
+                      ofFilm([](FilmOptions& film, const std::string& given) {
+                          film.pictureOf = wordAmong(kPicturesOf, given);
+                      }))};
+}
+
 std::vector<Setting> outputSettings() {
     constexpr const char* kGroup = "Picture";
-    Setting output =
-        pictureOption("output", "FILE", "", kGroup, "The PNG file to write, - for standard output",
-                      parsed(parseOutput, &Options::output,
-                             "named like another kind of file; only PNG is written: end it with .png"));
+    Setting output = pictureOption(
+        "output", "FILE", "", kGroup,
+        "The PNG file to write, - for standard output; of --subtitles a .mp4, .mov, .mkv or .webm, "
+        "numbered pictures (frame_%05d.png) or raw frames (-, .rgba)",
+        readOutput);
     output.letter = "o";
     return {output,
             pictureOption("background", "transparent|checkerboard|#RRGGBB", "transparent", kGroup,
@@ -331,8 +417,9 @@ std::vector<Setting> helpSettings() {
 
 std::vector<Setting> allSettings() {
     std::vector<Setting> all;
-    for (auto part : {textSettings(), fontSettings(), lookSettings(), canvasSettings(), outputSettings(),
-                      seriesSettings(), reportSettings(), helpSettings()}) {
+    for (auto part :
+         {textSettings(), fontSettings(), lookSettings(), canvasSettings(), cueSettings(),
+          filmSettings(), outputSettings(), seriesSettings(), reportSettings(), helpSettings()}) {
         all.insert(all.end(), part.begin(), part.end());
     }
     return all;
@@ -358,8 +445,9 @@ std::vector<std::string> wordsOf(const Setting& setting) {
     std::vector<std::string> words;
     std::istringstream alternatives(setting.value);
     for (std::string word; std::getline(alternatives, word, '|');) {
-        const bool literal = std::all_of(word.begin(), word.end(),
-                                         [](char c) { return (c >= 'a' && c <= 'z') || c == '-'; });
+        const bool literal = std::all_of(word.begin(), word.end(), [](char c) {
+            return (c >= 'a' && c <= 'z') || (c >= '0' && c <= '9') || c == '-';
+        });
         if (literal) words.push_back(word);
     }
     return words;

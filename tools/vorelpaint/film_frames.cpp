@@ -1,0 +1,81 @@
+#include "film_frames.h"
+
+#include <algorithm>
+
+#include "background.h"
+
+namespace vorelpaint {
+namespace {
+
+using voreltext::Image;
+
+void clearRows(Image& image, const voreltext::Box& rows) {
+    const auto row = [&](int y) {
+        return image.pixels.begin() + static_cast<std::ptrdiff_t>(offsetOf(image, 0, y));
+    };
+    std::fill(row(rows.top), row(rows.bottom), uint8_t{0});
+}
+
+}  // namespace
+
+FilmFrames::FilmFrames(const Options& options, const FilmCues& cues, const FrameRate& rate)
+    : mOptions(options),
+      mCues(cues),
+      mRate(rate),
+      mRows(cues.rows()),
+      mPicture(voreltext::transparentImage(*options.canvas.width, *options.canvas.height)) {
+    layOn(mPicture, options.background);
+}
+
+bool FilmFrames::advanceTo(int64_t frame) {
+    Seen seen = seenAt(frame);
+    const bool isSame = mIsBegun && seen == mSeen;
+    mIsBegun = true;
+    if (isSame) return false;
+    mSeen = std::move(seen);
+    compose();
+    return true;
+}
+
+FilmFrames::Seen FilmFrames::seenAt(int64_t frame) {
+    const std::vector<PlacedCue>& all = mCues.all();
+    for (; mNext < all.size() && all[mNext].firstFrame <= frame; ++mNext) {
+        if (all[mNext].endFrame > frame) mPainted.emplace(mNext, Image{});
+    }
+    Seen seen;
+    for (auto each = mPainted.begin(); each != mPainted.end();) {
+        const PlacedCue& placed = all[each->first];
+        if (placed.endFrame <= frame) {
+            each = mPainted.erase(each);
+            continue;
+        }
+        const float opacity = placed.opacityAt(mRate.startMs(frame), mOptions.film);
+        if (opacity > 0 && !placed.area.isEmpty()) seen.emplace_back(each->first, opacity);
+        ++each;
+    }
+    return seen;
+}
+
+/// Only the rows that cues paint are ever touched.
+void FilmFrames::compose() {
+    clearRows(mPicture, mRows);
+    for (const auto& [cue, opacity] : mSeen) {
+        const voreltext::Box& area = mCues.all()[cue].area;
+        if (opacity < 1) {
+            Image faded = pictureOf(cue);
+            fade(faded, opacity);
+            layOver(mPicture, faded, area.left, area.top);
+        } else {
+            layOver(mPicture, pictureOf(cue), area.left, area.top);
+        }
+    }
+    layOn(mPicture, mOptions.background, mRows.top, mRows.bottom);
+}
+
+const Image& FilmFrames::pictureOf(size_t cue) {
+    Image& picture = mPainted.at(cue);
+    if (picture.pixels.empty()) picture = mCues.paint(mCues.all()[cue]);
+    return picture;
+}
+
+}  // namespace vorelpaint
