@@ -1,11 +1,11 @@
 #!/usr/bin/env bash
-# Measures how many pictures a second vorelpaint and other programs paint; docs/benchmarks.md explains it.
+# Measures how many pictures a second vorelpaint and other programs paint; docs/benchmarks.md tells more.
 #
 #     scripts/bench_batch.sh [--quick] [--against COMMIT] [--tool FILE] [--document]
 #
-#     --quick            four pictures of each kind, once: whether all of it works, figures that tell nothing
+#     --quick            four pictures of each kind, once: shows that all of it works, not how fast
 #     --against COMMIT   also vorelpaint as it was then
-#     --tool FILE        this vorelpaint instead of one built here
+#     --tool FILE        this vorelpaint instead of one built from the tree
 #     --document         into docs/benchmarks.md
 set -euo pipefail
 invoked=$PWD

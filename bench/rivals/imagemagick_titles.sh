@@ -1,16 +1,23 @@
 #!/usr/bin/env bash
 # Paints a title a line with ImageMagick, one process a picture and JOBS at a time:
 #
-#     imagemagick_titles.sh shadow|gradient|glow TITLES FOLDER JOBS
-#     imagemagick_titles.sh --version
+#     imagemagick_titles.sh [--fast] shadow|gradient|glow TITLES FOLDER JOBS
+#     imagemagick_titles.sh [--fast] --version
 #
-# Only the channel of alpha is blurred. A process has one thread, so that JOBS of them keep as many cores busy.
+# --fast has PNG files compressed by zlib's level 1; the default is 7.
+# Only the channel of alpha is blurred. A process has one thread, so that JOBS of them keep as many cores
+# busy.
 set -euo pipefail
 
 convert=/usr/bin/convert
 if [[ ! -x $convert ]]; then convert=/usr/bin/magick; fi
+png=(-depth 8) fast=''
+if [[ $1 == --fast ]]; then
+    png+=(-define png:compression-level=1) fast=', level 1'
+    shift
+fi
 if [[ $1 == --version ]]; then
-    "$convert" -version | sed -n '1s/Version: \(ImageMagick [^ ]*\).*/\1/p'
+    "$convert" -version | sed -n "1s/Version: \(ImageMagick [^ ]*\).*/\1$fast/p"
     exit
 fi
 look=$1 titles=$2 folder=$3 jobs=$4
@@ -29,13 +36,13 @@ arguments() {
                 -fill white -stroke none -annotate 0 "$1")
             ;;
         gradient)
-            told=("${canvas[@]}" -fill '#5A2A00' -stroke '#5A2A00' -strokewidth 8 -annotate 0 "$1" -stroke none
-                \( -size 1500x95 'gradient:#FFE08A-#F08A24' -background '#F08A24' -extent 1500x130
-                -write mpr:ramp +delete \) -tile mpr:ramp -annotate 0 "$1")
+            told=("${canvas[@]}" -fill '#5A2A00' -stroke '#5A2A00' -strokewidth 8 -annotate 0 "$1"
+                -stroke none \( -size 1500x95 'gradient:#FFE08A-#F08A24' -background '#F08A24'
+                -extent 1500x130 -write mpr:ramp +delete \) -tile mpr:ramp -annotate 0 "$1")
             ;;
         glow)
-            told=("${canvas[@]}" -fill white -stroke white -strokewidth 12 -annotate 0 "$1" "${soften[@]}"
-                -fill '#2090FF' -colorize 100 -fill white -stroke none -annotate 0 "$1")
+            told=("${canvas[@]}" -fill white -stroke white -strokewidth 12 -annotate 0 "$1"
+                "${soften[@]}" -fill '#2090FF' -colorize 100 -fill white -stroke none -annotate 0 "$1")
             ;;
     esac
 }
@@ -44,5 +51,5 @@ arguments ''
 number=0
 while IFS= read -r title; do
     arguments "$title"
-    printf '%s\0' "${told[@]}" -depth 8 "PNG32:$folder/$((number++)).png"
-done < "$titles" | xargs -0 -P "$jobs" -n $((${#told[@]} + 3)) "$convert"
+    printf '%s\0' "${told[@]}" "${png[@]}" "PNG32:$folder/$((number++)).png"
+done < "$titles" | xargs -0 -P "$jobs" -n $((${#told[@]} + ${#png[@]} + 1)) "$convert"

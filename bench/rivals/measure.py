@@ -3,8 +3,8 @@
 
     measure.py --tool VORELPAINT [--against NAME VORELPAINT] --folder FOLDER [--quick]
 
-All paint the same titles in looks of the same kind, one and two pictures at a time. Rounds take all programs in
-turns; a rate is the median of the rounds, a ratio the median of the ratios within them.
+All paint the same titles in looks of the same kind, one and two pictures at a time. Rounds take all
+programs in turns; a rate is the median of the rounds, a ratio the median of the ratios within them.
 """
 import argparse
 import json
@@ -26,11 +26,11 @@ QUICK = 4
 
 
 class Rival:
-    """A program with a script of its own that takes a look, a file of titles, a folder and a number of jobs."""
+    """A program with a script that takes a look, a file of titles, a folder and a number of jobs."""
 
-    def __init__(self, pictures, *script):
+    def __init__(self, pictures, interpreter, script, *options):
         self.pictures = pictures
-        self.script = [*script[:-1], str(HERE / script[-1])]
+        self.script = [interpreter, str(HERE / script), *options]
         self.name = self.version()
 
     def version(self):
@@ -92,7 +92,7 @@ def paint(program, look, count, jobs, folder):
 
 
 def traits(file):
-    """What pictures of one kind have in common: the box of what is seen, and shares of a thousand of the pixels."""
+    """What pictures of one kind share: the box of what is seen, and thousandths of the pixels."""
     with Image.open(file) as picture:
         if picture.size != SIZE or picture.mode != "RGBA":
             sys.exit(f"{file}: {picture.size} {picture.mode}, not {SIZE} RGBA")
@@ -102,7 +102,8 @@ def traits(file):
         histogram = alpha.histogram()
         light = Image.composite(picture.convert("L"), Image.new("L", SIZE), seen).histogram()
     thousandth = SIZE[0] * SIZE[1] / 1000
-    return {"width": right - left, "height": bottom - top, "seen pixels": sum(histogram[128:]) / thousandth,
+    return {"width": right - left, "height": bottom - top,
+            "seen pixels": sum(histogram[128:]) / thousandth,
             "translucent pixels": sum(histogram[8:248]) / thousandth,
             "light pixels": sum(light[150:]) / thousandth}
 
@@ -115,12 +116,13 @@ MARGINS = {"width": (0.02, 0), "height": (0.1, 0), "seen pixels": (0.2, 0),
 def check_kind(program, file, ours):
     theirs = traits(file)
     for trait, (share, amount) in MARGINS.items():
-        if abs(theirs[trait] - ours[trait]) > share * ours[trait] + amount:
-            sys.exit(f"{program.name}: {file}: {trait}: {theirs[trait]:.0f}, vorelpaint {ours[trait]:.0f}")
+        their, our = theirs[trait], ours[trait]
+        if abs(their - our) > share * our + amount:
+            sys.exit(f"{program.name}: {file}: {trait}: {their:.0f}, of vorelpaint {our:.0f}")
 
 
 def check(programs, folder):
-    """Paints a few pictures by each program and compares their kind. Returns mean bytes by program and look."""
+    """Compares the kind of a few pictures by each program. Returns mean bytes by program and look."""
     sizes = {}
     for look in LOOKS:
         ours = None
@@ -180,7 +182,9 @@ def found_programs(tool, against):
     if against:
         programs.append(Tool(150, *against))
     rivals = {"Pillow": Rival(100, sys.executable, "pillow_titles.py"),
+              "Pillow, level 1": Rival(100, sys.executable, "pillow_titles.py", "--fast"),
               "ImageMagick": Rival(30, "bash", "imagemagick_titles.sh"),
+              "ImageMagick, level 1": Rival(30, "bash", "imagemagick_titles.sh", "--fast"),
               "librsvg": Rival(40, "bash", "librsvg_titles.sh"),
               "Skia": Rival(100, "node", "skia_titles.mjs")}
     for name, rival in rivals.items():

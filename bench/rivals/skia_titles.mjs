@@ -3,7 +3,7 @@
 //     skia_titles.mjs shadow|gradient|glow TITLES FOLDER JOBS
 //     skia_titles.mjs --version
 //
-// RIVALS_NODE is the folder that the package is installed in. Each thread has one canvas for all its pictures.
+// RIVALS_NODE is the folder that the package is installed in. A thread has one canvas for all pictures.
 import { readFileSync, writeFileSync } from "node:fs";
 import { createRequire } from "node:module";
 import { resolve } from "node:path";
