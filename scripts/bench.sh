@@ -15,6 +15,7 @@ set -euo pipefail
 invoked=$PWD
 cd "$(dirname "$0")/.."
 . scripts/packages.sh
+. scripts/figures.sh
 
 peers=OFF times=yes counts='' document='' filter='' save='' compare=''
 sampling=(--benchmark_min_time=0.02 --benchmark_repetitions=15)
@@ -40,14 +41,6 @@ need_packages cmake ninja-build clang-14 pkg-config libbenchmark-dev libfreetype
 build=build/bench
 cmake --preset bench -DVOREL_BENCH_PEERS="$peers" > /dev/null
 cmake --build --preset bench -- --quiet
-
-describe_run() {
-    local model cores
-    model=$(sed -n '/^model name[^:]*: /{s///p;q}' /proc/cpuinfo)
-    cores=$(nproc)
-    echo "Commit $(git rev-parse --short HEAD), $(clang++-14 --version | head -n 1);" \
-        "$model, $cores cores, $(grep -om 1 -w -e avx512_vnni -e avx2 /proc/cpuinfo | sort -r | head -n 1)."
-}
 
 print_times() {
     local run=$build/run.json
@@ -77,7 +70,7 @@ print_counts() {
 }
 
 print_all() {
-    describe_run
+    describe_run clang++-14
     [[ -z $times ]] || print_times
     [[ -z $counts ]] || print_counts
 }
@@ -88,8 +81,6 @@ if [[ -z $document ]]; then
     exit
 fi
 
-# The figures stand between two marks of the page.
 print_all > "$build/figures.md"
-sed -i -e '/^<!-- figures -->$/,/^<!-- end of figures -->$/{//!d}' "$document"
-sed -i -e "/^<!-- figures -->\$/r $build/figures.md" "$document"
+write_figures figures "$build/figures.md" "$document"
 echo "$document"

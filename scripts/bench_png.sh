@@ -7,6 +7,7 @@ set -euo pipefail
 cd "$(dirname "$0")/.."
 . scripts/packages.sh
 . scripts/quietly.sh
+. scripts/figures.sh
 
 need_packages cmake ninja-build g++ pkg-config libbenchmark-dev libfreetype-dev libharfbuzz-dev \
     libfribidi-dev libfontconfig-dev libunibreak-dev libpng-dev libdeflate-dev \
@@ -21,7 +22,4 @@ if [[ ${1-} != --document ]]; then
     exec "$build/bench/vorelpaint_png_bench"
 fi
 "$build/bench/vorelpaint_png_bench" > "$build/figures.md"
-document=docs/benchmarks.md
-sed -i -e '/^<!-- PNG figures -->$/,/^<!-- end of PNG figures -->$/{//!d}' "$document"
-sed -i -e "/^<!-- PNG figures -->\$/r $build/figures.md" "$document"
-echo "$document"
+write_figures 'PNG figures' "$build/figures.md" docs/benchmarks.md
