@@ -1,12 +1,13 @@
 #!/usr/bin/env bash
 # Measures how fast vorelpaint makes films of 1920 x 1080 pixels at 30 frames a second, on one core.
 #
-#     scripts/film_bench.sh [--document]
+#     scripts/bench_film.sh [--document]
 #
 #     --document       the figures into docs/film.md
 set -euo pipefail
 cd "$(dirname "$0")/.."
 . scripts/packages.sh
+. scripts/figures.sh
 
 case ${1-} in
     '' | --document) ;;
@@ -78,6 +79,4 @@ if [[ -z ${1-} ]]; then
     exit
 fi
 cd "$OLDPWD"
-sed -i -e '/^<!-- figures -->$/,/^<!-- end of figures -->$/{//!d}' docs/film.md
-sed -i -e "/^<!-- figures -->\$/r $work/figures.md" docs/film.md
-echo docs/film.md
+write_figures figures "$work/figures.md" docs/film.md

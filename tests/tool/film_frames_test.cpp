@@ -40,7 +40,7 @@ uint8_t alphaAt(const Image& image, int x, int y) {
 
 TEST_F(FilmFramesOf, Frames_ChangeWhereACueBeginsOrEnds) {
     const FilmCues cues(mOptions, kTen);
-    FilmFrames frames(mOptions, cues, kTen);
+    FilmFrames frames(mOptions, cues, kTen, 1);
     std::vector<bool> changes;
     std::vector<bool> blanks;
     for (int frame = 0; frame < 12; ++frame) {
@@ -57,10 +57,10 @@ TEST_F(FilmFramesOf, Frame_DoesNotDependOnThoseBefore) {
     mOptions.film.fadeInMs = 150;
     mOptions.background = {Background::Kind::checkerboard, 0};
     const FilmCues cues(mOptions, kTen);
-    FilmFrames frames(mOptions, cues, kTen);
+    FilmFrames frames(mOptions, cues, kTen, 1);
     for (int frame = 0; frame < 12; ++frame) {
         frames.advanceTo(frame);
-        FilmFrames other(mOptions, cues, kTen);
+        FilmFrames other(mOptions, cues, kTen, 1);
         other.advanceTo(frame);
         EXPECT_EQ(frames.picture().pixels, other.picture().pixels) << frame;
     }
@@ -68,7 +68,7 @@ TEST_F(FilmFramesOf, Frame_DoesNotDependOnThoseBefore) {
 
 TEST_F(FilmFramesOf, Frame_HasTheCuesInTheirPlaces) {
     const FilmCues cues(mOptions, kTen);
-    FilmFrames frames(mOptions, cues, kTen);
+    FilmFrames frames(mOptions, cues, kTen, 1);
     const auto inkIn = [&](int frame, const voreltext::Box& box) {
         frames.advanceTo(frame);
         int most = 0;
@@ -94,7 +94,7 @@ TEST_F(FilmFramesOf, Fading_MultipliesThePremultipliedPicture) {
     const FilmCues cues(mOptions, kTen);
     const Image whole = cues.paint(cues.all()[0]);
     mOptions.film.fadeInMs = 500;  // at 0.3 seconds a fifth: 51 of 255
-    FilmFrames frames(mOptions, cues, kTen);
+    FilmFrames frames(mOptions, cues, kTen, 1);
     frames.advanceTo(3);
     const voreltext::Box& area = cues.all()[0].area;
     for (int y = 0; y < area.height(); ++y) {

@@ -2,7 +2,9 @@
 
 #include <unistd.h>
 
+#include <cerrno>
 #include <charconv>
+#include <cstring>
 #include <memory>
 #include <system_error>
 
@@ -109,6 +111,15 @@ void writeFile(const std::string& path, const std::function<void(std::FILE*)>& w
     NewFile file(target);
     fill(file.get(), inQuotes(path), write);
     file.finish();
+}
+
+void writeFile(const std::string& path, const std::vector<uint8_t>& bytes) {
+    writeFile(path, [&](std::FILE* file) { writeAll(file, bytes); });
+}
+
+void writeAll(std::FILE* file, const std::vector<uint8_t>& bytes) {
+    const size_t written = std::fwrite(bytes.data(), 1, bytes.size(), file);
+    if (written != bytes.size()) throw ToolError(std::strerror(errno));
 }
 
 }  // namespace vorelpaint

@@ -27,5 +27,9 @@ bool isStandardOutput(const std::string& path);
 /// link is made or replaced, not the link. "-" is standard output; a device or a pipe is written
 /// directly, and an open file under such a name as /dev/stdout from its place on. Throws ToolError.
 void writeFile(const std::string& path, const std::function<void(std::FILE*)>& write);
+void writeFile(const std::string& path, const std::vector<uint8_t>& bytes);
+
+/// Throws ToolError.
+void writeAll(std::FILE* file, const std::vector<uint8_t>& bytes);
 
 }  // namespace vorelpaint

@@ -2,13 +2,14 @@
 
 #include <algorithm>
 #include <cstdint>
-#include <cstring>
+#include <memory>
 #include <optional>
 #include <string>
 #include <vector>
 
 #include "child_program.h"
 #include "console.h"
+#include "crew.h"
 #include "error.h"
 #include "file_io.h"
 #include "film_clip.h"
@@ -19,6 +20,7 @@
 #include "film_request.h"
 #include "new_file.h"
 #include "numbered_name.h"
+#include "numbered_pictures.h"
 #include "painting.h"
 #include "png_writer.h"
 #include "progress.h"
@@ -29,6 +31,7 @@ namespace vorelpaint {
 namespace {
 
 using voreltext::Box;
+using voreltext::CanvasRequest;
 using voreltext::Image;
 using Bytes = std::vector<uint8_t>;
 
@@ -89,15 +92,10 @@ struct Film {
     HeldNotes notes;  ///< of the clip
 };
 
-void writeAll(std::FILE* file, const Bytes& bytes) {
-    const size_t written = std::fwrite(bytes.data(), 1, bytes.size(), file);
-    if (written != bytes.size()) throw ToolError(std::strerror(errno));
-}
-
 // --- raw frames -------------------------------------------------------------------------------------
 
 void writeRaw(const Film& film) {
-    FilmFrames frames(film.options, film.cues, film.rate);
+    FilmFrames frames(film.options, film.cues, film.rate, threadsFor(film.options));
     const int64_t count = film.cues.frameCount();
     writeFile(*film.options.output, [&](std::FILE* file) {
         Progress progress("frames", static_cast<size_t>(count));
@@ -111,41 +109,42 @@ void writeRaw(const Film& film) {
 
 // --- pictures ---------------------------------------------------------------------------------------
 
-void writeBytes(const std::string& path, const Bytes& bytes) {
-    writeFile(path, [&](std::FILE* file) { writeAll(file, bytes); });
-}
-
-/// A picture like the one before, and one without any cue, is not encoded anew.
+/// A picture like the one before, and one without any cue, is not encoded anew. Frames are laid here, one
+/// after the other, and encoded on threads.
 void writeFramePictures(const Film& film, const NumberedName& name) {
-    FilmFrames frames(film.options, film.cues, film.rate);
     const int64_t count = film.cues.frameCount();
-    Progress progress("frames", static_cast<size_t>(count));
-    Bytes blank;
-    Bytes seen;
+    FilmFrames frames(film.options, film.cues, film.rate, 1);
+    NumberedPictures pictures(name, threadsFor(film.options), "frames", static_cast<size_t>(count));
+    std::shared_ptr<NumberedPictures::File> blank;
+    std::shared_ptr<NumberedPictures::File> seen;
     for (int64_t frame = 0; frame < count; ++frame) {
         const bool isNew = frames.advanceTo(frame);
-        Bytes& bytes = frames.isBlank() ? blank : seen;
-        if (frames.isBlank() ? blank.empty() : isNew) {
-            bytes = encodedPng(frames.picture(), film.options.png);
+        auto& file = frames.isBlank() ? blank : seen;
+        if (frames.isBlank() ? blank == nullptr : isNew) {
+            file = pictures.add(frame, [&film, picture = frames.picture()](Workbench&) {
+                return encodedPng(picture, film.options.png);
+            });
+        } else {
+            pictures.repeat(frame, file);
         }
-        writeBytes(name.with(frame), bytes);
-        progress.advance();
     }
+    pictures.finish();
+}
+
+Bytes pictureOf(const Film& film, const PlacedCue& cue, Workbench& bench) {
+    const CanvasRequest& size = film.options.canvas;
+    Image frame = voreltext::transparentImage(*size.width, *size.height);
+    if (!cue.area.isEmpty()) layOver(frame, film.cues.paint(cue, bench), cue.area.left, cue.area.top);
+    layOn(frame, film.options.background);
+    return encodedPng(frame, film.options.png);
 }
 
 void writeCuePictures(const Film& film, const NumberedName& name) {
-    const std::vector<PlacedCue>& cues = film.cues.all();
-    Progress progress("cues", cues.size());
-    for (size_t i = 0; i < cues.size(); ++i) {
-        Image frame =
-            voreltext::transparentImage(*film.options.canvas.width, *film.options.canvas.height);
-        if (!cues[i].area.isEmpty()) {
-            layOver(frame, film.cues.paint(cues[i]), cues[i].area.left, cues[i].area.top);
-        }
-        layOn(frame, film.options.background);
-        writeBytes(name.with(static_cast<int64_t>(i) + 1), encodedPng(frame, film.options.png));
-        progress.advance();
-    }
+    NumberedPictures pictures(name, threadsFor(film.options), "cues", film.cues.all().size());
+    int64_t number = 0;
+    for (const PlacedCue& cue : film.cues.all())
+        pictures.add(++number, [&](Workbench& bench) { return pictureOf(film, cue, bench); });
+    pictures.finish();
 }
 
 // --- films of ffmpeg --------------------------------------------------------------------------------
@@ -178,7 +177,7 @@ Image rowsIn(const Image& picture, const FilmPlan& plan) {
 
 /// ffmpeg may close its input early, when the clip ends before the cues do.
 void feed(const Film& film, const FilmPlan& plan, ChildProgram& ffmpeg) {
-    FilmFrames frames(film.options, film.cues, film.rate);
+    FilmFrames frames(film.options, film.cues, film.rate, threadsFor(film.options));
     const int64_t count = framesToSend(film);
     Progress progress("frames", static_cast<size_t>(count));
     Image rows;

@@ -16,14 +16,19 @@ void clearRows(Image& image, const voreltext::Box& rows) {
     std::fill(row(rows.top), row(rows.bottom), uint8_t{0});
 }
 
+bool isEverSeen(const PlacedCue& placed) {
+    return placed.firstFrame < placed.endFrame && !placed.area.isEmpty();
+}
+
 }  // namespace
 
-FilmFrames::FilmFrames(const Options& options, const FilmCues& cues, const FrameRate& rate)
+FilmFrames::FilmFrames(const Options& options, const FilmCues& cues, const FrameRate& rate, int threads)
     : mOptions(options),
       mCues(cues),
       mRate(rate),
       mRows(cues.rows()),
-      mPicture(voreltext::transparentImage(*options.canvas.width, *options.canvas.height)) {
+      mPicture(voreltext::transparentImage(*options.canvas.width, *options.canvas.height)),
+      mCrew(threads) {
     layOn(mPicture, options.background);
 }
 
@@ -37,20 +42,46 @@ bool FilmFrames::advanceTo(int64_t frame) {
     return true;
 }
 
-FilmFrames::Seen FilmFrames::seenAt(int64_t frame) {
+void FilmFrames::paintAhead() {
+    const std::vector<PlacedCue>& all = mCues.all();
+    for (; mNextAhead < all.size() && !mCrew.isFull(); ++mNextAhead) {
+        const PlacedCue& placed = all[mNextAhead];
+        if (!isEverSeen(placed)) continue;
+        mAhead.push_back(std::make_shared<Image>());
+        mCrew.give([this, &placed, picture = mAhead.back()](Workbench& bench) {
+            *picture = mCues.paint(placed, bench);
+        });
+    }
+}
+
+/// The first one that was given.
+Image FilmFrames::takePainted() {
+    paintAhead();
+    mCrew.take();
+    Image picture = std::move(*mAhead.front());
+    mAhead.pop_front();
+    paintAhead();
+    return picture;
+}
+
+void FilmFrames::beginCues(int64_t frame) {
     const std::vector<PlacedCue>& all = mCues.all();
     for (; mNext < all.size() && all[mNext].firstFrame <= frame; ++mNext) {
-        if (all[mNext].endFrame > frame) mPainted.emplace(mNext, Image{});
+        if (isEverSeen(all[mNext])) mPainted.emplace(mNext, takePainted());
     }
+}
+
+FilmFrames::Seen FilmFrames::seenAt(int64_t frame) {
+    beginCues(frame);
     Seen seen;
     for (auto each = mPainted.begin(); each != mPainted.end();) {
-        const PlacedCue& placed = all[each->first];
+        const PlacedCue& placed = mCues.all()[each->first];
         if (placed.endFrame <= frame) {
             each = mPainted.erase(each);
             continue;
         }
         const float opacity = placed.opacityAt(mRate.startMs(frame), mOptions.film);
-        if (opacity > 0 && !placed.area.isEmpty()) seen.emplace_back(each->first, opacity);
+        if (opacity > 0) seen.emplace_back(each->first, opacity);
         ++each;
     }
     return seen;
@@ -62,20 +93,14 @@ void FilmFrames::compose() {
     for (const auto& [cue, opacity] : mSeen) {
         const voreltext::Box& area = mCues.all()[cue].area;
         if (opacity < 1) {
-            Image faded = pictureOf(cue);
+            Image faded = mPainted.at(cue);
             fade(faded, opacity);
             layOver(mPicture, faded, area.left, area.top);
         } else {
-            layOver(mPicture, pictureOf(cue), area.left, area.top);
+            layOver(mPicture, mPainted.at(cue), area.left, area.top);
         }
     }
     layOn(mPicture, mOptions.background, mRows.top, mRows.bottom);
-}
-
-const Image& FilmFrames::pictureOf(size_t cue) {
-    Image& picture = mPainted.at(cue);
-    if (picture.pixels.empty()) picture = mCues.paint(mCues.all()[cue]);
-    return picture;
 }
 
 }  // namespace vorelpaint

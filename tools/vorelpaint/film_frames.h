@@ -2,10 +2,13 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <deque>
 #include <map>
+#include <memory>
 #include <utility>
 #include <vector>
 
+#include "crew.h"
 #include "film_cues.h"
 #include "film_rate.h"
 #include "options.h"
@@ -13,12 +16,13 @@
 
 namespace vorelpaint {
 
-/// The frames of a film, one after the other. A cue is painted when it is first seen and kept until it
-/// ends; a frame like the one before it is left as it is.
+/// The frames of a film, one after the other. A cue is painted once, a little before it is first seen, and
+/// kept until it ends; a frame like the one before it is left as it is.
 class FilmFrames {
   public:
-    /// The cues must outlive it. The options have the frame's width and height.
-    FilmFrames(const Options& options, const FilmCues& cues, const FrameRate& rate);
+    /// The cues must outlive it. The options have the frame's width and height. So many threads paint
+    /// cues ahead.
+    FilmFrames(const Options& options, const FilmCues& cues, const FrameRate& rate, int threads);
 
     /// Goes to a frame, which is not before the last one; whether its pixels may differ from those of
     /// the frame before, as those of the first one do.
@@ -33,9 +37,11 @@ class FilmFrames {
   private:
     using Seen = std::vector<std::pair<size_t, float>>;  ///< cues with their opacities
 
+    void paintAhead();
+    voreltext::Image takePainted();
+    void beginCues(int64_t frame);
     Seen seenAt(int64_t frame);
     void compose();
-    const voreltext::Image& pictureOf(size_t cue);
 
     const Options& mOptions;
     const FilmCues& mCues;
@@ -46,6 +52,10 @@ class FilmFrames {
     Seen mSeen;
     size_t mNext = 0;                             ///< the first cue that has not begun
     std::map<size_t, voreltext::Image> mPainted;  ///< those that have begun and not ended
+
+    size_t mNextAhead = 0;  ///< the first cue that was not given to be painted
+    std::deque<std::shared_ptr<voreltext::Image>> mAhead;
+    Crew mCrew;  ///< ends before what it works at
 };
 
 }  // namespace vorelpaint

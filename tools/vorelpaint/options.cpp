@@ -133,8 +133,8 @@ void checkSeries(const Options& options) {
     if (options.skipExisting && !options.batch) {
         throw ToolError("--skip-existing leaves out jobs of a --batch");
     }
-    if (options.jobs && !options.batch && !options.sheet) {
-        throw ToolError("--jobs is for the pictures of a --batch or a --sheet");
+    if (options.jobs && !options.batch && !options.sheet && !options.film.subtitles) {
+        throw ToolError("--jobs is for the pictures of --batch, --sheet or --subtitles");
     }
 }
 

@@ -30,14 +30,6 @@ std::vector<uint8_t> fileOf(const Options& options, Image picture) {
     return encodedPng(picture, options.png);
 }
 
-void writeOutput(const Options& options, const std::vector<uint8_t>& bytes) {
-    writeFile(options.output.value(), [&](std::FILE* file) {
-        if (std::fwrite(bytes.data(), 1, bytes.size(), file) != bytes.size()) {
-            throw ToolError(std::strerror(errno));
-        }
-    });
-}
-
 }  // namespace
 
 Composition::Composition(const Options& options, Workbench& bench)
@@ -79,7 +71,7 @@ void noteCut(const Canvas& canvas, const Box& ink, const Margins& margins, const
 }
 
 void writePicture(const Options& options, Image picture) {
-    writeOutput(options, fileOf(options, std::move(picture)));
+    writeFile(*options.output, fileOf(options, std::move(picture)));
 }
 
 PaintedPicture painted(const Options& options, const Composition& composition) {
@@ -91,7 +83,7 @@ PaintedPicture painted(const Options& options, const Composition& composition) {
 }
 
 void handOver(const Options& options, const PaintedPicture& picture, const Note& note) {
-    if (options.output) writeOutput(options, picture.file);
+    if (options.output) writeFile(*options.output, picture.file);
     if (options.report) print(picture.report);
     picture.notes.giveTo(note);
 }
