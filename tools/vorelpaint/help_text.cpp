@@ -71,7 +71,9 @@ const std::vector<Topic>& topics() {
              ". They mean what the options of these names mean; style may also be a style itself. "
              "What a job does not say, it takes from the command line. Paths start at the working "
              "directory. A line that fails is reported with its number, and the next one goes on. "
-             "When two jobs have one output, nothing is painted."},
+             "When two jobs have one output, nothing is painted. Neither --jobs nor --shard changes "
+             "a picture, and what is said comes in the order of the lines. A run that was ended is "
+             "finished by the same command with --skip-existing."},
         {"Text",
          "Text is UTF-8; text that begins with - stands behind --. A line ends with LF, CR, CR "
          "LF, or one of U+0085, U+2028 and U+2029; a tab is painted as a blank. Any other control "
@@ -88,6 +90,7 @@ const std::vector<Topic>& topics() {
          "share/doc/vorelpaint/style-files.md lists every key of a style file, "
          "share/doc/vorelpaint/vorelpaint.md tells of batches and reports, "
          "share/doc/vorelpaint/captions.md has recipes for titles and captions, "
+         "share/doc/vorelpaint/at-scale.md spreads batches over cores and machines, "
          "share/doc/vorelpaint/layer-styles.md translates the layer styles of design tools, "
          "share/voreleffect/presets has the presets, and "
          "share/voreleffect/vorelpaint-style.schema.json tells editors what a style file may hold."},
