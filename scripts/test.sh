@@ -16,7 +16,7 @@ need_packages cmake ninja-build g++ clang-14 libclang-rt-14-dev pkg-config \
     fonts-hosny-amiri culmus fonts-lohit-deva fonts-tlwg-loma-ttf fonts-vlgothic fonts-alee \
     fonts-noto-color-emoji fonts-inter-variable \
     python3 python3-jsonschema zsh fish mandoc bsdextrautils ffmpeg \
-    locales g++-aarch64-linux-gnu qemu-user-static
+    locales parallel g++-aarch64-linux-gnu qemu-user-static
 
 presets=("$@")
 [[ $# -gt 0 ]] || presets=(release sanitize arm64)

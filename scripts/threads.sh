@@ -1,11 +1,12 @@
 #!/usr/bin/env bash
-# Runs the tests of separate threads under ThreadSanitizer.
+# Runs the tests of separate threads, and of the tool's crew, under ThreadSanitizer.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 . scripts/packages.sh
 
 need_packages cmake ninja-build g++ clang-14 libclang-rt-14-dev pkg-config googletest libgtest-dev \
-    libfreetype-dev fonts-dejavu-core android-liblog-dev
+    libfreetype-dev libfribidi-dev libharfbuzz-dev libfontconfig-dev libpng-dev libdeflate-dev \
+    libunibreak-dev nlohmann-json3-dev libcli11-dev libraqm-dev fonts-dejavu-core android-liblog-dev
 
 # ThreadSanitizer maps fixed addresses: on kernels that spread mappings widely it needs them unspread.
 run=()
@@ -15,9 +16,11 @@ build=build/thread
 cmake -S . -B "$build" -G Ninja -DCMAKE_BUILD_TYPE=RelWithDebInfo -DCMAKE_CXX_COMPILER=clang++-14 \
     -DCMAKE_CXX_FLAGS='-fsanitize=thread -fno-omit-frame-pointer' \
     -DCMAKE_CXX_FLAGS_RELWITHDEBINFO='-O2 -gline-tables-only -DNDEBUG' -DVOREL_ASSERTIONS=ON \
-    -DVOREL_BUILD_TESTS=ON -DVOREL_WERROR=ON > /dev/null
-"${run[@]}" cmake --build "$build" --target reliability_threads_tests -- --quiet
+    -DVOREL_BUILD_TESTS=ON -DVOREL_BUILD_TOOLS=ON -DVOREL_WERROR=ON > /dev/null
+"${run[@]}" cmake --build "$build" --target reliability_threads_tests vorelpaint vorelpaint_tests -- --quiet
 
 # A race shows only when both accesses are recent: the tests run several times.
-TSAN_OPTIONS='halt_on_error=1 history_size=7' \
-    "${run[@]}" "$build/tests/reliability/reliability_threads_tests" --gtest_repeat=3
+export TSAN_OPTIONS='halt_on_error=1 history_size=7'
+"${run[@]}" "$build/tests/reliability/reliability_threads_tests" --gtest_repeat=3
+"${run[@]}" "$build/tests/tool/vorelpaint_tests" --gtest_repeat=3 \
+    --gtest_filter='Crew.*:Threads/CrewOf.*:Series.AnyNumber*:Series.Sheet*:Series.WhatCameBefore*:Jobs/PipedSeries.*'

@@ -18,6 +18,7 @@ NAVIGATION = [
                  "docs/effects/pattern.md"]),
     ("Using it", ["docs/limits.md", "examples/README.md", "docs/android.md", "packaging/README.md",
                   "docs/looks.md", "docs/vorelpaint.md", "docs/captions.md", "docs/film.md",
+                  "docs/at-scale.md",
                   "docs/style-files.md", "docs/layer-styles.md"]),
     ("How it works", ["docs/architecture.md", "docs/pixels.md", "docs/fixed-point.md", "docs/quirks.md",
                       "docs/determinism.md", "docs/reliability.md", "docs/benchmarks.md",

@@ -61,6 +61,7 @@ class RunningVorelpaint {
     RunningVorelpaint(const RunningVorelpaint&) = delete;
     RunningVorelpaint& operator=(const RunningVorelpaint&) = delete;
 
+    pid_t id() const { return mChild; }
     void send(int signal) const;
 
     bool freeze() const;  ///< whether it stands still; it may have ended instead

@@ -139,7 +139,7 @@ class BatchRun {
         std::optional<std::string> fault;
 
         void paint(Workbench& bench) {
-            if (!isToDo || fault) return;
+            if (!isToDo) return;
             fault = faultOf([&] { picture = painted(options, Composition(options, bench)); });
         }
     };
@@ -166,11 +166,20 @@ class BatchRun {
         job->fault = faultOf([&] {
             job->options = parseJob(mReader.line(), mCommon);
             claimOutput(mOutputs, job->options, job->line);
-            job->isToDo = !mCommon.skipExisting || !isWritten(*job->options.output);
         });
         if (!isInShard(mCommon, mReader.jobNumber())) return;
-        mCrew.give([given = job.get()](Workbench& bench) { given->paint(bench); });
+        job->isToDo = !job->fault && !(mCommon.skipExisting && isWritten(*job->options.output));
+        give(std::move(job));
+    }
+
+    void give(std::unique_ptr<Job> job) {
         mJobs.push_back(std::move(job));
+        try {
+            mCrew.give([given = mJobs.back().get()](Workbench& bench) { given->paint(bench); });
+        } catch (...) {
+            mJobs.pop_back();
+            throw;
+        }
     }
 
     void handOverDone() {

@@ -2,6 +2,7 @@
 
 #include <malloc.h>
 #include <poll.h>
+#include <sched.h>
 #include <sys/eventfd.h>
 #include <unistd.h>
 
@@ -9,7 +10,6 @@
 #include <array>
 #include <cerrno>
 #include <cstdint>
-#include <system_error>
 #include <utility>
 
 #include "error.h"
@@ -29,11 +29,17 @@ void keepMemory() {
     ::mallopt(M_TRIM_THRESHOLD, kMostKept);
 }
 
+/// Those that it may run on: a job of a cluster has some of its machine's.
+int coresOfThisProcess() {
+    cpu_set_t cores;
+    if (::sched_getaffinity(0, sizeof cores, &cores) == 0) return CPU_COUNT(&cores);
+    return static_cast<int>(std::thread::hardware_concurrency());
+}
+
 }  // namespace
 
 int threadsFor(const Options& options) {
-    const auto cores = static_cast<int>(std::thread::hardware_concurrency());
-    return options.jobs.value_or(std::clamp(cores, kJobs.low, kJobs.high));
+    return options.jobs.value_or(std::clamp(coresOfThisProcess(), kJobs.low, kJobs.high));
 }
 
 Crew::Crew(int threads) {
@@ -42,10 +48,11 @@ Crew::Crew(int threads) {
     loadInstalledFonts();
     mDone = ::eventfd(0, EFD_CLOEXEC | EFD_NONBLOCK);
     if (mDone < 0) failWithErrno("cannot start threads");
+    mThreads.reserve(static_cast<size_t>(threads));
     try {
         for (int i = 0; i < threads; ++i)
             startThread();
-    } catch (const std::system_error&) {  // the system has no more of them
+    } catch (const std::exception&) {  // the system has no more of them, or no memory for them
     }
     mMost = std::max(size_t{1}, 2 * mThreads.size());
 }
@@ -101,9 +108,12 @@ void Crew::give(Task task) {
         given->isDone = true;
         return;
     }
-    {
+    try {
         const std::lock_guard<std::mutex> alone(mMutex);
         mWaiting.push_back(given);
+    } catch (...) {  // nobody would ever do it
+        mTasks.pop_back();
+        throw;
     }
     mChange.notify_one();
 }

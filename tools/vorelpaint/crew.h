@@ -15,7 +15,8 @@
 
 namespace vorelpaint {
 
-/// The threads that are asked for: as many as the machine has cores unless the options say so.
+/// The threads that are asked for: as many as there are cores for this process unless the options say
+/// so.
 int threadsFor(const Options& options);
 
 /// Threads that do tasks, each at a workbench of its own. Tasks are begun in the order in which they are
@@ -36,7 +37,7 @@ class Crew {
     bool isEmpty() const { return mTasks.empty(); }
     bool isFull() const { return mTasks.size() >= mMost; }  ///< two tasks for each thread
 
-    /// To be asked when it is not full.
+    /// To be asked when it is not full. Where this throws the task is not taken.
     void give(Task task);
 
     /// Whether the first task is done; there is one.

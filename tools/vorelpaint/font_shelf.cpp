@@ -73,7 +73,7 @@ std::shared_ptr<OpenFonts> FontShelf::open(const FontsKey& key, int size) {
 
 std::shared_ptr<OpenFonts> FontShelf::fresh(const FontsKey& key, int size) {
     auto opened = std::make_shared<OpenFonts>(key, size);
-    mOpen.keep({key, size}, opened);
+    mOpen.keep({key, size}, opened, key.files.size());
     return opened;
 }
 

@@ -46,11 +46,12 @@ class OpenFonts {
     std::set<std::pair<std::string, long>> mFallbacks;
 };
 
-/// Fonts, kept open from one text to the next: kMostFonts sets of them, each of one size. For one
-/// thread.
+/// Fonts, kept open from one text to the next: kMostSets sets of them, each of one size, of kMostFiles
+/// files that were asked for. For one thread.
 class FontShelf {
   public:
-    static constexpr size_t kMostFonts = 32;
+    static constexpr size_t kMostSets = 32;
+    static constexpr size_t kMostFiles = 64;
 
     /// What the fonts that are asked for are made of. Throws ToolError or TextError where one is not
     /// there.
@@ -66,7 +67,7 @@ class FontShelf {
     voreltext::FontFile fileOf(const std::string& request);
 
     Shelf<std::string, voreltext::FontFile> mInstalled{kMostNames};
-    Shelf<std::pair<FontsKey, int>, OpenFonts> mOpen{kMostFonts};
+    Shelf<std::pair<FontsKey, int>, OpenFonts> mOpen{kMostSets, kMostFiles};
 };
 
 }  // namespace vorelpaint

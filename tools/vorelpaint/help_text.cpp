@@ -74,7 +74,9 @@ const std::vector<Topic>& topics() {
              ". They mean what the options of these names mean; style may also be a style itself. "
              "What a job does not say, it takes from the command line. Paths start at the working "
              "directory. A line that fails is reported with its number, and the next one goes on. "
-             "When two jobs have one output, nothing is painted."},
+             "When two jobs have one output, nothing is painted. Neither --jobs nor --shard changes "
+             "a picture, and what is said comes in the order of the lines. A run that was ended is "
+             "finished by the same command with --skip-existing."},
         {"Films",
          "The cues of --subtitles are painted in frames of 1920 x 1080 pixels, or of the clip's sides; "
          "centred lines stand at the bottom, broken where they are too wide. The font has an "
@@ -104,6 +106,7 @@ const std::vector<Topic>& topics() {
          "share/doc/vorelpaint/style-files.md lists every key of a style file, "
          "share/doc/vorelpaint/vorelpaint.md tells of batches and reports, "
          "share/doc/vorelpaint/captions.md has recipes for titles and captions, "
+         "share/doc/vorelpaint/at-scale.md spreads batches over cores and machines, "
          "share/doc/vorelpaint/layer-styles.md translates the layer styles of design tools, "
          "share/doc/vorelpaint/film.md tells of films, "
          "share/voreleffect/presets has the presets, and "

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <optional>
 #include <string>
+#include <utility>
 #include <variant>
 
 #include "style_file.h"
@@ -59,6 +60,15 @@ struct CoversFill {
     }
 };
 
+/// Adds what the pictures hold that are loaded.
+vorelstyle::LoadImage weighed(vorelstyle::LoadImage load, size_t& bytes) {
+    return [load = std::move(load), &bytes](const std::string& name) {
+        vorelstyle::PatternImage image = load(name);
+        bytes += image.pixels.size();
+        return image;
+    };
+}
+
 /// The first effect of a look that covers its fill; empty when there is none.
 std::string coverOf(const LookStyle& look) {
     const auto cover = std::find_if(look.effects.begin(), look.effects.end(), [](const Effect& effect) {
@@ -84,7 +94,8 @@ Style chosenStyle(const Options& options) {
 LayerSet::LayerSet(const Options& options, const Style& style, int size,
                    const std::vector<ColourRange>& colours, const Note& note)
     : mStyle(resolvedStyle(style, size, options.effectScale, note)),
-      mStack(std::make_unique<Stack>(mStyle, options.color, options.opacity, imagesOf(mStyle))) {
+      mStack(std::make_unique<Stack>(mStyle, options.color, options.opacity,
+                                     weighed(imagesOf(mStyle), mPictureBytes))) {
     for (const std::string& line : mStack->notes())
         note(line);
     for (const std::string& effect : mStack->unpainted())

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <filesystem>
 #include <memory>
 #include <optional>
@@ -30,12 +31,14 @@ class LayerSet {
     const vorelstyle::Style& style() const { return mStyle; }  ///< with lengths in pixels
     const vorelstyle::Stack& stack() const { return *mStack; }
     const std::vector<voreltext::Layer>& layers() const { return mLayers; }
+    size_t pictureBytes() const { return mPictureBytes; }  ///< of the pixels of its patterns
 
   private:
     void addColours(const Options& options, const std::vector<vorelstyle::ColourRange>& colours,
                     const Note& note);
 
     vorelstyle::Style mStyle;
+    size_t mPictureBytes = 0;
     std::unique_ptr<vorelstyle::Stack> mStack;
     std::vector<voreltext::Layer> mLayers;
 };

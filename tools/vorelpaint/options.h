@@ -65,7 +65,7 @@ struct Options {
     std::optional<std::string> batch;
     std::optional<Shard> shard;
     bool skipExisting = false;
-    std::optional<int> jobs;  ///< at a time; as many as there are cores without
+    std::optional<int> jobs;  ///< threads; as many as there are cores without
     bool sheet = false;
     std::vector<int> sheetSizes;  ///< empty: the one size
     bool explain = false;

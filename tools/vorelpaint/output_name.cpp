@@ -58,8 +58,10 @@ bool namesOtherKind(std::string_view path) {
 
 bool isWritten(const std::string& path) {
     const std::optional<fs::path> target = targetOf(path);
-    std::error_code ignored;
-    return target && !isForAll(*target) && fs::exists(*target, ignored);
+    std::error_code error;
+    if (!target || isForAll(*target)) return false;
+    const uintmax_t size = fs::file_size(*target, error);
+    return !error && size > 0;
 }
 
 std::optional<size_t> OutputNames::claim(const std::string& path, size_t line) {

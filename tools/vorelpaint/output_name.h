@@ -12,8 +12,8 @@ namespace vorelpaint {
 /// of mktemp, do not.
 bool namesOtherKind(std::string_view path);
 
-/// Whether there is a file already where `path` leads to. Devices, pipes and open files are always there
-/// to be written.
+/// Whether there is a file with something in it already where `path` leads to: files take their names
+/// when they are whole. Devices, pipes and open files are always there to be written.
 bool isWritten(const std::string& path);
 
 /// The files that the jobs of a batch write.

@@ -356,27 +356,27 @@ std::vector<Setting> outputSettings() {
 
 std::vector<Setting> seriesSettings() {
     constexpr const char* kGroup = "Many pictures";
-    return {
-        programOption("batch", "FILE", kGroup,
-                      "Paint the jobs of FILE, one JSON object a line; - for standard input",
-                      text(&Options::batch)),
-        programOption("shard", "I/N", kGroup,
-                      "Of a batch every N-th job alone, from job I on, for other processes to do "
-                      "the others",
-                      readShard),
-        programOption("skip-existing", "", kGroup, "Leave the jobs of a batch out whose output is there",
-                      flag(&Options::skipExisting)),
-        programOption("jobs", "N", kGroup,
-                      "Paint " + spelled(kJobs) +
-                          " pictures of a batch or a sheet at a time "
-                          "(as many as there are cores)",
-                      numberWithin(kJobs, &Options::jobs)),
-        programOption("sheet", "", kGroup, "Paint TEXT in every preset, with their names",
-                      flag(&Options::sheet)),
-        programOption("sizes", "LIST", kGroup,
-                      "Sizes of a sheet's columns, such as 24,48,96: " + spelled(kSheetSizes) + " of " +
-                          spelled(kFontSize) + " pixels",
-                      readSheetSizes)};
+    return {programOption("batch", "FILE", kGroup,
+                          "Paint the jobs of FILE, one JSON object a line; - for standard input",
+                          text(&Options::batch)),
+            programOption("shard", "I/N", kGroup,
+                          "Of a batch every N-th job alone, from job I on, for other processes to do "
+                          "the others",
+                          readShard),
+            programOption("skip-existing", "", kGroup,
+                          "Leave the jobs of a batch out whose output is there and not empty",
+                          flag(&Options::skipExisting)),
+            programOption("jobs", "N", kGroup,
+                          "Paint " + spelled(kJobs) +
+                              " pictures of a batch or a sheet at a time "
+                              "(as many as there are cores)",
+                          numberWithin(kJobs, &Options::jobs)),
+            programOption("sheet", "", kGroup, "Paint TEXT in every preset, with their names",
+                          flag(&Options::sheet)),
+            programOption("sizes", "LIST", kGroup,
+                          "Sizes of a sheet's columns, such as 24,48,96: " + spelled(kSheetSizes) +
+                              " of " + spelled(kFontSize) + " pixels",
+                          readSheetSizes)};
 }
 
 std::vector<Setting> reportSettings() {

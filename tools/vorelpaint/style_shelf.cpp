@@ -54,14 +54,14 @@ bool StyleShelf::LooksKey::operator==(const LooksKey& other) const {
 std::shared_ptr<const LayerSet> StyleShelf::looks(const Options& options, int size,
                                                   const std::vector<ColourRange>& colours,
                                                   const Note& note) {
-    const std::shared_ptr<const Style> chosen = style(options);
+    const auto [chosen, isKept] = style(options);
     const LooksKey key{chosen,        picturesOf(*chosen), size,   options.effectScale,
                        options.color, options.opacity,     colours};
-    std::shared_ptr<const NotedLooks> noted = mLooks.find(key);
+    std::shared_ptr<const NotedLooks> noted = isKept ? mLooks.find(key) : nullptr;
     if (!noted) {
         auto made = std::make_shared<NotedLooks>();
         made->looks.emplace(options, *chosen, size, colours, made->notes.taker());
-        mLooks.keep(key, made);
+        if (isKept) mLooks.keep(key, made, made->looks->pictureBytes());
         noted = made;
     }
     noted->notes.giveTo(note);
@@ -69,15 +69,15 @@ std::shared_ptr<const LayerSet> StyleShelf::looks(const Options& options, int si
 }
 
 /// One that stands in a job or nowhere is in no file.
-std::shared_ptr<const Style> StyleShelf::style(const Options& options) {
+StyleShelf::ChosenStyle StyleShelf::style(const Options& options) {
     const std::optional<std::filesystem::path> path = chosenStyleFile(options);
-    if (!path || *path == "-") return std::make_shared<const Style>(chosenStyle(options));
+    if (!path || *path == "-") return {std::make_shared<const Style>(chosenStyle(options)), false};
     const StyleKey key{path->string(), markOf(*path)};
     std::shared_ptr<const Style> kept = mStyles.find(key);
-    if (kept) return kept;
+    if (kept) return {kept, true};
     kept = std::make_shared<const Style>(loadStyle(*path));
     mStyles.keep(key, kept);
-    return kept;
+    return {kept, true};
 }
 
 }  // namespace vorelpaint

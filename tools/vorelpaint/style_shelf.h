@@ -16,11 +16,13 @@
 namespace vorelpaint {
 
 /// Styles that were read from files, and their looks, kept from one text to the next: kMostStyles and
-/// kMostLooks. A file that has changed is read anew. For one thread.
+/// kMostLooks, these with at most kMostPictureBytes of patterns. A file that has changed is read anew.
+/// For one thread.
 class StyleShelf {
   public:
     static constexpr size_t kMostStyles = 32;
     static constexpr size_t kMostLooks = 32;
+    static constexpr size_t kMostPictureBytes = size_t{64} << 20;  ///< one of the largest there may be
 
     /// The style that is asked for, as LayerSet makes it for text of one size; it notes the same when it
     /// is kept. Throws ToolError or StyleError.
@@ -52,10 +54,15 @@ class StyleShelf {
         std::optional<LayerSet> looks;
     };
 
-    std::shared_ptr<const vorelstyle::Style> style(const Options& options);
+    struct ChosenStyle {
+        std::shared_ptr<const vorelstyle::Style> style;
+        bool isKept;  ///< and may come again
+    };
+
+    ChosenStyle style(const Options& options);
 
     Shelf<StyleKey, const vorelstyle::Style> mStyles{kMostStyles};
-    Shelf<LooksKey, const NotedLooks> mLooks{kMostLooks};
+    Shelf<LooksKey, const NotedLooks> mLooks{kMostLooks, kMostPictureBytes};
 };
 
 }  // namespace vorelpaint
