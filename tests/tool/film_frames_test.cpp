@@ -66,6 +66,28 @@ TEST_F(FilmFramesOf, Frame_DoesNotDependOnThoseBefore) {
     }
 }
 
+/// More cues than threads paint ahead, some of which no frame shows.
+TEST_F(FilmFramesOf, AnyNumberOfThreads_PaintsTheSame) {
+    std::string cues;
+    for (int i = 0; i < 40; ++i) {
+        const std::string tenth = std::to_string(i / 10) + "," + std::to_string(i % 10);
+        cues += "00:00:0" + tenth + "10 --> 00:00:0" + tenth + (i % 3 == 0 ? "90" : "95") + "\nA\n\n" +
+                "00:00:0" + tenth + "00 --> 00:00:0" + tenth + "99\n" + std::to_string(i) + "\n\n";
+    }
+    mOptions.film.subtitles = mDir.write("many.srt", cues);
+    const FilmCues set(mOptions, kTen);
+    FilmFrames alone(mOptions, set, kTen, 1);
+    FilmFrames many(mOptions, set, kTen, 3);
+    FilmFrames skipping(mOptions, set, kTen, 2);
+    for (int frame = 0; frame < 41; ++frame) {
+        EXPECT_EQ(alone.advanceTo(frame), many.advanceTo(frame)) << frame;
+        ASSERT_EQ(alone.picture().pixels, many.picture().pixels) << frame;
+        if (frame % 7 != 0) continue;
+        skipping.advanceTo(frame);
+        ASSERT_EQ(alone.picture().pixels, skipping.picture().pixels) << frame;
+    }
+}
+
 TEST_F(FilmFramesOf, Frame_HasTheCuesInTheirPlaces) {
     const FilmCues cues(mOptions, kTen);
     FilmFrames frames(mOptions, cues, kTen, 1);
@@ -92,7 +114,8 @@ TEST_F(FilmFramesOf, Frame_HasTheCuesInTheirPlaces) {
 
 TEST_F(FilmFramesOf, Fading_MultipliesThePremultipliedPicture) {
     const FilmCues cues(mOptions, kTen);
-    const Image whole = cues.paint(cues.all()[0]);
+    Workbench bench;
+    const Image whole = cues.paint(cues.all()[0], bench);
     mOptions.film.fadeInMs = 500;  // at 0.3 seconds a fifth: 51 of 255
     FilmFrames frames(mOptions, cues, kTen, 1);
     frames.advanceTo(3);

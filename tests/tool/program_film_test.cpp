@@ -11,6 +11,7 @@
 #include <cstdio>
 #include <cstdlib>
 #include <filesystem>
+#include <map>
 #include <nlohmann/json.hpp>
 #include <sstream>
 #include <string>
@@ -158,6 +159,25 @@ TEST_F(Films, NumberedPictures_AreTheFrames) {
         ++number;
     }
     EXPECT_EQ(number, 15U);
+}
+
+TEST_F(Films, AnyNumberOfThreads_MakesTheSame) {
+    for (const Words& words :
+         {Words{"f%d.png"}, Words{"f%d.png", "--each", "cue"}, Words{"f.rgba"}, Words{"f.mkv"}}) {
+        std::vector<std::map<std::string, std::string>> results;
+        for (const char* jobs : {"1", "2", "5"}) {
+            const TempDir dir;
+            Words here = words;
+            here.front() = dir.file(here.front());
+            made(inFrames(Words{"--fade-in", "200", "--fade-out", "200", "--jobs", jobs, "-o"} + here));
+            results.emplace_back();
+            for (const std::string& name : dir.list())
+                results.back()[name] = readBytes(dir.file(name));
+        }
+        EXPECT_EQ(results[0].size(), words[0] != "f%d.png" ? 1U : words.size() == 1 ? 45U : 2U);
+        EXPECT_EQ(results[0], results[1]) << words[0];
+        EXPECT_EQ(results[0], results[2]) << words[0];
+    }
 }
 
 TEST_F(Films, PictureOfEachCue_StandsInTheReport) {

@@ -109,8 +109,8 @@ void writeRaw(const Film& film) {
 
 // --- pictures ---------------------------------------------------------------------------------------
 
-/// A picture like the one before, and one without any cue, is not encoded anew. Frames are laid here, one
-/// after the other, and encoded on threads.
+/// A picture like the one before, and one without any cue, is not encoded anew. Frames are laid here,
+/// one after the other, and encoded on threads.
 void writeFramePictures(const Film& film, const NumberedName& name) {
     const int64_t count = film.cues.frameCount();
     FilmFrames frames(film.options, film.cues, film.rate, 1);

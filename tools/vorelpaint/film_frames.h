@@ -16,8 +16,8 @@
 
 namespace vorelpaint {
 
-/// The frames of a film, one after the other. A cue is painted once, a little before it is first seen, and
-/// kept until it ends; a frame like the one before it is left as it is.
+/// The frames of a film, one after the other. A cue is painted once, a little before it is first seen,
+/// and kept until it ends; a frame like the one before it is left as it is.
 class FilmFrames {
   public:
     /// The cues must outlive it. The options have the frame's width and height. So many threads paint

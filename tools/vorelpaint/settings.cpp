@@ -368,7 +368,7 @@ std::vector<Setting> seriesSettings() {
                           flag(&Options::skipExisting)),
             programOption("jobs", "N", kGroup,
                           "Paint " + spelled(kJobs) +
-                              " pictures of a batch or a sheet at a time "
+                              " pictures of a batch, a sheet or a film at a time "
                               "(as many as there are cores)",
                           numberWithin(kJobs, &Options::jobs)),
             programOption("sheet", "", kGroup, "Paint TEXT in every preset, with their names",
