@@ -73,7 +73,7 @@ class Series : public ::testing::Test {
                job("pattern.png", R"("text": "A", "style": {"pattern": {"image": "/no/such.png"}})") +
                job("no/such/a.png", R"("text": "A")") +
                job("cut.png", R"("text": "A", "preset": "gold", "width": 16, "height": 16)") +
-               job("markup.png", R"("text": "{#F00}A{/}b", "markup": true)") +
+               job("markup.png", R"("text": "<c #F00>A</c>b", "markup": true)") +
                job("blank.png", R"("text": " ")") + job("last.png", R"("text": "A")");
     }
 
@@ -160,6 +160,8 @@ TEST_F(Series, WhatCameBefore_ChangesNoPicture) {
         R"("text": "A", "preset": "gold", "opacity": 0.5)",
         R"("text": "A", "preset": "gold", "effect-scale": 2)",
         R"("text": "Av", "font-features": "kern=0")",
+        R"("text": "Av")",
+        R"("text": "A b c")",
         R"("text": "Av", "letter-spacing": 3)",
         R"("text": "Av", "letter-spacing": "3%")",
         R"("text": "A b c", "fit": "wrap", "width": 20, "height": 90)",
@@ -167,15 +169,17 @@ TEST_F(Series, WhatCameBefore_ChangesNoPicture) {
         R"("text": "A b c", "box": "line")",
         R"("text": "A\nb c", "align": "right")",
         R"("text": "A\nb c", "line-height": 2)",
-        R"("text": "{#F00}A{/}b", "markup": true)",
-        R"("text": "A{#F00}b{/}", "markup": true)",
+        R"("text": "<c #F00>A</c>b", "markup": true, "preset": "plain")",
+        R"("text": "A<c #F00>b</c>", "markup": true, "preset": "plain")",
         R"("text": "A", "style": {"stroke": {"size": 1, "color": "#F00", "position": "outside"}})",
         R"("text": "A", "style": {"stroke": {"size": 2, "color": "#F00", "position": "outside"}})"};
     std::string lines;
-    for (const char* round : {"a", "b", "c"}) {
-        for (size_t i = 0; i < members.size(); ++i)
-            lines += job(round + std::to_string(i) + ".png", members[i]);
+    for (size_t i = 0; i < members.size(); ++i) {
+        lines += job("a" + std::to_string(i) + ".png", members[i]);
+        lines += job("b" + std::to_string(i) + ".png", members[i]);
     }
+    for (size_t i = 0; i < members.size(); ++i)
+        lines += job("c" + std::to_string(i) + ".png", members[i]);
     const Outcome outcome = run(lines, {"--jobs", "1", "--report", "json"});
     EXPECT_EQ(outcome.exitCode, 0) << outcome.err;
     const Files files = takePainted();
@@ -248,23 +252,36 @@ TEST_P(PipedSeries, FilesThatChangeBetweenLines_AreReadAnew) {
     EXPECT_NE(byColour["#FF0000"], byColour["#0000FF"]);
 }
 
-TEST_P(PipedSeries, PatternsThatChangeBetweenLines_AreReadAnew) {
+TEST_P(PipedSeries, OldFilesThatChangeBetweenLines_AreReadAnew) {
     const std::string image = mInputs.file("tile.png");
-    const std::string style =
-        mInputs.write("look.json", R"({"pattern": {"image": "tile.png", "scale": 1}})");
-    const std::string members = R"("text": "A", "style": ")" + style + "\"";
+    const auto writeTile = [&](const char* colour) {
+        runVorelpaint({"--size", "9", "--background", colour, "--color", colour, "-o", image, "I"});
+    };
+    const auto writeStyle = [&](const char* scale) {
+        return mInputs.write(
+            "look.json", std::string(R"({"pattern": {"image": "tile.png", "scale": )") + scale + "}}");
+    };
+    const std::string members = R"("text": "A", "style": ")" + writeStyle("1") + "\"";
+    writeTile("#F00");
+    std::this_thread::sleep_for(std::chrono::milliseconds(3100));  // until they are kept
     RunningVorelpaint program({"--size", "20", "--batch", mFifo, "--jobs", GetParam()});
     std::ofstream pipe(mFifo, std::ios::binary);
-    std::vector<std::string> pictures;
-    for (const char* colour : {"#F00", "#00F"}) {
-        runVorelpaint({"--size", "9", "--background", colour, "--color", colour, "-o", image, "I"});
-        const std::string name = std::to_string(pictures.size()) + ".png";
-        ASSERT_TRUE(paint(pipe, name, members));
-        pictures.push_back(readBytes(mDir.file(name)));
-    }
+    int number = 0;
+    const auto next = [&] {
+        const std::string name = std::to_string(number++) + ".png";
+        EXPECT_TRUE(paint(pipe, name, members));
+        return readBytes(mDir.file(name));
+    };
+    const std::string red = next();
+    for (int i = 0; i < 5; ++i)
+        EXPECT_EQ(next(), red);
+    writeTile("#00F");
+    const std::string blue = next();
+    EXPECT_NE(blue, red);
+    writeStyle("1, \"opacity\": 0.5");
+    EXPECT_NE(next(), blue);
     pipe.close();
     EXPECT_EQ(program.wait(), 0);
-    EXPECT_NE(pictures[0], pictures[1]);
 }
 
 INSTANTIATE_TEST_SUITE_P(Jobs, PipedSeries, ::testing::Values("1", "2", "5"));

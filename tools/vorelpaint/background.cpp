@@ -22,7 +22,7 @@ uint8_t channelOf(uint32_t colour, int channel) {
 /// For each alpha and channel the value with the alpha divided out, rounded to nearest and at most 255.
 class StraightChannels {
   public:
-    StraightChannels() : mValues(256 * 256) {
+    StraightChannels() : mValues(size_t{256} * 256) {
         for (unsigned int alpha = 1; alpha < 256; ++alpha) {
             for (unsigned int channel = 0; channel < 256; ++channel) {
                 const unsigned int straight = (channel * 255U + alpha / 2) / alpha;
