@@ -17,7 +17,7 @@ for text in "$help" "${manual//\\-/-}"; do
 done
 
 pages=("$prefix"/share/doc/vorelpaint/*.md)
-[[ ${#pages[@]} -eq 5 ]] || fail "not the five pages"
+[[ ${#pages[@]} -eq 6 ]] || fail "not the six pages"
 for page in "${pages[@]}"; do
     mapfile -t links < <(grep -oE '(\]\(|<img src=")[^)#"]+' "$page" | sed -E 's/^(\]\(|<img src=")//')
     [[ ${#links[@]} -ge 2 ]] || fail "$page: not the links that were counted"

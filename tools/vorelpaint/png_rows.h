@@ -2,6 +2,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <cstring>
 #include <vector>
 
 namespace vorelpaint {
@@ -30,14 +31,22 @@ std::vector<uint8_t> unfiltered(const PngRows& rows);
 /// signed numbers: what the format itself advises for pictures of many colours.
 std::vector<uint8_t> filtered(const PngRows& rows);
 
-/// Whether most pixels are new, of those that are neither the one on their left nor the one above: as
-/// far as a table of 4,096 tells in which later ones push out earlier ones. So they are in photographs.
+/// Whether most pixels are new, of those in every fourth row that are neither the one on their left nor
+/// the one above: as far as a table of 4,096 tells in which later ones push out earlier ones. So they
+/// are in photographs.
 bool isOfNewPixels(const PngRows& rows);
 
 /// A pixel as one word, equal where its four channels are.
-uint32_t wordAt(const uint8_t* pixel);
+inline uint32_t wordAt(const uint8_t* pixel) {
+    uint32_t word = 0;
+    std::memcpy(&word, pixel, sizeof word);
+    return word;
+}
 
 /// A number below 2^bits for a word; `bits` is from 1 to 31.
-size_t spread(uint32_t word, int bits);
+inline size_t spread(uint32_t word, int bits) {
+    constexpr uint32_t kGolden = 2654435761U;  // 2^32 over the golden ratio, as Knuth hashes
+    return (word * kGolden) >> (32 - bits);
+}
 
 }  // namespace vorelpaint
