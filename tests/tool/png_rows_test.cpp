@@ -93,8 +93,19 @@ bool isOfNew(const Bytes& numbers, size_t width) {
 /// The first row and column are only looked at.
 TEST(PngRows, PixelsAreNew_WhereMostCameNotBefore) {
     EXPECT_TRUE(isOfNew({0, 0, 0, 0, 0, 1, 2, 3}, 4)) << "three new ones";
-    EXPECT_TRUE(isOfNew({0, 0, 0, 0, 0, 1, 2, 1}, 4)) << "two of three";
-    EXPECT_FALSE(isOfNew({0, 0, 0, 0, 0, 0, 1, 2, 1, 2}, 5)) << "two of four";
+    EXPECT_TRUE(isOfNew({0, 0, 0, 0, 0, 0, 0, 1, 2, 3, 4, 1}, 6)) << "four of five";
+    EXPECT_FALSE(isOfNew({0, 0, 0, 0, 0, 0, 1, 2, 3, 1}, 5)) << "three of four";
+}
+
+/// Those of the rows between are not looked at.
+TEST(PngRows, PixelsAreNew_InEveryFourthRow) {
+    const Bytes seen{0, 0, 0, 0, 0, 1, 2, 3};
+    const Bytes between{0, 1, 2, 1, 0, 3, 1, 3, 0, 1, 3, 1};
+    Bytes rows = seen;
+    rows.insert(rows.end(), between.begin(), between.end());
+    EXPECT_TRUE(isOfNew(rows, 4));
+    rows.insert(rows.end(), {0, 2, 3, 2});
+    EXPECT_FALSE(isOfNew(rows, 4));
 }
 
 TEST(PngRows, PixelsLikeANeighbour_AreNotCounted) {

@@ -116,7 +116,7 @@ bool isOfNewPixels(const PngRows& rows) {
             last = pixel;
         }
     }
-    return fresh > edges / 2;
+    return 4 * fresh > 3 * edges;
 }
 
 }  // namespace vorelpaint
