@@ -672,6 +672,27 @@ TEST_F(SetMemory, RefusedWhileAdding_PaintsWithoutTheEffectUntilItIsAddedAgain) 
     }
 }
 
+TEST_F(SetMemory, RefusedWhileUpdating_KeepsTheOldEffectAndReturnsItsId) {
+    const auto update = [](VFEffect& set, int type) {
+        return type == kPattern ? set.addPatternText(&tile(), 3, 1) : addEffect(set, type, 2);
+    };
+    for (const int type : kEveryType) {
+        refuseEach(std::string("updating the ") + nameOf(type), [&](long n, Refusal refusal) {
+            VFEffect set;
+            const unsigned id = addEffect(set, type);
+            VFProperty* const old = set.getEffect(type)->getProperty();
+            bool refused = false;
+            {
+                const RefusedMemory no(n, refusal);
+                EXPECT_EQ(update(set, type), id);
+                refused = RefusedMemory::refused();
+            }
+            EXPECT_TRUE(!refused || set.getEffect(type)->getProperty() == old);
+            return refused;
+        });
+    }
+}
+
 /// In every floating-point state: throwing leaves it as it was, too.
 TEST_F(SetMemory, ListThatCannotGrow_ThrowsAndLeavesTheSetAsItWas) {
     for (const FloatState& state : floatStates()) {
