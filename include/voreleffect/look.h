@@ -30,8 +30,8 @@
 /// out. It takes neither exceptions nor run-time type information.
 ///
 /// Conventions beside those of VFBitmap.h:
-///  - Input is const and stays the caller's; views are looked at during the call that they are handed
-///  to.
+///  - Input is const and stays the caller's; views are looked at only during the call that they are
+///    handed to.
 ///  - Numbers out of range become what VFEffect's add-calls make of them.
 ///  - std::bad_alloc comes from what makes or copies looks, painters and pictures, and from key() and
 ///    margins(), before anything is painted. A Painter that is made paints without throwing. In a
@@ -42,7 +42,7 @@ namespace VFontEffect {
 
 /// A colour without an opacity: 0xRRGGBB.
 struct Color {
-    unsigned int value = 0;
+    unsigned int value = 0;  ///< 0xRRGGBB
 };
 
 /// A colour from 0xRRGGBB; what lies above is ignored.
@@ -57,11 +57,11 @@ constexpr Color rgb(int red, int green, int blue) {
             static_cast<unsigned int>(std::clamp(blue, 0, 255))};
 }
 
-/// One colour of a ramp. `place` runs from 0 to 1, ascending from stop to stop.
+/// One colour of a ramp.
 struct Stop {
-    Color color;
-    float opacity = 1;
-    float place = 0;
+    Color color;        ///< black at the start
+    float opacity = 1;  ///< 0 to 1
+    float place = 0;    ///< 0 to 1, ascending from stop to stop
 };
 
 /// Where a stroke lies on the edge of the glyphs.
@@ -72,24 +72,25 @@ enum class PixelOrder { rgba, bgra };
 
 /// Pixels that an effect needs, or a picture has, around the glyphs.
 struct Margins {
-    int left = 0;
-    int top = 0;
-    int right = 0;
-    int bottom = 0;
+    int left = 0;    ///< 0 or more
+    int top = 0;     ///< 0 or more
+    int right = 0;   ///< 0 or more
+    int bottom = 0;  ///< 0 or more
 };
 
 /// Half-open, in whole pixels; empty at the start.
 struct Box {
-    int left = 0;
-    int top = 0;
-    int right = 0;
-    int bottom = 0;
+    int left = 0;    ///< first column
+    int top = 0;     ///< first row
+    int right = 0;   ///< one past the last column
+    int bottom = 0;  ///< one past the last row
 
+    /// Whether there is no pixel in it.
     bool isEmpty() const { return right <= left || bottom <= top; }
 };
 
 /// The coverage of one glyph, or of a whole line, and where it stands. One of no width or no height is
-/// skipped, whatever else it holds.
+/// skipped, with or without coverage.
 struct Glyph {
     int x = 0;                                ///< left edge, from the origin of the text
     int y = 0;                                ///< top edge
@@ -102,14 +103,18 @@ struct Glyph {
 /// A list of glyphs that lie elsewhere: to be handed to a call, not to be kept.
 class Glyphs {
   public:
+    /// One.
     Glyphs(const Glyph& only) : Glyphs(&only, 1) {}
+    /// Those of a list.
     Glyphs(const std::vector<Glyph>& glyphs) : Glyphs(glyphs.data(), glyphs.size()) {}
+    /// Those that are named.
     Glyphs(const std::initializer_list<Glyph>& glyphs) : Glyphs(glyphs.begin(), glyphs.size()) {}
+    /// `count` of them from the first on; none when that is null.
     Glyphs(const Glyph* first, std::size_t count)
         : mFirst(first), mCount(first == nullptr ? 0 : count) {}
 
-    const Glyph* begin() const { return mFirst; }
-    const Glyph* end() const { return mFirst + mCount; }
+    const Glyph* begin() const { return mFirst; }         ///< the first
+    const Glyph* end() const { return mFirst + mCount; }  ///< behind the last
 
   private:
     const Glyph* mFirst;
@@ -119,17 +124,17 @@ class Glyphs {
 /// A picture to paint on: premultiplied pixels of 4 bytes.
 struct PictureView {
     unsigned char* data = nullptr;  ///< top row first
-    int width = 0;
-    int height = 0;
-    std::ptrdiff_t stride = 0;  ///< bytes from row to row, at least 4 * width; 0 for packed rows
-    PixelOrder order = PixelOrder::rgba;
+    int width = 0;                  ///< pixels of a row
+    int height = 0;                 ///< rows
+    std::ptrdiff_t stride = 0;      ///< bytes from row to row, at least 4 * width; 0 for packed rows
+    PixelOrder order = PixelOrder::rgba;  ///< of its bytes
 };
 
 /// The pixels of a pattern: R, G, B, A, straight, that is not premultiplied.
 struct PixelView {
     const unsigned char* data = nullptr;  ///< top row first
-    int width = 0;
-    int height = 0;
+    int width = 0;                        ///< pixels of a row
+    int height = 0;                       ///< rows
     std::ptrdiff_t stride = 0;  ///< bytes from row to row, at least 4 * width; 0 for packed rows
 };
 
@@ -225,137 +230,167 @@ enum Kind {
     kText = 12
 };
 
-}  // namespace look_internal
+/// An effect of any kind; which of the fields count depends on it.
+struct EffectData {
+    explicit EffectData(Kind ofKind, Color ofColor = {}) : kind(ofKind), color(ofColor) {}
 
-/// One effect of any kind: what a Look keeps of those below, which alone can be made. The kind decides
-/// which of the fields count.
-struct Effect {
-    look_internal::Kind mKind;
-    Color mColor;
-    float mOpacity = 1;
-    float mAngle = 0;
-    float mDistance = 0;
-    float mSize = 0;
-    float mScale = 1;
-    Position mPosition = Position::outside;
-    std::vector<Stop> mStops;
-    std::shared_ptr<const look_internal::Tile> mTile;
-
-  protected:
-    explicit Effect(look_internal::Kind kind, Color color = {}, float size = 0)
-        : mKind(kind), mColor(color), mSize(size) {}
+    Kind kind;
+    Color color;
+    float opacity = 1;
+    float angle = 0;
+    float distance = 0;
+    float size = 0;
+    float scale = 1;
+    Position position = Position::outside;
+    std::vector<Stop> stops;
+    std::shared_ptr<const Tile> tile;
 };
 
-namespace look_internal {
+}  // namespace look_internal
 
-/// What all effects are. The calls of an effect return a changed copy.
+/// One effect of any kind: one of those below. Their calls return a changed copy.
+class Effect {
+  protected:
+    friend class Look;
+
+    using Data = look_internal::EffectData;                 ///< what it holds
+    explicit Effect(Data data) : mData(std::move(data)) {}  ///< made by its kind alone
+
+    Data mData;  ///< the numbers as they were told
+};
+
+/// What all effects are.
 template <class Self>
-struct EffectOf : Effect {
-    using Effect::Effect;
-
+class EffectOf : public Effect {
+  public:
     /// 0 to 1, at the start 1; multiplied with that of each stop.
-    [[nodiscard]] Self opacity(float value) const { return changed(&Effect::mOpacity, value); }
+    [[nodiscard]] Self opacity(float value) const { return changed(&Data::opacity, value); }
 
   protected:
+    using Effect::Effect;
+
+    /// A copy in which one field is another.
     template <class Value>
-    Self changed(Value Effect::*field, Value value) const {
+    Self changed(Value Data::*field, Value value) const {
         Self copy = static_cast<const Self&>(*this);
-        copy.*field = std::move(value);
+        copy.mData.*field = std::move(value);
         return copy;
     }
 };
 
 /// What both shadows are.
-template <class Self, Kind kind>
-struct ShadowOf : EffectOf<Self> {
-    explicit ShadowOf(Color color) : EffectOf<Self>(kind, color, 4) {
-        Effect::mAngle = 135;
-        Effect::mDistance = 4;
+template <class Self, look_internal::Kind kind>
+class ShadowOf : public EffectOf<Self> {
+  public:
+    /// Angle 135, distance 4, size 4, opacity 1.
+    explicit ShadowOf(Color color) : EffectOf<Self>(look_internal::EffectData(kind, color)) {
+        this->mData.angle = 135;
+        this->mData.distance = 4;
+        this->mData.size = 4;
     }
 
-    /// Where the light comes from, in degrees: 0 the right, 90 above; at the start 135.
-    [[nodiscard]] Self angle(float degrees) const { return this->changed(&Effect::mAngle, degrees); }
-    /// How far it is moved, away from the light: 0 to 100 pixels, at the start 4.
-    [[nodiscard]] Self distance(float pixels) const { return this->changed(&Effect::mDistance, pixels); }
-    /// Radius of the blur: 0 to 100 pixels, at the start 4.
-    [[nodiscard]] Self size(float pixels) const { return this->changed(&Effect::mSize, pixels); }
+    /// Where the light comes from, in degrees: 0 the right, 90 above.
+    [[nodiscard]] Self angle(float degrees) const {
+        return this->changed(&look_internal::EffectData::angle, degrees);
+    }
+    /// How far it is moved, away from the light: 0 to 100 pixels.
+    [[nodiscard]] Self distance(float pixels) const {
+        return this->changed(&look_internal::EffectData::distance, pixels);
+    }
+    /// Radius of the blur: 0 to 100 pixels.
+    [[nodiscard]] Self size(float pixels) const {
+        return this->changed(&look_internal::EffectData::size, pixels);
+    }
 };
 
 /// What both glows are.
-template <class Self, Kind kind>
-struct GlowOf : EffectOf<Self> {
-    GlowOf(float size, Color color) : EffectOf<Self>(kind, color, size) {}
+template <class Self, look_internal::Kind kind>
+class GlowOf : public EffectOf<Self> {
+  public:
+    /// 0 to 100 pixels wide, in one colour.
+    GlowOf(float size, Color color) : EffectOf<Self>(look_internal::EffectData(kind, color)) {
+        this->mData.size = size;
+    }
 
     /// The colours from the edge of the glyphs onwards instead of the one colour; 256 at most.
-    [[nodiscard]] Self stops(std::vector<Stop> stops) const {
-        return this->changed(&Effect::mStops, std::move(stops));
+    [[nodiscard]] Self stops(std::vector<Stop> list) const {
+        return this->changed(&look_internal::EffectData::stops, std::move(list));
     }
 };
 
 /// What both gradients are.
-template <class Self, Kind kind>
-struct GradientOf : EffectOf<Self> {
-    explicit GradientOf(std::vector<Stop> stops) : EffectOf<Self>(kind) {
-        Effect::mStops = std::move(stops);
+template <class Self, look_internal::Kind kind>
+class GradientOf : public EffectOf<Self> {
+  public:
+    /// 1 to 256 stops; none paint nothing.
+    explicit GradientOf(std::vector<Stop> stops) : EffectOf<Self>(look_internal::EffectData(kind)) {
+        this->mData.stops = std::move(stops);
     }
 
     /// The length of the ramp, 0.1 to 2, at the start 1; less paints nothing. In lengths of the box, of
     /// a radial one in half widths.
-    [[nodiscard]] Self scale(float lengths) const { return this->changed(&Effect::mScale, lengths); }
+    [[nodiscard]] Self scale(float lengths) const {
+        return this->changed(&look_internal::EffectData::scale, lengths);
+    }
 };
 
-}  // namespace look_internal
-
 /// A shadow behind the glyphs.
-struct OuterShadow : look_internal::ShadowOf<OuterShadow, look_internal::kOuterShadow> {
+class OuterShadow : public ShadowOf<OuterShadow, look_internal::kOuterShadow> {
     using ShadowOf::ShadowOf;
 };
 
 /// A shadow that falls into the glyphs.
-struct InnerShadow : look_internal::ShadowOf<InnerShadow, look_internal::kInnerShadow> {
+class InnerShadow : public ShadowOf<InnerShadow, look_internal::kInnerShadow> {
     using ShadowOf::ShadowOf;
 };
 
-/// A halo of 0 to 100 pixels around the glyphs.
-struct OuterGlow : look_internal::GlowOf<OuterGlow, look_internal::kOuterGlow> {
+/// A halo around the glyphs.
+class OuterGlow : public GlowOf<OuterGlow, look_internal::kOuterGlow> {
     using GlowOf::GlowOf;
 };
 
-/// A glow of 0 to 100 pixels from the edges of the glyphs inwards.
-struct InnerGlow : look_internal::GlowOf<InnerGlow, look_internal::kInnerGlow> {
+/// A glow from the edges of the glyphs inwards.
+class InnerGlow : public GlowOf<InnerGlow, look_internal::kInnerGlow> {
     using GlowOf::GlowOf;
 };
 
-/// A ramp across the box of the glyphs, of 1 to 256 stops; none paint nothing.
-struct LinearGradient : look_internal::GradientOf<LinearGradient, look_internal::kLinearGradient> {
+/// A ramp across the box of the glyphs.
+class LinearGradient : public GradientOf<LinearGradient, look_internal::kLinearGradient> {
+  public:
     using GradientOf::GradientOf;
 
     /// In degrees: 0, as at the start, runs to the right, 90 upwards.
-    [[nodiscard]] LinearGradient angle(float degrees) const { return changed(&Effect::mAngle, degrees); }
+    [[nodiscard]] LinearGradient angle(float degrees) const { return changed(&Data::angle, degrees); }
 };
 
-/// A ramp from the centre of the box of the glyphs, of 1 to 256 stops; none paint nothing.
-struct RadialGradient : look_internal::GradientOf<RadialGradient, look_internal::kRadialGradient> {
+/// A ramp from the centre of the box of the glyphs.
+class RadialGradient : public GradientOf<RadialGradient, look_internal::kRadialGradient> {
     using GradientOf::GradientOf;
 };
 
-/// An outline of 0 to 100 pixels, outside unless told otherwise.
-struct Stroke : look_internal::EffectOf<Stroke> {
-    Stroke(float size, Color color) : EffectOf(look_internal::kStroke, color, size) {}
+/// An outline.
+class Stroke : public EffectOf<Stroke> {
+  public:
+    /// 0 to 100 pixels wide, outside.
+    Stroke(float size, Color color) : EffectOf(Data(look_internal::kStroke, color)) {
+        mData.size = size;
+    }
 
-    [[nodiscard]] Stroke position(Position where) const { return changed(&Effect::mPosition, where); }
+    /// Where it lies.
+    [[nodiscard]] Stroke position(Position where) const { return changed(&Data::position, where); }
 };
 
-/// A picture tiled over the glyphs from the top left corner of their box. The pixels are copied; of a
-/// view that cannot be read there are none, and nothing is painted.
-struct Pattern : look_internal::EffectOf<Pattern> {
-    explicit Pattern(const PixelView& pixels) : EffectOf(look_internal::kPattern) {
-        mTile = look_internal::tileOf(pixels);
+/// A picture tiled over the glyphs from the top left corner of their box.
+class Pattern : public EffectOf<Pattern> {
+  public:
+    /// Copies the pixels. Of a view that cannot be read there are none, and nothing is painted.
+    explicit Pattern(const PixelView& pixels) : EffectOf(Data(look_internal::kPattern)) {
+        mData.tile = look_internal::tileOf(pixels);
     }
 
     /// Pixels of the picture painted on for one of the pattern: 0.1 to 10, at the start 1; less paints
     /// nothing.
-    [[nodiscard]] Pattern scale(float value) const { return changed(&Effect::mScale, value); }
+    [[nodiscard]] Pattern scale(float value) const { return changed(&Data::scale, value); }
 };
 
 /// What text looks like: a fill and effects. At the start the fill is black and there are no effects.
@@ -373,6 +408,7 @@ class Look {
         mIsFilled = true;
         return *this;
     }
+    /// The same for one that is being made.
     Look fill(Color color, float opacity = 1) && { return std::move(fill(color, opacity)); }
 
     /// Leaves out the fill. What lies beneath the text is cut out of the glyphs; what lies inside them
@@ -381,6 +417,7 @@ class Look {
         mIsFilled = false;
         return *this;
     }
+    /// The same for one that is being made.
     Look noFill() && { return std::move(noFill()); }
 
     /// The opacity of the text, 0 to 1, which the fill's is multiplied with. Below 1 what lies beneath
@@ -390,20 +427,23 @@ class Look {
         mTextOpacity = look_internal::unit(opacity);
         return *this;
     }
+    /// The same for one that is being made.
     Look textOpacity(float opacity) && { return std::move(textOpacity(opacity)); }
 
     /// Adds an effect. One of its kind that is there already is replaced, at its place in the order.
-    Look& add(Effect effect) & {
-        const auto same = std::find_if(mEffects.begin(), mEffects.end(),
-                                       [&](const Effect& other) { return other.mKind == effect.mKind; });
+    Look& add(const Effect& effect) & {
+        const auto same = std::find_if(mEffects.begin(), mEffects.end(), [&](const Data& other) {
+            return other.kind == effect.mData.kind;
+        });
         if (same == mEffects.end()) {
-            mEffects.push_back(std::move(effect));
+            mEffects.push_back(effect.mData);
         } else {
-            *same = std::move(effect);
+            *same = Data(effect.mData);
         }
         return *this;
     }
-    Look add(Effect effect) && { return std::move(add(std::move(effect))); }
+    /// The same for one that is being made.
+    Look add(const Effect& effect) && { return std::move(add(effect)); }
 
     /// How far the look paints beyond the glyphs; nothing is cut off. At least what the four offsets of
     /// VFEffect tell: an outer glow has its faint end in addition.
@@ -420,10 +460,12 @@ class Look {
 
     /// Looks are equal when their keys are.
     friend bool operator==(const Look& a, const Look& b) { return a.key() == b.key(); }
+    /// Not equal.
     friend bool operator!=(const Look& a, const Look& b) { return !(a == b); }
 
   private:
     friend class Painter;
+    using Data = look_internal::EffectData;
 
     float shownTextOpacity() const { return mIsFilled ? mTextOpacity : 0.0F; }
     /// Makes the add-calls in an empty set.
@@ -433,7 +475,7 @@ class Look {
     float mFillOpacity = 1;
     float mTextOpacity = 1;
     bool mIsFilled = true;
-    std::vector<Effect> mEffects;
+    std::vector<Data> mEffects;
 };
 
 namespace look_internal {
@@ -443,51 +485,51 @@ class AddCalls {
   public:
     explicit AddCalls(VFEffect& set) : mSet(set) {}
 
-    void add(const Effect& effect) const {
+    void add(const EffectData& effect) const {
         const unsigned int id = added(effect);
-        check(id, effect.mKind);
+        check(id, effect.kind);
     }
     void fill(Color color, float opacity) const { check(mSet.addText(color.value, opacity), kText); }
 
   private:
-    unsigned int added(const Effect& e) const {
+    unsigned int added(const EffectData& e) const {
         std::vector<VFGradient> stops = stopsOf(e);
         const auto count = static_cast<int>(stops.size());
-        const unsigned int color = e.mColor.value;
-        switch (e.mKind) {
+        const unsigned int color = e.color.value;
+        switch (e.kind) {
             case kOuterShadow:
-                return mSet.addOuterShadowText(e.mAngle, e.mDistance, e.mSize, color, e.mOpacity);
+                return mSet.addOuterShadowText(e.angle, e.distance, e.size, color, e.opacity);
             case kInnerShadow:
-                return mSet.addInnerShadowText(e.mAngle, e.mDistance, e.mSize, color, e.mOpacity);
+                return mSet.addInnerShadowText(e.angle, e.distance, e.size, color, e.opacity);
             case kOuterGlow:
-                return mSet.addOuterGlowText(e.mSize, color, e.mOpacity, count, stops.data());
+                return mSet.addOuterGlowText(e.size, color, e.opacity, count, stops.data());
             case kInnerGlow:
-                return mSet.addInnerGlowText(e.mSize, color, e.mOpacity, count, stops.data());
+                return mSet.addInnerGlowText(e.size, color, e.opacity, count, stops.data());
             case kLinearGradient:
-                return mSet.addLinearGradientText(e.mAngle, e.mScale, e.mOpacity, count, stops.data());
+                return mSet.addLinearGradientText(e.angle, e.scale, e.opacity, count, stops.data());
             case kRadialGradient:
-                return mSet.addRadialGradientText(e.mScale, e.mOpacity, count, stops.data());
+                return mSet.addRadialGradientText(e.scale, e.opacity, count, stops.data());
             case kStroke:
-                return mSet.addStrokeText(e.mSize, color, e.mOpacity, 0, static_cast<int>(e.mPosition));
+                return mSet.addStrokeText(e.size, color, e.opacity, 0, static_cast<int>(e.position));
             case kPattern:
                 return addPattern(e);
             default:
                 return kNoCore;
         }
     }
-    unsigned int addPattern(const Effect& e) const {
-        const Tile& tile = *e.mTile;
+    unsigned int addPattern(const EffectData& e) const {
+        const Tile& tile = *e.tile;
         // The bitmap copies the bytes without changing them, but takes a pointer to mutable ones.
         VFBitmap bitmap(static_cast<unsigned int>(tile.width), static_cast<unsigned int>(tile.height),
                         const_cast<unsigned char*>(tile.argb.data()), 4);
         if (bitmap.mData == nullptr && !tile.argb.empty()) throwBadAlloc();
-        return mSet.addPatternText(&bitmap, e.mScale, e.mOpacity);
+        return mSet.addPatternText(&bitmap, e.scale, e.opacity);
     }
-    static std::vector<VFGradient> stopsOf(const Effect& effect) {
+    static std::vector<VFGradient> stopsOf(const EffectData& effect) {
         constexpr std::size_t kMostStops = 256;
         std::vector<VFGradient> stops;
-        stops.reserve(std::min(effect.mStops.size(), kMostStops));
-        for (const Stop& stop : effect.mStops) {
+        stops.reserve(std::min(effect.stops.size(), kMostStops));
+        for (const Stop& stop : effect.stops) {
             if (stops.size() == kMostStops) break;
             stops.push_back({stop.color.value, stop.opacity, stop.place});
         }
@@ -506,8 +548,8 @@ class KeyWriter {
   public:
     KeyWriter(std::string& key, VFEffect& set) : mKey(key), mSet(set) {}
 
-    void add(const Effect& effect) {
-        switch (effect.mKind) {
+    void add(const EffectData& effect) {
+        switch (effect.kind) {
             case kOuterGlow:
                 writeStops(recordOf<VFOuterGlowProperty>(kOuterGlow));
                 break;
@@ -521,7 +563,7 @@ class KeyWriter {
                 writeGradient(recordOf<VFRadialGradientProperty>(kRadialGradient));
                 break;
             case kPattern:
-                writePattern(recordOf<VFPatternProperty>(kPattern), *effect.mTile);
+                writePattern(recordOf<VFPatternProperty>(kPattern), *effect.tile);
                 break;
             default:
                 break;
@@ -698,6 +740,16 @@ inline bool isUsable(const PictureView& view) {
     return view.width == 0 || view.height == 0 || areRows(view.data, view.width, 4, view.stride);
 }
 
+/// One look: its set, planned by the first run and not changed after that, and its layer.
+struct Stage {
+    VFEffect set;
+    Margins margins;
+    VFBitmap layer;
+    std::size_t capacity = 0;  ///< bytes that the layer has room for
+    WideBox box;               ///< of the layer, from the origin of the text
+    bool isPainted = false;
+};
+
 /// Pixels from malloc.
 using Pixels = std::unique_ptr<unsigned char, void (*)(void*)>;
 
@@ -707,7 +759,9 @@ using Pixels = std::unique_ptr<unsigned char, void (*)(void*)>;
 class Picture {
   public:
     Picture() = default;  ///< empty
+    /// Takes the pixels; the other one is empty then.
     Picture(Picture&& other) noexcept { swap(other); }
+    /// Copies the pixels.
     Picture(const Picture& other) : mWidth(other.mWidth), mHeight(other.mHeight) {
         mLeft = other.mLeft;
         mTop = other.mTop;
@@ -716,23 +770,24 @@ class Picture {
         if (mPixels == nullptr) look_internal::throwBadAlloc();
         std::memcpy(mPixels.get(), other.data(), bytes());
     }
+    /// As they are made.
     Picture& operator=(Picture other) noexcept {
         swap(other);
         return *this;
     }
     ~Picture() = default;
 
-    int width() const { return mWidth; }
-    int height() const { return mHeight; }
-    int stride() const { return 4 * mWidth; }  ///< bytes from row to row
-    bool isEmpty() const { return mPixels == nullptr; }
+    int width() const { return mWidth; }                 ///< pixels of a row
+    int height() const { return mHeight; }               ///< rows
+    int stride() const { return 4 * mWidth; }            ///< bytes from row to row
+    bool isEmpty() const { return mPixels == nullptr; }  ///< without pixels
 
     int left() const { return mLeft; }  ///< of the left column, from the origin of the text
     int top() const { return mTop; }    ///< of the top row, from the origin of the text
 
     const unsigned char* data() const { return mPixels.get(); }  ///< null when it is empty
-    unsigned char* data() { return mPixels.get(); }
-    PictureView view() { return {data(), mWidth, mHeight}; }  ///< to paint on
+    unsigned char* data() { return mPixels.get(); }              ///< the same, to change them
+    PictureView view() { return {data(), mWidth, mHeight}; }     ///< to paint on
 
     /// Lays it over the view, clipped, so that the origin of the text stands at (x, y): each channel
     /// becomes over + under * (255 - alpha) / 255, rounded to nearest, at most 255. Returns the box that
@@ -781,8 +836,10 @@ class Picture {
 /// Gradients, patterns and what lies inside follow the box around all glyphs of a call.
 class Painter {
   public:
+    /// Of one look.
     explicit Painter(const Look& look) { addStage(look); }
-    explicit Painter(const std::vector<Look>& looks) {  ///< the last lies on top
+    /// Of a stack of looks, the last on top; of none it paints nothing.
+    explicit Painter(const std::vector<Look>& looks) {
         for (const Look& look : looks)
             addStage(look);
     }
@@ -807,17 +864,8 @@ class Painter {
     Failure failure() const { return mFailure; }
 
   private:
+    using Stage = look_internal::Stage;
     using WideBox = look_internal::WideBox;
-
-    /// One look: its set, planned by the first run and not changed after that, and its layer.
-    struct Stage {
-        VFEffect set;
-        Margins margins;
-        VFBitmap layer;
-        std::size_t capacity = 0;  ///< bytes that the layer has room for
-        WideBox box;               ///< of the layer, from the origin of the text
-        bool isPainted = false;
-    };
 
     void addStage(const Look& look);
     std::nullopt_t fail(Failure why) {
@@ -864,7 +912,7 @@ inline std::optional<Picture> paint(const std::vector<Look>& looks, Glyphs glyph
 inline void Look::describe(VFEffect& set) const {
     const look_internal::AddCalls calls(set);
     set.setTextOpacity(shownTextOpacity());
-    for (const Effect& effect : mEffects)
+    for (const Data& effect : mEffects)
         calls.add(effect);
     calls.fill(mFill, mFillOpacity * shownTextOpacity());
 }
@@ -882,7 +930,7 @@ inline std::string Look::key() const {
     if (designed == nullptr) look_internal::throwBadAlloc();
     std::string key(designed.get());
     look_internal::KeyWriter writer(key, set);
-    for (const Effect& effect : mEffects)
+    for (const Data& effect : mEffects)
         writer.add(effect);
     if (shownTextOpacity() < 1.0F) writer.cutOut();
     return key;

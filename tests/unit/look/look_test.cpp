@@ -85,8 +85,8 @@ TEST(Look, AtTheStart_IsFilledInBlack) {
 TEST(Look, CallsOfAnEffect_LeaveItAsItWas) {
     const Stroke thin(1, rgb(1));
     const Stroke faint = thin.opacity(0.5F);
-    EXPECT_EQ(thin.mOpacity, 1.0F);
-    EXPECT_EQ(faint.mOpacity, 0.5F);
+    EXPECT_EQ(Look().add(thin), Look().add(Stroke(1, rgb(1))));
+    EXPECT_NE(Look().add(thin), Look().add(faint));
 }
 
 TEST(Look, CopiesAndMoves_AreEqualAndIndependent) {
