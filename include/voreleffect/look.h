@@ -161,9 +161,36 @@ constexpr int kLargestGlyph = 65535;
 #endif
 }
 
-/// 0 to 1; what is no number is 0.
+inline std::uint32_t bitsOf(float value) {
+    std::uint32_t bits = 0;
+    static_assert(sizeof bits == sizeof value);
+    std::memcpy(&bits, &value, sizeof bits);
+    return bits;
+}
+
+/// 0 to 1; what is no number is 0, and so is what a caller's state may flush to 0. Asked of the bits,
+/// which raise no exception of floating-point arithmetic.
 inline float unit(float value) {
-    return value > 0.0F ? std::min(value, 1.0F) : 0.0F;
+    constexpr std::uint32_t kSmallest = 0x00800000U;
+    constexpr std::uint32_t kOne = 0x3F800000U;
+    constexpr std::uint32_t kInfinity = 0x7F800000U;
+    const std::uint32_t bits = bitsOf(value);
+    if (bits < kSmallest || bits > kInfinity) return 0.0F;
+    return bits < kOne ? value : 1.0F;
+}
+
+/// The product of two such numbers, rounded to nearest whatever the caller's rounding mode: it is exact
+/// in a double, the lowest 29 bits of which are more than a float has.
+inline float product(float a, float b) {
+    constexpr std::uint64_t kTooMany = 0x1FFFFFFFU;
+    double exact = static_cast<double>(a) * static_cast<double>(b);
+    std::uint64_t bits = 0;
+    static_assert(sizeof bits == sizeof exact);
+    std::memcpy(&bits, &exact, sizeof bits);
+    bits += (kTooMany >> 1) + (bits >> 29 & 1U);
+    bits &= ~kTooMany;
+    std::memcpy(&exact, &bits, sizeof exact);
+    return exact < 0x1p-126 ? 0.0F : static_cast<float>(exact);
 }
 
 /// Whether rows of `width` pixels can be read or written: `stride` is in bytes.
@@ -608,13 +635,6 @@ class KeyWriter {
         for (int shift = 0; shift < bits; shift += 7)
             mKey += static_cast<char>(0x80U | (value >> shift & 0x7FU));
     }
-    static std::uint32_t bitsOf(float value) {
-        std::uint32_t bits = 0;
-        static_assert(sizeof bits == sizeof value);
-        std::memcpy(&bits, &value, sizeof bits);
-        return bits;
-    }
-
     std::string& mKey;
     VFEffect& mSet;
     int mPlace = 0;
@@ -914,7 +934,7 @@ inline void Look::describe(VFEffect& set) const {
     set.setTextOpacity(shownTextOpacity());
     for (const Data& effect : mEffects)
         calls.add(effect);
-    calls.fill(mFill, mFillOpacity * shownTextOpacity());
+    calls.fill(mFill, look_internal::product(mFillOpacity, shownTextOpacity()));
 }
 
 inline Margins Look::margins() const {

@@ -9,6 +9,7 @@
 #include <vector>
 
 #include "tests/support/compare.h"
+#include "tests/support/float_states.h"
 #include "tests/support/thinned.h"
 #include "tests/unit/look/looks_by_hand.h"
 
@@ -282,6 +283,42 @@ TEST(LookPictures, OpacityOfTheText_MayBeToldBeforeOrAfterTheFill) {
         paint(look, squareText().glyphs(), page.view());
         EXPECT_TRUE(samePage(expected, page));
     }
+}
+
+/// 0.4 times 0.75 lies on the edge between two alphas: rounded up it is 77, rounded down 76.
+TEST(LookPictures, InEveryFloatState_AreTheSameAndSoAreTheKeys) {
+    Look look = everything();
+    look.fill(rgb(0x80FF40), 0.4F).textOpacity(0.75F);
+    const Text text = squareText(12, 12);
+    Page expected(40, 40);
+    paint(look, text.glyphs(), expected.view());
+    const std::string key = look.key();
+    for (const FloatState& state : floatStates()) {
+        Page page(40, 40);
+        std::string again;
+        {
+            const InFloatState callers(state);
+            Look told = everything();
+            told.fill(rgb(0x80FF40), 0.4F).textOpacity(0.75F);
+            paint(told, text.glyphs(), page.view());
+            again = told.key();
+        }
+        EXPECT_TRUE(samePage(expected, page)) << state.name;
+        EXPECT_EQ(key, again) << state.name;
+    }
+}
+
+/// As that of the style files is, which is a product of two floats.
+TEST(LookPictures, OpacityOfFillAndText_IsTheirProduct) {
+    Random random(51);
+    for (int i = 0; i < thinned(20'000); ++i) {
+        const float a = random.real(0, 1);
+        const float b = random.chance(20) ? 1.0F : random.real(0, 1);
+        ASSERT_EQ(look_internal::product(a, b), a * b) << a << " " << b;
+    }
+    EXPECT_EQ(look_internal::product(0.75F, 0.4F), 0.75F * 0.4F);
+    EXPECT_EQ(look_internal::product(0, 0), 0.0F);
+    EXPECT_EQ(look_internal::product(1, 1), 1.0F);
 }
 
 // --- Margins ----------------------------------------------------------------------------------------
