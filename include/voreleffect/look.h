@@ -179,18 +179,23 @@ inline float unit(float value) {
     return bits < kOne ? value : 1.0F;
 }
 
-/// The product of two such numbers, rounded to nearest whatever the caller's rounding mode: it is exact
-/// in a double, the lowest 29 bits of which are more than a float has.
+/// The product of two such numbers, rounded to nearest, ties to even: by their bits, as the caller's
+/// rounding mode and traps must not matter.
 inline float product(float a, float b) {
-    constexpr std::uint64_t kTooMany = 0x1FFFFFFFU;
-    double exact = static_cast<double>(a) * static_cast<double>(b);
-    std::uint64_t bits = 0;
-    static_assert(sizeof bits == sizeof exact);
-    std::memcpy(&bits, &exact, sizeof bits);
-    bits += (kTooMany >> 1) + (bits >> 29 & 1U);
-    bits &= ~kTooMany;
-    std::memcpy(&exact, &bits, sizeof exact);
-    return exact < 0x1p-126 ? 0.0F : static_cast<float>(exact);
+    if (bitsOf(a) == 0 || bitsOf(b) == 0) return 0.0F;
+    const auto mantissa = [](float x) { return std::uint64_t{(bitsOf(x) & 0x007FFFFFU) | 0x00800000U}; };
+    const std::uint64_t whole = mantissa(a) * mantissa(b);  // 2^46 to 2^48
+    const unsigned int cut = whole >> 47 == 0 ? 23 : 24;
+    const std::uint64_t half = std::uint64_t{1} << (cut - 1);
+    const std::uint64_t kept = (whole + half - 1 + (whole >> cut & 1U)) >> cut;
+    const int exponent = static_cast<int>((bitsOf(a) >> 23) + (bitsOf(b) >> 23) + cut) - 127 - 23;
+    if (exponent < 1) return 0.0F;
+    // The leading bit of what is kept is not stored; a carry beyond it belongs to the exponent.
+    const auto bits =
+        static_cast<std::uint32_t>((static_cast<std::uint64_t>(exponent - 1) << 23) + kept);
+    float rounded = 0;
+    std::memcpy(&rounded, &bits, sizeof rounded);
+    return rounded;
 }
 
 /// Whether rows of `width` pixels can be read or written: `stride` is in bytes.

@@ -317,6 +317,9 @@ TEST(LookPictures, OpacityOfFillAndText_IsTheirProduct) {
         ASSERT_EQ(look_internal::product(a, b), a * b) << a << " " << b;
     }
     EXPECT_EQ(look_internal::product(0.75F, 0.4F), 0.75F * 0.4F);
+    EXPECT_EQ(look_internal::product(1e-20F, 1e-10F), 1e-20F * 1e-10F);
+    EXPECT_EQ(look_internal::product(1e-30F, 1e-30F), 0.0F);
+    EXPECT_EQ(look_internal::product(0, 0.5F), 0.0F);
     EXPECT_EQ(look_internal::product(0, 0), 0.0F);
     EXPECT_EQ(look_internal::product(1, 1), 1.0F);
 }
