@@ -355,8 +355,9 @@ template <class Self, look_internal::Kind kind>
 class GradientOf : public EffectOf<Self> {
   public:
     /// 1 to 256 stops; none paint nothing.
-    explicit GradientOf(std::vector<Stop> stops) : EffectOf<Self>(look_internal::EffectData(kind)) {
-        this->mData.stops = std::move(stops);
+    explicit GradientOf(const std::vector<Stop>& stops)
+        : EffectOf<Self>(look_internal::EffectData(kind)) {
+        this->mData.stops = stops;
     }
 
     /// The length of the ramp, 0.1 to 2, at the start 1; less paints nothing. In lengths of the box, of
@@ -640,6 +641,7 @@ class KeyWriter {
         for (int shift = 0; shift < bits; shift += 7)
             mKey += static_cast<char>(0x80U | (value >> shift & 0x7FU));
     }
+
     std::string& mKey;
     VFEffect& mSet;
     int mPlace = 0;
@@ -856,7 +858,7 @@ class Picture {
 };
 
 /// Paints in a look, or in a stack of looks, again and again: every time the same picture for the same
-/// glyphs. It keeps its layers, the largest of so far, for the next time.
+/// glyphs. It keeps its layers for the next time, as large as the largest so far.
 ///
 /// Gradients, patterns and what lies inside follow the box around all glyphs of a call.
 class Painter {

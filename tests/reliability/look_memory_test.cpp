@@ -167,7 +167,14 @@ TEST_F(LookMemory, RefusedWhileDescribing_Throws) {
     EXPECT_THROW(Picture copy(*picture), std::bad_alloc);
 }
 
-/// A mask of two requests, and what the effects ask for while they paint.
+TEST_F(LookMemory, OfAPainterThatIsMade_IsAskedForWithoutThrowing) {
+    Painter painter({everything(), plainStack()[0]});
+    Bytes painted = page();
+    const RefusedObjects no;
+    EXPECT_TRUE(painter.paint(mLetter.glyph(), view(painted)));
+    EXPECT_TRUE(painter.paint(mLetter.glyph()));
+}
+
 TEST_F(LookMemory, OfALaterRun_IsThatOfTheClasses) {
     Painter painter(Look().add(OuterShadow(rgb(0))).add(Stroke(4, rgb(0xFFFFFF))));
     Bytes painted = page();

@@ -637,6 +637,28 @@ TEST(Runs, DestinationOfAnotherSizeInLayeredMode_TakesWhatLiesInsideTheGlyphsAlo
     }
 }
 
+TEST(Runs, DestinationOfAnotherFormat_StaysAsItIs) {
+    for (const unsigned bytesPerPixel : {1U, 2U, 3U}) {
+        for (const float textOpacity : {1.0F, 0.5F}) {
+            VFEffect set;
+            set.addOuterShadowText(135, 6, 8, 0xFF0000, 1);
+            set.addInnerShadowText(135, 3, 2, 0x0000FF, 1);
+            set.setTextOpacity(textOpacity);
+            set.addText(0x808080, textOpacity);
+            VFBitmap picture(30, 30, bytesPerPixel);
+            fillBytes(picture, 77);
+            const std::vector<uint8_t> before = bytesOf(picture);
+            SolidGlyph glyph(10, 10);
+            set.initEffect(30, 30);
+            set.setDstBitmap(&picture);
+            set.renderEffectLayer(10, 10, &glyph.glyph);
+            set.doEffectPostProcessing();
+            set.compositeLayers(&picture);
+            EXPECT_EQ(bytesOf(picture), before) << bytesPerPixel << " " << textOpacity;
+        }
+    }
+}
+
 TEST(Runs, CallsOutOfOrder_PaintNothing) {
     SolidGlyph glyph(3, 3);
     VFBitmap picture(9, 9, 4);

@@ -123,7 +123,7 @@ void expectSamePictures(const std::vector<const TwoLooks*>& stack, const Text& t
 }
 
 TEST(LookPictures, RandomLooksOnRandomPages_AreThoseOfTheClasses) {
-    for (int seed = 0; seed < thinned(1500); ++seed) {
+    for (int seed = 0; seed < thinned(4000); ++seed) {
         SCOPED_TRACE("seed " + std::to_string(seed));
         Random random(static_cast<uint64_t>(seed));
         const TwoLooks look = randomLook(random);
@@ -136,7 +136,7 @@ TEST(LookPictures, RandomLooksOnRandomPages_AreThoseOfTheClasses) {
 }
 
 TEST(LookPictures, RandomStacks_AreThoseOfTheClassesLaidOneOverTheOther) {
-    for (int seed = 0; seed < thinned(500); ++seed) {
+    for (int seed = 0; seed < thinned(1000); ++seed) {
         SCOPED_TRACE("seed " + std::to_string(seed));
         Random random(static_cast<uint64_t>(seed) + 100'000);
         const TwoLooks a = randomLook(random);
