@@ -46,8 +46,8 @@ namespace VFontEffect {
 class VF_API VFEffect {
   public:
     VFEffect();  ///< without effects, at text opacity 1
-    /// The same; the argument is not looked at. Beware: `VFEffect b(&a)` is an empty set, `VFEffect
-    /// b(a)` a copy of a.
+    /// The same; the argument is not looked at. Beware: `VFEffect b(&a)` is an empty set; a copy of a is
+    /// `VFEffect b(a)`.
     explicit VFEffect(void* ignored);
 
     /// Copies the look (each effect with its id and a deep copy of its record, the text opacity and
