@@ -33,6 +33,7 @@ Cases allCases() {
     addBlendCases(cases);
     addFillCases(cases);
     addLookCases(cases);
+    addFaceCases(cases);
     addPeerCases(cases);
     return cases;
 }

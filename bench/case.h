@@ -63,6 +63,7 @@ void addGlowCases(Cases& cases);
 void addBlendCases(Cases& cases);
 void addFillCases(Cases& cases);
 void addLookCases(Cases& cases);
+void addFaceCases(Cases& cases);
 void addPeerCases(Cases& cases);  ///< none in a build without peers
 
 /// All of them.

@@ -44,4 +44,8 @@ def goals():
             ("B", "TITLE160", 160, 400), ("C", "LINE48", 120, 250), ("C", "TITLE160", 400, 800),
             ("A", "GLYPH48", 8, 15)):
         listed += each("us", [f"look/{look}/{line}"], best, narrow)
+    # The modern face against the classes, glyph by glyph.
+    for onto in ("picture", "page"):
+        listed += each("overRow", [f"look/glyphs/{onto}/painter"], 1.1, 1.1,
+                       other=f"look/glyphs/{onto}/classes")
     return listed

@@ -27,7 +27,16 @@ namespace VFontEffect {
 ///     delete[] key;
 ///
 /// The picture then holds premultiplied R, G, B, A bytes. It must be 32 bits per pixel and of the
-/// size given to initEffect.
+/// size given to initEffect. With another number of bytes per pixel nothing is painted. With another
+/// size what fits is painted; in layered mode (see initEffect) only of what lies inside the glyphs.
+///
+/// The effects lie in three groups, from the top: those inside the glyphs (inner shadow, inner glow,
+/// gradients, pattern, inside stroke), the text fill, those beneath the text (outer shadow, outer glow,
+/// outside stroke). Within a group the one that was added last lies on top, in a set that was not
+/// planned before: see initEffect. A centred stroke, in both groups, lies over what was added before it.
+///
+/// The calls of a run come in this order. A destination that is set before initEffect is forgotten by
+/// it, a glyph laid before it lost; after compositeLayers nothing is painted until the next initEffect.
 ///
 /// One set is used by one thread at a time; separate sets may run on separate threads.
 ///
@@ -36,8 +45,10 @@ namespace VFontEffect {
 /// 13 none. Bevel, emboss and 9 have no core.
 class VF_API VFEffect {
   public:
-    VFEffect();                        ///< without effects, at text opacity 1
-    explicit VFEffect(void* ignored);  ///< the same; the argument is not looked at
+    VFEffect();  ///< without effects, at text opacity 1
+    /// The same; the argument is not looked at. Beware: `VFEffect b(&a)` is an empty set; a copy of a is
+    /// `VFEffect b(a)`.
+    explicit VFEffect(void* ignored);
 
     /// Copies the look (each effect with its id and a deep copy of its record, the text opacity and
     /// colour, the id counter), not the bitmaps of a run.
@@ -47,9 +58,10 @@ class VF_API VFEffect {
 
     /// @name Add-calls: one per effect kind
     /// Each puts its effect into the set, or updates the one of its kind that is there, and returns
-    /// the effect's id, or 0xFFFFFFFF when there is no core of that kind. No argument is refused:
-    /// numbers are clamped to the ranges named here, a NaN to the lower end. Angles are cut to whole
-    /// degrees and brought into 0..359, sizes and distances to whole pixels. The alpha byte of a
+    /// the effect's id, or 0xFFFFFFFF when there is no core of that kind or no memory for one. An update
+    /// that memory runs out for returns the id as well, and the effect stays as it was. No argument is
+    /// refused: numbers are clamped to the ranges named here, a NaN to the lower end. Angles are cut to
+    /// whole degrees and brought into 0..359, sizes and distances to whole pixels. The alpha byte of a
     /// colour is ignored; `opacity`, 0..1, takes its place. Arrays and bitmaps are copied.
     /// @{
 
@@ -112,9 +124,9 @@ class VF_API VFEffect {
     /// @{
 
     /// Gives `property` (copied; null leaves the core without a new record) to the core of that
-    /// type, made with this id if there is none; a negative id asks for the next of the counter.
-    /// Returns the id of the core that holds it, or -1 when there is no core of that type or memory ran
-    /// out.
+    /// type, made with this id if there is none; a negative id asks for the next of the counter. The
+    /// record must be of the class that belongs to the type: nothing checks it. Returns the id of the
+    /// core that holds it, or -1 when there is no core of that type or memory ran out.
     int addEffect(int id, int type, VFProperty* property);
     int addEffect(int type, VFProperty* property);  ///< addEffect(-1, type, property)
 
@@ -172,7 +184,8 @@ class VF_API VFEffect {
     VFRect* getTextRect();
 
     /// Merges the coverage of `glyph` into the mask with its top left corner at (x, y), clipped, and
-    /// grows the text box. Overlapping glyphs keep the larger coverage.
+    /// grows the text box. Overlapping glyphs keep the larger coverage. A glyph whose buffer is null, or
+    /// that has no width or height, leaves the mask and grows the box all the same.
     void renderEffectLayer(int x, int y, VFGlyph* glyph);
 
     /// Every effect paints once from the mask into the destination (or the outer layer).

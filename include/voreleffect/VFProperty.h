@@ -137,7 +137,7 @@ class VF_API VFRadialGradientProperty : public VFProperty {
     VFGradient* mGradient;  ///< not owned; may be null
 };
 
-/// Parameters of a bevel. No core paints it: VFEffect::addBevelText always returns -1.
+/// Parameters of a bevel. No core paints it: VFEffect::addBevelText always returns 0xFFFFFFFF.
 class VF_API VFBevelProperty : public VFProperty {
   public:
     /// mColor is 0; depth is clamped to 0..10 and soften to 0..16; the angle is cut to whole degrees
@@ -162,7 +162,7 @@ class VF_API VFBevelProperty : public VFProperty {
     float mShadowOpacity;          ///< 0 to 1
 };
 
-/// Parameters of an emboss. No core paints it: VFEffect::addEmbossText always returns -1.
+/// Parameters of an emboss. No core paints it: VFEffect::addEmbossText always returns 0xFFFFFFFF.
 class VF_API VFEmbossProperty : public VFProperty {
   public:
     /// Clamps and reduces as the bevel record does.

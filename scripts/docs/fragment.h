@@ -1,7 +1,10 @@
 #pragma once
 
+#include <voreleffect/look.h>
 #include <voreleffect/voreleffect.h>
 
+#include <cstdio>
+#include <optional>
 #include <string>
 #include <thread>
 #include <vector>

@@ -14,6 +14,7 @@
 #include <vector>
 
 #include "allocation_watch.h"
+#include "refuse_each.h"
 #include "tests/support/compare.h"
 #include "tests/support/core_compare.h"
 #include "tests/support/fake_core.h"
@@ -32,12 +33,6 @@ using namespace VFontEffect;
 
 using Bytes = std::vector<uint8_t>;
 using Types = std::set<int>;
-
-constexpr Refusal kRefusals[] = {Refusal::kOnce, Refusal::kFromThenOn};
-
-const char* nameOf(Refusal refusal) {
-    return refusal == Refusal::kOnce ? "refused once" : "refused from then on";
-}
 
 std::array<VFGradient, 3> gStops = {
     {{0xFFFF0000, 1.0F, 0.0F}, {0xC000FF00, 1.0F, 0.5F}, {0xFF0000FF, 1.0F, 1.0F}}};
@@ -68,28 +63,6 @@ class MemoryTest : public ::testing::Test {
         EXPECT_THROW(throw std::bad_alloc(), std::bad_alloc);
     }
 };
-
-/// Calls `attempt(n)` with the n-th request refused, n from 1 until one attempt needs no refused
-/// request, for both kinds of refusal. `attempt` returns whether its request was refused. Returns the
-/// number of requests of an undisturbed attempt, and prints it.
-template <class Attempt>
-long refuseEach(const std::string& what, Attempt attempt) {
-    long requests = 0;
-    for (const Refusal refusal : kRefusals) {
-        requests = 0;
-        for (long n = 1;; ++n) {
-            SCOPED_TRACE(what + ", request " + std::to_string(n) + " " + nameOf(refusal));
-            const long before = liveBlocks();
-            const bool refused = attempt(n, refusal);
-            EXPECT_EQ(before, liveBlocks()) << "blocks leak";
-            if (::testing::Test::HasFailure() || !refused) break;
-            requests = n;
-        }
-    }
-    std::printf("[ refusals ] %-36s %3ld requests, each refused alone and with all later ones\n",
-                what.c_str(), requests);
-    return requests;
-}
 
 // --- The cores by themselves ------------------------------------------------------------------------
 
@@ -696,6 +669,27 @@ TEST_F(SetMemory, RefusedWhileAdding_PaintsWithoutTheEffectUntilItIsAddedAgain) 
             });
         // The core and its record at least.
         EXPECT_GE(requests, 2);
+    }
+}
+
+TEST_F(SetMemory, RefusedWhileUpdating_KeepsTheOldEffectAndReturnsItsId) {
+    const auto update = [](VFEffect& set, int type) {
+        return type == kPattern ? set.addPatternText(&tile(), 3, 1) : addEffect(set, type, 2);
+    };
+    for (const int type : kEveryType) {
+        refuseEach(std::string("updating the ") + nameOf(type), [&](long n, Refusal refusal) {
+            VFEffect set;
+            const unsigned id = addEffect(set, type);
+            VFProperty* const old = set.getEffect(type)->getProperty();
+            bool refused = false;
+            {
+                const RefusedMemory no(n, refusal);
+                EXPECT_EQ(update(set, type), id);
+                refused = RefusedMemory::refused();
+            }
+            EXPECT_TRUE(!refused || set.getEffect(type)->getProperty() == old);
+            return refused;
+        });
     }
 }
 

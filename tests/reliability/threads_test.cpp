@@ -7,12 +7,14 @@
 #include <cstring>
 #include <functional>
 #include <iterator>
+#include <string>
 #include <thread>
 #include <vector>
 
 #include "build_kind.h"
 #include "random_caller.h"
 #include "tests/support/mask_gallery.h"
+#include "voreleffect/look.h"
 #include "voreleffect/voreleffect.h"
 #include "whole_looks.h"
 
@@ -174,6 +176,32 @@ TEST(Threads, KernelsOnSeparateDestinations_ShareTheirSources) {
         for (const std::vector<uint8_t>& picture : ofThread)
             EXPECT_EQ(alone, picture);
     }
+}
+
+TEST(Threads, OneLookAndOnePicture_AreReadByAllOfThem) {
+    using namespace VFontEffect;
+    const std::vector<unsigned char> tile(4 * 4 * 4, 120);
+    const Look look = Look().add(Pattern({tile.data(), 4, 4})).add(OuterGlow(4, rgb(0xFFAA00)));
+    const unsigned char covered[] = {255, 255, 255, 255};
+    const Glyph glyph = {9, 9, covered, 2, 2};
+    const auto picture = paint(look, glyph);
+    const std::string key = look.key();
+    std::vector<unsigned char> expected(4 * 20 * 20);
+    paint(look, glyph, {expected.data(), 20, 20});
+    std::atomic<int> differences{0};
+    onAllThreads([&](size_t) {
+        for (int i = repetitions(200); i > 0; --i) {
+            std::vector<unsigned char> painted(expected.size());
+            std::vector<unsigned char> laid(expected.size());
+            const Look copy = look;
+            Painter(copy).paint(glyph, {painted.data(), 20, 20});
+            picture->layOver({laid.data(), 20, 20}, 0, 0);
+            const Picture own = *picture;
+            if (painted != expected || laid != expected || look.key() != key || own.isEmpty())
+                ++differences;
+        }
+    });
+    EXPECT_EQ(differences, 0);
 }
 
 }  // namespace

@@ -177,6 +177,35 @@ TEST(MapKey, DifferentNumbers_GiveDifferentKeys) {
     EXPECT_NE(keyOf(size), keyOf(style));
 }
 
+/// An add-call puts the opacities into the colours, which are in the key.
+TEST(MapKey, OpacitiesOfAddCalls_AreInIt) {
+    const auto keyOfRamp = [](float opacity, float ofStop) {
+        VFEffect set;
+        VFGradient stops[] = {{0xFF0000, ofStop, 0}, {0x0000FF, 1, 1}};
+        set.addLinearGradientText(0, 1, opacity, 2, stops);
+        return keyOf(set);
+    };
+    EXPECT_NE(keyOfRamp(1, 1), keyOfRamp(0.5F, 1));
+    EXPECT_NE(keyOfRamp(1, 1), keyOfRamp(1, 0.5F));
+}
+
+/// Twice cut to hundredths: once by the add-call, once on the way into the key.
+TEST(MapKey, TwoPlacesOfStops_AreToldAHundredthLess) {
+    const auto keyOfStop = [](float place) {
+        VFEffect set;
+        VFGradient stop = {0xFF0000, 1, place};
+        set.addLinearGradientText(0, 1, 1, 1, &stop);
+        return keyOf(set);
+    };
+    for (int hundredth = 1; hundredth <= 100; ++hundredth) {
+        // In the middle, where the first cut is of no doubt.
+        const float place = (static_cast<float>(hundredth) + 0.5F) / 100;
+        const bool isTheSame = hundredth == 53 || hundredth == 59;
+        EXPECT_EQ(keyOfStop(place) == keyOfStop(place - 0.01F), isTheSame && hundredth < 100)
+            << hundredth;
+    }
+}
+
 TEST(MapKey, CoresWithoutRecords_LeaveNoTrace) {
     VFEffect set;
     for (const int type : kCoreTypes)

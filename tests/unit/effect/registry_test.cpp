@@ -59,6 +59,14 @@ TEST(EffectSet, ConstructorArgument_IsIgnored) {
     EXPECT_EQ(anything, 5);
 }
 
+TEST(EffectSet, MadeFromAPointerToASet_IsNoCopy) {
+    VFEffect set;
+    set.addText(0xFF, 1);
+    VFEffect other(&set);
+    EXPECT_FALSE(other.hasEffects());
+    EXPECT_TRUE(VFEffect(set).hasEffects());
+}
+
 TEST(Registry, CreateEffect_MakesTheCoreOfItsTypeOutsideTheList) {
     VFEffect set;
     for (const int type : kCoreTypes) {

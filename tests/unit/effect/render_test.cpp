@@ -4,6 +4,8 @@
 #include <algorithm>
 #include <array>
 #include <climits>
+#include <cstring>
+#include <vector>
 
 #include "tests/support/compare.h"
 #include "tests/support/engine.h"
@@ -578,6 +580,113 @@ TEST(Runs, FollowEachOtherOnOneSet) {
         EXPECT_TRUE(sameBytes(pixel, run.picture.mData + (size * size - 1) * 4, 1, 1, 4));
         EXPECT_EQ(sidesOf(*set.getTextRect()), (Sides{0, 0, size, size}));
     }
+}
+
+/// A run on layers of 80 x 80 pixels, painted into a destination of a side of its own. Effects of both
+/// sides of the edge.
+VFBitmap paintedOnLayersOf80(unsigned side, float textOpacity) {
+    VFEffect set;
+    set.addOuterShadowText(135, 6, 8, 0xFF0000, 1);
+    set.addStrokeText(4, 0x00FF00, 1, 0, 1);
+    set.addInnerShadowText(135, 3, 2, 0x0000FF, 1);
+    set.setTextOpacity(textOpacity);
+    set.addText(0x808080, textOpacity);
+    VFBitmap picture(side, side, 4);
+    SolidGlyph glyph(40, 40);
+    set.initEffect(80, 80);
+    set.setDstBitmap(&picture);
+    set.renderEffectLayer(20, 20, &glyph.glyph);
+    set.doEffectPostProcessing();
+    set.compositeLayers(&picture);
+    return picture;
+}
+
+const uint8_t* pixelOf(const VFBitmap& picture, unsigned x, unsigned y) {
+    return picture.mData + (size_t{y} * picture.mWidth + x) * 4;
+}
+
+TEST(Runs, DestinationOfAnotherSize_TakesWhatFits) {
+    const VFBitmap whole = paintedOnLayersOf80(80, 1);
+    const VFBitmap small = paintedOnLayersOf80(60, 1);
+    const VFBitmap large = paintedOnLayersOf80(100, 1);
+    for (unsigned y = 0; y < 100; ++y) {
+        for (unsigned x = 0; x < 100; ++x) {
+            const bool inLayers = x < 80 && y < 80;
+            const uint8_t none[4] = {};
+            const uint8_t* const wanted = inLayers ? pixelOf(whole, x, y) : none;
+            ASSERT_EQ(0, std::memcmp(wanted, pixelOf(large, x, y), 4)) << x << ", " << y;
+            if (x >= 60 || y >= 60) continue;
+            ASSERT_EQ(0, std::memcmp(wanted, pixelOf(small, x, y), 4)) << x << ", " << y;
+        }
+    }
+}
+
+/// Nothing outside the glyph, whose box is 20 to 60 on either axis.
+TEST(Runs, DestinationOfAnotherSizeInLayeredMode_TakesWhatLiesInsideTheGlyphsAlone) {
+    const VFBitmap whole = paintedOnLayersOf80(80, 0.5F);
+    for (const unsigned side : {60U, 100U}) {
+        const VFBitmap other = paintedOnLayersOf80(side, 0.5F);
+        for (unsigned y = 0; y < side; ++y) {
+            for (unsigned x = 0; x < side; ++x) {
+                const bool inside = x >= 20 && x < 60 && y >= 20 && y < 60;
+                const uint8_t none[4] = {};
+                const uint8_t* const wanted = inside ? pixelOf(whole, x, y) : none;
+                ASSERT_EQ(0, std::memcmp(wanted, pixelOf(other, x, y), 4)) << x << ", " << y;
+            }
+        }
+    }
+}
+
+TEST(Runs, DestinationOfAnotherFormat_StaysAsItIs) {
+    for (const unsigned bytesPerPixel : {1U, 2U, 3U}) {
+        for (const float textOpacity : {1.0F, 0.5F}) {
+            VFEffect set;
+            set.addOuterShadowText(135, 6, 8, 0xFF0000, 1);
+            set.addInnerShadowText(135, 3, 2, 0x0000FF, 1);
+            set.setTextOpacity(textOpacity);
+            set.addText(0x808080, textOpacity);
+            VFBitmap picture(30, 30, bytesPerPixel);
+            fillBytes(picture, 77);
+            const std::vector<uint8_t> before = bytesOf(picture);
+            SolidGlyph glyph(10, 10);
+            set.initEffect(30, 30);
+            set.setDstBitmap(&picture);
+            set.renderEffectLayer(10, 10, &glyph.glyph);
+            set.doEffectPostProcessing();
+            set.compositeLayers(&picture);
+            EXPECT_EQ(bytesOf(picture), before) << bytesPerPixel << " " << textOpacity;
+        }
+    }
+}
+
+TEST(Runs, CallsOutOfOrder_PaintNothing) {
+    SolidGlyph glyph(3, 3);
+    VFBitmap picture(9, 9, 4);
+    const std::vector<uint8_t> clear = bytesOf(picture);
+    VFEffect set;
+    set.addStrokeText(1, 0xFFFFFF, 1, 0, 1);
+    set.addText(0xFF, 1);
+
+    set.setDstBitmap(&picture);  // initEffect forgets it
+    set.initEffect(9, 9);
+    set.renderEffectLayer(3, 3, &glyph.glyph);
+    set.doEffectPostProcessing();
+    set.compositeLayers(&picture);
+    EXPECT_EQ(bytesOf(picture), clear);
+
+    set.renderEffectLayer(3, 3, &glyph.glyph);  // no mask to draw into yet
+    set.initEffect(9, 9);
+    set.setDstBitmap(&picture);
+    set.doEffectPostProcessing();
+    set.compositeLayers(&picture);
+    EXPECT_EQ(bytesOf(picture), clear);
+
+    set.initEffect(9, 9);
+    set.setDstBitmap(&picture);
+    set.renderEffectLayer(3, 3, &glyph.glyph);
+    set.compositeLayers(&picture);  // ends the run
+    set.doEffectPostProcessing();
+    EXPECT_EQ(bytesOf(picture), clear);
 }
 
 TEST(Runs, DestinationSmallerOrLargerThanTheLayers_Survives) {
