@@ -418,7 +418,7 @@ TEST_F(Series, ClosedOutput_FailsTheReportsAndPaintsThePictures) {
 TEST_F(Series, LittleRoomForThreads_GivesTheSame) {
     if (!MemoryMeter::works()) GTEST_SKIP() << "a sanitizer maps more";
     for (const char* count : {"1", "2", "7", "64"}) {
-        for (const size_t mib : {96, 192, 300}) {
+        for (const size_t mib : {size_t{96}, size_t{192}, size_t{300}}) {
             Surroundings limited;
             limited.addressSpace = mib << 20;
             const Outcome outcome =
