@@ -58,6 +58,21 @@ TEST_P(CrewOf, TasksThatNobodyTakes_HinderNoEnd) {
     EXPECT_LE(begun, 2 * GetParam());
 }
 
+TEST_P(CrewOf, WaitForAll_EndsWhenEveryTaskIsDone) {
+    Crew crew(GetParam());
+    std::atomic<int> given{0};
+    std::atomic<int> done{0};
+    for (; !crew.isFull(); ++given) {
+        crew.give([&](Workbench& /*bench*/) {
+            std::this_thread::sleep_for(std::chrono::milliseconds(2));
+            ++done;
+        });
+    }
+    crew.waitForAll();
+    EXPECT_EQ(done, given);
+    EXPECT_FALSE(crew.isEmpty());
+}
+
 TEST_P(CrewOf, Signals_AreHeldInEveryOtherThread) {
     Crew crew(GetParam());
     bool isHeld = false;

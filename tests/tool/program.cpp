@@ -102,6 +102,11 @@ void enter(const Surroundings& surroundings) {
         const rlimit limit{surroundings.largestFile, surroundings.largestFile};
         if (::setrlimit(RLIMIT_FSIZE, &limit) != 0) ::_exit(127);
     }
+    if (surroundings.addressSpace != 0) {
+        const rlimit limit{surroundings.addressSpace, surroundings.addressSpace};
+        if (::setrlimit(RLIMIT_AS, &limit) != 0) ::_exit(127);
+    }
+    if (surroundings.missingStream >= 0) ::close(surroundings.missingStream);
     if (surroundings.closedOutput) {
         std::array<int, 2> ends{};
         if (::pipe(ends.data()) != 0 || ::dup2(ends[1], STDOUT_FILENO) < 0) ::_exit(127);

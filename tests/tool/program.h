@@ -47,6 +47,8 @@ struct Surroundings {
     size_t largestFile =
         0;  ///< bytes, beyond which SIGXFSZ ends what does not ignore it; 0 for no limit
     bool closedOutput = false;  ///< standard output is a pipe that nobody reads
+    size_t addressSpace = 0;    ///< bytes that it may have mapped; 0 for no limit
+    int missingStream = -1;     ///< a standard stream that is not open; -1 for none
 };
 
 /// The same, waited for like runVorelpaint, in other surroundings and without input.

@@ -609,6 +609,16 @@ TEST_F(RefusedFilms, Outputs_ThatAreNoFilms) {
 }
 
 /// At the end of a file, too, which ffmpeg by itself takes lightly.
+/// Before anything is read or made: a film may take hours.
+TEST_F(RefusedFilms, Outputs_ThatAreFolders) {
+    for (const char* name : {"a.mov", "a.rgba"}) {
+        const std::string folder = mDir.file(name);
+        std::filesystem::create_directory(folder);
+        EXPECT_EQ(faultOf({"--subtitles", "no.srt", "-o", folder}),
+                  "cannot write '" + folder + "': Is a directory");
+    }
+}
+
 TEST_F(RefusedFilms, Outputs_WithoutRoom) {
     for (const char* name : {"a.mov", "a.mkv", "a.webm", "a.mp4", "a.rgba"}) {
         const Words films = inFrames({"--background", "#204060", "--fade-in", "500", "-o"});

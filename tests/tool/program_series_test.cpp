@@ -1,6 +1,7 @@
 #include <gtest/gtest.h>
 #include <sys/stat.h>
 #include <sys/wait.h>
+#include <unistd.h>
 
 #include <algorithm>
 #include <chrono>
@@ -31,7 +32,7 @@ using vorel_test::TempDir;
 using Words = std::vector<std::string>;
 using Files = std::map<std::string, std::string>;
 
-/// Waits for what another process does, for at most a minute.
+/// Waits for what another process does, for at most half a minute.
 template <typename Condition>
 bool becomesTrue(Condition condition) {
     const auto end = std::chrono::steady_clock::now() + std::chrono::seconds(30);
@@ -411,6 +412,48 @@ TEST_F(Series, ClosedOutput_FailsTheReportsAndPaintsThePictures) {
         EXPECT_EQ(outcome.exitCode, 2);
         EXPECT_NE(outcome.err.find("3 of 3 jobs failed"), std::string::npos) << outcome.err;
         EXPECT_EQ(takePainted().size(), 3U);
+    }
+}
+
+TEST_F(Series, LittleRoomForThreads_GivesTheSame) {
+    if (!MemoryMeter::works()) GTEST_SKIP() << "a sanitizer maps more";
+    for (const char* count : {"1", "2", "7", "64"}) {
+        for (const size_t mib : {size_t{96}, size_t{192}, size_t{300}}) {
+            Surroundings limited;
+            limited.addressSpace = mib << 20;
+            const Outcome outcome =
+                runVorelpaintIn(limited, {"--size", "20", "--batch", batch(jobs(12)), "--jobs", count});
+            EXPECT_EQ(outcome.exitCode, 0) << count << " threads, " << mib << " MiB";
+            EXPECT_EQ(outcome.err, "");
+            EXPECT_EQ(takePainted().size(), 12U);
+        }
+    }
+}
+
+TEST_F(Series, PicturesThatOneAloneHasMemoryFor_ArePaintedOneByOne) {
+    if (!MemoryMeter::works()) GTEST_SKIP() << "a sanitizer maps more";
+    std::string lines;
+    for (int i = 0; i < 3; ++i)
+        lines += job(std::to_string(i) + ".png",
+                     R"("text": "Ag", "preset": "gold", "width": 5700, "height": 5700)");
+    Surroundings limited;
+    limited.addressSpace = size_t{600} << 20;
+    for (const char* count : {"1", "2"}) {
+        const Outcome outcome = runVorelpaintIn(
+            limited, {"--size", "120", "--png", "fast", "--batch", batch(lines), "--jobs", count});
+        EXPECT_EQ(outcome.exitCode, 0);
+        EXPECT_EQ(outcome.err, "");
+        EXPECT_EQ(takePainted().size(), 3U);
+    }
+}
+
+TEST_F(Series, MissingInput_IsNoFileThatIsOpenedLater) {
+    Surroundings surroundings;
+    surroundings.missingStream = STDIN_FILENO;
+    for (const char* count : {"1", "2"}) {
+        const Outcome outcome = runVorelpaintIn(surroundings, {"--batch", "-", "--jobs", count});
+        EXPECT_EQ(outcome.exitCode, 2);
+        EXPECT_EQ(outcome.err, "vorelpaint: cannot read standard input: Bad file descriptor\n");
     }
 }
 

@@ -138,9 +138,16 @@ class BatchRun {
         PaintedPicture picture;
         std::optional<std::string> fault;
 
+        /// Throws std::bad_alloc; any other failure is its fault.
         void paint(Workbench& bench) {
             if (!isToDo) return;
-            fault = faultOf([&] { picture = painted(options, Composition(options, bench)); });
+            try {
+                picture = painted(options, Composition(options, bench));
+            } catch (const std::bad_alloc&) {
+                throw;
+            } catch (const std::exception& error) {
+                fault = error.what();
+            }
         }
     };
 
@@ -192,10 +199,23 @@ class BatchRun {
             handOverFirst();
     }
 
-    void handOverFirst() {
-        mCrew.take();
-        const std::unique_ptr<Job> job = std::move(mJobs.front());
+    /// The first job, when it is painted. What has no memory beside others may have enough alone.
+    std::unique_ptr<Job> takeFirst() {
+        mCrew.wait();
+        std::unique_ptr<Job> job = std::move(mJobs.front());
         mJobs.pop_front();
+        try {
+            mCrew.take();
+        } catch (const std::bad_alloc&) {
+            mCrew.waitForAll();
+            Workbench bench;
+            job->fault = faultOf([&] { job->paint(bench); });
+        }
+        return job;
+    }
+
+    void handOverFirst() {
+        const std::unique_ptr<Job> job = takeFirst();
         const auto sayHere = [&](const std::string& what) { sayOfLine(job->line, what); };
         if (!job->fault && job->isToDo) {
             job->fault = faultOf([&] {

@@ -1,5 +1,6 @@
 #include "console.h"
 
+#include <fcntl.h>
 #include <sys/ioctl.h>
 #include <unistd.h>
 
@@ -33,6 +34,15 @@ void drawStatus() {
 }
 
 }  // namespace
+
+/// The lowest free number is always the one that is given.
+void reserveStandardStreams() {
+    for (const int stream : {STDIN_FILENO, STDOUT_FILENO, STDERR_FILENO}) {
+        if (::fcntl(stream, F_GETFD) >= 0) continue;
+        const int direction = stream == STDIN_FILENO ? O_WRONLY : O_RDONLY;
+        [[maybe_unused]] const int placeholder = ::open("/dev/null", direction);
+    }
+}
 
 void print(const std::string& text) {
     const size_t written = std::fwrite(text.data(), 1, text.size(), stdout);

@@ -5,6 +5,10 @@
 /// What the program prints on standard output, and what it says beside that: lines on standard error.
 namespace vorelpaint {
 
+/// Takes the numbers of standard streams that are not open, so that no file has them that is opened
+/// later; reading and writing fails as before.
+void reserveStandardStreams();
+
 /// Text on standard output. Throws ToolError when it does not get there.
 void print(const std::string& text);
 

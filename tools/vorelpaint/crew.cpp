@@ -4,6 +4,7 @@
 #include <poll.h>
 #include <sched.h>
 #include <sys/eventfd.h>
+#include <sys/resource.h>
 #include <unistd.h>
 
 #include <algorithm>
@@ -36,14 +37,24 @@ int coresOfThisProcess() {
     return static_cast<int>(std::thread::hardware_concurrency());
 }
 
+/// As many of the threads as there is room for where a process may map so much and no more: each has a
+/// stack, a heap and pictures of its own, and libraries that are refused memory may crash.
+int threadsWithRoom(int threads) {
+    constexpr rlim_t kRoomOfOne = rlim_t{256} << 20;
+    rlimit space{};
+    if (::getrlimit(RLIMIT_AS, &space) != 0 || space.rlim_cur == RLIM_INFINITY) return threads;
+    return static_cast<int>(std::min(static_cast<rlim_t>(threads), space.rlim_cur / kRoomOfOne));
+}
+
 }  // namespace
 
 int threadsFor(const Options& options) {
     return options.jobs.value_or(std::clamp(coresOfThisProcess(), kJobs.low, kJobs.high));
 }
 
-Crew::Crew(int threads) {
+Crew::Crew(int asked) {
     keepMemory();
+    const int threads = asked < 2 ? asked : threadsWithRoom(asked);
     if (threads < 2) return;
     loadInstalledFonts();
     mDone = ::eventfd(0, EFD_CLOEXEC | EFD_NONBLOCK);
@@ -118,13 +129,26 @@ void Crew::give(Task task) {
     mChange.notify_one();
 }
 
-bool Crew::isFirstDone() const {
+bool Crew::isDone(const Given& given) const {
     const std::lock_guard<std::mutex> alone(mMutex);
-    return mTasks.front()->isDone;
+    return given.isDone;
+}
+
+bool Crew::isFirstDone() const {
+    return isDone(*mTasks.front());
 }
 
 void Crew::wait(int input) const {
-    while (!isFirstDone()) {
+    waitFor(*mTasks.front(), input);
+}
+
+void Crew::waitForAll() const {
+    for (const std::shared_ptr<Given>& given : mTasks)
+        waitFor(*given);
+}
+
+void Crew::waitFor(const Given& given, int input) const {
+    while (!isDone(given)) {
         // poll() passes over descriptors below 0.
         std::array<pollfd, 2> events{{{mDone, POLLIN, 0}, {input, POLLIN, 0}}};
         if (::poll(events.data(), events.size(), -1) < 0 && errno != EINTR) failWithErrno("cannot wait");

@@ -26,8 +26,8 @@ class Crew {
     using Task = std::function<void(Workbench&)>;
 
     /// Of one thread there is none: tasks are done where they are given. Where the system gives fewer
-    /// threads than are asked for, those do all.
-    explicit Crew(int threads);
+    /// threads than are asked for, or has no room for them, those do all.
+    explicit Crew(int asked);
 
     /// Ends when the tasks have that were begun; the others are dropped.
     ~Crew();
@@ -42,6 +42,8 @@ class Crew {
 
     /// Whether the first task is done; there is one.
     bool isFirstDone() const;
+
+    void waitForAll() const;  ///< until every task is done
 
     /// Waits until the first task is done; there is one. With a file descriptor `input` also until
     /// something can be read there.
@@ -58,6 +60,8 @@ class Crew {
     };
 
     static void perform(Given& given, Workbench& bench);
+    bool isDone(const Given& given) const;
+    void waitFor(const Given& given, int input = -1) const;
     void work();
     void startThread();
 

@@ -1,5 +1,8 @@
 #include "film_request.h"
 
+#include <cerrno>
+#include <filesystem>
+
 #include "error.h"
 #include "file_io.h"
 #include "film_form.h"
@@ -24,6 +27,11 @@ void checkFilmOutput(const Options& options) {
     if (kind != FilmKind::file && (film.over || film.codec)) {
         throw ToolError(std::string(film.over ? "--over" : "--codec") +
                         " needs a film: end the output's name with .mp4, .mov, .mkv or .webm");
+    }
+    std::error_code ignored;
+    if (std::filesystem::is_directory(*options.output, ignored)) {
+        errno = EISDIR;
+        failWithErrno("cannot write " + inQuotes(*options.output));
     }
     if (kind == FilmKind::file) filmCodec(*options.output, film.codec, isTransparentFilm(options));
 }

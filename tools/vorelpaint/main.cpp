@@ -108,6 +108,7 @@ void run(const Options& options) {
 }
 
 int runProgram(int argc, const char* const* argv) {
+    reserveStandardStreams();
     cleanUpOnSignals();
     try {
         const std::optional<Options> options = parseOptions(argc, argv);
