@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cstdlib>
 #include <random>
 #include <vector>
@@ -48,9 +49,11 @@ Bytes unfilteredLiterally(const Bytes& stream, size_t rowBytes, size_t bytesPerP
 
 TEST(PngRows, Unfiltered_HasA0BeforeEachRow) {
     const Bytes pixels{1, 2, 3, 4, 5, 6, 7, 8};
-    EXPECT_EQ(unfiltered({pixels.data(), 2, 1, 4}), (Bytes{0, 1, 2, 3, 4, 5, 6, 7, 8}));
-    EXPECT_EQ(unfiltered({pixels.data(), 1, 2, 4}), (Bytes{0, 1, 2, 3, 4, 0, 5, 6, 7, 8}));
-    EXPECT_EQ(unfiltered({pixels.data(), 1, 2, 3}), (Bytes{0, 1, 2, 3, 0, 5, 6, 7}));
+    EXPECT_EQ(unfiltered({pixels.data(), 2, 1, kRgba}), (Bytes{0, 1, 2, 3, 4, 5, 6, 7, 8}));
+    EXPECT_EQ(unfiltered({pixels.data(), 1, 2, kRgba}), (Bytes{0, 1, 2, 3, 4, 0, 5, 6, 7, 8}));
+    EXPECT_EQ(unfiltered({pixels.data(), 1, 2, kRgb}), (Bytes{0, 1, 2, 3, 0, 5, 6, 7}));
+    EXPECT_EQ(unfiltered({pixels.data(), 1, 2, kGreyAlpha}), (Bytes{0, 1, 4, 0, 5, 8}));
+    EXPECT_EQ(unfiltered({pixels.data(), 2, 1, kGrey}), (Bytes{0, 1, 5}));
 }
 
 TEST(PngRows, Filters_AreUndoneByTheirLiteralForm) {
@@ -59,13 +62,14 @@ TEST(PngRows, Filters_AreUndoneByTheirLiteralForm) {
         const size_t width = 1 + random() % 20;
         const size_t height = 1 + random() % 8;
         const Bytes pixels = randomPixels(random, width * height, round % 2 == 0 ? 255 : 3);
-        for (const size_t bytesPerPixel : {size_t{3}, size_t{4}}) {
-            const PngRows rows{pixels.data(), width, height, bytesPerPixel};
+        for (const PngChannels& channels : {kGrey, kGreyAlpha, kRgb, kRgba}) {
+            const PngRows rows{pixels.data(), width, height, channels};
             Bytes packed;
             for (size_t i = 0; i < pixels.size(); ++i) {
-                if (i % 4 < bytesPerPixel) packed.push_back(pixels[i]);
+                const size_t* end = &channels.places[0] + channels.count;
+                if (std::find(&channels.places[0], end, i % 4) != end) packed.push_back(pixels[i]);
             }
-            ASSERT_EQ(unfilteredLiterally(filtered(rows), rows.rowBytes(), bytesPerPixel), packed);
+            ASSERT_EQ(unfilteredLiterally(filtered(rows), rows.rowBytes(), channels.count), packed);
         }
     }
 }
@@ -77,7 +81,7 @@ TEST(PngRows, EachRow_HasTheFilterThatLeavesLeast) {
         for (int x = 0; x < 32; ++x)
             pixels.insert(pixels.end(), 4, static_cast<uint8_t>(7 * x));
     }
-    const PngRows rows{pixels.data(), 32, 2, 4};
+    const PngRows rows{pixels.data(), 32, 2, kRgba};
     const Bytes stream = filtered(rows);
     EXPECT_EQ(stream[0], 1);
     EXPECT_EQ(stream[rows.rowBytes()], 2);
@@ -87,7 +91,7 @@ bool isOfNew(const Bytes& numbers, size_t width) {
     Bytes pixels;
     for (const uint8_t number : numbers)
         pixels.insert(pixels.end(), {1, 2, number, 4});
-    return isOfNewPixels({pixels.data(), width, numbers.size() / width, 4});
+    return isOfNewPixels({pixels.data(), width, numbers.size() / width, kRgba});
 }
 
 /// The first row and column are only looked at.

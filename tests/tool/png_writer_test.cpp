@@ -108,6 +108,27 @@ TEST_F(PngWriter, Palette_HasRoomFor256Colours) {
     EXPECT_EQ(encodedPng(image, PngEffort::normal)[kKind], 3);
 }
 
+TEST_F(PngWriter, GreyPicture_HasOneChannelOfColour) {
+    Image image{512, 1, {}};
+    for (int i = 0; i < 512; ++i) {
+        const auto grey = static_cast<uint8_t>(i);
+        image.pixels.insert(image.pixels.end(), {grey, grey, grey, static_cast<uint8_t>(255 - i / 2)});
+    }
+    expectReadBack(image);
+    EXPECT_EQ(encodedPng(image, PngEffort::normal)[kKind], 4);
+    Image opaque = image;
+    for (size_t at = 3; at < opaque.pixels.size(); at += 4)
+        opaque.pixels[at] = 255;
+    expectReadBack(opaque);
+    EXPECT_EQ(encodedPng(opaque, PngEffort::normal)[kKind], 0);
+    for (size_t i = 0; i < 3; ++i) {
+        Image coloured = image;
+        coloured.pixels[4 * 300 + i] ^= 1;
+        expectReadBack(coloured);
+        EXPECT_EQ(encodedPng(coloured, PngEffort::normal)[kKind], 6) << i;
+    }
+}
+
 TEST_F(PngWriter, OpaquePictureOfManyColours_HasNoAlpha) {
     EXPECT_EQ(encodedPng(photograph(100, 100), PngEffort::normal)[kKind], 2);
 }

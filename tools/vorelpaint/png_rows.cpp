@@ -53,16 +53,33 @@ uint32_t filterRow(int filter, const RowPair& pair, size_t count, uint8_t* remai
     }
 }
 
+/// The bytes of pixels that are in the file.
+template <size_t count>
+void append(std::vector<uint8_t>& stream, const PngChannels& channels, const uint8_t* pixels,
+            const uint8_t* end) {
+    const size_t begin = stream.size();
+    stream.resize(begin + static_cast<size_t>(end - pixels) / kChannels * count);
+    for (uint8_t* to = &stream[begin]; pixels != end; pixels += kChannels, to += count) {
+        for (size_t i = 0; i < count; ++i)
+            to[i] = pixels[channels.places[i]];
+    }
+}
+
 }  // namespace
 
 void appendRow(std::vector<uint8_t>& stream, const PngRows& rows, int filter, const uint8_t* pixels) {
     stream.push_back(static_cast<uint8_t>(filter));
-    if (rows.bytesPerPixel == kChannels) {
-        stream.insert(stream.end(), pixels, pixels + rows.width * kChannels);
-        return;
+    const uint8_t* end = pixels + rows.width * kChannels;
+    switch (rows.channels.count) {
+        case 1:
+            return append<1>(stream, rows.channels, pixels, end);
+        case 2:
+            return append<2>(stream, rows.channels, pixels, end);
+        case 3:
+            return append<3>(stream, rows.channels, pixels, end);
+        default:
+            stream.insert(stream.end(), pixels, end);
     }
-    for (size_t x = 0; x < rows.width; ++x, pixels += kChannels)
-        stream.insert(stream.end(), pixels, pixels + rows.bytesPerPixel);
 }
 
 std::vector<uint8_t> unfiltered(const PngRows& rows) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <array>
 #include <cstddef>
 #include <cstdint>
 #include <cstring>
@@ -7,16 +8,26 @@
 
 namespace vorelpaint {
 
-/// The rows of a picture as a PNG has them: of each pixel's four bytes the first ones are in the file.
-/// The bytes are the owner's.
+/// Which of a pixel's four bytes are in the file: of grey ones the first stands for the first three, and
+/// opaque ones need no fourth.
+struct PngChannels {
+    size_t count;
+    std::array<size_t, 4> places;
+};
+constexpr PngChannels kGrey{1, {0}};
+constexpr PngChannels kGreyAlpha{2, {0, 3}};
+constexpr PngChannels kRgb{3, {0, 1, 2}};
+constexpr PngChannels kRgba{4, {0, 1, 2, 3}};
+
+/// The rows of a picture as a PNG has them. The bytes are the owner's.
 struct PngRows {
     const uint8_t* pixels;  ///< packed rows of four bytes a pixel
     size_t width;           ///< of both sides at least 1
     size_t height;
-    size_t bytesPerPixel;  ///< in the file: 4, or 3 where the fourth one says nothing
+    PngChannels channels;
 
     const uint8_t* row(size_t y) const { return pixels + y * width * 4; }
-    size_t rowBytes() const { return 1 + width * bytesPerPixel; }  ///< with the number of its filter
+    size_t rowBytes() const { return 1 + width * channels.count; }  ///< with the number of its filter
 };
 
 /// Adds a row as it is in the file to `stream`: the number of a filter, then of each of these pixels the

@@ -19,15 +19,28 @@ using Bytes = std::vector<uint8_t>;
 using voreltext::Image;
 
 /// Numbers that the format gives to what a sample is.
-constexpr uint8_t kRgb = 2;
 constexpr uint8_t kIndexed = 3;
-constexpr uint8_t kRgba = 6;
+constexpr std::array<uint8_t, 4> kKinds{0, 4, 2, 6};  ///< of 1 to 4 channels
 
 bool isOpaque(const Image& image) {
     for (size_t at = 3; at < image.pixels.size(); at += 4) {
         if (image.pixels[at] != 255) return false;
     }
     return true;
+}
+
+bool isGrey(const Image& image) {
+    for (size_t at = 0; at < image.pixels.size(); at += 4) {
+        const uint8_t* pixel = &image.pixels[at];
+        if (pixel[0] != pixel[1] || pixel[0] != pixel[2]) return false;
+    }
+    return true;
+}
+
+const PngChannels& channelsOf(const Image& image) {
+    const bool isWhole = isOpaque(image);
+    if (isGrey(image)) return isWhole ? kGrey : kGreyAlpha;
+    return isWhole ? kRgb : kRgba;
 }
 
 /// The colours of a picture by the order in which they appear, up to 256.
@@ -130,7 +143,7 @@ Bytes compressed(const PngRows& rows, PngEffort effort) {
 
 PngRows rowsOf(const Image& image) {
     return {image.pixels.data(), static_cast<size_t>(image.width), static_cast<size_t>(image.height),
-            isOpaque(image) ? size_t{3} : size_t{4}};
+            channelsOf(image)};
 }
 
 // --- the file -----------------------------------------------------------------------------------------
@@ -178,13 +191,14 @@ void appendPalette(Bytes& file, const std::vector<uint32_t>& palette) {
 
 Bytes encodedPng(const Image& image, PngEffort effort) {
     Bytes file{0x89, 'P', 'N', 'G', '\r', '\n', 0x1A, '\n'};
-    if (const std::optional<IndexedPicture> few = indexed(image)) {
+    const PngRows rows = rowsOf(image);
+    const bool isByteAPixel = rows.channels.count == 1;
+    if (const std::optional<IndexedPicture> few = isByteAPixel ? std::nullopt : indexed(image)) {
         appendHeader(file, image, kIndexed);
         appendPalette(file, few->palette);
         appendChunk(file, "IDAT", compressedIndices(few->indices, image, effort));
     } else {
-        const PngRows rows = rowsOf(image);
-        appendHeader(file, image, rows.bytesPerPixel == 3 ? kRgb : kRgba);
+        appendHeader(file, image, kKinds[rows.channels.count - 1]);
         appendChunk(file, "IDAT", compressed(rows, effort));
     }
     appendChunk(file, "IEND", {});
