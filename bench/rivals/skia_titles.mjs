@@ -73,7 +73,7 @@ function paintShare({ look, titles, folder, share, jobs }) {
 function main() {
     if (argv[2] === "--version") {
         const { version } = require("@napi-rs/canvas/package.json");
-        console.log(`Skia by @napi-rs/canvas ${version}`);
+        console.log(`Skia by napi-rs canvas ${version}`);
         return;
     }
     const [look, file, folder] = argv.slice(2);
