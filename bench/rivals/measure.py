@@ -94,8 +94,8 @@ def paint(program, look, count, jobs, folder):
 def traits(file):
     """What pictures of one kind share: the box of what is seen, and thousandths of the pixels."""
     with Image.open(file) as picture:
-        if picture.size != SIZE or picture.mode != "RGBA":
-            sys.exit(f"{file}: {picture.size} {picture.mode}, not {SIZE} RGBA")
+        if picture.size != SIZE or picture.mode not in ("RGBA", "LA"):
+            sys.exit(f"{file}: {picture.size} {picture.mode}, not {SIZE} with alpha")
         alpha = picture.getchannel("A")
         seen = alpha.point(lambda value: 255 if value >= 128 else 0)
         left, top, right, bottom = seen.getbbox() or (0, 0, 0, 0)
