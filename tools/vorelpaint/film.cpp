@@ -7,6 +7,7 @@
 #include <string>
 #include <vector>
 
+#include "background.h"
 #include "child_program.h"
 #include "console.h"
 #include "crew.h"
@@ -21,7 +22,6 @@
 #include "new_file.h"
 #include "numbered_name.h"
 #include "numbered_pictures.h"
-#include "painting.h"
 #include "png_writer.h"
 #include "progress.h"
 #include "ranges.h"
