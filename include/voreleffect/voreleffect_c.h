@@ -10,6 +10,7 @@
 extern "C" {
 #endif
 
+/// @file
 /// The words of look.h in C99, for C and for all languages that call C: looks, painted with one call.
 ///
 ///     vorel_look* look = NULL;
