@@ -282,6 +282,16 @@ struct EffectData {
 
 /// One effect of any kind: one of those below. Their calls return a changed copy.
 class Effect {
+  public:
+    /// Moves are copies, too: what is moved from stays as it was.
+    Effect(const Effect&) = default;
+    /// A copy; where memory runs out the effect stays as it was.
+    Effect& operator=(const Effect& other) {
+        mData = Data(other.mData);
+        return *this;
+    }
+    ~Effect() = default;
+
   protected:
     friend class Look;
 
@@ -433,6 +443,14 @@ class Pattern : public EffectOf<Pattern> {
 /// them paint several looks, one over the other.
 class Look {
   public:
+    Look() = default;             ///< filled in black
+    Look(const Look&) = default;  ///< an independent copy
+    Look(Look&&) = default;       ///< the other one has no effects then
+    /// A copy; where memory runs out the look stays as it was.
+    Look& operator=(const Look& other) { return *this = Look(other); }
+    Look& operator=(Look&&) = default;  ///< the other one has no effects then
+    ~Look() = default;
+
     /// Fills the glyphs. Through a fill whose own opacity (0 to 1) is below 1 what lies beneath the text
     /// is seen.
     Look& fill(Color color, float opacity = 1) & {
@@ -858,7 +876,8 @@ class Picture {
 };
 
 /// Paints in a look, or in a stack of looks, again and again: every time the same picture for the same
-/// glyphs. It keeps its layers for the next time, as large as the largest so far.
+/// glyphs. It keeps its layers for the next time, as large as the largest so far. One that was moved
+/// from paints nothing.
 ///
 /// Gradients, patterns and what lies inside follow the box around all glyphs of a call.
 class Painter {
