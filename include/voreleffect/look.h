@@ -17,6 +17,7 @@
 #include "VFECore.h"
 #include "VFEffect.h"
 #include "VFProperty.h"
+#include "VFVersion.h"
 
 /// Looks as values, painted with one call.
 ///
@@ -39,6 +40,16 @@
 ///  - One Look, Painter or Picture belongs to one thread at a time, but several may read a Look or a
 ///    Picture; copies are independent.
 namespace VFontEffect {
+
+/// \cond
+// The version stands in all names: two libraries of one process that were compiled with different
+// versions of this header would otherwise share its inline functions, and one of them would read the
+// other's layout.
+#define VOREL_LOOK_JOINED(major, minor, patch) look_##major##_##minor##_##patch
+#define VOREL_LOOK_OF(major, minor, patch) VOREL_LOOK_JOINED(major, minor, patch)
+#define VOREL_LOOK VOREL_LOOK_OF(VOREL_VERSION_MAJOR, VOREL_VERSION_MINOR, VOREL_VERSION_PATCH)
+inline namespace VOREL_LOOK {
+/// \endcond
 
 /// A colour without an opacity: 0xRRGGBB.
 struct Color {
@@ -142,7 +153,8 @@ struct PixelView {
 enum class Failure {
     none,
     badArgument,  ///< a view or a glyph without pixels, of a negative size, or with too short a stride
-    tooLarge,     ///< a glyph beyond 65535 pixels on a side, or a layer of 2^31 bytes and more
+    tooLarge,     ///< a glyph beyond 65535 pixels on a side, a layer of 2^31 bytes and more, or a
+                  ///< picture whose left or top is below -2^31
     noMemory
 };
 
@@ -1134,5 +1146,12 @@ inline std::optional<Picture> Painter::paint(Glyphs glyphs) {
     layOver(picture.view(), -box.left, -box.top);
     return picture;
 }
+
+/// \cond
+}  // namespace VOREL_LOOK
+#undef VOREL_LOOK
+#undef VOREL_LOOK_OF
+#undef VOREL_LOOK_JOINED
+/// \endcond
 
 }  // namespace VFontEffect

@@ -1,4 +1,5 @@
 #include <gtest/gtest.h>
+#include <voreleffect/VFVersion.h>
 #include <voreleffect/look.h>
 
 #include <climits>
@@ -6,6 +7,7 @@
 #include <limits>
 #include <memory>
 #include <string>
+#include <typeinfo>
 #include <utility>
 #include <vector>
 
@@ -112,6 +114,16 @@ TEST(Look, EffectsThatWereMovedFrom_AreAsTheyWere) {
     const Look after = Look().add(Pattern(std::move(pattern))).add(RadialGradient(std::move(ramp)));
     EXPECT_EQ(after, before);
     EXPECT_EQ(Look().add(pattern).add(ramp), before);  // NOLINT: that is what is tested
+}
+
+/// Two libraries of one process may have look.h of different versions: what they have in common by name
+/// would be taken from one of them.
+TEST(Look, Names_HaveTheVersionInThem) {
+    std::string version = VOREL_VERSION_STRING;
+    std::replace(version.begin(), version.end(), '.', '_');
+    for (const std::type_info* type :
+         {&typeid(Look), &typeid(Painter), &typeid(Glyph), &typeid(look_internal::WideBox)})
+        EXPECT_NE(std::string(type->name()).find("look_" + version), std::string::npos) << type->name();
 }
 
 // --- Pictures against the classes called by hand ----------------------------------------------------
