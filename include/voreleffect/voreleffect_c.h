@@ -23,7 +23,7 @@ extern "C" {
 ///
 /// Conventions:
 ///  - What can fail returns a vorel_status. When it is not VOREL_OK the call has changed nothing, but a
-///    handle that it was to make is null.
+///    handle that it was to make is null, and vorel_look_key may have told a length.
 ///  - No pointer may be null but those that are said to be, and lists of no entries; nor may a handle.
 ///    VOREL_BAD_ARGUMENT tells of one.
 ///  - Numbers out of range, and what is no number, become what look.h makes of them: the nearest in
@@ -32,8 +32,7 @@ extern "C" {
 ///    that they are handed to.
 ///  - No exception leaves a call, and memory that runs out ends no process: VOREL_NO_MEMORY.
 ///  - A handle is made by a function whose name ends in new, copy or picture, and is the caller's to
-///  free.
-///    Painters have copies of their looks.
+///    free. Painters have copies of their looks.
 ///  - A handle belongs to one thread at a time, but several may read a look or a picture: hand it to
 ///    parameters that are const, and lists of looks. Different handles are independent.
 ///  - Colours are 0xRRGGBB; what lies above is ignored. Opacities are 0 to 1.
@@ -47,7 +46,8 @@ enum {
     VOREL_OK = 0,            ///< done
     VOREL_BAD_ARGUMENT = 1,  ///< null, no constant, no pixels, a negative size, too short a stride
     VOREL_TOO_LARGE = 2,     ///< a glyph beyond 65535 pixels on a side, a layer or a pattern of 2^31
-                             ///< bytes and more, a key beyond its buffer
+                             ///< bytes and more, a picture whose left or top is below -2^31, a key
+                             ///< beyond its buffer
     VOREL_NO_MEMORY = 3      ///< memory ran out
 };
 
