@@ -332,6 +332,24 @@ TEST(CFace, GlyphsFarApart_AreTooLargeForALayer) {
     EXPECT_EQ(picture, nullptr);
 }
 
+TEST(CFace, PictureWhoseOriginDoesNotFit_IsTooLarge) {
+    const unsigned char covered = 255;
+    const LookHandle look = newLook();
+    ASSERT_EQ(vorel_look_stroke(look.get(), 3, 0xFF, 1, VOREL_OUTSIDE), VOREL_OK);
+    const PainterHandle painter = newPainter({look.get()});
+    vorel_margins margins = {};
+    ASSERT_EQ(vorel_painter_margins(painter.get(), &margins), VOREL_OK);
+    vorel_glyph glyph = {INT32_MIN + margins.left, INT32_MIN + margins.top, &covered, 1, 1, 0};
+    vorel_picture* picture = nullptr;
+    EXPECT_EQ(vorel_painter_picture(painter.get(), &glyph, 1, &picture), VOREL_OK);
+    EXPECT_EQ(vorel_picture_left(picture), INT32_MIN);
+    EXPECT_EQ(vorel_picture_top(picture), INT32_MIN);
+    vorel_picture_free(picture);
+    --glyph.x;
+    EXPECT_EQ(vorel_painter_picture(painter.get(), &glyph, 1, &picture), VOREL_TOO_LARGE);
+    EXPECT_EQ(picture, nullptr);
+}
+
 TEST(CFace, NothingToPaint_TouchesNothingAndGivesAnEmptyPicture) {
     Page page(4, 4);
     const vorel_view view = inC(page.view());
