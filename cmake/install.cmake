@@ -9,6 +9,11 @@ install(TARGETS voreleffect EXPORT voreleffect-targets
   INCLUDES DESTINATION ${CMAKE_INSTALL_INCLUDEDIR})
 install(DIRECTORY include/voreleffect TYPE INCLUDE COMPONENT development)
 
+# What of the C++ runtime a program must link that is linked by a C compiler with the static library.
+set(VOREL_CXX_RUNTIME ${CMAKE_CXX_IMPLICIT_LINK_LIBRARIES})
+list(FILTER VOREL_CXX_RUNTIME INCLUDE REGEX "^(stdc\\+\\+|c\\+\\+|c\\+\\+abi)$")
+list(REMOVE_DUPLICATES VOREL_CXX_RUNTIME)
+
 # find_package(voreleffect)
 set(VOREL_CONFIG_DIR ${CMAKE_INSTALL_LIBDIR}/cmake/voreleffect)
 configure_package_config_file(cmake/voreleffect-config.cmake.in
@@ -35,7 +40,9 @@ foreach(directory VOREL_PC_LIBDIR VOREL_PC_INCLUDEDIR)
     string(PREPEND ${directory} "\${prefix}/")
   endif()
 endforeach()
-set(VOREL_PC_LIBS_PRIVATE "-lm")
+list(TRANSFORM VOREL_CXX_RUNTIME PREPEND "-l" OUTPUT_VARIABLE VOREL_PC_LIBS_PRIVATE)
+list(APPEND VOREL_PC_LIBS_PRIVATE "-lm")
+list(JOIN VOREL_PC_LIBS_PRIVATE " " VOREL_PC_LIBS_PRIVATE)
 if(ANDROID)
   string(APPEND VOREL_PC_LIBS_PRIVATE " -llog")
 endif()

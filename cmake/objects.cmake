@@ -37,7 +37,8 @@ endfunction()
 function(vorel_library target choice)
   cmake_parse_arguments(PARSE_ARGV 2 arg "" "" "LEVELS")
   target_sources(${target} PRIVATE
-    ${choice} blend/loop_tables.cpp ops/loop_tables.cpp $<TARGET_OBJECTS:voreleffect_objects>)
+    ${choice} blend/loop_tables.cpp ops/loop_tables.cpp
+    $<TARGET_OBJECTS:voreleffect_objects> $<TARGET_OBJECTS:voreleffect_capi>)
   foreach(level IN LISTS arg_LEVELS)
     target_sources(${target} PRIVATE $<TARGET_OBJECTS:voreleffect_${level}>)
   endforeach()

@@ -1,17 +1,23 @@
 #!/usr/bin/env bash
-# Checks what a built library shows to the linker: its exported symbols (tests/abi/symbols.txt), its
-# name, its needs, its alignment.
+# Checks what a built library shows to the linker: its exported symbols (tests/abi/symbols.txt), what it
+# takes from the C++ runtime (tests/abi/runtime.txt), its name, its needs, its alignment.
 #
 #     scripts/abi.sh [LIBRARY...]   the release and arm64 builds unless named
-#     scripts/abi.sh --update       writes the list of symbols anew from the release build
+#     scripts/abi.sh --update       writes both lists anew from the release build
 set -euo pipefail
 cd "$(dirname "$0")/.."
 
 list=tests/abi/symbols.txt
+runtime_list=tests/abi/runtime.txt
 symbols() { nm -D --defined-only "$1" | awk '{print $3}' | LC_ALL=C sort; }
+runtime() {
+    nm -D --undefined-only --without-symbol-versions "$1" | awk '{print $2}' |
+        grep -E '^(_Z|__cxa_|__gxx_|_Unwind_)' | LC_ALL=C sort
+}
 
 if [[ ${1:-} == --update ]]; then
     symbols build/release/libvoreleffect.so > "$list"
+    runtime build/release/libvoreleffect.so > "$runtime_list"
     exit 0
 fi
 
@@ -25,6 +31,7 @@ libraries=("$@")
 [[ $# -gt 0 ]] || libraries=(build/release/libvoreleffect.so build/arm64/libvoreleffect.so)
 for library in "${libraries[@]}"; do
     diff -u "$list" <(symbols "$library") || complain "exports other symbols than $list"
+    diff -u "$runtime_list" <(runtime "$library") || complain "takes other symbols than $runtime_list"
     dynamic=$(readelf --wide -d "$library")
     grep -q 'SONAME.*\[libvoreleffect\.so' <<< "$dynamic" || complain "has no SONAME"
     ! grep -q TEXTREL <<< "$dynamic" || complain "has text relocations"

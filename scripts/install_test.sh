@@ -26,6 +26,7 @@ fail() {
 }
 
 cp -r tests/install/consumer "$outside/sources"
+cp -r tests/install/c_consumer "$outside/c_sources"
 
 # check WHAT KIND PROGRAM PLUGIN: a built consumer works and has taken the library in as KIND.
 check() {
@@ -70,6 +71,37 @@ by_pkg_config() {
     check "$what" "$kind" "$out/consumer" "$out/libplugin.so"
 }
 
+# check_c WHAT KIND PROGRAM: a built program in C paints, and asks for no C++ runtime where the shared
+# library does.
+check_c() {
+    local what=$1 kind=$2 program=$3 said needs
+    said=$("$program") || fail "$what: the program in C fails"
+    [[ $said == "$version" ]] || fail "$what: the library says version $said, CHANGELOG.md $version"
+    needs=$(readelf --wide -d "$program" | sed -n 's/.*NEEDED.*\[\(.*\)\]/\1/p')
+    [[ $kind == static || $needs != *stdc++* ]] || fail "$what: the program in C needs libstdc++"
+    echo "$what, $kind: a program in C paints"
+}
+
+# c_by_cmake WHAT KIND OPTION...
+c_by_cmake() {
+    local what=$1 kind=$2 out
+    shift 2
+    out=$(mktemp -d -p "$outside")
+    quietly cmake -S "$outside/c_sources" -B "$out" -G Ninja "$@"
+    quietly cmake --build "$out"
+    check_c "$what" "$kind" "$out/c_consumer"
+}
+
+# c_by_pkg_config WHAT KIND OPTION...: the options are those of pkg-config
+c_by_pkg_config() {
+    local what=$1 kind=$2 out flags
+    shift 2
+    out=$(mktemp -d -p "$outside")
+    read -ra flags <<< "$(pkg-config "$@" --cflags --libs voreleffect) -Wl,-rpath,$(pkg-config --variable=libdir voreleffect)"
+    gcc -std=c99 -Wall -Wextra -Wpedantic -Werror "$outside/c_sources/c_consumer.c" "${flags[@]}" -o "$out/c_consumer"
+    check_c "$what" "$kind" "$out/c_consumer"
+}
+
 declare -A shared=([shared]=ON [static]=OFF)
 declare -A moved=()
 for kind in shared static; do
@@ -86,6 +118,8 @@ for kind in shared static; do
     static=()
     [[ $kind == shared ]] || static=(--static)
     PKG_CONFIG_PATH=$pc by_pkg_config pkg-config $kind "${static[@]}"
+    c_by_cmake find_package $kind -DCMAKE_PREFIX_PATH="${moved[$kind]}" -DCMAKE_BUILD_TYPE=Release
+    PKG_CONFIG_PATH=$pc c_by_pkg_config pkg-config $kind "${static[@]}"
     for way in add_subdirectory FetchContent; do
         by_cmake $way $kind -DTAKE=$way -DVOREL_SOURCE="$source" -DBUILD_SHARED_LIBS="${shared[$kind]}"
     done
@@ -127,6 +161,8 @@ packages=("${names[@]}")
 quietly dpkg --install "${files[@]}"
 by_cmake "Debian, find_package" shared -DCMAKE_BUILD_TYPE=Release
 by_pkg_config "Debian, pkg-config" shared
+c_by_cmake "Debian, find_package" shared -DCMAKE_BUILD_TYPE=Release
+c_by_pkg_config "Debian, pkg-config" shared
 picture=$outside/picture.png
 (cd / && vorelpaint --preset gold -o "$picture" "Installed")
 [[ $(file -b "$picture") == PNG* ]] || fail "Debian: vorelpaint paints no picture"

@@ -17,6 +17,7 @@
 #include "VFECore.h"
 #include "VFEffect.h"
 #include "VFProperty.h"
+#include "VFVersion.h"
 
 /// Looks as values, painted with one call.
 ///
@@ -39,6 +40,16 @@
 ///  - One Look, Painter or Picture belongs to one thread at a time, but several may read a Look or a
 ///    Picture; copies are independent.
 namespace VFontEffect {
+
+/// \cond
+// The version stands in all names: two libraries of one process that were compiled with different
+// versions of this header would otherwise share its inline functions, and one of them would read the
+// other's layout.
+#define VOREL_LOOK_JOINED(major, minor, patch) look_##major##_##minor##_##patch
+#define VOREL_LOOK_OF(major, minor, patch) VOREL_LOOK_JOINED(major, minor, patch)
+#define VOREL_LOOK VOREL_LOOK_OF(VOREL_VERSION_MAJOR, VOREL_VERSION_MINOR, VOREL_VERSION_PATCH)
+inline namespace VOREL_LOOK {
+/// \endcond
 
 /// A colour without an opacity: 0xRRGGBB.
 struct Color {
@@ -142,7 +153,8 @@ struct PixelView {
 enum class Failure {
     none,
     badArgument,  ///< a view or a glyph without pixels, of a negative size, or with too short a stride
-    tooLarge,     ///< a glyph beyond 65535 pixels on a side, or a layer of 2^31 bytes and more
+    tooLarge,     ///< a glyph beyond 65535 pixels on a side, a layer of 2^31 bytes and more, or a
+                  ///< picture whose left or top is below -2^31
     noMemory
 };
 
@@ -282,6 +294,16 @@ struct EffectData {
 
 /// One effect of any kind: one of those below. Their calls return a changed copy.
 class Effect {
+  public:
+    /// Moves are copies, too: what is moved from stays as it was.
+    Effect(const Effect&) = default;
+    /// A copy; where memory runs out the effect stays as it was.
+    Effect& operator=(const Effect& other) {
+        mData = Data(other.mData);
+        return *this;
+    }
+    ~Effect() = default;
+
   protected:
     friend class Look;
 
@@ -433,6 +455,14 @@ class Pattern : public EffectOf<Pattern> {
 /// them paint several looks, one over the other.
 class Look {
   public:
+    Look() = default;             ///< filled in black
+    Look(const Look&) = default;  ///< an independent copy
+    Look(Look&&) = default;       ///< the other one has no effects then
+    /// A copy; where memory runs out the look stays as it was.
+    Look& operator=(const Look& other) { return *this = Look(other); }
+    Look& operator=(Look&&) = default;  ///< the other one has no effects then
+    ~Look() = default;
+
     /// Fills the glyphs. Through a fill whose own opacity (0 to 1) is below 1 what lies beneath the text
     /// is seen.
     Look& fill(Color color, float opacity = 1) & {
@@ -858,7 +888,8 @@ class Picture {
 };
 
 /// Paints in a look, or in a stack of looks, again and again: every time the same picture for the same
-/// glyphs. It keeps its layers for the next time, as large as the largest so far.
+/// glyphs. It keeps its layers for the next time, as large as the largest so far. One that was moved
+/// from paints nothing.
 ///
 /// Gradients, patterns and what lies inside follow the box around all glyphs of a call.
 class Painter {
@@ -1115,5 +1146,12 @@ inline std::optional<Picture> Painter::paint(Glyphs glyphs) {
     layOver(picture.view(), -box.left, -box.top);
     return picture;
 }
+
+/// \cond
+}  // namespace VOREL_LOOK
+#undef VOREL_LOOK
+#undef VOREL_LOOK_OF
+#undef VOREL_LOOK_JOINED
+/// \endcond
 
 }  // namespace VFontEffect

@@ -13,7 +13,7 @@ required_conan_version = ">=2.0"
 
 
 # What the library is made of.
-ROOMS = ("blend", "cmake", "core", "cores", "effect", "include", "ops", "property", "simd")
+ROOMS = ("blend", "capi", "cmake", "core", "cores", "effect", "include", "ops", "property", "simd")
 
 
 class VoreleffectConan(ConanFile):

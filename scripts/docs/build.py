@@ -40,7 +40,7 @@ def main(library, folder):
     fail_on(faults)
     shutil.rmtree(folder / "html", ignore_errors=True)
     fail_on(build_site(pages, folder))
-    print(f"{len(pages)} pages, {sum(len(page.links) for page in pages)} links, {blocks} blocks of C++; "
+    print(f"{len(pages)} pages, {sum(len(page.links) for page in pages)} links, {blocks} blocks of C++ and C; "
           f"site: {folder / 'html/index.html'}")
 
 

@@ -1,8 +1,8 @@
-"""The C++ in the Markdown pages compiles.
+"""The C++ and the C in the Markdown pages compile.
 
-A block of `cpp` with a main is a program: it is compiled, linked and run. One that defines functions is a
-source file. Any other is the inside of a function and may use the names that fragment.h declares. A block
-that includes Android's headers is left to scripts/android_test.sh.
+A block of `cpp` or `c` with a main is a program: it is compiled, linked and run. One that defines functions is
+a source file, as every other one of `c` is. Any other of `cpp` is the inside of a function and may use the names
+that fragment.h declares. A block that includes Android's headers is left to scripts/android_test.sh.
 """
 
 import os
@@ -14,10 +14,13 @@ from pathlib import Path
 
 from pages import ROOT
 
-COMPILER = os.environ.get("CXX", "g++")
-FLAGS = ["-std=c++17", "-Wall", "-Wextra", "-Wconversion", "-Werror", "-I", str(ROOT / "include")]
-SOURCE_FLAGS = [*FLAGS, "-fsyntax-only", "-x", "c++", "-"]
-FRAGMENT_FLAGS = [*SOURCE_FLAGS, "-Wno-unused", "-I", str(Path(__file__).parent)]
+WARNINGS = ["-Wall", "-Wextra", "-Wconversion", "-Werror", "-I", str(ROOT / "include")]
+# Of each language: how its sources end, the compiler with its options, and what the compiler calls it.
+LANGUAGES = {
+    "cpp": (".cpp", [os.environ.get("CXX", "g++"), "-std=c++17", *WARNINGS], "c++"),
+    "c": (".c", [os.environ.get("CC", "gcc"), "-std=c99", "-Wpedantic", *WARNINGS], "c"),
+}
+FRAGMENT_FLAGS = ["-Wno-unused", "-I", str(Path(__file__).parent)]
 ELSEWHERE = re.compile(r"#include <(android/|jni\.h)")
 MAIN = re.compile(r"\bint main\(")
 FUNCTION = re.compile(r"^(?!for|if|while|switch|else)\w[\w:&*<>, ]* [\w:]+\([^;]*\) \{$", re.MULTILINE)
@@ -30,7 +33,7 @@ def located(page, block, text):
 
 def fault_of(arguments, source=None):
     """The first error of the compiler, or None."""
-    said = subprocess.run([COMPILER, *arguments], input=source, text=True, capture_output=True, check=False)
+    said = subprocess.run(arguments, input=source, text=True, capture_output=True, check=False)
     if said.returncode == 0:
         return None
     lines = said.stderr.strip().split("\n")
@@ -39,14 +42,20 @@ def fault_of(arguments, source=None):
 
 def program_fault(page, block, library):
     with tempfile.TemporaryDirectory() as folder:
-        source, program = Path(folder) / "program.cpp", Path(folder) / "program"
+        suffix, compiler, _ = LANGUAGES[block.language]
+        source, program = Path(folder) / f"program{suffix}", Path(folder) / "program"
         source.write_text(located(page, block, block.text))
-        fault = fault_of([*FLAGS, str(source), "-o", str(program), "-L", str(library), "-lvoreleffect",
+        fault = fault_of([*compiler, str(source), "-o", str(program), "-L", str(library), "-lvoreleffect",
                           f"-Wl,-rpath,{library}"])
         if fault:
             return fault
         result = subprocess.run([program], cwd=folder, capture_output=True, timeout=60, check=False).returncode
         return f"{page.name}:{block.line}: the program ends with {result}" if result else None
+
+
+def source_fault(language, source, options=()):
+    _, compiler, name = LANGUAGES[language]
+    return fault_of([*compiler, *options, "-fsyntax-only", "-x", name, "-"], source)
 
 
 def fragment_fault(page, block):
@@ -55,21 +64,21 @@ def fragment_fault(page, block):
     inside = "\n".join("" if line.startswith("#include") else line for line in lines)
     source = (includes + '#include "fragment.h"\nvoid fragment();\nvoid fragment() {\n'
               + located(page, block, inside) + "}\n")
-    return fault_of(FRAGMENT_FLAGS, source)
+    return source_fault(block.language, source, FRAGMENT_FLAGS)
 
 
 def block_fault(page, block, library):
     if MAIN.search(block.text):
         return program_fault(page, block, library)
-    if FUNCTION.search(block.text):
-        return fault_of(SOURCE_FLAGS, located(page, block, block.text))
+    if block.language == "c" or FUNCTION.search(block.text):
+        return source_fault(block.language, located(page, block, block.text))
     return fragment_fault(page, block)
 
 
 def code_faults(pages, library):
     """One line for each block that does not compile, or whose program fails; and the number of blocks."""
     blocks = [(page, block) for page in pages for block in page.blocks
-              if block.language == "cpp" and not ELSEWHERE.search(block.text)]
+              if block.language in LANGUAGES and not ELSEWHERE.search(block.text)]
     with ThreadPoolExecutor(2) as pool:
         faults = list(pool.map(lambda both: block_fault(*both, library), blocks))
     return [fault for fault in faults if fault], len(blocks)

@@ -167,6 +167,38 @@ TEST_F(LookMemory, RefusedWhileDescribing_Throws) {
     EXPECT_THROW(Picture copy(*picture), std::bad_alloc);
 }
 
+/// Assigning `other` to a copy of `original` throws and leaves it, or succeeds.
+template <class Value, class KeyOf>
+void expectAllOrNothing(const Value& original, const Value& other, KeyOf keyOf) {
+    Value value = original;
+    {
+        const RefusedObjects no;
+        EXPECT_THROW(value = other, std::bad_alloc);
+    }
+    EXPECT_EQ(keyOf(value), keyOf(original));
+    value = other;
+    EXPECT_EQ(keyOf(value), keyOf(other));
+}
+
+/// Both looks have as many effects: their list has room already.
+TEST_F(LookMemory, RefusedWhileAssigned_LeavesWhatWasThere) {
+    const std::vector<Stop> none;
+    const Look plain = Look()
+                           .fill(rgb(9))
+                           .add(Stroke(9, rgb(1)))
+                           .add(OuterGlow(2, rgb(2)))
+                           .add(InnerGlow(2, rgb(3)))
+                           .add(OuterShadow(rgb(4)))
+                           .add(InnerShadow(rgb(5)))
+                           .add(Pattern({kTile, 1, 1}))
+                           .add(LinearGradient(none))
+                           .add(RadialGradient(none));
+    expectAllOrNothing(plain, everything(), [](const Look& look) { return look.key(); });
+    const RadialGradient narrow = RadialGradient({{rgb(1)}}).scale(0.3F);
+    const RadialGradient wide = RadialGradient({{rgb(2)}, {rgb(3), 1, 1}}).scale(0.7F);
+    expectAllOrNothing(narrow, wide, [](const RadialGradient& ramp) { return Look().add(ramp).key(); });
+}
+
 TEST_F(LookMemory, OfAPainterThatIsMade_IsAskedForWithoutThrowing) {
     Painter painter({everything(), plainStack()[0]});
     Bytes painted = page();

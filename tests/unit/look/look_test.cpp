@@ -1,4 +1,5 @@
 #include <gtest/gtest.h>
+#include <voreleffect/VFVersion.h>
 #include <voreleffect/look.h>
 
 #include <climits>
@@ -6,6 +7,8 @@
 #include <limits>
 #include <memory>
 #include <string>
+#include <typeinfo>
+#include <utility>
 #include <vector>
 
 #include "tests/support/compare.h"
@@ -101,6 +104,26 @@ TEST(Look, CopiesAndMoves_AreEqualAndIndependent) {
     EXPECT_EQ(moved.key(), key);
     copy = moved;
     EXPECT_EQ(copy.key(), key);
+}
+
+TEST(Look, EffectsThatWereMovedFrom_AreAsTheyWere) {
+    const unsigned char pixels[] = {1, 2, 3, 255, 200, 100, 50, 255};
+    Pattern pattern({pixels, 2, 1});
+    RadialGradient ramp({{rgb(0)}, {rgb(0xFFFFFF), 1, 1}});
+    const Look before = Look().add(pattern).add(ramp);
+    const Look after = Look().add(Pattern(std::move(pattern))).add(RadialGradient(std::move(ramp)));
+    EXPECT_EQ(after, before);
+    EXPECT_EQ(Look().add(pattern).add(ramp), before);  // NOLINT: that is what is tested
+}
+
+/// Two libraries of one process may have look.h of different versions: what they have in common by name
+/// would be taken from one of them.
+TEST(Look, Names_HaveTheVersionInThem) {
+    std::string version = VOREL_VERSION_STRING;
+    std::replace(version.begin(), version.end(), '.', '_');
+    for (const std::type_info* type :
+         {&typeid(Look), &typeid(Painter), &typeid(Glyph), &typeid(look_internal::WideBox)})
+        EXPECT_NE(std::string(type->name()).find("look_" + version), std::string::npos) << type->name();
 }
 
 // --- Pictures against the classes called by hand ----------------------------------------------------
@@ -230,6 +253,23 @@ TEST(LookPictures, OfOnePainter_DoNotDependOnWhatItPaintedBefore) {
         ASSERT_EQ(0, std::memcmp(picture->data(), fresh->data(),
                                  static_cast<size_t>(picture->stride() * picture->height())));
     }
+}
+
+TEST(LookPictures, OfAPainterThatWasMovedFrom_AreEmpty) {
+    Painter original(everything());
+    const Text text = squareText(9, 9);
+    Page expected(30, 30);
+    ASSERT_TRUE(original.paint(text.glyphs(), expected.view()));
+    Painter moved = std::move(original);
+    Page page(30, 30);
+    ASSERT_TRUE(moved.paint(text.glyphs(), page.view()));
+    EXPECT_TRUE(samePage(expected, page));
+    page = Page(30, 30);
+    const auto touched = original.paint(text.glyphs(), page.view());  // NOLINT: that is what is tested
+    ASSERT_TRUE(touched);
+    EXPECT_TRUE(touched->isEmpty());
+    EXPECT_TRUE(original.paint(text.glyphs())->isEmpty());
+    EXPECT_TRUE(samePage(Page(30, 30), page));
 }
 
 TEST(LookPictures, OrderOfAdding_DecidesWhatLiesOnTop) {

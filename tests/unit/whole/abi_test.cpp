@@ -62,6 +62,15 @@ TEST(Abi, Bitmap_IsLaidOut) {
     EXPECT_EQ(offsetIn(b, b.mBytesPerPixel), 28U);
 }
 
+/// On 64-bit machines: a table of operations and the fields, all of them private.
+TEST(Abi, ObjectsThatCallersHold_HaveTheirSizes) {
+    EXPECT_EQ(sizeof(VFEffect), 8U + 24 + 3 * 8 + 24 + 2 * 4 + 4 * 4);
+    EXPECT_EQ(sizeof(VFECoreBase), 8U + 2 * 4);
+    for (const size_t size : {sizeof(VFText), sizeof(VFStroke), sizeof(VFPattern)})
+        EXPECT_EQ(size, sizeof(VFECoreBase) + 8);
+    EXPECT_EQ(sizeof(VFOuterShadow), sizeof(VFECoreBase) + 8 + 2 * 4);
+}
+
 TEST(Abi, SmallRecords_AreLaidOut) {
     const VFRect r;
     EXPECT_EQ(sizeof r, 24U);

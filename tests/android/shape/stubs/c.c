@@ -5,6 +5,7 @@ FUNCTION(calloc)
 FUNCTION(free)
 FUNCTION(getauxval) /* the level of the instruction set */
 FUNCTION(malloc)
+FUNCTION(memcmp)
 FUNCTION(memcpy)
 FUNCTION(memmove)
 FUNCTION(memset)
