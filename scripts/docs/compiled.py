@@ -2,7 +2,8 @@
 
 A block of `cpp` or `c` with a main is a program: it is compiled, linked and run. One that defines functions is
 a source file, as every other one of `c` is. Any other of `cpp` is the inside of a function and may use the names
-that fragment.h declares. A block that includes Android's headers is left to scripts/android_test.sh.
+that fragment.h declares. A block that includes Android's headers is left to scripts/android_test.sh, and one that
+is quoted (quoted.py) to what builds its file.
 """
 
 import os
@@ -13,6 +14,7 @@ from concurrent.futures import ThreadPoolExecutor
 from pathlib import Path
 
 from pages import ROOT
+from quoted import source_of
 
 WARNINGS = ["-Wall", "-Wextra", "-Wconversion", "-Werror", "-I", str(ROOT / "include")]
 # Of each language: how its sources end, the compiler with its options, and what the compiler calls it.
@@ -78,7 +80,8 @@ def block_fault(page, block, library):
 def code_faults(pages, library):
     """One line for each block that does not compile, or whose program fails; and the number of blocks."""
     blocks = [(page, block) for page in pages for block in page.blocks
-              if block.language in LANGUAGES and not ELSEWHERE.search(block.text)]
+              if block.language in LANGUAGES and not ELSEWHERE.search(block.text)
+              and not source_of(page, block)]
     with ThreadPoolExecutor(2) as pool:
         faults = list(pool.map(lambda both: block_fault(*both, library), blocks))
     return [fault for fault in faults if fault], len(blocks)

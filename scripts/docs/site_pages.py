@@ -11,6 +11,7 @@ from pages import CODE_SPAN, ROOT, is_outside, target_of
 # stands in the last group.
 NAVIGATION = [
     ("Guide", ["docs/guide.md"]),
+    ("Recipes", ["docs/recipes.md"]),
     ("Effects", ["docs/effects/README.md", "docs/effects/text-fill.md", "docs/effects/stroke.md",
                  "docs/effects/outer-shadow.md", "docs/effects/inner-shadow.md",
                  "docs/effects/outer-glow.md", "docs/effects/inner-glow.md",
