@@ -1,8 +1,7 @@
 #!/usr/bin/env bash
 # Takes the library as its users do, from outside the tree: by find_package, pkg-config, add_subdirectory
 # and FetchContent, shared and static, from a prefix that was moved; then builds the Debian packages and
-# takes it from them (as root; they are removed afterwards); then builds and runs the examples and
-# recipes.
+# takes it from them (as root; they are removed afterwards); then builds and runs the examples.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 . scripts/packages.sh
@@ -142,7 +141,6 @@ quietly cmake --install "$build/shared" --component runtime --prefix "$outside/r
     fail "the component runtime has more than the library"
 
 scripts/examples.sh "${moved[shared]}"
-scripts/recipes.sh "${moved[shared]}"
 
 if [[ $(id -u) -ne 0 ]]; then
     echo "Debian packages: not tried, which takes root"

@@ -7,6 +7,7 @@ set -euo pipefail
 cd "$(dirname "$0")/.."
 . scripts/packages.sh
 . scripts/quietly.sh
+. scripts/installed.sh
 
 need_packages cmake ninja-build g++ pkg-config ffmpeg python3 python3-pil
 # Any Rust of the last years does; Debian's where there is none.
@@ -14,12 +15,10 @@ command -v rustc > /dev/null || need_packages rustc
 
 programs=$PWD/examples/languages
 build=$PWD/build/languages
-prefix=$build/prefix
 pages=$build/pages
-rm -rf "$prefix" "$pages"
+rm -rf "$build"
 mkdir -p "$pages"
-quietly cmake -S . -B "$build/library" -G Ninja -DCMAKE_BUILD_TYPE=Release -DCMAKE_INSTALL_PREFIX="$prefix"
-quietly cmake --build "$build/library" --target install
+install_library
 
 library=$(dirname "$(find "$prefix" -name libvoreleffect.so)")
 export PKG_CONFIG_PATH=$library/pkgconfig LD_LIBRARY_PATH=$library
