@@ -1,8 +1,8 @@
 #!/usr/bin/env bash
 # Builds the site of the documents into build/docs/html. Fails, with a line for each fault, when
 #   - a relative link or an anchor of a Markdown page leads nowhere,
-#   - the tables of keys in docs/style-files.md are behind the schema,
 #   - what a page quotes of a program is not what stands in it,
+#   - the tables of keys in docs/style-files.md are behind the schema,
 #   - a block of C++ or C in one does not compile, or its program fails,
 #   - a public name is not documented, or Doxygen warns of anything else,
 #   - a link of the finished site leads nowhere.

@@ -36,8 +36,8 @@ def build_site(pages, folder):
 def main(library, folder):
     pages = all_pages()
     fail_on(link_faults(pages))
-    fail_on(table_faults())
     fail_on(quote_faults(pages))
+    fail_on(table_faults())
     faults, blocks = code_faults(pages, library)
     fail_on(faults)
     shutil.rmtree(folder / "html", ignore_errors=True)

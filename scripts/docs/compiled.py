@@ -14,7 +14,6 @@ from concurrent.futures import ThreadPoolExecutor
 from pathlib import Path
 
 from pages import ROOT
-from quoted import source_of
 
 WARNINGS = ["-Wall", "-Wextra", "-Wconversion", "-Werror", "-I", str(ROOT / "include")]
 # Of each language: how its sources end, the compiler with its options, and what the compiler calls it.
@@ -81,7 +80,7 @@ def code_faults(pages, library):
     """One line for each block that does not compile, or whose program fails; and the number of blocks."""
     blocks = [(page, block) for page in pages for block in page.blocks
               if block.language in LANGUAGES and not ELSEWHERE.search(block.text)
-              and not source_of(page, block)]
+              and not block.source]
     with ThreadPoolExecutor(2) as pool:
         faults = list(pool.map(lambda both: block_fault(*both, library), blocks))
     return [fault for fault in faults if fault], len(blocks)

@@ -8,23 +8,14 @@ import re
 
 from pages import CODE_SPAN, ROOT, target_of
 
-FROM = re.compile(r"^From \[[^\]]*\]\(([^()\s]+)\):$")
 ROW = re.compile(r"^\| *\[[^\]]*\]\(([^()\s]+)\) *\|")
 PROGRAMS = ROOT / "examples/languages"
 
 
-def source_of(page, block):
-    """The file that the block is said to be from, or None."""
-    before = [line for line in page.lines[:block.line - 2] if line.strip()]
-    match = FROM.match(before[-1]) if before else None
-    return target_of(page, match[1])[0] if match else None
-
-
 def block_faults(page):
     for block in page.blocks:
-        source = source_of(page, block)
-        if source and block.text not in source.read_text(encoding="utf-8"):
-            yield f"{page.name}:{block.line}: not what stands in {source.name}"
+        if block.source and block.text not in block.source.read_text(encoding="utf-8"):
+            yield f"{page.name}:{block.line}: not what stands in {block.source.name}"
 
 
 def row_faults(page):
