@@ -123,7 +123,7 @@ TEST(Painters, InnerShadowsInWindows_AreThoseOfTheLiteralForm) {
 
 template <class Record, class LiteralForm>
 void expectGlows(EffectType type, LiteralForm literalForm) {
-    forSeeds(0, 800, [&](Random& random) {
+    forSeeds(0, 400, [&](Random& random) {
         const Scene scene = windowedScene(random);
         const auto stops = randomStops(random, random.chance(50) ? 0 : random.between(1, 4));
         auto array = libraryStops(stops);
