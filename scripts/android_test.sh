@@ -7,7 +7,7 @@ cd "$(dirname "$0")/.."
 . scripts/packages.sh
 need_packages cmake ninja-build g++ libgtest-dev python3 openjdk-17-jdk-headless \
     clang-14 lld-14 llvm-14 libc++-14-dev g++-aarch64-linux-gnu qemu-user-static \
-    android-liblog-dev android-platform-frameworks-native-headers android-libnativehelper-dev
+    android-liblog-dev android-platform-frameworks-native-headers android-libnativehelper-dev proguard-cli
 
 build=build/android_tests
 cmake -S tests/android -B "$build" -G Ninja > /dev/null
