@@ -3,7 +3,9 @@
 FUNCTION(abort)
 FUNCTION(calloc)
 FUNCTION(free)
+#ifdef __aarch64__
 FUNCTION(getauxval) /* the level of the instruction set */
+#endif
 FUNCTION(malloc)
 FUNCTION(memcmp)
 FUNCTION(memcpy)
