@@ -1,6 +1,7 @@
 #!/usr/bin/env bash
-# The same look in six languages: builds the programs of examples/languages against the library as it is installed,
-# runs each and compares the pages that they have painted, byte for byte; the picture is that of docs/languages.md.
+# The same look in five languages: builds the programs of examples/languages against what users install, runs each and
+# compares the pages that they have painted, byte for byte; the picture is that of docs/languages.md. The face of Java
+# is the one that scripts/android_test.sh builds.
 #
 #     scripts/languages.sh [--update]    --update takes the picture into docs/languages instead of comparing it
 set -euo pipefail
@@ -9,7 +10,7 @@ cd "$(dirname "$0")/.."
 . scripts/quietly.sh
 . scripts/installed.sh
 
-need_packages cmake ninja-build g++ pkg-config ffmpeg python3 python3-pil
+need_packages cmake ninja-build g++ pkg-config ffmpeg python3 python3-pil openjdk-17-jdk-headless kotlin
 # Any Rust of the last years does; Debian's where there is none.
 command -v rustc > /dev/null || need_packages rustc
 
@@ -18,11 +19,19 @@ build=$PWD/build/languages
 pages=$build/pages
 rm -rf "$build"
 mkdir -p "$pages"
-install_library
+prefix=$(install_library)
+quietly scripts/android_test.sh --build
 
 library=$(dirname "$(find "$prefix" -name libvoreleffect.so)")
-export PKG_CONFIG_PATH=$library/pkgconfig LD_LIBRARY_PATH=$library
-read -ra flags <<< "$(pkg-config --cflags --libs voreleffect)"
+export PKG_CONFIG_PATH=$library/pkgconfig
+read -ra flags <<< "$(pkg-config --cflags --libs voreleffect) -Wl,-rpath,$library"
+java=$PWD/build/android_tests/voreleffect
+classes=$java/android/classes
+
+# run_java CLASS_FILES CLASS PAGE
+run_java() {
+    java -Djava.library.path="$java:$java/android:$PWD/build/android_tests" -cp "$classes:$1" "$2" "$3"
+}
 
 in_cpp() {
     quietly g++ -std=c++17 -Wall -Wextra -Wconversion -Werror "$programs/title.cpp" "${flags[@]}" -o "$build/cpp"
@@ -34,12 +43,23 @@ in_c() {
     "$build/c" "$1"
 }
 
+in_java() {
+    quietly javac -Xlint:all -Werror -cp "$classes" -d "$build/java" "$programs/Title.java"
+    run_java "$build/java" Title "$1"
+}
+
+in_kotlin() {
+    quietly kotlinc "$programs/title.kt" -cp "$classes" -d "$build/kotlin"
+    run_java "$build/kotlin:/usr/share/java/kotlin-stdlib.jar" TitleKt "$1"
+}
+
 in_rust() {
-    quietly rustc --edition 2021 -D warnings -L "$library" -o "$build/rust" "$programs/title.rs"
+    quietly rustc --edition 2021 -D warnings -L "$library" -C link-arg="-Wl,-rpath,$library" -o "$build/rust" \
+        "$programs/title.rs"
     "$build/rust" "$1"
 }
 
-for language in cpp c rust; do
+for language in cpp c java kotlin rust; do
     "in_$language" "$pages/$language.rgba"
     cmp "$pages/cpp.rgba" "$pages/$language.rgba"
     echo "$language: $(sha256sum < "$pages/$language.rgba" | cut -c -16)"
@@ -47,7 +67,6 @@ done
 
 ffmpeg -nostdin -v error -f rawvideo -pixel_format rgba -video_size 100x110 -i "$pages/cpp.rgba" "$pages/title.png"
 if [[ ${1:-} == --update ]]; then
-    mkdir -p docs/languages
     cp "$pages/title.png" docs/languages
 else
     # Debian's own Python, to which python3-pil belongs.

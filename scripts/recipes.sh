@@ -15,7 +15,7 @@ need_packages cmake ninja-build g++ pkg-config libfreetype-dev libpng-dev fonts-
 root=$PWD
 build=$root/build/examples/recipes
 pictures=$root/build/examples/recipe_pictures
-install_library
+prefix=$(install_library)
 
 # Not optimised: what takes time is in the library.
 quietly cmake -S examples/recipes -B "$build" -G Ninja -DCMAKE_PREFIX_PATH="$prefix" \
