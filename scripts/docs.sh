@@ -3,7 +3,8 @@
 #   - a relative link or an anchor of a Markdown page leads nowhere,
 #   - what a page quotes of a program is not what stands in it,
 #   - the tables of keys in docs/style-files.md are behind the schema,
-#   - a block of C++ or C in one does not compile, or its program fails,
+#   - a page has another number than is counted,
+#   - a block of C++ or C in one does not compile, or its program fails or adds an effect that is not seen,
 #   - a public name is not documented, or Doxygen warns of anything else,
 #   - a link of the finished site leads nowhere.
 set -euo pipefail
