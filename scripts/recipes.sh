@@ -9,7 +9,7 @@ cd "$(dirname "$0")/.."
 . scripts/quietly.sh
 . scripts/installed.sh
 
-need_packages cmake ninja-build g++ pkg-config libfreetype-dev libpng-dev fonts-dejavu-core ffmpeg \
+need_packages cmake ninja-build g++ pkg-config libfreetype-dev libharfbuzz-dev libpng-dev fonts-dejavu-core ffmpeg \
     qt6-base-dev libsdl2-dev libcairo2-dev libopencv-core-dev libopencv-imgproc-dev python3 python3-pil
 
 root=$PWD
@@ -29,7 +29,7 @@ mkdir -p "$pictures"
 cd "$pictures"
 for source in "$root"/examples/recipes/*.cpp; do
     recipe=$(basename "$source" .cpp)
-    [[ $recipe != line ]] || continue
+    [[ $recipe != recipe ]] || continue
     QT_QPA_PLATFORM=offscreen quietly "$build/$recipe"
     echo "$recipe: build/examples/recipe_pictures/$recipe.png"
 done

@@ -3,7 +3,8 @@
 #include <optional>
 #include <string>
 
-#include "line.h"
+#include "../shared/shaped_text.h"
+#include "recipe.h"
 
 using namespace VFontEffect;
 
@@ -44,7 +45,7 @@ class Pictures {
 };
 
 Page frameOf(int frame, const Line& line, Pictures& pictures) {
-    Page page(200, 100, rgb(0xFBEFD5));
+    Page page(200, 100, 0xFBEFD5);
     const Picture* picture = pictures.of(lookOf(frame), line, "Spin/DejaVu Sans Bold/64");
     check(picture != nullptr, "a picture");
     picture->layOver(page.view(), 20, 70);
@@ -64,7 +65,7 @@ void checkSteps(const Line& line) {
 }  // namespace
 
 int main() {
-    const Line line("Spin", 64);
+    const Line line = Font(kFont, 64).line("Spin");
     Pictures pictures;
     std::vector<Page> first;
     for (int frame = 0; frame < kFrames; ++frame)
@@ -74,15 +75,15 @@ int main() {
     // The second turn paints nothing, and looks as the first.
     for (std::size_t frame = 0; frame < kFrames; ++frame) {
         const Page again = frameOf(kFrames + static_cast<int>(frame), line, pictures);
-        check(again.pixels == first[frame].pixels, "the same frames again");
+        check(again == first[frame], "the same frames again");
     }
     check(pictures.painted() == kFrames, "nothing painted anew");
-    checkSteps(Line("Spin", 8));
+    checkSteps(Font(kFont, 8).line("Spin"));
 
-    Page strip(800, 100, rgb(0xFBEFD5));
+    Page strip(800, 100, 0xFBEFD5);
     for (int column = 0; column < 4; ++column)
         pictures.of(lookOf(column * kFrames / 4), line, "Spin/DejaVu Sans Bold/64")
             ->layOver(strip.view(), column * 200 + 20, 70);
-    writePng("animation.png", strip.view());
+    check(strip.writePng("animation.png"), "a PNG");
     return 0;
 }

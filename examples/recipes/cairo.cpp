@@ -4,7 +4,8 @@
 #include <cmath>
 #include <memory>
 
-#include "line.h"
+#include "../shared/shaped_text.h"
+#include "recipe.h"
 
 using namespace VFontEffect;
 
@@ -75,20 +76,21 @@ void draw(cairo_t* context, int width, int height, cairo_surface_t* title) {
     cairo_paint(context);
 }
 
-/// What Cairo has laid over the window is what the library lays over a page.
-void checkDrawn(const PictureView& window, const PictureView& title, const Look& look,
+/// What Cairo has laid over the window is what the library lays over a page. Returns that page.
+Page checkDrawn(const PictureView& window, const PictureView& title, const Look& look,
                 const Glyph& glyph) {
     const Margins margins = look.margins();
-    Page page(window.width, window.height, rgb(0xF6F0E0));
+    Page page(window.width, window.height, 0xF6F0E0);
     paint(look, glyph, page.view(), (window.width - title.width) / 2 + margins.left - glyph.x,
           (window.height - title.height) / 2 + margins.top - glyph.y);
-    for (int y = 0; y < page.height; ++y)
-        for (int x = 0; x < page.width; ++x) {
+    for (int y = 0; y < window.height; ++y)
+        for (int x = 0; x < window.width; ++x) {
             const unsigned char* drawn = window.data + y * window.stride + x * 4;
-            const unsigned char* painted = page.view().data + (y * page.width + x) * 4;
+            const unsigned char* painted = page.pixels().data() + (y * window.width + x) * 4;
             check(drawn[2] == painted[0] && drawn[1] == painted[1] && drawn[0] == painted[2],
                   "as on a page");
         }
+    return page;
 }
 
 }  // namespace
@@ -106,7 +108,7 @@ int main() {
     const Context context(cairo_create(window.get()), cairo_destroy);
     draw(context.get(), 340, 130, title.get());
     cairo_surface_flush(window.get());
-    checkDrawn(viewOf(window.get()), viewOf(title.get()), look, glyph);
-    writePng("cairo.png", viewOf(window.get()));
+    const Page page = checkDrawn(viewOf(window.get()), viewOf(title.get()), look, glyph);
+    check(page.writePng("cairo.png"), "a PNG");
     return 0;
 }

@@ -4,7 +4,8 @@
 #include <cstdio>
 #include <string>
 
-#include "line.h"
+#include "../shared/shaped_text.h"
+#include "recipe.h"
 
 using namespace VFontEffect;
 
@@ -78,20 +79,21 @@ std::vector<Frame> framesOf(const std::string& film) {
     return frames;
 }
 
-/// The film holds what the library lays over a page.
+/// The film holds what the library lays over a page. Writes one of its frames as a PNG.
 void checkLaid(const Line& line, const std::vector<Frame>& laid) {
     check(laid.size() == kFrames, "as many frames as painted");
     for (int i = 0; i < kFrames; ++i) {
-        Page page(kWidth, kHeight, rgb(0x204060));
+        Page page(kWidth, kHeight, 0x204060);
         paint(lookOf(i), line.glyphs, page.view(), 30, 80);
-        check(laid[static_cast<std::size_t>(i)] == page.pixels, "as on a page");
+        check(laid[static_cast<std::size_t>(i)] == page.pixels(), "as on a page");
+        if (i == kFrames / 2) check(page.writePng("frames.png"), "a PNG");
     }
 }
 
 }  // namespace
 
 int main() {
-    const Line line("FFmpeg", 64);
+    const Line line = Font(kFont, 64).line("FFmpeg");
     const std::vector<Frame> frames = paintFrames(line);
     std::vector<Frame> stored;
     for (const Frame& frame : frames)
@@ -100,8 +102,6 @@ int main() {
     check(framesOf("frames.mov") == stored, "the film holds the frames");
 
     check(pipeInto(kOver, frames), "a film with words over it");
-    std::vector<Frame> laid = framesOf("over.mov");
-    checkLaid(line, laid);
-    writePng("frames.png", {laid[kFrames / 2].data(), kWidth, kHeight});
+    checkLaid(line, framesOf("over.mov"));
     return 0;
 }

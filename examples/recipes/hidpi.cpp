@@ -3,7 +3,8 @@
 #include <cmath>
 #include <optional>
 
-#include "line.h"
+#include "../shared/shaped_text.h"
+#include "recipe.h"
 
 using namespace VFontEffect;
 
@@ -48,14 +49,14 @@ std::optional<Picture> wideStroke(Glyphs glyphs, int size, Color color) {
 /// The same words at three densities. Letters are rasterised at the scale: coverage that is enlarged
 /// would have soft edges.
 void paintAtScales() {
-    Page page(610, 120, rgb(0xEFE9F7));
+    Page page(610, 120, 0xEFE9F7);
     int x = 15;
     for (const float scale : {1.0F, 1.5F, 2.0F}) {
-        const Line line("HiDPI", static_cast<int>(std::lround(40 * scale)));
+        const Line line = Font(kFont, static_cast<int>(std::lround(40 * scale))).line("HiDPI");
         check(paint(lookAt(scale), line.glyphs, page.view(), x, 90).has_value(), "painted");
         x += static_cast<int>(132 * scale);
     }
-    writePng("hidpi.png", page.view());
+    check(page.writePng("hidpi.png"), "a PNG");
 }
 
 /// Around a square the stroke is all that lies within 240 pixels of it, round corners included.

@@ -3,7 +3,8 @@
 #include <iterator>
 #include <optional>
 
-#include "line.h"
+#include "../shared/shaped_text.h"
+#include "recipe.h"
 
 using namespace VFontEffect;
 
@@ -31,12 +32,12 @@ void paintLetters(const Line& line, const PictureView& view, int x, int y) {
 
 /// Where a letter is opaque, nothing of the outline or of another letter is seen. The origin of the text
 /// is the page's (x, y).
-void checkLetter(const Page& page, const Picture& letter, int x, int y) {
+void checkLetter(const PictureView& page, const Picture& letter, int x, int y) {
     for (int row = 0; row < letter.height(); ++row)
         for (int column = 0; column < letter.width(); ++column) {
             const unsigned char* painted = letter.data() + row * letter.stride() + 4 * column;
             const int at = (y + letter.top() + row) * page.width + x + letter.left() + column;
-            const bool isSame = std::equal(painted, painted + 4, page.pixels.data() + 4 * at);
+            const bool isSame = std::equal(painted, painted + 4, page.data + 4 * at);
             if (painted[3] == 255) check(isSame, "nothing over a letter");
         }
 }
@@ -44,14 +45,14 @@ void checkLetter(const Page& page, const Picture& letter, int x, int y) {
 }  // namespace
 
 int main() {
-    const Line line("Rainbow", 80);
-    Page page(430, 130, rgb(0x9FD8E8));
+    const Line line = Font(kFont, 80).line("Rainbow");
+    Page page(430, 130, 0x9FD8E8);
     paintLetters(line, page.view(), 28, 90);
-    writePng("letters.png", page.view());
+    check(page.writePng("letters.png"), "a PNG");
     for (std::size_t i = 0; i < line.glyphs.size(); ++i) {
         const std::optional<Picture> letter = paint(letterLook(i), line.glyphs[i]);
         check(letter.has_value(), "a letter");
-        checkLetter(page, *letter, 28, 90);
+        checkLetter(page.view(), *letter, 28, 90);
     }
     return 0;
 }

@@ -4,7 +4,7 @@
 #include <opencv2/imgproc.hpp>
 #include <optional>
 
-#include "line.h"
+#include "recipe.h"
 
 using namespace VFontEffect;
 
@@ -90,8 +90,9 @@ int main() {
     const std::optional<Picture> picture = paint(look, glyphOf(mask));
     check(picture.has_value(), "a picture");
     checkLaid(frame, filmFrame(), *picture);
-    cv::Mat opaque;
-    cv::cvtColor(frame, opaque, cv::COLOR_BGR2BGRA);
-    writePng("opencv.png", viewOf(opaque));
+    Page page(frame.cols, frame.rows, 0);
+    cv::Mat seen(frame.rows, frame.cols, CV_8UC4, page.view().data);
+    cv::cvtColor(frame, seen, cv::COLOR_BGR2RGBA);
+    check(page.writePng("opencv.png"), "a PNG");
     return 0;
 }

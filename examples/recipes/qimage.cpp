@@ -9,7 +9,8 @@
 #include <algorithm>
 #include <vector>
 
-#include "line.h"
+#include "../shared/shaped_text.h"
+#include "recipe.h"
 
 using namespace VFontEffect;
 
@@ -53,9 +54,9 @@ QImage painted(QImage::Format format, const Look& look, const Mask& mask) {
 
 /// Both formats hold the bytes of a page.
 void checkFormats(const QImage& argb, const QImage& rgba, const Look& look, const Mask& mask) {
-    Page page(340, 120, rgb(0x41CD52));
+    Page page(340, 120, 0x41CD52);
     paint(look, mask.glyph(), page.view(), 20, 85);
-    check(std::equal(page.pixels.begin(), page.pixels.end(), rgba.constBits()), "as on a page");
+    check(std::equal(page.pixels().begin(), page.pixels().end(), rgba.constBits()), "as on a page");
     check(argb.convertToFormat(rgba.format()) == rgba, "the same in both formats");
 }
 

@@ -6,7 +6,8 @@
 #include <optional>
 #include <vector>
 
-#include "line.h"
+#include "../shared/shaped_text.h"
+#include "recipe.h"
 
 using namespace VFontEffect;
 
@@ -72,13 +73,13 @@ SDL_Surface* windowSurface() {
 
 /// The surface holds what a page does; what was blended from straight pixels was rounded twice.
 void checkSeen(const PictureView& seen, const Look& look, const Line& line) {
-    Page page(seen.width, seen.height, rgb(0x172A54));
+    Page page(seen.width, seen.height, 0x172A54);
     paint(look, line.glyphs, page.view(), 30, 85);
     paint(look, line.glyphs, page.view(), 230, 85);
-    for (int y = 0; y < page.height; ++y)
-        for (int x = 0; x < page.width; ++x)
+    for (int y = 0; y < seen.height; ++y)
+        for (int x = 0; x < seen.width; ++x)
             for (int channel = 0; channel < 3; ++channel) {
-                const int painted = page.view().data[(y * page.width + x) * 4 + channel];
+                const int painted = page.view().data[(y * seen.width + x) * 4 + channel];
                 const int drawn = seen.data[y * seen.stride + x * 4 + 2 - channel];
                 check(std::abs(drawn - painted) <= (x < 200 ? 0 : 2), "as on a page");
             }
@@ -87,7 +88,7 @@ void checkSeen(const PictureView& seen, const Look& look, const Line& line) {
 }  // namespace
 
 int main(int, char**) {
-    const Line line("SDL", 72);
+    const Line line = Font(kFont, 72).line("SDL");
     Look look;
     look.fill(rgb(0xF4F7FF))
         .add(OuterGlow(14, rgb(0x3BD1FF)))
@@ -104,9 +105,10 @@ int main(int, char**) {
     SDL_RenderPresent(renderer);
 
     checkSeen(viewOf(*surface), look, line);
-    SDL_Surface* shown = SDL_ConvertSurfaceFormat(surface, SDL_PIXELFORMAT_RGBA32, 0);
-    writePng("sdl.png", viewOf(*shown));
-    SDL_FreeSurface(shown);
+    Page page(surface->w, surface->h, 0);
+    SDL_ConvertPixels(surface->w, surface->h, surface->format->format, surface->pixels, surface->pitch,
+                      SDL_PIXELFORMAT_RGBA32, page.view().data, 4 * surface->w);
+    check(page.writePng("sdl.png"), "a PNG");
     SDL_DestroyTexture(texture);
     SDL_DestroyRenderer(renderer);
     SDL_FreeSurface(surface);

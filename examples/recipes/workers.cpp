@@ -1,12 +1,12 @@
 // Many lines on all cores: a painter for each worker, and the bytes of a single one.
 #include <atomic>
 #include <cstring>
-#include <memory>
 #include <optional>
 #include <string>
 #include <thread>
 
-#include "line.h"
+#include "../shared/shaped_text.h"
+#include "recipe.h"
 
 using namespace VFontEffect;
 
@@ -16,13 +16,13 @@ using Pictures = std::vector<std::optional<Picture>>;
 
 /// The picture of each line. Workers share nothing but the number of the next line: each has a painter,
 /// which keeps its memory from line to line.
-Pictures paintAll(const Look& look, const std::vector<Glyphs>& lines, unsigned int workers) {
+Pictures paintAll(const Look& look, const std::vector<Line>& lines, unsigned int workers) {
     Pictures pictures(lines.size());
     std::atomic<std::size_t> next{0};
     const auto work = [&] {
         Painter painter(look);
         for (std::size_t i = next++; i < lines.size(); i = next++)
-            pictures[i] = painter.paint(lines[i]);
+            pictures[i] = painter.paint(lines[i].glyphs);
     };
     std::vector<std::thread> threads;
     for (unsigned int i = 0; i < workers; ++i)
@@ -47,22 +47,20 @@ int main() {
         .add(OuterGlow(10, rgb(0x00B8A9)).opacity(0.9F))
         .add(InnerGlow(5, rgb(0x00877C)));
 
-    std::vector<std::unique_ptr<Line>> lines;
-    std::vector<Glyphs> glyphs;
-    for (int i = 0; i < 24; ++i) {
-        lines.push_back(std::make_unique<Line>(("Line " + std::to_string(i + 1)).c_str(), 36));
-        glyphs.push_back(lines.back()->glyphs);
-    }
-    const Pictures serial = paintAll(look, glyphs, 1);
-    const Pictures parallel = paintAll(look, glyphs, 4);
+    const Font font(kFont, 36);
+    std::vector<Line> lines;
+    for (int i = 1; i <= 24; ++i)
+        lines.push_back(font.line("Line " + std::to_string(i)));
+    const Pictures serial = paintAll(look, lines, 1);
+    const Pictures parallel = paintAll(look, lines, 4);
 
-    Page page(720, 100, rgb(0x10303A));
+    Page page(720, 100, 0x10303A);
     for (std::size_t i = 0; i < serial.size(); ++i) {
         check(serial[i] && parallel[i], "all are painted");
         check(areSame(*serial[i], *parallel[i]), "the same bytes on four threads");
         const auto place = static_cast<int>(i);
         parallel[i]->layOver(page.view(), 15 + place % 4 * 178, 42 + place / 4 * 48);
     }
-    writePng("workers.png", page.view());
+    check(page.writePng("workers.png"), "a PNG");
     return 0;
 }

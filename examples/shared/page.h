@@ -15,6 +15,7 @@ class Page {
     }
 
     VFontEffect::PictureView view() { return {mPixels.data(), mWidth, mHeight}; }
+    const std::vector<unsigned char>& pixels() const { return mPixels; }  ///< R, G, B, A, packed rows
 
     /// Whether it could be written. Opaque pixels are straight ones, too.
     bool writePng(const char* path) const {
