@@ -20,7 +20,7 @@ python3 -B scripts/arrows.py
 database=build/sanitize
 [[ -f $database/compile_commands.json ]] || scripts/test.sh sanitize
 rooms=()
-for room in core simd property blend ops cores effect capi unicode style text tools; do
+for room in core simd property blend ops cores effect capi unicode style text compose tools bindings; do
     [[ ! -d $room ]] || rooms+=("$room")
 done
 printf '%s\n' "${sources[@]}" | grep -E "^($(IFS='|'; echo "${rooms[*]}"))/.*\.cpp\$" |

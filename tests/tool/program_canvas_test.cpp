@@ -9,7 +9,7 @@
 #include <string>
 #include <vector>
 
-#include "png_reader.h"
+#include "compose/system/png_reader.h"
 #include "program.h"
 
 namespace vorelpaint {
@@ -20,6 +20,7 @@ using vorel_test::Outcome;
 using vorel_test::readBytes;
 using vorel_test::runVorelpaint;
 using vorel_test::TempDir;
+using vorelcompose::readPng;
 using voreltext::Image;
 using Words = std::vector<std::string>;
 

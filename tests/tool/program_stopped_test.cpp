@@ -12,7 +12,7 @@
 #include <tuple>
 #include <vector>
 
-#include "png_reader.h"
+#include "compose/system/png_reader.h"
 #include "program.h"
 
 namespace vorelpaint {
@@ -25,6 +25,7 @@ using vorel_test::runVorelpaintIn;
 using vorel_test::runVorelpaintInto;
 using vorel_test::Surroundings;
 using vorel_test::TempDir;
+using vorelcompose::readPng;
 using Clock = std::chrono::steady_clock;
 using Words = std::vector<std::string>;
 
