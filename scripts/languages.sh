@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
-# The same look in five languages: builds the programs of examples/languages against what users install, runs each and
-# compares the pages that they have painted, byte for byte; the picture is that of docs/languages.md. The face of Java
-# is the one that scripts/android_test.sh builds.
+# The same look in six languages: builds the programs of examples/languages against what users install, runs each and
+# compares the pages that they have painted, byte for byte; the picture is that of docs/languages.md. The faces of
+# Java and of Python are those that scripts/android_test.sh and scripts/python.sh have built; else they are built now.
 #
 #     scripts/languages.sh [--update]    --update takes the picture into docs/languages instead of comparing it
 set -euo pipefail
@@ -21,6 +21,7 @@ rm -rf "$build"
 mkdir -p "$pages"
 prefix=$(install_library)
 quietly scripts/android_test.sh --build
+python=$(python_with_the_package)
 
 library=$(dirname "$(find "$prefix" -name libvoreleffect.so)")
 export PKG_CONFIG_PATH=$library/pkgconfig
@@ -43,6 +44,10 @@ in_c() {
     "$build/c" "$1"
 }
 
+in_python() {
+    "$python" -B "$programs/title.py" "$1"
+}
+
 in_java() {
     quietly javac -Xlint:all -Werror -cp "$classes" -d "$build/java" "$programs/Title.java"
     run_java "$build/java" Title "$1"
@@ -59,7 +64,7 @@ in_rust() {
     "$build/rust" "$1"
 }
 
-for language in cpp c java kotlin rust; do
+for language in cpp c python java kotlin rust; do
     "in_$language" "$pages/$language.rgba"
     cmp "$pages/cpp.rgba" "$pages/$language.rgba"
     echo "$language: $(sha256sum < "$pages/$language.rgba" | cut -c -16)"

@@ -26,7 +26,10 @@ quietly cmake --build "$build"
 
 rm -rf "$pictures"
 mkdir -p "$pictures"
+python=$(python_with_the_package)
 cd "$pictures"
+"$python" -B "$root/examples/recipes/numpy_pillow.py"
+echo "numpy_pillow: build/examples/recipe_pictures/numpy_pillow.png"
 for source in "$root"/examples/recipes/*.cpp; do
     recipe=$(basename "$source" .cpp)
     [[ $recipe != recipe ]] || continue
