@@ -3,6 +3,7 @@
 #   - a relative link or an anchor of a Markdown page leads nowhere,
 #   - the tables of keys in docs/style-files.md are behind the schema,
 #   - a block of C++ or C in one does not compile, or its program fails,
+#   - a block of Python fails,
 #   - a public name is not documented, or Doxygen warns of anything else,
 #   - a link of the finished site leads nowhere.
 set -euo pipefail
@@ -11,4 +12,6 @@ cd "$(dirname "$0")/.."
 
 need_packages doxygen g++ python3
 scripts/demo.sh > /dev/null # the library, with which the programs are linked
+[[ -x build/python-venv/bin/python ]] || scripts/python.sh > /dev/null # the package of Python
+build/python-venv/bin/python -B scripts/docs/python_blocks.py
 python3 -B scripts/docs/build.py "$PWD/build/demo" "$PWD/build/docs"

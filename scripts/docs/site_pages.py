@@ -16,7 +16,7 @@ NAVIGATION = [
                  "docs/effects/outer-glow.md", "docs/effects/inner-glow.md",
                  "docs/effects/linear-gradient.md", "docs/effects/radial-gradient.md",
                  "docs/effects/pattern.md"]),
-    ("Using it", ["docs/c.md", "docs/limits.md", "examples/README.md", "docs/android.md", "packaging/README.md",
+    ("Using it", ["docs/c.md", "docs/python.md", "bindings/python/README.md", "docs/limits.md", "examples/README.md", "docs/android.md", "packaging/README.md",
                   "docs/versioning.md", "docs/looks.md", "docs/vorelpaint.md", "docs/captions.md", "docs/film.md",
                   "docs/at-scale.md",
                   "docs/style-files.md", "docs/layer-styles.md"]),
