@@ -42,5 +42,4 @@ tests=$PWD/bindings/python/tests
 "$venv/bin/python" -m pytest -q -p no:cacheprovider "$tests"
 PYTHONDONTWRITEBYTECODE=1 "$venv/bin/python" examples/python/first_look.py build/python-dist
 PYTHONDONTWRITEBYTECODE=1 "$venv/bin/python" examples/python/at_scale.py "${VOREL_TITLES:-400}"
-PYTHONDONTWRITEBYTECODE=1 "$venv/bin/python" -B scripts/docs/python_blocks.py
 ls "$PWD/$dist"/*

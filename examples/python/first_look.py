@@ -37,7 +37,7 @@ picture.image().save(folder / "first_look_gold.png")
 # %%
 rows, columns = np.mgrid[:80, :80] - 39.5
 disc = (np.clip(38 - np.hypot(rows, columns), 0, 1) * 255).astype(np.uint8)
-badge = ve.Look().radial_gradient([("#fff4b0", 0), ("#d08000", 1)]).stroke(3, "#402000").outer_glow(12, "#ffb000")
+badge = ve.Look().radial_gradient([("#fff4b0", 0), ("#d08000", 1)]).outer_glow(12, "#ffb000").stroke(3, "#402000")
 painted = badge.paint(disc)
 print(painted.array.shape, painted.left, painted.top)
 painted.image().save(folder / "first_look_badge.png")
