@@ -2,7 +2,8 @@
 # Builds the site of the documents into build/docs/html. Fails, with a line for each fault, when
 #   - a relative link or an anchor of a Markdown page leads nowhere,
 #   - the tables of keys in docs/style-files.md are behind the schema,
-#   - a block of C++ or C in one does not compile, or its program fails,
+#   - a page has another number than is counted,
+#   - a block of C++ or C in one does not compile, or its program fails or adds an effect that is not seen,
 #   - a public name is not documented, or Doxygen warns of anything else,
 #   - a link of the finished site leads nowhere.
 set -euo pipefail

@@ -8,6 +8,7 @@ import sys
 from pathlib import Path
 
 from compiled import code_faults
+from counts import count_faults
 from links import link_faults
 from pages import ROOT, all_pages
 from site_pages import copy_pictures, site_faults, write_layout, write_pages
@@ -36,6 +37,7 @@ def main(library, folder):
     pages = all_pages()
     fail_on(link_faults(pages))
     fail_on(table_faults())
+    fail_on(count_faults())
     faults, blocks = code_faults(pages, library)
     fail_on(faults)
     shutil.rmtree(folder / "html", ignore_errors=True)
