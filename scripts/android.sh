@@ -19,7 +19,7 @@ build=${1:-build/android}
 libraries=()
 for abi in arm64-v8a x86_64; do
     cmake --preset "android-${abi%-v8a}" -B "$build/$abi"
-    cmake --build "$build/$abi"
+    cmake --build "$build/$abi" --target voreleffect voreleffect_jni
     rm -rf "$build/$abi/stage"
     cmake --install "$build/$abi" --prefix "$build/$abi/stage" --strip
     libraries+=(--libraries "$abi=$build/$abi/stage/lib")

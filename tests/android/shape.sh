@@ -37,7 +37,8 @@ check_library() {
 
 # build_form CPU : into $build, with stubs in $stubs
 build_form() {
-    local name compile=(clang-14 "--target=$1-linux-android24" -fPIC -fno-builtin -w)
+    local name
+    local compile=(clang-14 "--target=$1-linux-android24" "-DSTUBS_FOR_$1" -fPIC -fno-builtin -w)
     mkdir -p "$stubs"
     for name in c m log jnigraphics; do
         "${compile[@]}" -shared -nostdlib -fuse-ld=lld -Wl,-soname,"lib$name.so" "$sources/$name.c" \
@@ -50,7 +51,7 @@ build_form() {
 
     VOREL_CPU=$1 VOREL_STUBS=$stubs cmake -S tests/android/shape -B "$build" -G Ninja \
         -DCMAKE_BUILD_TYPE=Release -DCMAKE_TOOLCHAIN_FILE="$PWD/tests/android/shape/toolchain.cmake" > /dev/null
-    cmake --build "$build" --parallel 2 -- --quiet
+    cmake --build "$build" --parallel 2 --target voreleffect voreleffect_jni bitmap_recipe -- --quiet
     ninja -C "$build" -t cleandead > /dev/null # objects of sources that have gone
 }
 

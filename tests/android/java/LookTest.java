@@ -325,6 +325,13 @@ public final class LookTest extends Checks {
         }
     }
 
+    void testAnotherPatternTakesThePlaceOfTheFirst() {
+        Look one = BLUE.pattern(PATTERN, 2, 3, 1, 1).stroke(1, 2);
+        Look replaced = BLUE.pattern(PATTERN, 3, 2, 9, 0.5f).stroke(1, 2).pattern(PATTERN, 2, 3, 1, 1);
+        check(one.equals(replaced), "keys");
+        check(one.paint(RING).pixels().equals(replaced.paint(RING).pixels()), "pixels");
+    }
+
     void testPatternIsCopied() {
         int[] pixels = PATTERN.clone();
         Look look = BLUE.pattern(pixels, 3, 2, 1, 1);

@@ -6,8 +6,6 @@ set(CMAKE_SYSTEM_VERSION 1) # the version at which CMake asks for no NDK
 set(CMAKE_SYSTEM_PROCESSOR $ENV{VOREL_CPU})
 set(CMAKE_CXX_COMPILER clang++-14)
 set(CMAKE_CXX_COMPILER_TARGET $ENV{VOREL_CPU}-linux-android24)
-# Nothing runs: of optimisation only that matters what is called.
-set(CMAKE_CXX_FLAGS_RELEASE "-O1 -DNDEBUG" CACHE STRING "")
 set(CMAKE_TRY_COMPILE_TARGET_TYPE STATIC_LIBRARY)
 if("$ENV{VOREL_CPU}" STREQUAL "aarch64")
   set(c_headers "-isystem /usr/aarch64-linux-gnu/include")

@@ -2,7 +2,7 @@
    instruction set, which 64-bit ARM asks of the kernel. */
 #include "stub.h"
 
-#ifdef __x86_64__
+#ifdef STUBS_FOR_x86_64
 OBJECT(__cpu_model)
 OBJECT(__cpu_features2)
 #endif

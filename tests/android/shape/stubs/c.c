@@ -3,7 +3,7 @@
 FUNCTION(abort)
 FUNCTION(calloc)
 FUNCTION(free)
-#ifdef __aarch64__
+#ifdef STUBS_FOR_aarch64
 FUNCTION(getauxval) /* the level of the instruction set */
 #endif
 FUNCTION(malloc)
