@@ -48,6 +48,7 @@ def over_a_cluster(chunks, workers):
             if not lost and len(hashes) >= sum(map(len, chunks)) // 3:
                 os.kill(victim, signal.SIGKILL)
                 lost = 1
+        client.wait_for_workers(workers)  # the one that takes its place, too
         return hashes, lost
 
 

@@ -16,6 +16,8 @@ class Benches {
 
     using Bench = std::unique_ptr<vorelcompose::Workbench>;
 
+    Benches() { mKept.reserve(kMostKept); }
+
     Bench take() {
         const std::lock_guard<std::mutex> alone(mMutex);
         if (mKept.empty()) return std::make_unique<vorelcompose::Workbench>(mFonts);
@@ -23,12 +25,11 @@ class Benches {
         mKept.pop_back();
         return bench;
     }
+    /// Takes no memory.
     void giveBack(Bench bench) {
         const std::lock_guard<std::mutex> alone(mMutex);
         if (mKept.size() < kMostKept) mKept.push_back(std::move(bench));
     }
-
-    vorelcompose::SystemFontSource& fonts() { return mFonts; }
 
   private:
     vorelcompose::SystemFontSource mFonts;

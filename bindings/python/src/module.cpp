@@ -20,7 +20,7 @@ namespace py = pybind11;
 /// A new exception of the package, under the name that Python's own machinery finds it by.
 py::object exceptionOf(py::module_& module, const char* name, const py::handle& base, const char* doc) {
     const std::string full = std::string("voreleffect.") + name;
-    const auto made = py::reinterpret_steal<py::object>(
+    auto made = py::reinterpret_steal<py::object>(
         PyErr_NewExceptionWithDoc(full.c_str(), doc, base.ptr(), nullptr));
     if (!made) throw py::error_already_set();
     module.add_object(name, made);
@@ -40,7 +40,8 @@ void setError(PyObject* type, const char* what) {
     Py_DECREF(text);
 }
 
-void translate(std::exception_ptr thrown) {
+/// What pybind11 calls it with is a copy.
+void translate(std::exception_ptr thrown) {  // NOLINT(performance-unnecessary-value-param)
     try {
         if (thrown) std::rethrow_exception(thrown);
     } catch (const vorelstyle::StyleError& error) {

@@ -66,6 +66,7 @@ class SharedPainter {
     static std::vector<VFontEffect::Look> looksOf(
         const std::vector<std::shared_ptr<NativeLook>>& natives) {
         std::vector<VFontEffect::Look> looks;
+        looks.reserve(natives.size());
         for (const std::shared_ptr<NativeLook>& native : natives)
             looks.push_back(native->look);
         return looks;

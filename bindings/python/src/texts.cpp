@@ -275,6 +275,7 @@ py::tuple paintText(const py::dict& arguments, const py::object& look) {
 }  // namespace
 
 void defineTexts(py::module_& module) {
+    benches();  // made before there are threads
     module.def("paint_text", paintText);
     module.def("after_fork_in_child", [] { benches() = new Benches; });
 }

@@ -135,12 +135,19 @@ def test_a_forked_child_paints():
     expected = ve.text_picture("before", look="neon").array
     stop = threading.Event()
 
-    def busy():
-        while not stop.is_set():
-            ve.text_picture("busy", size=12)
+    def busy(first):
+        """Asks for fonts and families that were not asked for before, so that locks are held most of the time."""
+        for i in itertools.count(first):
+            if stop.is_set():
+                return
+            try:
+                ve.text_picture(chr(0x4E00 + i % 20000), size=9, font=f"No {i}" if i % 2 else "DejaVu Sans")
+            except ve.TextError:
+                pass
 
-    thread = threading.Thread(target=busy)
-    thread.start()
+    threads = [threading.Thread(target=busy, args=(7000 * first,)) for first in range(3)]
+    for thread in threads:
+        thread.start()
     try:
         for _ in range(8):
             child = os.fork()
@@ -156,7 +163,8 @@ def test_a_forked_child_paints():
             assert ended[0] == child and ended[1] == 0
     finally:
         stop.set()
-        thread.join()
+        for thread in threads:
+            thread.join()
 
 
 def resident():

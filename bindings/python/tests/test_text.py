@@ -1,3 +1,4 @@
+import inspect
 import json
 import os
 import pickle
@@ -268,6 +269,20 @@ def test_without_pillow_all_but_images_works():
             "except ImportError as e: print(e)")
     said = subprocess.run([sys.executable, "-c", code], check=True, capture_output=True, text=True).stdout
     assert "Pillow" in said
+
+
+def test_text_has_the_arguments_of_text_picture():
+    assert list(inspect.signature(ve.text).parameters) == list(inspect.signature(ve.text_picture).parameters)
+    assert ve.text.__name__ == "text" and "letter_spacing" in ve.text.__doc__
+
+
+def test_all_that_is_public_is_documented():
+    for name in ve.__all__:
+        public = getattr(ve, name)
+        assert inspect.getdoc(public), name
+        for member in vars(public) if inspect.isclass(public) else ():
+            if not member.startswith("_") and callable(getattr(public, member)):
+                assert inspect.getdoc(getattr(public, member)), f"{name}.{member}"
 
 
 def test_the_package_names_its_version():

@@ -14,6 +14,11 @@ pixels: npt.NDArray[np.uint8] = picture.array
 box: ve.Box = look.paint(mask, onto=pixels, x=1, order="bgra")
 margins: ve.Margins = ve.Painter(look).margins
 text: ve.TextPicture = ve.text_picture("Hello", look="neon", font=["DejaVu Sans"], letter_spacing="5%")
+image = ve.text("Hello", size=20, look=[look], align="center")
+ve.text("Hello", sise=20)  # type: ignore[call-arg]
+ve.text_picture("Hello", align="middle")  # type: ignore[arg-type]
+look.stroke(4)  # type: ignore[call-arg]
+look.stroke(4, "#fff", position="beside")  # type: ignore[arg-type]
 key: bytes = text.key
 names: list[str] = ve.presets()
 style: ve.Style = ve.Style.from_json({"color": "#fff"})

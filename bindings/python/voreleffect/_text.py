@@ -2,8 +2,9 @@
 
 from __future__ import annotations
 
+import functools
 import os
-from collections.abc import Iterable, Mapping, Sequence
+from collections.abc import Callable, Iterable, Mapping, Sequence
 from typing import TYPE_CHECKING, Any, Literal, Union
 
 from . import _voreleffect as native
@@ -14,6 +15,9 @@ from ._values import Box, Color, Margins, color, number, spelled
 
 if TYPE_CHECKING:
     import PIL.Image
+    from typing_extensions import ParamSpec
+
+    Arguments = ParamSpec("Arguments")
 
 Font = Union[str, "os.PathLike[str]"]
 #: A look, a stack of looks with the last on top, a style, or the name of a preset.
@@ -155,9 +159,17 @@ def text_picture(
 _color = color
 
 
-def text(text: str, **options: Any) -> PIL.Image.Image:
-    """Paints a text: a straight image of Pillow, mode RGBA. The arguments are those of text_picture.
+def _as_image(picture: Callable[Arguments, TextPicture]) -> Callable[Arguments, PIL.Image.Image]:
+    """The same call, which returns the image alone."""
 
-    Raises what text_picture raises, and ImportError without Pillow.
-    """
-    return text_picture(text, **options).image()
+    @functools.wraps(picture)
+    def text(*args: Arguments.args, **kwargs: Arguments.kwargs) -> PIL.Image.Image:
+        return picture(*args, **kwargs).image()
+
+    text.__name__ = text.__qualname__ = "text"
+    text.__doc__ = ("Paints a text: a straight image of Pillow, mode RGBA. Raises ImportError without Pillow.\n\n"
+                    f"As text_picture: {picture.__doc__}")
+    return text
+
+
+text = _as_image(text_picture)
