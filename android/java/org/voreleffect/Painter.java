@@ -99,8 +99,7 @@ public final class Painter implements AutoCloseable {
      * @param x -2^30 to 2^30
      * @param y -2^30 to 2^30
      * @return the box that holds all that was touched; an empty one when there is nothing to paint, or
-     *     none
-     *     of it lies within the view
+     *     none of it lies within the view
      */
     @NonNull
     public synchronized Box paint(
