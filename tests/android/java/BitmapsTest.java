@@ -52,6 +52,13 @@ public final class BitmapsTest extends Checks {
         unlocked(none, 0);
     }
 
+    void testPainterThatTheListOfGlyphsClosesIsRefused() {
+        Painter painter = new Painter(LOOK);
+        Bitmap bitmap = page(0);
+        misplaced(() -> VorelBitmaps.paint(painter, closing(painter, BLOCK), bitmap, 0, 0));
+        unlocked(bitmap, 0);
+    }
+
     void testPictureIsLaidOverABitmap() {
         Picture picture = LOOK.paint(BLOCK);
         Bitmap painted = page(8);

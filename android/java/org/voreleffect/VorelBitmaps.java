@@ -39,8 +39,8 @@ public final class VorelBitmaps {
         if (painter == null) throw new IllegalArgumentException("painter: null");
         int[] touched = new int[4];
         synchronized (painter) {
-            long address = painter.address();
             Glyph.Run run = new Glyph.Run(glyphs);
+            long address = painter.address(); // the list, a caller's, may have closed it
             checkTarget(bitmap, x, y);
             nativePaint(painter, address, run.numbers, run.coverage, bitmap, x, y, touched);
         }
