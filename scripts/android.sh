@@ -8,6 +8,7 @@
 # Prints where the AAR and the repository are.
 set -euo pipefail
 cd "$(dirname "$0")/.."
+. scripts/quietly.sh
 
 ndk=${ANDROID_NDK_HOME:-}
 if [[ ! -f $ndk/build/cmake/android.toolchain.cmake || ! -f $ndk/source.properties ]]; then
@@ -34,8 +35,8 @@ scripts/pack_aar.py --version "$version" \
     "${libraries[@]}" --output "$archive"
 
 rm -rf "$build/javadoc" "$build/maven"
-javadoc -quiet -notimestamp -encoding UTF-8 --release 8 -Xdoclint:none -windowtitle "voreleffect $version" \
-    --source-path "android/java:android/stubs" -d "$build/javadoc" org.voreleffect 2> /dev/null
+quietly javadoc -quiet -notimestamp -encoding UTF-8 --release 8 -Xdoclint:none \
+    -windowtitle "voreleffect $version" --source-path "android/java:android/stubs" -d "$build/javadoc" org.voreleffect
 scripts/pack_maven.py --version "$version" --aar "$archive" --sources android/java \
     --javadoc "$build/javadoc" --output "$build/maven"
 echo "$archive"

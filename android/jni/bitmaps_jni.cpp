@@ -16,20 +16,16 @@ using namespace voreljni;
 
 namespace {
 
-/// How the alpha of a bitmap is meant: two bits of its flags from API 30 on, 0 before, when all bitmaps
-/// of four bytes were premultiplied or opaque.
-constexpr uint32_t kAlphaMask = 3;
-constexpr uint32_t kUnpremultiplied = 2;
-/// Of API 30 and newer: the pixels are on the graphics card.
+/// A flag of API 30 and newer: the pixels are on the graphics card.
 constexpr uint32_t kHardware = 0x80000000U;
 
-/// Why a bitmap cannot be painted on; null when it can.
+/// Why a bitmap cannot be painted on; null when it can. That it is mutable and premultiplied the Java
+/// side has seen, which older versions of Android do not tell here.
 const char* faultOf(const AndroidBitmapInfo& info) {
     constexpr uint32_t kMost = 0x7FFFFFFF;
     if (info.format != ANDROID_BITMAP_FORMAT_RGBA_8888)
         return "bitmap: not of the configuration ARGB_8888";
     if ((info.flags & kHardware) != 0) return "bitmap: of the configuration HARDWARE";
-    if ((info.flags & kAlphaMask) == kUnpremultiplied) return "bitmap: not premultiplied";
     if (info.width > kMost / 4 || info.height > kMost || info.stride < uint64_t{info.width} * 4)
         return "bitmap: of a size or a stride that there is not";
     return nullptr;

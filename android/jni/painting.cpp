@@ -35,12 +35,12 @@ GlyphNumbers nextGlyph(Numbers& numbers) {
     return told;
 }
 
-/// How many bytes of arrays the glyphs have.
-std::size_t arrayBytes(Numbers numbers, jsize count) {
-    std::size_t bytes = 0;
+/// How many bytes of arrays the glyphs have: more than there is memory for when many show one array.
+int64_t arrayBytes(Numbers numbers, jsize count) {
+    int64_t bytes = 0;
     for (jsize i = 0; i < count; ++i) {
         const GlyphNumbers told = nextGlyph(numbers);
-        if (told.kind == kBytes) bytes += static_cast<std::size_t>(told.bytes);
+        if (told.kind == kBytes) bytes += told.bytes;
     }
     return bytes;
 }
@@ -78,7 +78,12 @@ bool JavaPainter::take(JNIEnv* env, jintArray numbers, jobjectArray memory) {
     const jsize count = env->GetArrayLength(memory);
     glyphs.clear();
     glyphs.reserve(static_cast<std::size_t>(count));
-    coverage.resize(arrayBytes(told, count));
+    const auto needed = static_cast<uint64_t>(arrayBytes(told, count));
+    if (needed > coverage.max_size()) {
+        throwOutOfMemory(env, "coverage");
+        return false;
+    }
+    coverage.resize(static_cast<std::size_t>(needed));
     unsigned char* room = coverage.data();
     for (jsize i = 0; i < count; ++i) {
         GlyphNumbers next = nextGlyph(told);

@@ -81,7 +81,8 @@ class GlyphCache {
     /// glyph; for one that runs through a line, paint and cache the line.
     Picture paint(Painter& painter, unsigned index, int pixels) {
         FT_Set_Pixel_Sizes(mFace, 0, static_cast<unsigned>(pixels));
-        if (FT_Load_Glyph(mFace, index, FT_LOAD_RENDER | FT_LOAD_NO_HINTING) != 0) return {};
+        constexpr FT_Int32 kFlags = FT_LOAD_RENDER | FT_LOAD_NO_HINTING | FT_LOAD_NO_BITMAP;
+        if (FT_Load_Glyph(mFace, index, kFlags) != 0) return {};
         const FT_GlyphSlot slot = mFace->glyph;
         const FT_Bitmap& bitmap = slot->bitmap;
         const Glyph glyph = {slot->bitmap_left,

@@ -1,6 +1,7 @@
 // Frames into FFmpeg, through pipes: words whose glow pulses, stored with their alpha and laid over a
 // film.
 #include <algorithm>
+#include <csignal>
 #include <cstdio>
 #include <string>
 
@@ -51,6 +52,7 @@ Frame straight(Frame frame) {
 bool pipeInto(const std::string& command, const std::vector<Frame>& frames) {
     std::FILE* pipe = popen(command.c_str(), "w");
     if (pipe == nullptr) return false;
+    std::signal(SIGPIPE, SIG_IGN);  // a command that ends early would end this program, too
     std::size_t written = 0;
     for (const Frame& frame : frames)
         written += std::fwrite(frame.data(), frame.size(), 1, pipe);
@@ -101,6 +103,7 @@ int main() {
     check(pipeInto(kStore, stored), "a film with alpha");
     check(framesOf("frames.mov") == stored, "the film holds the frames");
 
+    check(!pipeInto("false", frames), "a command that fails is told of");
     check(pipeInto(kOver, frames), "a film with words over it");
     checkLaid(line, framesOf("over.mov"));
     return 0;

@@ -54,5 +54,9 @@ def main():
     assert np.abs(np.asarray(image).astype(int) - array).max() <= 2, "as on the array"
     image.save("numpy_pillow.png")
 
+    blank = image.copy()
+    on_image(blank, look, [mask_of(" ", ImageFont.truetype(FONT, 72))], 20, 80)
+    assert blank == image, "a blank leaves the image as it was"
+
 
 main()

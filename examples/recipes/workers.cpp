@@ -1,4 +1,5 @@
 // Many lines on all cores: a painter for each worker, and the bytes of a single one.
+#include <algorithm>
 #include <atomic>
 #include <cstring>
 #include <optional>
@@ -15,7 +16,7 @@ namespace {
 using Pictures = std::vector<std::optional<Picture>>;
 
 /// The picture of each line. Workers share nothing but the number of the next line: each has a painter,
-/// which keeps its memory from line to line.
+/// which keeps its memory from line to line. There is one at least: hardware_concurrency() may tell 0.
 Pictures paintAll(const Look& look, const std::vector<Line>& lines, unsigned int workers) {
     Pictures pictures(lines.size());
     std::atomic<std::size_t> next{0};
@@ -25,7 +26,7 @@ Pictures paintAll(const Look& look, const std::vector<Line>& lines, unsigned int
             pictures[i] = painter.paint(lines[i].glyphs);
     };
     std::vector<std::thread> threads;
-    for (unsigned int i = 0; i < workers; ++i)
+    for (unsigned int i = 0; i < std::max(1U, workers); ++i)
         threads.emplace_back(work);
     for (std::thread& thread : threads)
         thread.join();
@@ -51,7 +52,7 @@ int main() {
     std::vector<Line> lines;
     for (int i = 1; i <= 24; ++i)
         lines.push_back(font.line("Line " + std::to_string(i)));
-    const Pictures serial = paintAll(look, lines, 1);
+    const Pictures serial = paintAll(look, lines, 0);
     const Pictures parallel = paintAll(look, lines, 4);
 
     Page page(720, 100, 0x10303A);

@@ -26,7 +26,7 @@ class Font {
         if (FT_Init_FreeType(&mLibrary) != 0 || FT_New_Face(mLibrary, file, 0, &mFace) != 0) return;
         mIsReady = FT_Set_Pixel_Sizes(mFace, 0, static_cast<FT_UInt>(pixels)) == 0;
         mShaped = hb_ft_font_create_referenced(mFace);
-        hb_ft_font_set_load_flags(mShaped, FT_LOAD_NO_HINTING);
+        hb_ft_font_set_load_flags(mShaped, kOutlines);
     }
     Font(const Font&) = delete;
     Font& operator=(const Font&) = delete;
@@ -61,12 +61,15 @@ class Font {
     }
 
   private:
+    /// Bitmaps, which some fonts have for small sizes, have one bit a pixel.
+    static constexpr FT_Int32 kOutlines = FT_LOAD_NO_HINTING | FT_LOAD_NO_BITMAP;
+
     /// HarfBuzz and FreeType count in 64ths of a pixel.
     static int wholePixels(long sixtyFourths) { return static_cast<int>((sixtyFourths + 32) >> 6); }
 
     /// Draws a glyph whose pen is at (x, y), y upwards.
     void draw(Line& line, unsigned index, long x, long y) const {
-        if (FT_Load_Glyph(mFace, index, FT_LOAD_RENDER | FT_LOAD_NO_HINTING) != 0) return;
+        if (FT_Load_Glyph(mFace, index, FT_LOAD_RENDER | kOutlines) != 0) return;
         const FT_GlyphSlot slot = mFace->glyph;
         const FT_Bitmap& bitmap = slot->bitmap;
         const std::size_t bytes = static_cast<std::size_t>(bitmap.pitch) * bitmap.rows;

@@ -35,9 +35,9 @@ check_library() {
     done
 }
 
-# build_form CPU : into $build, with stubs in $stubs
+# build_form CPU TARGET... : into $build, with stubs in $stubs
 build_form() {
-    local name
+    local name targets=("${@:2}")
     local compile=(clang-14 "--target=$1-linux-android24" "-DSTUBS_FOR_$1" -fPIC -fno-builtin -w)
     mkdir -p "$stubs"
     for name in c m log jnigraphics; do
@@ -51,18 +51,21 @@ build_form() {
 
     VOREL_CPU=$1 VOREL_STUBS=$stubs cmake -S tests/android/shape -B "$build" -G Ninja \
         -DCMAKE_BUILD_TYPE=Release -DCMAKE_TOOLCHAIN_FILE="$PWD/tests/android/shape/toolchain.cmake" > /dev/null
-    cmake --build "$build" --parallel 2 --target voreleffect voreleffect_jni bitmap_recipe -- --quiet
+    cmake --build "$build" --parallel 2 --target "${targets[@]}" -- --quiet
     ninja -C "$build" -t cleandead > /dev/null # objects of sources that have gone
 }
 
-check_form() {
-    local library native recipe exported objects outside shared runtime name
-    library=$build/voreleffect/libvoreleffect.so
-    native=$build/voreleffect/android/libvoreleffect_jni.so
-    check_library "$library" libc.so libm.so liblog.so
-    check_library "$native" libvoreleffect.so libc.so libjnigraphics.so
-    recipe=$build/libbitmap_recipe.so
+# check_users : what is linked with the library
+check_users() {
+    local recipe=$build/libbitmap_recipe.so
+    check_library "$build/voreleffect/android/libvoreleffect_jni.so" libvoreleffect.so libc.so libjnigraphics.so
     same "$recipe: NEEDED" "$(lines libvoreleffect.so libjnigraphics.so libc.so)" "$(dynamic "$recipe" NEEDED)"
+}
+
+check_form() {
+    local library exported objects outside shared runtime name
+    library=$build/voreleffect/libvoreleffect.so
+    check_library "$library" libc.so libm.so liblog.so
     # clang makes no constructor of a whole object for the abstract classes: nothing could call it.
     exported=$(grep -vE 'VFPropertyC1Ejf$|VFECoreBaseC1Ev$' tests/abi/symbols.txt)
     same "$library: exported symbols" "$exported" "$(names --dynamic --defined-only "$library")"
@@ -82,12 +85,16 @@ check_form() {
     echo "C++ runtime, linked in: $(names --defined-only "$stubs"/{cxx_static,builtins}.o | llvm-cxxfilt-14 | paste -sd ';' | sed 's/;/; /g')"
 }
 
+# What uses the library has no code for one kind of CPU: once is enough.
+users=(voreleffect_jni bitmap_recipe)
 for cpu in aarch64 x86_64; do
     build=build/android_shape/$cpu
     stubs=$PWD/$build/stubs
-    build_form "$cpu"
+    build_form "$cpu" voreleffect "${users[@]}"
     echo "$cpu:"
     check_form
+    [[ ${#users[@]} -eq 0 ]] || check_users
+    users=()
 done
 [[ $failed -eq 0 ]] && echo "the Android form has its shape"
 exit "$failed"

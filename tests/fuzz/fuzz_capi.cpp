@@ -1,6 +1,7 @@
 /// Any sequence of calls of the C face: looks, painters and pictures with null pointers, odd sizes and
 /// strides, and views within buffers that hold exactly their bytes. A finding is whatever a sanitizer
-/// reports, a call that fails and changes something, or one that paints beyond what it says.
+/// reports, a call that fails and changes something, one that paints beyond what it says, that says of
+/// another box than the margins make of the glyphs, or that paints otherwise where a view ends.
 #include <voreleffect/voreleffect_c.h>
 
 #include <algorithm>
@@ -50,6 +51,94 @@ struct Line {
 
     const vorel_glyph* data() const { return isNull ? nullptr : glyphs.data(); }
 };
+
+/// A box whose sides may lie beyond an int.
+struct Reach {
+    int64_t left = 0;
+    int64_t top = 0;
+    int64_t right = 0;
+    int64_t bottom = 0;
+
+    bool isEmpty() const { return right <= left || bottom <= top; }
+    /// Makes it hold the other one, too.
+    void add(const Reach& other) {
+        if (other.isEmpty()) return;
+        *this = isEmpty() ? other
+                          : Reach{std::min(left, other.left), std::min(top, other.top),
+                                  std::max(right, other.right), std::max(bottom, other.bottom)};
+    }
+    /// With the margins, moved; empty when it was.
+    Reach with(const vorel_margins& margins, int32_t x, int32_t y) const {
+        if (isEmpty()) return {};
+        return {left - margins.left + x, top - margins.top + y, right + margins.right + x,
+                bottom + margins.bottom + y};
+    }
+    Reach within(const Rows& rows) const {
+        const Reach both = {std::max<int64_t>(left, 0), std::max<int64_t>(top, 0),
+                            std::min<int64_t>(right, rows.width),
+                            std::min<int64_t>(bottom, rows.height)};
+        return both.isEmpty() ? Reach{} : both;
+    }
+    bool isThat(const Reach& other) const {
+        return left == other.left && top == other.top && right == other.right && bottom == other.bottom;
+    }
+    bool isThat(const vorel_box& box) const {
+        return isThat(Reach{box.left, box.top, box.right, box.bottom});
+    }
+};
+
+Reach reachOf(const Line& line) {
+    Reach all;
+    for (const vorel_glyph& glyph : line.glyphs) {
+        const int64_t x = glyph.x;
+        const int64_t y = glyph.y;
+        all.add({x, y, x + glyph.width, y + glyph.height});
+    }
+    return all;
+}
+
+/// What the looks touch of a page, each by its own margins.
+Reach touchedBy(const std::vector<vorel_look*>& looks, const Line& line, const Rows& page, int32_t x,
+                int32_t y) {
+    Reach all;
+    for (const vorel_look* look : looks) {
+        vorel_margins margins = {};
+        require(vorel_look_margins(look, &margins) == VOREL_OK);
+        all.add(reachOf(line).with(margins, x, y).within(page));
+    }
+    return all;
+}
+
+/// How much wider a framed page is on each side.
+constexpr int kFrame = 5;
+
+/// The page, which is readable, within a larger one that is clear around it.
+Rows framed(const Rows& page) {
+    Rows larger;
+    larger.width = page.width + 2 * kFrame;
+    larger.height = page.height + 2 * kFrame;
+    larger.bytes.resize(size_t{4} * static_cast<size_t>(larger.width) *
+                        static_cast<size_t>(larger.height));
+    const ptrdiff_t step = page.stride == 0 ? ptrdiff_t{4} * page.width : page.stride;
+    for (int y = 0; y < page.height; ++y) {
+        const auto row = page.bytes.begin() + y * step;
+        std::copy_n(row, 4 * page.width,
+                    larger.bytes.begin() + 4 * ((y + kFrame) * larger.width + kFrame));
+    }
+    return larger;
+}
+
+/// Whether the page is what stands in the frame.
+bool standsIn(const Rows& frame, const Rows& page) {
+    const ptrdiff_t step = page.stride == 0 ? ptrdiff_t{4} * page.width : page.stride;
+    for (int y = 0; y < page.height; ++y) {
+        const auto row = page.bytes.begin() + y * step;
+        if (!std::equal(row, row + 4 * page.width,
+                        frame.bytes.begin() + 4 * ((y + kFrame) * frame.width + kFrame)))
+            return false;
+    }
+    return true;
+}
 
 class Caller {
   public:
@@ -179,7 +268,7 @@ class Caller {
     static void requireTouched(const Rows& before, const Rows& after, vorel_status status,
                                const vorel_box& touched) {
         if (status != VOREL_OK || touched.right == 0) {
-            require(before.bytes == after.bytes);
+            require(before.bytes == after.bytes && Reach{}.isThat(touched));
             return;
         }
         require(0 <= touched.left && touched.left < touched.right && touched.right <= after.width);
@@ -193,6 +282,13 @@ class Caller {
                                   column < ptrdiff_t{4} * touched.right;
             require(isInside || before.bytes[i] == after.bytes[i]);
         }
+    }
+
+    /// Where the picture lies, from the origin of its text.
+    Reach pictureReach() const {
+        const int64_t left = vorel_picture_left(mPicture);
+        const int64_t top = vorel_picture_top(mPicture);
+        return {left, top, left + vorel_picture_width(mPicture), top + vorel_picture_height(mPicture)};
     }
 
     Decoder mIn;
@@ -325,7 +421,7 @@ void Caller::makePainter() {
     mPainter = painter;
 }
 
-/// Painted by a painter, and once: the same.
+/// Painted by a painter, and once: the same. So is what a larger page shows.
 void Caller::paintView() {
     if (++mPaints > kMostPaints) return;
     const std::vector<vorel_look*> looks = stack();
@@ -340,18 +436,24 @@ void Caller::paintView() {
     const vorel_status status =
         vorel_paint(looks.data(), looks.size(), line.data(), line.glyphs.size(), &view, x, y, &touched);
     requireTouched(before, once, status, touched);
+    require(status != VOREL_OK || touchedBy(looks, line, before, x, y).isThat(touched));
 
     vorel_painter* painter = nullptr;
     if (vorel_painter_new(looks.data(), looks.size(), &painter) != VOREL_OK) {
         require(status == VOREL_BAD_ARGUMENT);
         return;
     }
-    for (int times = 0; times < 2; ++times) {
-        Rows again = before;
-        const vorel_view same = viewOf(again, bytes);
-        require(vorel_painter_paint(painter, line.data(), line.glyphs.size(), &same, x, y, nullptr) ==
-                status);
-        require(again.bytes == once.bytes);
+    Rows again = before;
+    const vorel_view same = viewOf(again, bytes);
+    require(vorel_painter_paint(painter, line.data(), line.glyphs.size(), &same, x, y, nullptr) ==
+            status);
+    require(again.bytes == once.bytes);
+    if (status == VOREL_OK && before.isReadable && std::max(x, y) <= INT_MAX - kFrame) {
+        Rows frame = framed(before);
+        const vorel_view larger = viewOf(frame, bytes);
+        require(vorel_painter_paint(painter, line.data(), line.glyphs.size(), &larger, x + kFrame,
+                                    y + kFrame, nullptr) == VOREL_OK);
+        require(standsIn(frame, once));
     }
     vorel_painter_free(painter);
 }
@@ -371,6 +473,9 @@ void Caller::paintPicture() {
     const int32_t width = vorel_picture_width(picture);
     require(vorel_picture_stride(picture) == 4 * width);
     require((pixels == nullptr) == (width == 0));
+    vorel_margins margins = {};
+    require(vorel_painter_margins(mPainter, &margins) == VOREL_OK);
+    require(width == 0 || pictureReach().isThat(reachOf(line).with(margins, 0, 0)));
 }
 
 void Caller::layPicture() {
@@ -382,6 +487,7 @@ void Caller::layPicture() {
     vorel_box touched = {};
     const vorel_status status = vorel_picture_lay_over(mPicture, &view, x, y, &touched);
     requireTouched(before, after, status, touched);
+    require(status != VOREL_OK || pictureReach().with({}, x, y).within(before).isThat(touched));
     vorel_view own = {};
     require((vorel_picture_view(mPicture, &own) == VOREL_OK) == (mPicture != nullptr));
 }

@@ -32,8 +32,8 @@ using Words = std::vector<std::string>;
 /// Between two looks whether a program writes: short beside the writing, long beside a look.
 constexpr std::chrono::microseconds kLook{200};
 
-/// How often each signal stops each program: once, for all signals take one way, and VOREL_STOPS times to
-/// look for what is rare.
+/// How often each signal stops each program: once, for all signals take one way, and VOREL_STOPS times
+/// to look for what is rare.
 int stopsAskedFor() {
     const char* asked = std::getenv("VOREL_STOPS");
     return asked != nullptr ? std::max(1, std::atoi(asked)) : 1;

@@ -251,3 +251,11 @@ def test_an_image_of_a_picture_is_straight():
     image = ve.Look().fill((200, 100, 0)).paint(np.array([[255, 0]], np.uint8)).image()
     assert image.mode == "RGBA" and image.getpixel((0, 0)) == (200, 100, 0, 255)
     assert image.getpixel((1, 0))[3] == 0
+
+
+def test_an_image_of_an_empty_picture_is_empty_and_changes_no_other():
+    image = ve.Look().paint([]).image()
+    assert (image.mode, image.size) == ("RGBA", (0, 0))
+    page = PIL.Image.new("RGBA", (4, 4), (1, 2, 3, 255))
+    page.alpha_composite(image, (2, 2))
+    assert page.getcolors() == [(16, (1, 2, 3, 255))]

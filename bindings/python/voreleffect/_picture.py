@@ -23,6 +23,8 @@ def image_of(array: Array, mode: str) -> PIL.Image.Image:
     except ImportError as error:
         raise ImportError("images need Pillow; the array of the picture does without") from error
     height, width = array.shape[:2]
+    if height == 0 or width == 0:
+        return PIL.Image.new(mode, (width, height))  # Pillow reads no buffer without pixels
     return PIL.Image.frombuffer(mode, (width, height), array, "raw", mode, 0, 1)
 
 

@@ -52,6 +52,13 @@ public final class BitmapsTest extends Checks {
         unlocked(none, 0);
     }
 
+    void testPainterThatTheListOfGlyphsClosesIsRefused() {
+        Painter painter = new Painter(LOOK);
+        Bitmap bitmap = page(0);
+        misplaced(() -> VorelBitmaps.paint(painter, closing(painter, BLOCK), bitmap, 0, 0));
+        unlocked(bitmap, 0);
+    }
+
     void testPictureIsLaidOverABitmap() {
         Picture picture = LOOK.paint(BLOCK);
         Bitmap painted = page(8);
@@ -77,6 +84,8 @@ public final class BitmapsTest extends Checks {
                 check(Arrays.equals(row, expected), "row " + y);
             }
         }
+        Bitmap far = VorelBitmaps.bitmapOf(LOOK.paint(BLOCK.at(Integer.MAX_VALUE, Integer.MIN_VALUE + 64)));
+        check(Arrays.equals(bytes(far), bytes(VorelBitmaps.bitmapOf(picture))), "of far glyphs");
         refused(() -> VorelBitmaps.bitmapOf(LOOK.paint(Arrays.<Glyph>asList())));
     }
 
@@ -95,7 +104,7 @@ public final class BitmapsTest extends Checks {
 
     void testOpaqueBitmapIsPaintedOn() {
         Bitmap bitmap = page(0);
-        bitmap.flags = 1; // its alpha is not looked at
+        bitmap.flags = Bitmap.OPAQUE; // its alpha is not looked at
         check(!VorelBitmaps.paint(LOOK, GLYPHS, bitmap, 0, 0).isEmpty(), "nothing was painted");
     }
 
@@ -103,7 +112,9 @@ public final class BitmapsTest extends Checks {
         Bitmap otherFormat = page(0);
         otherFormat.format = 4; // RGB_565
         Bitmap straight = page(0);
-        straight.flags = 2;
+        straight.flags = Bitmap.STRAIGHT;
+        Bitmap immutable = page(0);
+        immutable.isMutable = false;
         Bitmap hardware = page(0);
         hardware.flags = 0x80000000;
         Bitmap withoutInfo = page(0);
@@ -122,7 +133,7 @@ public final class BitmapsTest extends Checks {
         Bitmap failing = page(0);
         failing.lockResult = JNI_EXCEPTION;
         for (Bitmap bitmap :
-                Arrays.asList(otherFormat, straight, hardware, withoutInfo, narrow, withoutStride, huge,
+                Arrays.asList(otherFormat, straight, immutable, hardware, withoutInfo, narrow, withoutStride, huge,
                         negative, locked, failing)) {
             refused(() -> VorelBitmaps.paint(LOOK, GLYPHS, bitmap, 0, 0));
             refused(() -> VorelBitmaps.layOver(LOOK.paint(BLOCK), bitmap, 0, 0));

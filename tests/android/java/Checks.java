@@ -5,6 +5,10 @@ import java.lang.reflect.Method;
 import java.nio.file.Files;
 import java.nio.file.Paths;
 import java.io.IOException;
+import java.util.AbstractList;
+import java.util.List;
+import org.voreleffect.Glyph;
+import org.voreleffect.Painter;
 
 /** What the tests of the Java side share. Each method whose name starts with "test" is a test. */
 abstract class Checks {
@@ -47,6 +51,22 @@ abstract class Checks {
 
     static void check(boolean holds, String what) {
         if (!holds) throw new AssertionError(what);
+    }
+
+    /** One glyph in a list that closes the painter when it is asked for it. */
+    static List<Glyph> closing(Painter painter, Glyph glyph) {
+        return new AbstractList<Glyph>() {
+            @Override
+            public Glyph get(int index) {
+                painter.close();
+                return glyph;
+            }
+
+            @Override
+            public int size() {
+                return 1;
+            }
+        };
     }
 
     /** Collects, and waits for the thread that queues what was found: under load it runs late. */

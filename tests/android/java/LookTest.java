@@ -529,6 +529,18 @@ public final class LookTest extends Checks {
         painter.close();
     }
 
+    void testPainterThatTheListOfGlyphsClosesIsRefused() {
+        for (boolean isOnAPage : new boolean[] {true, false}) {
+            Painter painter = new Painter(EVERYTHING);
+            List<Glyph> closing = closing(painter, RING);
+            PictureView page = PictureView.of(new int[WIDTH * HEIGHT], WIDTH, HEIGHT);
+            misplaced(() -> {
+                if (isOnAPage) painter.paint(closing, page, 0, 0);
+                else painter.paint(closing);
+            });
+        }
+    }
+
     void testClosingFromOtherThreadsEndsInARefusal() throws InterruptedException {
         for (int round = 0; round < 30; ++round) {
             Painter painter = new Painter(EVERYTHING);

@@ -594,6 +594,36 @@ TEST(LookViews, TouchedBox_IsThatOfTheMarginsWithinTheView) {
     ASSERT_TRUE(touched);
     EXPECT_EQ(touched->top, 0);
     EXPECT_EQ(touched->right, 50);
+    // A single column of the layer is seen.
+    touched = paint(look, squareText(49 + margins.left, 20, 6).glyphs(), page.view());
+    ASSERT_TRUE(touched);
+    EXPECT_EQ(touched->left, 49);
+    EXPECT_EQ(touched->right, 50);
+}
+
+TEST(LookViews, TouchedBox_HoldsEveryPixelThatChanges) {
+    for (int seed = 0; seed < thinned(400); ++seed) {
+        SCOPED_TRACE("seed " + std::to_string(seed));
+        Random random(static_cast<uint64_t>(seed) + 300'000);
+        const TwoLooks a = randomLook(random);
+        const TwoLooks b = randomLook(random);
+        const Text text = randomText(random);
+        Page page = randomPage(random, random.between(1, 40), random.between(1, 40));
+        const Page before = page;
+        const int x = random.between(-60, 60);
+        const int y = random.between(-60, 60);
+        const auto touched = paint({a.look, b.look}, text.glyphs(), page.view(), x, y);
+        ASSERT_TRUE(touched);
+        for (int row = 0; row < page.height; ++row) {
+            for (int column = 0; column < page.width; ++column) {
+                const bool isTouched = column >= touched->left && column < touched->right &&
+                                       row >= touched->top && row < touched->bottom;
+                ASSERT_TRUE(isTouched ||
+                            std::memcmp(before.at(column, row), page.at(column, row), 4) == 0)
+                    << column << ", " << row;
+            }
+        }
+    }
 }
 
 TEST(LookViews, GlyphsElsewhere_AreNothingToPaint) {

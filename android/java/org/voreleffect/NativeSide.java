@@ -32,7 +32,7 @@ abstract class NativeSide extends PhantomReference<Object> {
     }
 
     /** Takes what was made for the owner. */
-    final void hold(long made) {
+    final synchronized void hold(long made) {
         address = made;
     }
 

@@ -99,14 +99,13 @@ public final class Painter implements AutoCloseable {
      * @param x -2^30 to 2^30
      * @param y -2^30 to 2^30
      * @return the box that holds all that was touched; an empty one when there is nothing to paint, or
-     *     none
-     *     of it lies within the view
+     *     none of it lies within the view
      */
     @NonNull
     public synchronized Box paint(
             @NonNull List<Glyph> glyphs, @NonNull PictureView view, int x, int y) {
-        long painter = side.address();
         Glyph.Run run = new Glyph.Run(glyphs);
+        long painter = side.address(); // the list, a caller's, may have closed this
         if (view == null) throw new IllegalArgumentException("view: null");
         checkOrigin(x, y);
         int[] touched = new int[4];
@@ -137,8 +136,8 @@ public final class Painter implements AutoCloseable {
     @CheckResult
     @NonNull
     public synchronized Picture paint(@NonNull List<Glyph> glyphs) {
-        long painter = side.address();
         Glyph.Run run = new Glyph.Run(glyphs);
+        long painter = side.address(); // the list, a caller's, may have closed this
         int[] place = new int[4];
         nativePicture(painter, run.numbers, run.coverage, place);
         ByteBuffer pixels = null;

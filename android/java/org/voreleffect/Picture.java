@@ -94,7 +94,8 @@ public final class Picture {
 
     /**
      * Lays it over the view, clipped, so that the origin of the text stands at (x, y): each channel
-     * becomes over + under * (255 - alpha) / 255, rounded to nearest, at most 255.
+     * becomes over + under * (255 - alpha) / 255, rounded to nearest, at most 255. The view must not show
+     * this picture's own pixels: they would be changed while they are read.
      *
      * @param view what it is laid over
      * @param x -2^30 to 2^30

@@ -10,8 +10,12 @@ import java.util.Arrays;
  *
  * <pre>{@code
  * Stops dawn = Stops.of(0xFFD75E, 0xE8412C);
- * Stops glass = Stops.builder().add(0xFFFFFF, 0.9f, 0).add(0xFFFFFF, 0.2f, 0.5f).add(0xA0C8FF,
- * 1).build(); }</pre>
+ * Stops glass = Stops.builder()
+ *         .add(0xFFFFFF, 0.9f, 0)
+ *         .add(0xFFFFFF, 0.2f, 0.5f)
+ *         .add(0xA0C8FF, 1)
+ *         .build();
+ * }</pre>
  */
 public final class Stops {
     private static final int MOST = 256;

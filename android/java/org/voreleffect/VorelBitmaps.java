@@ -11,10 +11,9 @@ import java.util.List;
  * Painting on bitmaps of Android, for Android alone: no other class here knows of them, so that the
  * others run on every virtual machine.
  *
- * <p>A bitmap that is painted on is mutable and premultiplied, has the configuration ARGB_8888, and is
- * neither recycled nor of the configuration HARDWARE; another one gives an {@link
- * IllegalArgumentException} and is left alone. It is locked for the call and unlocked again whatever
- * happens. Do not recycle it on another thread meanwhile.
+ * <p>A bitmap that is painted on is mutable, premultiplied or opaque, has the configuration ARGB_8888,
+ * and is not recycled; another one gives an {@link IllegalArgumentException} and is left alone. It is
+ * locked for the call and unlocked again whatever happens. Do not recycle it on another thread meanwhile.
  */
 public final class VorelBitmaps {
     static {
@@ -40,8 +39,8 @@ public final class VorelBitmaps {
         if (painter == null) throw new IllegalArgumentException("painter: null");
         int[] touched = new int[4];
         synchronized (painter) {
-            long address = painter.address();
             Glyph.Run run = new Glyph.Run(glyphs);
+            long address = painter.address(); // the list, a caller's, may have closed it
             checkTarget(bitmap, x, y);
             nativePaint(painter, address, run.numbers, run.coverage, bitmap, x, y, touched);
         }
@@ -137,12 +136,17 @@ public final class VorelBitmaps {
         }
         Bitmap bitmap =
                 Bitmap.createBitmap(picture.width(), picture.height(), Bitmap.Config.ARGB_8888);
-        layOver(picture, bitmap, -picture.left(), -picture.top());
+        int[] corner = {picture.width(), picture.height(), 0, 0};
+        nativeLayOver(picture.buffer(), corner, bitmap, 0, 0, new int[4]);
         return bitmap;
     }
 
     private static void checkTarget(Bitmap bitmap, int x, int y) {
         if (bitmap == null) throw new IllegalArgumentException("bitmap: null");
+        if (!bitmap.isMutable()) throw new IllegalArgumentException("bitmap: not mutable");
+        if (bitmap.hasAlpha() && !bitmap.isPremultiplied()) {
+            throw new IllegalArgumentException("bitmap: not premultiplied");
+        }
         Painter.checkOrigin(x, y);
     }
 

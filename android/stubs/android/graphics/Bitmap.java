@@ -39,6 +39,21 @@ public final class Bitmap {
         throw new UnsupportedOperationException();
     }
 
+    /** @return whether its pixels may be changed */
+    public boolean isMutable() {
+        throw new UnsupportedOperationException();
+    }
+
+    /** @return whether its alpha counts */
+    public boolean hasAlpha() {
+        throw new UnsupportedOperationException();
+    }
+
+    /** @return whether its pixels have an alpha that they were multiplied with */
+    public boolean isPremultiplied() {
+        throw new UnsupportedOperationException();
+    }
+
     /** Copies its bytes, with the gaps between rows. */
     public void copyPixelsToBuffer(Buffer buffer) {
         throw new UnsupportedOperationException();

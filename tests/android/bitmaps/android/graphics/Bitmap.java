@@ -21,6 +21,11 @@ public final class Bitmap {
     public static final int FORMAT_RGBA_8888 = 1;
     public static final int FORMAT_A_8 = 8;
 
+    /** The lowest two of the flags. */
+    public static final int PREMULTIPLIED = 0;
+    public static final int OPAQUE = 1;
+    public static final int STRAIGHT = 2;
+
     /** What the native functions tell; the tests change it. */
     public int width;
     public int height;
@@ -30,6 +35,7 @@ public final class Bitmap {
     public int infoResult;
     public int lockResult;
     public boolean throwsInLock;
+    public boolean isMutable = true;
     public boolean hasPixels = true;
     public int locks;
     public int unlocks;
@@ -64,6 +70,22 @@ public final class Bitmap {
 
     public Config getConfig() {
         return config;
+    }
+
+    public boolean isMutable() {
+        return isMutable;
+    }
+
+    public boolean hasAlpha() {
+        return alphaFlags() != OPAQUE;
+    }
+
+    public boolean isPremultiplied() {
+        return alphaFlags() == PREMULTIPLIED;
+    }
+
+    private int alphaFlags() {
+        return flags & 3;
     }
 
     public void copyPixelsToBuffer(Buffer buffer) {
