@@ -16,6 +16,8 @@ class Benches {
 
     using Bench = std::unique_ptr<vorelcompose::Workbench>;
 
+    Benches() { mKept.reserve(kMostKept); }
+
     Bench take() {
         const std::lock_guard<std::mutex> alone(mMutex);
         if (mKept.empty()) return std::make_unique<vorelcompose::Workbench>(mFonts);
