@@ -69,6 +69,9 @@ class PackLibrary(sdist):
 
     def make_release_tree(self, base_dir, files):
         super().make_release_tree(base_dir, files)
+        license_file = Path(base_dir) / "LICENSE"
+        license_file.unlink()  # a link out of the distribution
+        shutil.copyfile(ROOT / "LICENSE", license_file)
         for name in SOURCES:
             source, target = ROOT / name, Path(base_dir) / "library" / name
             if source.is_dir():

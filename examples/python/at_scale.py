@@ -48,7 +48,8 @@ def over_a_cluster(chunks, workers):
             if not lost and len(hashes) >= sum(map(len, chunks)) // 3:
                 os.kill(victim, signal.SIGKILL)
                 lost = 1
-        client.wait_for_workers(workers)  # the one that takes its place, too
+        # Dask's workers tell at length of being ended while they start, as the one in the place of the victim is.
+        client.wait_for_workers(workers)
         return hashes, lost
 
 

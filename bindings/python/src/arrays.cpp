@@ -20,13 +20,13 @@ std::string spelled(const py::array& array) {
 }
 
 py::array arrayLike(const py::object& object, const char* what) {
-    py::array array = py::array::ensure(object);
-    if (!array) {
-        PyErr_Clear();
+    try {
+        return py::array(object);
+    } catch (const py::error_already_set& error) {
+        if (!error.matches(PyExc_TypeError) && !error.matches(PyExc_ValueError)) throw;
         throw py::type_error(std::string(what) + ", not " +
                              std::string(py::str(py::type::of(object).attr("__name__"))));
     }
-    return array;
 }
 
 void requireBytes(const py::array& array, py::ssize_t dimensions, const char* what) {
@@ -57,9 +57,7 @@ std::ptrdiff_t strideOf(const py::array& array) {
 }
 
 py::array packed(const py::array& array) {
-    py::array copy = py::array_t<uint8_t, py::array::c_style | py::array::forcecast>::ensure(array);
-    if (copy) return copy;
-    throw py::error_already_set();
+    return py::array_t<uint8_t, py::array::c_style | py::array::forcecast>(array);
 }
 
 }  // namespace

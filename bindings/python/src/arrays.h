@@ -5,6 +5,7 @@
 #include <voreleffect/look.h>
 
 #include <cstdint>
+#include <memory>
 #include <utility>
 #include <vector>
 
@@ -43,10 +44,11 @@ Pixels pixelsOf(const py::object& object);
 /// the array or anything that is made of it.
 template <typename Owner>
 py::array arrayOf(Owner owner, int width, int height, uint8_t* (*dataOf)(Owner&)) {
-    auto* const kept = new Owner(std::move(owner));
-    const py::capsule capsule(kept, [](void* pointer) { delete static_cast<Owner*>(pointer); });
+    auto kept = std::make_unique<Owner>(std::move(owner));
+    const py::capsule capsule(kept.get(), [](void* pointer) { delete static_cast<Owner*>(pointer); });
+    Owner& held = *kept.release();
     const py::array::ShapeContainer shape{py::ssize_t{height}, py::ssize_t{width}, py::ssize_t{4}};
-    return py::array(py::dtype::of<uint8_t>(), shape, dataOf(*kept), capsule);
+    return py::array(py::dtype::of<uint8_t>(), shape, dataOf(held), capsule);
 }
 
 /// A whole number within 32 bits. Throws TypeError, or ValueError which names it.

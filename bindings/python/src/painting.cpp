@@ -1,6 +1,7 @@
 #include "painting.h"
 
 #include <pybind11/stl.h>
+#include <unistd.h>
 
 #include <memory>
 #include <mutex>
@@ -10,6 +11,7 @@
 
 #include "arrays.h"
 #include "native_look.h"
+#include "without_gil.h"
 
 namespace vorelpython {
 namespace {
@@ -33,10 +35,15 @@ using VFontEffect::PictureView;
 class SharedPainter {
   public:
     explicit SharedPainter(const std::vector<std::shared_ptr<NativeLook>>& looks)
-        : mPainter(looksOf(looks)) {}
+        : mLooks(looksOf(looks)) {}
+    ~SharedPainter() {
+        if (mProcess != ::getpid()) leaveTurns();
+    }
+    SharedPainter(const SharedPainter&) = delete;
+    SharedPainter& operator=(const SharedPainter&) = delete;
 
     py::tuple margins() const {
-        const Margins margins = mPainter.margins();
+        const Margins margins = mTurns->painter.margins();
         return py::make_tuple(margins.left, margins.top, margins.right, margins.bottom);
     }
 
@@ -57,12 +64,20 @@ class SharedPainter {
     py::tuple paintOnto(const py::sequence& masks, const py::array& onto, const py::object& x,
                         const py::object& y, bool isBgra) {
         const Placements placements(masks);
-        const PictureView view = viewOf(onto, isBgra);
-        const Box box = *paintedOn(placements.glyphs(), view, integer(x, "x"), integer(y, "y"));
+        const int column = integer(x, "x");
+        const int row = integer(y, "y");
+        const Box box = *paintedOn(placements.glyphs(), viewOf(onto, isBgra), column, row);
         return py::make_tuple(box.left, box.top, box.right, box.bottom);
     }
 
   private:
+    struct Turns {
+        explicit Turns(const std::vector<VFontEffect::Look>& looks) : painter(looks) {}
+
+        std::mutex mutex;
+        Painter painter;
+    };
+
     static std::vector<VFontEffect::Look> looksOf(
         const std::vector<std::shared_ptr<NativeLook>>& natives) {
         std::vector<VFontEffect::Look> looks;
@@ -73,22 +88,37 @@ class SharedPainter {
     }
     static py::array emptyArray() { return py::array_t<uint8_t>(std::vector<py::ssize_t>{0, 0, 4}); }
     std::optional<Picture> painted(Glyphs glyphs) {
-        const py::gil_scoped_release released;
-        const std::lock_guard<std::mutex> alone(mMutex);
-        std::optional<Picture> picture = mPainter.paint(glyphs);
-        if (!picture) raise(mPainter.failure());
+        Turns& turns = turnsOfProcess();
+        const WithoutGil released;
+        const std::lock_guard<std::mutex> alone(turns.mutex);
+        std::optional<Picture> picture = turns.painter.paint(glyphs);
+        if (!picture) raise(turns.painter.failure());
         return picture;
     }
     std::optional<Box> paintedOn(Glyphs glyphs, const PictureView& view, int x, int y) {
-        const py::gil_scoped_release released;
-        const std::lock_guard<std::mutex> alone(mMutex);
-        const std::optional<Box> box = mPainter.paint(glyphs, view, x, y);
-        if (!box) raise(mPainter.failure());
+        Turns& turns = turnsOfProcess();
+        const WithoutGil released;
+        const std::lock_guard<std::mutex> alone(turns.mutex);
+        const std::optional<Box> box = turns.painter.paint(glyphs, view, x, y);
+        if (!box) raise(turns.painter.failure());
         return box;
     }
 
-    std::mutex mMutex;
-    Painter mPainter;
+    /// Those of this process. A child that was forked has its own: those of its parent may have been in
+    /// the hands of a thread that it has not, and stay as they are.
+    Turns& turnsOfProcess() {
+        if (mProcess != ::getpid()) {
+            leaveTurns();
+            mTurns = std::make_unique<Turns>(mLooks);
+            mProcess = ::getpid();
+        }
+        return *mTurns;
+    }
+    void leaveTurns() { static_cast<void>(mTurns.release()); }
+
+    std::vector<VFontEffect::Look> mLooks;
+    pid_t mProcess = ::getpid();
+    std::unique_ptr<Turns> mTurns{std::make_unique<Turns>(mLooks)};
 };
 
 }  // namespace

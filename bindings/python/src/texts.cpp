@@ -15,6 +15,7 @@
 #include "native_look.h"
 #include "native_style.h"
 #include "unicode/utf8.h"
+#include "without_gil.h"
 
 namespace vorelpython {
 namespace {
@@ -233,7 +234,7 @@ struct Painted {
 
 Painted painted(const Request& request, const std::string& text, bool hasMarkup, const FoundStyle& style,
                 const std::optional<Background>& background) {
-    const py::gil_scoped_release released;
+    const WithoutGil released;
     BenchOfCall call(*benches());
     const Composition composition(
         request, vorelcompose::SourceText(text, hasMarkup), [&] { return style; }, call.bench());

@@ -167,6 +167,23 @@ def test_a_forked_child_paints():
             thread.join()
 
 
+def test_a_forked_child_paints_with_a_painter_that_another_thread_holds():
+    painter = ve.Painter(ve.Look().outer_glow(90, "#fff").stroke(90, "#f00"))
+    small, large = np.full((4, 4), 255, np.uint8), np.full((1500, 1500), 255, np.uint8)
+    expected = painter.paint(small).array
+    thread = threading.Thread(target=painter.paint, args=(large,))
+    thread.start()
+    time.sleep(0.02)
+    child = os.fork()
+    if child == 0:
+        signal.alarm(20)
+        os._exit(0 if np.array_equal(painter.paint(small).array, expected) else 1)
+    was_painting = thread.is_alive()
+    assert os.waitpid(child, 0)[1] == 0 and was_painting
+    thread.join()
+    assert np.array_equal(painter.paint(small).array, expected)
+
+
 def resident():
     with open("/proc/self/statm") as file:
         return int(file.read().split()[1]) * os.sysconf("SC_PAGE_SIZE")

@@ -132,5 +132,7 @@ def test_no_memory_is_a_memory_error():
     try:
         with pytest.raises(MemoryError):
             LOOKS["all"].paint(mask)
+        with pytest.raises(MemoryError):
+            LOOKS["all"].paint([(0, 0, mask[:, ::-1])] * 2)
     finally:
         resource.setrlimit(resource.RLIMIT_AS, (soft, hard))

@@ -24,6 +24,9 @@ def test_nothing_of_a_look_can_be_set():
             setattr(look, name, 1)
     with pytest.raises(AttributeError):
         del look._state
+    filled = look.fill("#fff")
+    filled.__init__()
+    assert filled == look.fill("#fff")
 
 
 def test_an_effect_of_its_kind_is_replaced_at_its_place():

@@ -245,6 +245,24 @@ def test_a_picture_is_an_array_without_a_copy(mask):
     assert np.shares_memory(np.asarray(picture), picture.array)
     assert picture.array.base is not None and picture.array.flags.writeable
     assert np.asarray(picture, np.float32).dtype == np.float32
+    assert picture.__array__(np.uint8) is picture.array and picture.__array__(copy=False) is picture.array
+
+
+def test_a_picture_is_copied_for_who_asks(mask):
+    picture = LOOKS["all"].paint(mask)
+    for copy in (np.array(picture), picture.__array__(copy=True), picture.__array__(np.float32, copy=True)):
+        assert np.array_equal(copy, picture.array) and not np.shares_memory(copy, picture.array)
+    with pytest.raises(ValueError, match="copied"):
+        picture.__array__(np.float32, copy=False)
+
+
+def test_pictures_of_any_array_have_an_image():
+    for shape in ((0, 0), (0, 5), (3, 0)):
+        assert ve.Picture(np.zeros((*shape, 4), np.uint8), 0, 0).image().size == shape[::-1]
+    assert ve.Look().paint([]).image().size == (0, 0)
+    page = np.random.default_rng(3).integers(0, 256, (8, 9, 4), dtype=np.uint8)
+    page[..., 3] = 255
+    assert np.array_equal(np.asarray(ve.Picture(page[::2, 1:], 0, 0).image()), page[::2, 1:])
 
 
 def test_an_image_of_a_picture_is_straight():
@@ -259,3 +277,24 @@ def test_an_image_of_an_empty_picture_is_empty_and_changes_no_other():
     page = PIL.Image.new("RGBA", (4, 4), (1, 2, 3, 255))
     page.alpha_composite(image, (2, 2))
     assert page.getcolors() == [(16, (1, 2, 3, 255))]
+
+
+@pytest.mark.parametrize("fault", [KeyboardInterrupt, MemoryError, OSError])
+def test_what_goes_wrong_while_a_mask_is_made_is_told(fault):
+    class Fails:
+        def __array__(self, dtype=None, copy=None):
+            raise fault("while it was made")
+
+    with pytest.raises(fault, match="while it was made"):
+        ve.Look().paint(Fails())
+
+
+def test_an_array_that_shrinks_while_its_place_is_asked_for_is_painted_as_it_is_then(mask):
+    onto = np.zeros((400, 400, 4), np.uint8)
+
+    class Shrinks:
+        def __index__(self):
+            onto.resize((1, 2, 4), refcheck=False)
+            return 0
+
+    assert ve.Look().paint(mask, onto=onto, x=Shrinks()) == (0, 0, 2, 1)

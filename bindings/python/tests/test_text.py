@@ -138,6 +138,8 @@ def test_a_style_is_a_value(tmp_path):
     assert len(style.looks(10)) == 2 and "of two" in repr(style)
     with pytest.raises(AttributeError):
         style.description = ""
+    with pytest.raises(AttributeError):
+        del style._text
     with pytest.raises(TypeError):
         ve.Style()
     (tmp_path / "a.json").write_text(style.to_json())
@@ -147,6 +149,39 @@ def test_a_style_is_a_value(tmp_path):
     (tmp_path / "a.json").write_bytes(b'{"description": "\xff"}')
     with pytest.raises(ve.StyleError, match="a.json"):
         ve.Style.read(tmp_path / "a.json")
+
+
+def test_a_style_may_begin_with_the_mark_of_utf_8(tmp_path):
+    (tmp_path / "a.json").write_bytes(b'\xef\xbb\xbf{"color": "#f00"}')
+    style = ve.Style.read(tmp_path / "a.json")
+    assert style == ve.Style.from_json({"color": "#f00"}) and hash(style) == hash(ve.Style.from_json({"color": "#f00"}))
+
+
+def test_styles_and_fonts_may_have_names_that_are_not_utf_8(tmp_path):
+    folder = tmp_path / os.fsdecode(b"\xff")
+    folder.mkdir()
+    (folder / "font.ttf").write_bytes((FONTS / "truetype/dejavu/DejaVuSans.ttf").read_bytes())
+    PIL.Image.new("RGBA", (3, 3)).save(folder / "a.png")
+    (folder / "a.json").write_text('{"pattern": {"image": "a.png"}}')
+    style = ve.Style.read(folder / "a.json")
+    assert np.array_equal(ve.text_picture("a", font=folder / "font.ttf", look=style).array,
+                          ve.text_picture("a", look=pickle.loads(pickle.dumps(style))).array)
+    with pytest.raises(ve.TextError, match="no font file"):
+        ve.text_picture("a", font=folder / "none.ttf")
+
+
+@pytest.mark.parametrize("arguments, fault", [
+    ({"style": b"{}"}, TypeError), ({"style": "\ud800"}, ValueError), ({"name": 5}, TypeError), ({"folder": 5}, TypeError),
+    ({"images": {5: None}}, TypeError), ({"images": [5]}, TypeError), ({"images": {"\ud800": None}}, ValueError),
+    ({"images": {"a.png": "a.png"}}, TypeError)])
+def test_what_makes_no_style_is_refused(arguments, fault):
+    with pytest.raises(fault):
+        ve.Style.from_json(**{"style": {}, **arguments})
+
+
+def test_an_endless_file_is_no_style():
+    with pytest.raises(ve.StyleError, match="more than 131072 bytes"):
+        ve.Style.read("/dev/zero")
 
 
 def test_faults_of_styles_tell_their_place(tmp_path):
@@ -202,6 +237,8 @@ def test_what_cannot_be_painted_is_told(arguments, what):
     ({"opacity": 2}, ValueError), ({"opacity": float("nan")}, ValueError), ({"effect_scale": 0}, ValueError),
     ({"color": "red"}, ValueError), ({"background": "red"}, ValueError), ({"font": []}, ValueError),
     ({"font": ["DejaVu Sans"] * 17}, ValueError), ({"font": "a\0b"}, ValueError), ({"font": b"a"}, TypeError),
+    ({"font": "\ud800"}, ValueError), ({"features": [1]}, TypeError), ({"features": "\udcff"}, ValueError),
+    ({"features": None}, TypeError), ({"variations": [1]}, TypeError), ({"variations": {1: 1}}, TypeError),
     ({"font": None}, TypeError), ({"look": 5}, TypeError), ({"look": ["neon"]}, TypeError), ({"box": "all"}, ValueError),
     ({"variations": {"weight": 1}}, ValueError), ({"variations": {"wght": "1"}}, TypeError),
     ({"premultiplied": True, "background": "#fff"}, ValueError), ({"colour": "#fff"}, TypeError)])

@@ -3,6 +3,7 @@
 from __future__ import annotations
 
 import json
+import os
 from collections.abc import Iterable, Sequence
 from typing import Any, Literal, Tuple, Union, overload
 
@@ -51,8 +52,10 @@ class Look:
     _state: LookState
     _native: native.NativeLook
 
-    def __init__(self) -> None:
-        _set_state(self, _PLAIN)
+    def __new__(cls) -> Look:
+        look = object.__new__(cls)
+        _set_state(look, _PLAIN)
+        return look
 
     def __setattr__(self, name: str, value: object) -> None:
         raise AttributeError(f"a look does not change: {name} cannot be set")
@@ -216,8 +219,8 @@ class Look:
     # Style files.
 
     @staticmethod
-    def from_json(style: str | dict[str, Any], *, size: int = 96, folder: Any = None,
-                  images: dict[str, Any] | None = None) -> Look:
+    def from_json(style: str | dict[str, Any], *, size: int = 96,
+                  folder: str | os.PathLike[str] | None = None, images: dict[str, Any] | None = None) -> Look:
         """The one look of a style file (docs/style-files.md), its lengths for a font of `size` pixels.
 
         Raises StyleError for what is no style, and for one of several looks or of one that is moved.

@@ -23,9 +23,17 @@ def image_of(array: Array, mode: str) -> PIL.Image.Image:
     except ImportError as error:
         raise ImportError("images need Pillow; the array of the picture does without") from error
     height, width = array.shape[:2]
-    if height == 0 or width == 0:
-        return PIL.Image.new(mode, (width, height))  # Pillow reads no buffer without pixels
-    return PIL.Image.frombuffer(mode, (width, height), array, "raw", mode, 0, 1)
+    if array.size == 0:
+        return PIL.Image.new(mode, (width, height))
+    return PIL.Image.frombuffer(mode, (width, height), np.ascontiguousarray(array), "raw", mode, 0, 1)
+
+
+def _converted(array: Array, dtype: Any, copy: bool | None) -> npt.NDArray[Any]:
+    """What numpy asks an object for: the array itself, unless a copy is asked for or another type needs one."""
+    converted = np.asarray(array, dtype)
+    if converted is not array and copy is False:
+        raise ValueError(f"pixels of {array.dtype} are copied to become {converted.dtype}")
+    return array.copy() if converted is array and copy else converted
 
 
 @dataclass(frozen=True, eq=False)
@@ -54,8 +62,8 @@ class Picture:
         """Where it lies, from the origin of the text."""
         return Box(self.left, self.top, self.left + self.width, self.top + self.height)
 
-    def __array__(self, dtype: Any = None) -> npt.NDArray[Any]:
-        return self.array if dtype is None else self.array.astype(dtype)
+    def __array__(self, dtype: Any = None, copy: bool | None = None) -> npt.NDArray[Any]:
+        return _converted(self.array, dtype, copy)
 
     def image(self) -> PIL.Image.Image:
         """A straight image of Pillow, mode RGBA. Raises ImportError without Pillow."""
@@ -90,8 +98,8 @@ class TextPicture:
         """Rows."""
         return int(self.array.shape[0])
 
-    def __array__(self, dtype: Any = None) -> npt.NDArray[Any]:
-        return self.array if dtype is None else self.array.astype(dtype)
+    def __array__(self, dtype: Any = None, copy: bool | None = None) -> npt.NDArray[Any]:
+        return _converted(self.array, dtype, copy)
 
     def image(self) -> PIL.Image.Image:
         """A straight image of Pillow, mode RGBA. Raises ImportError without Pillow."""

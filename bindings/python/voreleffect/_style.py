@@ -10,8 +10,10 @@ from typing import Any
 
 from . import _voreleffect as native
 from ._look import Look, _look_of
-from ._values import Margins, number, rgba_of
+from ._values import Margins, number, rgba_of, string
 
+#: More than a style may have: what is longer is refused.
+_MOST_READ = 1 << 20
 _PRESETS = Path(__file__).with_name("presets")
 
 
@@ -39,6 +41,9 @@ class Style:
     def __setattr__(self, name: str, value: object) -> None:
         raise AttributeError(f"a style does not change: {name} cannot be set")
 
+    def __delattr__(self, name: str) -> None:
+        raise AttributeError(f"a style does not change: {name} cannot be deleted")
+
     @staticmethod
     def from_json(style: str | dict[str, Any], *, name: str = "", folder: str | os.PathLike[str] | None = None,
                   images: dict[str, Any] | None = None) -> Style:
@@ -50,20 +55,23 @@ class Style:
 
         Raises StyleError, which tells the path of the key that is wrong.
         """
-        text = style if isinstance(style, str) else json.dumps(style)
-        given = {key: rgba_of(image) for key, image in (images or {}).items()}
-        where = None if folder is None else os.fspath(folder)
-        return _made(text, name, native.NativeStyle(text, name, given, where))
+        text = string(style if isinstance(style, str) else json.dumps(style), "style")
+        given = {string(key, "images"): rgba_of(image) for key, image in dict(images or {}).items()}
+        where = None if folder is None else os.fsencode(folder)
+        return _made(text, name, native.NativeStyle(text, string(name, "name"), given, where))
 
     @staticmethod
     def read(path: str | os.PathLike[str]) -> Style:
         """The style of a file; the pictures of its patterns lie beside it. Raises OSError or StyleError."""
         file = Path(path)
+        name = os.fsencode(file).decode(errors="replace")
+        with file.open("rb") as opened:
+            data = opened.read(_MOST_READ)
         try:
-            text = file.read_bytes().decode()
+            text = data.decode()
         except UnicodeDecodeError as error:
-            raise native.StyleError(f"style '{file}': {error}") from None
-        return Style.from_json(text, name=str(file), folder=file.parent)
+            raise native.StyleError(f"style '{name}': {error}") from None
+        return Style.from_json(text, name=name, folder=file.parent)
 
     @staticmethod
     def preset(name: str) -> Style:
@@ -100,7 +108,8 @@ class Style:
         return Margins(*self._native.margins(size, scale))
 
     def _said(self) -> tuple[str, Any]:
-        return json.dumps(json.loads(self._text), sort_keys=True), self._images
+        said = json.loads(self._text.removeprefix("\ufeff"))  # the mark that editors put before UTF-8
+        return json.dumps(said, sort_keys=True), self._images
 
     def __eq__(self, other: object) -> bool:
         if not isinstance(other, Style):

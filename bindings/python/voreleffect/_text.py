@@ -11,7 +11,7 @@ from . import _voreleffect as native
 from ._look import Look, _stack_of
 from ._picture import TextPicture
 from ._style import Style
-from ._values import Box, Color, Margins, color, number, spelled
+from ._values import Box, Color, Margins, color, number, spelled, string
 
 if TYPE_CHECKING:
     import PIL.Image
@@ -30,18 +30,18 @@ TextBox = Literal["ink", "line"]
 os.register_at_fork(after_in_child=native.after_fork_in_child)
 
 
-def _fonts(font: Font | Iterable[Font]) -> list[str]:
+def _fonts(font: Font | Iterable[Font]) -> list[bytes]:
+    """Families and files as their bytes: the name of a file need not be UTF-8."""
     names = [os.fspath(each) for each in ([font] if isinstance(font, (str, bytes, os.PathLike)) else font)]
     for name in names:
         if not isinstance(name, str):
             raise TypeError(f"font: a str or a path, not {type(name).__name__}")
-    return names
+    return [name.encode(errors="surrogateescape") for name in names]
 
 
 def _features(features: str | Iterable[str]) -> list[str]:
-    if isinstance(features, str):
-        return features.split(",") if features else []
-    return list(features)
+    split = features.split(",") if isinstance(features, str) and features else features
+    return [string(feature, "features") for feature in split]
 
 
 def _spacing(length: float | str) -> tuple[float, bool]:
@@ -70,13 +70,6 @@ def _background(background: Color | Literal["checkerboard"] | None) -> str:
     if background is None or background == "transparent":
         return "transparent"
     return "checkerboard" if background == "checkerboard" else spelled(color(background))
-
-
-def _string(value: object, name: str) -> str:
-    if not isinstance(value, str):
-        raise TypeError(f"{name}: a str, not {type(value).__name__}")
-    value.encode()  # raises UnicodeEncodeError, a ValueError, for halves of surrogate pairs
-    return value
 
 
 def text_picture(
@@ -138,16 +131,16 @@ def text_picture(
     if premultiplied and background is not None:
         raise ValueError("premultiplied: not beside a background")
     arguments = {
-        "text": _string(text, "text"), "markup": bool(markup), "font": _fonts(font), "size": size,
-        "align": _string(align, "align"), "line_height": number(line_height, "line_height"),
+        "text": string(text, "text"), "markup": bool(markup), "font": _fonts(font), "size": size,
+        "align": string(align, "align"), "line_height": number(line_height, "line_height"),
         "letter_spacing": _spacing(letter_spacing), "features": _features(features),
-        "variations": [(_string(axis, "variations"), number(value, "variations"))
-                       for axis, value in (variations or {}).items()],
+        "variations": [(string(axis, "variations"), number(value, "variations"))
+                       for axis, value in dict(variations or {}).items()],
         "color": None if color is None else _color(color),
         "opacity": None if opacity is None else number(opacity, "opacity"),
         "effect_scale": number(effect_scale, "effect_scale"), "width": width, "height": height,
-        "anchor": _string(anchor, "anchor"), "margin": margin, "fit": _string(fit, "fit"),
-        "box": _string(box, "box"), "padding": padding, "strict": bool(strict),
+        "anchor": string(anchor, "anchor"), "margin": margin, "fit": string(fit, "fit"),
+        "box": string(box, "box"), "padding": padding, "strict": bool(strict),
         "background": None if premultiplied else _background(background),
     }
     array, x, y, baseline, painted_size, ink, box_, margins, key, fonts, missing, notes = native.paint_text(

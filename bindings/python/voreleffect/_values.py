@@ -56,6 +56,14 @@ def number(value: object, name: str) -> float:
     return result
 
 
+def string(value: object, name: str) -> str:
+    """A text that UTF-8 can say. Raises TypeError, or ValueError for halves of surrogate pairs."""
+    if not isinstance(value, str):
+        raise TypeError(f"{name}: a str, not {type(value).__name__}")
+    value.encode()  # raises UnicodeEncodeError, a ValueError
+    return value
+
+
 def _channel(value: object) -> int:
     if isinstance(value, bool) or not isinstance(value, numbers.Integral):
         raise TypeError(f"a channel of a colour is a whole number, not {type(value).__name__}")
