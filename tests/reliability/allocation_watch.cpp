@@ -134,10 +134,9 @@ void* objectMemory(size_t size) {
     return counted(VOREL_RAW(malloc)(size > 0 ? size : 1));
 }
 
-void* objectMemoryOrEnd(size_t size) {
-    if (gObjectsRefused) throw std::bad_alloc();
-    void* const block = objectMemory(size);
-    if (block == nullptr) std::abort();
+void* objectMemoryOrThrow(size_t size) {
+    void* const block = gObjectsRefused ? nullptr : objectMemory(size);
+    if (block == nullptr) throw std::bad_alloc();
     return block;
 }
 
@@ -174,10 +173,10 @@ void free(void* block) noexcept {
 }  // extern "C"
 
 void* operator new(size_t size) {
-    return objectMemoryOrEnd(size);
+    return objectMemoryOrThrow(size);
 }
 void* operator new[](size_t size) {
-    return objectMemoryOrEnd(size);
+    return objectMemoryOrThrow(size);
 }
 void* operator new(size_t size, const std::nothrow_t&) noexcept {
     return refuses() ? nullptr : objectMemory(size);
