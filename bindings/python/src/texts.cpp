@@ -258,7 +258,8 @@ py::list decoded(const std::vector<std::string>& texts) {
 /// The pixels and what is known of them. Straight on a background, premultiplied without one.
 py::tuple paintText(const py::dict& arguments, const py::object& look) {
     const Arguments given(arguments);
-    Painted done = painted(requestOf(given), textOf(given), given.value<bool>("markup"), styleOf(look),
+    const FoundStyle style = styleOf(look);
+    Painted done = painted(requestOf(given), textOf(given), given.value<bool>("markup"), style,
                            backgroundOf(given));
     const Facts& facts = done.facts;
     const voreltext::Margins& margins = facts.margins;
