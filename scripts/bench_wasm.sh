@@ -21,7 +21,7 @@ turns=5 rounds=5
 quietly cmake --preset bench
 quietly cmake --build --preset bench --target voreleffect_rows --target voreleffect_write_glyphs
 quietly cmake --preset bench-wasm32
-quietly cmake --build --preset bench-wasm32 --target voreleffect_rows
+quietly cmake --build --preset bench-wasm32 --target voreleffect_rows voreleffect_module voreleffect-scalar_module
 
 # Both paint the same glyphs, and take turns.
 export VOREL_BENCH_GLYPHS=$PWD/build/bench-wasm32/glyphs
@@ -62,7 +62,17 @@ table() {
         }' "$figures.txt"
 }
 
-table > "$figures.md"
+# The modules' KiB, plain and compressed.
+sizes() {
+    local module
+    printf '\n| module | KiB | gzip |\n|---|---:|---:|\n'
+    for module in build/bench-wasm32/bindings/js/module/*.wasm; do
+        printf '| %s | %d | %d |\n' "${module##*/}" $(($(stat -c %s "$module") / 1024)) \
+            $(($(gzip -9 -c "$module" | wc -c) / 1024))
+    done
+}
+
+{ table; sizes; } > "$figures.md"
 if [[ ${1-} == --document ]]; then
     write_figures 'WebAssembly figures' "$figures.md" docs/benchmarks.md
 else

@@ -66,20 +66,26 @@ const done = await new Promise((resolve) => {
         finish(JSON.parse(body));
     });
     let browser;
+    let finished = false;
     const tooLate = setTimeout(() => finish({ code: 1, text: 'the browser did not answer\n' }), kLongestRun);
     const finish = (answer) => {
+        if (finished) return;
+        finished = true;
         clearTimeout(tooLate);
         server.closeAllConnections();
         server.close();
-        const ended = () => resolve(answer);
-        if (browser.exitCode !== null) ended();
-        browser.once('exit', ended);
+        if (browser.pid === undefined || browser.exitCode !== null) {
+            resolve(answer);
+            return;
+        }
+        browser.once('exit', () => resolve(answer));
         // The browser and the processes that it started.
         process.kill(-browser.pid, 'SIGKILL');
     };
     server.listen(0, '127.0.0.1', () => {
         browser = start(`http://127.0.0.1:${server.address().port}/`, profile);
-        browser.once('error', (error) => resolve({ code: 1, text: `chromium: ${error.message}\n` }));
+        browser.once('error', (error) => finish({ code: 1, text: `chromium: ${error.message}\n` }));
+        browser.once('exit', () => finish({ code: 1, text: 'the browser ended without an answer\n' }));
     });
 });
 rmSync(profile, { recursive: true, force: true, maxRetries: 5 });
