@@ -147,6 +147,21 @@ function sizesBeyondMemory_AreRefused(module) {
     for (const bytes of [2 ** 31 - 1, 2 ** 31, 2 ** 32 - 1]) assert.equal(face.allocated(bytes), 0);
 }
 
+/** Addresses whose highest bit is set, and buffers that lie across the first of them. */
+function addressesBeyondHalfOfMemory_AreAddresses(module, expected) {
+    const kHalf = 2 ** 31;
+    for (const before of [0, 20e3, 60e3, 150e3]) {
+        const face = new Face(module);
+        face.allocated(1e9);
+        const next = face.allocated(1 << 20) + (1 << 20);
+        if (before > 0) face.allocated(kHalf - next - before);
+        else while (face.allocated(1e9) < kHalf - 1e9);
+        const look = everything(face);
+        assert.deepEqual({ key: face.keyOf(look), picture: painted(face, look) }, expected);
+        assert.ok(face.bytes.length > kHalf);
+    }
+}
+
 /** Bytes of the stack that the deepest looks take. */
 function stackOf(module) {
     const face = new Face(module);
@@ -180,5 +195,6 @@ const looks = Object.values(modules).map((module) => {
     return { key: face.keyOf(look), picture: painted(face, look) };
 });
 assert.deepEqual(looks[0], looks[1]);
+for (const module of Object.values(modules)) addressesBeyondHalfOfMemory_AreAddresses(module, looks[0]);
 assert.ok(looks[0].picture.pixels.some((byte) => byte !== 0));
 console.log('both modules paint the same bytes');
