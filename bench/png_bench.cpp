@@ -15,7 +15,7 @@
 #include <utility>
 #include <vector>
 
-#include "background.h"
+#include "compose/background.h"
 #include "painting.h"
 #include "png_writer.h"
 #include "style_file.h"
@@ -34,7 +34,7 @@ struct Group {
 // --- pictures -----------------------------------------------------------------------------------------
 
 Image painted(const Options& options) {
-    Image picture = vorelpaint::Composition(options).paint();
+    Image picture = vorelpaint::composed(options).paint();
     layOn(picture, options.background);
     return picture;
 }

@@ -1,5 +1,6 @@
-# What `cmake --install` lays down, in three components: runtime (the shared library), development
-# (headers, link name or static library, package files) and tool (tools/vorelpaint/CMakeLists.txt).
+# What `cmake --install` lays down, in four components: runtime (the shared library), development
+# (headers, link name or static library, package files), tool (tools/vorelpaint/CMakeLists.txt) and python
+# (bindings/python/CMakeLists.txt).
 include(CMakePackageConfigHelpers)
 include(GNUInstallDirs)
 

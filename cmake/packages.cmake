@@ -10,6 +10,9 @@ set(CPACK_COMPONENTS_ALL runtime development)
 if(VOREL_BUILD_TOOLS)
   list(APPEND CPACK_COMPONENTS_ALL tool)
 endif()
+if(VOREL_BUILD_PYTHON)
+  list(APPEND CPACK_COMPONENTS_ALL python)
+endif()
 
 set(CPACK_DEB_COMPONENT_INSTALL ON)
 set(CPACK_DEBIAN_FILE_NAME DEB-DEFAULT)
@@ -29,6 +32,13 @@ set(CPACK_DEBIAN_DEVELOPMENT_PACKAGE_DEPENDS "${runtime} (= ${PROJECT_VERSION})"
 # ffmpeg is run for films; nothing that is read from the program tells so.
 set(CPACK_DEBIAN_TOOL_PACKAGE_DEPENDS "${runtime} (>= ${PROJECT_VERSION}), ffmpeg")
 set(CPACK_DEBIAN_TOOL_PACKAGE_RECOMMENDS fonts-dejavu-core)
+# The module has the library in it. It is for the one minor version of Python that it was built for.
+if(VOREL_BUILD_PYTHON)
+  math(EXPR next "${Python3_VERSION_MINOR} + 1")
+  set(CPACK_DEBIAN_PYTHON_PACKAGE_DEPENDS "python3 (>= 3.${Python3_VERSION_MINOR}), python3 (<< 3.${next}), \
+python3-numpy")
+  set(CPACK_DEBIAN_PYTHON_PACKAGE_RECOMMENDS "python3-pil, fonts-dejavu-core")
+endif()
 
 set(about "voreleffect paints strokes, shadows, glows, gradients and patterns\naround and into \
 text, from 8-bit coverage masks of its glyphs to\npremultiplied RGBA pixels, the same bytes on every \
@@ -49,6 +59,9 @@ vorel_deb(DEVELOPMENT libvoreleffect-dev libdevel "text effects from glyph masks
   "This package has the headers and the files for CMake and pkg-config.")
 vorel_deb(TOOL vorelpaint graphics "paint text with effects into a PNG file"
   "This package has vorelpaint, which paints a text in a font and a\nstyle, its preset styles, its manual page and documents.")
+
+vorel_deb(PYTHON python3-voreleffect python "text effects from glyph masks - Python package"
+  "This package has the package voreleffect of Python, which paints masks\nand texts into arrays of numpy and images of Pillow, and its preset\nstyles.")
 
 # Every Debian package has its copyright and its changes.
 set(CPACK_PRE_BUILD_SCRIPTS ${PROJECT_SOURCE_DIR}/cmake/debian_docs.cmake)

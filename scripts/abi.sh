@@ -1,6 +1,7 @@
 #!/usr/bin/env bash
 # Checks what a built library shows to the linker: its exported symbols (tests/abi/symbols.txt), what it
-# takes from the C++ runtime (tests/abi/runtime.txt), its name, its needs, its alignment.
+# takes from the C++ runtime (tests/abi/runtime.txt), its name, its needs, its alignment, and, unless libraries
+# are named, that README.md tells its size.
 #
 #     scripts/abi.sh [LIBRARY...]   the release and arm64 builds unless named
 #     scripts/abi.sh --update       writes both lists anew from the release build
@@ -20,6 +21,26 @@ if [[ ${1:-} == --update ]]; then
     runtime build/release/libvoreleffect.so > "$runtime_list"
     exit 0
 fi
+
+# told_size ARCHITECTURE: the KiB of the stripped library in README.md
+told_size() { sed -n "s/^| Library, stripped.* \([0-9]*\) KiB on $1.*/\1/p" README.md; }
+# stripped_size LIBRARY PREFIX: likewise, of this one, by the strip whose name begins so
+stripped_size() {
+    local copy size
+    copy=$(mktemp)
+    "$2strip" -o "$copy" "$1"
+    size=$(stat -c %s "$copy")
+    rm "$copy"
+    echo $(((size + 512) / 1024))
+}
+# check_size LIBRARY ARCHITECTURE PREFIX: sizes may differ by a hundredth, as compilers' patches do
+check_size() {
+    local size told
+    size=$(stripped_size "$1" "$3")
+    told=$(told_size "$2")
+    ((100 * size >= 99 * told && 100 * size <= 101 * told)) ||
+        complain "has $size KiB stripped, $told on $2 as README.md says"
+}
 
 failed=0
 complain() {
@@ -43,4 +64,10 @@ for library in "${libraries[@]}"; do
     done
     echo "$library: $(symbols "$library" | wc -l) symbols checked"
 done
+if [[ $# -eq 0 ]]; then
+    library=build/release/libvoreleffect.so
+    check_size "$library" x86-64 ''
+    library=build/arm64/libvoreleffect.so
+    check_size "$library" '64-bit ARM' aarch64-linux-gnu-
+fi
 exit "$failed"

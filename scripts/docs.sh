@@ -1,8 +1,11 @@
 #!/usr/bin/env bash
 # Builds the site of the documents into build/docs/html. Fails, with a line for each fault, when
 #   - a relative link or an anchor of a Markdown page leads nowhere,
+#   - what a page quotes of a program is not what stands in it,
 #   - the tables of keys in docs/style-files.md are behind the schema,
-#   - a block of C++ or C in one does not compile, or its program fails,
+#   - a page has another number than is counted,
+#   - a block of C++ or C in one does not compile, or its program fails or adds an effect that is not seen,
+#   - a block of Python fails,
 #   - a public name is not documented, or Doxygen warns of anything else,
 #   - a link of the finished site leads nowhere.
 set -euo pipefail
@@ -11,4 +14,6 @@ cd "$(dirname "$0")/.."
 
 need_packages doxygen g++ python3
 scripts/demo.sh > /dev/null # the library, with which the programs are linked
+[[ -x build/python-venv/bin/python ]] || scripts/python.sh > /dev/null # the package of Python
+build/python-venv/bin/python -B scripts/docs/python_blocks.py
 python3 -B scripts/docs/build.py "$PWD/build/demo" "$PWD/build/docs"

@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
-# Builds every example against an installed library, runs it and checks that it paints; the pictures are
-# in build/examples/pictures.
+# Builds every example against an installed library, runs it and checks that it paints, the same again and
+# another picture without any one of its effects; the pictures are in build/examples/pictures.
 #
 #     scripts/examples.sh            installs the library into build/examples/prefix first
 #     scripts/examples.sh PREFIX     takes the library that is installed there
@@ -10,7 +10,7 @@ cd "$(dirname "$0")/.."
 . scripts/quietly.sh
 
 need_packages cmake ninja-build g++ pkg-config libfreetype-dev libharfbuzz-dev libpng-dev \
-    fonts-dejavu-core file ffmpeg
+    fonts-dejavu-core file ffmpeg python3
 
 root=$PWD
 build=$root/build/examples
@@ -21,6 +21,9 @@ if [[ $# -eq 0 ]]; then
         -DCMAKE_INSTALL_PREFIX="$prefix"
     quietly cmake --build "$build/library" --target install
 fi
+
+PKG_CONFIG_PATH=$(dirname "$(find "$prefix" -name voreleffect.pc)")
+export PKG_CONFIG_PATH
 
 # compile NAME: builds an example
 compile() {
@@ -33,6 +36,17 @@ compile() {
     quietly cmake --build "$build/$name"
 }
 
+# see_effects NAME ARGUMENT...: each effect of the example is seen in what it paints
+see_effects() {
+    local name=$1 modules=(voreleffect freetype2 harfbuzz libpng) flags libs
+    shift
+    read -ra flags <<< "$(pkg-config --cflags "${modules[@]}")"
+    read -ra libs <<< "$(pkg-config --libs "${modules[@]}")"
+    "${CXX:-g++}" -std=c++17 -include scripts/docs/seen_effects.h "${flags[@]}" "examples/$name/$name.cpp" \
+        -o "$build/$name/seen" "${libs[@]}" "-Wl,-rpath,$(pkg-config --variable=libdir voreleffect)"
+    echo "$name: $(python3 -B scripts/docs/seen_effects.py "$build/$name/seen" "$@")"
+}
+
 # paint NAME PICTURE ARGUMENT...: builds an example and runs it among the pictures
 paint() {
     local name=$1 picture=$2
@@ -41,6 +55,7 @@ paint() {
     (cd "$pictures" && "$build/$name/$name" "$@")
     [[ $(file -b "$pictures/$picture") == *"image data"* ]] || { echo "$name: no picture" >&2; return 1; }
     echo "$name: build/examples/pictures/$picture"
+    see_effects "$name" "$@"
 }
 
 rm -rf "$pictures"
@@ -53,6 +68,7 @@ paint stacked_looks stacked_looks.png
 # Laid over a film, as the program's source says, the cues of the sample are seen in the frames of their
 # times, from 0.5, 3.0 and 5.3 seconds to 2.5, 5.0 and 7.5; the others stay what they are.
 compile subtitles
+see_effects subtitles "$root/examples/subtitles/sample.srt"
 film=$build/subtitles/film.mkv
 subtitled=$build/subtitles/subtitled.mkv
 lossless=(-c:v ffv1 -pix_fmt gbrp -y)

@@ -22,7 +22,7 @@ usage() { sed -n '2,/^set/s/^# \{0,1\}//p' "$0" >&2; exit 2; }
 [[ ${1:-} =~ ^([1-9][0-9]*|--merge|--coverage)$ ]] || usage
 seconds=$1
 shift
-all_targets=(fuzz_effect_set fuzz_differential fuzz_blender fuzz_style fuzz_job fuzz_subtitles fuzz_text)
+all_targets=(fuzz_effect_set fuzz_differential fuzz_blender fuzz_capi fuzz_style fuzz_job fuzz_subtitles fuzz_text)
 targets=("$@")
 [[ $# -gt 0 ]] || targets=("${all_targets[@]}")
 

@@ -13,7 +13,7 @@ need_packages cmake ninja-build g++ pkg-config googletest libgtest-dev libfreety
     g++-aarch64-linux-gnu qemu-user-static
 
 share=${1:-400}
-targets=(fuzz_effect_set fuzz_blender fuzz_differential)
+targets=(fuzz_effect_set fuzz_blender fuzz_capi fuzz_differential)
 cmake --preset arm64 > /dev/null
 cmake --build --preset arm64 --target "${targets[@]/%/_replay}" -- --quiet
 

@@ -6,7 +6,7 @@ set -euo pipefail
 cd "$(dirname "$0")/.."
 . scripts/packages.sh
 . scripts/quietly.sh
-need_packages cmake ninja-build g++ pkg-config binutils python3 ffmpeg
+need_packages cmake ninja-build g++ pkg-config binutils python3 python3-numpy python3-pil ffmpeg
 
 source=$PWD
 build=$source/build/install
@@ -149,10 +149,10 @@ fi
 
 files=$(scripts/debian.sh)
 mapfile -t files <<< "$files"
-names=(libvoreleffect1 libvoreleffect-dev vorelpaint)
+names=(libvoreleffect1 libvoreleffect-dev vorelpaint python3-voreleffect)
 for file in "${files[@]}"; do
     depends=$(dpkg-deb --field "$file" Depends)
-    [[ $file == */libvoreleffect1_* || $depends == *"libvoreleffect1 ("* ]] ||
+    [[ $file == */libvoreleffect1_* || $file == */python3-voreleffect_* || $depends == *"libvoreleffect1 ("* ]] ||
         fail "$file does not depend on libvoreleffect1"
     [[ $file != */vorelpaint_* || ", $depends," == *", ffmpeg,"* ]] || fail "$file does not depend on ffmpeg"
 done
@@ -176,3 +176,8 @@ grep -q '=> \(/usr\)\?/lib.*libvoreleffect.so.1' <<< "$taken" ||
     fail "Debian: vorelpaint does not take the library from its package"
 tests/tool/installed_test.sh "$(command -v vorelpaint)" /usr || fail "Debian: not all that vorelpaint names"
 echo "Debian: vorelpaint paints, and its pages are there"
+(cd / && /usr/bin/python3 -B "$source/tests/install/python_consumer.py" "$picture" "$version") ||
+    fail "Debian: the package of Python does not paint what vorelpaint does"
+! readelf --wide -d /usr/lib/python3/dist-packages/voreleffect/*.so | grep libvoreleffect ||
+    fail "Debian: the module of Python needs the library beside it"
+echo "Debian: the package of Python paints what vorelpaint does"

@@ -2,7 +2,9 @@
 """Packs libraries, headers and class files as an AAR with a Prefab package inside.
 
     pack_aar.py --version 1.2.3 --ndk 27 --include DIR --classes DIR
-                --library libvoreleffect.so --jni-library libvoreleffect_jni.so --output FILE.aar
+                --libraries arm64-v8a=DIR --libraries x86_64=DIR --output FILE.aar
+
+Each directory of libraries has libvoreleffect.so and libvoreleffect_jni.so for one kind of CPU.
 
 The same files give the same bytes: names are sorted and every time stamp is the same.
 """
@@ -14,19 +16,20 @@ import sys
 import zipfile
 from pathlib import Path
 
-ABI = "arm64-v8a"
+MACHINES = {"arm64-v8a": 183, "x86_64": 62}  # of an ABI, as ELF numbers them
+LIBRARY = "libvoreleffect.so"
+JNI_LIBRARY = "libvoreleffect_jni.so"
 MIN_API = 21
 ANDROID = Path(__file__).resolve().parent.parent / "android"
 LICENSE = ANDROID.parent / "LICENSE"
 
 
-def check_library(path):
-    """Ends the program unless the file is a 64-bit ARM library whose segments fit 16 KB pages."""
+def read_library(path, abi):
+    """Its bytes; ends the program unless it is a library for the CPU whose segments fit 16 KB pages."""
     data = path.read_bytes()
     little_64_bit = data[:6] == b"\x7fELF\x02\x01"
-    aarch64 = 183
-    if not little_64_bit or struct.unpack_from("<H", data, 18)[0] != aarch64:
-        sys.exit(f"{path}: not a library for {ABI}")
+    if not little_64_bit or struct.unpack_from("<H", data, 18)[0] != MACHINES[abi]:
+        sys.exit(f"{path}: not a library for {abi}")
     (table,) = struct.unpack_from("<Q", data, 32)
     entry_size, entries = struct.unpack_from("<HH", data, 54)
     for entry in range(table, table + entries * entry_size, entry_size):
@@ -35,6 +38,7 @@ def check_library(path):
         loaded = 1
         if kind == loaded and alignment % 16384:
             sys.exit(f"{path}: a segment is aligned to {alignment}, which does not fit 16 KB pages")
+    return data
 
 
 def zipped(files):
@@ -59,48 +63,56 @@ def json_bytes(value):
     return (json.dumps(value, indent=2) + "\n").encode()
 
 
-def prefab(version, ndk, headers, library):
+def prefab(version, ndk, headers, libraries):
     """The Prefab package of schema 2. Its reader refuses any field that is not in the schema."""
     module = "modules/voreleffect"
-    place = f"{module}/libs/android.{ABI}"
-    # The C++ runtime is linked in and hidden: "none" is what Prefab asks such a library to say, and
-    # would else refuse it for each user of another runtime.
-    abi = {"abi": ABI, "api": MIN_API, "ndk": ndk, "stl": "none", "static": False}
-    return {
+    files = {
         "prefab.json": json_bytes(
             {"schema_version": 2, "name": "voreleffect", "version": version, "dependencies": []}
         ),
         f"{module}/module.json": json_bytes({"export_libraries": [], "android": {}}),
         **{f"{module}/include/{name}": header for name, header in headers.items()},
-        f"{place}/abi.json": json_bytes(abi),
-        f"{place}/libvoreleffect.so": library,
     }
+    for abi, contents in libraries.items():
+        # The C++ runtime is linked in and hidden: "none" is what Prefab asks such a library to say, and
+        # would else refuse it for each user of another runtime.
+        told = {"abi": abi, "api": MIN_API, "ndk": ndk, "stl": "none", "static": False}
+        place = f"{module}/libs/android.{abi}"
+        files[f"{place}/abi.json"] = json_bytes(told)
+        files[f"{place}/{LIBRARY}"] = contents[LIBRARY]
+    return files
+
+
+def libraries_of(given):
+    """The libraries of a directory by their names, and their ABI: of "ABI=DIR"."""
+    abi, _, directory = given.partition("=")
+    if abi not in MACHINES or not directory:
+        raise argparse.ArgumentTypeError(f"{given}: no ABI={'|'.join(MACHINES)} and directory")
+    return abi, {name: read_library(Path(directory) / name, abi) for name in (LIBRARY, JNI_LIBRARY)}
 
 
 def main():
     parser = argparse.ArgumentParser(description="Packs an AAR with a Prefab package inside.")
     parser.add_argument("--version", required=True)
     parser.add_argument("--ndk", required=True, type=int, help="major version of the NDK")
-    for name in ("include", "classes", "library", "jni-library", "output"):
+    parser.add_argument("--libraries", required=True, type=libraries_of, action="append", metavar="ABI=DIR")
+    for name in ("include", "classes", "output"):
         parser.add_argument(f"--{name}", required=True, type=Path)
     given = parser.parse_args()
 
-    check_library(given.library)
-    check_library(given.jni_library)
     headers = tree(given.include)
     classes = tree(given.classes)
     if not headers or not classes:
         sys.exit(f"no files in {given.classes if headers else given.include}")
-    library = given.library.read_bytes()
-    package = prefab(given.version, given.ndk, headers, library)
+    libraries = dict(given.libraries)
+    package = prefab(given.version, given.ndk, headers, libraries)
     files = {
         "AndroidManifest.xml": (ANDROID / "AndroidManifest.xml").read_bytes(),
         "LICENSE": LICENSE.read_bytes(),
         "R.txt": b"",
         "classes.jar": zipped(classes),
         "proguard.txt": (ANDROID / "proguard.txt").read_bytes(),
-        f"jni/{ABI}/libvoreleffect.so": library,
-        f"jni/{ABI}/libvoreleffect_jni.so": given.jni_library.read_bytes(),
+        **{f"jni/{abi}/{name}": data for abi, own in libraries.items() for name, data in own.items()},
         **{f"prefab/{name}": content for name, content in package.items()},
     }
     given.output.write_bytes(zipped(files))

@@ -3,24 +3,29 @@
 #include <algorithm>
 #include <cstdint>
 #include <cstring>
+#include <memory>
 #include <new>
 
 #include "org_voreleffect_VorelEffect.h"
+#include "support.h"
 #include "voreleffect/VFEffect.h"
 
 // The native side of org.voreleffect.VorelEffect, which checks every argument before it comes here. The
 // generated header declares each function below, so that the compiler refuses one that does not fit.
 
 using namespace VFontEffect;
+using namespace voreljni;
 
 namespace {
 
 constexpr int kMaxStops = 256;
 constexpr unsigned int kColourBytes = 4;
 constexpr unsigned int kColourFormat = 1;
+constexpr int kMostKinds = 12;
+constexpr const char* kListOfEffects = "list of effects";
 
 VFEffect& lookOf(jlong painter) {
-    return *reinterpret_cast<VFEffect*>(static_cast<intptr_t>(painter));
+    return at<VFEffect>(painter);
 }
 
 unsigned int wordOf(jint bits) {
@@ -32,43 +37,10 @@ jint idOf(unsigned int id) {
     return static_cast<jint>(id);
 }
 
-void throwNew(JNIEnv* env, const char* className, const char* what) {
-    const jclass kind = env->FindClass(className);
-    if (kind != nullptr) env->ThrowNew(kind, what);
-}
-
-void throwOutOfMemory(JNIEnv* env, const char* what) {
-    throwNew(env, "java/lang/OutOfMemoryError", what);
-}
-
-/// What `call` gives. It adds an effect, and throws when the list of effects cannot grow: the exception
-/// of a library with a C++ runtime of its own, perhaps, so its type is not asked.
-template <class Call>
-auto orOutOfMemory(JNIEnv* env, Call call) -> decltype(call()) {
-    try {
-        return call();
-    } catch (...) {
-        throwOutOfMemory(env, "list of effects");
-        return {};
-    }
-}
-
 /// The id that the add-call gives.
 template <class AddCall>
 jint added(JNIEnv* env, AddCall addCall) {
-    return idOf(orOutOfMemory(env, addCall));
-}
-
-/// The bytes of a direct buffer from `offset` on, of which `count` are used. Where the buffer has not so
-/// many it throws and gives null. Position and limit are not asked, which any thread may move at any
-/// time; the capacity stands.
-unsigned char* bytesOf(JNIEnv* env, jobject buffer, jint offset, int64_t count) {
-    if (count == 0) return nullptr;
-    auto* const bytes = static_cast<unsigned char*>(env->GetDirectBufferAddress(buffer));
-    if (bytes != nullptr && offset >= 0 && env->GetDirectBufferCapacity(buffer) - offset >= count)
-        return bytes + offset;
-    throwNew(env, "java/lang/IllegalArgumentException", "too few bytes in the buffer");
-    return nullptr;
+    return idOf(orOutOfMemory(env, kListOfEffects, addCall));
 }
 
 /// Colour stops, read from three arrays of one length.
@@ -119,6 +91,16 @@ void dropRun(VFEffect& look) {
     look.doEffectPostProcessing();
 }
 
+/// Whether the copy has every effect: one that memory runs out for is missing, or has no record.
+bool isWhole(VFEffect& copy, VFEffect& original) {
+    for (int kind = 1; kind <= kMostKinds; ++kind) {
+        VFECore* const effect = copy.getEffect(kind);
+        if (effect == nullptr && original.getEffect(kind) != nullptr) return false;
+        if (effect != nullptr && effect->getProperty() == nullptr) return false;
+    }
+    return true;
+}
+
 }  // namespace
 
 #define VOREL_NATIVE(result, name) \
@@ -127,7 +109,7 @@ void dropRun(VFEffect& look) {
 VOREL_NATIVE(jlong, nativeCreate)(JNIEnv* env, jclass) {
     auto* const look = new (std::nothrow) VFEffect;
     if (look == nullptr) throwOutOfMemory(env, "look");
-    return static_cast<jlong>(reinterpret_cast<intptr_t>(look));
+    return addressOf(look);
 }
 
 VOREL_NATIVE(void, nativeDestroy)(JNIEnv*, jclass, jlong painter) {
@@ -136,6 +118,15 @@ VOREL_NATIVE(void, nativeDestroy)(JNIEnv*, jclass, jlong painter) {
 
 // Below, the object stands beside its painter: as an argument it stays reachable until the call has
 // returned, so that the painter is not freed under it.
+
+VOREL_NATIVE(jlong, nativeCopy)(JNIEnv* env, jobject, jlong painter) {
+    return orOutOfMemory(env, kListOfEffects, [&]() -> jlong {
+        auto copy = std::make_unique<VFEffect>(lookOf(painter));
+        if (isWhole(*copy, lookOf(painter))) return addressOf(copy.release());
+        throwOutOfMemory(env, "look");
+        return 0;
+    });
+}
 
 VOREL_NATIVE(jint, nativeAddOuterShadow)
 (JNIEnv* env, jobject, jlong painter, jfloat angle, jfloat distance, jfloat size, jint color,
@@ -273,7 +264,8 @@ VOREL_NATIVE(jbyteArray, nativeGetMapKey)(JNIEnv* env, jobject, jlong painter) {
 }
 
 VOREL_NATIVE(jbyteArray, nativeGetMapKeyOfColor)(JNIEnv* env, jobject, jlong painter, jint color) {
-    char* const key = orOutOfMemory(env, [&] { return lookOf(painter).getMapKey(wordOf(color)); });
+    char* const key =
+        orOutOfMemory(env, kListOfEffects, [&] { return lookOf(painter).getMapKey(wordOf(color)); });
     return env->ExceptionCheck() ? nullptr : keyArray(env, key);
 }
 

@@ -3,20 +3,18 @@
 //
 //     glyph_cache [FONT_FILE [PICTURE.png]]
 #include <ft2build.h>
-#include <png.h>
-#include <voreleffect/voreleffect.h>
+#include <voreleffect/look.h>
 
-#include <algorithm>
 #include <chrono>
 #include <cstdio>
-#include <functional>
 #include <list>
 #include <string>
 #include <unordered_map>
-#include <utility>
 #include <vector>
 #include FT_FREETYPE_H
 #include FT_ADVANCES_H
+
+#include "../shared/page.h"
 
 using namespace VFontEffect;
 
@@ -27,109 +25,73 @@ constexpr int kPageHeight = 640;
 constexpr int kMargin = 40;
 constexpr int kBodyPixels = 26;
 constexpr int kHeadingPixels = 58;
-constexpr int kPaper[] = {0x5C, 0x6F, 0x84};
-
-// --- A look and its identity ------------------------------------------------------------------------
-
-/// A set of effects and the name under which its glyphs are kept.
-struct Look {
-    Look(const std::function<void(VFEffect&)>& addEffects, unsigned fill,
-         const std::string& patternName) {
-        addEffects(set);
-        // Taken here, once, from a set that has just been described and has painted nothing:
-        // initEffect, which plans a run, puts the effects into another order, and the key follows that
-        // order. A key taken after the first run would differ from this one, and every cached glyph
-        // would be missed. Nor is it taken again later: getMapKey(colour) counts as an add-call, after
-        // which the next run is planned anew, with the order of the effects turned round.
-        char* key = set.getMapKey(fill);
-        identity = key != nullptr ? key : "";
-        delete[] key;
-        // A pattern leaves no trace in the key: looks that differ in nothing else have equal keys.
-        // The caller, who knows where the pattern came from, adds a name for it.
-        identity += '/' + patternName;
-    }
-
-    VFEffect set;
-    std::string identity;
-};
+constexpr unsigned kPaper = 0x5C6F84;
 
 // --- The cache --------------------------------------------------------------------------------------
 
-/// A painted glyph: premultiplied pixels, and where their top left corner lies seen from the pen.
-struct PaintedGlyph {
-    PaintedGlyph(int width, int height)
-        : pixels(static_cast<unsigned>(width), static_cast<unsigned>(height), 4) {}
+/// A painter and the name under which its glyphs are kept. The key tells all of the look, patterns
+/// included.
+struct NamedPainter {
+    explicit NamedPainter(const Look& look) : key(look.key()), painter(look) {}
 
-    size_t bytes() const {
-        return size_t{4} * pixels.mWidth * pixels.mHeight + sizeof *this + key.size();
+    std::string key;
+    Painter painter;
+};
+
+/// A glyph as it lies on the page, its origin the pen.
+struct PaintedGlyph {
+    std::size_t bytes() const {
+        return static_cast<std::size_t>(picture.stride()) * static_cast<std::size_t>(picture.height()) +
+               sizeof *this + key.size();
     }
 
     std::string key;
-    int left = 0;
-    int top = 0;
-    VFBitmap pixels;
+    Picture picture;
 };
 
 class GlyphCache {
   public:
-    GlyphCache(FT_Face face, size_t limitBytes) : mFace(face), mLimit(limitBytes) {}
+    GlyphCache(FT_Face face, std::size_t limitBytes) : mFace(face), mLimit(limitBytes) {}
 
     /// The glyph in this look and size; stays valid until the next call.
-    const PaintedGlyph& get(Look& look, unsigned glyph, int pixels) {
-        const std::string key =
-            look.identity + '/' + std::to_string(glyph) + '/' + std::to_string(pixels);
+    const Picture& get(NamedPainter& look, unsigned glyph, int pixels) {
+        const std::string key = look.key + '/' + std::to_string(glyph) + '/' + std::to_string(pixels);
         const auto found = mPlaces.find(key);
         if (found != mPlaces.end()) {
             ++hits;
             mGlyphs.splice(mGlyphs.begin(), mGlyphs, found->second);
-            return mGlyphs.front();
+            return mGlyphs.front().picture;
         }
         ++misses;
-        paint(look.set, glyph, pixels);
-        mGlyphs.front().key = key;
+        mGlyphs.push_front({key, paint(look.painter, glyph, pixels)});
         mPlaces[key] = mGlyphs.begin();
         used += mGlyphs.front().bytes();
         while (used > mLimit && mGlyphs.size() > 1)
             dropOldest();
-        return mGlyphs.front();
+        return mGlyphs.front().picture;
     }
 
-    size_t hits = 0;
-    size_t misses = 0;
-    size_t dropped = 0;
-    size_t used = 0;
+    std::size_t hits = 0;
+    std::size_t misses = 0;
+    std::size_t dropped = 0;
+    std::size_t used = 0;
 
   private:
-    /// Paints one glyph as a run of its own and puts it in front. A gradient or a pattern thus starts
-    /// anew in every glyph; for one that runs through a line, paint and cache the line.
-    void paint(VFEffect& look, unsigned index, int pixels) {
+    /// Paints one glyph in a picture of its own. A gradient or a pattern thus starts anew in every
+    /// glyph; for one that runs through a line, paint and cache the line.
+    Picture paint(Painter& painter, unsigned index, int pixels) {
         FT_Set_Pixel_Sizes(mFace, 0, static_cast<unsigned>(pixels));
-        const bool drawn = FT_Load_Glyph(mFace, index, FT_LOAD_RENDER | FT_LOAD_NO_HINTING) == 0;
+        constexpr FT_Int32 kFlags = FT_LOAD_RENDER | FT_LOAD_NO_HINTING | FT_LOAD_NO_BITMAP;
+        if (FT_Load_Glyph(mFace, index, kFlags) != 0) return {};
         const FT_GlyphSlot slot = mFace->glyph;
-        const int columns = drawn ? static_cast<int>(slot->bitmap.width) : 0;
-        const int rows = drawn ? static_cast<int>(slot->bitmap.rows) : 0;
-        std::vector<unsigned char> coverage;
-        for (int row = 0; row < rows; ++row) {
-            const unsigned char* start = slot->bitmap.buffer + row * slot->bitmap.pitch;
-            coverage.insert(coverage.end(), start, start + columns);
-        }
-
-        const int left = look.getLeftOffset();
-        const int top = look.getTopOffset();
-        const int width = columns == 0 ? 0 : left + columns + look.getRightOffset();
-        const int height = rows == 0 ? 0 : top + rows + look.getBottomOffset();
-        mGlyphs.emplace_front(width, height);
-        PaintedGlyph& painted = mGlyphs.front();
-        painted.left = slot->bitmap_left - left;
-        painted.top = -slot->bitmap_top - top;
-
-        VFGlyph mask = {coverage.data(), static_cast<unsigned short>(columns),
-                        static_cast<unsigned short>(rows)};
-        look.initEffect(width, height);
-        look.setDstBitmap(&painted.pixels);
-        look.renderEffectLayer(left, top, &mask);
-        look.doEffectPostProcessing();
-        look.compositeLayers(&painted.pixels);
+        const FT_Bitmap& bitmap = slot->bitmap;
+        const Glyph glyph = {slot->bitmap_left,
+                             -slot->bitmap_top,
+                             bitmap.buffer,
+                             static_cast<int>(bitmap.width),
+                             static_cast<int>(bitmap.rows),
+                             bitmap.pitch};
+        return painter.paint(glyph).value_or(Picture());
     }
 
     void dropOldest() {
@@ -140,40 +102,12 @@ class GlyphCache {
     }
 
     FT_Face mFace;
-    size_t mLimit;
+    std::size_t mLimit;
     std::list<PaintedGlyph> mGlyphs;  // the one used last in front
     std::unordered_map<std::string, std::list<PaintedGlyph>::iterator> mPlaces;
 };
 
 // --- The page ---------------------------------------------------------------------------------------
-
-struct Page {
-    Page() {
-        for (int pixel = 0; pixel < kPageWidth * kPageHeight; ++pixel) {
-            for (const int channel : kPaper)
-                rgb.push_back(static_cast<unsigned char>(channel));
-        }
-    }
-
-    /// Lays the premultiplied glyph over the opaque page, with its corner at (x, y).
-    void layOver(const PaintedGlyph& glyph, int x, int y) {
-        const int width = static_cast<int>(glyph.pixels.mWidth);
-        const int height = static_cast<int>(glyph.pixels.mHeight);
-        for (int row = std::max(0, -y); row < std::min(height, kPageHeight - y); ++row) {
-            for (int column = std::max(0, -x); column < std::min(width, kPageWidth - x); ++column) {
-                const unsigned char* source = glyph.pixels.mData + 4 * (row * width + column);
-                unsigned char* target = rgb.data() + 3 * ((y + row) * kPageWidth + x + column);
-                for (int channel = 0; channel < 3; ++channel) {
-                    const int through = target[channel] * (255 - source[3]) / 255;
-                    target[channel] =
-                        static_cast<unsigned char>(std::min(source[channel] + through, 255));
-                }
-            }
-        }
-    }
-
-    std::vector<unsigned char> rgb;
-};
 
 /// Sets words from left to right and line by line, and draws them from the cache.
 class Typesetter {
@@ -182,13 +116,13 @@ class Typesetter {
 
     /// The looks are painted one over the other, each line of text wholly in the first one before the
     /// next: so the outline of a letter lies beneath its neighbours, never on them.
-    void paragraph(const std::string& text, const std::vector<Look*>& looks, int pixels) {
+    void paragraph(const std::string& text, const std::vector<NamedPainter*>& looks, int pixels) {
         FT_Set_Pixel_Sizes(mFace, 0, static_cast<unsigned>(pixels));
         const int lineHeight = static_cast<int>(mFace->size->metrics.height >> 6) + pixels / 5;
         std::string line;
-        size_t at = 0;
+        std::size_t at = 0;
         while (at < text.size()) {
-            const size_t end = std::min(text.find(' ', at), text.size());
+            const std::size_t end = std::min(text.find(' ', at), text.size());
             const std::string word = text.substr(at, end - at) + ' ';
             FT_Set_Pixel_Sizes(mFace, 0, static_cast<unsigned>(pixels));
             if (widthOf(line + word) > kPageWidth - 2 * kMargin) {
@@ -218,13 +152,13 @@ class Typesetter {
         return width;
     }
 
-    void drawLine(const std::string& line, const std::vector<Look*>& looks, int pixels, int lineHeight) {
+    void drawLine(const std::string& line, const std::vector<NamedPainter*>& looks, int pixels,
+                  int lineHeight) {
         const int baseline = mTop + pixels;
-        for (Look* look : looks) {
+        for (NamedPainter* look : looks) {
             int pen = kMargin;
             for (const char c : line) {
-                const PaintedGlyph& painted = mCache.get(*look, glyphOf(c), pixels);
-                mPage.layOver(painted, pen + painted.left, baseline + painted.top);
+                mCache.get(*look, glyphOf(c), pixels).layOver(mPage.view(), pen, baseline);
                 FT_Set_Pixel_Sizes(mFace, 0, static_cast<unsigned>(pixels));
                 pen += advanceOf(glyphOf(c));
             }
@@ -238,47 +172,35 @@ class Typesetter {
     int mTop = kMargin;
 };
 
-/// A tile of 8 x 8 pixels in two colours, memory order A, R, G, B: stripes along the sum or checks.
-VFBitmap makeTile(unsigned first, unsigned second, bool stripes) {
+/// A pattern of 8 x 8 pixels in two colours: stripes along the sum, or checks.
+Pattern tile(unsigned first, unsigned second, bool stripes) {
     constexpr unsigned kSide = 8;
-    VFBitmap tile(kSide, kSide, 4);
+    std::vector<unsigned char> rgba;
     for (unsigned i = 0; i < kSide * kSide; ++i) {
         const unsigned x = i % kSide;
         const unsigned y = i / kSide;
         const bool odd = stripes ? (x + y) % kSide < kSide / 2 : (x < kSide / 2) != (y < kSide / 2);
         const unsigned color = odd ? first : second;
-        unsigned char* pixel = tile.mData + size_t{4} * i;
-        pixel[0] = 255;
-        pixel[1] = static_cast<unsigned char>(color >> 16);
-        pixel[2] = static_cast<unsigned char>(color >> 8);
-        pixel[3] = static_cast<unsigned char>(color);
+        for (const int shift : {16, 8, 0})
+            rgba.push_back(static_cast<unsigned char>(color >> shift));
+        rgba.push_back(255);
     }
-    return tile;
+    return Pattern({rgba.data(), kSide, kSide});
+}
+
+Look outlined(const Pattern& pattern) {
+    return Look().fill(rgb(0xFFFFFF)).add(Stroke(4, rgb(0x1B2633))).add(pattern);
 }
 
 /// The four looks of the page.
 struct Looks {
-    VFBitmap stripes = makeTile(0xFFD166, 0xF2994A, true);
-    VFBitmap checks = makeTile(0x9BE7C4, 0x52B69A, false);
-
-    static void outline(VFEffect& look, float pixels) { look.addStrokeText(pixels, 0x1B2633, 1, 0, 1); }
-
-    Look striped{[this](VFEffect& look) {
-                     look.addPatternText(&stripes, 1, 1);
-                     outline(look, 4);
-                 },
-                 0xFFFFFF, "stripes"};
-    Look checked{[this](VFEffect& look) {
-                     look.addPatternText(&checks, 1, 1);
-                     outline(look, 4);
-                 },
-                 0xFFFFFF, "checks"};
-    Look halo{[](VFEffect& look) {
-                  outline(look, 2);
-                  look.addOuterShadowText(120, 3, 4, 0x000000, 0.7F);
-              },
-              0x1B2633, ""};
-    Look face{[](VFEffect&) {}, 0xFFFFFF, ""};
+    NamedPainter striped{outlined(tile(0xFFD166, 0xF2994A, true))};
+    NamedPainter checked{outlined(tile(0x9BE7C4, 0x52B69A, false))};
+    NamedPainter halo{Look()
+                          .fill(rgb(0x1B2633))
+                          .add(OuterShadow(rgb(0)).angle(120).distance(3).size(4).opacity(0.7F))
+                          .add(Stroke(2, rgb(0x1B2633)))};
+    NamedPainter face{Look().fill(rgb(0xFFFFFF))};
 };
 
 void setPage(FT_Face face, GlyphCache& cache, Looks& looks, Page& page) {
@@ -286,41 +208,30 @@ void setPage(FT_Face face, GlyphCache& cache, Looks& looks, Page& page) {
     setter.paragraph("Painted once", {&looks.striped}, kHeadingPixels);
     setter.paragraph(
         "A page of text repeats a few dozen letters some hundred times. Their effects cost far more "
-        "than "
-        "laying a finished picture on the page, so each letter is painted when it is first met and kept "
-        "as long as there is room.",
+        "than laying a finished picture on the page, so each letter is painted when it is first met and "
+        "kept as long as there is room.",
         {&looks.halo, &looks.face}, kBodyPixels);
     setter.paragraph("Used often", {&looks.checked}, kHeadingPixels);
     setter.paragraph(
         "The name of a kept letter has three parts: the key of its look, the number of the glyph and "
-        "the "
-        "size. Two headings with one look but for the pattern in them need a fourth, a name of the "
-        "pattern, or the second heading would come out in the letters of the first.",
+        "the size. The headings differ by the pattern alone, and so do their keys: else the second one "
+        "would come out in the letters of the first.",
         {&looks.halo, &looks.face}, kBodyPixels);
 }
 
 void report(const char* what, FT_Face face, GlyphCache& cache, Looks& looks, Page& page) {
-    const size_t hits = cache.hits;
-    const size_t misses = cache.misses;
-    const size_t dropped = cache.dropped;
+    const std::size_t hits = cache.hits;
+    const std::size_t misses = cache.misses;
+    const std::size_t dropped = cache.dropped;
     const auto start = std::chrono::steady_clock::now();
     setPage(face, cache, looks, page);
     const std::chrono::duration<double, std::milli> time = std::chrono::steady_clock::now() - start;
-    const size_t painted = cache.misses - misses;
-    const size_t drawn = cache.hits - hits + painted;
+    const std::size_t painted = cache.misses - misses;
+    const std::size_t drawn = cache.hits - hits + painted;
     std::printf("%-24s %5zu drawn %5zu painted %5.1f %% hits %6.1f KiB kept %5zu dropped %6.1f ms\n",
                 what, drawn, painted,
                 100.0 * static_cast<double>(drawn - painted) / static_cast<double>(drawn),
                 static_cast<double>(cache.used) / 1024, cache.dropped - dropped, time.count());
-}
-
-bool writePng(const char* path, const Page& page) {
-    png_image png = {};
-    png.version = PNG_IMAGE_VERSION;
-    png.width = kPageWidth;
-    png.height = kPageHeight;
-    png.format = PNG_FORMAT_RGB;
-    return png_image_write_to_file(&png, path, 0, page.rgb.data(), 0, nullptr) != 0;
 }
 
 }  // namespace
@@ -337,22 +248,22 @@ int main(int argc, char** argv) {
     }
 
     Looks looks;
-    Page page;
-    GlyphCache roomy(face, size_t{1} << 20);
+    Page page(kPageWidth, kPageHeight, kPaper);
+    GlyphCache roomy(face, std::size_t{1} << 20);
     report("1 MiB, first page", face, roomy, looks, page);
-    Page again;
+    Page again(kPageWidth, kPageHeight, kPaper);
     report("1 MiB, the page again", face, roomy, looks, again);
-    GlyphCache tight(face, size_t{128} << 10);
-    Page third;
+    GlyphCache tight(face, std::size_t{128} << 10);
+    Page third(kPageWidth, kPageHeight, kPaper);
     report("128 KiB, first page", face, tight, looks, third);
     FT_Done_Face(face);
     FT_Done_FreeType(library);
 
-    if (page.rgb != again.rgb || page.rgb != third.rgb) {
+    if (!(page == again && page == third)) {
         std::fprintf(stderr, "the pages differ\n");
         return 1;
     }
-    if (!writePng(path, page)) {
+    if (!page.writePng(path)) {
         std::fprintf(stderr, "cannot write %s\n", path);
         return 1;
     }

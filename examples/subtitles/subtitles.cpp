@@ -8,9 +8,7 @@
 //
 // What files of films have besides (tags, other formats, lines that are too long) is left to
 // vorelpaint --subtitles.
-#include <ft2build.h>
-#include <hb-ft.h>
-#include <voreleffect/voreleffect.h>
+#include <voreleffect/look.h>
 
 #include <algorithm>
 #include <cstdint>
@@ -21,7 +19,8 @@
 #include <string>
 #include <utility>
 #include <vector>
-#include FT_FREETYPE_H
+
+#include "../shared/shaped_text.h"
 
 using namespace VFontEffect;
 
@@ -75,114 +74,44 @@ std::vector<Cue> readCues(std::istream& file) {
 
 // --- A painted cue ----------------------------------------------------------------------------------
 
-/// Premultiplied pixels, and where their top left corner lies in the frame.
-struct Overlay {
-    int x;
-    int y;
-    VFBitmap pixels;
-};
+/// Black outlines over a soft shadow.
+Look cueLook() {
+    return Look()
+        .fill(rgb(0xFFF6D8))
+        .add(OuterShadow(rgb(0)).angle(135).distance(4).size(5).opacity(0.7F))  // light from upper left
+        .add(Stroke(3, rgb(0)));                                                // 3 pixels, outside
+}
 
 class CuePainter {
   public:
-    explicit CuePainter(FT_Face face) : mFace(face), mFont(hb_ft_font_create_referenced(face)) {
-        mLook.addStrokeText(3, 0x000000, 1, 0, 1);            // 3 pixels, outside
-        mLook.addOuterShadowText(135, 4, 5, 0x000000, 0.7F);  // light from the upper left
-        mLook.addText(0xFFF6D8, 1);
-    }
-    CuePainter(const CuePainter&) = delete;
-    CuePainter& operator=(const CuePainter&) = delete;
-    ~CuePainter() { hb_font_destroy(mFont); }
+    explicit CuePainter(const char* fontFile) : mFont(fontFile, kTextPixels), mPainter(cueLook()) {}
 
-    /// The lines, centred, at the bottom of the frame, in a picture as small as the effects allow.
-    Overlay paint(const Cue& cue) {
-        const int lineHeight = static_cast<int>(mFace->size->metrics.height >> 6);
-        const int ascent = static_cast<int>(mFace->size->metrics.ascender >> 6);
-        const int left = mLook.getLeftOffset();
-        const int top = mLook.getTopOffset();
+    bool isReady() const { return mFont.isReady(); }  ///< whether the font could be read
 
-        std::vector<int> widths;
-        for (const std::string& line : cue.lines)
-            widths.push_back(forEachGlyph(line, [](int, int, unsigned) {}));
-        const int textWidth = *std::max_element(widths.begin(), widths.end());
-        const int textHeight = lineHeight * static_cast<int>(cue.lines.size());
-        const int width = left + textWidth + mLook.getRightOffset();
-        const int height = top + textHeight + mLook.getBottomOffset();
-
-        Overlay overlay = {(kWidth - textWidth) / 2 - left, kHeight - kFromBottom - textHeight - top,
-                           VFBitmap(static_cast<unsigned>(width), static_cast<unsigned>(height), 4)};
-        mLook.initEffect(width, height);
-        mLook.setDstBitmap(&overlay.pixels);
-        for (size_t i = 0; i < cue.lines.size(); ++i) {
-            const int lineLeft = left + (textWidth - widths[i]) / 2;
-            const int baseline = top + static_cast<int>(i) * lineHeight + ascent;
-            forEachGlyph(cue.lines[i], [&](int x, int y, unsigned glyph) {
-                addGlyph(lineLeft + x, baseline + y, glyph);
-            });
+    /// The lines, centred, at the bottom of the frame, in a picture no larger than they need.
+    Picture paint(const Cue& cue) {
+        const auto height = static_cast<int>(cue.lines.size()) * mFont.lineHeight();
+        int baseline = kHeight - kFromBottom - height + mFont.ascent();
+        std::vector<Line> lines;
+        std::vector<Glyph> glyphs;
+        for (const std::string& text : cue.lines) {
+            lines.push_back(mFont.line(text));
+            for (Glyph glyph : lines.back().glyphs) {
+                glyph.x += (kWidth - lines.back().width) / 2;
+                glyph.y += baseline;
+                glyphs.push_back(glyph);
+            }
+            baseline += mFont.lineHeight();
         }
-        mLook.doEffectPostProcessing();
-        mLook.compositeLayers(&overlay.pixels);
-        return overlay;
+        return mPainter.paint(glyphs).value_or(Picture());
     }
 
   private:
-    /// Shapes a line; calls use(x, y, glyph) with the pen of each glyph; returns the line's width.
-    template <class Use>
-    int forEachGlyph(const std::string& line, Use use) {
-        hb_buffer_t* buffer = hb_buffer_create();
-        hb_buffer_add_utf8(buffer, line.data(), static_cast<int>(line.size()), 0, -1);
-        hb_buffer_guess_segment_properties(buffer);
-        hb_shape(mFont, buffer, nullptr, 0);
-        unsigned count = 0;
-        const hb_glyph_info_t* infos = hb_buffer_get_glyph_infos(buffer, &count);
-        const hb_glyph_position_t* positions = hb_buffer_get_glyph_positions(buffer, &count);
-        int pen = 0;  // in 64ths of a pixel, as the positions
-        for (unsigned i = 0; i < count; ++i) {
-            use((pen + positions[i].x_offset + 32) >> 6, -((positions[i].y_offset + 32) >> 6),
-                infos[i].codepoint);
-            pen += positions[i].x_advance;
-        }
-        hb_buffer_destroy(buffer);
-        return (pen + 63) >> 6;
-    }
-
-    void addGlyph(int x, int y, unsigned index) {
-        if (FT_Load_Glyph(mFace, index, FT_LOAD_RENDER) != 0) return;
-        const FT_Bitmap& bitmap = mFace->glyph->bitmap;
-        std::vector<unsigned char> coverage;
-        for (int row = 0; row < static_cast<int>(bitmap.rows); ++row) {
-            const unsigned char* start = bitmap.buffer + row * bitmap.pitch;
-            coverage.insert(coverage.end(), start, start + bitmap.width);
-        }
-        VFGlyph glyph = {coverage.data(), static_cast<unsigned short>(bitmap.width),
-                         static_cast<unsigned short>(bitmap.rows)};
-        mLook.renderEffectLayer(x + mFace->glyph->bitmap_left, y - mFace->glyph->bitmap_top, &glyph);
-    }
-
-    FT_Face mFace;
-    hb_font_t* mFont;
-    VFEffect mLook;
+    Font mFont;
+    Painter mPainter;
 };
 
 // --- Frames -----------------------------------------------------------------------------------------
-
-using Frame = std::vector<unsigned char>;
-
-/// Lays the overlay over the frame, both premultiplied, clipped.
-void layOver(Frame& frame, const Overlay& overlay) {
-    const int width = static_cast<int>(overlay.pixels.mWidth);
-    const int height = static_cast<int>(overlay.pixels.mHeight);
-    for (int row = std::max(0, -overlay.y); row < std::min(height, kHeight - overlay.y); ++row) {
-        for (int column = std::max(0, -overlay.x); column < std::min(width, kWidth - overlay.x);
-             ++column) {
-            const unsigned char* source = overlay.pixels.mData + 4 * (row * width + column);
-            unsigned char* target = frame.data() + 4 * ((overlay.y + row) * kWidth + overlay.x + column);
-            for (int channel = 0; channel < 4; ++channel) {
-                const int through = target[channel] * (255 - source[3]) / 255;
-                target[channel] = static_cast<unsigned char>(std::min(source[channel] + through, 255));
-            }
-        }
-    }
-}
 
 /// A cue is painted once and kept while it is seen; a frame like the one before is written again. The
 /// last frame is clear: FFmpeg shows it for the rest of the film.
@@ -192,8 +121,8 @@ bool writeFrames(const std::vector<Cue>& cues, CuePainter& painter) {
         endMs = std::max(endMs, cue.endMs);
     const int64_t frames = int64_t{endMs} * kFramesPerSecond / 1000 + 2;
 
-    std::map<size_t, Overlay> seen;
-    Frame frame(size_t{4} * kWidth * kHeight);
+    std::map<size_t, Picture> seen;
+    std::vector<unsigned char> frame(size_t{4} * kWidth * kHeight);
     for (int64_t number = 0; number < frames; ++number) {
         const int64_t nowMs = 1000 * number / kFramesPerSecond;
         bool changes = false;
@@ -209,8 +138,8 @@ bool writeFrames(const std::vector<Cue>& cues, CuePainter& painter) {
         }
         if (changes) {
             std::fill(frame.begin(), frame.end(), static_cast<unsigned char>(0));
-            for (const auto& [cue, overlay] : seen)
-                layOver(frame, overlay);
+            for (const auto& [cue, picture] : seen)
+                picture.layOver({frame.data(), kWidth, kHeight}, 0, 0);
         }
         if (std::fwrite(frame.data(), frame.size(), 1, stdout) != 1) return false;
     }
@@ -226,20 +155,14 @@ int main(int argc, char** argv) {
         std::fprintf(stderr, "usage: subtitles FILE.srt [FONT_FILE]\n");
         return 2;
     }
-    FT_Library library = nullptr;
-    FT_Face face = nullptr;
-    if (FT_Init_FreeType(&library) != 0 || FT_New_Face(library, font, 0, &face) != 0 ||
-        FT_Set_Pixel_Sizes(face, 0, kTextPixels) != 0) {
+    CuePainter painter(font);
+    if (!painter.isReady()) {
         std::fprintf(stderr, "cannot read the font %s\n", font);
         return 1;
     }
-    bool isWritten = false;
-    {
-        CuePainter painter(face);
-        isWritten = writeFrames(readCues(file), painter);
+    if (!writeFrames(readCues(file), painter)) {
+        std::fprintf(stderr, "cannot write the frames\n");
+        return 1;
     }
-    FT_Done_Face(face);
-    FT_Done_FreeType(library);
-    if (!isWritten) std::fprintf(stderr, "cannot write the frames\n");
-    return isWritten ? 0 : 1;
+    return 0;
 }

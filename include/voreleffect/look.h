@@ -44,10 +44,24 @@ namespace VFontEffect {
 /// \cond
 // The version stands in all names: two libraries of one process that were compiled with different
 // versions of this header would otherwise share its inline functions, and one of them would read the
-// other's layout.
+// other's layout. So do sources without exceptions: a program that has some of either kind would take
+// functions of one kind for both, and end, or leak, where it is to throw.
+#ifdef __cpp_exceptions
 #define VOREL_LOOK_JOINED(major, minor, patch) look_##major##_##minor##_##patch
+#else
+#define VOREL_LOOK_JOINED(major, minor, patch) look_##major##_##minor##_##patch##_aborting
+#endif
 #define VOREL_LOOK_OF(major, minor, patch) VOREL_LOOK_JOINED(major, minor, patch)
 #define VOREL_LOOK VOREL_LOOK_OF(VOREL_VERSION_MAJOR, VOREL_VERSION_MINOR, VOREL_VERSION_PATCH)
+// By this clang warns of a list that outlives what it points to.
+#ifdef __has_cpp_attribute
+#if __has_cpp_attribute(clang::lifetimebound)
+#define VOREL_POINTED_TO [[clang::lifetimebound]]
+#endif
+#endif
+#ifndef VOREL_POINTED_TO
+#define VOREL_POINTED_TO
+#endif
 inline namespace VOREL_LOOK {
 /// \endcond
 
@@ -115,11 +129,12 @@ struct Glyph {
 class Glyphs {
   public:
     /// One.
-    Glyphs(const Glyph& only) : Glyphs(&only, 1) {}
+    Glyphs(const Glyph& only VOREL_POINTED_TO) : Glyphs(&only, 1) {}
     /// Those of a list.
-    Glyphs(const std::vector<Glyph>& glyphs) : Glyphs(glyphs.data(), glyphs.size()) {}
+    Glyphs(const std::vector<Glyph>& glyphs VOREL_POINTED_TO) : Glyphs(glyphs.data(), glyphs.size()) {}
     /// Those that are named.
-    Glyphs(const std::initializer_list<Glyph>& glyphs) : Glyphs(glyphs.begin(), glyphs.size()) {}
+    Glyphs(const std::initializer_list<Glyph>& glyphs VOREL_POINTED_TO)
+        : Glyphs(glyphs.begin(), glyphs.size()) {}
     /// `count` of them from the first on; none when that is null.
     Glyphs(const Glyph* first, std::size_t count)
         : mFirst(first), mCount(first == nullptr ? 0 : count) {}
@@ -821,6 +836,10 @@ using Pixels = std::unique_ptr<unsigned char, void (*)(void*)>;
 }  // namespace look_internal
 
 /// A picture that owns its pixels: premultiplied R, G, B, A in packed rows.
+///
+/// One look laid over a view as a picture gives the same bytes as painted onto the view. A stack does so
+/// where the view is clear; elsewhere it may differ by roundings, since its looks were laid over each
+/// other before: by 2 values of a channel at most when there are two looks.
 class Picture {
   public:
     Picture() = default;  ///< empty
@@ -856,7 +875,8 @@ class Picture {
 
     /// Lays it over the view, clipped, so that the origin of the text stands at (x, y): each channel
     /// becomes over + under * (255 - alpha) / 255, rounded to nearest, at most 255. Returns the box that
-    /// was touched; nothing for a view that cannot be painted on.
+    /// was touched; nothing for a view that cannot be painted on. The view must not show this picture's
+    /// own pixels: they would be changed while they are read.
     std::optional<Box> layOver(const PictureView& view, int x, int y) const {
         if (!look_internal::isUsable(view)) return std::nullopt;
         const look_internal::WideBox box{0, 0, mWidth, mHeight};
@@ -1160,6 +1180,7 @@ inline std::optional<Picture> Painter::paint(Glyphs glyphs) {
 #undef VOREL_LOOK
 #undef VOREL_LOOK_OF
 #undef VOREL_LOOK_JOINED
+#undef VOREL_POINTED_TO
 /// \endcond
 
 }  // namespace VFontEffect

@@ -227,7 +227,8 @@ VF_API int32_t vorel_picture_top(const vorel_picture* picture);
 VF_API const uint8_t* vorel_picture_data(const vorel_picture* picture);
 /// `view` becomes one of the picture's own pixels, to paint on, as long as it lives.
 VF_API vorel_status vorel_picture_view(vorel_picture* picture, vorel_view* view);
-/// Lays it over the view, clipped, as a painter does. `touched` may be null.
+/// Lays it over the view, clipped, as a painter does. `touched` may be null. The view must not show the
+/// picture's own pixels: they would be changed while they are read.
 VF_API vorel_status vorel_picture_lay_over(const vorel_picture* picture, const vorel_view* view,
                                            int32_t x, int32_t y, vorel_box* touched);
 

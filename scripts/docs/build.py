@@ -8,8 +8,10 @@ import sys
 from pathlib import Path
 
 from compiled import code_faults
+from counts import count_faults
 from links import link_faults
 from pages import ROOT, all_pages
+from quoted import quote_faults
 from site_pages import copy_pictures, site_faults, write_layout, write_pages
 from style_tables import table_faults
 
@@ -35,7 +37,9 @@ def build_site(pages, folder):
 def main(library, folder):
     pages = all_pages()
     fail_on(link_faults(pages))
+    fail_on(quote_faults(pages))
     fail_on(table_faults())
+    fail_on(count_faults())
     faults, blocks = code_faults(pages, library)
     fail_on(faults)
     shutil.rmtree(folder / "html", ignore_errors=True)

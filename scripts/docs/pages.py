@@ -13,16 +13,19 @@ HEADING = re.compile(r"^(#{1,6})\s+(.*?)\s*#*$")
 LINK = re.compile(r"\]\(\s*<?([^()\s>]+)>?(?:\s+\"[^\"]*\")?\s*\)")
 HTML_LINK = re.compile(r"<(?:img|a)\b[^>]*?\b(?:src|href)=\"([^\"]+)\"")
 CODE_SPAN = re.compile(r"(`+)(.+?)\1")
+# Above a block that is a part of a file.
+FROM = re.compile(r"^From \[[^\]]*\]\(([^()\s]+)\):$")
 OUTSIDE = re.compile(r"^[a-z][a-z0-9+.-]*:|^//")
 
 
 @dataclass
 class Block:
-    """A fenced block of code; `line` is that of its first line of code."""
+    """A fenced block of code; `line` is that of its first line of code. One that is quoted has a source."""
 
     language: str
     line: int
     text: str
+    source: Path | None = None
 
 
 @dataclass
@@ -65,7 +68,7 @@ class Page:
         return self.headings[0][1] if self.headings else self.path.stem
 
     def _split(self):
-        fence, block = None, None
+        fence, block, above = None, None, ""
         for number, line in enumerate(self.lines, 1):
             mark = FENCE.match(line)
             if fence:
@@ -75,9 +78,14 @@ class Page:
                 else:
                     block.text += line + "\n"
             elif mark:
-                fence, block = mark[1], Block(mark[2], number + 1, "")
+                fence, block = mark[1], Block(mark[2], number + 1, "", self._source(above))
             else:
                 self.prose.append((number, line))
+                above = line if line.strip() else above
+
+    def _source(self, above):
+        match = FROM.match(above)
+        return target_of(self, match[1])[0] if match else None
 
     @staticmethod
     def _links(line):

@@ -21,7 +21,7 @@ std::string faultOf(const std::string& line) {
     try {
         parseJob(line, kCommon);
         return "";
-    } catch (const ToolError& error) {
+    } catch (const std::runtime_error& error) {
         return error.what();
     }
 }

@@ -20,8 +20,8 @@ Options optionsOf(const std::string& text, const std::string& style = "{}") {
     return options;
 }
 
-Composition composed(const Options& options) {
-    Composition composition(options);
+Composition checked(const Options& options) {
+    Composition composition = composed(options);
     composition.notes().giveTo([](const std::string& note) { ADD_FAILURE() << note; });
     return composition;
 }
@@ -56,7 +56,7 @@ TEST(Captions, Shrink_TakesLengthsInPercentAlong) {
     options.canvas.width = 400;
     options.canvas.margin = 30;
     options.fit = Fit::shrink;
-    const Composition shrunk = composed(options);
+    const Composition shrunk = checked(options);
     EXPECT_LT(shrunk.text().size(), 120);
     EXPECT_EQ(shrunk.margins().left, (shrunk.text().size() + 5) / 10);
 }
@@ -73,7 +73,7 @@ TEST(Captions, WrappedBeyondTheHeight_IsCutOffWithANote) {
     options.canvas.width = 300;
     options.canvas.height = 120;
     options.fit = Fit::wrap;
-    const Composition wrapped(options);
+    const Composition wrapped = composed(options);
     std::vector<std::string> notes;
     wrapped.notes().giveTo([&](const std::string& note) { notes.push_back(note); });
     EXPECT_GT(wrapped.text().layout().lines().size(), 2U);
@@ -85,7 +85,7 @@ TEST(Captions, WrappedBeyondTheHeight_IsCutOffWithANote) {
 TEST(Captions, Start_GoesByEachLine) {
     Options options = optionsOf("a long line of English\n\u05E9\u05DC\u05D5\u05DD\nshort");
     options.align = voreltext::Align::start;
-    const Composition text = composed(options);
+    const Composition text = checked(options);
     const std::vector<Line>& lines = text.text().layout().lines();
     ASSERT_EQ(lines.size(), 3U);
     EXPECT_EQ(lines[1].box.right, lines[0].box.right);
@@ -147,7 +147,7 @@ TEST(Captions, PictureOfAColourFont_HidesTheFillAndWhatLiesOnIt) {
 }
 
 TEST(Captions, PictureOfAColourFont_HasTheStrokeAroundIt) {
-    const Composition plain = composed(thumb("{}"));
+    const Composition plain = checked(thumb("{}"));
     const Composition edged =
         composed(thumb(R"({"stroke": {"size": 6, "color": "#FFF", "position": "outside"}})"));
     EXPECT_EQ(edged.canvas().width, plain.canvas().width + 12);

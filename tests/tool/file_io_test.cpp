@@ -8,6 +8,7 @@
 #include <string>
 #include <vector>
 
+#include "compose/error.h"
 #include "error.h"
 #include "program.h"
 
@@ -146,15 +147,15 @@ TEST(FileIo, StandardOutput_HasMoreNamesThanOne) {
 TEST(FileIo, ReadFile_StopsAtTheLimit) {
     const TempDir dir;
     const std::string path = dir.write("a", "12345");
-    EXPECT_EQ(readFile(path, 5), "12345");
-    EXPECT_THROW(readFile(path, 4), ToolError);
-    EXPECT_THROW(readFile("/dev/zero", 1000), ToolError);
+    EXPECT_EQ(readFileOrInput(path, 5), "12345");
+    EXPECT_THROW(readFileOrInput(path, 4), vorelcompose::ComposeError);
+    EXPECT_THROW(readFileOrInput("/dev/zero", 1000), vorelcompose::ComposeError);
 }
 
 TEST(FileIo, ReadFile_RefusesWhatIsNoFile) {
     const TempDir dir;
-    EXPECT_THROW(readFile(dir.path().string(), 10), ToolError);
-    EXPECT_THROW(readFile(dir.file("none"), 10), ToolError);
+    EXPECT_THROW(readFileOrInput(dir.path().string(), 10), vorelcompose::ComposeError);
+    EXPECT_THROW(readFileOrInput(dir.file("none"), 10), vorelcompose::ComposeError);
 }
 
 }  // namespace

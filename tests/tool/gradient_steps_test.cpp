@@ -33,7 +33,7 @@ Steps stepsOf(const std::string& style) {
     options.text = block + " " + block + " " + block;
     options.size = 100;
     options.inlineStyle = vorelstyle::parseStyle(style);
-    const Image image = Composition(options).paint();
+    const Image image = composed(options).paint();
     EXPECT_GT(image.width, 3 * 256);
 
     const uint8_t* row = image.pixels.data() + 4 * static_cast<size_t>(image.height / 2 * image.width);

@@ -1,4 +1,4 @@
-#include "layer_set.h"
+#include "compose/layer_set.h"
 
 #include <gtest/gtest.h>
 
@@ -23,7 +23,7 @@ Options optionsOf(const std::string& style, const std::string& text) {
 
 /// The most memory that painting takes at one time.
 size_t mostMemoryOf(const Options& options) {
-    const Composition composition(options);
+    const Composition composition = composed(options);
     const MemoryMeter meter;
     composition.paint();
     return meter.peak();
@@ -51,7 +51,7 @@ TEST(LayerSet, Colours_HaveTheOpacityOfTheFill) {
     const Options options = optionsOf(
         R"({"version": 2, "looks": [{"text": {"color": "#000", "opacity": 0.5}, "textOpacity": 0.5}]})",
         "a");
-    const LayerSet looks(options, *options.inlineStyle, 24, {{0, 1, 0xFF8800}},
+    const LayerSet looks(options, *options.inlineStyle, {}, 24, {{0, 1, 0xFF8800}},
                          [](const std::string&) {});
     ASSERT_EQ(looks.layers().size(), 1U);
     EXPECT_EQ(looks.layers()[0].fillOpacity, 0.25F);

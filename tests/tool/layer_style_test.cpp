@@ -23,7 +23,7 @@ struct Pixel {
 class Painted {
   public:
     explicit Painted(const std::string& json)
-        : mComposition(optionsOf(json)), mImage(mComposition.paint()) {
+        : mComposition(composed(optionsOf(json))), mImage(mComposition.paint()) {
         const voreltext::Canvas& canvas = mComposition.canvas();
         const Box& ink = mComposition.text().layout().inkBox();
         mBox = {ink.left + canvas.x, ink.top + canvas.y, ink.right + canvas.x, ink.bottom + canvas.y};

@@ -19,7 +19,7 @@ std::string faultOf(const std::vector<const char*>& arguments) {
     try {
         optionsOf(arguments);
         return "";
-    } catch (const ToolError& error) {
+    } catch (const std::runtime_error& error) {
         return error.what();
     }
 }

@@ -9,7 +9,7 @@
 #include <string>
 #include <vector>
 
-#include "png_reader.h"
+#include "compose/system/png_reader.h"
 #include "program.h"
 #include "style_file.h"
 
@@ -17,6 +17,7 @@ namespace vorelpaint {
 namespace {
 
 using Bytes = std::vector<uint8_t>;
+using vorelcompose::readPng;
 using voreltext::Image;
 
 constexpr std::array<PngEffort, 3> kEfforts{PngEffort::fast, PngEffort::normal, PngEffort::small};

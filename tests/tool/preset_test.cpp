@@ -40,7 +40,7 @@ Image painted(Style style, int size) {
     options.canvas.width = 3 * size;
     options.canvas.height = 2 * size;
     options.inlineStyle = std::move(style);
-    const Composition composition(options);
+    const Composition composition = composed(options);
     composition.notes().giveTo(failOn);
     return composition.paint();
 }

@@ -10,7 +10,7 @@
 #include <thread>
 #include <vector>
 
-#include "png_reader.h"
+#include "compose/system/png_reader.h"
 #include "program.h"
 
 namespace vorelpaint {

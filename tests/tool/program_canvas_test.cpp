@@ -9,7 +9,7 @@
 #include <string>
 #include <vector>
 
-#include "png_reader.h"
+#include "compose/system/png_reader.h"
 #include "program.h"
 
 namespace vorelpaint {
@@ -20,6 +20,7 @@ using vorel_test::Outcome;
 using vorel_test::readBytes;
 using vorel_test::runVorelpaint;
 using vorel_test::TempDir;
+using vorelcompose::readPng;
 using voreltext::Image;
 using Words = std::vector<std::string>;
 
@@ -339,6 +340,29 @@ TEST(Strict, LengthBeyondTheLimit_IsAnError) {
               "with 100\n");
     EXPECT_EQ(faultOf({"--strict", "--style", style, "--size", "300", "I"}),
               "vorelpaint: stroke.size: 120 pixels are more than the library's 100; painted with 100\n");
+}
+
+TEST(Notes, LengthsBeyondTheLimitByTheScale_AreToldWithTheLookTheyAreIn) {
+    const TempDir dir;
+    const std::string style = dir.write("wide.json", R"({"version": 2, "looks": [
+        {"stroke": {"size": 60, "color": "#000", "position": "outside"}},
+        {"outerShadow": {"angle": 90, "distance": "10%", "size": 4, "color": "#000"}}]})");
+    const auto notesAt = [&](const std::string& scale) {
+        const Outcome outcome = runVorelpaint(
+            {"--style", style, "--size", "96", "--effect-scale", scale, "-o", dir.file("a.png"), "I"});
+        EXPECT_EQ(outcome.exitCode, 0);
+        return outcome.err;
+    };
+    // 60 * 1.66 is 99.6, rounded 100; 9.6 * 10.5 is 100.8.
+    EXPECT_EQ(notesAt("1.66"), "");
+    EXPECT_EQ(notesAt("1.7"),
+              "vorelpaint: note: looks[0].stroke.size: 102 pixels are more than the library's 100; "
+              "painted with 100\n");
+    EXPECT_EQ(notesAt("10.5"),
+              "vorelpaint: note: looks[0].stroke.size: 630 pixels are more than the library's 100; "
+              "painted with 100\n"
+              "vorelpaint: note: looks[1].outerShadow.distance: 101 pixels are more than the library's "
+              "100; painted with 100\n");
 }
 
 // --- markup -------------------------------------------------------------------------------------------

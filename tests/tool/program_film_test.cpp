@@ -20,9 +20,9 @@
 #include <vector>
 
 #include "child_program.h"
+#include "compose/system/png_reader.h"
 #include "film_clip.h"
 #include "film_rate.h"
-#include "png_reader.h"
 #include "program.h"
 #include "subtitle_reader.h"
 
@@ -38,6 +38,7 @@ using vorel_test::RunningVorelpaint;
 using vorel_test::runVorelpaint;
 using vorel_test::Surroundings;
 using vorel_test::TempDir;
+using vorelcompose::readPng;
 using voreltext::Image;
 using Clock = std::chrono::steady_clock;
 using Words = std::vector<std::string>;

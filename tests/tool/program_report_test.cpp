@@ -5,7 +5,7 @@
 #include <string>
 #include <vector>
 
-#include "png_reader.h"
+#include "compose/system/png_reader.h"
 #include "program.h"
 #include "style_file.h"
 
@@ -17,6 +17,7 @@ using vorel_test::readBytes;
 using vorel_test::runVorelpaint;
 using vorel_test::runVorelpaintOnTerminal;
 using vorel_test::TempDir;
+using vorelcompose::readPng;
 using voreltext::Image;
 using Words = std::vector<std::string>;
 

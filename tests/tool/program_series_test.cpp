@@ -458,15 +458,19 @@ TEST_F(Series, MissingInput_IsNoFileThatIsOpenedLater) {
 }
 
 TEST_F(Series, Signals_EndABatchOfManyThreadsAndLeaveWholePictures) {
-    const std::string lines = jobs(200);
+    const std::string lines = jobs(40);
     run(lines, {});
     const Files files = takePainted();
+    const std::string fifo = mInputs.file("fifo");
+    ASSERT_EQ(::mkfifo(fifo.c_str(), 0600), 0);
     for (const int signal : {SIGINT, SIGTERM, SIGHUP}) {
         for (const bool unnamed : {true, false}) {
             Surroundings surroundings;
             surroundings.unnamedFiles = unnamed;
-            RunningVorelpaint program({"--size", "20", "--batch", batch(lines), "--jobs", "3"},
-                                      surroundings);
+            RunningVorelpaint program({"--size", "20", "--batch", fifo, "--jobs", "3"}, surroundings);
+            // As long as the pipe is open, more jobs may come: the batch cannot have ended.
+            std::ofstream pipe(fifo, std::ios::binary);
+            pipe << lines << std::flush;
             EXPECT_TRUE(becomesTrue([&] { return !mDir.list().empty(); }));
             program.send(signal);
             const int status = program.wait();

@@ -12,7 +12,7 @@
 #include <tuple>
 #include <vector>
 
-#include "png_reader.h"
+#include "compose/system/png_reader.h"
 #include "program.h"
 
 namespace vorelpaint {
@@ -25,14 +25,15 @@ using vorel_test::runVorelpaintIn;
 using vorel_test::runVorelpaintInto;
 using vorel_test::Surroundings;
 using vorel_test::TempDir;
+using vorelcompose::readPng;
 using Clock = std::chrono::steady_clock;
 using Words = std::vector<std::string>;
 
 /// Between two looks whether a program writes: short beside the writing, long beside a look.
 constexpr std::chrono::microseconds kLook{200};
 
-/// How often each signal stops each program: once, for all signals take one way, and VOREL_STOPS times to
-/// look for what is rare.
+/// How often each signal stops each program: once, for all signals take one way, and VOREL_STOPS times
+/// to look for what is rare.
 int stopsAskedFor() {
     const char* asked = std::getenv("VOREL_STOPS");
     return asked != nullptr ? std::max(1, std::atoi(asked)) : 1;

@@ -8,7 +8,7 @@
 #include <string>
 #include <vector>
 
-#include "png_reader.h"
+#include "compose/system/png_reader.h"
 #include "voreleffect/VFVersion.h"
 
 namespace vorelpaint {
@@ -19,6 +19,7 @@ using vorel_test::readBytes;
 using vorel_test::runVorelpaint;
 using vorel_test::runVorelpaintInto;
 using vorel_test::TempDir;
+using vorelcompose::readPng;
 using voreltext::Image;
 using Words = std::vector<std::string>;
 

@@ -6,6 +6,7 @@
 #include <string>
 #include <vector>
 
+#include "compose/error.h"
 #include "error.h"
 #include "program.h"
 #include "tests/support/thinned.h"
@@ -156,7 +157,7 @@ TEST(SubtitleReader, TooMuch_IsRefused) {
     EXPECT_EQ(faultOf("a.srt", bytes), "'a.srt', line 200001: more than 100000 cues");
     const TempDir dir;
     const std::string path = dir.write("a.srt", std::string(kMaxSubtitleBytes + 1, '\n'));
-    EXPECT_THROW(readSubtitles(path), ToolError);
+    EXPECT_THROW(readSubtitles(path), vorelcompose::ComposeError);
 }
 
 /// Whatever the bytes are, they are read or refused.

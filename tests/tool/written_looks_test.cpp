@@ -10,8 +10,8 @@
 #include <utility>
 #include <vector>
 
+#include "compose/layer_set.h"
 #include "font_choice.h"
-#include "layer_set.h"
 #include "style_file.h"
 
 #define VOREL_WRITTEN_LOOK(function, style) void function(VFontEffect::VFEffect& look);

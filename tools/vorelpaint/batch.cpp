@@ -142,7 +142,7 @@ class BatchRun {
         void paint(Workbench& bench) {
             if (!isToDo) return;
             try {
-                picture = painted(options, Composition(options, bench));
+                picture = painted(options, composed(options, bench));
             } catch (const std::bad_alloc&) {
                 throw;
             } catch (const std::exception& error) {

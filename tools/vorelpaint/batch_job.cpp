@@ -123,7 +123,7 @@ Options readJob(const JsonObject& job, const Options& common) {
         }
     }
     requirePicture(options);
-    checkCanvas(options);
+    checkCanvasOf(options);
     checkStandardOutput(options);
     return options;
 }

@@ -8,6 +8,7 @@
 #include <memory>
 #include <system_error>
 
+#include "compose/system/file_bytes.h"
 #include "error.h"
 #include "new_file.h"
 
@@ -19,9 +20,7 @@ namespace fs = std::filesystem;
 constexpr int kMaxLinks = 40;
 
 struct Closer {
-    void operator()(std::FILE* file) const {
-        if (file != stdin) std::fclose(file);
-    }
+    void operator()(std::FILE* file) const { std::fclose(file); }
 };
 using File = std::unique_ptr<std::FILE, Closer>;
 
@@ -82,18 +81,9 @@ bool isStandardOutput(const std::string& path) {
     return path == "-" || openFileOf(followLinks(path)) == STDOUT_FILENO;
 }
 
-std::string readFile(const std::string& path, size_t maxBytes) {
-    const bool standard = path == "-";
-    const std::string name = standard ? "standard input" : inQuotes(path);
-    const File file(standard ? stdin : std::fopen(path.c_str(), "rb"));
-    if (!file) failWithErrno("cannot read " + name);
-    std::string bytes(maxBytes + 1, '\0');
-    bytes.resize(std::fread(bytes.data(), 1, bytes.size(), file.get()));
-    if (std::ferror(file.get()) != 0) failWithErrno("cannot read " + name);
-    if (bytes.size() > maxBytes) {
-        throw ToolError(name + " is longer than " + std::to_string(maxBytes) + " bytes");
-    }
-    return bytes;
+std::string readFileOrInput(const std::string& path, size_t maxBytes) {
+    if (path == "-") return vorelcompose::readAll(stdin, "standard input", maxBytes);
+    return vorelcompose::readFile(path, maxBytes);
 }
 
 void writeFile(const std::string& path, const std::function<void(std::FILE*)>& write) {

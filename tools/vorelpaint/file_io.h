@@ -9,9 +9,9 @@
 
 namespace vorelpaint {
 
-/// The bytes of a file, or of standard input for "-". Throws ToolError when it cannot be read or is
-/// longer than `maxBytes`.
-std::string readFile(const std::string& path, size_t maxBytes);
+/// The bytes of a file, or of standard input for "-". Throws ComposeError when it cannot be read or
+/// is longer than `maxBytes`.
+std::string readFileOrInput(const std::string& path, size_t maxBytes);
 
 /// The open file of this process, by its number, whose name a path is: /dev/fd/3.
 std::optional<int> openFileOf(const std::filesystem::path& path);

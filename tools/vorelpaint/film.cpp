@@ -7,8 +7,8 @@
 #include <string>
 #include <vector>
 
-#include "background.h"
 #include "child_program.h"
+#include "compose/background.h"
 #include "console.h"
 #include "crew.h"
 #include "error.h"

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "note.h"
+#include "compose/note.h"
 #include "options.h"
 
 /// Subtitles as a film: burnt into a clip, or on their own.

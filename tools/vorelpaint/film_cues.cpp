@@ -102,7 +102,7 @@ Box FilmCues::rows() const {
 }
 
 Image FilmCues::paint(const PlacedCue& placed, Workbench& bench) const {
-    const Composition composition(optionsOf(placed.cue, placed.look), bench);
+    const Composition composition = composed(optionsOf(placed.cue, placed.look), bench);
     const Box& area = placed.area;
     const Canvas canvas{area.width(), area.height(), composition.canvas().x - area.left,
                         composition.canvas().y + placed.down - area.top};
@@ -154,7 +154,7 @@ void FilmCues::place(const Cue& cue, const std::string& look) {
     const Note note = [&](const std::string& line) {
         if (mNoted.insert(line).second) mNotes.taker()(placeOf(cue) + line);
     };
-    const Composition composition(optionsOf(cue, look), mBench);
+    const Composition composition = composed(optionsOf(cue, look), mBench);
     composition.notes().giveTo(note);
     const Canvas& canvas = composition.canvas();
     const Box box = movedBy(composition.text().box(), canvas.x, canvas.y);

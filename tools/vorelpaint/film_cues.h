@@ -6,8 +6,8 @@
 #include <string>
 #include <vector>
 
+#include "compose/note.h"
 #include "film_rate.h"
-#include "note.h"
 #include "options.h"
 #include "style/vorelstyle.h"
 #include "subtitle_cue.h"

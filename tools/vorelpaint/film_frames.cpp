@@ -2,7 +2,7 @@
 
 #include <algorithm>
 
-#include "background.h"
+#include "compose/background.h"
 
 namespace vorelpaint {
 namespace {

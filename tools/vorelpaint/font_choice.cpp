@@ -3,15 +3,11 @@
 #include <fcntl.h>
 #include <unistd.h>
 
-#include <filesystem>
-#include <mutex>
-
-#include "error.h"
+#include <memory>
 
 namespace vorelpaint {
 namespace {
 
-using voreltext::FontFile;
 using voreltext::SystemFonts;
 
 /// While it lives, what is written to standard error is lost.
@@ -35,54 +31,24 @@ class SilentErrors {
 };
 
 /// Without fontconfig's own complaints: what fails for want of fonts says so in the program's one line.
-SystemFonts loadFonts() {
+std::unique_ptr<SystemFonts> loadFonts() {
     const SilentErrors silence;
-    return SystemFonts();
-}
-
-/// The jobs of a batch share them, one thread at a time.
-class InstalledFonts {
-  public:
-    FontFile find(const std::string& request) const {
-        const std::lock_guard<std::mutex> alone(mMutex);
-        return mFonts.find(request);
-    }
-    std::optional<FontFile> findFor(const voreltext::Cluster& cluster, const FontFile& main) const {
-        const std::lock_guard<std::mutex> alone(mMutex);
-        return mFonts.findFor(cluster, main);
-    }
-
-  private:
-    SystemFonts mFonts = loadFonts();
-    mutable std::mutex mMutex;
-};
-
-/// Loaded once.
-const InstalledFonts& installedFonts() {
-    static const InstalledFonts fonts;
-    return fonts;
+    return std::make_unique<SystemFonts>();
 }
 
 }  // namespace
 
+vorelcompose::SystemFontSource& fontSource() {
+    static vorelcompose::SystemFontSource fonts(loadFonts);
+    return fonts;
+}
+
 void loadInstalledFonts() {
-    installedFonts();
+    fontSource().load();
 }
 
-bool namesFontFile(const std::string& request) {
-    std::error_code ignored;
-    return request.find('/') != std::string::npos || std::filesystem::is_regular_file(request, ignored);
-}
-
-FontFile findFont(const std::string& request) {
-    std::error_code ignored;
-    if (std::filesystem::is_regular_file(request, ignored)) return {request, 0};
-    if (namesFontFile(request)) throw ToolError("no font file '" + request + "'");
-    return installedFonts().find(request);
-}
-
-std::optional<FontFile> findFontFor(const voreltext::Cluster& cluster, const FontFile& main) {
-    return installedFonts().findFor(cluster, main);
+voreltext::FontFile findFont(const std::string& request) {
+    return fontSource().find(request).file;
 }
 
 }  // namespace vorelpaint

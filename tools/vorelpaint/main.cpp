@@ -64,7 +64,7 @@ void printFacts(const Options& options, const LayerSet& looks, const Margins& ma
 /// What is printed about a look that no text is given for.
 void presentLook(const Options& options) {
     HeldNotes notes;
-    const LayerSet looks(options, chosenStyle(options), options.size, {}, notes.taker());
+    const LayerSet looks = looksOf(options, {}, notes.taker());
     if (options.strict) notes.refuse();
     printFacts(options, looks, voreltext::marginsOf(looks.layers()));
     if (options.explain) print(explanationOf(options, looks));
@@ -74,7 +74,7 @@ void presentLook(const Options& options) {
 /// What is printed about a look and its picture.
 void present(const Options& options) {
     if (!options.text && !options.textFile) return presentLook(options);
-    const Composition composition(options);
+    const Composition composition = composed(options);
     printFacts(options, composition.looks(), composition.margins());
     if (options.explain) print(explanationOf(options, composition));
     handOver(options, painted(options, composition), sayNote);

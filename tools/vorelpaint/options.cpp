@@ -171,20 +171,14 @@ void checkCombination(const Options& options) {
     if (options.batch) return checkBatch(options);
     if (options.film.subtitles) return checkFilm(options);
     checkOutput(options);
-    checkCanvas(options);
+    checkCanvasOf(options);
 }
 
 }  // namespace
 
-void checkCanvas(const Options& options) {
-    const voreltext::CanvasRequest& canvas = options.canvas;
-    if (options.fit == Fit::wrap && !canvas.width) {
-        throw ToolError("fit: wrap breaks lines at a width; none is given");
-    }
-    if (options.fit == Fit::shrink && !canvas.width && !canvas.height) {
-        throw ToolError("fit: shrink makes a text fit a width or a height; neither is given");
-    }
-    if (options.sheet && (canvas.width || canvas.height)) {
+void checkCanvasOf(const Options& options) {
+    checkCanvas(options);
+    if (options.sheet && (options.canvas.width || options.canvas.height)) {
         throw ToolError("a sheet has the size of its cells; no width or height can be given");
     }
 }

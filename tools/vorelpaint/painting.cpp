@@ -1,28 +1,27 @@
 #include "painting.h"
 
-#include <algorithm>
-#include <array>
-#include <cerrno>
-#include <cstdio>
-#include <cstring>
 #include <string>
 #include <utility>
 
-#include "background.h"
 #include "console.h"
-#include "error.h"
 #include "file_io.h"
 #include "png_writer.h"
+#include "ranges.h"
 #include "report.h"
+#include "style_file.h"
 
 namespace vorelpaint {
 
-using voreltext::Box;
-using voreltext::Canvas;
 using voreltext::Image;
-using voreltext::Margins;
 
 namespace {
+
+std::string bytesOfText(const Options& options) {
+    if (options.text) return *options.text;
+    std::string text = readFileOrInput(options.textFile.value(), kMaxTextBytes);
+    if (!text.empty() && text.back() == '\n') text.pop_back();
+    return text;
+}
 
 /// The bytes of the file of a picture on its background.
 std::vector<uint8_t> fileOf(const Options& options, Image picture) {
@@ -32,42 +31,17 @@ std::vector<uint8_t> fileOf(const Options& options, Image picture) {
 
 }  // namespace
 
-Composition::Composition(const Options& options, Workbench& bench)
-    : mSource(options),
-      mText(bench.texts.text(options, bench.fonts, mSource)),
-      mLooks(bench.styles.looks(options, mText->size(), mSource.colours(), mNotes.taker())),
-      mMargins(marginsOf(mLooks->layers())),
-      mCanvas(placedOn(options.canvas, mText->box(), mMargins)) {
-    noteMissing(mText->layout(), mSource, mNotes.taker());
-    noteCut(mCanvas, mText->layout().inkBox(), mMargins, mNotes.taker());
-    if (options.strict) mNotes.refuse();
+SourceText sourceOf(const Options& options) {
+    return {bytesOfText(options), options.markup};
 }
 
-Composition::Composition(const Options& options) : Composition(options, std::make_unique<Workbench>()) {}
-
-Composition::Composition(const Options& options, std::unique_ptr<Workbench> bench)
-    : Composition(options, *bench) {}
-
-Image Composition::paint() const {
-    return voreltext::paint(mLooks->layers(), mText->layout(), mCanvas);
+Composition composed(const Options& options, Workbench& bench) {
+    return {options, sourceOf(options), [&] { return chosenStyle(options, bench.styles); }, bench};
 }
 
-void noteCut(const Canvas& canvas, const Box& ink, const Margins& margins, const Note& note) {
-    struct Side {
-        const char* name;
-        int beyond;
-    };
-    const std::array<Side, 4> sides{
-        {{"on the left", -(canvas.x + ink.left - margins.left)},
-         {"at the top", -(canvas.y + ink.top - margins.top)},
-         {"on the right", canvas.x + ink.right + margins.right - canvas.width},
-         {"at the bottom", canvas.y + ink.bottom + margins.bottom - canvas.height}}};
-    std::string places;
-    for (const Side& side : sides) {
-        if (side.beyond <= 0) continue;
-        places += (places.empty() ? "" : ", ") + std::to_string(side.beyond) + " " + side.name;
-    }
-    if (!places.empty()) note("the picture cuts pixels of the text or its effects off: " + places);
+Composition composed(const Options& options) {
+    Workbench bench;
+    return composed(options, bench);
 }
 
 void writePicture(const Options& options, Image picture) {

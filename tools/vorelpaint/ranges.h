@@ -1,30 +1,16 @@
 #pragma once
 
 #include <cstddef>
-#include <sstream>
-#include <string>
+#include <cstdint>
 
+#include "compose/limits.h"
 #include "film_rate.h"
-#include "text/voreltext.h"
 
 /// What can be asked for at most; help and manual name the same.
 namespace vorelpaint {
 
-/// From `low` to `high`, both taken.
-template <typename Number>
-struct Limits {
-    Number low;
-    Number high;
-};
+using namespace vorelcompose;  // the limits of one picture
 
-constexpr Limits<int> kFontSize{1, 1000};
-constexpr Limits<int> kPadding{0, 1000};
-constexpr Limits<int> kCanvasSide{1, voreltext::TextLayout::kMaxSide};
-constexpr Limits<int> kMargin{0, 8000};
-constexpr Limits<float> kLineHeight{0.5F, 10.0F};
-constexpr Limits<float> kLetterSpacing{-200.0F, 200.0F};  ///< pixels, or percent of the font size
-constexpr Limits<float> kEffectScale{0.05F, 20.0F};
-constexpr Limits<float> kOpacity{0.0F, 1.0F};
 constexpr Limits<size_t> kSheetSizes{1, 16};  ///< how many a sheet has
 
 constexpr Limits<int> kJobs{1, 64};  ///< at a time
@@ -32,18 +18,6 @@ constexpr Limits<int> kShards{1, 100000};
 constexpr Limits<int> kFade{0, 60000};  ///< milliseconds
 constexpr Limits<int64_t> kFrameRates{1, FrameRate::kMost};
 
-constexpr size_t kMostFonts = 16;  ///< that a text asks in turn
-constexpr size_t kMaxTextBytes = size_t{1} << 16;
-constexpr size_t kMaxStyleBytes = size_t{1} << 17;
 constexpr size_t kMaxJobBytes = size_t{1} << 18;  ///< room for the largest text and the largest style
-constexpr unsigned int kMaxPatternSide = 4096;    ///< of a picture that is read
-
-/// "1 to 1000".
-template <typename Number>
-std::string spelled(const Limits<Number>& limits) {
-    std::ostringstream text;
-    text << limits.low << " to " << limits.high;
-    return text.str();
-}
 
 }  // namespace vorelpaint

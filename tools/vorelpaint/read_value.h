@@ -33,21 +33,12 @@ std::optional<Number> numberIn(std::string_view given) {
 }
 
 template <typename Number>
-bool contains(const Limits<Number>& limits, Number number) {
-    return number >= limits.low && number <= limits.high;
-}
-
-template <typename Number>
 Number readNumber(const Limits<Number>& limits, const std::string& given) {
     const std::optional<Number> number = numberIn<Number>(given);
     if (number && contains(limits, *number)) return *number;
     refuse(given,
            (std::is_integral_v<Number> ? "no whole number from " : "no number from ") + spelled(limits));
 }
-
-/// A word and what it stands for.
-template <typename Value>
-using Word = std::pair<const char*, Value>;
 
 /// The words with `separator` between them.
 template <typename Words>

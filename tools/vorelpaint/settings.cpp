@@ -17,21 +17,20 @@ namespace {
 
 using vorelstyle::Length;
 using vorelstyle::parseColour;
-using voreltext::Align;
-using voreltext::Anchor;
 using Read = Setting::Read;
 
-Read flag(bool Options::*member) {
+template <typename Part>
+Read flag(bool Part::*member) {
     return [member](Options& options, const std::string& given) { options.*member = given == "true"; };
 }
 
-template <typename Member>
-Read text(Member Options::*member) {
+template <typename Part, typename Member>
+Read text(Member Part::*member) {
     return [member](Options& options, const std::string& given) { options.*member = given; };
 }
 
-template <typename Number, typename Member>
-Read numberWithin(const Limits<Number>& limits, Member Options::*member) {
+template <typename Number, typename Part, typename Member>
+Read numberWithin(const Limits<Number>& limits, Member Part::*member) {
     return
         [=](Options& options, const std::string& given) { options.*member = readNumber(limits, given); };
 }
@@ -44,8 +43,8 @@ Read pixelsOfCanvas(const Limits<int>& limits, Member voreltext::CanvasRequest::
 }
 
 /// Reads what `parse` understands.
-template <typename Parse, typename Member>
-Read parsed(Parse parse, Member Options::*member, const char* refusal) {
+template <typename Parse, typename Part, typename Member>
+Read parsed(Parse parse, Member Part::*member, const char* refusal) {
     return [=](Options& options, const std::string& given) {
         const auto value = parse(given);
         if (!value) refuse(given, refusal);
@@ -53,31 +52,14 @@ Read parsed(Parse parse, Member Options::*member, const char* refusal) {
     };
 }
 
-constexpr std::array<Word<Align>, 5> kAligns{{{"left", Align::left},
-                                              {"center", Align::center},
-                                              {"right", Align::right},
-                                              {"start", Align::start},
-                                              {"end", Align::end}}};
-constexpr std::array<Word<Anchor>, 9> kAnchors{{{"top-left", Anchor::topLeft},
-                                                {"top", Anchor::top},
-                                                {"top-right", Anchor::topRight},
-                                                {"left", Anchor::left},
-                                                {"center", Anchor::center},
-                                                {"right", Anchor::right},
-                                                {"bottom-left", Anchor::bottomLeft},
-                                                {"bottom", Anchor::bottom},
-                                                {"bottom-right", Anchor::bottomRight}}};
-constexpr std::array<Word<Fit>, 3> kFits{
-    {{"none", Fit::none}, {"shrink", Fit::shrink}, {"wrap", Fit::wrap}}};
 constexpr std::array<Word<PngEffort>, 3> kEfforts{
     {{"fast", PngEffort::fast}, {"normal", PngEffort::normal}, {"small", PngEffort::small}}};
 constexpr std::array<Word<PictureOf>, 2> kPicturesOf{
     {{"frame", PictureOf::frame}, {"cue", PictureOf::cue}}};
-constexpr std::array<Word<TextBox>, 2> kBoxes{{{"ink", TextBox::ink}, {"line", TextBox::line}}};
 constexpr std::array<Word<const char*>, 3> kShells{{{"bash", "bash"}, {"zsh", "zsh"}, {"fish", "fish"}}};
 
-template <typename Words, typename Member>
-Read oneOf(const Words& words, Member Options::*member) {
+template <typename Words, typename Part, typename Member>
+Read oneOf(const Words& words, Member Part::*member) {
     return [&words, member](Options& options, const std::string& given) {
         options.*member = wordAmong(words, given);
     };

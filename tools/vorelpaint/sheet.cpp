@@ -7,10 +7,8 @@
 #include <vector>
 
 #include "crew.h"
-#include "layer_set.h"
 #include "painting.h"
 #include "progress.h"
-#include "set_text.h"
 #include "style_file.h"
 #include "workbench.h"
 
@@ -86,9 +84,8 @@ Column columnOf(const Options& options, Workbench& bench, const SourceText& sour
         chosen.preset = preset;
         const std::string prefix = preset + ": ";
         const Note noteOfPreset = [&](const std::string& line) { note(prefix + line); };
-        column.cells.push_back(
-            {preset, LayerSet(chosen, chosenStyle(chosen), size, source.colours(), noteOfPreset),
-             labelOf(chosen, bench, preset).layout().inkBox()});
+        column.cells.push_back({preset, looksOf(chosen, source.colours(), noteOfPreset),
+                                labelOf(chosen, bench, preset).layout().inkBox()});
     }
     return column;
 }
@@ -237,7 +234,7 @@ int sheetColumns(int count, int cellWidth, int cellHeight) {
 }
 
 void paintSheet(const Options& options, const Note& note) {
-    const SourceText source(options);
+    const SourceText source = sourceOf(options);
     const std::vector<int> sizes =
         options.sheetSizes.empty() ? std::vector<int>{options.size} : options.sheetSizes;
     HeldNotes notes;

@@ -1,11 +1,9 @@
 #include "style_file.h"
 
 #include <array>
-#include <utility>
 
 #include "error.h"
 #include "file_io.h"
-#include "png_reader.h"
 #include "ranges.h"
 
 namespace vorelpaint {
@@ -13,10 +11,9 @@ namespace {
 
 namespace fs = std::filesystem;
 
-using vorelstyle::LoadImage;
-using vorelstyle::PatternImage;
 using vorelstyle::Style;
-using vorelstyle::StyleError;
+
+constexpr const char* kStandardInput = "-";
 
 /// The presets installed with the running program, or else those that it was built beside.
 fs::path presetDir() {
@@ -34,19 +31,31 @@ fs::path presetDir() {
 
 }  // namespace
 
-Style loadStyle(const fs::path& path) {
-    return vorelstyle::parseStyle(readFile(path.string(), kMaxStyleBytes), path.string());
+std::optional<fs::path> chosenStyleFile(const Options& options) {
+    if (options.inlineStyle) return std::nullopt;
+    if (options.preset) return findPreset(*options.preset);
+    return options.style;
 }
 
-LoadImage imagesOf(const Style& style) {
-    return [directory = fs::path(style.name).parent_path()](const std::string& image) -> PatternImage {
-        try {
-            voreltext::Image read = readPng(directory / image);
-            return {read.width, read.height, std::move(read.pixels)};
-        } catch (const ToolError& error) {
-            throw StyleError(error.what());
-        }
-    };
+Style chosenStyle(const Options& options) {
+    if (options.inlineStyle) return *options.inlineStyle;
+    const std::optional<fs::path> file = chosenStyleFile(options);
+    if (!file) return {};
+    if (*file != kStandardInput) return loadStyle(*file);
+    return vorelstyle::parseStyle(readFileOrInput(kStandardInput, kMaxStyleBytes), kStandardInput);
+}
+
+/// One that stands in a job or nowhere is in no file.
+FoundStyle chosenStyle(const Options& options, StyleShelf& shelf) {
+    const std::optional<fs::path> file = chosenStyleFile(options);
+    if (!file || *file == kStandardInput) return foundStyle(chosenStyle(options));
+    return shelf.style(*file);
+}
+
+LayerSet looksOf(const Options& options, const std::vector<vorelstyle::ColourRange>& colours,
+                 const Note& note) {
+    const Style style = chosenStyle(options);
+    return {options, style, imagesOf(style), options.size, colours, note};
 }
 
 std::vector<std::string> presetNames() {

@@ -321,7 +321,7 @@ std::vector<Cue> subtitlesIn(std::string_view bytes, const std::string& path) {
 
 std::vector<Cue> readSubtitles(const std::string& path) {
     readerOf(path);
-    return subtitlesIn(readFile(path, kMaxSubtitleBytes), path);
+    return subtitlesIn(readFileOrInput(path, kMaxSubtitleBytes), path);
 }
 
 std::string timeName(int64_t ms) {

@@ -23,8 +23,9 @@ constexpr int64_t kLongestFilmMs = int64_t{24} * 60 * 60 * 1000;
 
 /// The cues of a SubRip (.srt), WebVTT (.vtt) or ASS file (.ass, .ssa) in UTF-8, in the order of their
 /// starts, those of one start in that of the file. Left out are cues without a text and those that end
-/// where they start. Throws ToolError, naming file and line, for what cannot be read, and for times that
-/// run backwards or beyond kLongestFilmMs; it throws, too, when there is no cue, or more than kMostCues.
+/// where they start. Throws ToolError or ComposeError, naming file and line, for what cannot be read,
+/// and for times that run backwards or beyond kLongestFilmMs; it throws, too, when there is no cue, or
+/// more than kMostCues.
 ///
 /// A cue's names are, in WebVTT, its identifier, classes and voices; in ASS its style and who speaks.
 std::vector<Cue> readSubtitles(const std::string& path);

@@ -2,6 +2,11 @@ import java.nio.ByteBuffer;
 import java.util.Arrays;
 import jdk.incubator.foreign.MemorySegment;
 import jdk.incubator.foreign.ResourceScope;
+import org.voreleffect.Glyph;
+import org.voreleffect.Look;
+import org.voreleffect.Painter;
+import org.voreleffect.Picture;
+import org.voreleffect.PictureView;
 import org.voreleffect.VorelEffect;
 
 /**
@@ -19,6 +24,8 @@ public final class ClosedMemoryTest {
         destinationClosedBeforeTheRun();
         destinationClosedWithinTheRun();
         coverageClosedWithinTheRun();
+        coverageOfAGlyphThatIsClosed();
+        memoryOfAViewThatIsClosed();
         System.out.println("what is closed is refused");
     }
 
@@ -50,6 +57,29 @@ public final class ClosedMemoryTest {
             look.finish();
         }
         check(picture.equals(painted()), "the run goes on");
+    }
+
+    private static void coverageOfAGlyphThatIsClosed() {
+        try (Painter painter = new Painter(new Look())) {
+            Glyph glyph;
+            try (ResourceScope scope = ResourceScope.newConfinedScope()) {
+                glyph = new Glyph(0, 0, buffer(WIDTH * HEIGHT, scope), WIDTH, HEIGHT);
+            }
+            refused(() -> painter.paint(glyph));
+            refused(() -> painter.paint(glyph, PictureView.of(new int[1], 1, 1), 0, 0));
+            Glyph open = new Glyph(0, 0, coverage(), WIDTH, HEIGHT);
+            check(painter.paint(open).width() == WIDTH, "the next picture");
+        }
+    }
+
+    private static void memoryOfAViewThatIsClosed() {
+        Picture picture = new Look().paint(new Glyph(0, 0, coverage(), WIDTH, HEIGHT));
+        PictureView view;
+        try (ResourceScope scope = ResourceScope.newConfinedScope()) {
+            view = PictureView.of(buffer(WIDTH * HEIGHT * 4, scope), WIDTH, HEIGHT);
+        }
+        refused(() -> picture.layOver(view, 0, 0));
+        refused(() -> new Look().paint(new Glyph(0, 0, coverage(), WIDTH, HEIGHT), view, 0, 0));
     }
 
     private static VorelEffect look() {

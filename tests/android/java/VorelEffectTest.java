@@ -1,6 +1,4 @@
 import java.io.IOException;
-import java.lang.ref.PhantomReference;
-import java.lang.ref.ReferenceQueue;
 import java.lang.ref.WeakReference;
 import java.lang.reflect.Field;
 import java.lang.reflect.InvocationTargetException;
@@ -19,13 +17,14 @@ import java.util.Map;
 import java.util.concurrent.atomic.AtomicBoolean;
 import java.util.concurrent.atomic.AtomicReference;
 import java.util.function.Consumer;
+import org.voreleffect.Stops;
 import org.voreleffect.VorelEffect;
 
 /**
  * Tests of the Java facade: the same margins, keys and pixels as C++ (paint_runs.cpp wrote them), and
- * what is refused. Each method whose name starts with "test" is a test; its name is a behaviour.
+ * what is refused.
  */
-public final class VorelEffectTest {
+public final class VorelEffectTest extends Checks {
     private static final int WIDTH = 67;
     private static final int HEIGHT = 49;
     private static final int TEXT_COLOR = 0x3366CC;
@@ -47,22 +46,7 @@ public final class VorelEffectTest {
     }
 
     public static void main(String[] arguments) throws IllegalAccessException {
-        VorelEffectTest tests = new VorelEffectTest(Paths.get(arguments[0]));
-        int run = 0;
-        int failed = 0;
-        for (Method method : VorelEffectTest.class.getDeclaredMethods()) {
-            if (!method.getName().startsWith("test")) continue;
-            ++run;
-            try {
-                method.invoke(tests);
-            } catch (InvocationTargetException e) {
-                ++failed;
-                System.err.println("FAILED " + method.getName());
-                e.getCause().printStackTrace();
-            }
-        }
-        System.out.println(run + " tests, " + failed + " failed");
-        System.exit(run > 0 && failed == 0 ? 0 : 1);
+        new VorelEffectTest(Paths.get(arguments[0])).run();
     }
 
     // --- The same as C++ ------------------------------------------------------------------------
@@ -371,21 +355,6 @@ public final class VorelEffectTest {
         check(most < 160_000, "10,000 looks of 32 kB that were never closed hold " + most + " kB");
     }
 
-    /** Collects, and waits for the thread that queues what was found: under load it runs late. */
-    private static void collect() throws InterruptedException {
-        ReferenceQueue<Object> found = new ReferenceQueue<>();
-        PhantomReference<Object> gone = new PhantomReference<>(new Object(), found);
-        System.gc();
-        for (int seconds = 0; seconds < 10 && found.remove(1000) != gone; ++seconds) {}
-    }
-
-    private static long residentKb() throws IOException {
-        for (String line : Files.readAllLines(Paths.get("/proc/self/status"))) {
-            if (line.startsWith("VmRSS:")) return Long.parseLong(line.replaceAll("[^0-9]", ""));
-        }
-        throw new AssertionError("no VmRSS");
-    }
-
     void testObjectIsNotFreedWhileItsLastCallRuns() throws InterruptedException {
         ByteBuffer expected = everythingPainted();
         byte[] key = everything().getMapKey();
@@ -514,6 +483,69 @@ public final class VorelEffectTest {
         }
     }
 
+    void testStopsGiveWhatTheirThreeArraysGive() {
+        Stops stops = Stops.of(COLORS, OPACITIES, LOCATIONS);
+        try (VorelEffect one = new VorelEffect();
+                VorelEffect three = new VorelEffect()) {
+            one.addOuterGlowText(5, 0.5f, stops);
+            three.addOuterGlowText(5, 0, 0.5f, COLORS, OPACITIES, LOCATIONS);
+            one.addInnerGlowText(4, 1, stops);
+            three.addInnerGlowText(4, 0, 1, COLORS, OPACITIES, LOCATIONS);
+            one.addLinearGradientText(30, 1, 0.7f, stops);
+            three.addLinearGradientText(30, 1, 0.7f, COLORS, OPACITIES, LOCATIONS);
+            one.addRadialGradientText(0.5f, 0.9f, stops);
+            three.addRadialGradientText(0.5f, 0.9f, COLORS, OPACITIES, LOCATIONS);
+            check(Arrays.equals(one.getMapKey(), three.getMapKey()), "keys");
+            refused(() -> one.addOuterGlowText(5, 0.5f, null));
+            refused(() -> one.addInnerGlowText(5, 0.5f, null));
+            refused(() -> one.addLinearGradientText(5, 0.5f, 1, null));
+            refused(() -> one.addRadialGradientText(5, 0.5f, null));
+        }
+    }
+
+    // --- Copies ---------------------------------------------------------------------------------
+
+    void testCopiesOfALookThatWasNeverRunPaintWhatItWouldPaint() {
+        ByteBuffer expected = everythingPainted();
+        try (VorelEffect original = everything()) {
+            for (int run = 0; run < 3; ++run) {
+                try (VorelEffect copy = original.copy()) {
+                    copy.getMapKey(TEXT_COLOR); // an add-call, which would turn a second run around
+                    ByteBuffer picture = picture();
+                    paintRun(copy, picture);
+                    check(picture.equals(expected), "run " + run);
+                }
+            }
+        }
+    }
+
+    void testCopyIsIndependent() {
+        VorelEffect original = everything();
+        byte[] key = original.getMapKey();
+        original.setTextOpacity(0.5f);
+        try (VorelEffect copy = original.copy()) {
+            check(Arrays.equals(key, copy.getMapKey()), "key");
+            check(copy.getTextOpacity() == 0.5f, "text opacity");
+            copy.addStrokeText(9, 0x123456, 1, 0, VorelEffect.STROKE_OUTSIDE);
+            copy.setTextOpacity(0.25f);
+            check(Arrays.equals(key, original.getMapKey()), "the original has changed");
+            check(original.getTextOpacity() == 0.5f, "the original's text opacity has changed");
+            original.close();
+            check(copy.getRightOffset() == 9, "margin of the copy, the original closed");
+        }
+    }
+
+    void testCopyHasNoRun() {
+        try (VorelEffect original = everything()) {
+            original.begin(WIDTH, HEIGHT, picture());
+            try (VorelEffect copy = original.copy()) {
+                misplaced(copy::finish);
+            }
+            glyphs(original);
+            original.finish();
+        }
+    }
+
     void testGlowWithoutStopsIsThatOfOneColor() {
         try (VorelEffect empty = new VorelEffect();
                 VorelEffect plain = new VorelEffect()) {
@@ -568,7 +600,7 @@ public final class VorelEffectTest {
                     ++called;
                 }
             }
-            check(called == 17, "methods called: " + called);
+            check(called == 21, "methods called: " + called);
             glyphs(look);
             look.finish();
             check(picture.equals(everythingPainted()), "pixels");
@@ -638,6 +670,7 @@ public final class VorelEffectTest {
         }
     }
 
+    @SuppressWarnings("deprecation")
     void testBevelAndEmbossAddNothing() {
         try (VorelEffect look = new VorelEffect()) {
             int bevel = look.addBevelText(0, 5, 1, 0, 0, 2, 1, 120, 30, 0xFFFFFF, 1, 0, 1);
@@ -758,7 +791,7 @@ public final class VorelEffectTest {
         try {
             Field painter = VorelEffect.class.getDeclaredField("painter");
             painter.setAccessible(true);
-            Field address = painter.getType().getDeclaredField("look");
+            Field address = painter.getType().getDeclaredField("address");
             address.setAccessible(true);
             List<Object> all = new ArrayList<>(Arrays.asList(arguments));
             all.add(0, address.get(painter.get(look)));
@@ -772,27 +805,5 @@ public final class VorelEffectTest {
         } catch (ReflectiveOperationException e) {
             throw new AssertionError(e);
         }
-    }
-
-    private static void refused(Runnable call) {
-        expect(IllegalArgumentException.class, call);
-    }
-
-    private static void misplaced(Runnable call) {
-        expect(IllegalStateException.class, call);
-    }
-
-    private static void expect(Class<? extends Throwable> kind, Runnable call) {
-        try {
-            call.run();
-        } catch (RuntimeException | OutOfMemoryError e) {
-            check(e.getClass() == kind, kind.getSimpleName() + " expected, not " + e);
-            return;
-        }
-        throw new AssertionError(kind.getSimpleName() + " expected");
-    }
-
-    private static void check(boolean holds, String what) {
-        if (!holds) throw new AssertionError(what);
     }
 }

@@ -1,7 +1,11 @@
 #include <gtest/gtest.h>
 
+#include <algorithm>
+#include <array>
 #include <cmath>
+#include <cstdlib>
 #include <limits>
+#include <set>
 #include <vector>
 
 #include "tests/support/core_compare.h"
@@ -139,6 +143,89 @@ TEST(LinearGradient, Steps_AreStripesInABoxWiderThan256) {
         EXPECT_EQ(table[static_cast<size_t>(128 + (x - 1024) / 8)], row[static_cast<size_t>(x)]) << x;
     EXPECT_EQ(row[1024 - 7], row[1024 + 7]);
     EXPECT_NE(row[1024], row[1024 + 8]);
+}
+
+TEST(LinearGradient, Steps_AreAsWideAsTheBoxTimesTheScaleBy256) {
+    // A quarter of 1024 columns shows the ramp, an entry a column, as a box of 256 at a scale of 1 does.
+    const std::vector<uint32_t> table = tableOf(kRamp);
+    const std::vector<uint32_t> row =
+        rowOf(kGradient.painted(sceneOf(filledMask(1024, 1, 255)), 0.0F, 0.25F, kRamp).dst, 0);
+    for (int x = 0; x < 256; ++x)
+        EXPECT_EQ(table[static_cast<size_t>(x)], row[static_cast<size_t>(384 + x)]) << x;
+    EXPECT_EQ(table[0], row[0]);
+    EXPECT_EQ(table[255], row[1023]);
+}
+
+/// The largest change of a channel from an entry to the next.
+int largestStep(const std::vector<uint32_t>& table) {
+    int largest = 0;
+    for (size_t i = 1; i < table.size(); ++i)
+        for (const int shift : {0, 8, 16})
+            largest = std::max(largest, std::abs(static_cast<int>(table[i] >> shift & 255) -
+                                                 static_cast<int>(table[i - 1] >> shift & 255)));
+    return largest;
+}
+
+TEST(LinearGradient, Steps_BetweenTwoStopsOverTheWholeRampAreOneValueAtMost) {
+    // 255 values at most on 256 entries. From black to white each grey from 0 to 254 is there.
+    const std::vector<uint32_t> greys = tableOf(kRamp);
+    EXPECT_EQ(1, largestStep(greys));
+    EXPECT_EQ(255U, std::set<uint32_t>(greys.begin(), greys.end()).size());
+    EXPECT_EQ(1, largestStep(tableOf({{0xFF5B2A86, 1.0F, 0.0F}, {0xFFFFB03A, 1.0F, 1.0F}})));
+}
+
+TEST(LinearGradient, Steps_BetweenStopsATenthApartAreTenValues) {
+    // 255 values on 25.6 entries: 26 steps of 9.96, off by the rounding of both ends.
+    const std::vector<uint32_t> greys = tableOf({{kBlack, 1.0F, 0.4F}, {kWhite, 1.0F, 0.5F}});
+    EXPECT_EQ(27U, std::set<uint32_t>(greys.begin(), greys.end()).size());
+    EXPECT_NEAR(10, largestStep(greys), 1);
+}
+
+/// A colour in CIE L*a*b* under the white of sRGB.
+std::array<double, 3> labOf(uint32_t rgb) {
+    const auto linear = [rgb](int shift) {
+        const double value = (rgb >> shift & 255) / 255.0;
+        return value <= 0.04045 ? value / 12.92 : std::pow((value + 0.055) / 1.055, 2.4);
+    };
+    const auto root = [](double t) {
+        return t > 216.0 / 24389 ? std::cbrt(t) : (t * 24389 / 27 + 16) / 116;
+    };
+    const double red = linear(16);
+    const double green = linear(8);
+    const double blue = linear(0);
+    const double x = root((0.4124 * red + 0.3576 * green + 0.1805 * blue) / 0.9505);
+    const double y = root(0.2126 * red + 0.7152 * green + 0.0722 * blue);
+    const double z = root((0.0193 * red + 0.1192 * green + 0.9505 * blue) / 1.089);
+    return {116 * y - 16, 500 * (x - y), 200 * (y - z)};
+}
+
+/// Mean and largest distance from an entry to the next one of another colour, in tenths.
+std::array<long, 2> distancesOf(const std::vector<uint32_t>& table) {
+    double sum = 0;
+    double largest = 0;
+    int count = 0;
+    for (size_t i = 1; i < table.size(); ++i) {
+        if (table[i] == table[i - 1]) continue;
+        ++count;
+        const auto a = labOf(table[i - 1]);
+        const auto b = labOf(table[i]);
+        const double distance = std::hypot(a[0] - b[0], a[1] - b[1], a[2] - b[2]);
+        sum += distance;
+        largest = std::max(largest, distance);
+    }
+    return {std::lround(sum / count * 10), std::lround(largest * 10)};
+}
+
+TEST(LinearGradient, Steps_AreAsFarApartForTheEyeAsItsPageSays) {
+    EXPECT_EQ((std::array<long, 2>{7, 12}),
+              distancesOf(tableOf({{0xFF5B2A86, 1, 0}, {0xFFFFB03A, 1, 1}})));
+    EXPECT_EQ((std::array<long, 2>{25, 49}), distancesOf(tableOf({{0xFFFF0000, 1, 0},
+                                                                  {0xFFFFFF00, 1, 0.17F},
+                                                                  {0xFF00FF00, 1, 0.33F},
+                                                                  {0xFF00FFFF, 1, 0.5F},
+                                                                  {0xFF0000FF, 1, 0.67F},
+                                                                  {0xFFFF00FF, 1, 0.83F},
+                                                                  {0xFFFF0000, 1, 1}})));
 }
 
 TEST(LinearGradient, Scale_StretchesOrCompressesTheRamp) {

@@ -2,7 +2,9 @@
 #include <voreleffect/VFVersion.h>
 #include <voreleffect/look.h>
 
+#include <algorithm>
 #include <climits>
+#include <cstdlib>
 #include <cstring>
 #include <limits>
 #include <memory>
@@ -195,6 +197,40 @@ TEST(LookPictures, OfTheirOwn_HoldAllThatIsPaintedAndNoMore) {
         EXPECT_TRUE(samePage(expected, actual));
         if (HasFailure()) break;
     }
+}
+
+TEST(LookPictures, OfTheirOwnOverOtherPixels_DifferByTwoAtMostFromPaintingTwoLooksThere) {
+    // Rounding to nearest is off by half at most, of a value that is scaled down by less than 1. Painted
+    // onto the page two looks round twice; as a picture the upper one's rounding is in channels and
+    // alpha, and laying it over rounds once more: 1 and 1.5 values, together 2 whole ones.
+    int largest = 0;
+    for (int seed = 0; seed < thinned(300); ++seed) {
+        SCOPED_TRACE("seed " + std::to_string(seed));
+        Random random(static_cast<uint64_t>(seed) + 250'000);
+        const std::vector<Look> looks = {randomLook(random).look, randomLook(random).look};
+        const Text text = randomText(random);
+        Page painted(60, 50);
+        for (size_t i = 0; i < painted.bytes.size(); i += 4) {
+            for (size_t channel = 0; channel < 3; ++channel)
+                painted.bytes[i + channel] = random.byte();
+            painted.bytes[i + 3] = 255;
+        }
+        Page laid = painted;
+        ASSERT_TRUE(paint(looks, text.glyphs(), painted.view(), 12, 12));
+        const auto picture = paint(looks, text.glyphs());
+        ASSERT_TRUE(picture);
+        ASSERT_TRUE(picture->layOver(laid.view(), 12, 12));
+        for (size_t i = 0; i < painted.bytes.size(); ++i)
+            largest = std::max(largest, std::abs(painted.bytes[i] - laid.bytes[i]));
+        const auto alone = paint(looks[0], text.glyphs());
+        ASSERT_TRUE(alone);
+        Page other = laid;
+        ASSERT_TRUE(paint(looks[0], text.glyphs(), laid.view(), 12, 12));
+        ASSERT_TRUE(alone->layOver(other.view(), 12, 12));
+        ASSERT_TRUE(samePage(laid, other)) << "of one look";
+    }
+    EXPECT_GE(largest, 1);
+    EXPECT_LE(largest, 2);
 }
 
 /// The longest reaches that there are.
@@ -558,6 +594,36 @@ TEST(LookViews, TouchedBox_IsThatOfTheMarginsWithinTheView) {
     ASSERT_TRUE(touched);
     EXPECT_EQ(touched->top, 0);
     EXPECT_EQ(touched->right, 50);
+    // A single column of the layer is seen.
+    touched = paint(look, squareText(49 + margins.left, 20, 6).glyphs(), page.view());
+    ASSERT_TRUE(touched);
+    EXPECT_EQ(touched->left, 49);
+    EXPECT_EQ(touched->right, 50);
+}
+
+TEST(LookViews, TouchedBox_HoldsEveryPixelThatChanges) {
+    for (int seed = 0; seed < thinned(400); ++seed) {
+        SCOPED_TRACE("seed " + std::to_string(seed));
+        Random random(static_cast<uint64_t>(seed) + 300'000);
+        const TwoLooks a = randomLook(random);
+        const TwoLooks b = randomLook(random);
+        const Text text = randomText(random);
+        Page page = randomPage(random, random.between(1, 40), random.between(1, 40));
+        const Page before = page;
+        const int x = random.between(-60, 60);
+        const int y = random.between(-60, 60);
+        const auto touched = paint({a.look, b.look}, text.glyphs(), page.view(), x, y);
+        ASSERT_TRUE(touched);
+        for (int row = 0; row < page.height; ++row) {
+            for (int column = 0; column < page.width; ++column) {
+                const bool isTouched = column >= touched->left && column < touched->right &&
+                                       row >= touched->top && row < touched->bottom;
+                ASSERT_TRUE(isTouched ||
+                            std::memcmp(before.at(column, row), page.at(column, row), 4) == 0)
+                    << column << ", " << row;
+            }
+        }
+    }
 }
 
 TEST(LookViews, GlyphsElsewhere_AreNothingToPaint) {

@@ -1,14 +1,13 @@
 package org.voreleffect;
 
-import java.lang.ref.PhantomReference;
-import java.lang.ref.ReferenceQueue;
+import androidx.annotation.CheckResult;
+import androidx.annotation.NonNull;
 import java.nio.ByteBuffer;
-import java.util.Collections;
-import java.util.Set;
-import java.util.concurrent.ConcurrentHashMap;
 
 /**
- * A styled-text look and the painter of its runs.
+ * A styled-text look and the painter of its runs, call by call as the C++ class {@code VFEffect} has
+ * them. {@link Look} and {@link Painter} are the plainer way: they paint the same picture each time,
+ * keep track of margins by themselves, and lay what they paint over what is there.
  *
  * <p>Describe the look once with add-calls, then paint any number of runs (a line, a block, a glyph):
  *
@@ -37,6 +36,18 @@ import java.util.concurrent.ConcurrentHashMap;
  * there, and returns the id of the effect. Two looks made by the same calls in the same order paint
  * the same bytes on every device.
  *
+ * <p><b>Which effect lies on top.</b> Effects lie in three groups, from the top: those inside the glyphs
+ * (inner shadow, inner glow, gradients, pattern, inside stroke), then the text fill, then those beneath
+ * the text (outer shadow, outer glow, outside stroke). Within a group the one that was added last lies
+ * on top. The text fill keeps its place wherever it is added. A centred stroke belongs to both sides; it
+ * lies over what was added before it.
+ *
+ * <p><b>The second run.</b> {@link #begin} puts the effects into the order of painting by reversing the
+ * list as it stands, and does so whenever an add-call or a new text opacity came since the last time;
+ * {@link #getMapKey(int)} is an add-call. A look that is painted, gets an add-call and is painted again
+ * shows its groups in the opposite order. So take the key once, before the first run; to change
+ * something between runs, keep a look that is never run and run {@linkplain #copy copies} of it.
+ *
  * <p>What would touch memory that is not there is refused: a null array or buffer, a buffer that is
  * not direct, one with too few bytes remaining, a size out of range give an
  * {@link IllegalArgumentException}, and nothing changes. A closed object, a buffer over memory that its
@@ -45,15 +56,15 @@ import java.util.concurrent.ConcurrentHashMap;
  * {@link OutOfMemoryError}; no run is open then.
  *
  * <p>The methods exclude each other, so that an object may be handed from thread to thread and closed
- * from any of them; separate objects paint at the same time. A buffer's position and limit are read once,
- * when the buffer is handed over: another thread that moves them makes no call touch other memory. Its
- * bytes are the caller's to keep: memory that is closed or unmapped <em>during</em> a call, or that was
- * freed behind the virtual machine's back (the pixels under a buffer that native code has made), cannot be
- * told from memory that is there, and touching it ends the process.
+ * from any of them; separate objects paint at the same time. A buffer's position and limit are read
+ * once, when the buffer is handed over: another thread that moves them makes no call touch other memory.
+ * Its bytes are the caller's to keep: memory that is closed or unmapped <em>during</em> a call, or that
+ * was freed behind the virtual machine's back (the pixels under a buffer that native code has made),
+ * cannot be told from memory that is there, and touching it ends the process.
  *
  * <p>Close an object when it is done. One that was never closed is freed when a later one is made, after
- * the collector has found it unreachable, and until then holds the memory of its effects and of a run that
- * is open.
+ * the collector has found it unreachable, and until then holds the memory of its effects and of a run
+ * that is open.
  */
 public final class VorelEffect implements AutoCloseable {
     /** Position of a stroke: half of it on each side of the edge. Selects layered mode. */
@@ -74,11 +85,10 @@ public final class VorelEffect implements AutoCloseable {
     private static final int LARGEST_PATTERN = 0x3FFFFFFF;
 
     static {
-        System.loadLibrary("voreleffect");
-        System.loadLibrary("voreleffect_jni");
+        Library.load();
     }
 
-    private final Painter painter;
+    private final NativeSide painter;
 
     /**
      * The destination of the open run, as a buffer of our own, whose position and limit nobody moves.
@@ -91,13 +101,31 @@ public final class VorelEffect implements AutoCloseable {
 
     /** A look without effects, at full text opacity. Frees those that were never closed and are gone. */
     public VorelEffect() {
-        Painter.freeForgotten();
-        painter = new Painter(this);
+        painter = new Side(this);
+        painter.hold(nativeCreate());
+    }
+
+    private VorelEffect(VorelEffect original) {
+        painter = new Side(this);
+        painter.hold(original.nativeCopy(original.painter.address()));
     }
 
     /**
-     * Frees the look; a run that is open is dropped. Closing twice does nothing. A call of another thread
-     * that is under way is waited for; what it calls next is refused.
+     * An independent copy: its effects, their ids and the text opacity, but no run. The first run of a
+     * copy reverses the list of effects as it stands, so copy a look that was never run: each of its
+     * copies then paints the picture that the look itself would paint first.
+     *
+     * @return a new object, to be closed as well
+     */
+    @CheckResult
+    @NonNull
+    public synchronized VorelEffect copy() {
+        return new VorelEffect(this);
+    }
+
+    /**
+     * Frees the look; a run that is open is dropped. Closing twice does nothing. A call of another
+     * thread that is under way is waited for; what it calls next is refused.
      */
     @Override
     public synchronized void close() {
@@ -105,51 +133,21 @@ public final class VorelEffect implements AutoCloseable {
         destination = null;
     }
 
-    /**
-     * The native side of an object, which is freed with it: by close, or, where that was never called, once
-     * the collector has found the object unreachable. There is neither a finaliser, which would let an
-     * object be used after its end, nor a thread: looks that are made free those that were forgotten, so
-     * that their number stays bounded wherever it could grow.
-     */
-    private static final class Painter extends PhantomReference<VorelEffect> {
-        /** Painters of unreachable objects. */
-        private static final ReferenceQueue<VorelEffect> FORGOTTEN = new ReferenceQueue<>();
-
-        /** Every painter that is not free: a reference is queued only while it is reachable itself. */
-        private static final Set<Painter> HELD =
-                Collections.newSetFromMap(new ConcurrentHashMap<Painter, Boolean>());
-
-        /** The address of the look; 0 when freed. */
-        private long look;
-
-        Painter(VorelEffect owner) {
-            super(owner, FORGOTTEN);
-            HELD.add(this);
-            look = nativeCreate();
+    private static final class Side extends NativeSide {
+        Side(VorelEffect owner) {
+            super(owner);
         }
 
-        long look() {
-            return look;
-        }
-
-        synchronized void free() {
-            if (look != 0) nativeDestroy(look);
-            look = 0;
-            clear();
-            HELD.remove(this);
-        }
-
-        static void freeForgotten() {
-            for (Object gone = FORGOTTEN.poll(); gone != null; gone = FORGOTTEN.poll()) {
-                ((Painter) gone).free();
-            }
+        @Override
+        void destroy(long made) {
+            nativeDestroy(made);
         }
     }
 
     // --- The look: between runs only ------------------------------------------------------------
 
     /**
-     * Adds a shadow behind the text.
+     * Adds a shadow behind the text: beneath it, over what was added there before.
      *
      * @param angle where the light comes from: 0 from the right, 90 from above
      * @param distance how far the shadow is moved, 0 to 100 pixels
@@ -164,7 +162,7 @@ public final class VorelEffect implements AutoCloseable {
     }
 
     /**
-     * Adds a shadow that falls into the text.
+     * Adds a shadow that falls into the text: inside the glyphs, over what was added there before it.
      *
      * @param angle where the light comes from: 0 from the right, 90 from above
      * @param distance how far the shadow is moved, 0 to 100 pixels
@@ -179,7 +177,7 @@ public final class VorelEffect implements AutoCloseable {
     }
 
     /**
-     * Adds a halo of one colour around the text.
+     * Adds a halo of one colour around the text: beneath it, over what was added there before.
      *
      * @param size reach of the halo, 0 to 100 pixels
      * @param color 0xRRGGBB
@@ -191,9 +189,9 @@ public final class VorelEffect implements AutoCloseable {
     }
 
     /**
-     * Adds a halo around the text that runs through colour stops from the text outwards. The three
-     * arrays are copied and have one length; stops after the 256th are left out, and without stops
-     * the halo has the one colour {@code color}.
+     * Adds a halo around the text that runs through colour stops from the text outwards: beneath the
+     * text, over what was added there before it. The three arrays are copied and have one length; stops
+     * after the 256th are left out, and without stops the halo has the one colour {@code color}.
      *
      * @param size reach of the halo, 0 to 100 pixels
      * @param color 0xRRGGBB, of a halo without stops
@@ -207,17 +205,34 @@ public final class VorelEffect implements AutoCloseable {
             float size,
             int color,
             float opacity,
-            int[] stopColors,
-            float[] stopOpacities,
-            float[] stopLocations) {
+            @NonNull int[] stopColors,
+            @NonNull float[] stopOpacities,
+            @NonNull float[] stopLocations) {
         long look = look();
-        checkStops(stopColors, stopOpacities, stopLocations);
+        Stops.check(stopColors, stopOpacities, stopLocations);
         return nativeAddOuterGlow(
                 look, size, color, opacity, stopColors, stopOpacities, stopLocations);
     }
 
     /**
-     * Adds a glow of one colour from the edges of the text inwards.
+     * Adds a halo around the text that runs through colour stops from the text outwards: beneath the
+     * text, over what was added there before it.
+     *
+     * @param size reach of it, 0 to 100 pixels
+     * @param opacity 0 to 1, multiplies the opacity of each stop
+     * @param stops its colours
+     * @return the id of the effect
+     */
+    public synchronized int addOuterGlowText(float size, float opacity, @NonNull Stops stops) {
+        long look = look();
+        checkGiven(stops);
+        return nativeAddOuterGlow(
+                look, size, 0, opacity, stops.colors(), stops.opacities(), stops.places());
+    }
+
+    /**
+     * Adds a glow of one colour from the edges of the text inwards: inside the glyphs, over what was
+     * added there before it.
      *
      * @param size reach of the glow, 0 to 100 pixels
      * @param color 0xRRGGBB
@@ -229,9 +244,9 @@ public final class VorelEffect implements AutoCloseable {
     }
 
     /**
-     * Adds a glow that runs through colour stops from the edges of the text inwards. The three arrays
-     * are copied and have one length; stops after the 256th are left out, and without stops the glow
-     * has the one colour {@code color}.
+     * Adds a glow that runs through colour stops from the edges of the text inwards: inside the glyphs,
+     * over what was added there before it. The three arrays are copied and have one length; stops after
+     * the 256th are left out, and without stops the glow has the one colour {@code color}.
      *
      * @param size reach of the glow, 0 to 100 pixels
      * @param color 0xRRGGBB, of a glow without stops
@@ -245,17 +260,33 @@ public final class VorelEffect implements AutoCloseable {
             float size,
             int color,
             float opacity,
-            int[] stopColors,
-            float[] stopOpacities,
-            float[] stopLocations) {
+            @NonNull int[] stopColors,
+            @NonNull float[] stopOpacities,
+            @NonNull float[] stopLocations) {
         long look = look();
-        checkStops(stopColors, stopOpacities, stopLocations);
+        Stops.check(stopColors, stopOpacities, stopLocations);
         return nativeAddInnerGlow(
                 look, size, color, opacity, stopColors, stopOpacities, stopLocations);
     }
 
     /**
-     * Nothing paints a bevel: leaves the effects as they are.
+     * Adds a glow that runs through colour stops from the edges of the text inwards: inside the glyphs,
+     * over what was added there before it.
+     *
+     * @param size reach of it, 0 to 100 pixels
+     * @param opacity 0 to 1, multiplies the opacity of each stop
+     * @param stops its colours
+     * @return the id of the effect
+     */
+    public synchronized int addInnerGlowText(float size, float opacity, @NonNull Stops stops) {
+        long look = look();
+        checkGiven(stops);
+        return nativeAddInnerGlow(
+                look, size, 0, opacity, stops.colors(), stops.opacities(), stops.places());
+    }
+
+    /**
+     * Leaves the effects as they are.
      *
      * @param style any number
      * @param size pixels
@@ -271,7 +302,11 @@ public final class VorelEffect implements AutoCloseable {
      * @param shadowColor 0xRRGGBB
      * @param shadowOpacity 0 to 1
      * @return {@link #NO_EFFECT}
+     * @deprecated the library has the numbers of a bevel but no core that paints one, so the call adds
+     *     nothing. What comes near it is a light edge and a dark one: an inner glow or an inside stroke in
+     *     the colour of the light, and an inner shadow from the other side.
      */
+    @Deprecated
     public synchronized int addBevelText(
             int style,
             float size,
@@ -304,7 +339,7 @@ public final class VorelEffect implements AutoCloseable {
     }
 
     /**
-     * Nothing paints an emboss: leaves the effects as they are.
+     * Leaves the effects as they are.
      *
      * @param style any number
      * @param size pixels
@@ -320,7 +355,11 @@ public final class VorelEffect implements AutoCloseable {
      * @param shadowColor 0xRRGGBB
      * @param shadowOpacity 0 to 1
      * @return {@link #NO_EFFECT}
+     * @deprecated the library has the numbers of an emboss but no core that paints one, so the call adds
+     *     nothing. What comes near it is a light edge and a dark one: an inner glow or an inside stroke in
+     *     the colour of the light, and an inner shadow from the other side.
      */
+    @Deprecated
     public synchronized int addEmbossText(
             int style,
             float size,
@@ -353,8 +392,8 @@ public final class VorelEffect implements AutoCloseable {
     }
 
     /**
-     * Adds a ramp across the box of the text. The three arrays are copied and have one length, at
-     * least 1; stops after the 256th are left out.
+     * Adds a ramp across the box of the text: inside the glyphs, over what was added there before it.
+     * The three arrays are copied and have one length, at least 1; stops after the 256th are left out.
      *
      * @param angle 0 runs to the right, 90 upwards
      * @param scale length of the ramp in lengths of the box, 0 to 2; below 0.1 nothing is drawn
@@ -368,9 +407,9 @@ public final class VorelEffect implements AutoCloseable {
             float angle,
             float scale,
             float opacity,
-            int[] stopColors,
-            float[] stopOpacities,
-            float[] stopLocations) {
+            @NonNull int[] stopColors,
+            @NonNull float[] stopOpacities,
+            @NonNull float[] stopLocations) {
         long look = look();
         checkRamp(stopColors, stopOpacities, stopLocations);
         return nativeAddLinearGradient(
@@ -378,8 +417,25 @@ public final class VorelEffect implements AutoCloseable {
     }
 
     /**
-     * Adds a ramp from the centre of the box of the text. The three arrays are copied and have one
-     * length, at least 1; stops after the 256th are left out.
+     * Adds a ramp across the box of the text: inside the glyphs, over what was added there before it.
+     *
+     * @param angle 0 runs to the right, 90 upwards
+     * @param scale length of the ramp in lengths of the box, 0 to 2; below 0.1 nothing is drawn
+     * @param opacity 0 to 1, multiplies the opacity of each stop
+     * @param stops its colours
+     * @return the id of the effect
+     */
+    public synchronized int addLinearGradientText(
+            float angle, float scale, float opacity, @NonNull Stops stops) {
+        long look = look();
+        checkGiven(stops);
+        return nativeAddLinearGradient(
+                look, angle, scale, opacity, stops.colors(), stops.opacities(), stops.places());
+    }
+
+    /**
+     * Adds a ramp from the centre of the box of the text: inside the glyphs, over what was added there
+     * before it. The three arrays are copied and have one length, at least 1; stops after the 256th are left out.
      *
      * @param scale radius in half widths of the box, 0 to 2; below 0.1 nothing is drawn
      * @param opacity 0 to 1, multiplies the opacity of each stop
@@ -391,9 +447,9 @@ public final class VorelEffect implements AutoCloseable {
     public synchronized int addRadialGradientText(
             float scale,
             float opacity,
-            int[] stopColors,
-            float[] stopOpacities,
-            float[] stopLocations) {
+            @NonNull int[] stopColors,
+            @NonNull float[] stopOpacities,
+            @NonNull float[] stopLocations) {
         long look = look();
         checkRamp(stopColors, stopOpacities, stopLocations);
         return nativeAddRadialGradient(
@@ -401,7 +457,24 @@ public final class VorelEffect implements AutoCloseable {
     }
 
     /**
-     * Adds an outline.
+     * Adds a ramp from the centre of the box of the text: inside the glyphs, over what was added there
+     * before it.
+     *
+     * @param scale radius in half widths of the box, 0 to 2; below 0.1 nothing is drawn
+     * @param opacity 0 to 1, multiplies the opacity of each stop
+     * @param stops its colours
+     * @return the id of the effect
+     */
+    public synchronized int addRadialGradientText(float scale, float opacity, @NonNull Stops stops) {
+        long look = look();
+        checkGiven(stops);
+        return nativeAddRadialGradient(
+                look, scale, opacity, stops.colors(), stops.opacities(), stops.places());
+    }
+
+    /**
+     * Adds an outline: one outside lies beneath the text, one inside in the glyphs, a centred one over
+     * what was added before it on both sides.
      *
      * @param size width of the outline, 0 to 100 pixels
      * @param color 0xRRGGBB
@@ -416,8 +489,9 @@ public final class VorelEffect implements AutoCloseable {
     }
 
     /**
-     * Adds an image tiled over the text from the top left corner of its box. The pixels are copied.
-     * The key does not tell one image from another.
+     * Adds an image tiled over the text from the top left corner of its box: inside the glyphs, over
+     * what was added there before it. The pixels are copied. The key does not tell one image from
+     * another.
      *
      * @param pixels 0xAARRGGBB, straight, rows back to back, as {@code Bitmap.getPixels} gives them
      * @param width pixels per row, at least 1
@@ -427,7 +501,7 @@ public final class VorelEffect implements AutoCloseable {
      * @return the id of the effect
      */
     public synchronized int addPatternText(
-            int[] pixels, int width, int height, float scale, float opacity) {
+            @NonNull int[] pixels, int width, int height, float scale, float opacity) {
         long look = look();
         checkSize(width, height);
         if (pixels == null) throw new IllegalArgumentException("pixels: null");
@@ -442,7 +516,8 @@ public final class VorelEffect implements AutoCloseable {
     }
 
     /**
-     * Adds the plain fill of the text.
+     * Adds the plain fill of the text: between the effects inside the glyphs and those beneath the text,
+     * wherever it is added.
      *
      * @param color 0xRRGGBB
      * @param opacity 0 to 1
@@ -528,6 +603,7 @@ public final class VorelEffect implements AutoCloseable {
      *
      * @return a new array, empty for a look without effects; it holds no zero byte
      */
+    @NonNull
     public synchronized byte[] getMapKey() {
         return nativeGetMapKey(painter());
     }
@@ -539,6 +615,7 @@ public final class VorelEffect implements AutoCloseable {
      * @param color 0xRRGGBB
      * @return the key, as {@link #getMapKey()}
      */
+    @NonNull
     public synchronized byte[] getMapKey(int color) {
         return nativeGetMapKeyOfColor(look(), color);
     }
@@ -546,9 +623,9 @@ public final class VorelEffect implements AutoCloseable {
     // --- One run --------------------------------------------------------------------------------
 
     /**
-     * Opens a run. Its pixels are written when {@link #finish} is called. Give it a destination of zeros:
-     * a text fill erases whatever lies around the glyphs. A run that is still open is dropped; nothing of
-     * it is painted.
+     * Opens a run. Its pixels are written when {@link #finish} is called. Give it a destination of
+     * zeros: a text fill erases whatever lies around the glyphs. A run that is still open is dropped;
+     * nothing of it is painted.
      *
      * @param width pixels per row of the destination, at least 1
      * @param height rows of the destination, at least 1
@@ -556,7 +633,7 @@ public final class VorelEffect implements AutoCloseable {
      *     those from its position on and does not move the position. Kept until the run ends, its memory
      *     untouched until {@link #finish}.
      */
-    public synchronized void begin(int width, int height, ByteBuffer destination) {
+    public synchronized void begin(int width, int height, @NonNull ByteBuffer destination) {
         long open = painter();
         checkSize(width, height);
         int start = startOf("destination", destination, (long) width * height, BYTES_PER_PIXEL);
@@ -583,7 +660,8 @@ public final class VorelEffect implements AutoCloseable {
      * @param width pixels per row, 0 to 65535
      * @param height rows, 0 to 65535
      */
-    public synchronized void glyph(int x, int y, ByteBuffer coverage, int width, int height) {
+    public synchronized void glyph(
+            int x, int y, @NonNull ByteBuffer coverage, int width, int height) {
         long run = run();
         if (width < 0 || width > LARGEST_GLYPH || height < 0 || height > LARGEST_GLYPH) {
             throw new IllegalArgumentException("size of a glyph: " + width + " x " + height);
@@ -609,9 +687,7 @@ public final class VorelEffect implements AutoCloseable {
     private static final float[] NO_NUMBERS = {};
 
     private long painter() {
-        long open = painter.look();
-        if (open == 0) throw new IllegalStateException("closed");
-        return open;
+        return painter.address();
     }
 
     /** The painter while its look may change: an effect added within a run would miss its order. */
@@ -661,19 +737,12 @@ public final class VorelEffect implements AutoCloseable {
         }
     }
 
-    private static void checkStops(int[] colors, float[] opacities, float[] locations) {
-        if (colors == null || opacities == null || locations == null) {
-            throw new IllegalArgumentException("stops: null");
-        }
-        if (colors.length != opacities.length || colors.length != locations.length) {
-            throw new IllegalArgumentException(
-                    "stops: " + colors.length + " colours, " + opacities.length + " opacities, "
-                            + locations.length + " locations");
-        }
+    private static void checkGiven(Stops stops) {
+        if (stops == null) throw new IllegalArgumentException("stops: null");
     }
 
     private static void checkRamp(int[] colors, float[] opacities, float[] locations) {
-        checkStops(colors, opacities, locations);
+        Stops.check(colors, opacities, locations);
         if (colors.length == 0) throw new IllegalArgumentException("stops: none");
     }
 
@@ -682,6 +751,8 @@ public final class VorelEffect implements AutoCloseable {
     // Those of an object are not static: as an argument of the call it stays reachable until that returns.
 
     private static native long nativeCreate();
+
+    private native long nativeCopy(long painter);
 
     private static native void nativeDestroy(long painter);
 

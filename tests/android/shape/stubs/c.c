@@ -3,7 +3,9 @@
 FUNCTION(abort)
 FUNCTION(calloc)
 FUNCTION(free)
+#ifdef STUBS_FOR_aarch64
 FUNCTION(getauxval) /* the level of the instruction set */
+#endif
 FUNCTION(malloc)
 FUNCTION(memcmp)
 FUNCTION(memcpy)

@@ -1,0 +1,18 @@
+# shellcheck shell=bash
+# To be sourced, behind quietly.sh: install_library installs the library for what is built against it,
+# python_with_the_package the package of Python.
+
+# install_library: says where it is
+install_library() {
+    local build=$PWD/build/examples
+    quietly cmake -S . -B "$build/library" -G Ninja -DCMAKE_BUILD_TYPE=Release \
+        -DCMAKE_INSTALL_PREFIX="$build/prefix" && quietly cmake --build "$build/library" --target install &&
+        echo "$build/prefix"
+}
+
+# python_with_the_package: says which Python has the package; that of scripts/python.sh, which runs where it has not
+python_with_the_package() {
+    local python=$PWD/build/python-venv/bin/python
+    [[ -x $python ]] || quietly scripts/python.sh
+    echo "$python"
+}

@@ -1,0 +1,7 @@
+#include <voreleffect/look.h>
+
+#include "tests/unit/look/mixed_exceptions.h"
+
+Ending endingWithoutExceptions() {
+    return &VFontEffect::look_internal::throwBadAlloc;
+}
