@@ -25,12 +25,18 @@ if [[ ${1-} == modules ]]; then
     exit
 fi
 
-need_packages g++ pkg-config libfreetype-dev fonts-dejavu-core googletest libgtest-dev libstb-dev locales chromium
+need_packages g++ pkg-config libfreetype-dev fonts-dejavu-core googletest libgtest-dev chromium
 command -v node > /dev/null || need_packages nodejs
 build wasm32
 # The literal form paints its table in every other build; the pages are the same ones.
 ctest --preset wasm32 --parallel "$(nproc)" --progress --exclude-regex 'ByTheLiteralForm|^Docs'
-node tests/wasm/module_test.mjs build/wasm32/bindings/js/module
+modules=build/wasm32/bindings/js/module
+node tests/wasm/module_test.mjs "$modules"
+
+# vectors MODULE: how many instructions of vectors there are in it
+vectors() { llvm-objdump-19 --disassemble "$modules/$1" | grep -cE '\b(v128|[if](8x16|16x8|32x4|64x2))\.' || true; }
+[[ $(vectors voreleffect.wasm) -gt 0 && $(vectors voreleffect-scalar.wasm) -eq 0 ]] ||
+    { echo 'the modules have not the instructions of their levels' >&2; exit 1; }
 
 table=tests/determinism/hashes.txt
 echo 'in Chromium:'
