@@ -38,7 +38,7 @@ done
 
 # The fastest call of all turns.
 table() {
-    echo "Commit $(git rev-parse --short HEAD), $(clang++-19 --version | head -n 1), node $(node --version)."
+    echo "$(describe_run clang++-19) Node $(node --version); the native library by clang 14."
     echo
     awk '
         { key = $1 " " $2; id = key " " $3 }
