@@ -20,11 +20,11 @@ foreach(component IN LISTS CPACK_COMPONENTS_ALL)
   string(TOUPPER ${component} name)
   set(docs ${CPACK_TEMPORARY_DIRECTORY}/${component}/usr/share/doc/${CPACK_DEBIAN_${name}_PACKAGE_NAME})
   file(MAKE_DIRECTORY ${docs})
-  file(COPY ${root}/packaging/debian/copyright DESTINATION ${docs})
+  file(COPY ${root}/packaging/debian/copyright ${root}/NOTICE DESTINATION ${docs})
   # Without the name and the time of the file: the same input, the same bytes.
   execute_process(COMMAND gzip -9nc ${changelog} OUTPUT_FILE ${docs}/changelog.gz
     COMMAND_ERROR_IS_FATAL ANY)
-  file(CHMOD ${docs}/copyright ${docs}/changelog.gz
+  file(CHMOD ${docs}/copyright ${docs}/NOTICE ${docs}/changelog.gz
     PERMISSIONS OWNER_READ OWNER_WRITE GROUP_READ WORLD_READ)
 endforeach()
 

@@ -38,6 +38,8 @@ if(VOREL_BUILD_PYTHON)
   set(CPACK_DEBIAN_PYTHON_PACKAGE_DEPENDS "python3 (>= 3.${Python3_VERSION_MINOR}), python3 (<< 3.${next}), \
 python3-numpy")
   set(CPACK_DEBIAN_PYTHON_PACKAGE_RECOMMENDS "python3-pil, fonts-dejavu-core")
+  set(CPACK_DEBIAN_PYTHON_PACKAGE_CONTROL_EXTRA
+    ${PROJECT_SOURCE_DIR}/packaging/debian/python/postinst ${PROJECT_SOURCE_DIR}/packaging/debian/python/prerm)
 endif()
 
 set(about "voreleffect paints strokes, shadows, glows, gradients and patterns\naround and into \

@@ -181,3 +181,8 @@ echo "Debian: vorelpaint paints, and its pages are there"
 ! readelf --wide -d /usr/lib/python3/dist-packages/voreleffect/*.so | grep libvoreleffect ||
     fail "Debian: the module of Python needs the library beside it"
 echo "Debian: the package of Python paints what vorelpaint does"
+# What Python itself compiles goes with the package.
+[[ -d /usr/lib/python3/dist-packages/voreleffect/__pycache__ ]] || fail "Debian: the package of Python is not compiled"
+quietly dpkg --purge python3-voreleffect
+[[ ! -e /usr/lib/python3/dist-packages/voreleffect ]] || fail "Debian: the package of Python leaves files behind"
+packages=(libvoreleffect1 libvoreleffect-dev vorelpaint)

@@ -26,6 +26,11 @@ quietly "$python" -m build --sdist --no-isolation --outdir "$dist" bindings/pyth
 tar -xf "$dist"/voreleffect-*.tar.gz -C "$unpacked" --strip-components=1
 quietly "$python" -m build --wheel --no-isolation --outdir "$dist" "$unpacked"
 
+wheel=$("$python" -m zipfile -l "$dist"/voreleffect-*.whl)
+for name in LICENSE NOTICE; do
+    grep -q "^voreleffect-.*dist-info/$name " <<< "$wheel" || { echo "the wheel has no $name" >&2; exit 1; }
+done
+
 venv=build/python-venv
 rm -rf "$venv"
 "$python" -m venv --system-site-packages "$venv"

@@ -21,9 +21,10 @@ ROOT = PACKED if PACKED.is_dir() else HERE.parents[1]
 PRESETS = ROOT / "style/presets"
 
 # What the extension is built of.
-SOURCES = ["CMakeLists.txt", "LICENSE", "CHANGELOG.md", "README.md", "SECURITY.md", "blend", "capi", "cmake", "compose",
-           "core", "cores", "effect", "include", "ops", "packaging/debian", "property", "simd", "style", "text",
-           "unicode", "bindings/python/CMakeLists.txt", "bindings/python/src", "bindings/python/voreleffect"]
+SOURCES = ["CMakeLists.txt", "LICENSE", "NOTICE", "CHANGELOG.md", "README.md", "SECURITY.md", "blend", "capi", "cmake",
+           "compose", "core", "cores", "effect", "include", "ops", "packaging/debian", "property", "simd", "style", "text",
+           "unicode", "bindings/python/CMakeLists.txt", "bindings/python/METADATA.in", "bindings/python/src",
+           "bindings/python/voreleffect"]
 
 
 def version():
@@ -69,9 +70,10 @@ class PackLibrary(sdist):
 
     def make_release_tree(self, base_dir, files):
         super().make_release_tree(base_dir, files)
-        license_file = Path(base_dir) / "LICENSE"
-        license_file.unlink()  # a link out of the distribution
-        shutil.copyfile(ROOT / "LICENSE", license_file)
+        for name in ("LICENSE", "NOTICE"):
+            licence = Path(base_dir) / name
+            licence.unlink()  # a link out of the distribution
+            shutil.copyfile(ROOT / name, licence)
         for name in SOURCES:
             source, target = ROOT / name, Path(base_dir) / "library" / name
             if source.is_dir():
