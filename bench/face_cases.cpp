@@ -71,7 +71,7 @@ class ClassesJob : public GlyphsJob {
     void layOver(const VFBitmap& picture, int x, int y) {
         const PictureView view = page();
         for (unsigned row = 0; row < picture.mHeight; ++row) {
-            const auto line = static_cast<std::ptrdiff_t>(y) + row;
+            const int64_t line = int64_t{y} + static_cast<int64_t>(row);
             look_internal::layRowOver<PixelOrder::rgba>(view.data + (line * view.width + x) * 4,
                                                         picture.mData + size_t{row} * picture.mWidth * 4,
                                                         static_cast<int>(picture.mWidth));

@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <climits>
 
-#include "font_face.h"
+#include "glyphs.h"
 #include "tests/support/random.h"
 
 namespace vorel_bench {
@@ -11,25 +11,6 @@ namespace {
 
 constexpr char kSans[] = VOREL_BENCH_FONTS "/DejaVuSans.ttf";
 constexpr char kSansBold[] = VOREL_BENCH_FONTS "/DejaVuSans-Bold.ttf";
-
-/// Renders a character with the pen at `penX` on the baseline 0 and moves the pen.
-Glyph rendered(FT_Face face, char character, int& penX) {
-    const auto code = static_cast<FT_ULong>(static_cast<unsigned char>(character));
-    if (FT_Load_Char(face, code, kLoadFlags | FT_LOAD_RENDER) != 0) return {};
-    const FT_GlyphSlot slot = face->glyph;
-    const FT_Bitmap& bitmap = slot->bitmap;
-    Glyph glyph = {penX + slot->bitmap_left,
-                   -slot->bitmap_top,
-                   static_cast<int>(bitmap.width),
-                   static_cast<int>(bitmap.rows),
-                   {}};
-    for (int y = 0; y < glyph.height; ++y) {
-        const unsigned char* const row = bitmap.buffer + std::ptrdiff_t{y} * bitmap.pitch;
-        glyph.coverage.insert(glyph.coverage.end(), row, row + glyph.width);
-    }
-    penX += static_cast<int>((slot->advance.x + 32) >> 6);
-    return glyph;
-}
 
 /// Moves the glyphs so that their extents start at (0, 0), and sets the size of the workload.
 void cropToExtents(Workload& workload) {
@@ -67,12 +48,7 @@ Workload textLine(const char* name, const char* text, const char* font, int size
     workload.text = text;
     workload.font = font;
     workload.sizePx = sizePx;
-    const FontFace face(font, sizePx);
-    int penX = 0;
-    for (const char character : workload.text) {
-        Glyph glyph = rendered(face.face(), character, penX);
-        if (!glyph.coverage.empty()) workload.glyphs.push_back(std::move(glyph));
-    }
+    workload.glyphs = glyphsOf(workload);
     cropToExtents(workload);
     mergeGlyphs(workload);
     return workload;

@@ -172,11 +172,12 @@ vorel_status paint(vorel_painter& painter, const vorel_glyph* glyphs, size_t cou
 
 /// Whether the pixels of a pattern can be read, and are not too many.
 vorel_status statusOf(const vorel_pixels& pixels) {
-    if (pixels.width < 1 || pixels.height < 1) return VOREL_BAD_ARGUMENT;
-    if (!capi::VFontEffect::look_internal::areRows(pixels.data, pixels.width, 4, pixels.stride))
-        return VOREL_BAD_ARGUMENT;
-    const int64_t most = capi::VFontEffect::look_internal::kMostBytes / 4;
-    return int64_t{pixels.width} * pixels.height > most ? VOREL_TOO_LARGE : VOREL_OK;
+    namespace look = capi::VFontEffect::look_internal;
+    if (pixels.data == nullptr || pixels.width < 1 || pixels.height < 1) return VOREL_BAD_ARGUMENT;
+    if (int64_t{pixels.width} * pixels.height > look::kMostBytes / 4) return VOREL_TOO_LARGE;
+    return look::areRows(pixels.data, pixels.width, pixels.height, 4, pixels.stride)
+               ? VOREL_OK
+               : VOREL_BAD_ARGUMENT;
 }
 
 }  // namespace

@@ -1,5 +1,11 @@
 include(CheckCXXSymbolExists)
 check_cxx_symbol_exists(__i386__ cstddef VOREL_FOR_I386)
+check_cxx_symbol_exists(__wasm__ cstddef VOREL_FOR_WASM)
+# A WebAssembly module stands at its own place in memory.
+set(VOREL_RELOCATABLE ON)
+if(VOREL_FOR_WASM)
+  set(VOREL_RELOCATABLE OFF)
+endif()
 
 # How every source of the library is compiled.
 function(vorel_objects target)
@@ -23,7 +29,7 @@ function(vorel_objects target)
     CXX_EXTENSIONS OFF
     CXX_VISIBILITY_PRESET hidden
     VISIBILITY_INLINES_HIDDEN ON
-    POSITION_INDEPENDENT_CODE ON)
+    POSITION_INDEPENDENT_CODE ${VOREL_RELOCATABLE})
 endfunction()
 
 # vorel_strict_link(TARGET): some linkers' drivers answer a wish for fast arithmetic with code that, when
@@ -37,13 +43,21 @@ endfunction()
 function(vorel_library target choice)
   cmake_parse_arguments(PARSE_ARGV 2 arg "" "" "LEVELS")
   target_sources(${target} PRIVATE
-    ${choice} blend/loop_tables.cpp ops/loop_tables.cpp
+    ${choice} ${PROJECT_SOURCE_DIR}/blend/loop_tables.cpp ${PROJECT_SOURCE_DIR}/ops/loop_tables.cpp
     $<TARGET_OBJECTS:voreleffect_objects> $<TARGET_OBJECTS:voreleffect_capi>)
   foreach(level IN LISTS arg_LEVELS)
     target_sources(${target} PRIVATE $<TARGET_OBJECTS:voreleffect_${level}>)
   endforeach()
   if(NOT scalar IN_LIST arg_LEVELS)
     target_compile_definitions(${target} PRIVATE VOREL_WITHOUT_SCALAR)
+  elseif(arg_LEVELS STREQUAL scalar AND NOT VOREL_LEVELS STREQUAL scalar)
+    target_compile_definitions(${target} PRIVATE VOREL_WITHOUT_VECTORS)
+  endif()
+  if(VOREL_FOR_WASM)
+    # The C face throws, which the packaged library of C++ cannot.
+    target_sources(${target} PRIVATE ${PROJECT_SOURCE_DIR}/bindings/js/module/exceptions.cpp)
+    set_source_files_properties(${PROJECT_SOURCE_DIR}/bindings/js/module/exceptions.cpp
+      TARGET_DIRECTORY ${target} PROPERTIES COMPILE_OPTIONS -fexceptions)
   endif()
   vorel_objects(${target})
   vorel_strict_link(${target})

@@ -31,7 +31,7 @@ class OwnFloatState {
 #elif defined(__aarch64__)
     uint64_t mControl = 0;
     uint64_t mFlags = 0;
-#else
+#elif !defined(__wasm__)
     std::fenv_t mEnvironment = {};
 #endif
 };
@@ -57,6 +57,12 @@ OwnFloatState::~OwnFloatState() {
     asm volatile("msr fpsr, %0" : : "r"(mFlags) : "memory");
     if (mControl != 0) asm volatile("msr fpcr, %0" : : "r"(mControl) : "memory");
 }
+
+#elif defined(__wasm__)
+
+// Arithmetic has one state there, the library's own.
+OwnFloatState::OwnFloatState() = default;
+OwnFloatState::~OwnFloatState() = default;
 
 #else
 

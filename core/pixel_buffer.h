@@ -1,5 +1,6 @@
 #pragma once
 
+#include <algorithm>
 #include <cstddef>
 #include <cstdint>
 #include <cstdlib>
@@ -30,8 +31,9 @@ class [[nodiscard]] PixelBuffer {
     T& operator[](size_t i) { return mData[i]; }
 
   private:
-    /// A larger request fails. No effect comes near it, whatever its picture: see core/windows.h.
-    static constexpr uint64_t kMostBytes = uint64_t{1} << 32;
+    /// A larger request fails, and so do all beyond what pointers span, half of a 32-bit address space.
+    /// No effect comes near it, whatever its picture: see core/windows.h.
+    static constexpr uint64_t kMostBytes = std::min<uint64_t>(uint64_t{1} << 32, PTRDIFF_MAX);
 
     static PixelBuffer make(int64_t width, int64_t height, bool clear) {
         if (width < 0 || height < 0) return PixelBuffer(nullptr);

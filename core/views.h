@@ -1,8 +1,8 @@
 #pragma once
 
+#include <algorithm>
 #include <cstddef>
 #include <cstdint>
-#include <limits>
 
 #include "voreleffect/VFBitmap.h"
 
@@ -11,11 +11,14 @@ namespace VFontEffect::internal {
 constexpr int kMaskBytes = 1;
 constexpr int kColourBytes = 4;
 
-/// Whether the byte count of width x height pixels fits in 32 bits. Beyond that a bitmap, which counts
-/// its bytes in 32 bits, has a smaller buffer than its numbers claim.
+/// Whether the byte count of width x height pixels fits in 32 bits, and in what pointers span, which is
+/// less where addresses have 32 bits. Beyond the one a bitmap, which counts its bytes in 32 bits, has a
+/// smaller buffer than its numbers claim; beyond the other no two of its pixels can be told apart by a
+/// distance.
 inline bool fitsByteCount(unsigned int width, unsigned int height, unsigned int bytesPerPixel) {
+    constexpr uint64_t kMost = std::min<uint64_t>(UINT32_MAX, PTRDIFF_MAX);
     const uint64_t pixels = static_cast<uint64_t>(width) * height;
-    return bytesPerPixel != 0 && pixels <= std::numeric_limits<uint32_t>::max() / bytesPerPixel;
+    return bytesPerPixel != 0 && pixels <= kMost / bytesPerPixel;
 }
 
 /// The pixels of a bitmap, with 64-bit sizes and packed rows. Empty, with null data, for a bitmap

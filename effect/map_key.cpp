@@ -1,4 +1,5 @@
 #include <cstddef>
+#include <cstdint>
 #include <new>
 
 #include "voreleffect/VFEffect.h"
@@ -7,22 +8,20 @@ namespace VFontEffect {
 namespace {
 
 /// Bytes. Only records with absurd stop counts reserve more; there is no key then.
-constexpr std::size_t kLargestKey = std::size_t{1} << 28;
+constexpr int64_t kLargestKey = int64_t{1} << 28;
 
 }  // namespace
 
 // Deliberate: the fragments follow the list, which initEffect reorders; they are not sorted.
 char* VFEffect::getMapKey() {
-    std::size_t reserved = 0;
+    int64_t reserved = 0;
     for (VFECore* core : mEffects) {
-        if (VFProperty* record = core->getProperty()) {
-            reserved += static_cast<std::size_t>(record->getSequentialCharLength());
-        }
+        if (VFProperty* record = core->getProperty()) reserved += record->getSequentialCharLength();
     }
-    if (reserved > kLargestKey) return nullptr;
+    if (reserved < 0 || reserved > kLargestKey) return nullptr;
     // Zeroed, because some records write less than they reserve: equal looks give equal keys to the
     // last byte, and a set that writes nothing gives an empty string.
-    char* key = new (std::nothrow) char[reserved + 1]();
+    char* key = new (std::nothrow) char[static_cast<std::size_t>(reserved) + 1]();
     if (key == nullptr) return nullptr;
     char* cursor = key;
     for (VFECore* core : mEffects) {

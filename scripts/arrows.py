@@ -88,9 +88,9 @@ PUBLIC_FOLDER = "include/voreleffect"
 SOURCES = (".h", ".c", ".cpp", ".inc")
 
 LEVEL = re.compile(
-    r"\b(VOREL_LEVEL\w*|VOREL_NATIVE\w*|VOREL_(?:WITHOUT_)?SCALAR|VOREL_VECTOR_BYTES|VOREL_DOT_PRODUCTS|"
+    r"\b(VOREL_LEVEL\w*|VOREL_NATIVE\w*|VOREL_(?:WITHOUT_)?SCALAR|VOREL_WITHOUT_VECTORS|VOREL_VECTOR_BYTES|VOREL_DOT_PRODUCTS|"
     r"VOREL_PLANAR_PIXELS|VOREL_MASK_REGISTERS|__SSE\w*|__AVX\w*|__F16C__|__FMA__|__ARM_NEON\w*|"
-    r"__ARM_FEATURE\w*|__aarch64__|__arm__|__x86_64__|__i386__|__amd64__|_M_X64|_M_ARM64)"
+    r"__ARM_FEATURE\w*|__wasm\w*|__aarch64__|__arm__|__x86_64__|__i386__|__amd64__|_M_X64|_M_ARM64)"
 )
 CONDITION = re.compile(r"\s*#\s*(?:if|ifdef|ifndef|elif)\b")
 INCLUDE = re.compile(r'\s*#\s*include\s*(?:"([^"]+)"|<(voreleffect/[^>]+)>)')
@@ -98,6 +98,7 @@ INCLUDE = re.compile(r'\s*#\s*include\s*(?:"([^"]+)"|<(voreleffect/[^>]+)>)')
 ALLOWED_TO_ASK = {
     "core/float_state.h": "each kind of CPU has its own registers for the state of its arithmetic",
     "tests/support/float_states.cpp": "sets those registers for the tests",
+    "tests/support/guarded.h": "WebAssembly has no pages that are forbidden",
     "tests/unit/simd/level_test.cpp": "tests which levels each kind of CPU has",
 }
 
@@ -225,6 +226,7 @@ SOUND = {
     "examples/one/one.cpp": "#include <voreleffect/VFEffect.h>\n",
     "tests/unit/glow_test.cpp": '#include "cores/glow.h"\n// #if __AVX2__\n',
     "tests/support/float_states.cpp": "sets those registers for the tests",
+    "tests/support/guarded.h": "WebAssembly has no pages that are forbidden",
     "tests/unit/simd/level_test.cpp": "#if defined(__x86_64__)\n#endif\n",
 }
 CASES = [
@@ -261,6 +263,7 @@ CASES = [
     ({"blend/rows.h": "\n#if VOREL_ONE || \\\n    defined(__ARM_NEON)\n#endif\n"}, ["blend/rows.h:2: ", "__ARM_NEON"]),
     ({"cores/glow.h": "#ifdef VOREL_NATIVE_TAPS\n#endif\n"}, ["cores/glow.h:1: ", "VOREL_NATIVE_TAPS"]),
     ({"tests/unit/glow_test.cpp": "#elif __x86_64__\n"}, ["tests/unit/glow_test.cpp:1: ", "__x86_64__"]),
+    ({"blend/rows.h": "#if defined(__wasm_simd128__)\n#endif\n"}, ["blend/rows.h:1: ", "__wasm_simd128__"]),
     ({"tools/part.h": "# if VOREL_LEVEL == 2\n#endif\n"}, ["tools/part.h:1: ", "VOREL_LEVEL"]),
 ]
 

@@ -25,9 +25,9 @@ for room in core simd property blend ops cores effect capi unicode style text co
 done
 printf '%s\n' "${sources[@]}" | grep -E "^($(IFS='|'; echo "${rooms[*]}"))/.*\.cpp\$" |
     xargs -P "$(nproc)" -n 1 clang-tidy-14 --quiet -p "$database" 2> /dev/null
-# The bindings are in no database: the options are those of a source beside them, and what Python takes.
+# The one of Python is in no database: the options are those of a source beside them, and what Python takes.
 python=$(/usr/bin/python3 -c 'import sysconfig; print(sysconfig.get_path("include"))')
-printf '%s\n' "${sources[@]}" | grep '^bindings/.*\.cpp$' |
+printf '%s\n' "${sources[@]}" | grep '^bindings/python/.*\.cpp$' |
     xargs -P "$(nproc)" -n 1 clang-tidy-14 --quiet -p "$database" --extra-arg=-fexceptions \
         --extra-arg=-isystem"$python" 2> /dev/null
 cppcheck --quiet --std=c++17 --enable=warning,performance,portability --inline-suppr --error-exitcode=1 \

@@ -9,14 +9,19 @@
 /// VOREL_EACH_VECTOR_LEVEL applies a macro to the name of each level but the scalar one, from the
 /// plainest to the best, and to two arguments of the caller's. The plainest runs on every CPU of its
 /// kind, so only the tests have the scalar level beside it, and VOREL_WITHOUT_SCALAR says that it is not
-/// there. VOREL_EACH_DOTLESS_LEVEL names for each of them the level that its loops without dot products
-/// are taken from.
+/// there. A WebAssembly module with vectors is refused as a whole where there are none, so one is built
+/// for each of both cases, and VOREL_WITHOUT_VECTORS says that the scalar level is alone.
+/// VOREL_EACH_DOTLESS_LEVEL names for each of them the level that its loops without dot products are
+/// taken from.
 #if defined(__x86_64__)
 #define VOREL_EACH_VECTOR_LEVEL(apply, a, b) apply(sse2, a, b) apply(avx2, a, b) apply(avx512, a, b)
 #define VOREL_EACH_DOTLESS_LEVEL(apply, a, b) VOREL_EACH_VECTOR_LEVEL(apply, a, b)
 #elif defined(__aarch64__)
 #define VOREL_EACH_VECTOR_LEVEL(apply, a, b) apply(neon, a, b) apply(dotprod, a, b)
 #define VOREL_EACH_DOTLESS_LEVEL(apply, a, b) apply(neon, a, b) apply(neon, a, b)
+#elif defined(__wasm__)
+#define VOREL_EACH_VECTOR_LEVEL(apply, a, b) apply(simd128, a, b)
+#define VOREL_EACH_DOTLESS_LEVEL(apply, a, b) VOREL_EACH_VECTOR_LEVEL(apply, a, b)
 #else
 #define VOREL_EACH_VECTOR_LEVEL(apply, a, b)
 #define VOREL_EACH_DOTLESS_LEVEL(apply, a, b)
@@ -33,6 +38,11 @@ constexpr int kCpuLevels = static_cast<int>(CpuLevel::count);
 constexpr int kPlainestLevel = 1;
 #else
 constexpr int kPlainestLevel = 0;
+#endif
+#if defined(VOREL_WITHOUT_VECTORS)
+constexpr int kBestLevel = 0;
+#else
+constexpr int kBestLevel = kCpuLevels - 1;
 #endif
 
 /// Bytes of the longest vector of any level.

@@ -12,6 +12,8 @@
 #include "simd/lanes_sse2.h"
 #elif defined(__aarch64__)
 #include "simd/lanes_neon.h"
+#elif defined(__wasm_simd128__)
+#include "simd/lanes_simd128.h"
 #else
 #error "there is no such level on this machine"
 #endif

@@ -17,6 +17,7 @@ using X86Floats = __m128;
 }  // namespace VFontEffect::internal::VOREL_LEVEL
 
 #include "simd/lanes_x86.h"
+#include "simd/taps_in_pairs.h"
 
 namespace VFontEffect::internal::VOREL_LEVEL {
 
@@ -52,21 +53,6 @@ VOREL_INLINE U16s widenHigh(U8s v) {
 VOREL_INLINE U8s narrow(U16s a, U16s b) { return pack(a, b); }
 VOREL_INLINE U16s pairSums(U8s v) { return (bitCast<U16s>(v) & 0x00FF) + (bitCast<U16s>(v) >> 8); }
 
-#define VOREL_NATIVE_TAPS
-/// Taps 0 and 2 of each word, and taps 1 and 3. The cell of a tap holds its weight and that of the next
-/// but one.
-struct Taps {
-    U16s even;
-    U16s odd;
-};
-using WeightCell = U16s;
-
-VOREL_INLINE Taps tapsOf(U8s v) { return {bitCast<U16s>(v) & 0x00FF, bitCast<U16s>(v) >> 8}; }
-VOREL_INLINE WeightCell cellOf(const uint8_t* weights) {
-    return bitCast<U16s>(splat<U32s>(weights[0] | uint32_t{weights[2]} << 16));
-}
-
-constexpr uint8_t kTapBias = 0;
 template <int64_t kFour>
 VOREL_INLINE U32s addDots(U32s sums, Taps taps, const WeightCell* weights) {
     const __m128i even = _mm_madd_epi16(ints(taps.even), ints(weights[4 * kFour]));

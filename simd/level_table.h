@@ -8,7 +8,11 @@
     namespace level {                                 \
     extern const Table name;                          \
     }
+#if defined(VOREL_WITHOUT_VECTORS)
+#define VOREL_LEVEL_TABLE_ADDRESS(level, Table, name) nullptr,
+#else
 #define VOREL_LEVEL_TABLE_ADDRESS(level, Table, name) &level::name,
+#endif
 #if defined(VOREL_WITHOUT_SCALAR)
 #define VOREL_SCALAR_TABLE_ADDRESS(name) nullptr
 #else

@@ -167,7 +167,8 @@ struct PixelView {
 /// Why a painter painted nothing.
 enum class Failure {
     none,
-    badArgument,  ///< a view or a glyph without pixels, of a negative size, or with too short a stride
+    badArgument,  ///< a view or a glyph without pixels, of a negative size, with too short a stride, or
+                  ///< with rows farther apart than pointers span
     tooLarge,     ///< a glyph beyond 65535 pixels on a side, a layer of 2^31 bytes and more, or a
                   ///< picture whose left or top is below -2^31
     noMemory
@@ -225,9 +226,15 @@ inline float product(float a, float b) {
     return rounded;
 }
 
-/// Whether rows of `width` pixels can be read or written: `stride` is in bytes.
-inline bool areRows(const unsigned char* data, int width, int bytesPerPixel, std::ptrdiff_t stride) {
-    return data != nullptr && (stride == 0 || stride >= std::int64_t{width} * bytesPerPixel);
+/// Whether so many rows of `width` pixels, one at least, can be read or written: `stride` is in bytes.
+/// Where addresses have 32 bits some are farther apart than pointers span.
+inline bool areRows(const unsigned char* data, int width, int height, int bytesPerPixel,
+                    std::ptrdiff_t stride) {
+    constexpr std::int64_t kMost = PTRDIFF_MAX;
+    const std::int64_t rowBytes = std::int64_t{width} * bytesPerPixel;
+    const std::int64_t step = stride == 0 ? rowBytes : stride;
+    if (data == nullptr || step < rowBytes || rowBytes > kMost) return false;
+    return height <= 1 || height - 1 <= (kMost - rowBytes) / step;
 }
 
 /// The bytes from row to row.
@@ -262,7 +269,7 @@ inline void takePixel(Tile& tile, const unsigned char* rgba) {
 inline std::shared_ptr<const Tile> tileOf(const PixelView& pixels) {
     auto tile = std::make_shared<Tile>();
     if (pixels.width <= 0 || pixels.height <= 0) return tile;
-    if (!areRows(pixels.data, pixels.width, 4, pixels.stride)) return tile;
+    if (!areRows(pixels.data, pixels.width, pixels.height, 4, pixels.stride)) return tile;
     if (std::int64_t{pixels.width} * pixels.height > kMostBytes / 4) return tile;
     tile->width = pixels.width;
     tile->height = pixels.height;
@@ -809,7 +816,8 @@ struct Placed {
 /// Whether the view can be painted on. One without width or height can, to no effect.
 inline bool isUsable(const PictureView& view) {
     if (view.width < 0 || view.height < 0) return false;
-    return view.width == 0 || view.height == 0 || areRows(view.data, view.width, 4, view.stride);
+    return view.width == 0 || view.height == 0 ||
+           areRows(view.data, view.width, view.height, 4, view.stride);
 }
 
 /// One look: its set, planned by the first run and not changed after that, and its layer.
@@ -1033,7 +1041,7 @@ inline Margins Painter::margins() const {
 inline Failure Painter::grow(WideBox& ink, const Glyph& glyph) {
     if (glyph.width < 0 || glyph.height < 0) return Failure::badArgument;
     if (glyph.width == 0 || glyph.height == 0) return Failure::none;
-    if (!look_internal::areRows(glyph.coverage, glyph.width, 1, glyph.stride))
+    if (!look_internal::areRows(glyph.coverage, glyph.width, glyph.height, 1, glyph.stride))
         return Failure::badArgument;
     if (std::max(glyph.width, glyph.height) > look_internal::kLargestGlyph) return Failure::tooLarge;
     ink.grow(WideBox{0, 0, glyph.width, glyph.height}.moved(glyph.x, glyph.y));

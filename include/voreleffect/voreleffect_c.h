@@ -44,7 +44,8 @@ typedef int32_t vorel_status;
 
 enum {
     VOREL_OK = 0,            ///< done
-    VOREL_BAD_ARGUMENT = 1,  ///< null, no constant, no pixels, a negative size, too short a stride
+    VOREL_BAD_ARGUMENT = 1,  ///< null, no constant, no pixels, a negative size, too short a stride, rows
+                             ///< farther apart than pointers span
     VOREL_TOO_LARGE = 2,     ///< a glyph beyond 65535 pixels on a side, a layer or a pattern of 2^31
                              ///< bytes and more, a picture whose left or top is below -2^31, a key
                              ///< beyond its buffer

@@ -2,7 +2,6 @@
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
-#include <fstream>
 #include <functional>
 #include <iostream>
 #include <map>
@@ -11,6 +10,7 @@
 #include <vector>
 
 #include "tests/support/both_sets.h"
+#include "tests/support/file_bytes.h"
 #include "tests/support/float_states.h"
 #include "tests/support/levels.h"
 #include "tests/support/mask_gallery.h"
@@ -165,10 +165,7 @@ std::string lines(const Table& table) {
 }
 
 std::string textOf(const char* path) {
-    std::ifstream file(path);
-    std::ostringstream text;
-    text << file.rdbuf();
-    if (file) return text.str();
+    if (const auto text = bytesOfFile(path)) return *text;
     std::cerr << "cannot read " << path << '\n';
     std::exit(2);
 }

@@ -1,15 +1,16 @@
 /// Runs inputs through a fuzz target without a fuzzer: every file named on the command line and every
 /// file of a directory named there, each at every level of the instruction set. Whatever stops the
 /// fuzzer stops this program.
+#include <dirent.h>
+
 #include <algorithm>
 #include <chrono>
 #include <cstdint>
 #include <cstdio>
-#include <filesystem>
-#include <fstream>
-#include <iterator>
+#include <string>
 #include <vector>
 
+#include "tests/support/file_bytes.h"
 #if defined(VOREL_FUZZ_PAINTS)
 #include "level_of_input.h"
 #endif
@@ -18,21 +19,21 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size);
 
 namespace {
 
-namespace fs = std::filesystem;
-
-/// The files in a fixed order.
-std::vector<fs::path> filesOf(const fs::path& path) {
-    if (!fs::is_directory(path)) return {path};
-    std::vector<fs::path> files;
-    for (const auto& entry : fs::directory_iterator(path)) {
-        if (entry.is_regular_file()) files.push_back(entry.path());
+/// A file itself, or the files of a directory in a fixed order.
+std::vector<std::string> filesOf(const std::string& path) {
+    DIR* const directory = opendir(path.c_str());
+    if (directory == nullptr) return {path};
+    std::vector<std::string> files;
+    while (const dirent* const entry = readdir(directory)) {
+        if (entry->d_type != DT_DIR) files.push_back(path + "/" + entry->d_name);
     }
+    closedir(directory);
     std::sort(files.begin(), files.end());
     return files;
 }
 
 /// Runs an input, at every level of the instruction set if it paints.
-void run(const std::vector<char>& bytes) {
+void run(const std::string& bytes) {
     const auto* const data = reinterpret_cast<const uint8_t*>(bytes.data());
 #if defined(VOREL_FUZZ_PAINTS)
     for (size_t i = 0; i < vorel_test::levelsHere().size(); ++i) {
@@ -46,14 +47,12 @@ void run(const std::vector<char>& bytes) {
 
 /// Milliseconds that the input took; negative when it cannot be read. The name is printed first, for
 /// the input may end the program.
-double replay(const fs::path& path) {
-    std::ifstream file(path, std::ios::binary);
-    if (!file) return -1.0;
-    const std::vector<char> bytes{std::istreambuf_iterator<char>(file),
-                                  std::istreambuf_iterator<char>()};
+double replay(const std::string& path) {
+    const auto bytes = vorel_test::bytesOfFile(path);
+    if (!bytes) return -1.0;
     std::fprintf(stderr, "%s\n", path.c_str());
     const auto start = std::chrono::steady_clock::now();
-    run(bytes);
+    run(*bytes);
     const std::chrono::duration<double, std::milli> taken = std::chrono::steady_clock::now() - start;
     return taken.count();
 }
@@ -63,9 +62,9 @@ double replay(const fs::path& path) {
 int main(int argc, char** argv) {
     int inputs = 0;
     double longest = 0.0;
-    fs::path slowest;
+    std::string slowest;
     for (int i = 1; i < argc; ++i) {
-        for (const fs::path& path : filesOf(argv[i])) {
+        for (const std::string& path : filesOf(argv[i])) {
             const double taken = replay(path);
             if (taken < 0.0) {
                 std::fprintf(stderr, "cannot read %s\n", path.c_str());

@@ -8,7 +8,7 @@ set -euo pipefail
 level=$1
 shift
 own="11VFontEffect8internal${#level}${level}"
-symbols=$(nm --defined-only --format=posix "$@")
+symbols=$("${NM:-nm}" --defined-only --format=posix "$@")
 grep -q "$own" <<< "$symbols" || { echo "no code of the level $level in: $*" >&2; exit 1; }
 # Names of type information (_ZT), which sanitizers add, are no code.
 shared=$(awk '$2 ~ /^[WVu]$/ && $1 !~ /^_ZT/ { print $1 }' <<< "$symbols" | { grep -v "$own" || true; } | sort -u)

@@ -331,6 +331,31 @@ TEST(LyingSizes, BitmapsWhoseByteCountWraps_AreNeitherReadNorWritten) {
     }
 }
 
+TEST(LyingSizes, BitmapsBeyondWhatPointersSpan_AreNeitherReadNorWritten) {
+    if (sizeof(void*) > 4) GTEST_SKIP() << "pointers span more than a bitmap can count";
+    const Numbers colours = {32768, 16384, 4};  // 2^31 bytes
+    const Numbers coverage = {65536, 32768, 1};
+    for (Painter& each : everyPainter()) {
+        SCOPED_TRACE(each.name);
+        GuardedBitmap mask(30, 24, 1);
+        GuardedBitmap dst(30, 24, 4);
+        std::fill(mask.pixels().begin(), mask.pixels().end(), uint8_t{255});
+        std::vector<uint8_t> one(4, 255);
+        VFBitmap lying(1, 1, 4);
+        unsigned char* const own = std::exchange(lying.mData, one.data());
+        VFRect box(3, 2, 27, 22);
+        claim(&lying, colours);
+        VFECore::ParamPostProcessing onto{&lying, mask.bitmap(), &box, 1, &lying};
+        each.core->doPostProcessing(&onto);
+        EXPECT_EQ(one, std::vector<uint8_t>(4, 255));
+        claim(&lying, coverage);
+        VFECore::ParamPostProcessing from{dst.bitmap(), &lying, &box, 0, nullptr};
+        each.core->doPostProcessing(&from);
+        EXPECT_EQ(std::vector<uint8_t>(30 * 24 * 4, 0), bytesOf(dst.pixels()));
+        lying.mData = own;
+    }
+}
+
 TEST(LyingSizes, PatternsWhoseByteCountWraps_PaintNothing) {
     // The numbers whose buffer, of the wrapped count, stays small.
     for (const auto& [width, height] :

@@ -21,7 +21,7 @@ void apply(const FloatState& state) {
     asm volatile("ldmxcsr %0\n\tfnclex\n\tfldcw %1" : : "m"(mxcsr), "m"(state.x87) : "memory");
 }
 
-#else
+#elif defined(__aarch64__)
 
 constexpr uint32_t kNearest = 0;
 constexpr uint32_t kUp = 1U << 22;
@@ -40,11 +40,19 @@ void apply(const FloatState& state) {
                  : "memory");
 }
 
+#else
+
+// Of WebAssembly there is one state.
+void apply(const FloatState& /*state*/) {}
+
 #endif
 
 }  // namespace
 
 std::vector<FloatState> floatStates() {
+#if defined(__wasm__)
+    return {{"as it starts", 0, 0, 0}};
+#else
     return {{"as it starts", kNearest, kX87, 0},
             {"rounding up", kUp, kX87, 0},
             {"rounding down", kDown, kX87, 0},
@@ -53,6 +61,7 @@ std::vector<FloatState> floatStates() {
             {"trapping", kTraps, kX87, 0},
             {"80-bit registers set up", kNearest, kOddX87, 0},
             {"trapping, flushing, rounding up", kTraps | kFlush | (kUp & ~kNearest), kOddX87, 0}};
+#endif
 }
 
 FloatState currentFloatState() {
@@ -62,7 +71,7 @@ FloatState currentFloatState() {
     asm volatile("stmxcsr %0\n\tfnstcw %1" : "=m"(mxcsr), "=m"(state.x87) : : "memory");
     state.control = mxcsr & ~kFlags;
     state.flags = mxcsr & kFlags;
-#else
+#elif defined(__aarch64__)
     uint64_t control = 0;
     uint64_t flags = 0;
     asm volatile("mrs %0, fpcr\n\tmrs %1, fpsr" : "=r"(control), "=r"(flags) : : "memory");

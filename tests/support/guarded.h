@@ -1,11 +1,15 @@
 #pragma once
 
+#if !defined(__wasm__)
 #include <sys/mman.h>
 #include <unistd.h>
+#endif
 
+#include <algorithm>
 #include <cstddef>
 #include <cstdint>
 #include <cstdlib>
+#include <memory>
 
 #include "voreleffect/VFBitmap.h"
 
@@ -15,6 +19,40 @@ namespace vorel_test {
 
 /// Which end of the buffer touches an inaccessible page.
 enum class Edge { kEnd, kStart };
+
+#if defined(__wasm__)
+
+/// Where no page can be forbidden: `size` zero bytes between bytes that must be as they were at its end.
+/// So a write one byte too far stops the test, a read does not.
+class GuardedBuffer {
+  public:
+    explicit GuardedBuffer(size_t size, Edge /*edge*/ = Edge::kEnd)
+        : mSize(size), mBytes(new uint8_t[size + 2 * kGuard]) {
+        std::fill(mBytes.get(), end() + kGuard, kUntouched);
+        std::fill(begin(), end(), uint8_t{0});
+    }
+    ~GuardedBuffer() {
+        const auto touched = [](uint8_t byte) { return byte != kUntouched; };
+        if (std::any_of(mBytes.get(), begin(), touched)) abort();
+        if (std::any_of(end(), end() + kGuard, touched)) abort();
+    }
+    GuardedBuffer(const GuardedBuffer&) = delete;
+    GuardedBuffer& operator=(const GuardedBuffer&) = delete;
+
+    uint8_t* data() const { return begin(); }
+    uint8_t* begin() const { return mBytes.get() + kGuard; }
+    uint8_t* end() const { return begin() + mSize; }
+    size_t size() const { return mSize; }
+
+  private:
+    static constexpr size_t kGuard = 4096;
+    static constexpr uint8_t kUntouched = 0xA5;
+
+    size_t mSize;
+    std::unique_ptr<uint8_t[]> mBytes;
+};
+
+#else
 
 /// `size` zero bytes that end exactly at an inaccessible page, or start exactly behind one.
 class GuardedBuffer {
@@ -47,6 +85,8 @@ class GuardedBuffer {
     uint8_t* mMapped;
     uint8_t* mData;
 };
+
+#endif
 
 /// A VFBitmap whose pixels lie in a guarded buffer while it lives.
 class GuardedBitmap {

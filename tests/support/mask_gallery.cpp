@@ -2,11 +2,12 @@
 
 #include <algorithm>
 #include <cmath>
+#include <cstdio>
 #include <cstdlib>
-#include <fstream>
-#include <iterator>
-#include <stdexcept>
+#include <string>
 #include <utility>
+
+#include "file_bytes.h"
 
 namespace vorel_test {
 namespace {
@@ -164,9 +165,12 @@ std::string glyphFile() {
 Mask readGlyphLine() {
     const std::string path = glyphFile();
     if (path.empty()) return {};
-    std::ifstream file(path, std::ios::binary);
-    if (!file) throw std::runtime_error("cannot read the glyph masks in " + path);
-    ByteReader reader({std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()});
+    const auto bytes = bytesOfFile(path);
+    if (!bytes) {
+        std::fprintf(stderr, "cannot read the glyph masks in %s\n", path.c_str());
+        std::abort();
+    }
+    ByteReader reader({bytes->begin(), bytes->end()});
 
     struct Piece {
         int x, y;

@@ -4,7 +4,7 @@
 #
 #     own_functions.sh OBJECT
 set -euo pipefail
-symbols=$(nm --defined-only --demangle "$1")
+symbols=$("${NM:-nm}" --defined-only --demangle "$1")
 grep -Eq 'VFontEffect::look_[0-9_]+::Look::key' <<< "$symbols" ||
     { echo "no code of look.h in $1" >&2; exit 1; }
 if grep -E ' [WVu] VFontEffect::look_[0-9_]+::' <<< "$symbols"; then

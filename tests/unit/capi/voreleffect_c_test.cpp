@@ -322,6 +322,34 @@ TEST(CFace, ViewsAndGlyphsThatCannotBeRead_AreRefused) {
     EXPECT_EQ(painted(glyph, {nullptr, 0, 4, 0, VOREL_RGBA}), VOREL_OK) << "to no effect";
 }
 
+TEST(CFace, RowsFartherApartThanPointersSpan_AreRefused) {
+    Page page(4, 4);
+    const unsigned char coverage[16] = {};
+    const vorel_glyph glyph = {0, 0, coverage, 2, 2, 0};
+    const vorel_view view = inC(page.view());
+    // The last of three rows begins two strides from the first: that its end is within what pointers
+    // span leaves half of that, less half a row, for each.
+    constexpr ptrdiff_t kGlyphStride = (PTRDIFF_MAX - 2) / 2 + 1;
+    constexpr ptrdiff_t kViewStride = (PTRDIFF_MAX - 16) / 2 + 1;
+    EXPECT_EQ(painted({0, 0, coverage, 2, 3, kGlyphStride}, view), VOREL_BAD_ARGUMENT);
+    EXPECT_EQ(painted(glyph, {view.data, 4, 3, kViewStride, VOREL_RGBA}), VOREL_BAD_ARGUMENT);
+    EXPECT_EQ(painted({9, 9, coverage, 2, 2, 0}, {view.data, 4, 3, kViewStride - 1, VOREL_RGBA}),
+              VOREL_OK);
+    const vorel_pixels pixels = {coverage, 1, 3, kViewStride + 6};
+    const LookHandle look = newLook();
+    EXPECT_EQ(vorel_look_pattern(look.get(), &pixels, 1, 1), VOREL_BAD_ARGUMENT);
+}
+
+TEST(CFace, PackedRowsOfMoreThanPointersSpan_AreRefused) {
+    Page page(4, 4);
+    const unsigned char coverage[16] = {};
+    const vorel_glyph glyph = {0, 0, coverage, 2, 2, 0};
+    if (sizeof(ptrdiff_t) > 4) GTEST_SKIP() << "there is no such width";
+    for (const int32_t width : {1 << 29, INT32_MAX})
+        EXPECT_EQ(painted(glyph, {page.view().data, width, 2, 0, VOREL_RGBA}), VOREL_BAD_ARGUMENT);
+    EXPECT_EQ(painted(glyph, {page.view().data, 1 << 15, 1 << 15, 0, VOREL_RGBA}), VOREL_BAD_ARGUMENT);
+}
+
 TEST(CFace, GlyphsFarApart_AreTooLargeForALayer) {
     const unsigned char covered = 255;
     const vorel_glyph glyphs[] = {{INT32_MIN, 0, &covered, 1, 1, 0}, {INT32_MAX, 0, &covered, 1, 1, 0}};

@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+#include <cstddef>
 #include <cstdint>
 #include <utility>
 
@@ -27,6 +29,17 @@ TEST(PixelBuffer, BeyondFourGigabytes_IsRefusedWhateverAnElementTakes) {
     expectRefusedBeyondTheLimit<uint16_t>();
     expectRefusedBeyondTheLimit<uint32_t>();
     expectRefusedBeyondTheLimit<uint64_t>();
+}
+
+TEST(PixelBuffer, BeyondWhatPointersSpan_IsRefused) {
+    constexpr int64_t kMost = std::min<int64_t>(kMostBytes, PTRDIFF_MAX);
+    EXPECT_FALSE(PixelBuffer<uint8_t>::uninitialised(kMost + 1));
+    // Where a size has 32 bits this is one of no bytes.
+    const int64_t wrapped = kMostBytes;
+    if (sizeof(size_t) == 4) {
+        EXPECT_FALSE(PixelBuffer<uint8_t>::uninitialised(wrapped));
+        EXPECT_FALSE(PixelBuffer<uint32_t>::zeroed(wrapped / 8, 2));
+    }
 }
 
 TEST(PixelBuffer, NegativeSides_AreRefused) {

@@ -259,6 +259,16 @@ class LongRecord : public VFProperty {
     int mLength;
 };
 
+TEST(MapKey, LengthsWhoseSumNeedsMoreThan32Bits_GiveNoKey) {
+    LongRecord half(INT32_MAX);
+    LongRecord rest(2 + 8);  // 2^32 + 8 in all
+    VFEffect set;
+    insertCore(set, kOuterGlow, &half);
+    insertCore(set, kInnerGlow, &half);
+    insertCore(set, kStroke, &rest);
+    EXPECT_EQ(set.getMapKey(), nullptr);
+}
+
 TEST(MapKey, LongestKey_Has2To28Bytes) {
     constexpr int kLongest = 1 << 28;
     LongRecord within(kLongest - 9);

@@ -2,11 +2,11 @@
 #include <voreleffect/VFEffect.h>
 
 #include <algorithm>
-#include <fstream>
-#include <iterator>
+#include <string>
 
 #include "tests/support/compare.h"
 #include "tests/support/engine.h"
+#include "tests/support/file_bytes.h"
 #include "tests/support/random.h"
 
 using namespace VFontEffect;
@@ -29,8 +29,7 @@ struct PlacedGlyph {
 class ByteReader {
   public:
     explicit ByteReader(const char* path) {
-        std::ifstream file(path, std::ios::binary);
-        mBytes.assign(std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>());
+        if (const auto bytes = vorel_test::bytesOfFile(path)) mBytes = *bytes;
     }
 
     uint32_t number(int bytes) {
@@ -44,7 +43,7 @@ class ByteReader {
     bool atEnd() const { return mAt == mBytes.size(); }
 
   private:
-    std::vector<char> mBytes;
+    std::string mBytes;
     size_t mAt = 0;
 };
 
