@@ -1,7 +1,7 @@
 // Builds the package into dist: the compiled sources, the modules, and the modules in base64.
 //
 //     node build.mjs [FOLDER_OF_THE_MODULES]
-import { execFileSync } from 'node:child_process';
+import { spawnSync } from 'node:child_process';
 import { copyFileSync, existsSync, readFileSync, rmSync, writeFileSync } from 'node:fs';
 import { createRequire } from 'node:module';
 import { dirname, join } from 'node:path';
@@ -23,7 +23,8 @@ function inlined(file) {
 
 rmSync('dist', { recursive: true, force: true });
 const compiler = join(dirname(createRequire(import.meta.url).resolve('typescript')), 'tsc.js');
-execFileSync(process.execPath, [compiler, '--project', '.'], { stdio: 'inherit' });
+const { status } = spawnSync(process.execPath, [compiler, '--project', '.'], { stdio: 'inherit' });
+if (status !== 0) process.exit(1);
 for (const { name } of modules.filter(({ entry }) => existsSync(`src/${entry}.ts`))) {
     const file = join(folder, `${name}.wasm`);
     copyFileSync(file, `dist/${name}.wasm`);

@@ -1,6 +1,6 @@
 import { Engine } from './engine.js';
 import { VorelError } from './errors.js';
-import { kindOf } from './values.js';
+import { kindOf, tagOf } from './values.js';
 import { VERSION } from './version.js';
 
 /** The platform's WebAssembly.Module; where its types are not known, nothing. */
@@ -80,8 +80,9 @@ export async function engineOf(source: WasmSource, fetch: Fetch, wanted: Wanted)
 
 async function moduleOf(given: WasmSource, fetch: Fetch): Promise<WebAssembly.Module> {
     const source = await given;
-    if (source instanceof WebAssembly.Module) return source;
-    if (source instanceof ArrayBuffer || ArrayBuffer.isView(source)) return compiled(source);
+    if (tagOf(source) === 'WebAssembly.Module') return source as WebAssembly.Module;
+    if (ArrayBuffer.isView(source)) return compiled(source);
+    if (tagOf(source) === 'ArrayBuffer') return compiled(new Uint8Array(source as ArrayBuffer));
     if (isResponse(source)) return compiledAnswer(source);
     const address = addressOf(source);
     const answer = await fetch(address);
@@ -108,18 +109,17 @@ async function compiledAnswer(answer: ResponseLike): Promise<WebAssembly.Module>
     if (isTold && answer instanceof Response && 'compileStreaming' in WebAssembly) {
         return refused(() => WebAssembly.compileStreaming(answer));
     }
-    return compiled(await answer.arrayBuffer());
+    return compiled(new Uint8Array(await answer.arrayBuffer()));
 }
 
-async function compiled(source: ArrayBuffer | ArrayBufferView): Promise<WebAssembly.Module> {
-    const bytes = ArrayBuffer.isView(source)
-        ? new Uint8Array(source.buffer, source.byteOffset, source.byteLength).slice()
-        : new Uint8Array(source);
+async function compiled(view: ArrayBufferView): Promise<WebAssembly.Module> {
+    // A copy: memory that is shared is not compiled.
+    const bytes = Uint8Array.from(new Uint8Array(view.buffer, view.byteOffset, view.byteLength));
     if (MAGIC.some((byte, i) => bytes[i] !== byte)) {
         const start = new TextDecoder('latin1').decode(bytes.subarray(0, 9));
         throw new VorelError(`no module: it begins with ${JSON.stringify(start)}`);
     }
-    return refused(() => WebAssembly.compile(bytes as Uint8Array<ArrayBuffer>));
+    return refused(() => WebAssembly.compile(bytes));
 }
 
 /** Says why a module was not compiled. */

@@ -7,6 +7,7 @@ import {
     options,
     spelled,
     stops,
+    tagOf,
     unit,
     type Color,
     type Stop,
@@ -258,7 +259,9 @@ export function bytesOf<Kind extends Uint8Array | Uint8ClampedArray>(
     data: Kind,
     what: string,
 ): Kind {
-    if (data instanceof Uint8Array || data instanceof Uint8ClampedArray) return data;
+    const tag = tagOf(data);
+    const isOfBytes = tag === 'Uint8Array' || tag === 'Uint8ClampedArray';
+    if (ArrayBuffer.isView(data) && isOfBytes) return data;
     throw new TypeError(`${what}: a Uint8Array or a Uint8ClampedArray, not ${kindOf(data)}`);
 }
 

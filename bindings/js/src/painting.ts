@@ -57,7 +57,7 @@ export class Painter {
     /** Paints onto a target; see the function `paint`. */
     paint(glyphs: Glyphs, target: PaintTarget, place?: Place): Box;
     paint(glyphs: Glyphs, target?: PaintTarget, place?: Place): Picture | Box {
-        const painter = this.#handle.address;
+        const painter = (): number => this.#handle.address;
         return this.#engine.scoped((scope) => paintBy(scope, painter, glyphs, target, place));
     }
 
@@ -86,7 +86,8 @@ export function painterClassOf(engine: Engine): PainterClass {
 
 /** Where looks lie in memory. Throws TypeError for what are no looks of the instance. */
 export function addressesOf(engine: Engine, looks: Look | readonly Look[]): number[] {
-    const stack: readonly unknown[] = Array.isArray(looks) ? looks : [looks];
+    // Read before the first address is asked for: what reads them may free some.
+    const stack: unknown[] = Array.isArray(looks) ? Array.from(looks) : [looks];
     return stack.map((look) => Look.addressIn(engine, look));
 }
 
@@ -100,7 +101,7 @@ export function paint(
 ): Picture | Box {
     return engine.scoped((scope) => {
         const painter = scope.takes(painterOf(scope, looks), 'vorel_painter_free');
-        return paintBy(scope, painter, glyphs, target, place);
+        return paintBy(scope, () => painter, glyphs, target, place);
     });
 }
 
@@ -108,9 +109,12 @@ function painterOf(scope: Scope, looks: readonly number[]): number {
     return scope.made('vorel_painter_new', scope.words(...looks), looks.length);
 }
 
+/** Where a painter lies; what is read of arguments may have freed it, which this throws. */
+type PainterAddress = () => number;
+
 function paintBy(
     scope: Scope,
-    painter: number,
+    painter: PainterAddress,
     given: Glyphs,
     target: PaintTarget | undefined,
     place: Place = {},
@@ -126,9 +130,14 @@ function paintBy(
     return onRows(scope, painter, glyphs, new Rows(target), origin);
 }
 
-function pictureBy(scope: Scope, painter: number, glyphs: PlacedGlyphs): Picture {
+function pictureBy(scope: Scope, painter: PainterAddress, glyphs: PlacedGlyphs): Picture {
     const { engine } = scope;
-    const made = scope.made('vorel_painter_picture', painter, glyphs.copiedTo(scope), glyphs.count);
+    const made = scope.made(
+        'vorel_painter_picture',
+        painter(),
+        glyphs.copiedTo(scope),
+        glyphs.count,
+    );
     const picture = scope.takes(made, 'vorel_picture_free');
     const part = (name: string): number => engine.call(`vorel_picture_${name}`, picture);
     const [width, height] = [part('width'), part('height')];
@@ -153,9 +162,9 @@ interface Origin {
 }
 
 /** The part of a target that may be painted: the glyphs with the margins around them. */
-function reachOf(scope: Scope, painter: number, glyphs: PlacedGlyphs, at: Origin): Sides {
+function reachOf(scope: Scope, painter: PainterAddress, glyphs: PlacedGlyphs, at: Origin): Sides {
     const { left, top, right, bottom } = glyphs.sides ?? NOTHING;
-    const around = marginsBy(scope.engine, 'vorel_painter_margins', painter);
+    const around = marginsBy(scope.engine, 'vorel_painter_margins', painter());
     return {
         left: at.x + left - around.left,
         top: at.y + top - around.top,
@@ -164,14 +173,28 @@ function reachOf(scope: Scope, painter: number, glyphs: PlacedGlyphs, at: Origin
     };
 }
 
-function onRows(scope: Scope, painter: number, glyphs: PlacedGlyphs, rows: Rows, at: Origin): Box {
+function onRows(
+    scope: Scope,
+    painter: PainterAddress,
+    glyphs: PlacedGlyphs,
+    rows: Rows,
+    at: Origin,
+): Box {
     const { engine } = scope;
     const box = clipped(reachOf(scope, painter, glyphs, at), rows.width, rows.height);
     const list = glyphs.copiedTo(scope);
     const touched = scope.words(0, 0, 0, 0);
     const part = rows.part(scope, box);
     const place = [at.x - box.left, at.y - box.top] as const;
-    engine.check('vorel_painter_paint', painter, list, glyphs.count, part.view, ...place, touched);
+    engine.check(
+        'vorel_painter_paint',
+        painter(),
+        list,
+        glyphs.count,
+        part.view,
+        ...place,
+        touched,
+    );
     part.finish();
     return movedBy(sidesAt(engine, touched), box.left, box.top);
 }
@@ -185,7 +208,7 @@ function movedBy(box: Box, x: number, y: number): Box {
 /** A canvas gives and takes straight pixels: the part that is painted is taken out and put back. */
 function onCanvas(
     scope: Scope,
-    painter: number,
+    painter: PainterAddress,
     glyphs: PlacedGlyphs,
     canvas: CanvasLike,
     at: Origin,

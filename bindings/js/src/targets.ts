@@ -1,7 +1,7 @@
 import type { Scope } from './engine.js';
 import { bytesOf, checkRows, strideOf } from './look_state.js';
 import { premultiplied, straightened } from './picture.js';
-import { integer, kindOf, object, type Box } from './values.js';
+import { integer, kindOf, object, tagOf, type Box } from './values.js';
 
 /** A buffer of pixels of 4 bytes to paint onto. */
 export interface Target {
@@ -42,7 +42,7 @@ export class Rows {
     /** Throws TypeError or RangeError for what is no target. */
     constructor(target: Target) {
         const { data, width, height, stride, order = 'rgba' } = object(target, 'a target');
-        const { alpha = isImageData(target) ? 'straight' : 'premultiplied' } = target;
+        const { alpha = tagOf(target) === 'ImageData' ? 'straight' : 'premultiplied' } = target;
         this.width = integer(width, 'width', 0);
         this.height = integer(height, 'height', 0);
         this.#data = bytesOf(data, 'a target');
@@ -93,11 +93,6 @@ function oneOf<Name extends string>(value: unknown, what: string, names: readonl
     if (found !== undefined) return found;
     const told = typeof value === 'string' ? `'${value}'` : kindOf(value);
     throw new RangeError(`${what}: ${told} is none of ${names.join(', ')}`);
-}
-
-/** Also of another window or frame. */
-function isImageData(target: object): boolean {
-    return Object.prototype.toString.call(target) === '[object ImageData]';
 }
 
 function premultiply(pixels: Uint8Array): void {

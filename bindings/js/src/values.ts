@@ -36,9 +36,14 @@ const LARGEST_INTEGER = 2 ** 31 - 1;
 
 /** What a value is, for an error. */
 export function kindOf(value: unknown): string {
-    if (value === null) return 'null';
+    if (value === null || value === undefined) return String(value);
     if (Array.isArray(value)) return 'an array';
     return typeof value === 'object' ? 'an object' : `a ${typeof value}`;
+}
+
+/** The kind of an object of the platform, also of one from another window or context. */
+export function tagOf(value: unknown): string {
+    return Object.prototype.toString.call(value).slice('[object '.length, -1);
 }
 
 /** A finite number. Throws TypeError, or RangeError for one that is none. */

@@ -19,7 +19,8 @@ export interface Paint {
      * large enough. Gradients, patterns and what lies inside follow the box around all masks of a call.
      *
      * Masks are looked at during the call alone, and copied into the module's memory. Throws TypeError and RangeError
-     * for arguments, VorelSizeError, VorelMemoryError; nothing is painted then.
+     * for arguments, VorelSizeError, VorelMemoryError; nothing is painted then. An effect that memory runs out for
+     * while it paints is missing, the others are there.
      */
     (looks: Look | readonly Look[], glyphs: Glyphs): Picture;
     /**
