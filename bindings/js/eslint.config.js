@@ -27,4 +27,19 @@ export default defineConfig(
             ),
         },
     },
+    {
+        files: ['tests/page/*.js'],
+        languageOptions: {
+            globals: Object.fromEntries(
+                [
+                    'Worker',
+                    'ImageData',
+                    'OffscreenCanvas',
+                    'document',
+                    'onmessage',
+                    'postMessage',
+                ].map((name) => [name, name === 'onmessage' ? 'writable' : 'readonly']),
+            ),
+        },
+    },
 );
