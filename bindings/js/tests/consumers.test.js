@@ -6,7 +6,7 @@ import { after, before, test } from 'node:test';
 import { fileURLToPath } from 'node:url';
 
 import * as esbuild from 'esbuild';
-import { build as viteBuild } from 'vite';
+import { build as viteBuild, createServer } from 'vite';
 import { publint } from 'publint';
 import { formatMessage } from 'publint/utils';
 import webpack from 'webpack';
@@ -147,6 +147,31 @@ test('Vite_CarriesTheModuleAlong', async () => {
     assert.deepEqual(await told('vite'), expected);
     const names = readdirSync(join(project, 'vite'), { recursive: true });
     assert.equal(names.filter((name) => name.endsWith('.wasm')).length, 1);
+});
+
+test('Vite_ServesTheModuleWhileOneDevelops', async () => {
+    const server = { host: '127.0.0.1', port: 0, watch: null, hmr: false };
+    const developing = await createServer({ root: project, logLevel: 'error', server });
+    await developing.listen();
+    const { port } = developing.httpServer.address();
+    const { value } = await resultOf(running, `http://127.0.0.1:${port}/index.html`);
+    await developing.close();
+    assert.deepEqual(value, expected);
+});
+
+test('Import_FetchesNothing', async () => {
+    writeFileSync(
+        join(project, 'import.html'),
+        `<!doctype html><link rel="icon" href="data:," /><script type="module">
+            import * as voreleffect from './node_modules/voreleffect/dist/index.js';
+            globalThis.result = Object.keys(voreleffect);
+        </script>`,
+    );
+    const site = await served(project);
+    const { value } = await resultOf(running, `${site.address}/import.html`);
+    site.close();
+    assert.deepEqual(value, ['VorelError', 'VorelMemoryError', 'VorelSizeError', 'load']);
+    assert.ok(!site.requests.some((path) => path.endsWith('.wasm')));
 });
 
 test('Webpack_CarriesTheModuleAlong', async () => {
