@@ -18,5 +18,5 @@ quietly npm ci --ignore-scripts --no-audit --no-fund
 node build.mjs
 npx eslint .
 npx prettier --log-level warn --check .
-node --test --test-concurrency="$(nproc)" tests/
+node --test --test-concurrency="$(nproc)" tests/*.test.js
 node sizes.mjs

@@ -14,6 +14,10 @@ const Status = { ok: 0, tooLarge: 2, noMemory: 3 } as const;
 /** More than a module can ever hand out: sizes beyond would wrap around in its 32 bits. */
 const MOST_BYTES = 0xffff0000;
 
+const TOO_LARGE =
+    'the masks and their effects are too large: a layer has less than 2^31 bytes, and the left and top of a ' +
+    'picture fit into 32 bits';
+
 const DEAD =
     'this instance of voreleffect has failed and cannot be used any more; load() gives a fresh one';
 
@@ -122,7 +126,7 @@ export class Engine {
     #errorOf(status: number): VorelError {
         const text = this.textAt(this.addressBy('vorel_status_text', status));
         if (status === Status.noMemory) return new VorelMemoryError(text);
-        if (status === Status.tooLarge) return new VorelSizeError(text);
+        if (status === Status.tooLarge) return new VorelSizeError(TOO_LARGE);
         return new VorelError(text);
     }
 }

@@ -107,7 +107,7 @@ export function color(value: unknown): number {
 }
 
 function colorOfText(text: string): number {
-    if (!/^#([0-9a-f]{3}|[0-9a-f]{6})$/i.test(text) || text.endsWith('\n')) {
+    if (!/^#([0-9a-f]{3}|[0-9a-f]{6})$/i.test(text)) {
         throw new RangeError(`'${text}' is no colour: write '#RRGGBB' or '#RGB'`);
     }
     const digits = text.slice(1);

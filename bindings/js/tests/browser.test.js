@@ -26,6 +26,7 @@ test('Page_PaintsTheTableAndItsTargetsUnderAPolicy', async () => {
     const table = new URL('../../../tests/determinism/hashes.txt', import.meta.url);
     assert.deepEqual(value.lines, readFileSync(table, 'utf8').trimEnd().split('\n'));
     assert.deepEqual(value.imageData, value.buffer);
+    assert.deepEqual(value.translucent[0], value.translucent[1]);
     assert.ok(value.box.right > value.box.left);
     const empty = { left: 0, top: 0, right: 0, bottom: 0 };
     const ofCanvas = { box: value.box, away: empty, bytes: value.buffer };

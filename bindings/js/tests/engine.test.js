@@ -58,6 +58,13 @@ test('Errors_LeaveNothingAllocated', () => {
     assert.deepEqual(counted.live, []);
 });
 
+test('Look_ThatCannotBeMadeLeavesNothing', () => {
+    const counted = new Counted({ vorel_look_stroke: () => 3 });
+    const look = new counted.ve.Look().pattern(TILE).stroke(3, 0);
+    assert.throws(() => look.key, { name: 'VorelMemoryError' });
+    assert.deepEqual(counted.live, []);
+});
+
 test('Arguments_ThatFreeWhatPaintsAreHarmless', () => {
     const { engine, ve } = new Counted();
     const painter = new ve.Painter(new ve.Look());
@@ -158,6 +165,8 @@ test('Collected_IsFreed', async () => {
     assert.equal(counted.live.length, 100);
     const kept = new ve.Look();
     assert.ok(kept.key.length > 0);
+    // What was freed before is not freed again, which would throw.
+    for (let i = 0; i < 50; ++i) new ve.Painter(kept).free();
     for (let i = 0; i < 50 && counted.live.length > 1; ++i) {
         collect();
         await setImmediate();

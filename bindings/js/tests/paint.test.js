@@ -2,6 +2,7 @@ import assert from 'node:assert/strict';
 import { test } from 'node:test';
 
 import { load } from 'voreleffect';
+import { straightened } from '../dist/picture.js';
 import { disc, everything, noise } from './scenes.js';
 import { block, page } from './support.js';
 
@@ -39,6 +40,7 @@ test('Picture_OutlivesItsLookAndTheNextPaintings', () => {
 test('Straight_DividesAlphaOutToNearest', () => {
     const picture = new Look().fill('#c08040').paint(noise());
     const straight = picture.straight();
+    assert.deepEqual([straightened(9, 0), straightened(200, 100)], [0, 255]);
     for (let at = 0; at < straight.length; at += 4) {
         const alpha = picture.data[at + 3];
         for (let c = 0; c < 3; ++c) {

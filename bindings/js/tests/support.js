@@ -22,9 +22,10 @@ export function page(width, height, pixel = [0, 0, 0, 0], more = {}) {
 /** An instance whose allocations and things are counted. */
 export class Counted {
     #live = new Set();
-    constructor() {
+    /** With other calls in the place of some. */
+    constructor(others = {}) {
         const { exports } = new WebAssembly.Instance(MODULE, {});
-        const calls = { ...exports };
+        const calls = { ...exports, ...others };
         calls.malloc = (bytes) => this.#came('malloc', exports.malloc(bytes));
         calls.free = (address) => this.#went('malloc', address, exports.free);
         for (const thing of ['look', 'painter', 'picture']) {

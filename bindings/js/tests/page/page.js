@@ -31,7 +31,13 @@ async function results() {
     const element = Object.assign(document.createElement('canvas'), { width, height });
     const picture = everything(new ve.Look(), 4).paint(mask);
     const image = picture.imageData();
+    const translucent = () => PAGE.data().map((byte, i) => (i % 4 === 3 ? (i * 3) % 256 : byte));
+    const clear = new ImageData(new Uint8ClampedArray(translucent()), width, height);
+    const straight = { width, height, data: translucent(), alpha: 'straight' };
+    look.paint(mask, clear, place);
+    look.paint(mask, straight, place);
     return {
+        translucent: [numbersOf(clear.data), numbersOf(straight.data)],
         lines: linesOf(ve),
         box,
         imageData: numbersOf(ofPage.data),
