@@ -28,7 +28,7 @@ export type Glyphs = Mask | Glyph | readonly Glyph[];
 interface Placed {
     readonly x: number;
     readonly y: number;
-    readonly data: Uint8Array | Uint8ClampedArray;
+    readonly data: Uint8Array;
     readonly width: number;
     readonly height: number;
     readonly stride: number;
@@ -52,7 +52,9 @@ export class PlacedGlyphs {
     /** Throws TypeError or RangeError for what are no glyphs. */
     constructor(given: Glyphs) {
         const list: readonly unknown[] = Array.isArray(given) ? given : [given];
-        this.#glyphs = list.map(placed).filter(({ width, height }) => width > 0 && height > 0);
+        this.#glyphs = Array.from(list, placed).filter(
+            ({ width, height }) => width > 0 && height > 0,
+        );
     }
 
     get count(): number {

@@ -254,14 +254,12 @@ function packed(pixels: Pixels): Pick<PatternState, 'width' | 'height' | 'data'>
     return { width, height, data };
 }
 
-/** An array of bytes. Throws TypeError. */
-export function bytesOf<Kind extends Uint8Array | Uint8ClampedArray>(
-    data: Kind,
-    what: string,
-): Kind {
+/** The bytes of an array of them, where they lie: whatever its class makes of its calls. Throws TypeError. */
+export function bytesOf(data: unknown, what: string): Uint8Array {
     const tag = tagOf(data);
-    const isOfBytes = tag === 'Uint8Array' || tag === 'Uint8ClampedArray';
-    if (ArrayBuffer.isView(data) && isOfBytes) return data;
+    if (ArrayBuffer.isView(data) && (tag === 'Uint8Array' || tag === 'Uint8ClampedArray')) {
+        return new Uint8Array(data.buffer, data.byteOffset, data.byteLength);
+    }
     throw new TypeError(`${what}: a Uint8Array or a Uint8ClampedArray, not ${kindOf(data)}`);
 }
 

@@ -34,7 +34,7 @@ export interface Part {
 export class Rows {
     readonly width: number;
     readonly height: number;
-    readonly #data: Uint8Array | Uint8ClampedArray;
+    readonly #data: Uint8Array;
     readonly #stride: number;
     readonly #order: keyof typeof ORDERS;
     readonly #isStraight: boolean;
@@ -82,7 +82,7 @@ export class Rows {
         return { view, finish };
     }
 
-    #row(x: number, y: number, width: number): Uint8Array | Uint8ClampedArray {
+    #row(x: number, y: number, width: number): Uint8Array {
         const at = y * this.#stride + 4 * x;
         return this.#data.subarray(at, at + 4 * width);
     }
@@ -104,11 +104,7 @@ function premultiply(pixels: Uint8Array): void {
 }
 
 /** Takes the pixels that painting has changed, alpha divided out; the others keep their bytes. */
-function takeStraight(
-    row: Uint8Array | Uint8ClampedArray,
-    painted: Uint8Array,
-    before: Uint8Array,
-): void {
+function takeStraight(row: Uint8Array, painted: Uint8Array, before: Uint8Array): void {
     for (let at = 0; at < painted.length; at += 4) {
         const alpha = painted[at + 3]!;
         let isChanged = alpha !== before[at + 3];

@@ -1,5 +1,5 @@
 import assert from 'node:assert/strict';
-import { copyFileSync, readFileSync, rmSync } from 'node:fs';
+import { readFileSync } from 'node:fs';
 import { after, test } from 'node:test';
 import { fileURLToPath } from 'node:url';
 
@@ -8,17 +8,13 @@ import { browser, resultOf, served } from './served.js';
 const folder = fileURLToPath(new URL('..', import.meta.url));
 const policy = (more) =>
     `default-src 'none'; script-src 'self'${more}; worker-src 'self'; connect-src 'self'; img-src data:`;
-const copied = `${folder}tests/page/voreleffect.txt`;
-copyFileSync(`${folder}dist/voreleffect.wasm`, copied);
 const running = await browser();
-after(async () => {
-    await running.close();
-    rmSync(copied);
-});
+after(() => running.close());
 
 test('Page_PaintsTheTableAndItsTargetsUnderAPolicy', async () => {
-    const site = await served(folder, () => ({
+    const site = await served(folder, (url) => ({
         'Content-Security-Policy': policy(" 'wasm-unsafe-eval'"),
+        ...(url.endsWith('?text') ? { 'Content-Type': 'text/plain' } : {}),
     }));
     const { value, complaints } = await resultOf(running, `${site.address}/tests/page/`);
     site.close();

@@ -221,6 +221,12 @@ test('Masks_OfAnyStrideBufferAndKindPaintTheSame', () => {
     assert.deepEqual(painted({ data: Buffer.from(data) }), expected);
     assert.deepEqual(painted({ data: new Uint8ClampedArray(data) }), expected);
     assert.deepEqual(rich.paint(Object.freeze({ data, width, height })).data, expected);
+    class Lying extends Uint8Array {
+        subarray() {
+            return new Uint8Array(1 << 20);
+        }
+    }
+    assert.deepEqual(painted({ data: new Lying(data) }), expected);
     const frozen = Object.freeze([Object.freeze({ x: 0, y: 0, mask: { data, width, height } })]);
     assert.deepEqual(rich.paint(frozen).data, expected);
 });
@@ -246,7 +252,8 @@ test('Masks_ThatAreNoneAreRefused', () => {
     refused(TypeError, { x: 0, y: 0, mask: null });
     const gone = new Uint8Array(12);
     structuredClone(gone.buffer, { transfer: [gone.buffer] });
-    refused(RangeError, { data: gone, width: 4, height: 3 });
+    refused(TypeError, { data: gone, width: 4, height: 3 });
+    refused(TypeError, Object.assign([], { length: 1 }));
 });
 
 test('Targets_ThatAreNoneAreRefused', () => {

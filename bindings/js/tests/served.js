@@ -12,7 +12,7 @@ const TYPES = {
     '.wasm': 'application/wasm',
 };
 
-/** Serves a folder; what headers there are besides is asked for each path. */
+/** Serves a folder; what other headers there are is asked for each request. */
 export async function served(folder, headersOf = () => ({})) {
     const requests = [];
     const server = createServer(async (request, response) => {
@@ -22,7 +22,7 @@ export async function served(folder, headersOf = () => ({})) {
         try {
             const bytes = await readFile(join(folder, name));
             const type = TYPES[extname(name)] ?? 'application/octet-stream';
-            response.writeHead(200, { 'Content-Type': type, ...headersOf(path) });
+            response.writeHead(200, { 'Content-Type': type, ...headersOf(request.url) });
             response.end(bytes);
         } catch {
             response.writeHead(404).end();

@@ -48,7 +48,7 @@ async function results() {
         image: numbersOf(image.data),
         sides: [image.width - picture.width, image.height - picture.height],
         kinds: [image instanceof ImageData, ofPage instanceof ImageData],
-        wrongKind: await failed(load('/tests/page/voreleffect.txt')),
+        wrongKind: await failed(load('/dist/voreleffect.wasm?text')),
         missing: await failed(load('/none.wasm')),
         page: await failed(load('/tests/page/index.html')),
         empty: await failed((async () => new ve.Look().paint([]).imageData())()),
