@@ -10,6 +10,7 @@ cd "$(dirname "$0")/.."
 need_packages chromium
 command -v node > /dev/null || need_packages nodejs
 command -v npm > /dev/null || need_packages npm
+[[ $(node --print 'parseInt(process.versions.node)') -ge 20 ]] || { echo 'node 20 or later is needed' >&2; exit 1; }
 
 quietly scripts/wasm.sh modules
 cd bindings/js
