@@ -8,6 +8,7 @@
 #include "compose/layer_set.h"
 #include "compose/limits.h"
 #include "compose/note.h"
+#include "compose/plan.h"
 #include "compose/request.h"
 #include "compose/set_text.h"
 #include "compose/shelf.h"
