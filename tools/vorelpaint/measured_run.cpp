@@ -9,14 +9,12 @@
 namespace vorelpaint {
 namespace {
 
-using VFontEffect::VFEffect;
 using vorelcompose::LookPlan;
-using vorelcompose::PlannedEffect;
+using vorelcompose::SteppedRun;
 using vorelstyle::Look;
 using voreltext::Frame;
 using voreltext::GlyphMask;
 using voreltext::Image;
-using voreltext::Run;
 using Clock = std::chrono::steady_clock;
 
 /// Calls `step` and returns what it takes.
@@ -27,19 +25,6 @@ Cost costOf(Step step) {
     step();
     const std::chrono::duration<double, std::milli> time = Clock::now() - start;
     return {time.count(), meter.peak()};
-}
-
-void removeAll(VFEffect& effects, const LookPlan& plan) {
-    for (const PlannedEffect& planned : plan.effects)
-        effects.removeEffect(effects.getEffect(planned.type)->getId());
-}
-
-/// Paints one effect of `source` into the run that is under way in `run`, which holds no other.
-Cost paintAlone(VFEffect& run, VFEffect& source, int type) {
-    const int id = run.addEffect(type, source.getEffect(type)->getProperty());
-    const Cost cost = costOf([&] { run.doEffectPostProcessing(); });
-    run.removeEffect(id);
-    return cost;
 }
 
 /// The layers stay throughout; each effect gives its working memory back before the next begins.
@@ -84,19 +69,13 @@ void takeMedian(std::vector<MeasuredRun>& runs, Part part) {
 
 MeasuredRun measuredRun(const Look& look, const LookPlan& plan, const Frame& frame,
                         const std::vector<GlyphMask>& glyphs, Image* picture) {
-    VFEffect source(look.effects());
-    VFEffect effects(look.effects());
-    Run run(effects, frame);
+    SteppedRun run(look, plan, frame);
     MeasuredRun measured;
-    measured.glyphs = costOf([&] {
-        run.begin();
-        for (const GlyphMask& glyph : glyphs)
-            run.draw(glyph);
-    });
-    // Whether the run is layered is settled now; it stays so without the effects that asked for it.
-    removeAll(effects, plan);
-    for (const PlannedEffect& planned : plan.effects)
-        measured.effects.push_back(paintAlone(effects, source, planned.type));
+    measured.glyphs = costOf([&] { run.draw(glyphs); });
+    for (size_t i = 0; i < plan.effects.size(); ++i) {
+        run.choose(i);
+        measured.effects.push_back(costOf([&] { run.paintChosen(); }));
+    }
     measured.merge = costOf([&] { run.merge(); });
     if (picture != nullptr) *picture = run.picture();
     measured.whole = sumOf(measured);
