@@ -26,6 +26,11 @@ const PROGRAM = `
     const { width, height, data } = look.paint({ data: new Uint8Array(12).fill(255), width: 4, height: 3 });
     globalThis.result = { version, sides: [width, height, look.margins.left + 2, data.length / 56] };
 `;
+const OF_TEXT = `${PROGRAM}
+    const { presets, Style } = await load();
+    globalThis.result.presets = presets.includes('neon') && Style.preset('neon').looks(48).length;
+`;
+const expectedOfText = { ...expected, presets: 2 };
 const pageOf = (script) =>
     `<!doctype html><link rel="icon" href="data:," /><script type="module" src="${script}"></script>`;
 
@@ -49,7 +54,13 @@ before(async () => {
         join(project, 'inline.js'),
         `import { load } from 'voreleffect/inline';${PROGRAM}`,
     );
+    writeFileSync(join(project, 'text.js'), `import { load } from 'voreleffect/text';${OF_TEXT}`);
+    writeFileSync(
+        join(project, 'text_inline.js'),
+        `import { load } from 'voreleffect/text/inline';${OF_TEXT}`,
+    );
     writeFileSync(join(project, 'index.html'), pageOf('app.js'));
+    writeFileSync(join(project, 'text.html'), pageOf('text.js'));
     running = await browser();
 });
 after(() => running.close());
@@ -68,6 +79,7 @@ async function told(folder, page = 'index.html') {
 test('Tarball_HasTheModuleTheTypesAndTheLicence', () => {
     for (const name of [
         'LICENSE',
+        'dist/voreleffect-text.wasm',
         'NOTICE',
         'README.md',
         'package.json',
@@ -88,10 +100,16 @@ test('Tarball_IsAsPackagesShouldBe', async () => {
 });
 
 test('Node_ImportsThePackage', () => {
-    for (const name of ['app', 'inline']) {
+    const programs = {
+        app: expected,
+        inline: expected,
+        text: expectedOfText,
+        text_inline: expectedOfText,
+    };
+    for (const [name, result] of Object.entries(programs)) {
         const program = `await import('./${name}.js'); console.log(JSON.stringify(result))`;
         const said = run(process.execPath, '--input-type=module', '--eval', program);
-        assert.deepEqual(JSON.parse(said), expected);
+        assert.deepEqual(JSON.parse(said), result);
     }
 });
 
@@ -142,11 +160,18 @@ test('Vite_CarriesTheModuleAlong', async () => {
     await viteBuild({
         root: project,
         logLevel: 'error',
-        build: { target: 'esnext', outDir: 'vite' },
+        build: {
+            target: 'esnext',
+            outDir: 'vite',
+            rollupOptions: {
+                input: ['index.html', 'text.html'].map((name) => join(project, name)),
+            },
+        },
     });
     assert.deepEqual(await told('vite'), expected);
     const names = readdirSync(join(project, 'vite'), { recursive: true });
-    assert.equal(names.filter((name) => name.endsWith('.wasm')).length, 1);
+    assert.equal(names.filter((name) => name.endsWith('.wasm')).length, 2);
+    assert.deepEqual(await told('vite', 'text.html'), expectedOfText);
 });
 
 test('Vite_ServesTheModuleWhileOneDevelops', async () => {

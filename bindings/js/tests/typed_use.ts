@@ -17,6 +17,18 @@ import type {
     WasmSource,
 } from 'voreleffect';
 import { load as loadInline } from 'voreleffect/inline';
+import { load as loadText, FontError, StyleError, TextError } from 'voreleffect/text';
+import type {
+    Explanation,
+    Font,
+    LayerPicture,
+    Style,
+    TextLayout,
+    TextOptions,
+    TextPicture,
+    VoreleffectText,
+} from 'voreleffect/text';
+import { load as loadTextInline } from 'voreleffect/text/inline';
 
 const sources: WasmSource[] = ['a.wasm', { href: 'a.wasm' }, new Uint8Array(8), new ArrayBuffer(8)];
 const ve: Voreleffect = await load(sources[0]);
@@ -65,6 +77,22 @@ const size: number = picture.imageData().width;
 }
 const errors: VorelError[] = [new VorelMemoryError('a'), new VorelSizeError('b')];
 void [same, margins, key, isEqual, box, once, straight, size, errors];
+
+const texts: VoreleffectText = await loadText();
+const inText: Voreleffect = await loadTextInline();
+const fonts: Font = new texts.Font(new ArrayBuffer(8), { name: 'sans', index: 0 });
+const style: Style = texts.Style.preset(texts.presets[0]!);
+const options: TextOptions = { fonts, size: 48, look: style, align: 'center', fit: 'wrap' };
+const title: TextPicture = texts.Text.picture('Hello', options);
+const layout: TextLayout = texts.Text.layout('Hello', { fonts: [fonts] });
+const plan: Explanation = texts.Text.explain('Hello', options);
+const layers: LayerPicture[] = texts.Text.layers('Hello', options);
+const ofStyle: Look[] = style.looks(48, { effectScale: 2 });
+const painted: Picture = texts.paint(ofStyle, layout.glyphs);
+const isOfFonts: boolean = new FontError('a') instanceof TextError;
+void [inText, title, plan, layers, painted, isOfFonts, new StyleError('a')];
+// @ts-expect-error -- a text has fonts
+texts.Text.picture('Hello', { size: 48 });
 
 // @ts-expect-error -- a position that there is not
 look.stroke(4, color, { position: 'above' });
