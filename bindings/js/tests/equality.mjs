@@ -42,7 +42,11 @@ const VARIATIONS = [
     ['AVA To', ['latin'], { letterSpacing: 5 }],
     ['AVA To', ['latin'], { letterSpacing: '-4%', look: 'neon' }],
     ['office', ['latin'], { features: ['liga=0', '-kern'] }],
-    ['a <c #f00>red</c> &lt;b&gt; <c #00FF80>green</c>', ['latin'], { markup: true, look: 'candy' }],
+    [
+        'a <c #f00>red</c> &lt;b&gt; <c #00FF80>green</c>',
+        ['latin'],
+        { markup: true, look: 'candy' },
+    ],
     ['Weight', ['variable'], { variations: { wght: 900 }, look: 'outline' }],
     ['Weight', ['variable'], { variations: { wght: 250 }, size: 31 }],
     ['Amount', ['cff'], { color: '#123456', opacity: 0.5, effectScale: 2.5, look: 'gold' }],
@@ -110,7 +114,10 @@ try {
     let painting = 0;
     cases.forEach(([text, names, options], i) => {
         const start = performance.now();
-        const picture = ve.Text.picture(text, { fonts: names.map((name) => fonts[name]), ...options });
+        const picture = ve.Text.picture(text, {
+            fonts: names.map((name) => fonts[name]),
+            ...options,
+        });
         painting += performance.now() - start;
         const { width, height, data } = pixelsOf(outputs[i]);
         const what = `${names.join()} ${JSON.stringify(options)} ${text}`;
