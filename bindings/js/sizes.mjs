@@ -30,8 +30,14 @@ function sizesOf(bytes) {
     return [bytes.length, gzipSync(bytes, { level: 9 }).length, brotli.length];
 }
 
+/** In two or three digits, which small changes leave as they are. */
+function rounded(size) {
+    const step = size < 100_000 ? 1 : 10;
+    return step * Math.round(size / 1000 / step);
+}
+
 function row(name, sizes) {
-    return `| ${[name, ...sizes.map((size) => Math.round(size / 1000))].join(' | ')} |\n`;
+    return `| ${[name, ...sizes.map(rounded)].join(' | ')} |\n`;
 }
 
 let table = heading;

@@ -33,7 +33,7 @@ export type WasmSource =
 export type Fetch = (address: string) => Promise<ResponseLike | Uint8Array<ArrayBuffer>>;
 
 /** What of a module is asked for. */
-export interface Wanted<Kind extends Engine> {
+export interface Wanted<Kind extends Engine = Engine> {
     /** Of the file, for errors. */
     readonly name: string;
     /** Exports, one of each part. */
@@ -43,7 +43,7 @@ export interface Wanted<Kind extends Engine> {
 }
 
 /** What the library's own module has. */
-export const LIBRARY: Wanted<Engine> = {
+export const LIBRARY: Wanted = {
     name: 'voreleffect.wasm',
     exports: ['memory', '_initialize', 'malloc', 'free', 'vorel_version', 'vorel_painter_picture'],
     engine: Engine,

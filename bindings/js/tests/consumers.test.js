@@ -26,8 +26,10 @@ const PROGRAM = `
     const { width, height, data } = look.paint({ data: new Uint8Array(12).fill(255), width: 4, height: 3 });
     globalThis.result = { version, sides: [width, height, look.margins.left + 2, data.length / 56] };
 `;
-const OF_TEXT = `${PROGRAM}
+// The result is whole when it is seen: nothing is waited for between its parts.
+const OF_TEXT = `
     const { presets, Style } = await load();
+    ${PROGRAM}
     globalThis.result.presets = presets.includes('neon') && Style.preset('neon').looks(48).length;
 `;
 const expectedOfText = { ...expected, presets: 2 };
