@@ -1,10 +1,11 @@
 #pragma once
 
 #include <cstddef>
-#include <sstream>
 #include <string>
+#include <type_traits>
 
 #include "text/voreltext.h"
+#include "unicode/decimal.h"
 
 /// What can be asked for at most of one picture. Who fills in a Request keeps to it.
 namespace vorelcompose {
@@ -39,9 +40,13 @@ bool contains(const Limits<Number>& limits, Number number) {
 /// "1 to 1000".
 template <typename Number>
 std::string spelled(const Limits<Number>& limits) {
-    std::ostringstream text;
-    text << limits.low << " to " << limits.high;
-    return text.str();
+    const auto written = [](Number number) {
+        if constexpr (std::is_integral_v<Number>)
+            return std::to_string(number);
+        else
+            return vorelunicode::decimal(double{number});
+    };
+    return written(limits.low) + " to " + written(limits.high);
 }
 
 }  // namespace vorelcompose

@@ -3,16 +3,15 @@
 #include <algorithm>
 #include <cmath>
 #include <functional>
-#include <locale>
 #include <nlohmann/json.hpp>
 #include <set>
-#include <sstream>
 #include <utility>
 
 #include "style/colour.h"
 #include "style/error.h"
 #include "style/message.h"
 #include "style/nearest.h"
+#include "unicode/decimal.h"
 
 namespace vorelstyle {
 namespace {
@@ -60,17 +59,11 @@ std::string wrongType(const std::string& expected, const Json& value) {
 
 /// "a number from 0 to 100" of the noun "a number from".
 std::string between(const char* noun, Range range) {
-    std::ostringstream text;
-    text.imbue(std::locale::classic());
-    text << noun << ' ' << range.low << " to " << range.high;
-    return text.str();
+    return noun + (' ' + vorelunicode::decimal(range.low)) + " to " + vorelunicode::decimal(range.high);
 }
 
 std::string withUnit(double value, const char* unit) {
-    std::ostringstream text;
-    text.imbue(std::locale::classic());
-    text << value << unit;
-    return text.str();
+    return vorelunicode::decimal(value) + unit;
 }
 
 /// 'a length from 0 to 100 pixels, as 4 or "4px", or from 0% to 100% of the font's size, as "4%"'.

@@ -2,7 +2,7 @@
 
 #include <array>
 #include <cstdio>
-#include <ostream>
+#include <string_view>
 #include <utility>
 #include <variant>
 
@@ -49,10 +49,28 @@ std::string sentence(const std::string& text) {
     return printable(text) + (ended ? "" : ".");
 }
 
+/// What is written, from the front to the back.
+class Source {
+  public:
+    Source& operator<<(std::string_view piece) {
+        mText += piece;
+        return *this;
+    }
+    Source& operator<<(char letter) {
+        mText += letter;
+        return *this;
+    }
+
+    const std::string& text() const { return mText; }
+
+  private:
+    std::string mText;
+};
+
 /// Writes the call of one effect, with the array that it needs before it.
 class CallWriter {
   public:
-    CallWriter(std::ostream& out, const TextPaint& text, const LoadImage& load)
+    CallWriter(Source& out, const TextPaint& text, const LoadImage& load)
         : mOut(out), mText(text), mLoad(load) {}
 
     void operator()(const OuterShadow& e) const { shadow("addOuterShadowText", e); }
@@ -136,13 +154,13 @@ class CallWriter {
              << literal(image.height) << ", pixels, 4);\n";
     }
 
-    std::ostream& mOut;
+    Source& mOut;
     const TextPaint& mText;
     const LoadImage& mLoad;
 };
 
 /// Writes the function that makes the calls of one look.
-void writeLook(std::ostream& out, const std::string& name, const LookStyle& look,
+void writeLook(Source& out, const std::string& name, const LookStyle& look,
                const std::string& description, const TextPaint& text, const LoadImage& load) {
     requireResolved(look);
     if (!description.empty()) out << "/// " << sentence(description) << '\n';
@@ -161,7 +179,7 @@ std::string nameOfLook(const std::string& name, size_t position) {
 }
 
 /// Writes the array that tells the looks and their places.
-void writePlaces(std::ostream& out, const std::string& name, const std::string& description,
+void writePlaces(Source& out, const std::string& name, const std::string& description,
                  const std::vector<Place>& places) {
     std::string type = name + "Look";
     if (type.front() >= 'a' && type.front() <= 'z')
@@ -185,8 +203,9 @@ void writePlaces(std::ostream& out, const std::string& name, const std::string& 
 
 }  // namespace
 
-void writeCpp(std::ostream& out, const std::string& name, const Style& style,
-              std::optional<uint32_t> fill, std::optional<float> textOpacity, const LoadImage& load) {
+std::string writtenAsCpp(const std::string& name, const Style& style, std::optional<uint32_t> fill,
+                         std::optional<float> textOpacity, const LoadImage& load) {
+    Source out;
     const std::vector<Place> places = placesOf(style);
     const bool isOne = isOneInItsPlace(places);
     out << "#include <voreleffect/voreleffect.h>\n\n";
@@ -201,6 +220,7 @@ void writeCpp(std::ostream& out, const std::string& name, const Style& style,
         if (!isOne) out << '\n';
     }
     if (!isOne) writePlaces(out, name, style.description, places);
+    return out.text();
 }
 
 std::string functionName(const std::string& look) {

@@ -1,7 +1,6 @@
 #pragma once
 
 #include <cstdint>
-#include <iosfwd>
 #include <optional>
 #include <string>
 
@@ -10,15 +9,14 @@
 
 namespace vorelstyle {
 
-/// Writes a C++17 source that makes the library calls of a resolved style. One look that is not moved,
+/// A C++17 source that makes the library calls of a resolved style. One look that is not moved,
 /// of the whole block, is one function, `name`; else there is a function for each look, `name` with its
 /// number from 1 on, and the array `name` + "Looks", which tells them in the order of painting with
 /// their offsets and spans, and how they are painted. The pictures are those of the Stack of the same
 /// style, fill (0xRRGGBB), text opacity and pattern pictures. Throws StyleError as Stack does, and for a
 /// pattern with a picture too large to be written out.
-void writeCpp(std::ostream& out, const std::string& name, const Style& style,
-              std::optional<uint32_t> fill = {}, std::optional<float> textOpacity = {},
-              const LoadImage& load = {});
+std::string writtenAsCpp(const std::string& name, const Style& style, std::optional<uint32_t> fill = {},
+                         std::optional<float> textOpacity = {}, const LoadImage& load = {});
 
 /// The name of that function for a style of this name: "addPaperCut" for "paper-cut".
 std::string functionName(const std::string& look);

@@ -6,8 +6,8 @@
 
 #include <cmath>
 
-#include "text/decimal.h"
 #include "text/error.h"
+#include "unicode/decimal.h"
 
 namespace voreltext {
 namespace {
@@ -50,7 +50,7 @@ class Axes {
 };
 
 std::string placeText(FT_Fixed place) {
-    return decimal(static_cast<double>(place) / kFixed);
+    return vorelunicode::decimal(static_cast<double>(place) / kFixed);
 }
 
 /// "wght 100 to 900, wdth 75 to 100".
@@ -85,7 +85,8 @@ void setAxes(FT_Face face, const std::vector<FontVariation>& variations, const s
         const double place = std::floor(double{variation.value} * kFixed + 0.5);
         if (!isWithin(axes[axis], place)) {
             throw TextError(subject + "a font without '" + variation.axis + "' of " +
-                            decimal(double{variation.value}) + "; it has " + rangesOf(axes));
+                            vorelunicode::decimal(double{variation.value}) + "; it has " +
+                            rangesOf(axes));
         }
         places[axis] = static_cast<FT_Fixed>(place);
     }

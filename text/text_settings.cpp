@@ -3,10 +3,10 @@
 #include <cmath>
 #include <cstdlib>
 
-#include "text/decimal.h"
 #include "text/error.h"
 #include "text/text_layout.h"
 #include "text/units.h"
+#include "unicode/decimal.h"
 
 namespace voreltext {
 namespace {
@@ -22,8 +22,8 @@ constexpr int64_t kMostSpacing = TextLayout::kMaxSide * kUnit;
 void checkSettings(const TextSettings& settings) {
     const float lineHeight = settings.lineHeight;
     if (!(lineHeight >= 0 && lineHeight <= TextSettings::kMostLineHeight)) {
-        refuse("line height", decimal(double{lineHeight}),
-               "0 to " + decimal(double{TextSettings::kMostLineHeight}));
+        refuse("line height", vorelunicode::decimal(double{lineHeight}),
+               "0 to " + vorelunicode::decimal(double{TextSettings::kMostLineHeight}));
     }
     if (settings.letterSpacing < -kMostSpacing || settings.letterSpacing > kMostSpacing) {
         refuse(

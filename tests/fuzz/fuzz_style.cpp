@@ -5,7 +5,6 @@
 #include <algorithm>
 #include <cmath>
 #include <cstdint>
-#include <sstream>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -140,9 +139,8 @@ void demandStack(const Style& style) {
     for (const std::string& note : stack.notes())
         demandLine(note);
     demandKey(stack);
-    std::ostringstream source;
-    writeCpp(source, functionName(style.description), style, {}, {}, load);
-    demand(!source.str().empty(), "a style is written as nothing");
+    const std::string source = writtenAsCpp(functionName(style.description), style, {}, {}, load);
+    demand(!source.empty(), "a style is written as nothing");
 }
 
 void readAndPaint(std::string_view json, Decoder& choices) {

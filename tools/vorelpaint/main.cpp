@@ -2,7 +2,6 @@
 #include <filesystem>
 #include <new>
 #include <optional>
-#include <sstream>
 #include <string>
 
 #include "batch.h"
@@ -45,10 +44,8 @@ void printMargins(const Margins& margins) {
 
 void printCpp(const Options& options, const Style& style) {
     const std::string name = options.preset.value_or(std::filesystem::path(style.name).stem().string());
-    std::ostringstream source;
-    vorelstyle::writeCpp(source, vorelstyle::functionName(name), style, options.color, options.opacity,
-                         imagesOf(style));
-    print(source.str());
+    print(vorelstyle::writtenAsCpp(vorelstyle::functionName(name), style, options.color, options.opacity,
+                                   imagesOf(style)));
 }
 
 void sayNote(const std::string& note) {

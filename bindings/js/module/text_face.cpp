@@ -5,7 +5,6 @@
 #include <memory>
 #include <new>
 #include <optional>
-#include <sstream>
 #include <string>
 #include <string_view>
 #include <utility>
@@ -179,10 +178,11 @@ Answer looksOf(const vorel_style& style, int size, float scale) {
 Answer sourceOf(const vorel_style& style, const SourceRequest& asked) {
     const vorelcompose::Request& request = asked.request;
     const Style resolved = resolvedStyle(*style.found.style, request.size, request.effectScale, {});
-    std::ostringstream out;
-    writeCpp(out, asked.name, resolved, request.color, request.opacity, style.found.load);
     JsonWriter json;
-    json.beginObject().entry("source", out.str()).endObject();
+    json.beginObject();
+    json.entry("source",
+               writtenAsCpp(asked.name, resolved, request.color, request.opacity, style.found.load));
+    json.endObject();
     return {json.text(), {}};
 }
 

@@ -3,7 +3,6 @@
 #include <gtest/gtest.h>
 
 #include <locale>
-#include <sstream>
 #include <string>
 #include <vector>
 
@@ -13,9 +12,7 @@ namespace vorelstyle {
 namespace {
 
 std::string writtenOf(const std::string& json) {
-    std::ostringstream out;
-    writeCpp(out, "addLook", parseStyle(json));
-    return out.str();
+    return writtenAsCpp("addLook", parseStyle(json));
 }
 
 TEST(WriteCppText, FunctionNames_AreTheLooksWords) {
@@ -45,10 +42,10 @@ TEST(WriteCppText, Description_CannotReorderTheSource) {
 
 TEST(WriteCppText, Pattern_IsWrittenWithItsPixels) {
     const auto onePixel = [](const std::string&) { return PatternImage{1, 1, {10, 20, 30, 40}}; };
-    std::ostringstream out;
-    writeCpp(out, "addLook", parseStyle(R"({"pattern": {"image": "a.png"}})"), 0, 1, onePixel);
-    EXPECT_NE(out.str().find("// a.png as A, R, G, B\n"), std::string::npos) << out.str();
-    EXPECT_NE(out.str().find("\n        40, 10, 20, 30,\n"), std::string::npos) << out.str();
+    const std::string text =
+        writtenAsCpp("addLook", parseStyle(R"({"pattern": {"image": "a.png"}})"), 0, 1, onePixel);
+    EXPECT_NE(text.find("// a.png as A, R, G, B\n"), std::string::npos) << text;
+    EXPECT_NE(text.find("\n        40, 10, 20, 30,\n"), std::string::npos) << text;
 }
 
 TEST(WriteCppText, PatternWithTooManyPixels_IsRefused) {
@@ -56,9 +53,8 @@ TEST(WriteCppText, PatternWithTooManyPixels_IsRefused) {
         return PatternImage{257, 256, std::vector<uint8_t>(size_t{257} * 256 * 4)};
     };
     const Style style = parseStyle(R"({"pattern": {"image": "a.png"}})", "b.json");
-    std::ostringstream out;
     try {
-        writeCpp(out, "addLook", style, 0, 1, large);
+        writtenAsCpp("addLook", style, 0, 1, large);
         FAIL() << "written out";
     } catch (const StyleError& error) {
         EXPECT_EQ(
@@ -109,12 +105,12 @@ TEST(WriteCppText, Numbers_AreThoseOfCppInAnyLocale) {
     const auto wide = [](const std::string&) {
         return PatternImage{300, 1, std::vector<uint8_t>(1200, 99)};
     };
-    std::ostringstream out;
-    out.imbue(std::locale(std::locale::classic(), new Grouped));
-    writeCpp(out, "addLook", parseStyle(R"({"version": 2, "looks": [{"pattern": {"image": "a.png"}},
+    const std::locale before = std::locale::global(std::locale(std::locale::classic(), new Grouped));
+    const std::string text =
+        writtenAsCpp("addLook", parseStyle(R"({"version": 2, "looks": [{"pattern": {"image": "a.png"}},
              {}, {}, {}, {}, {}, {}, {}, {}, {"offset": {"x": 1000}}]})"),
-             {}, {}, wide);
-    const std::string text = out.str();
+                     {}, {}, wide);
+    std::locale::global(before);
     EXPECT_NE(text.find("\n        99, 99, "), std::string::npos);
     EXPECT_NE(text.find("pattern(300, 1, pixels, 4);"), std::string::npos);
     EXPECT_NE(text.find("void addLook10("), std::string::npos);
@@ -150,26 +146,24 @@ TEST(WriteCppText, MovedLookOrOneInSpans_TellsItsPlace) {
 }
 
 TEST(WriteCppText, ChosenFill_IsThatOfTheTopmostFilledLook) {
-    std::ostringstream out;
-    writeCpp(out, "addLook", parseStyle(R"({"version": 2, "looks": [{}, {}, {"fill": false}]})"),
-             0xABCDEF, 0.5F);
-    EXPECT_EQ(countOf(out.str(), "addText(0xABCDEF, 0.5F)"), 1U) << out.str();
-    EXPECT_LT(out.str().find("void addLook2("), out.str().find("0xABCDEF")) << out.str();
+    const std::string text = writtenAsCpp(
+        "addLook", parseStyle(R"({"version": 2, "looks": [{}, {}, {"fill": false}]})"), 0xABCDEF, 0.5F);
+    EXPECT_EQ(countOf(text, "addText(0xABCDEF, 0.5F)"), 1U) << text;
+    EXPECT_LT(text.find("void addLook2("), text.find("0xABCDEF")) << text;
 }
 
 TEST(WriteCppText, WidthOfATile_IsWrittenAsItsScale) {
     const auto load = [](const std::string&) { return PatternImage{4, 1, std::vector<uint8_t>(16)}; };
-    std::ostringstream out;
-    writeCpp(out, "addLook", parseStyle(R"({"version": 2, "pattern": {"image": "a.png", "width": 10}})"),
-             {}, {}, load);
-    EXPECT_NE(out.str().find("addPatternText(&pattern, 2.5F, 1);"), std::string::npos) << out.str();
+    const std::string text = writtenAsCpp(
+        "addLook", parseStyle(R"({"version": 2, "pattern": {"image": "a.png", "width": 10}})"), {}, {},
+        load);
+    EXPECT_NE(text.find("addPatternText(&pattern, 2.5F, 1);"), std::string::npos) << text;
 }
 
 /// The message with which the style is refused.
 std::string faultOf(const std::string& json) {
-    std::ostringstream out;
     try {
-        writeCpp(out, "addLook", parseStyle(json, "a.json"));
+        writtenAsCpp("addLook", parseStyle(json, "a.json"));
         return "";
     } catch (const StyleError& error) {
         return error.what();
