@@ -28,8 +28,14 @@ voreltext::Font opened(const std::string& name, const voreltext::FontBytes& byte
 ByteFonts::Names ByteFonts::add(const std::string& name, std::vector<uint8_t> bytes, long faceIndex) {
     if (mFiles.count(name) != 0) throw FontError("a font " + quoted(name) + " is there already");
     const voreltext::Font font = opened(name, {bytes.data(), bytes.size(), faceIndex}, kTriedSize, {});
+    Names names{font.name(), font.family()};
     mFiles[name] = {std::make_shared<const std::vector<uint8_t>>(std::move(bytes)), faceIndex};
-    return {font.name(), font.family()};
+    return names;
+}
+
+void ByteFonts::remove(std::string_view name) {
+    const auto file = mFiles.find(name);
+    if (file != mFiles.end()) mFiles.erase(file);
 }
 
 ByteFonts::Held ByteFonts::held() const {

@@ -2,11 +2,13 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <functional>
 #include <map>
 #include <memory>
 #include <optional>
 #include <stdexcept>
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include "compose/vorelcompose.h"
@@ -37,7 +39,8 @@ class ByteFonts : public vorelcompose::FontSource {
     Held held() const;
 
     /// A font of these bytes that is still open needs somebody who holds them.
-    void remove(const std::string& name) { mFiles.erase(name); }
+    /// Takes no memory, which may have run out.
+    void remove(std::string_view name);
 
     /// Throws FontError.
     Found find(const std::string& request) override;
@@ -54,7 +57,7 @@ class ByteFonts : public vorelcompose::FontSource {
         long faceIndex;
     };
 
-    std::map<std::string, File> mFiles;
+    std::map<std::string, File, std::less<>> mFiles;
 };
 
 }  // namespace vorelscript

@@ -1,5 +1,5 @@
 /// <reference lib="esnext.disposable" preserve="true" />
-import { disposeByFree, freedError } from './engine.js';
+import { disposeByFree, freedError, Scope } from './engine.js';
 import type { TextEngine } from './text_engine.js';
 import { integer, kindOf, options } from './values.js';
 
@@ -40,18 +40,15 @@ export class Font {
     constructor(engine: TextEngine, bytes: Uint8Array, name: string, index: number) {
         this.#engine = engine;
         this.name = name;
-        this.family = engine.scoped((scope) => {
-            const named = scope.text(name).address;
-            const at = scope.copy(bytes);
-            const given = [engine.fonts, named, at, bytes.length, index];
-            return engine.answer<{ family: string }>('vorel_fonts_add', ...given).told.family;
-        });
-        this.#remove = () => {
-            if (engine.isDead) return;
-            engine.scoped((scope) =>
-                engine.call('vorel_fonts_remove', engine.fonts, scope.text(name).address),
-            );
-        };
+        const named = new Scope(engine);
+        try {
+            const at = named.text(name).address;
+            this.family = familyOfAdded(engine, at, bytes, index);
+            this.#remove = removalOf(engine, at, named);
+        } catch (error) {
+            named.free();
+            throw error;
+        }
         forgotten.register(this, this.#remove, this);
     }
 
@@ -80,6 +77,23 @@ export class Font {
         if (font.#isFreed) throw freedError('font');
         return font.name;
     }
+}
+
+/** Adds a font under the name at an address; returns its family. */
+function familyOfAdded(engine: TextEngine, name: number, bytes: Uint8Array, index: number): string {
+    return engine.scoped((scope) => {
+        const given = [engine.fonts, name, scope.copy(bytes), bytes.length, index];
+        return engine.answer<{ family: string }>('vorel_fonts_add', ...given).told.family;
+    });
+}
+
+/** What takes a font away. Its name stays in memory until then: this asks for none, which may have run out. */
+function removalOf(engine: TextEngine, name: number, named: Scope): () => void {
+    return () => {
+        if (engine.isDead) return;
+        engine.call('vorel_fonts_remove', engine.fonts, name);
+        named.free();
+    };
 }
 
 /** The class of the fonts of an instance. */

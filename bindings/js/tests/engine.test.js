@@ -1,15 +1,10 @@
 import assert from 'node:assert/strict';
 import { test } from 'node:test';
 import { setImmediate } from 'node:timers/promises';
-import v8 from 'node:v8';
-import vm from 'node:vm';
 
 import { load, VorelError, VorelMemoryError } from 'voreleffect';
 import { disc, everything, STOPS, TILE } from './scenes.js';
-import { block, Counted, exhausted, page } from './support.js';
-
-v8.setFlagsFromString('--expose-gc');
-const collect = vm.runInNewContext('gc');
+import { block, collect, Counted, exhausted, page } from './support.js';
 
 test('Errors_LeaveNothingAllocated', () => {
     const counted = new Counted();

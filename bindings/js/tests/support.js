@@ -1,5 +1,7 @@
 // What the tests share.
 import { readFileSync } from 'node:fs';
+import v8 from 'node:v8';
+import vm from 'node:vm';
 
 import { Engine } from '../dist/engine.js';
 import { faceOf } from '../dist/voreleffect.js';
@@ -7,6 +9,10 @@ import { faceOf } from '../dist/voreleffect.js';
 export const MODULE = new WebAssembly.Module(
     readFileSync(new URL('../dist/voreleffect.wasm', import.meta.url)),
 );
+
+v8.setFlagsFromString('--expose-gc');
+/** Collects what is not used any more. */
+export const collect = vm.runInNewContext('gc');
 
 /** A mask of full coverage. */
 export function block(width, height, coverage = 255) {

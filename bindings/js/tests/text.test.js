@@ -1,6 +1,7 @@
 import assert from 'node:assert/strict';
 import { readFileSync } from 'node:fs';
 import { test } from 'node:test';
+import { setImmediate } from 'node:timers/promises';
 
 import {
     FontError,
@@ -12,7 +13,7 @@ import {
 } from 'voreleffect/text';
 import { TextEngine } from '../dist/text_engine.js';
 import { textFaceOf } from '../dist/voreleffect_text.js';
-import { exhausted } from './support.js';
+import { collect, exhausted } from './support.js';
 
 const FONT = readFileSync('/usr/share/fonts/truetype/dejavu/DejaVuSans.ttf');
 const MODULE = new WebAssembly.Module(
@@ -57,6 +58,51 @@ test('Font_ThatWasFreedSetsNoTextAndItsNameIsFree', () => {
     own.free();
     assert.throws(() => Text.picture('a', { ...HIGH, fonts: own }), VorelError);
     new ve.Font(FONT, { name: 'own' }).free();
+});
+
+test('Font_IsFreedWhereMemoryHasRunOut', () => {
+    const { engine, face } = fresh();
+    const name = 'a name that is longer than those that need no memory of their own';
+    const own = new face.Font(FONT, { name });
+    const giveBack = exhausted(engine);
+    own.free();
+    giveBack();
+    assert.equal(new face.Font(FONT, { name }).family, 'DejaVu Sans');
+});
+
+test('Font_DoesNotHoldTheBytesThatItIsMadeOf', async () => {
+    const { face } = fresh();
+    const made = () => {
+        const { buffer } = Uint8Array.from(FONT);
+        return { own: new face.Font(buffer), buffer: new WeakRef(buffer) };
+    };
+    const { own, buffer } = made();
+    for (let i = 0; i < 50 && buffer.deref() !== undefined; ++i) {
+        await setImmediate();
+        collect();
+    }
+    assert.equal(buffer.deref(), undefined);
+    own.free();
+});
+
+test('Memory_IsSteadyHoweverManyTextsArePainted', () => {
+    const { face, exports, font: own } = fresh();
+    const work = (i) => {
+        const options = { fonts: own, size: 20 + (i % 60), look: face.presets[i % 18] };
+        face.Text.picture(`Text ${i}`, options);
+        if (i % 40 > 0) return;
+        face.Text.layout('Hello', { fonts: own });
+        face.Text.layers('Hello', { ...options, look: 'comic' });
+        assert.throws(() => face.Text.picture(' ', options), TextError);
+        assert.throws(() => face.Style.fromJSON('{"stroke": {"size": 300}}'), StyleError);
+        const other = new face.Font(FONT);
+        face.Text.picture('Hi', { fonts: other, size: 30 });
+        other.free();
+    };
+    for (let i = 0; i < 1000; ++i) work(i);
+    const before = exports.memory.buffer.byteLength;
+    for (let i = 1000; i < 3000; ++i) work(i);
+    assert.equal(exports.memory.buffer.byteLength, before);
 });
 
 test('Picture_IsAsLargeAsItsTextWithEffectsAndPadding', () => {
