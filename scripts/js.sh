@@ -7,7 +7,8 @@ cd "$(dirname "$0")/.."
 . scripts/packages.sh
 . scripts/quietly.sh
 
-need_packages chromium fonts-dejavu-core fonts-hosny-amiri fonts-lohit-deva fonts-inter-variable fonts-bebas-neue
+need_packages chromium fonts-dejavu-core fonts-hosny-amiri fonts-lohit-deva fonts-inter-variable fonts-bebas-neue \
+    fonts-noto-color-emoji
 command -v node > /dev/null || need_packages nodejs
 command -v npm > /dev/null || need_packages npm
 [[ $(node --print 'parseInt(process.versions.node)') -ge 20 ]] || { echo 'node 20 or later is needed' >&2; exit 1; }

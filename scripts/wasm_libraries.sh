@@ -8,7 +8,7 @@ cd "$(dirname "$0")/.."
 . scripts/packages.sh
 
 libraries=(libfreetype6 libharfbuzz0b libfribidi0)
-need_packages dpkg-dev g++ libunibreak-dev nlohmann-json3-dev "${libraries[@]}"
+need_packages dpkg-dev g++ libunibreak-dev nlohmann-json3-dev wasi-libc libc++-19-dev-wasm32 "${libraries[@]}"
 
 folder=build/wasm_sources
 mkdir -p "$folder"
@@ -76,4 +76,8 @@ heading() { printf '\n%s\n%s\n\n' "$(printf -- '-%.0s' {1..108})" "$1"; }
     cat "$folder/fribidi/COPYING"
     heading 'libunibreak, in voreleffect-text.wasm: tables of what it says, made by learn_line_breaks.cpp'
     cat /usr/share/doc/libunibreak1/copyright
+    heading 'wasi-libc with musl, in voreleffect.wasm and voreleffect-text.wasm'
+    cat /usr/share/doc/wasi-libc/copyright
+    heading 'libc++, in voreleffect.wasm and voreleffect-text.wasm'
+    cat /usr/share/doc/libc++-19-dev-wasm32/copyright
 } > "$folder/NOTICE"

@@ -1,5 +1,6 @@
 #include "requests.h"
 
+#include <algorithm>
 #include <cmath>
 #include <limits>
 #include <utility>
@@ -97,6 +98,18 @@ Request requestOf(const JsonObject& given) {
     return request;
 }
 
+/// What can name a function of C++.
+std::string identifierOf(const JsonObject& given) {
+    std::string name = given.string("name");
+    const auto isLetter = [](char c) {
+        return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || c == '_';
+    };
+    const auto isOfName = [&](char c) { return isLetter(c) || (c >= '0' && c <= '9'); };
+    if (name.empty() || !isLetter(name.front()) || !std::all_of(name.begin(), name.end(), isOfName))
+        given.fail("name", "'" + vorelstyle::printable(name) + "' is no name of a function");
+    return name;
+}
+
 std::string textOf(const JsonObject& given) {
     std::string text = given.string("text");
     if (text.size() > vorelcompose::kMaxTextBytes) {
@@ -150,7 +163,7 @@ SourceRequest sourceRequest(std::string_view json) {
     return readAs(json, {"name", "size", "color", "opacity", "effectScale"},
                   [](const JsonObject& given) {
                       SourceRequest source;
-                      source.name = given.string("name");
+                      source.name = identifierOf(given);
                       readColours(source.request, given);
                       return source;
                   });

@@ -127,7 +127,7 @@ export class Style {
         return told.map((state) => this.#Look.from(withPixels(state, bytes)));
     }
 
-    /** Its key for a cache, with a font of `size` pixels. */
+    /** Its key for a cache, with a font of `size` pixels; it does not tell the pixels of patterns. */
     key(size: number, scale: ScaleOptions = {}): Uint8Array<ArrayBuffer> {
         return bytesOfHex(this.#facts(size, scale).key);
     }
@@ -137,7 +137,10 @@ export class Style {
         return sidesOf(this.#facts(size, scale).margins);
     }
 
-    /** C++17 that makes the calls of the library; its function is called `name`. */
+    /**
+     * C++17 that makes the calls of the library; its function is called `name`, and several looks have one each, with
+     * numbers behind it. Throws RangeError for what is no name of a function.
+     */
     toCpp(name: string, size: number, given: CppOptions = {}): string {
         const {
             color: fill,

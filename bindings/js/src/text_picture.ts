@@ -45,7 +45,7 @@ export class TextPicture {
     readonly box: Box;
     /** How far the effects reach beyond the glyphs. */
     readonly margins: Margins;
-    /** Of the looks, for a cache. */
+    /** Of the looks, for a cache: that of their style, which does not tell the pixels of patterns. */
     readonly key: Uint8Array<ArrayBuffer>;
     /** The names of the fonts that have a glyph in it. */
     readonly fonts: readonly string[];

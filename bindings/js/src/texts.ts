@@ -51,7 +51,10 @@ export interface LayerPicture {
  * FontError, StyleError, VorelMemoryError, and TypeError and RangeError for options.
  */
 export interface Text {
-    /** Paints a text: the pixels that vorelpaint of this version paints with the same fonts. */
+    /**
+     * Paints a text: the pixels that vorelpaint of this version paints with the same fonts. Pictures of colour fonts
+     * that are PNG within the font leave no mark; those of outlines are painted.
+     */
     picture(text: string, options: TextOptions): TextPicture;
     /** Sets a text without painting it. */
     layout(text: string, options: TextOptions): TextLayout;

@@ -93,6 +93,24 @@ test('Tarball_HasTheModuleTheTypesAndTheLicence', () => {
     assert.ok(files.every((name) => /^(dist\/[\w.-]+|[A-Z]+(\.md)?|package\.json)$/.test(name)));
 });
 
+test('Notice_HasTheLicencesOfWhatIsInTheModules', () => {
+    const notice = readFileSync(join(project, 'node_modules/voreleffect/NOTICE'), 'utf8');
+    for (const name of [
+        'FreeType',
+        'HarfBuzz',
+        'FriBidi',
+        'libunibreak',
+        'JSON for Modern C++',
+        'wasi-libc with musl',
+        'libc++',
+    ]) {
+        assert.match(
+            notice,
+            new RegExp(`^${name.replaceAll('+', '\\+')}, in .*voreleffect-text`, 'm'),
+        );
+    }
+});
+
 test('Tarball_IsAsPackagesShouldBe', async () => {
     const { messages, pkg } = await publint({ pkgDir: own, strict: true });
     assert.deepEqual(

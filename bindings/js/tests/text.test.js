@@ -217,6 +217,37 @@ test('Style_KeepsWhatItWasMadeOf', () => {
     assert.notEqual(style.toCpp('blue', 100, { color: '#123456' }), style.toCpp('blue', 100));
 });
 
+test('Style_IsWrittenAsAFunctionOfANameOfOne', () => {
+    const style = Style.preset('comic');
+    assert.match(style.toCpp('_a1', 100), /\nvoid _a1\(/);
+    for (const name of ['', '1a', 'a b', 'a\n', 'a;b', 'ä']) {
+        assert.throws(() => style.toCpp(name, 100), RangeError, name);
+    }
+});
+
+test('Key_DoesNotTellThePixelsOfPatterns', () => {
+    const of = (red) => {
+        const pattern = { width: 1, height: 1, data: Uint8Array.of(red, 0, 0, 255) };
+        return Text.picture('a', { ...HIGH, look: new Look().pattern(pattern) });
+    };
+    assert.notDeepEqual(of(1).data, of(200).data);
+    assert.deepEqual(of(1).key, of(200).key);
+});
+
+test('Text_InPicturesThatArePngIsNotSeen', () => {
+    const emoji = new ve.Font(readFileSync('/usr/share/fonts/truetype/noto/NotoColorEmoji.ttf'));
+    assert.throws(() => Text.picture('\u{1f600}', { ...HIGH, fonts: emoji }), TextError);
+    emoji.free();
+});
+
+test('Text_InColourFontsOfOutlinesIsInTheirColours', () => {
+    const file = '/usr/share/fonts/opentype/fonts-hosny-amiri/AmiriQuranColored.ttf';
+    const coloured = new ve.Font(readFileSync(file));
+    const { data } = Text.picture('بِسْمِ', { ...HIGH, fonts: coloured });
+    assert.ok(data.some((byte, i) => i % 4 < 3 && byte > 0));
+    coloured.free();
+});
+
 test('Style_TakesThePicturesOfItsPatterns', () => {
     const file = { pattern: { image: 'dot.png', scale: 1 } };
     const data = Uint8Array.of(255, 0, 0, 255);
