@@ -13,10 +13,10 @@ const page = join(import.meta.dirname, '../../docs/javascript.md');
 const dist = join(import.meta.dirname, 'dist');
 const heading = '| | raw | gzip | brotli |\n|---|---|---|---|\n';
 
-/** Bytes by brotli that a module may have. */
+/** Bytes by brotli that a module may have: with what calls it that of text stays below 500 KB. */
 const parts = [
     { name: 'voreleffect.wasm', entry: 'index.js', most: 60_000 },
-    { name: 'voreleffect-text.wasm', entry: 'text.js', most: 500_000 },
+    { name: 'voreleffect-text.wasm', entry: 'text.js', most: 450_000 },
 ].filter(({ name }) => existsSync(join(dist, name)));
 
 function bundled(entry) {
