@@ -1,0 +1,26 @@
+import js from '@eslint/js';
+import prettier from 'eslint-config-prettier';
+import tseslint from 'typescript-eslint';
+
+export default tseslint.config(
+    { ignores: ['dist/', 'node_modules/', 'public/', 'test-results/'] },
+    js.configs.recommended,
+    {
+        files: ['**/*.{ts,tsx}'],
+        extends: [tseslint.configs.strictTypeChecked],
+        languageOptions: { parserOptions: { projectService: true } },
+        rules: {
+            '@typescript-eslint/restrict-template-expressions': ['error', { allowNumber: true }],
+            '@typescript-eslint/no-confusing-void-expression': [
+                'error',
+                { ignoreArrowShorthand: true },
+            ],
+            eqeqeq: 'error',
+        },
+    },
+    {
+        files: ['*.js', 'build/**/*.js'],
+        languageOptions: { globals: { console: 'readonly', process: 'readonly' } },
+    },
+    prettier,
+);
