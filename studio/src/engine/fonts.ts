@@ -5,6 +5,8 @@ export interface ShippedFont {
     /** Below `fonts/`. */
     file: string;
     licence: string;
+    /** What `vorelpaint --font` finds it by where its package is installed. */
+    query: string;
 }
 
 export const shippedFonts: readonly ShippedFont[] = [
@@ -13,24 +15,28 @@ export const shippedFonts: readonly ShippedFont[] = [
         label: 'DejaVu Sans Bold',
         file: 'DejaVuSans-Bold.ttf',
         licence: 'fonts-dejavu-core.txt',
+        query: 'DejaVu Sans:bold',
     },
     {
         id: 'lobster',
         label: 'Lobster',
         file: 'Lobster.otf',
         licence: 'fonts-lobster.txt',
+        query: 'Lobster',
     },
     {
         id: 'bebas-neue-bold',
         label: 'Bebas Neue Bold',
         file: 'BebasNeue-Bold.otf',
         licence: 'fonts-bebas-neue.txt',
+        query: 'Bebas Neue:bold',
     },
     {
         id: 'lohit-devanagari',
         label: 'Lohit Devanagari',
         file: 'Lohit-Devanagari.ttf',
         licence: 'fonts-lohit-deva.txt',
+        query: 'Lohit Devanagari',
     },
 ];
 

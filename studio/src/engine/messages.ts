@@ -1,3 +1,4 @@
+import type { Exported } from '../export';
 import type { PatternPixels, Work } from '../model/work';
 import type { StyleFile } from '../model/style_file';
 
@@ -55,13 +56,10 @@ export interface Layer {
     height: number;
 }
 
-/** The work in another language; `format` names the exporter. */
-export interface Code {
+/** The work in another language, by an exporter of the page. */
+export interface Code extends Exported {
     format: string;
-    name: string;
-    language: string;
-    text: string;
-    note?: string;
+    label: string;
 }
 
 export interface NamedFile {

@@ -1,4 +1,5 @@
 import type { Font, Style, TextOptions, VoreleffectText } from 'voreleffect/text';
+import type { ExportEngine } from '../export';
 import { fromBase64 } from '../model/base64';
 import type { StyleFile } from '../model/style_file';
 import type { PatternPixels, Work } from '../model/work';
@@ -10,7 +11,8 @@ export class Studio {
     private readonly fonts = new Map<string, Promise<Font>>();
     /** Text and font for which the chosen font alone was not enough. */
     private lacking = '';
-    private styled: { style: StyleFile; patterns: Work['patterns']; value: Style } | undefined;
+    private styled:
+        { style: StyleFile; patterns: Readonly<Work['patterns']>; value: Style } | undefined;
     private readonly pixels = new WeakMap<PatternPixels, Pixels>();
 
     /** `fontsAt` is the address of the folder of shipped fonts. */
@@ -82,7 +84,7 @@ export class Studio {
     }
 
     /** The style of a work; one that was read a moment ago is not read again. Throws the engine's StyleError. */
-    style(style: StyleFile, patterns: Record<string, PatternPixels>): Style {
+    style(style: StyleFile, patterns: Readonly<Record<string, PatternPixels>>): Style {
         if (this.styled && this.styled.style === style && this.styled.patterns === patterns) {
             return this.styled.value;
         }
@@ -95,11 +97,11 @@ export class Studio {
     }
 
     /** What the writers of code ask the engine. */
-    exportEngine(work: Work): ExportEngine {
+    exportEngine(): ExportEngine {
         return {
-            toCpp: (style, size, options) =>
-                this.style(style, work.patterns).toCpp('addLook', size, options),
-            resolved: (style) => style,
+            toCpp: (style, size, { name, patterns, ...options }) =>
+                this.style(style, patterns).toCpp(name, size, options),
+            fontName: (id) => shippedFonts.find((font) => font.id === id)?.query ?? id,
         };
     }
 

@@ -49,10 +49,22 @@ async function pngOf(work: Work, scale: number) {
     return { bytes: new Uint8Array(bytes), notes: picture.notes };
 }
 
+const labels: Record<string, string> = {
+    style: 'Style file',
+    'cpp-look': 'C++',
+    'cpp-classes': 'C++, classes',
+    c: 'C',
+    java: 'Java',
+    python: 'Python',
+    javascript: 'JavaScript',
+    command: 'Command',
+};
+
 function codeOf(from: Studio, work: Work): Code[] {
-    const engine = from.exportEngine(work);
+    const engine = from.exportEngine();
     return Object.entries(exporters).map(([format, exporter]) => ({
         format,
+        label: labels[format] ?? format,
         ...exporter(work, engine),
     }));
 }

@@ -189,7 +189,7 @@ function Code() {
                         tabIndex={code === shown ? 0 : -1}
                         onClick={() => (chosen.value = code.format)}
                     >
-                        {code.name}
+                        {code.label}
                     </button>
                 ))}
             </div>
@@ -200,11 +200,18 @@ function Code() {
                     <button
                         type="button"
                         class="button"
-                        onClick={() => void copy(shown.text, `Code for ${shown.name}`)}
+                        onClick={() => download(shown.name, shown.text, 'text/plain')}
+                    >
+                        <Icon name="load" /> {shown.name}
+                    </button>{' '}
+                    <button
+                        type="button"
+                        class="button"
+                        onClick={() => void copy(shown.text, `Code for ${shown.label}`)}
                     >
                         <Icon name="copy" /> Copy
                     </button>
-                    <pre tabIndex={0} aria-label={`Code for ${shown.name}`}>
+                    <pre tabIndex={0} aria-label={`Code for ${shown.label}`}>
                         <code>{shown.text}</code>
                     </pre>
                 </div>
