@@ -82,13 +82,19 @@ export async function takeStyle(text: string): Promise<boolean> {
 
 /** Opens a style file, or a whole work that was saved. */
 export async function openJson(file: File): Promise<void> {
-    if (file.size > 64 * 1024 * 1024) return notice('error', `${file.name} has more than 64 MiB`);
-    const text = await file.text();
+    const wrong = file.size > maxFile ? 'it has more than 64 MiB' : await takeJson(await file.text());
+    if (wrong) notice('error', `${file.name}: ${wrong}`);
+}
+
+const maxFile = 64 * 1024 * 1024;
+
+/** Why the text could not be taken, or an empty text. */
+async function takeJson(text: string): Promise<string> {
     const whole = readWork(text);
-    if (whole instanceof CheckError) return notice('error', `${file.name}: ${whole.message}`);
-    if (whole) return replaceWork(whole);
-    const taken = await takeStyle(text);
-    if (!taken) notice('error', `${file.name}: ${styleError.value}`);
+    if (whole instanceof CheckError) return whole.message;
+    if (!whole) return (await takeStyle(text)) ? '' : styleError.value;
+    replaceWork(whole);
+    return '';
 }
 
 /** The work that the text is, what is wrong with it, or nothing where it is a style. */

@@ -1,4 +1,3 @@
-import { effect } from '@preact/signals';
 import { asWork } from '../model/check';
 import { readLink } from '../model/permalink';
 import * as keep from './keep';
@@ -42,9 +41,8 @@ async function openLink(): Promise<void> {
 
 function startKeeping(): void {
     let timer: ReturnType<typeof setTimeout> | undefined;
-    const keepNow = () => void keep.put('work', 'now', work.value);
-    effect(() => {
-        void work.value;
+    const keepNow = () => void keep.put('work', 'now', work.peek());
+    work.subscribe(() => {
         clearTimeout(timer);
         timer = setTimeout(keepNow, 300);
     });
