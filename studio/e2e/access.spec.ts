@@ -11,11 +11,12 @@ async function violations(page: Page): Promise<string[]> {
 
 for (const colorScheme of ['light', 'dark'] as const) {
     test(`has no barriers on a wide page, ${colorScheme}`, async ({ browser, baseURL }) => {
-        const page = await browser.newPage({
+        const context = await browser.newContext({
             baseURL: baseURL ?? '',
             colorScheme,
             viewport: { width: 1440, height: 900 },
         });
+        const page = await context.newPage();
         await open(page);
         await page.getByRole('button', { name: 'Linear gradient', exact: true }).click();
         await page.waitForTimeout(700);
@@ -23,20 +24,21 @@ for (const colorScheme of ['light', 'dark'] as const) {
         await page.getByRole('button', { name: /^Save:/ }).click();
         await expect(page.getByRole('tab')).toHaveCount(8);
         expect(await violations(page)).toEqual([]);
-        await page.close();
+        await context.close();
     });
 
     test(`has no barriers on a phone and does not scroll sideways, ${colorScheme}`, async ({
         browser,
         baseURL,
     }) => {
-        const page = await browser.newPage({
+        const context = await browser.newContext({
             baseURL: baseURL ?? '',
             colorScheme,
             viewport: { width: 390, height: 844 },
             hasTouch: true,
             isMobile: true,
         });
+        const page = await context.newPage();
         await open(page);
         for (const name of panels) {
             await page.getByRole('navigation').getByRole('button', { name }).click();
@@ -48,7 +50,7 @@ for (const colorScheme of ['light', 'dark'] as const) {
             expect(over).toBeLessThanOrEqual(0);
             await expect(page.locator('canvas.picture')).toBeInViewport();
         }
-        await page.close();
+        await context.close();
     });
 }
 

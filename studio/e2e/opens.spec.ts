@@ -1,4 +1,4 @@
-import { expect, open, picture, pictureHash, test } from './page';
+import { expect, open, picture, pictureHash, test, textField } from './page';
 
 test('opens, says how fast, and asks nobody else', async ({ page, studio }) => {
     expect(studio).toBe(page);
@@ -11,11 +11,11 @@ test('opens, says how fast, and asks nobody else', async ({ page, studio }) => {
 });
 
 test('keeps the work between visits', async ({ studio }) => {
-    await studio.getByLabel('Text', { exact: true }).fill('Kept');
+    await textField(studio).fill('Kept');
     await expect(picture(studio)).toHaveAccessibleName('Painted text: Kept');
     await studio.waitForTimeout(600);
     await open(studio);
-    await expect(studio.getByLabel('Text', { exact: true })).toHaveValue('Kept');
+    await expect(textField(studio)).toHaveValue('Kept');
 });
 
 test('works without a network', async ({ studio, context }) => {

@@ -2,6 +2,7 @@ import { expect, test as base, type Locator, type Page } from '@playwright/test'
 
 /** What every test watches: errors, policy violations, requests to elsewhere. */
 export const test = base.extend<{ watched: string[]; studio: Page }>({
+    // eslint-disable-next-line no-empty-pattern -- fixtures are told by the pattern of their first argument
     watched: async ({}, use) => {
         await use([]);
     },
@@ -33,11 +34,17 @@ export function picture(page: Page): Locator {
     return page.locator('canvas.picture');
 }
 
+/** Where the text is written. */
+export function textField(page: Page): Locator {
+    return page.getByRole('textbox', { name: 'Text', exact: true });
+}
+
 /** A number that tells pictures apart. */
 export function pictureHash(page: Page): Promise<string> {
     return picture(page).evaluate((canvas: HTMLCanvasElement) => {
         const context = canvas.getContext('2d');
-        const { data } = context!.getImageData(0, 0, canvas.width, canvas.height);
+        if (!context) return '';
+        const { data } = context.getImageData(0, 0, canvas.width, canvas.height);
         let hash = 7;
         for (const value of data) hash = (Math.imul(hash, 31) + value) | 0;
         return `${canvas.width}x${canvas.height}:${hash}`;

@@ -1,5 +1,5 @@
 import type { Page } from '@playwright/test';
-import { expect, test } from './page';
+import { expect, test, textField } from './page';
 
 test.describe.configure({ mode: 'serial' });
 
@@ -29,7 +29,7 @@ for (const [size, text, least] of [
     [160, 'A large title', 20],
 ] as const) {
     test(`paints text of ${size} pixels while a slider moves`, async ({ studio }) => {
-        await studio.getByLabel('Text', { exact: true }).fill(text);
+        await textField(studio).fill(text);
         await studio.getByLabel('Size', { exact: true }).fill(String(size));
         await studio.getByRole('button', { name: 'Inner shadow', exact: true }).click();
         await studio.waitForTimeout(1500);

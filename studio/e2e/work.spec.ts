@@ -1,7 +1,7 @@
-import { changed, expect, picture, pictureHash, test } from './page';
+import { changed, expect, picture, pictureHash, test, textField } from './page';
 
 test('paints what is written, also in other scripts', async ({ studio }) => {
-    const text = studio.getByLabel('Text', { exact: true });
+    const text = textField(studio);
     let before = await pictureHash(studio);
     for (const words of ['Two\nlines', 'Привет', 'سلام', 'नमस्ते']) {
         await text.fill(words);
@@ -11,7 +11,7 @@ test('paints what is written, also in other scripts', async ({ studio }) => {
 });
 
 test('says near the text what no font shows', async ({ studio }) => {
-    await studio.getByLabel('Text', { exact: true }).fill('日本');
+    await textField(studio).fill('日本');
     await expect(studio.locator('#text-notes')).toContainText('U+65E5');
 });
 

@@ -35,7 +35,7 @@ self.addEventListener('fetch', (event) => {
     event.respondWith(
         caches
             .open(prefix + version)
-            .then((cache) => cache.match(request, { ignoreSearch: true }))
+            .then((cache) => cache.match(request, { ignoreSearch: true, ignoreVary: true }))
             .then((kept) => kept ?? fetch(request)),
     );
 });

@@ -28,11 +28,16 @@ interface Waiting {
 /** Milliseconds after which a worker that does not answer is given up. */
 const patience = 30_000;
 
+/** Workers that may end before a picture, until what waits is given up instead of asked again. */
+const mostDeaths = 3;
+
 export class Engine {
     private worker: Worker;
     private queue: Waiting[] = [];
     private current: Waiting | undefined;
     private ids = 0;
+    /** Workers that ended since the last picture. */
+    private deaths = 0;
     private timer: ReturnType<typeof setTimeout> | undefined;
 
     constructor(
@@ -75,7 +80,7 @@ export class Engine {
             this.queue.push({
                 ask: { id, call, ...ask } as unknown as Ask,
                 transfer,
-                done: done as (value: unknown) => void,
+                done: done as Waiting['done'],
                 fail,
             });
             this.next();
@@ -90,7 +95,8 @@ export class Engine {
         this.settle();
         lost?.fail(new Dropped(reason));
         this.listener.failed(reason, true);
-        this.listener.restarted();
+        if (++this.deaths < mostDeaths) this.listener.restarted();
+        else for (const waiting of this.queue.splice(0)) waiting.fail(new Dropped(reason));
         this.next();
     }
 
@@ -130,10 +136,16 @@ export class Engine {
     private answered(answer: Answer): void {
         const waiting = this.current;
         if (waiting?.ask.id !== answer.id) return;
-        if ('error' in answer && answer.dead) return this.restart(answer.error);
+        if ('error' in answer && answer.dead) {
+            this.restart(answer.error);
+            return;
+        }
         this.settle();
         if ('error' in answer) waiting.fail(new Error(answer.error));
-        else waiting.done(answer.value);
+        else {
+            if (waiting.ask.call === 'paint') this.deaths = 0;
+            waiting.done(answer.value);
+        }
         this.next();
     }
 }

@@ -41,7 +41,10 @@ export async function all(store: Store): Promise<[string, unknown][]> {
     if (!database) return [];
     const from = database.transaction(store).objectStore(store);
     const [keys, values] = await Promise.all([settled(from.getAllKeys()), settled(from.getAll())]);
-    return (keys ?? []).map((key, at) => [typeof key === 'string' ? key : '', values?.[at] as unknown]);
+    return (keys ?? []).map((key, at) => [
+        typeof key === 'string' ? key : '',
+        values?.[at] as unknown,
+    ]);
 }
 
 /** Whether it could be kept: a full disk is no reason to stop. */

@@ -82,7 +82,8 @@ export async function takeStyle(text: string): Promise<boolean> {
 
 /** Opens a style file, or a whole work that was saved. */
 export async function openJson(file: File): Promise<void> {
-    const wrong = file.size > maxFile ? 'it has more than 64 MiB' : await takeJson(await file.text());
+    const wrong =
+        file.size > maxFile ? 'it has more than 64 MiB' : await takeJson(await file.text());
     if (wrong) notice('error', `${file.name}: ${wrong}`);
 }
 

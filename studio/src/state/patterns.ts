@@ -63,10 +63,10 @@ export async function patternsFor(
 ): Promise<Record<string, PatternPixels>> {
     const names = [...imagesOf(style)];
     const pixels = await Promise.all(
-        names.map(
-            (name) =>
-                (Object.hasOwn(given, name) ? given[name] : undefined) ?? shippedPattern(name),
-        ),
+        names.map((name) => {
+            const known = Object.hasOwn(given, name) ? given[name] : undefined;
+            return known ? Promise.resolve(known) : shippedPattern(name);
+        }),
     );
     return Object.fromEntries(names.map((name, at) => [name, pixels[at] as PatternPixels]));
 }

@@ -38,7 +38,7 @@ function PictureFacts() {
     ] as const;
     return (
         <section class="fact" aria-labelledby="fact-picture">
-            <h3 id="fact-picture">Picture</h3>
+            <h3 id="fact-picture">Sizes and fonts</h3>
             <dl>
                 {rows.map(([name, value]) => (
                     <div key={name}>

@@ -250,7 +250,7 @@ const spans: readonly (readonly [Span, string])[] = [
 /** What a look has beside its effects. */
 function LookForm({ look, index }: { look: LookStyle; index: number }) {
     const set = (key: string, value: unknown) =>
-        editLook(index, (now) => withKey(now, key, value) as LookStyle, key);
+        editLook(index, (now) => withKey(now, key, value), key);
     const opacity = lookField('textOpacity');
     return (
         <div class="row-form form">

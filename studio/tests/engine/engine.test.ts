@@ -106,6 +106,19 @@ describe('the engine', () => {
         await expect(call).rejects.toBeInstanceOf(Dropped);
     });
 
+    it('does not start workers without end', async () => {
+        for (let size = 1; size < 20; size++) {
+            engine.paint(sized(size));
+            worker().fail('cannot begin', true);
+            await settled();
+        }
+        expect(listener.restarted).toHaveBeenCalledTimes(2);
+        engine.paint(sized(50));
+        worker().answer('well');
+        await settled();
+        expect(listener.painted).toHaveBeenCalledTimes(1);
+    });
+
     it('gives up a worker that does not answer', () => {
         vi.useFakeTimers();
         engine.paint(sized(10));
