@@ -129,7 +129,7 @@ export function setField(
 
 /** The object with the key set; undefined takes it away. */
 export function withKey<T extends object>(object: T, key: string, value: unknown): T {
-    if (value !== undefined) return { ...object, [key]: value } as T;
+    if (value !== undefined) return { ...object, [key]: value };
     return Object.fromEntries(Object.entries(object).filter(([name]) => name !== key)) as T;
 }
 

@@ -48,6 +48,7 @@ export const firstWork: Work = {
         version: 2,
         looks: [
             {
+                description: 'Edge and shadow',
                 color: '#1B2A6B',
                 outerShadow: {
                     angle: 120,
@@ -59,6 +60,7 @@ export const firstWork: Work = {
                 stroke: { size: '6%', color: '#1B2A6B', position: 'outside' },
             },
             {
+                description: 'Sunset',
                 span: 'line',
                 linearGradient: {
                     angle: 90,

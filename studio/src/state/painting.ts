@@ -102,6 +102,12 @@ export async function loadOwnFonts(): Promise<void> {
     await sendOwnFonts();
 }
 
+/** Forgets a font of the person's own. */
+export async function forgetFont(name: string): Promise<void> {
+    ownFonts.value = ownFonts.value.filter((each) => each !== name);
+    await keep.remove('fonts', name);
+}
+
 /** Takes a font file, keeps it in this browser and gives its name. Rejects with a sentence for the reader. */
 export async function addFont(file: File): Promise<string> {
     if (file.size > 32 * 1024 * 1024) throw new Error(`${file.name} has more than 32 MiB`);

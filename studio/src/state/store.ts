@@ -15,7 +15,7 @@ export const canRedo = computed(() => steps.value.future.length > 0);
 /** The look that is open, counted from the lowest. */
 export const openLook = signal(firstWork.style.looks.length - 1);
 /** The effect of it that is open. */
-export const openEffect = signal<EffectName | 'fill' | ''>('fill');
+export const openEffect = signal<EffectName | 'fill' | ''>('linearGradient');
 
 /** What is said politely to those who do not see the page. */
 export const announced = signal('');

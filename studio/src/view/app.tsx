@@ -1,9 +1,10 @@
 import { useSignal } from '@preact/signals';
 import { useEffect } from 'preact/hooks';
-import { announced, canRedo, canUndo, redo, undo } from '../state/store';
+import { firstWork } from '../model/work';
+import { picture } from '../state/painting';
+import { announced, canRedo, canUndo, openLook, redo, replaceWork, undo } from '../state/store';
 import { close, notices, notice } from '../state/notices';
 import { openJson } from '../state/leave';
-import { openLook } from '../state/store';
 import { theme, turnTheme } from '../state/theme';
 import { dock, openDock, openTab, tab, type Tab } from '../state/viewing';
 import { choosePattern } from './effect_form';
@@ -30,20 +31,22 @@ export function App() {
         <div class={dropping ? 'app dropping' : 'app'}>
             <Header />
             <main>
-                <Stage />
-                <nav class="tab-bar" aria-label="Panels">
-                    {tabs.map(([name, label]) => (
-                        <button
-                            key={name}
-                            type="button"
-                            class="tab"
-                            aria-current={tab.value === name ? 'true' : undefined}
-                            onClick={() => openTab(name)}
-                        >
-                            {label}
-                        </button>
-                    ))}
-                </nav>
+                <div class="top">
+                    <Stage />
+                    <nav class="tab-bar" aria-label="Panels">
+                        {tabs.map(([name, label]) => (
+                            <button
+                                key={name}
+                                type="button"
+                                class="tab"
+                                aria-current={tab.value === name ? 'true' : undefined}
+                                onClick={() => openTab(name)}
+                            >
+                                {label}
+                            </button>
+                        ))}
+                    </nav>
+                </div>
                 <div class="side side-left">
                     <Panel name="text" title="Text">
                         <TextPanel />
@@ -101,6 +104,10 @@ function Header() {
             <h1>
                 voreleffect <span>studio</span>
             </h1>
+            <Figures />
+            <button type="button" class="button" onClick={startOver}>
+                New
+            </button>
             <div class="bar-group" role="group" aria-label="History">
                 <IconButton icon="undo" label="Undo" disabled={!canUndo.value} onClick={undo} />
                 <IconButton icon="redo" label="Redo" disabled={!canRedo.value} onClick={redo} />
@@ -111,6 +118,23 @@ function Header() {
                 onClick={turnTheme}
             />
         </header>
+    );
+}
+
+/** The work of a first visit, in place of this one. */
+function startOver(): void {
+    replaceWork(firstWork);
+    notice('info', 'A new work. Undo brings back the one before.');
+}
+
+/** Size of the picture, and what it took to paint. */
+function Figures() {
+    const shown = picture.value;
+    if (!shown) return null;
+    return (
+        <span class="figures">
+            {shown.width} × {shown.height} px · {shown.milliseconds.toFixed(1)} ms
+        </span>
     );
 }
 

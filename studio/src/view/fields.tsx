@@ -167,6 +167,29 @@ export function ChoiceField<Value extends string>(props: ChoiceProps<Value>) {
     );
 }
 
+interface TextProps {
+    label: string;
+    help?: string;
+    value: string;
+    onChange: (text: string) => void;
+}
+
+export function TextField({ label, help, value, onChange }: TextProps) {
+    const id = useId();
+    return (
+        <div class="field wide" title={help}>
+            <label for={id}>{label}</label>
+            <input
+                id={id}
+                type="text"
+                maxLength={200}
+                value={value}
+                onInput={(event) => onChange(event.currentTarget.value)}
+            />
+        </div>
+    );
+}
+
 interface CheckProps {
     label: string;
     help?: string;

@@ -20,7 +20,14 @@ import {
 } from '../model/style_file';
 import { announce, edit, editLook, openEffect, openLook, work } from '../state/store';
 import { choosePattern, EffectForm } from './effect_form';
-import { CheckField, ChoiceField, ColourField, LengthField, NumberField } from './fields';
+import {
+    CheckField,
+    ChoiceField,
+    ColourField,
+    LengthField,
+    NumberField,
+    TextField,
+} from './fields';
 import { Icon, IconButton } from './icons';
 import { useReorder } from './reorder';
 
@@ -188,7 +195,7 @@ function LookEditor({ look, index }: { look: LookStyle; index: number }) {
                 ))}
             </ol>
             <div class={openEffect.value === 'fill' ? 'row-item open' : 'row-item'}>
-                <RowName name="fill" label="Fill, place and span" />
+                <RowName name="fill" label="Name, fill, place and span" />
                 {openEffect.value === 'fill' && <LookForm look={look} index={index} />}
             </div>
         </section>
@@ -254,6 +261,12 @@ function LookForm({ look, index }: { look: LookStyle; index: number }) {
     const opacity = lookField('textOpacity');
     return (
         <div class="row-form form">
+            <TextField
+                label="Name"
+                help={lookField('description').help}
+                value={look.description ?? ''}
+                onChange={(name) => set('description', name || undefined)}
+            />
             <CheckField
                 label="The text is filled"
                 help={lookField('fill').help}

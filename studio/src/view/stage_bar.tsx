@@ -1,4 +1,3 @@
-import { picture } from '../state/painting';
 import { edit, work } from '../state/store';
 import {
     fit,
@@ -51,7 +50,6 @@ export function StageBar() {
                     </button>
                 ))}
             </div>
-            <Figures />
         </div>
     );
 }
@@ -111,16 +109,5 @@ function Grounds() {
             )}
             <FileButton label="Picture…" accept="image/*" onFile={(file) => void chosen(file)} />
         </div>
-    );
-}
-
-/** Size of the picture, and what it took to paint. */
-function Figures() {
-    const shown = picture.value;
-    if (!shown) return null;
-    return (
-        <span class="figures">
-            {shown.width} × {shown.height} px · {shown.milliseconds.toFixed(1)} ms
-        </span>
     );
 }

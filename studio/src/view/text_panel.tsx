@@ -1,9 +1,9 @@
 import { shippedFonts } from '../engine/fonts';
 import { limits } from '../model/check';
 import type { Field } from '../model/schema';
-import type { Align, Work } from '../model/work';
+import { firstWork, type Align, type Work } from '../model/work';
 import { notice } from '../state/notices';
-import { addFont, failure, ownFonts, picture } from '../state/painting';
+import { addFont, failure, forgetFont, ownFonts, picture } from '../state/painting';
 import { edit, work } from '../state/store';
 import { CheckField, ChoiceField, FileButton, LengthField, NumberField } from './fields';
 
@@ -135,6 +135,18 @@ function FontField({ font, onChange }: { font: string; onChange: (font: string) 
     return (
         <>
             <ChoiceField label="Font" value={font} choices={choices} onChange={onChange} />
+            {ownFonts.value.includes(font) && (
+                <button
+                    type="button"
+                    class="button"
+                    onClick={() => {
+                        onChange(firstWork.font);
+                        void forgetFont(font);
+                    }}
+                >
+                    Forget {font}
+                </button>
+            )}
             <FileButton
                 label="Open a font file…"
                 accept=".ttf,.otf,.ttc,.otc,.woff"
