@@ -4,6 +4,7 @@
 #     scripts/studio.sh           builds it and serves it at an address of this machine, which it prints
 #     scripts/studio.sh build     builds it into build/studio, a folder to be put on any server
 #     scripts/studio.sh test      builds it, and checks its sources and the page in Chromium
+#     scripts/studio.sh pictures  builds it, and takes the pictures of docs/studio.md anew
 set -euo pipefail
 cd "$(dirname "$0")/.."
 . scripts/packages.sh
@@ -38,16 +39,29 @@ check() {
     npx playwright test
 }
 
+# Pictures of 256 colours are a quarter as large.
+take_pictures() {
+    need_packages chromium python3 python3-pil
+    (cd studio && node pictures/take.mjs)
+    /usr/bin/python3 -B - docs/studio/*.png <<'END'
+import sys
+from PIL import Image
+for name in sys.argv[1:]:
+    Image.open(name).convert("RGB").quantize(256, dither=Image.Dither.NONE).save(name, optimize=True)
+END
+}
+
 case ${1-serve} in
     build) build ;;
     test) build && check ;;
+    pictures) build && take_pictures ;;
     serve)
         build
         cd studio
         exec npx vite preview --host 127.0.0.1
         ;;
     *)
-        echo "usage: scripts/studio.sh [build | test]" >&2
+        echo "usage: scripts/studio.sh [build | test | pictures]" >&2
         exit 2
         ;;
 esac
