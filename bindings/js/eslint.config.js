@@ -3,12 +3,14 @@ import { defineConfig } from 'eslint/config';
 import { configs } from 'typescript-eslint';
 
 export default defineConfig(
-    { ignores: ['dist/'] },
+    { ignores: ['dist/', 'tests/typed_use.ts'] },
     js.configs.recommended,
     {
         files: ['**/*.ts'],
         extends: [configs.strictTypeChecked, configs.stylisticTypeChecked],
-        languageOptions: { parserOptions: { projectService: true } },
+        languageOptions: {
+            parserOptions: { projectService: true },
+        },
         rules: {
             '@typescript-eslint/restrict-template-expressions': ['error', { allowNumber: true }],
             '@typescript-eslint/no-confusing-void-expression': 'off',

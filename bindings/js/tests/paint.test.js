@@ -275,5 +275,14 @@ test('Sizes_BeyondMemoryAreErrorsOfTheirOwn', () => {
     assert.throws(() => plain.paint(dots(2 ** 29)), { name: 'VorelSizeError' });
     const lowest = { x: -(2 ** 31), y: 0, mask: block(1, 1) };
     assert.throws(() => new Look().stroke(9, 0).paint(lowest), { name: 'VorelSizeError' });
+    // More than addresses of 32 bits hold, by one mask that stands thrice.
+    const large = { data: new Uint8Array(16e8), width: 40000, height: 40000 };
+    const thrice = [0, 1, 2].map((x) => ({ x, y: 0, mask: large }));
+    assert.throws(() => plain.paint(thrice), { name: 'VorelMemoryError' });
+    assert.throws(
+        () => plain.paint(block(2, 2), { data: large.data, width: 1, height: 4e8 + 1 }),
+        RangeError,
+    );
+    assert.equal(plain.paint(block(65535, 3)).width, 65535);
     assert.equal(plain.paint(block(1, 1)).width, 1);
 });
