@@ -74,8 +74,9 @@ export interface Calls {
     sample: { ask: { work: Work }; answer: Painted };
     facts: { ask: { work: Work }; answer: Facts };
     layers: { ask: { work: Work }; answer: Layer[] };
+    /** `onGround`: with the colour of the background beneath the text, where it is a colour. */
     png: {
-        ask: { work: Work; scale: number };
+        ask: { work: Work; scale: number; onGround: boolean };
         answer: { bytes: Uint8Array<ArrayBuffer>; notes: string[] };
     };
     exports: { ask: { work: Work }; answer: Code[] };

@@ -29,14 +29,18 @@ export class Studio {
         return font.family;
     }
 
-    async paint(work: Work): Promise<Painted> {
-        const options = await this.options(work);
+    /** Paints the work, on nothing or on a ground of the colour '#rrggbb'. */
+    async paint(work: Work, ground?: string): Promise<Painted> {
+        const options = {
+            ...(await this.options(work)),
+            ...(ground ? { background: ground } : {}),
+        };
         const began = performance.now();
         const picture = this.engine.Text.picture(work.text, options);
         const milliseconds = performance.now() - began;
         if (picture.missing.length > 0 && this.lacking !== lackingKey(work)) {
             this.lacking = lackingKey(work);
-            return this.paint(work);
+            return this.paint(work, ground);
         }
         return {
             data: new Uint8ClampedArray(picture.data),
