@@ -82,7 +82,7 @@ function transfersOf(value: unknown): Transferable[] {
 
 /** After a trap, or without memory, the instance is of no use any more. */
 function isDeadly(error: unknown): boolean {
-    if (error instanceof WebAssembly.RuntimeError || error instanceof RangeError) return true;
+    if (error instanceof WebAssembly.RuntimeError) return true;
     const name = error instanceof Error ? error.name : '';
     return name === 'VorelMemoryError' || name === 'VorelError';
 }
