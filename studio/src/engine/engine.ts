@@ -80,7 +80,7 @@ export class Engine {
             this.queue.push({
                 ask: { id, call, ...ask } as unknown as Ask,
                 transfer,
-                done: done as Waiting['done'],
+                done: done,
                 fail,
             });
             this.next();
