@@ -28,7 +28,9 @@ export default tseslint.config(
             globals: {
                 self: 'readonly',
                 caches: 'readonly',
+                Headers: 'readonly',
                 Request: 'readonly',
+                Response: 'readonly',
                 URL: 'readonly',
                 fetch: 'readonly',
             },

@@ -13,6 +13,11 @@ export default defineConfig({
         viewport: { width: 1440, height: 900 },
         launchOptions: { executablePath: '/usr/bin/chromium', args: ['--no-sandbox'] },
     },
+    // Speed is measured when nothing else runs.
+    projects: [
+        { name: 'page', testIgnore: 'speed.spec.ts' },
+        { name: 'speed', testMatch: 'speed.spec.ts', dependencies: ['page'] },
+    ],
     webServer: {
         command: `npx vite preview --port ${port}`,
         port,

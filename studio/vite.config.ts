@@ -1,6 +1,12 @@
 import { defineConfig } from 'vite';
 import { offline } from './build/offline.ts';
 
+/** A page that no other one shares its process with has a clock of microseconds. */
+const isolation = {
+    'Cross-Origin-Opener-Policy': 'same-origin',
+    'Cross-Origin-Embedder-Policy': 'require-corp',
+};
+
 export default defineConfig({
     base: './',
     plugins: [offline()],
@@ -12,6 +18,6 @@ export default defineConfig({
         assetsInlineLimit: 0,
     },
     worker: { format: 'es' },
-    server: { host: '127.0.0.1', fs: { allow: ['..'] } },
-    preview: { host: '127.0.0.1', port: 4173, strictPort: true },
+    server: { host: '127.0.0.1', fs: { allow: ['..'] }, headers: isolation },
+    preview: { host: '127.0.0.1', port: 4173, strictPort: true, headers: isolation },
 });

@@ -7,6 +7,14 @@ const version = 'VERSION';
 const files = ['FILES'];
 const prefix = `voreleffect-studio ${self.registration.scope} `;
 
+/** The answer with the headers by which the browser gives the page a clock of microseconds. */
+function isolated(answer) {
+    const headers = new Headers(answer.headers);
+    headers.set('Cross-Origin-Opener-Policy', 'same-origin');
+    headers.set('Cross-Origin-Embedder-Policy', 'require-corp');
+    return new Response(answer.body, { status: answer.status, headers });
+}
+
 self.addEventListener('install', (event) => {
     event.waitUntil(
         caches
@@ -36,6 +44,6 @@ self.addEventListener('fetch', (event) => {
         caches
             .open(prefix + version)
             .then((cache) => cache.match(request, { ignoreSearch: true, ignoreVary: true }))
-            .then((kept) => kept ?? fetch(request)),
+            .then((kept) => (kept ? isolated(kept) : fetch(request))),
     );
 });

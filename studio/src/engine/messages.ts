@@ -19,11 +19,12 @@ export interface Painted {
     height: number;
     /** Milliseconds of layout and painting in the worker. */
     milliseconds: number;
+    /** Of the text, where its first baseline begins. */
+    origin: { x: number; y: number };
     margins: Box;
     ink: Box;
     /** What gradients and patterns fill. */
     box: Box;
-    baseline: number;
     /** Characters that no font has. */
     missing: string[];
     notes: string[];
@@ -51,6 +52,7 @@ export interface Facts {
     looks: PlannedLook[];
     key: { name: string; meaning: string }[];
     keyBytes: number;
+    /** From the origin of the text. */
     lines: { baseline: number; box: Box }[];
 }
 

@@ -150,3 +150,8 @@ export function isEffectName(name: string): name is EffectName {
 export function effectsOf(look: LookStyle): EffectName[] {
     return Object.keys(look).filter(isEffectName);
 }
+
+/** What a look is called: its description, or its number from the lowest. */
+export function lookName(look: LookStyle, index: number): string {
+    return look.description ?? `Look ${index + 1}`;
+}

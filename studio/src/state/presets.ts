@@ -45,6 +45,8 @@ export function paintPresets(): void {
         queueMicrotask(() => stop());
         void (async () => {
             for (const preset of presets) await paintPreset(preset).catch(() => undefined);
+            // The first picture's time is that of code that was not compiled yet.
+            engine?.paint(work.value);
         })();
     });
 }

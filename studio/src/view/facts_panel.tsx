@@ -1,7 +1,16 @@
 import { useEffect } from 'preact/hooks';
 import type { Facts, Step } from '../engine/messages';
 import { labelOf } from '../model/schema';
-import { facts, layers, picture, shownLayer, wantsFacts, wantsLayers } from '../state/painting';
+import { lookName } from '../model/style_file';
+import {
+    facts,
+    layers,
+    picture,
+    pictured,
+    shownLayer,
+    wantsFacts,
+    wantsLayers,
+} from '../state/painting';
 import { dock } from '../state/viewing';
 import { Pixels } from './pixels';
 
@@ -34,7 +43,7 @@ function PictureFacts() {
             `left ${margins.left}, top ${margins.top}, right ${margins.right}, bottom ${margins.bottom}`,
         ],
         ['Fonts', shown.fonts.join(', ')],
-        ['Layout and painting', `${shown.milliseconds.toFixed(2)} ms`],
+        ['Layout and painting', timeOf(shown.milliseconds)],
     ] as const;
     return (
         <section class="fact" aria-labelledby="fact-picture">
@@ -61,7 +70,7 @@ function Order({ known }: { known: Facts }) {
             <h3 id="fact-order">Order of painting, the topmost first</h3>
             {known.looks.map((look, index) => (
                 <div key={index} class="look-order">
-                    {known.looks.length > 1 && <h4>Look {known.looks.length - index}</h4>}
+                    {known.looks.length > 1 && <h4>{lookNamed(known.looks.length - 1 - index)}</h4>}
                     <p class="help">
                         {look.layered ? 'Two layers' : 'One layer'}: {look.reason}
                     </p>
@@ -88,6 +97,16 @@ function Order({ known }: { known: Facts }) {
     );
 }
 
+function lookNamed(index: number): string {
+    const look = pictured.value?.style.looks[index];
+    return look ? lookName(look, index) : '';
+}
+
+/** As fine as the browser's clock: one of pages that are isolated from others tells microseconds. */
+function timeOf(milliseconds: number): string {
+    return `${milliseconds.toFixed(crossOriginIsolated ? 3 : 1)} ms`;
+}
+
 function StepRow({ step, longest }: { step: Step; longest: number }) {
     const time = step.milliseconds;
     return (
@@ -101,7 +120,7 @@ function StepRow({ step, longest }: { step: Step; longest: number }) {
                 {time !== undefined && (
                     <>
                         <span class="time-bar" style={{ width: `${(time / longest) * 100}%` }} />
-                        {time.toFixed(3)} ms
+                        {timeOf(time)}
                     </>
                 )}
             </td>

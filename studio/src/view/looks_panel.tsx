@@ -13,6 +13,7 @@ import {
 import { helpOf, labelOf, lookField, offsetFields } from '../model/schema';
 import {
     effectsOf,
+    lookName,
     paintedEffects,
     type EffectName,
     type LookStyle,
@@ -42,10 +43,6 @@ export function LooksPanel() {
             {look && <LookEditor key={index} look={look} index={index} />}
         </>
     );
-}
-
-function lookName(look: LookStyle, index: number): string {
-    return look.description ?? `Look ${index + 1}`;
 }
 
 function swatchOf(look: LookStyle): string | undefined {

@@ -105,7 +105,7 @@ function Overlay() {
             {box && <Rectangle box={shown.box} class="mark-box" />}
             {lines &&
                 facts.value?.lines.map((line, index) => (
-                    <g key={index}>
+                    <g key={index} transform={`translate(${shown.origin.x} ${shown.origin.y})`}>
                         <Rectangle box={line.box} class="mark-line" />
                         <line
                             class="mark-baseline"

@@ -59,7 +59,7 @@ export function TextPanel() {
                 onChange={(value) => set('letterSpacing', String(value))}
             />
             <NumberField
-                label="Text opacity"
+                label="Opacity"
                 help="Of the topmost look that is filled; 1 leaves it its own"
                 value={now.opacity}
                 min={0}
