@@ -24,9 +24,9 @@ export function FactsPanel() {
     return (
         <div class="facts">
             <PictureFacts />
-            {facts.value && <Order known={facts.value} />}
             <Layers />
             {facts.value && <Key known={facts.value} />}
+            {facts.value && <Order known={facts.value} />}
         </div>
     );
 }
@@ -43,7 +43,7 @@ function PictureFacts() {
             `left ${margins.left}, top ${margins.top}, right ${margins.right}, bottom ${margins.bottom}`,
         ],
         ['Fonts', shown.fonts.join(', ')],
-        ['Layout and painting', timeOf(shown.milliseconds)],
+        ['Painted in', timeOf(shown.milliseconds)],
     ] as const;
     return (
         <section class="fact" aria-labelledby="fact-picture">
