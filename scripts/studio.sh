@@ -26,7 +26,7 @@ build() {
     install bindings/js
     (cd bindings/js && quietly node build.mjs)
     install studio
-    (cd studio && node build/copy_fonts.js && quietly npx vite build)
+    (cd studio && node tools/copy_files.js && quietly npx vite build)
 }
 
 check() {

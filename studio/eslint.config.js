@@ -19,7 +19,7 @@ export default tseslint.config(
         },
     },
     {
-        files: ['*.js', 'build/**/*.js', 'pictures/*.mjs'],
+        files: ['*.js', 'tools/**/*.js', 'pictures/*.mjs'],
         languageOptions: { globals: { URL: 'readonly', process: 'readonly' } },
     },
     {

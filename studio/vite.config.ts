@@ -1,5 +1,5 @@
 import { defineConfig } from 'vite';
-import { offline } from './build/offline.ts';
+import { offline } from './tools/offline.ts';
 
 /** A page that no other one shares its process with has a clock of microseconds. */
 const isolation = {

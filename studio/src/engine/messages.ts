@@ -83,7 +83,8 @@ export interface Calls {
     paint: { ask: { work: Work }; answer: Painted };
     /** As paint, of a work beside the one that is made. */
     sample: { ask: { work: Work }; answer: Painted };
-    facts: { ask: { work: Work }; answer: Facts };
+    /** `measured`: with the time of each effect, for which it is painted several times. */
+    facts: { ask: { work: Work; measured: boolean }; answer: Facts };
     layers: { ask: { work: Work }; answer: Layer[] };
     /** `onGround`: with the colour of the background beneath the text, where it is a colour. */
     png: {

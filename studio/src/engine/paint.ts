@@ -67,9 +67,11 @@ export class Studio {
         };
     }
 
-    async facts(work: Work): Promise<Facts> {
+    async facts(work: Work, measured: boolean): Promise<Facts> {
         const options = await this.options(work);
-        const explained = this.engine.Text.explain(work.text, options);
+        const explained = measured
+            ? this.engine.Text.explain(work.text, options)
+            : this.style(work.style, work.patterns).explain(work.size);
         const layout = this.engine.Text.layout(work.text, options);
         return {
             looks: explained.looks.toReversed().map((look) => ({

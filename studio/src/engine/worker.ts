@@ -31,7 +31,7 @@ type Answers = { [Name in CallName]: (ask: Calls[Name]['ask']) => Promise<Calls[
 const answers: Answers = {
     paint: async ({ work }) => (await studio).paint(work),
     sample: async ({ work }) => (await studio).paint(work),
-    facts: async ({ work }) => (await studio).facts(work),
+    facts: async ({ work, measured }) => (await studio).facts(work, measured),
     layers: async ({ work }) => (await studio).layers(work),
     style: async ({ style, patterns }) => {
         (await studio).style(style, patterns);

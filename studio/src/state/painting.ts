@@ -1,4 +1,4 @@
-import { effect, signal } from '@preact/signals';
+import { computed, effect, signal } from '@preact/signals';
 import { Engine } from '../engine/engine';
 import type { Facts, Layer, Painted } from '../engine/messages';
 import { missingSupport } from '../engine/support';
@@ -53,6 +53,14 @@ function startEngine(): Engine {
 
 let factsTimer: ReturnType<typeof setTimeout> | undefined;
 
+/** Pixels of a picture up to which its steps are measured and shown one by one: larger ones keep the worker busy. */
+export const mostMeasured = 4_000_000;
+
+export const isMeasured = computed(() => {
+    const shown = picture.value;
+    return shown !== undefined && shown.width * shown.height <= mostMeasured;
+});
+
 /** Facts follow when the hand rests: a slider that moves shall not wait for them. */
 function askFacts(of: Work): void {
     clearTimeout(factsTimer);
@@ -64,8 +72,9 @@ function askFacts(of: Work): void {
 
 async function ask(what: 'facts' | 'layers', of: Work): Promise<void> {
     try {
-        if (what === 'facts') facts.value = await engine?.newest('facts', { work: of });
-        else layers.value = (await engine?.newest('layers', { work: of })) ?? [];
+        const measured = isMeasured.value;
+        if (what === 'facts') facts.value = await engine?.newest('facts', { work: of, measured });
+        else layers.value = measured ? ((await engine?.newest('layers', { work: of })) ?? []) : [];
     } catch {
         // Overtaken by a newer work, or the painting has already told why it failed.
     }

@@ -4,7 +4,9 @@ import { labelOf } from '../model/schema';
 import { lookName } from '../model/style_file';
 import {
     facts,
+    isMeasured,
     layers,
+    mostMeasured,
     picture,
     pictured,
     shownLayer,
@@ -164,7 +166,7 @@ function LayerButton({ at, name, layer }: LayerProps) {
             aria-pressed={shownLayer.value === at}
             onClick={() => (shownLayer.value = at)}
         >
-            <span class="layer-picture ground-checkerboard">
+            <span class="layer-picture ground-mid">
                 {shown && <Pixels data={shown.data} width={shown.width} height={shown.height} />}
             </span>
             <span>{name}</span>

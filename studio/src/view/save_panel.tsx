@@ -1,5 +1,6 @@
 import { useSignal, useSignalEffect } from '@preact/signals';
 import { useEffect, useRef } from 'preact/hooks';
+import { shippedFonts } from '../engine/fonts';
 import {
     codeError,
     codes,
@@ -74,7 +75,22 @@ export function SavePanel() {
             </section>
             <StyleField />
             <Code />
+            <Licences />
         </div>
+    );
+}
+
+/** What the page is made of belongs to others, too. */
+function Licences() {
+    return (
+        <p class="help licences">
+            Licences: <a href="./licences.txt">the studio</a>
+            {shippedFonts.map(({ id, label, licence }) => (
+                <span key={id}>
+                    , <a href={`./fonts/${licence}`}>{label}</a>
+                </span>
+            ))}
+        </p>
     );
 }
 

@@ -65,7 +65,7 @@ describe('the engine', () => {
 
     it('paints before it tells facts', async () => {
         engine.paint(sized(10));
-        const facts = engine.newest('facts', { work: sized(10) });
+        const facts = engine.newest('facts', { work: sized(10), measured: true });
         engine.paint(sized(11));
         worker().answer('one');
         await settled();
@@ -101,7 +101,7 @@ describe('the engine', () => {
     });
 
     it('lets what was with a worker that stopped fail as dropped', async () => {
-        const call = engine.call('facts', { work: sized(10) });
+        const call = engine.call('facts', { work: sized(10), measured: true });
         worker().onerror?.({ message: 'gone', preventDefault: () => undefined });
         await expect(call).rejects.toBeInstanceOf(Dropped);
     });
