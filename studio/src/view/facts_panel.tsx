@@ -136,6 +136,12 @@ function Layers() {
     return (
         <section class="fact" aria-labelledby="fact-layers">
             <h3 id="fact-layers">Layers one by one, the lowest first</h3>
+            {!isMeasured.value && (
+                <p class="help">
+                    Layers and times are shown of pictures of up to {mostMeasured / 1e6} million
+                    pixels.
+                </p>
+            )}
             <div class="layers" role="group" aria-labelledby="fact-layers">
                 <LayerButton at={-1} name="The picture" />
                 {layers.value.map((layer, at) => (
