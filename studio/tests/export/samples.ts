@@ -143,7 +143,7 @@ export const handMade: Readonly<Record<string, Work>> = {
         [
             {
                 pattern: { image: 'tile.png', width: '30%' },
-                stroke: { ...ramp[0], size: 2, color: '#222', position: 'outside' } as never,
+                stroke: { size: 2, color: '#222', position: 'outside' },
             },
             { pattern: { image: 'other', width: 7 }, textOpacity: 0, span: 'word' },
             { fill: false, pattern: { image: 'other', width: '1000%', opacity: 0.2 } },
@@ -266,6 +266,6 @@ export const handMade: Readonly<Record<string, Work>> = {
                 { description: 'coding: utf-7', color: '#654321', offset: { x: 1 } },
             ],
         },
-        { text: '-o "\'; $(exit 3) `x` \\n %s \ud83d\ude00\n\u00e9 </script>\\' },
+        { text: '-o "\'; $(exit 3) `x` \\n %s \u2192\n\u00e9 </script>\\' },
     ),
 };
