@@ -67,14 +67,14 @@ export function presetWorks(): Map<string, Work> {
     );
 }
 
-/** Pixels of 5 x 3 in which all four channels vary, clear and half clear ones among them. */
-export const tile: PatternPixels = {
-    width: 5,
-    height: 3,
-    data: Buffer.from(
-        Array.from({ length: 60 }, (_, i) => (i % 4 === 3 ? (i * 37) % 256 : (i * 61 + 9) % 256)),
-    ).toString('base64'),
-};
+/** Pixels in which all four channels vary, clear and half clear ones among them. */
+function tileOf(width: number, height: number): PatternPixels {
+    const byte = (i: number): number => (i % 4 === 3 ? i * 37 : i * 61 + 9) % 256;
+    const bytes = Array.from({ length: width * height * 4 }, (_, i) => byte(i));
+    return { width, height, data: Buffer.from(bytes).toString('base64') };
+}
+
+export const tile = tileOf(5, 3);
 
 const ramp = [
     { location: 0, color: '#F40' },
@@ -150,6 +150,11 @@ export const handMade: Readonly<Record<string, Work>> = {
         ],
         { patterns: { 'tile.png': tile, other: tile } },
     ),
+    // As floats, 31 / 7 * 7 is less than 31: the tile would be a pixel too narrow.
+    roundedTile: workOf([{ pattern: { image: 'seven.png', width: 31 } }], {
+        size: 90,
+        patterns: { 'seven.png': tileOf(7, 2) },
+    }),
     textFill: workOf([
         { text: { color: '#8B2', opacity: 0.5 }, outerShadow: shadow, textOpacity: 1 },
         { innerShadow: shadow, text: { color: '#2B8', opacity: 0.6 }, textOpacity: 0.5 },
