@@ -1,6 +1,8 @@
 #!/usr/bin/env bash
 # Compiles and runs what the studio exports, of every preset and of looks with each effect and option: C++ by
 # look.h and by the classes, C, Java, Python, and the command with its style file. All paint the same bytes.
+# The package of JavaScript takes part where it has texts.
+#
 # What others have built is taken: build/release, the face of Java (scripts/android_test.sh) and the package of
 # Python (scripts/python.sh); else it is built now.
 set -euo pipefail
@@ -23,6 +25,10 @@ export VOREL_EXPORTS=$PWD/build/exports VOREL_BUILD=$PWD/build/release
 export VOREL_PYTHON=${VOREL_PYTHON:-$(python_with_the_package)}
 export VOREL_JAVA=${VOREL_JAVA:-$java/android/classes:::$java:$java/android}
 export VOREL_FONT=/usr/share/fonts/truetype/dejavu/DejaVuSans-Bold.ttf
+if grep -q '"./text"' bindings/js/package.json 2> /dev/null; then
+    [[ -d bindings/js/dist ]] || quietly scripts/js.sh
+    export VOREL_PACKAGES=$PWD/studio/node_modules
+fi
 rm -rf "$VOREL_EXPORTS"
 mkdir -p "$VOREL_EXPORTS"
 cd studio

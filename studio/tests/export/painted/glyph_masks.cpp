@@ -1,8 +1,9 @@
 // Sets texts and writes the masks of their glyphs: glyph_masks FONT LIST
 //
-// Each line of LIST is: FILE SIZE ALIGN LINE_HEIGHT LETTER_SPACING TEXT, the align as a number, the spacing in
-// 64ths of a pixel, the text as UTF-8 in hexadecimal. FILE gets, as numbers of 4 bytes, the highest first, the
-// count of glyphs, then of each its left, top, width, height, line, word, cluster, and its coverage.
+// Each line of LIST is: FILE SIZE ALIGN LINE_HEIGHT LETTER_SPACING TEXT, the align as a number, the
+// spacing in 64ths of a pixel, the text as UTF-8 in hexadecimal. FILE gets, as numbers of 4 bytes, the
+// highest first, the count of glyphs, then of each its left, top, width, height, line, word, cluster,
+// and its coverage.
 #include <cstdint>
 #include <fstream>
 #include <initializer_list>

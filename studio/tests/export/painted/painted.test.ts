@@ -1,9 +1,9 @@
 import { execFileSync } from 'node:child_process';
-import { mkdirSync, readFileSync, writeFileSync } from 'node:fs';
+import { mkdirSync, readFileSync, symlinkSync, writeFileSync } from 'node:fs';
 import { join } from 'node:path';
 import { beforeAll, describe, expect, it } from 'vitest';
 import type { ExportEngine, ExportName } from '../../../src/export';
-import { exporters, patternPictures } from '../../../src/export';
+import { exporters, patternFiles, patternPictures } from '../../../src/export';
 import { isPlainStack, patternNames, placedLooks, spansOf } from '../../../src/export/looks';
 import type { Work } from '../../../src/model/work';
 import { handMade, presetWorks } from '../samples';
@@ -17,6 +17,7 @@ import { handMade, presetWorks } from '../samples';
  *   VOREL_PYTHON    a Python that has the package
  *   VOREL_JAVA      the face of Java: the classes and the folders of the native libraries
  *   VOREL_FONT      the file of the samples' font
+ *   VOREL_PACKAGES  the node_modules in which the package of JavaScript is; without it, it is left out
  */
 const { VOREL_EXPORTS: folder = '', VOREL_BUILD: build = '' } = process.env;
 const root = new URL('../../../..', import.meta.url).pathname;
@@ -288,6 +289,16 @@ function bytesOf(name: string, kind: string): Buffer {
     return readFileSync(join(folder, `${name}${kind}.rgba`));
 }
 
+function runJavaScript(): void {
+    symlinkSync(process.env.VOREL_PACKAGES ?? '', join(folder, 'node_modules'));
+    const files = names.map((name) => {
+        const { style } = works.get(name) as Work;
+        return [name, Object.fromEntries(patternFiles(style))];
+    });
+    write('patterns.json', JSON.stringify(Object.fromEntries(files)));
+    run('node', [join(here, 'run_javascript.mjs'), folder, process.env.VOREL_FONT ?? '']);
+}
+
 describe.skipIf(folder === '')('an export', () => {
     beforeAll(async () => {
         await exportAll();
@@ -310,6 +321,16 @@ describe.skipIf(folder === '')('an export', () => {
         const other = names.filter((name) => !painted(name).equals(bytesOf(name, '.straight')));
         expect(other).toEqual([]);
     });
+    it.skipIf(process.env.VOREL_PACKAGES === undefined)(
+        'for javascript paints the very bytes',
+        () => {
+            runJavaScript();
+            const painted = (name: string): Buffer => bytesOf(name, '.javascript');
+            const other = names.filter((name) => !painted(name).equals(bytesOf(name, '.straight')));
+            expect(other).toEqual([]);
+        },
+        60_000,
+    );
     it('is not all of clear pixels', () => {
         const clear = names.filter((name) => bytesOf(name, '').every((byte) => byte === 0));
         expect(clear).toEqual([]);

@@ -1,7 +1,8 @@
 """Paints every case of FOLDER/cases.json, and runs what was exported for Python: reference.py FOLDER
 
-Of each case it writes NAME.rgba, premultiplied, and NAME.straight.rgba; of the exported program and
-the exported command, which run in FOLDER/NAME, NAME.python.rgba and NAME.command.rgba, straight; of all pages.txt: NAME WIDTH HEIGHT X Y.
+Of each case it writes NAME.rgba, premultiplied, and NAME.straight.rgba; of the exported program and the
+exported command, which run in FOLDER/NAME, NAME.python.rgba and NAME.command.rgba, straight; of all cases
+pages.txt: NAME WIDTH HEIGHT X Y.
 """
 
 import base64

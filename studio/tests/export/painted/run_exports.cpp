@@ -1,7 +1,7 @@
 // Paints every case by its exports for look.h, for the classes and for C: run_exports FOLDER
 //
-// FOLDER has the pages (pages.txt: NAME WIDTH HEIGHT X Y in each line), NAME.masks and NAME.patterns, and gets
-// NAME.cpp-look.rgba, NAME.cpp-classes.rgba and NAME.c.rgba, premultiplied.
+// FOLDER has the pages (pages.txt: NAME WIDTH HEIGHT X Y in each line), NAME.masks and NAME.patterns,
+// and gets NAME.cpp-look.rgba, NAME.cpp-classes.rgba and NAME.c.rgba, premultiplied.
 #include <cstdint>
 #include <cstring>
 #include <fstream>
@@ -102,7 +102,8 @@ void paintRun(VFEffect& effects, const ClassLook& look, const std::vector<Glyph>
         VFGlyph mask = {const_cast<unsigned char*>(glyph.coverage),
                         static_cast<unsigned short>(glyph.width),
                         static_cast<unsigned short>(glyph.height)};
-        effects.renderEffectLayer(page.x + look.offsetX + glyph.x, page.y + look.offsetY + glyph.y, &mask);
+        effects.renderEffectLayer(page.x + look.offsetX + glyph.x, page.y + look.offsetY + glyph.y,
+                                  &mask);
     }
     effects.doEffectPostProcessing();
     effects.compositeLayers(&picture);
@@ -117,11 +118,10 @@ void paintClasses(const std::vector<ClassLook>& looks, const Text& text, const P
     for (const ClassLook& look : looks) {
         VFEffect effects;
         look.add(effects);
-        const std::map<std::string, std::vector<std::vector<Glyph>>> parts = {
-            {"block", {text.glyphs}},
-            {"line", text.lines},
-            {"word", text.words},
-            {"glyph", text.letters}};
+        const std::map<std::string, std::vector<std::vector<Glyph>>> parts = {{"block", {text.glyphs}},
+                                                                              {"line", text.lines},
+                                                                              {"word", text.words},
+                                                                              {"glyph", text.letters}};
         for (const std::vector<Glyph>& run : parts.at(look.span))
             paintRun(effects, look, run, page, pixels);
     }
@@ -139,8 +139,8 @@ class CText {
             mPatterns.push_back({pixels.data, pixels.width, pixels.height, pixels.stride});
     }
     c_text get() const {
-        return {mGlyphs.data(),  mGlyphs.size(),   mLines.data(),   mLines.size(),   mWords.data(),
-                mWords.size(),   mLetters.data(),  mLetters.size(), mPatterns.data()};
+        return {mGlyphs.data(), mGlyphs.size(),  mLines.data(),   mLines.size(),   mWords.data(),
+                mWords.size(),  mLetters.data(), mLetters.size(), mPatterns.data()};
     }
 
   private:
