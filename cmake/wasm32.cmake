@@ -24,4 +24,5 @@ endforeach()
 # The stack first: one that overflows then meets the end of memory, and not the program's data.
 set(CMAKE_EXE_LINKER_FLAGS_INIT "-Wl,-z,stack-size=262144 -Wl,--stack-first")
 set(BUILD_SHARED_LIBS OFF CACHE BOOL "There are no shared libraries" FORCE)
+set(VOREL_SYSTEM_FONTS OFF CACHE BOOL "There are no installed fonts" FORCE)
 set(VOREL_INSTALL OFF CACHE BOOL "Nothing is installed")

@@ -1,6 +1,6 @@
 # shellcheck shell=bash
 # To be sourced, behind quietly.sh: install_library installs the library for what is built against it,
-# python_with_the_package the package of Python.
+# python_with_the_package the package of Python, project_with_the_package that of JavaScript.
 
 # install_library: says where it is
 install_library() {
@@ -15,4 +15,12 @@ python_with_the_package() {
     local python=$PWD/build/python-venv/bin/python
     [[ -x $python ]] || quietly scripts/python.sh
     echo "$python"
+}
+
+# project_with_the_package: says which folder has the package of JavaScript; that of scripts/js.sh, which runs where it
+# has not
+project_with_the_package() {
+    local project=$PWD/build/js-consumer
+    [[ -f $project/node_modules/voreleffect/package.json ]] || quietly scripts/js.sh
+    echo "$project"
 }

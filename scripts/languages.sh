@@ -1,7 +1,8 @@
 #!/usr/bin/env bash
-# The same look in six languages: builds the programs of examples/languages against what users install, runs each and
+# The same look in seven languages: builds the programs of examples/languages against what users install, runs each and
 # compares the pages that they have painted, byte for byte; the picture is that of docs/languages.md. The faces of
-# Java and of Python are those that scripts/android_test.sh and scripts/python.sh have built; else they are built now.
+# Java, of Python and of JavaScript are those that scripts/android_test.sh, scripts/python.sh and scripts/js.sh have
+# built; else they are built now.
 #
 #     scripts/languages.sh [--update]    --update takes the picture into docs/languages instead of comparing it
 set -euo pipefail
@@ -22,6 +23,7 @@ mkdir -p "$pages"
 prefix=$(install_library)
 quietly scripts/android_test.sh --build
 python=$(python_with_the_package)
+project=$(project_with_the_package)
 
 library=$(dirname "$(find "$prefix" -name libvoreleffect.so)")
 export PKG_CONFIG_PATH=$library/pkgconfig
@@ -48,6 +50,11 @@ in_python() {
     "$python" -B "$programs/title.py" "$1"
 }
 
+in_javascript() {
+    cp "$programs/title.mjs" "$project"
+    node "$project/title.mjs" "$1"
+}
+
 in_java() {
     quietly javac -Xlint:all -Werror -cp "$classes" -d "$build/java" "$programs/Title.java"
     run_java "$build/java" Title "$1"
@@ -64,7 +71,7 @@ in_rust() {
     "$build/rust" "$1"
 }
 
-for language in cpp c python java kotlin rust; do
+for language in cpp c python javascript java kotlin rust; do
     "in_$language" "$pages/$language.rgba"
     cmp "$pages/cpp.rgba" "$pages/$language.rgba"
     echo "$language: $(sha256sum < "$pages/$language.rgba" | cut -c -16)"

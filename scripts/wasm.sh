@@ -13,6 +13,8 @@ cd "$(dirname "$0")/.."
 
 need_packages cmake ninja-build clang-19 lld-19 llvm-19 libc++-19-dev-wasm32 libclang-rt-19-dev-wasm32 wasi-libc
 
+scripts/wasm_libraries.sh
+
 # build PRESET
 build() {
     cmake --preset "$1" > /dev/null

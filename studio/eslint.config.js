@@ -3,7 +3,7 @@ import prettier from 'eslint-config-prettier';
 import tseslint from 'typescript-eslint';
 
 export default tseslint.config(
-    { ignores: ['dist/', 'node_modules/', 'public/', 'test-results/'] },
+    { ignores: ['dist/', 'node_modules/', 'public/fonts/', 'test-results/'] },
     js.configs.recommended,
     {
         files: ['**/*.{ts,tsx}'],
@@ -20,7 +20,19 @@ export default tseslint.config(
     },
     {
         files: ['*.js', 'build/**/*.js'],
-        languageOptions: { globals: { console: 'readonly', process: 'readonly' } },
+        languageOptions: { globals: { URL: 'readonly', process: 'readonly' } },
+    },
+    {
+        files: ['public/service_worker.js'],
+        languageOptions: {
+            globals: {
+                self: 'readonly',
+                caches: 'readonly',
+                Request: 'readonly',
+                URL: 'readonly',
+                fetch: 'readonly',
+            },
+        },
     },
     prettier,
 );

@@ -161,7 +161,7 @@ constexpr std::array<EffectKind, std::variant_size_v<Effect>> kEffectKinds{{
     {"text", kTextType, readTextFill},
 }};
 
-const EffectKind* kindNamed(std::string_view name) {
+auto kindNamed(std::string_view name) {
     return std::find_if(kEffectKinds.begin(), kEffectKinds.end(),
                         [=](const EffectKind& each) { return each.name == name; });
 }
@@ -181,8 +181,8 @@ int effectType(const Effect& effect) {
 }
 
 std::string_view effectName(int type) {
-    const auto* kind = std::find_if(kEffectKinds.begin(), kEffectKinds.end(),
-                                    [=](const EffectKind& each) { return each.type == type; });
+    const auto kind = std::find_if(kEffectKinds.begin(), kEffectKinds.end(),
+                                   [=](const EffectKind& each) { return each.type == type; });
     return kind == kEffectKinds.end() ? "" : kind->name;
 }
 

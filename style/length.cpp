@@ -1,6 +1,6 @@
 #include "style/length.h"
 
-#include <charconv>
+#include <limits>
 
 namespace vorelstyle {
 namespace {
@@ -16,7 +16,7 @@ size_t takeDigits(std::string_view& text) {
     return count;
 }
 
-/// Whether the text is a number of the one spelling, such as -12.5; from_chars knows others, too.
+/// Whether the text is a number of the one spelling, such as -12.5.
 bool isNumeral(std::string_view text) {
     if (!text.empty() && text.front() == '-') text.remove_prefix(1);
     const bool startsWithZero = !text.empty() && text.front() == '0';
@@ -27,6 +27,23 @@ bool isNumeral(std::string_view text) {
     text.remove_prefix(1);
     const size_t decimals = takeDigits(text);
     return text.empty() && decimals >= 1 && decimals <= kMostDecimals;
+}
+
+/// What such a numeral says. Whole digits and tens are exact in double precision as far as any length
+/// goes, so that the quotient is the nearest number to what is written, and is so as a float as well:
+/// with three decimals nothing lies close enough to the middle of two floats for the two roundings to
+/// part.
+double valueOf(std::string_view numeral) {
+    double digits = 0;
+    double tens = 1;
+    bool isFraction = false;
+    for (const char each : numeral) {
+        if (each == '.') isFraction = true;
+        if (each < '0' || each > '9') continue;
+        digits = digits * 10 + (each - '0');
+        if (isFraction) tens *= 10;
+    }
+    return (numeral.front() == '-' ? -digits : digits) / tens;
 }
 
 /// Takes the suffix off the end of the text, where it stands there.
@@ -46,8 +63,10 @@ std::optional<Length> parseLength(std::string_view text) {
         return std::nullopt;
     }
     if (!isNumeral(text)) return std::nullopt;
-    const auto [end, error] = std::from_chars(text.data(), text.data() + text.size(), length.value);
-    if (error != std::errc{}) return std::nullopt;  // more than a float holds
+    const double value = valueOf(text);
+    constexpr double kLargest = std::numeric_limits<float>::max();
+    if (value < -kLargest || value > kLargest) return std::nullopt;
+    length.value = static_cast<float>(value);
     return length;
 }
 

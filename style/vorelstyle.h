@@ -11,7 +11,6 @@
 #include "style/nearest.h"
 #include "style/note.h"
 #include "style/pattern_image.h"
-#include "style/presets.h"
 #include "style/resolved_style.h"
 #include "style/stack.h"
 #include "style/style.h"
@@ -35,9 +34,9 @@
 /// there is none, styles with a pattern are refused.
 ///
 /// docs/style-files.md lists every key of a style file, vorelpaint-style.schema.json says the same to
-/// editors, and presets/ has style files to start from.
+/// editors, and presets/ has style files to start from; presets.h, by itself, lists such a directory.
 ///
-/// Nothing is printed, no file is opened but the directory of presetNames, and no state is kept between
+/// Nothing is printed, no file is opened but the directory of presets.h, and no state is kept between
 /// calls: threads may use the library at once, each with objects of its own. What is wrong with a style
 /// throws StyleError; memory that runs out throws std::bad_alloc. Texts are UTF-8.
 namespace vorelstyle {}

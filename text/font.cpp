@@ -68,6 +68,7 @@ Font& Font::operator=(Font&& other) noexcept {
     std::swap(mPicturePpem, other.mPicturePpem);
     std::swap(mSizePx, other.mSizePx);
     mName.swap(other.mName);
+    mFamily.swap(other.mFamily);
     std::swap(mAscender, other.mAscender);
     std::swap(mDescender, other.mDescender);
     std::swap(mLineHeight, other.mLineHeight);
@@ -88,7 +89,8 @@ void Font::open(const Source& source, const std::vector<FontVariation>& variatio
         if (mLineHeight <= 0 || mAscender <= mDescender) {
             throw TextError(source.subject + "a font without vertical metrics");
         }
-        mName = mFace->family_name == nullptr ? "unnamed" : mFace->family_name;
+        mFamily = mFace->family_name == nullptr ? "unnamed" : mFace->family_name;
+        mName = mFamily;
         if (mFace->style_name != nullptr) mName.append(" ").append(mFace->style_name);
     } catch (...) {
         FT_Done_FreeType(mLibrary);

@@ -50,6 +50,7 @@ class Font {
 
     int sizePx() const { return mSizePx; }
     const std::string& name() const { return mName; }  ///< family and style, "DejaVu Sans Bold"
+    const std::string& family() const { return mFamily; }
 
     /// The font's own, for its size, in 64ths of a pixel and whole pixels: how far its letters reach
     /// above the baseline, below it (negative), and from one baseline to the next.
@@ -85,6 +86,7 @@ class Font {
     int mPicturePpem = 0;
     int mSizePx;
     std::string mName;
+    std::string mFamily;
     long mAscender = 0;
     long mDescender = 0;
     long mLineHeight = 0;

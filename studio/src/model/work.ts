@@ -16,12 +16,12 @@ export interface Work {
     markup: boolean;
     /** Id of a shipped font, or the name of the person's own. */
     font: string;
-    /** In pixels, 1 to 1000. */
+    /** Whole pixels, 1 to 1000. */
     size: number;
     align: Align;
-    /** In line heights of the font: 1 is the font's own. */
+    /** In line heights of the font, 0.5 to 10: 1 is the font's own. */
     lineHeight: number;
-    /** Pixels, or percent of the size: '0', '2', '5%'. */
+    /** Pixels, or percent of the size: '0', '2', '5%'; 200 at most to either side. */
     letterSpacing: string;
     /** Version 2, always with `looks`. */
     style: StyleFile;
@@ -29,7 +29,7 @@ export interface Work {
     patterns: Record<string, PatternPixels>;
     /** Of the text: 1 leaves each look its own. */
     opacity: number;
-    /** Pixels around the ink and its effects. */
+    /** Pixels around the ink and its effects, 0 to 1000. */
     padding: number;
     /** 'transparent', 'checkerboard', 'picture' or '#rrggbb'. */
     background: string;
@@ -48,6 +48,7 @@ export const firstWork: Work = {
         version: 2,
         looks: [
             {
+                description: 'Edge and shadow',
                 color: '#1B2A6B',
                 outerShadow: {
                     angle: 120,
@@ -59,6 +60,7 @@ export const firstWork: Work = {
                 stroke: { size: '6%', color: '#1B2A6B', position: 'outside' },
             },
             {
+                description: 'Sunset',
                 span: 'line',
                 linearGradient: {
                     angle: 90,

@@ -1,0 +1,33 @@
+// Builds the package into dist: the compiled sources, the modules, and the modules in base64.
+//
+//     node build.mjs [FOLDER_OF_THE_MODULES]
+import { spawnSync } from 'node:child_process';
+import { copyFileSync, existsSync, readFileSync, rmSync, writeFileSync } from 'node:fs';
+import { createRequire } from 'node:module';
+import { dirname, join } from 'node:path';
+
+process.chdir(import.meta.dirname);
+const root = '../..';
+const folder = process.argv[2] ?? join(root, 'build/wasm32-module/bindings/js/module');
+
+/** A module and the entry of the package that takes it. */
+const modules = [
+    { name: 'voreleffect', entry: 'index' },
+    { name: 'voreleffect-text', entry: 'text' },
+];
+
+/** The module as a source file, which engines parse as one string. */
+function inlined(file) {
+    return `export const base64 = '${readFileSync(file).toString('base64')}';\n`;
+}
+
+rmSync('dist', { recursive: true, force: true });
+const compiler = join(dirname(createRequire(import.meta.url).resolve('typescript')), 'tsc.js');
+const { status } = spawnSync(process.execPath, [compiler, '--project', '.'], { stdio: 'inherit' });
+if (status !== 0) process.exit(1);
+for (const { name } of modules.filter(({ entry }) => existsSync(`src/${entry}.ts`))) {
+    const file = join(folder, `${name}.wasm`);
+    copyFileSync(file, `dist/${name}.wasm`);
+    writeFileSync(`dist/${name.replaceAll('-', '_')}_bytes.js`, inlined(file));
+}
+for (const name of ['LICENSE', 'NOTICE']) copyFileSync(join(root, name), name);

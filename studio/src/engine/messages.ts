@@ -1,0 +1,95 @@
+import type { Exported } from '../export';
+import type { PatternPixels, Work } from '../model/work';
+import type { StyleFile } from '../model/style_file';
+
+/** What the page and the worker say to one another. Coordinates are pixels of the picture, y downwards. */
+
+/** Half-open. */
+export interface Box {
+    left: number;
+    top: number;
+    right: number;
+    bottom: number;
+}
+
+/** A painted work; its pixels are red, green, blue and straight alpha. */
+export interface Painted {
+    data: Uint8ClampedArray<ArrayBuffer>;
+    width: number;
+    height: number;
+    /** Milliseconds of layout and painting in the worker. */
+    milliseconds: number;
+    margins: Box;
+    ink: Box;
+    /** What gradients and patterns fill. */
+    box: Box;
+    baseline: number;
+    /** Characters that no font has. */
+    missing: string[];
+    notes: string[];
+    fonts: string[];
+}
+
+export interface Step {
+    effect: string;
+    place: string;
+    reason: string;
+    milliseconds?: number;
+}
+
+/** The order of painting, the topmost step first, and the cache key as readable fragments. */
+export interface Facts {
+    looks: { layered: boolean; reason: string; place: string; order: Step[] }[];
+    key: { name: string; meaning: string }[];
+    keyBytes: number;
+    lines: { baseline: number; box: Box }[];
+}
+
+/** One step of painting alone, of the size of the picture; straight alpha. */
+export interface Layer {
+    look: number;
+    effect: string;
+    place: string;
+    milliseconds: number;
+    data: Uint8ClampedArray<ArrayBuffer>;
+    width: number;
+    height: number;
+}
+
+/** The work in another language, by an exporter of the page. */
+export interface Code extends Exported {
+    format: string;
+    label: string;
+}
+
+export interface NamedFile {
+    name: string;
+    bytes: Uint8Array<ArrayBuffer>;
+}
+
+/** What each kind of question carries and is answered with. */
+export interface Calls {
+    paint: { ask: { work: Work }; answer: Painted };
+    /** As paint, of a work beside the one that is made. */
+    sample: { ask: { work: Work }; answer: Painted };
+    facts: { ask: { work: Work }; answer: Facts };
+    layers: { ask: { work: Work }; answer: Layer[] };
+    png: {
+        ask: { work: Work; scale: number };
+        answer: { bytes: Uint8Array<ArrayBuffer>; notes: string[] };
+    };
+    exports: { ask: { work: Work }; answer: Code[] };
+    /** Whether the engine reads the style: it answers as it was asked, or with an error. */
+    style: { ask: { style: StyleFile; patterns: Record<string, PatternPixels> }; answer: null };
+    font: { ask: NamedFile; answer: { family: string } };
+    pattern: { ask: NamedFile; answer: PatternPixels };
+}
+
+export type CallName = keyof Calls;
+
+export type Ask<Name extends CallName = CallName> = {
+    [Key in Name]: { id: number; call: Key } & Calls[Key]['ask'];
+}[Name];
+
+/** `dead` when the engine cannot go on: the worker is to be started anew. */
+export type Answer = { id: number; value: unknown } | { id: number; error: string; dead: boolean };
