@@ -13,13 +13,14 @@ cd "$(dirname "$0")/.."
 
 need_packages cmake ninja-build g++ pkg-config libfreetype-dev libfribidi-dev libharfbuzz-dev libunibreak-dev \
     libfontconfig-dev libpng-dev libdeflate-dev nlohmann-json3-dev libcli11-dev openjdk-17-jdk-headless \
-    python3-numpy python3-pil fonts-dejavu-core npm
+    python3-numpy python3-pil fonts-dejavu-core
+command -v npm > /dev/null || need_packages nodejs npm
 
 [[ -f build/release/build.ninja ]] || quietly cmake --preset release
 quietly cmake --build --preset release --target vorelpaint
 java=$PWD/build/android_tests/voreleffect
 [[ -f $java/android/libvoreleffect_jni.so ]] || quietly scripts/android_test.sh --build
-[[ -d studio/node_modules ]] || (cd studio && quietly npm ci)
+[[ -d studio/node_modules ]] || (cd studio && quietly npm ci --ignore-scripts --no-audit --no-fund)
 
 export VOREL_EXPORTS=$PWD/build/exports VOREL_BUILD=$PWD/build/release
 export VOREL_PYTHON=${VOREL_PYTHON:-$(python_with_the_package)}
