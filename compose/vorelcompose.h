@@ -8,9 +8,13 @@
 #include "compose/layer_set.h"
 #include "compose/limits.h"
 #include "compose/note.h"
+#include "compose/painting_steps.h"
+#include "compose/plan.h"
 #include "compose/request.h"
 #include "compose/set_text.h"
 #include "compose/shelf.h"
+#include "compose/step_pictures.h"
+#include "compose/stepped_run.h"
 #include "compose/workbench.h"
 
 /// From what is asked of one picture to the picture: a text in its fonts, the looks of a style, and the

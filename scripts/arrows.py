@@ -7,7 +7,8 @@
 
 A room includes its own files, the rooms below it (BELOW) and the public headers that it is for
 (PUBLIC). No room but simd/ asks the preprocessor for a level of the instruction set; ALLOWED_TO_ASK
-lists the files that may, with the reason.
+lists the files that may, with the reason. Rooms that are built without files (FILELESS) include no header of
+files, of fontconfig or of the console.
 """
 import pathlib
 import re
@@ -80,6 +81,13 @@ PUBLIC = {
     "examples": ALL_PUBLIC,
     "include": CLASSES,
 }
+
+# Rooms that are built where there are no files, no installed fonts and no console.
+FILELESS = ("style", "text", "compose", "unicode")
+OF_FILES = re.compile(
+    r"\s*#\s*include\s*<(filesystem|fstream|iostream|fcntl\.h|unistd\.h|dirent\.h|sys/[^>]*|fontconfig/[^>]*|png\.h)>")
+# The part of text/ that finds installed fonts.
+WITH_FILES = ("text/font_coverage.", "text/fontconfig.", "text/system_fonts.")
 
 # These may include anything.
 FREE = ("tests", "bench", "fuzz", "android")
@@ -193,6 +201,9 @@ def faults(root):
                 fault = fault_of_include(root, path, include.group(1) or include.group(2))
                 if fault:
                     found.append(f"{path}:{number}: {fault}")
+            header = OF_FILES.match(line)
+            if header and room in FILELESS and not path.startswith(WITH_FILES):
+                found.append(f"{path}:{number}: includes <{header.group(1)}>: {room}/ opens no file and prints nothing")
             if asks and CONDITION.match(line):
                 found.extend(f"{path}:{number}: asks for {name}: levels are chosen in simd/ alone"
                              for name in sorted(set(LEVEL.findall(line))))
@@ -254,6 +265,11 @@ CASES = [
     ({"compose/picture.h": '#include "compose/system/files.h"\n'}, ["compose/picture.h:1: ", "compose/system/"]),
     ({"compose/picture.h": '#include "tools/part.h"\n'}, ["compose/picture.h:1: ", "tools/"]),
     ({"bindings/python/module.cpp": '#include "tools/part.h"\n'}, ["bindings/python/module.cpp:1: ", "tools/"]),
+    ({"style/look.h": "#include <filesystem>\n"}, ["style/look.h:1: ", "opens no file"]),
+    ({"compose/picture.h": "#pragma once\n#include <iostream>\n"}, ["compose/picture.h:2: ", "prints nothing"]),
+    ({"text/font.h": "#include <fontconfig/fontconfig.h>\n"}, ["text/font.h:1: ", "opens no file"]),
+    ({"text/system_fonts.cpp": "#include <fontconfig/fontconfig.h>\n"}, []),
+    ({"compose/system/files.h": "#include <filesystem>\n"}, []),
     ({"unicode/utf8.h": '#include "text/font.h"\n'}, ["unicode/utf8.h:1: ", "text/"]),
     ({"text/font.h": '#include "core/box.h"\n'}, ["text/font.h:1: ", "core/"]),
     ({"tools/part.h": '#include "core/box.h"\n'}, ["tools/part.h:1: ", "core/"]),

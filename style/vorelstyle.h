@@ -34,9 +34,9 @@
 /// there is none, styles with a pattern are refused.
 ///
 /// docs/style-files.md lists every key of a style file, vorelpaint-style.schema.json says the same to
-/// editors, and presets/ has style files to start from; presets.h, by itself, lists such a directory.
+/// editors, and presets/ has style files to start from.
 ///
-/// Nothing is printed, no file is opened but the directory of presets.h, and no state is kept between
+/// Nothing is printed, no file is opened, and no state is kept between
 /// calls: threads may use the library at once, each with objects of its own. What is wrong with a style
 /// throws StyleError; memory that runs out throws std::bad_alloc. Texts are UTF-8.
 namespace vorelstyle {}

@@ -6,6 +6,7 @@
 #include "text/fonts.h"
 #include "text/glyph_mask.h"
 #include "text/image.h"
+#include "text/layer_painter.h"
 #include "text/layers.h"
 #include "text/overlay.h"
 #include "text/run.h"

@@ -39,14 +39,14 @@ class MeasuredRunTest : public ::testing::Test {
     /// The run in steps paints what the run in one paints, in the order in which the set is planned.
     void expectThePlannedPicture(const Style& style, float opacity, size_t at = 0) {
         Look look(style.looks[at], 0x336699, opacity, imagesOf(style));
-        const Plan plan = planOf(look);
+        const LookPlan plan = planOf(look);
         const std::vector<int> planned = plannedOrder(look);
         Image inSteps;
         measuredRun(look, plan, frameOf(look), glyphs(), &inSteps);
         const Image inOne = paint(look.effects(), mText, 3);
         EXPECT_EQ(inSteps.width, inOne.width);
         EXPECT_EQ(inSteps.pixels, inOne.pixels);
-        EXPECT_EQ(withoutPattern(plan.order), planned);
+        EXPECT_EQ(withoutPattern(typesOf(plan)), planned);
     }
 
     /// The order of the key after planning, which follows the set's list.
@@ -57,6 +57,13 @@ class MeasuredRunTest : public ::testing::Test {
         std::vector<int> types;
         for (const KeyFragment& fragment : vorelstyle::keyFragments(key.get()))
             types.push_back(fragment.type);
+        return types;
+    }
+
+    static std::vector<int> typesOf(const LookPlan& plan) {
+        std::vector<int> types;
+        for (const PlannedEffect& planned : plan.effects)
+            types.push_back(planned.type);
         return types;
     }
 
@@ -87,27 +94,6 @@ TEST_F(MeasuredRunTest, TextAmongTheEffects_IsPaintedInItsPlace) {
                            "outerGlow": {"size": 9, "color": "#00FF00"}})";
     expectThePlannedPicture(parseStyle(json), 1);
     expectThePlannedPicture(parseStyle(json), 0.3F);
-}
-
-TEST_F(MeasuredRunTest, Plan_PutsWhatLiesBeneathBehindTheText) {
-    const Look look(
-        parseStyle(R"({"outerShadow": {"angle": 0, "distance": 1, "size": 1, "color": "#000000"},
-                       "innerShadow": {"angle": 0, "distance": 1, "size": 1, "color": "#000000"},
-                       "stroke": {"size": 1, "color": "#000000", "position": "outside"}})")
-            .looks.front(),
-        0, 1);
-    const Plan plan = planOf(look);
-    EXPECT_FALSE(plan.layered);
-    EXPECT_EQ(plan.order, (std::vector<int>{2, 12, 10, 1}));
-    EXPECT_EQ(plan.under, (std::vector<bool>{false, false, true, true}));
-}
-
-TEST_F(MeasuredRunTest, Plan_IsLayeredForTranslucentTextAndCentredStrokes) {
-    const Style centred =
-        parseStyle(R"({"stroke": {"size": 1, "color": "#000000", "position": "center"}})");
-    EXPECT_FALSE(planOf(Look({}, 0, 1)).layered);
-    EXPECT_TRUE(planOf(Look({}, 0, 0.99F)).layered);
-    EXPECT_TRUE(planOf(Look(centred.looks.front(), 0, 1)).layered);
 }
 
 TEST_F(MeasuredRunTest, Memory_IsThatOfTheLayersAndOneEffect) {

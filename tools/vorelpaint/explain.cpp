@@ -5,7 +5,6 @@
 #include <cstdio>
 #include <string>
 #include <utility>
-#include <variant>
 #include <vector>
 
 #include "measured_run.h"
@@ -16,15 +15,12 @@
 namespace vorelpaint {
 namespace {
 
-using vorelstyle::Effect;
 using vorelstyle::effectName;
 using vorelstyle::KeyFragment;
 using vorelstyle::Look;
-using vorelstyle::LookStyle;
 using vorelstyle::printable;
 using vorelstyle::Stack;
 using vorelstyle::StackedLook;
-using vorelstyle::Stroke;
 using vorelstyle::Style;
 using voreltext::Canvas;
 using voreltext::Frame;
@@ -118,57 +114,39 @@ std::string sizeText(int width, int height) {
     return std::to_string(width) + " x " + std::to_string(height) + " pixels";
 }
 
-std::string layersText(const Look& look, const Plan& plan) {
-    if (!plan.layered) return "one: the text is opaque, and no stroke is centred";
-    VFontEffect::VFEffect effects(look.effects());
-    const std::string reason =
-        effects.getTextOpacity() < 1.0F ? "the text is translucent" : "a stroke is centred on the edge";
-    return "two: " + reason + ", so the paint outside the glyphs has a layer of its own";
-}
-
-bool isCentredStroke(const LookStyle& look, int type) {
-    return type == vorelstyle::kStrokeType &&
-           std::any_of(look.effects.begin(), look.effects.end(), [](const Effect& effect) {
-               const auto* stroke = std::get_if<Stroke>(&effect);
-               return stroke != nullptr && stroke->position == 0;
-           });
-}
-
-std::string placeText(const LookStyle& look, const Plan& plan, size_t at) {
-    const int type = plan.order[at];
-    if (type == vorelstyle::kTextType) return "the text";
-    if (isCentredStroke(look, type)) return "across the edge";
-    if (plan.under[at]) return plan.layered ? "outside the text" : "beneath the text";
-    return "on the text";
+std::string layersText(const LookPlan& plan) {
+    if (!plan.layered) return "one: " + plan.reason;
+    return "two: " + plan.reason + ", so the paint outside the glyphs has a layer of its own";
 }
 
 /// "Order of painting", and of which look where there are several.
-std::string orderHeading(const Stack& stack, size_t at) {
-    const size_t count = stack.looks().size();
+std::string orderHeading(const std::vector<StackedPlan>& plans, size_t at) {
+    const size_t count = plans.size();
     if (count == 1) return "\nOrder of painting, the topmost effect first:\n\n";
-    const auto place = vorelstyle::keyFragments(placeFragment(stack.looks()[at].place));
     return "\nLook " + std::to_string(at + 1) + " of " + std::to_string(count) +
            (at + 1 == count ? ", the topmost: "
             : at == 0       ? ", the lowest: "
                             : ": ") +
-           place.front().meaning + ". Order of painting, the topmost effect first:\n\n";
+           plans[at].place + ". Order of painting, the topmost effect first:\n\n";
 }
 
-std::string orderTable(const LookStyle& look, const Plan& plan) {
+std::string orderTable(const LookPlan& plan) {
     Table table({"effect", "place"});
-    for (size_t i = 0; i < plan.order.size(); ++i)
-        table.add({std::string(effectName(plan.order[i])), placeText(look, plan, i)});
+    for (const PlannedEffect& effect : plan.effects)
+        table.add({std::string(effectName(effect.type)), std::string(placeName(effect.place))});
     return table.text();
 }
 
-std::string costTable(const LookStyle& look, const Plan& plan, const MeasuredRun& run) {
+std::string costTable(const LookPlan& plan, const MeasuredRun& run) {
     Table table({"step", "place", "time", "memory"});
     const auto add = [&](const std::string& step, const std::string& place, const Cost& cost) {
         table.add({step, place, timeText(cost), memoryText(cost.bytes)});
     };
     add("glyphs", "the mask", run.glyphs);
-    for (size_t i = 0; i < plan.order.size(); ++i)
-        add(std::string(effectName(plan.order[i])), placeText(look, plan, i), run.effects[i]);
+    for (size_t i = 0; i < plan.effects.size(); ++i) {
+        const PlannedEffect& effect = plan.effects[i];
+        add(std::string(effectName(effect.type)), std::string(placeName(effect.place)), run.effects[i]);
+    }
     add("merge", "the picture", run.merge);
     add("whole run", "", run.whole);
     return table.text();
@@ -210,7 +188,7 @@ std::vector<RunOfGlyphs> runsOf(const TextLayout& text, const voreltext::Layer& 
     return runs;
 }
 
-MeasuredRun measure(const Look& look, const Plan& plan, const std::vector<RunOfGlyphs>& glyphs) {
+MeasuredRun measure(const Look& look, const LookPlan& plan, const std::vector<RunOfGlyphs>& glyphs) {
     Progress progress("runs measured", 0);
     const Clock::time_point end = Clock::now() + kMeasuringTime;
     std::vector<MeasuredRun> runs;
@@ -232,7 +210,7 @@ std::string textText(const Composition& composition) {
 std::string looksText(const Stack& stack) {
     const std::vector<StackedLook>& looks = stack.looks();
     if (looks.size() > 1) return entry("looks", std::to_string(looks.size()) + ", the last on top");
-    return entry("layers", layersText(looks.front().look, planOf(looks.front().look)));
+    return entry("layers", layersText(planOf(looks.front().look)));
 }
 
 std::string headText(const Options& options, const LayerSet& looks, const Margins& margins) {
@@ -249,13 +227,13 @@ std::string fontsText(const TextLayout& text) {
 
 /// What is told of each look, the topmost first; `table` tells how it is painted.
 template <typename MakeTable>
-std::string looksExplained(const LayerSet& looks, MakeTable table) {
-    const std::vector<StackedLook>& stacked = looks.stack().looks();
+std::string looksExplained(const Stack& stack, MakeTable table) {
+    const std::vector<StackedPlan> plans = plansOf(stack);
     std::string text;
-    for (size_t at = stacked.size(); at-- > 0;) {
-        const Plan plan = planOf(stacked[at].look);
-        text += orderHeading(looks.stack(), at) + table(at, plan);
-        if (stacked.size() > 1) text += "\n  Layers: " + layersText(stacked[at].look, plan) + "\n";
+    for (size_t at = plans.size(); at-- > 0;) {
+        const LookPlan& plan = plans[at].look;
+        text += orderHeading(plans, at) + table(at, plan);
+        if (plans.size() > 1) text += "\n  Layers: " + layersText(plan) + "\n";
     }
     return text;
 }
@@ -264,9 +242,8 @@ std::string looksExplained(const LayerSet& looks, MakeTable table) {
 
 std::string explanationOf(const Options& options, const LayerSet& looks) {
     return headText(options, looks, marginsOf(looks.layers())) +
-           looksExplained(
-               looks,
-               [&](size_t at, const Plan& plan) { return orderTable(looks.style().looks[at], plan); }) +
+           looksExplained(looks.stack(),
+                          [](size_t /*at*/, const LookPlan& plan) { return orderTable(plan); }) +
            keyText(looks.stack());
 }
 
@@ -278,11 +255,11 @@ std::string explanationOf(const Options& options, const Composition& composition
            entry("fonts", fontsText(text)) +
            entry("ink", sizeText(text.inkBox().width(), text.inkBox().height())) +
            entry("picture", sizeText(canvas.width, canvas.height)) +
-           looksExplained(looks,
-                          [&](size_t at, const Plan& plan) {
+           looksExplained(looks.stack(),
+                          [&](size_t at, const LookPlan& plan) {
                               const Look& look = looks.stack().looks()[at].look;
                               const auto runs = runsOf(text, looks.layers()[at]);
-                              return costTable(looks.style().looks[at], plan, measure(look, plan, runs));
+                              return costTable(plan, measure(look, plan, runs));
                           }) +
            "\n" + wrapped(kCostsNote, kLineWidth, 0) + "\n" + keyText(looks.stack());
 }

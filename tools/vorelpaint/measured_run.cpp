@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <chrono>
-#include <iterator>
 #include <utility>
 
 #include "memory_meter.h"
@@ -10,30 +9,13 @@
 namespace vorelpaint {
 namespace {
 
-using VFontEffect::VFECore;
-using VFontEffect::VFEffect;
-using VFontEffect::VFStrokeProperty;
-using vorelstyle::kStrokeType;
-using vorelstyle::kTextType;
+using vorelcompose::LookPlan;
+using vorelcompose::SteppedRun;
 using vorelstyle::Look;
 using voreltext::Frame;
 using voreltext::GlyphMask;
 using voreltext::Image;
-using voreltext::Run;
 using Clock = std::chrono::steady_clock;
-
-bool hasCentredStroke(VFEffect& effects) {
-    VFECore* const stroke = effects.getEffect(kStrokeType);
-    return stroke != nullptr && static_cast<VFStrokeProperty*>(stroke->getProperty())->mPosition == 0;
-}
-
-/// The types for which `wanted` holds, those added last first.
-template <typename Test>
-std::vector<int> latestFirst(const std::vector<int>& added, Test wanted) {
-    std::vector<int> types;
-    std::copy_if(added.rbegin(), added.rend(), std::back_inserter(types), wanted);
-    return types;
-}
 
 /// Calls `step` and returns what it takes.
 template <typename Step>
@@ -43,19 +25,6 @@ Cost costOf(Step step) {
     step();
     const std::chrono::duration<double, std::milli> time = Clock::now() - start;
     return {time.count(), meter.peak()};
-}
-
-void removeAll(VFEffect& effects, const std::vector<int>& types) {
-    for (const int type : types)
-        effects.removeEffect(effects.getEffect(type)->getId());
-}
-
-/// Paints one effect of `source` into the run that is under way in `run`, which holds no other.
-Cost paintAlone(VFEffect& run, VFEffect& source, int type) {
-    const int id = run.addEffect(type, source.getEffect(type)->getProperty());
-    const Cost cost = costOf([&] { run.doEffectPostProcessing(); });
-    run.removeEffect(id);
-    return cost;
 }
 
 /// The layers stay throughout; each effect gives its working memory back before the next begins.
@@ -98,47 +67,22 @@ void takeMedian(std::vector<MeasuredRun>& runs, Part part) {
 
 }  // namespace
 
-Plan planOf(const Look& look) {
-    VFEffect planned(look.effects());
-    planned.initEffect(0, 0);
-    Plan plan;
-    plan.layered = planned.getTextOpacity() < 1.0F || hasCentredStroke(planned);
-    const auto isUnder = [&](int type) { return planned.isUnderEffect(planned.getEffect(type)); };
-    const auto isOver = [&](int type) { return type != kTextType && (plan.layered || !isUnder(type)); };
-    // The text fill clips what is painted before it to the glyphs; what lies beneath comes after it.
-    // With a layer for the effects outside the glyphs there is no such limit.
-    plan.order = latestFirst(look.added(), isOver);
-    plan.order.push_back(kTextType);
-    const std::vector<int> beneath =
-        latestFirst(look.added(), [&](int type) { return type != kTextType && !isOver(type); });
-    plan.order.insert(plan.order.end(), beneath.begin(), beneath.end());
-    for (const int type : plan.order)
-        plan.under.push_back(isUnder(type));
-    return plan;
-}
-
-MeasuredRun measuredRun(const Look& look, const Plan& plan, const Frame& frame,
+MeasuredRun measuredRun(const Look& look, const LookPlan& plan, const Frame& frame,
                         const std::vector<GlyphMask>& glyphs, Image* picture) {
-    VFEffect source(look.effects());
-    VFEffect effects(look.effects());
-    Run run(effects, frame);
+    SteppedRun run(look, plan, frame);
     MeasuredRun measured;
-    measured.glyphs = costOf([&] {
-        run.begin();
-        for (const GlyphMask& glyph : glyphs)
-            run.draw(glyph);
-    });
-    // Whether the run is layered is settled now; it stays so without the effects that asked for it.
-    removeAll(effects, plan.order);
-    for (const int type : plan.order)
-        measured.effects.push_back(paintAlone(effects, source, type));
+    measured.glyphs = costOf([&] { run.draw(glyphs); });
+    for (size_t i = 0; i < plan.effects.size(); ++i) {
+        run.choose(i);
+        measured.effects.push_back(costOf([&] { run.paintChosen(); }));
+    }
     measured.merge = costOf([&] { run.merge(); });
     if (picture != nullptr) *picture = run.picture();
     measured.whole = sumOf(measured);
     return measured;
 }
 
-MeasuredRun measuredRuns(const Look& look, const Plan& plan, const std::vector<RunOfGlyphs>& runs) {
+MeasuredRun measuredRuns(const Look& look, const LookPlan& plan, const std::vector<RunOfGlyphs>& runs) {
     MeasuredRun together = measuredRun(look, plan, runs.front().frame, runs.front().masks);
     for (size_t i = 1; i < runs.size(); ++i)
         add(together, measuredRun(look, plan, runs[i].frame, runs[i].masks));

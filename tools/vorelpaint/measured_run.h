@@ -1,24 +1,13 @@
 #pragma once
 
-#include <voreleffect/VFEffect.h>
-
 #include <cstddef>
 #include <vector>
 
+#include "compose/vorelcompose.h"
 #include "style/vorelstyle.h"
 #include "text/voreltext.h"
 
 namespace vorelpaint {
-
-/// How a set of effects paints a run.
-struct Plan {
-    bool layered;             ///< the effects outside the glyphs have a layer of their own
-    std::vector<int> order;   ///< effect types in the order of painting, the topmost first
-    std::vector<bool> under;  ///< for each of them, whether it lies beneath the text
-};
-
-/// The plan of a look. Nothing is painted.
-Plan planOf(const vorelstyle::Look& look);
 
 /// What one step of a run takes.
 struct Cost {
@@ -35,8 +24,8 @@ struct MeasuredRun {
 
 /// Paints a run with each effect on its own, in the order of the plan, into one picture, which goes to
 /// `picture` unless that is null.
-MeasuredRun measuredRun(const vorelstyle::Look& look, const Plan& plan, const voreltext::Frame& frame,
-                        const std::vector<voreltext::GlyphMask>& glyphs,
+MeasuredRun measuredRun(const vorelstyle::Look& look, const vorelcompose::LookPlan& plan,
+                        const voreltext::Frame& frame, const std::vector<voreltext::GlyphMask>& glyphs,
                         voreltext::Image* picture = nullptr);
 
 /// Glyphs that are painted as one run.
@@ -47,7 +36,7 @@ struct RunOfGlyphs {
 
 /// What the runs of a look take together: the time of all, the memory of the one that takes most. There
 /// is at least one.
-MeasuredRun measuredRuns(const vorelstyle::Look& look, const Plan& plan,
+MeasuredRun measuredRuns(const vorelstyle::Look& look, const vorelcompose::LookPlan& plan,
                          const std::vector<RunOfGlyphs>& runs);
 
 /// A run with the median of each time in `runs`, of which there is at least one.

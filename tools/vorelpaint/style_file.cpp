@@ -2,6 +2,7 @@
 
 #include <array>
 
+#include "compose/system/presets.h"
 #include "error.h"
 #include "file_io.h"
 #include "ranges.h"
@@ -59,11 +60,11 @@ LayerSet looksOf(const Options& options, const std::vector<vorelstyle::ColourRan
 }
 
 std::vector<std::string> presetNames() {
-    return vorelstyle::presetNames(presetDir());
+    return vorelcompose::presetNames(presetDir());
 }
 
 fs::path findPreset(const std::string& name) {
-    return vorelstyle::presetFile(presetDir(), name);
+    return vorelcompose::presetFile(presetDir(), name);
 }
 
 }  // namespace vorelpaint

@@ -58,6 +58,35 @@ void writeGlyph(JsonWriter& json, const voreltext::Glyph& glyph, const voreltext
         .endObject();
 }
 
+void writeMargins(JsonWriter& json, const voreltext::Margins& margins) {
+    writeSides(json, "margins", margins.left, margins.top, margins.right, margins.bottom);
+}
+
+void writePlan(JsonWriter& json, const vorelcompose::StackedPlan& plan) {
+    json.beginObject()
+        .entry("layered", plan.look.layered)
+        .entry("reason", plan.look.reason)
+        .entry("place", plan.place)
+        .entry("placeReason", plan.reason);
+    json.key("order").beginArray();
+    for (const vorelcompose::PlannedEffect& effect : plan.look.effects) {
+        json.beginObject()
+            .entry("effect", vorelstyle::effectName(effect.type))
+            .entry("place", placeName(effect.place))
+            .entry("reason", effect.reason)
+            .endObject();
+    }
+    json.endArray().endObject();
+}
+
+void writeKey(JsonWriter& json, const std::string& key) {
+    json.key("key").beginArray();
+    for (const vorelstyle::KeyFragment& fragment : vorelstyle::keyFragments(key)) {
+        json.beginObject().entry("name", fragment.name).entry("meaning", fragment.meaning).endObject();
+    }
+    json.endArray().entry("keyBytes", vorelstyle::hexadecimal(key));
+}
+
 }  // namespace
 
 Answer pictureAnswer(const Composition& composition, bool isPremultiplied,
@@ -66,7 +95,6 @@ Answer pictureAnswer(const Composition& composition, bool isPremultiplied,
     if (!isPremultiplied) layOn(image, background);
     const voreltext::Canvas& canvas = composition.canvas();
     const voreltext::TextLayout& layout = composition.text().layout();
-    const voreltext::Margins& margins = composition.margins();
     JsonWriter json;
     json.beginObject()
         .entry("width", image.width)
@@ -77,7 +105,7 @@ Answer pictureAnswer(const Composition& composition, bool isPremultiplied,
         .entry("baseline", layout.lines().front().baseline + canvas.y);
     writeBox(json, "ink", layout.inkBox(), canvas.x, canvas.y);
     writeBox(json, "box", composition.text().box(), canvas.x, canvas.y);
-    writeSides(json, "margins", margins.left, margins.top, margins.right, margins.bottom);
+    writeMargins(json, composition.margins());
     json.entry("key", vorelstyle::hexadecimal(composition.looks().stack().key()));
     writeText(json, composition);
     json.endObject();
@@ -101,6 +129,25 @@ Answer layoutAnswer(const Composition& composition) {
     writeText(json, composition);
     json.endObject();
     return {json.text(), std::move(bytes)};
+}
+
+Answer planAnswer(const vorelcompose::LayerSet& looks) {
+    JsonWriter json;
+    json.beginObject();
+    writeMargins(json, marginsOf(looks.layers()));
+    json.key("looks").beginArray();
+    for (const vorelcompose::StackedPlan& plan : vorelcompose::plansOf(looks.stack()))
+        writePlan(json, plan);
+    json.endArray();
+    writeKey(json, looks.stack().key());
+    json.endObject();
+    return {json.text(), {}};
+}
+
+Answer imageAnswer(voreltext::Image image) {
+    JsonWriter json;
+    json.beginObject().entry("width", image.width).entry("height", image.height).endObject();
+    return {json.text(), std::move(image.pixels)};
 }
 
 }  // namespace vorelscript

@@ -33,4 +33,12 @@ Answer pictureAnswer(const vorelcompose::Composition& composition, bool isPremul
 /// "box"; and, as of a picture, "ink", "box", "size", "fonts", "missing" and "notes".
 Answer layoutAnswer(const vorelcompose::Composition& composition);
 
+/// How looks are painted: "margins"; "looks", the lowest first, each with "layered" and the "reason" for
+/// it, "place" with "placeReason", and "order", the topmost effect first, of "effect", "place" and
+/// "reason"; "key", the fragments of the key of "name" and "meaning"; and "keyBytes", in hexadecimal.
+Answer planAnswer(const vorelcompose::LayerSet& looks);
+
+/// "width" and "height" of a picture, whose pixels are the bytes.
+Answer imageAnswer(voreltext::Image image);
+
 }  // namespace vorelscript

@@ -28,8 +28,15 @@ voreltext::Font opened(const std::string& name, const voreltext::FontBytes& byte
 ByteFonts::Names ByteFonts::add(const std::string& name, std::vector<uint8_t> bytes, long faceIndex) {
     if (mFiles.count(name) != 0) throw FontError("a font " + quoted(name) + " is there already");
     const voreltext::Font font = opened(name, {bytes.data(), bytes.size(), faceIndex}, kTriedSize, {});
-    mFiles[name] = {std::move(bytes), faceIndex};
+    mFiles[name] = {std::make_shared<const std::vector<uint8_t>>(std::move(bytes)), faceIndex};
     return {font.name(), font.family()};
+}
+
+ByteFonts::Held ByteFonts::held() const {
+    Held held;
+    for (const auto& [name, file] : mFiles)
+        held.push_back(file.bytes);
+    return held;
 }
 
 vorelcompose::FontSource::Found ByteFonts::find(const std::string& request) {
@@ -41,7 +48,7 @@ vorelcompose::FontSource::Found ByteFonts::find(const std::string& request) {
 voreltext::Font ByteFonts::open(const voreltext::FontFile& file, int size,
                                 const std::vector<voreltext::FontVariation>& variations) {
     const File& found = mFiles.at(file.path);
-    return opened(file.path, {found.bytes.data(), found.bytes.size(), found.faceIndex}, size,
+    return opened(file.path, {found.bytes->data(), found.bytes->size(), found.faceIndex}, size,
                   variations);
 }
 

@@ -3,6 +3,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <map>
+#include <memory>
 #include <optional>
 #include <stdexcept>
 #include <string>
@@ -31,7 +32,11 @@ class ByteFonts : public vorelcompose::FontSource {
     /// Throws FontError for what is no font and for a name that is taken.
     Names add(const std::string& name, std::vector<uint8_t> bytes, long faceIndex);
 
-    /// No font of these bytes may be open any more.
+    /// What keeps the bytes of all fonts of now.
+    using Held = std::vector<std::shared_ptr<const std::vector<uint8_t>>>;
+    Held held() const;
+
+    /// A font of these bytes that is still open needs somebody who holds them.
     void remove(const std::string& name) { mFiles.erase(name); }
 
     /// Throws FontError.
@@ -45,7 +50,7 @@ class ByteFonts : public vorelcompose::FontSource {
 
   private:
     struct File {
-        std::vector<uint8_t> bytes;
+        std::shared_ptr<const std::vector<uint8_t>> bytes;
         long faceIndex;
     };
 

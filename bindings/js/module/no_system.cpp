@@ -1,7 +1,7 @@
 #include <cstdint>
 
-// The C library asks a system for files and its environment, of which a module has none: what it may do there
-// fails, and nothing has to be imported.
+// The C library asks a system for files and its environment, of which a module has none: what it may do
+// there fails, and nothing has to be imported.
 
 extern "C" {
 

@@ -18,6 +18,7 @@
 #include "requests.h"
 
 using namespace vorelscript;
+using vorelcompose::Composition;
 
 struct vorel_fonts {
     ByteFonts source;
@@ -28,13 +29,19 @@ struct vorel_style {
     vorelcompose::FoundStyle found;
 };
 
+struct vorel_steps {
+    ByteFonts::Held bytes;  // of the fonts in which the text is set
+    Composition composition;
+    vorelcompose::PaintingSteps steps{composition};
+    bool isReady = false;
+};
+
 struct vorel_answer {
     Answer answer;
 };
 
 namespace {
 
-using vorelcompose::Composition;
 using vorelcompose::LayerSet;
 using vorelstyle::Style;
 using vorelstyle::StyleError;
@@ -184,6 +191,30 @@ Composition composed(vorel_fonts& fonts, const TextRequest& asked, const vorel_s
             [=] { return foundIn(style); }, *fonts.bench};
 }
 
+/// What of a step can be looked at: the effect is asked for of an effect alone.
+bool isStep(const vorelcompose::PaintingSteps& steps, int32_t kind, int32_t look, int32_t effect) {
+    const std::vector<vorelcompose::StackedPlan>& plans = steps.plans();
+    const auto position = static_cast<size_t>(look);
+    if (kind < VOREL_STEP_GLYPHS || kind > VOREL_STEP_FONT || look < 0 || position >= plans.size())
+        return false;
+    const bool isOfPlan =
+        effect >= 0 && static_cast<size_t>(effect) < plans[position].look.effects.size();
+    return kind != VOREL_STEP_EFFECT || isOfPlan;
+}
+
+voreltext::Image pictureOf(const Composition& composition, int32_t kind, size_t look, size_t effect) {
+    switch (kind) {
+        case VOREL_STEP_GLYPHS:
+            return coveragePicture(composition, look);
+        case VOREL_STEP_EFFECT:
+            return effectPicture(composition, look, effect);
+        case VOREL_STEP_FONT:
+            return fontPicture(composition, look);
+        default:
+            return lookPicture(composition, look);
+    }
+}
+
 }  // namespace
 
 const char* vorel_text_error() {
@@ -275,6 +306,56 @@ vorel_status vorel_text_layout(vorel_fonts* fonts, const char* request, size_t l
     return made(answer, [&] {
         return vorel_answer{
             layoutAnswer(composed(*fonts, textRequest(viewOf(request, length)), nullptr))};
+    });
+}
+
+vorel_status vorel_style_plan(const vorel_style* style, int32_t size, float scale,
+                              vorel_answer** answer) {
+    if (style == nullptr) return VOREL_BAD_ARGUMENT;
+    return made(answer, [&] { return vorel_answer{planAnswer(layersOf(*style, size, scale))}; });
+}
+
+vorel_status vorel_steps_new(vorel_fonts* fonts, const char* request, size_t length,
+                             const vorel_style* style, vorel_steps** steps) {
+    if (fonts == nullptr || request == nullptr || steps == nullptr) return VOREL_BAD_ARGUMENT;
+    *steps = nullptr;
+    return called([&] {
+        const TextRequest asked = textRequest(viewOf(request, length));
+        *steps = new vorel_steps{fonts->source.held(), composed(*fonts, asked, style)};
+    });
+}
+
+void vorel_steps_free(vorel_steps* steps) {
+    delete steps;
+}
+
+vorel_status vorel_steps_plan(const vorel_steps* steps, vorel_answer** answer) {
+    if (steps == nullptr) return VOREL_BAD_ARGUMENT;
+    return made(answer, [&] { return vorel_answer{planAnswer(steps->composition.looks())}; });
+}
+
+vorel_status vorel_steps_prepare(vorel_steps* steps, vorel_step* step) {
+    if (steps == nullptr || step == nullptr) return VOREL_BAD_ARGUMENT;
+    return called([&] {
+        steps->isReady = steps->steps.prepare();
+        const vorelcompose::PaintingStep& next = steps->steps.step();
+        *step = {steps->isReady ? static_cast<int32_t>(next.look) : -1, static_cast<int32_t>(next.span),
+                 static_cast<int32_t>(next.kind), static_cast<int32_t>(next.effect)};
+    });
+}
+
+vorel_status vorel_steps_paint(vorel_steps* steps) {
+    if (steps == nullptr || !steps->isReady) return VOREL_BAD_ARGUMENT;
+    steps->isReady = false;
+    return called([&] { steps->steps.paint(); });
+}
+
+vorel_status vorel_steps_picture(const vorel_steps* steps, int32_t kind, int32_t look, int32_t effect,
+                                 vorel_answer** answer) {
+    if (steps == nullptr || !isStep(steps->steps, kind, look, effect)) return VOREL_BAD_ARGUMENT;
+    return made(answer, [&] {
+        return vorel_answer{imageAnswer(pictureOf(steps->composition, kind, static_cast<size_t>(look),
+                                                  static_cast<size_t>(effect)))};
     });
 }
 

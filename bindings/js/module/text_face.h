@@ -31,8 +31,26 @@ enum {
 typedef struct vorel_fonts vorel_fonts;
 /// A style with the pictures of its patterns.
 typedef struct vorel_style vorel_style;
+/// A text that is painted step by step.
+typedef struct vorel_steps vorel_steps;
 /// What a call tells.
 typedef struct vorel_answer vorel_answer;
+
+/// What a step of painting does, and what vorel_steps_picture shows.
+enum {
+    VOREL_STEP_GLYPHS = 0,  ///< the coverage of the glyphs; its picture is white
+    VOREL_STEP_EFFECT = 1,  ///< one effect
+    VOREL_STEP_MERGE = 2,   ///< the whole of a look, laid on the canvas
+    VOREL_STEP_FONT = 3     ///< pictures of colour fonts; they are part of the merge
+};
+
+/// A step of painting: compose/painting_steps.h.
+typedef struct vorel_step {
+    int32_t look;    ///< position in the stack, 0 the lowest
+    int32_t span;    ///< position in reading order
+    int32_t kind;    ///< of the step
+    int32_t effect;  ///< of an effect: position in the plan of the look, 0 the topmost
+} vorel_step;
 
 /// A picture that a pattern of a style names.
 typedef struct vorel_named_pixels {
@@ -86,6 +104,26 @@ VF_API vorel_status vorel_text_picture(vorel_fonts* fonts, const char* request, 
 /// and lines what answers.h says.
 VF_API vorel_status vorel_text_layout(vorel_fonts* fonts, const char* request, size_t length,
                                       vorel_answer** answer);
+/// Tells how a style is painted for a font of a size: what answers.h says of a plan.
+VF_API vorel_status vorel_style_plan(const vorel_style* style, int32_t size, float scale,
+                                     vorel_answer** answer);
+
+/// Makes a text ready to be painted step by step, in a style or without one. Its fonts and style may be
+/// freed before it.
+VF_API vorel_status vorel_steps_new(vorel_fonts* fonts, const char* request, size_t length,
+                                    const vorel_style* style, vorel_steps** steps);
+/// Frees it; null may be freed.
+VF_API void vorel_steps_free(vorel_steps* steps);
+/// Tells what vorel_style_plan does, of this text.
+VF_API vorel_status vorel_steps_plan(const vorel_steps* steps, vorel_answer** answer);
+/// Makes the next step ready and tells of it; `look` is -1 when there is none.
+VF_API vorel_status vorel_steps_prepare(vorel_steps* steps, vorel_step* step);
+/// Paints the step that was made ready last.
+VF_API vorel_status vorel_steps_paint(vorel_steps* steps);
+/// Tells the picture of one step alone, of one effect or all of a look (compose/step_pictures.h):
+/// "width" and "height", with premultiplied pixels.
+VF_API vorel_status vorel_steps_picture(const vorel_steps* steps, int32_t kind, int32_t look,
+                                        int32_t effect, vorel_answer** answer);
 
 /// Frees it; null may be freed.
 VF_API void vorel_answer_free(vorel_answer* answer);

@@ -4,9 +4,9 @@
 #include <string>
 #include <vector>
 
-/// The presets are the style files of one directory, with the pictures of their patterns: those beside
-/// this file, or where they are installed.
-namespace vorelstyle {
+/// The presets are the style files of one directory, with the pictures of their patterns: style/presets,
+/// or where they are installed.
+namespace vorelcompose {
 
 /// The names of the presets in a directory, sorted. Throws StyleError when it cannot be read.
 std::vector<std::string> presetNames(const std::filesystem::path& directory);
@@ -15,4 +15,4 @@ std::vector<std::string> presetNames(const std::filesystem::path& directory);
 /// none.
 std::filesystem::path presetFile(const std::filesystem::path& directory, const std::string& name);
 
-}  // namespace vorelstyle
+}  // namespace vorelcompose

@@ -1,13 +1,15 @@
-#include "style/presets.h"
+#include "compose/system/presets.h"
 
 #include <algorithm>
 
 #include "style/error.h"
 #include "style/nearest.h"
 
-namespace vorelstyle {
+namespace vorelcompose {
 
 namespace fs = std::filesystem;
+
+using vorelstyle::StyleError;
 
 std::vector<std::string> presetNames(const fs::path& directory) {
     try {
@@ -25,9 +27,9 @@ std::vector<std::string> presetNames(const fs::path& directory) {
 fs::path presetFile(const fs::path& directory, const std::string& name) {
     const std::vector<std::string> names = presetNames(directory);
     if (std::find(names.begin(), names.end(), name) == names.end()) {
-        throw StyleError("no preset '" + name + "'" + choices(name, names, "there are"));
+        throw StyleError("no preset '" + name + "'" + vorelstyle::choices(name, names, "there are"));
     }
     return directory / (name + ".json");
 }
 
-}  // namespace vorelstyle
+}  // namespace vorelcompose

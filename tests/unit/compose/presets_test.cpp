@@ -1,4 +1,4 @@
-#include "style/presets.h"
+#include "compose/system/presets.h"
 
 #include <gtest/gtest.h>
 
@@ -7,8 +7,10 @@
 
 #include "style/error.h"
 
-namespace vorelstyle {
+namespace vorelcompose {
 namespace {
+
+using vorelstyle::StyleError;
 
 TEST(Presets, Names_AreSortedAndThoseOfTheStyleFiles) {
     const std::vector<std::string> names = presetNames(VOREL_PRESETS);
@@ -38,4 +40,4 @@ TEST(Presets, MissingDirectory_IsAStyleError) {
 }
 
 }  // namespace
-}  // namespace vorelstyle
+}  // namespace vorelcompose
