@@ -84,7 +84,7 @@ export class Engine {
     /** Calls an export that gives a status, and throws what is not VOREL_OK. */
     check(name: string, ...given: number[]): void {
         const status = this.call(name, ...given);
-        if (status !== Status.ok) throw this.#errorOf(status);
+        if (status !== Status.ok) throw this.errorOf(status);
     }
 
     /** The text at an address, up to its zero. */
@@ -119,7 +119,8 @@ export class Engine {
         if (!this.isDead) this.call(freeing, address);
     }
 
-    #errorOf(status: number): VorelError {
+    /** What a status other than VOREL_OK is thrown as. */
+    protected errorOf(status: number): Error {
         const text = this.textAt(this.addressBy('vorel_status_text', status));
         if (status === Status.noMemory) return new VorelMemoryError(text);
         if (status === Status.tooLarge) return new VorelSizeError(text);
@@ -161,6 +162,7 @@ export function freedError(what: string): VorelError {
 /** Memory that is freed at the end of `Engine.scoped`. */
 export class Scope {
     readonly #kept: Kept[] = [];
+    readonly #works: (() => void)[] = [];
 
     constructor(readonly engine: Engine) {}
 
@@ -208,8 +210,14 @@ export class Scope {
         return address;
     }
 
+    /** Runs `work` at the end, before anything is freed. */
+    runs(work: () => void): void {
+        this.#works.push(work);
+    }
+
     /** Frees all, what came last first. */
     free(): void {
+        for (const work of this.#works) work();
         for (let kept = this.#kept.pop(); kept !== undefined; kept = this.#kept.pop()) {
             this.engine.release(kept);
         }

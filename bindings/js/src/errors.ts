@@ -18,3 +18,24 @@ export class VorelSizeError extends VorelError {
         this.prototype.name = 'VorelSizeError';
     }
 }
+
+/** Something is wrong with a style, or with the markup of a text; the message tells the path of the key. */
+export class StyleError extends VorelError {
+    static {
+        this.prototype.name = 'StyleError';
+    }
+}
+
+/** A text cannot be painted as it is asked for. */
+export class TextError extends VorelError {
+    static {
+        this.prototype.name = 'TextError';
+    }
+}
+
+/** A font cannot be read, or has not what is asked of it. */
+export class FontError extends TextError {
+    static {
+        this.prototype.name = 'FontError';
+    }
+}

@@ -38,12 +38,15 @@ export interface Wanted {
     readonly name: string;
     /** Exports, one of each part. */
     readonly exports: readonly string[];
+    /** Makes the engine of an instance. */
+    readonly engine: new (exports: Record<string, unknown>) => Engine;
 }
 
 /** What the library's own module has. */
 export const LIBRARY: Wanted = {
     name: 'voreleffect.wasm',
     exports: ['memory', '_initialize', 'malloc', 'free', 'vorel_version', 'vorel_painter_picture'],
+    engine: Engine,
 };
 
 /** The smallest modules with an instruction of vectors, and one that catches. */
@@ -70,7 +73,7 @@ export async function engineOf(source: WasmSource, fetch: Fetch, wanted: Wanted)
         throw new VorelError(`this module is not ${wanted.name}: ${reason}`);
     }
     const { exports } = await WebAssembly.instantiate(module, {});
-    const engine = new Engine(exports);
+    const engine = new wanted.engine(exports);
     if (engine.version !== VERSION) {
         const versions = `the module is of version ${engine.version}, the package of ${VERSION}`;
         throw new VorelError(`${versions}: take ${wanted.name} of the package`);

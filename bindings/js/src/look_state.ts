@@ -237,7 +237,7 @@ export function pattern(pixels: Pixels, given: PatternOptions = {}): PatternStat
 }
 
 /** A copy of the pixels in packed rows. Throws TypeError or RangeError. */
-function packed(pixels: Pixels): Pick<PatternState, 'width' | 'height' | 'data'> {
+export function packed(pixels: Pixels): Pick<PatternState, 'width' | 'height' | 'data'> {
     const { data: from, width: w, height: h, stride: given } = object(pixels, 'pixels');
     const bytes = bytesOf(from, 'the pixels of a pattern');
     const width = integer(w, 'width', 1);
