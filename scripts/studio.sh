@@ -16,7 +16,7 @@ command -v node > /dev/null || need_packages nodejs
 command -v npm > /dev/null || need_packages npm
 
 install() {
-    ! grep -q '"resolved"' "$1/package-lock.json" ||
+    ! grep -q '"resolved": "http' "$1/package-lock.json" ||
         { echo "$1/package-lock.json names a registry" >&2; return 1; }
     (cd "$1" && quietly npm ci --ignore-scripts --no-audit --no-fund)
 }

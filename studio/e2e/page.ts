@@ -56,12 +56,3 @@ export async function changed(page: Page, before: string): Promise<string> {
     await expect.poll(() => pictureHash(page)).not.toBe(before);
     return pictureHash(page);
 }
-
-/** Numbers from 0 to below 1 that are the same in every run. */
-export function seeded(seed: number): () => number {
-    let state = seed;
-    return () => {
-        state = (Math.imul(state, 1664525) + 1013904223) >>> 0;
-        return state / 2 ** 32;
-    };
-}

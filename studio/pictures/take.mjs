@@ -8,7 +8,10 @@ import { preview } from 'vite';
 const into = new URL('../../docs/studio/', import.meta.url).pathname;
 
 const server = await preview({ preview: { host: '127.0.0.1', port: 4318, strictPort: true } });
-const browser = await chromium.launch({ executablePath: '/usr/bin/chromium', args: ['--no-sandbox'] });
+const browser = await chromium.launch({
+    executablePath: '/usr/bin/chromium',
+    args: ['--no-sandbox'],
+});
 
 /** Opens the page, does something on it, and takes its picture. */
 async function take(name, options, act) {

@@ -37,9 +37,18 @@ export interface Step {
     milliseconds?: number;
 }
 
-/** The order of painting, the topmost step first, and the cache key as readable fragments. */
+/** How a look is painted: whether in two layers, where it stands, and its steps, the topmost first. */
+export interface PlannedLook {
+    layered: boolean;
+    reason: string;
+    place: string;
+    placeReason: string;
+    order: Step[];
+}
+
+/** How the looks are painted, the topmost first, and the cache key as readable fragments. */
 export interface Facts {
-    looks: { layered: boolean; reason: string; place: string; order: Step[] }[];
+    looks: PlannedLook[];
     key: { name: string; meaning: string }[];
     keyBytes: number;
     lines: { baseline: number; box: Box }[];
@@ -74,8 +83,9 @@ export interface Calls {
     sample: { ask: { work: Work }; answer: Painted };
     facts: { ask: { work: Work }; answer: Facts };
     layers: { ask: { work: Work }; answer: Layer[] };
+    /** `onGround`: with the colour of the background beneath the text, where it is a colour. */
     png: {
-        ask: { work: Work; scale: number };
+        ask: { work: Work; scale: number; onGround: boolean };
         answer: { bytes: Uint8Array<ArrayBuffer>; notes: string[] };
     };
     exports: { ask: { work: Work }; answer: Code[] };

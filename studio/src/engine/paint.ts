@@ -8,6 +8,7 @@ import type { Box, Facts, Layer, Painted } from './messages';
 
 /** The engine's answers of works, in plain objects that can be sent to the page. */
 export class Studio {
+    private readonly names = new Set<string>();
     private readonly fonts = new Map<string, Promise<Font>>();
     /** Text and font for which the chosen font alone was not enough. */
     private lacking = '';
@@ -23,20 +24,33 @@ export class Studio {
 
     /** Takes a font of the person's own under its name. Throws where the bytes are none. */
     addFont(name: string, bytes: Uint8Array): string {
-        const font = new this.engine.Font(bytes, { name });
+        const font = this.made(bytes, name);
+        void this.fonts.get(name)?.then((before) => before.free());
         this.fonts.set(name, Promise.resolve(font));
         this.lacking = '';
         return font.family;
     }
 
-    async paint(work: Work): Promise<Painted> {
-        const options = await this.options(work);
+    /** A font under its name, or under one of its own where a font before it has the name. */
+    private made(bytes: Uint8Array | ArrayBuffer, name: string): Font {
+        const own = this.names.has(name) ? `${name} (${this.names.size})` : name;
+        const font = new this.engine.Font(bytes, { name: own });
+        this.names.add(own);
+        return font;
+    }
+
+    /** Paints the work, on nothing or on a ground of the colour '#rrggbb'. */
+    async paint(work: Work, ground?: string): Promise<Painted> {
+        const options = {
+            ...(await this.options(work)),
+            ...(ground ? { background: ground } : {}),
+        };
         const began = performance.now();
         const picture = this.engine.Text.picture(work.text, options);
         const milliseconds = performance.now() - began;
         if (picture.missing.length > 0 && this.lacking !== lackingKey(work)) {
             this.lacking = lackingKey(work);
-            return this.paint(work);
+            return this.paint(work, ground);
         }
         return {
             data: new Uint8ClampedArray(picture.data),
@@ -58,11 +72,9 @@ export class Studio {
         const explained = this.engine.Text.explain(work.text, options);
         const layout = this.engine.Text.layout(work.text, options);
         return {
-            looks: explained.looks.map(({ layered, reason, place, order }) => ({
-                layered,
-                reason,
-                place,
-                order: order.map((step) => ({ ...step })),
+            looks: explained.looks.toReversed().map((look) => ({
+                ...look,
+                order: look.order.map((step) => ({ ...step })),
             })),
             key: explained.key.map(({ name, meaning }) => ({ name, meaning })),
             keyBytes: explained.keyBytes.length,
@@ -91,6 +103,8 @@ export class Studio {
         const images = Object.fromEntries(
             Object.entries(patterns).map(([name, pixels]) => [name, this.pixelsOf(pixels)]),
         );
+        this.styled?.value.free();
+        this.styled = undefined;
         const value = this.engine.Style.fromJSON(JSON.stringify(style), { name: 'style', images });
         this.styled = { style, patterns, value };
         return value;
@@ -149,7 +163,7 @@ export class Studio {
             throw new Error(`the font '${name}' is not here; choose another or open its file`);
         const response = await fetch(new URL(shipped.file, this.fontsAt));
         if (!response.ok) throw new Error(`the font ${shipped.label} could not be loaded`);
-        return new this.engine.Font(await response.arrayBuffer(), { name: shipped.label });
+        return this.made(await response.arrayBuffer(), shipped.label);
     }
 }
 

@@ -39,12 +39,13 @@ const answers: Answers = {
     },
     font: async ({ name, bytes }) => ({ family: (await studio).addFont(name, bytes) }),
     pattern: ({ bytes }) => Promise.resolve(readPattern(bytes)),
-    png: async ({ work, scale }) => pngOf(work, scale),
+    png: async ({ work, scale, onGround }) => pngOf(scaledWork(work, scale), onGround),
     exports: async ({ work }) => codeOf(await studio, work),
 };
 
-async function pngOf(work: Work, scale: number) {
-    const picture = await (await studio).paint(scaledWork(work, scale));
+async function pngOf(work: Work, onGround: boolean) {
+    const colour = work.background.startsWith('#') ? work.background : undefined;
+    const picture = await (await studio).paint(work, onGround ? colour : undefined);
     const bytes = await png(picture.data, picture.width, picture.height);
     return { bytes: new Uint8Array(bytes), notes: picture.notes };
 }
@@ -81,7 +82,7 @@ function transfersOf(value: unknown): Transferable[] {
 
 /** After a trap, or without memory, the instance is of no use any more. */
 function isDeadly(error: unknown): boolean {
-    if (error instanceof WebAssembly.RuntimeError || error instanceof RangeError) return true;
+    if (error instanceof WebAssembly.RuntimeError) return true;
     const name = error instanceof Error ? error.name : '';
     return name === 'VorelMemoryError' || name === 'VorelError';
 }

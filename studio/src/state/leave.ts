@@ -25,10 +25,17 @@ export function download(name: string, content: BlobPart, type: string): void {
     setTimeout(() => URL.revokeObjectURL(address), 10_000);
 }
 
+/** Whether pictures are saved with the colour behind the text. */
+export const onGround = signal(false);
+
 /** The picture painted anew at a multiple of its size. */
 export async function savePng(scale: number): Promise<void> {
     try {
-        const result = await engine?.call('png', { work: work.value, scale });
+        const result = await engine?.call('png', {
+            work: work.value,
+            scale,
+            onGround: onGround.value,
+        });
         if (!result) return;
         download(fileName(scale > 1 ? `@${scale}x.png` : '.png'), result.bytes, 'image/png');
         if (result.notes.length > 0) notice('info', result.notes.join(' '));

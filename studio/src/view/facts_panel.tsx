@@ -64,7 +64,9 @@ function Order({ known }: { known: Facts }) {
                     {known.looks.length > 1 && <h4>Look {known.looks.length - index}</h4>}
                     <p class="help">
                         {look.layered ? 'Two layers' : 'One layer'}: {look.reason}
-                        {look.place && `; ${look.place}`}
+                    </p>
+                    <p class="help">
+                        Place: {look.place}. {look.placeReason}
                     </p>
                     <table>
                         <thead>

@@ -162,10 +162,12 @@ function LookEditor({ look, index }: { look: LookStyle; index: number }) {
         editLook(index, (now) => moveEffect(now, name, to), 'order');
         announce(`${labelOf(name)} moved to place ${last - to + 1} of ${last + 1} from the top`);
     };
-    const { list, handle } = useReorder((from, to) => {
+    const drag = (from: number, to: number) => {
         const name = names[last - from];
         if (name) move(name, last - to);
-    });
+    };
+    // An open form is higher than the rows that it would be dragged over.
+    const { list, handle } = useReorder(drag, () => (openEffect.value = ''));
     return (
         <section class="group" aria-labelledby="effects-title">
             <div class="group-head">

@@ -2,9 +2,9 @@ import { useRef } from 'preact/hooks';
 
 /**
  * Dragging rows of a list by a handle, with mouse, pen or finger. Rows are the children of the element that has
- * `list`; `onMove` is called while the row is moved over others. Buttons do the same for the keyboard.
+ * `list`; `onMove` is called while the row is moved over others, `onStart` before. Buttons do the same for the keyboard.
  */
-export function useReorder(onMove: (from: number, to: number) => void) {
+export function useReorder(onMove: (from: number, to: number) => void, onStart?: () => void) {
     const list = useRef<HTMLOListElement>(null);
     const from = useRef(-1);
 
@@ -19,6 +19,7 @@ export function useReorder(onMove: (from: number, to: number) => void) {
     const handle = (index: number) => ({
         onPointerDown(event: PointerEvent) {
             from.current = index;
+            onStart?.();
             (event.currentTarget as HTMLElement).setPointerCapture(event.pointerId);
         },
         onPointerMove(event: PointerEvent) {

@@ -7,6 +7,7 @@ import {
     copyLink,
     download,
     fileName,
+    onGround,
     openJson,
     savePng,
     styleError,
@@ -17,7 +18,7 @@ import {
 import { picture } from '../state/painting';
 import { work } from '../state/store';
 import { dock } from '../state/viewing';
-import { FileButton } from './fields';
+import { CheckField, FileButton } from './fields';
 import { Icon } from './icons';
 
 /** Everything in which the work leaves the page, and may come in again. */
@@ -39,6 +40,13 @@ export function SavePanel() {
                         </button>
                     ))}
                 </div>
+                {work.value.background.startsWith('#') && (
+                    <CheckField
+                        label="With the colour of the background"
+                        checked={onGround.value}
+                        onChange={(checked) => (onGround.value = checked)}
+                    />
+                )}
                 <div class="row">
                     <button type="button" class="button" onClick={() => void copyLink()}>
                         <Icon name="link" /> Copy link

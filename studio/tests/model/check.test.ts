@@ -1,7 +1,8 @@
 import { readdirSync, readFileSync } from 'node:fs';
 import { describe, expect, it } from 'vitest';
-import { asWork, readStyle } from '../../src/model/check';
+import { asWork, CheckError, readStyle } from '../../src/model/check';
 import { firstWork } from '../../src/model/work';
+import { seeded } from '../seeded';
 
 const presets = new URL('../../../style/presets/', import.meta.url);
 
@@ -47,6 +48,28 @@ describe('a style', () => {
     ])('%s is refused', (text, reason) => {
         expect(() => readStyle(text)).toThrow(reason);
     });
+});
+
+it('refuses styles that were damaged, or reads them, and does nothing else', () => {
+    const random = seeded(99);
+    const pieces = ['null', '-1', '1e999', '"%"', '[]', '{}', '"#FFF"', '101', '"4em"', 'true', ''];
+    const good = JSON.stringify(firstWork.style);
+    let read = 0;
+    for (let round = 0; round < 500; round++) {
+        const values = [...good.matchAll(/:("[^"]*"|[\d.]+|[[{])/g)];
+        const hit = values[Math.floor(random() * values.length)];
+        const piece = pieces[Math.floor(random() * pieces.length)] ?? '';
+        const at = hit?.index ?? 0;
+        const text = `${good.slice(0, at)}:${piece}${good.slice(at + (hit?.[0].length ?? 0))}`;
+        try {
+            readStyle(text);
+            read++;
+        } catch (error) {
+            expect(error).toBeInstanceOf(CheckError);
+        }
+    }
+    expect(read).toBeGreaterThan(0);
+    expect(read).toBeLessThan(250);
 });
 
 describe('a work', () => {

@@ -2,15 +2,7 @@ import { describe, expect, it } from 'vitest';
 import { CheckError } from '../../src/model/check';
 import { maxLink, readLink, writeLink } from '../../src/model/permalink';
 import { firstWork } from '../../src/model/work';
-
-/** Numbers from 0 to below 1 that are the same in every run. */
-function seeded(seed: number): () => number {
-    let state = seed;
-    return () => {
-        state = (Math.imul(state, 1664525) + 1013904223) >>> 0;
-        return state / 2 ** 32;
-    };
-}
+import { seeded } from '../seeded';
 
 describe('a link', () => {
     it('holds the whole work', async () => {
