@@ -1,10 +1,8 @@
 #!/usr/bin/env bash
 # Compiles and runs what the studio exports, of every preset and of looks with each effect and option: C++ by
-# look.h and by the classes, C, Java, Python, and the command with its style file. All paint the same bytes.
-# The package of JavaScript takes part where it has texts.
-#
-# What others have built is taken: build/release, the face of Java (scripts/android_test.sh) and the package of
-# Python (scripts/python.sh); else it is built now.
+# look.h and by the classes, C, Java, Python, JavaScript, and the command with its style file. All paint the same bytes.
+# What others have built is taken: build/release, the face of Java (scripts/android_test.sh), the packages of Python
+# (scripts/python.sh) and of JavaScript (scripts/studio.sh build); else it is built now.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 . scripts/packages.sh
@@ -20,16 +18,12 @@ command -v npm > /dev/null || need_packages nodejs npm
 quietly cmake --build --preset release --target vorelpaint
 java=$PWD/build/android_tests/voreleffect
 [[ -f $java/android/libvoreleffect_jni.so ]] || quietly scripts/android_test.sh --build
-[[ -d studio/node_modules ]] || (cd studio && quietly npm ci --ignore-scripts --no-audit --no-fund)
+[[ -f bindings/js/dist/text.js && -d studio/node_modules/voreleffect ]] || quietly scripts/studio.sh build
 
 export VOREL_EXPORTS=$PWD/build/exports VOREL_BUILD=$PWD/build/release
 export VOREL_PYTHON=${VOREL_PYTHON:-$(python_with_the_package)}
 export VOREL_JAVA=${VOREL_JAVA:-$java/android/classes:::$java:$java/android}
 export VOREL_FONT=/usr/share/fonts/truetype/dejavu/DejaVuSans-Bold.ttf
-if grep -q '"./text"' bindings/js/package.json 2> /dev/null; then
-    [[ -d bindings/js/dist ]] || quietly scripts/js.sh
-    export VOREL_PACKAGES=$PWD/studio/node_modules
-fi
 rm -rf "$VOREL_EXPORTS"
 mkdir -p "$VOREL_EXPORTS"
 cd studio

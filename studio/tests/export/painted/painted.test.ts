@@ -1,11 +1,13 @@
 import { execFileSync } from 'node:child_process';
 import { mkdirSync, readFileSync, symlinkSync, writeFileSync } from 'node:fs';
 import { join } from 'node:path';
+import type { Pixels } from 'voreleffect/text';
+import { load } from 'voreleffect/text';
 import { beforeAll, describe, expect, it } from 'vitest';
 import type { ExportEngine, ExportName } from '../../../src/export';
 import { exporters, patternFiles, patternPictures } from '../../../src/export';
 import { isPlainStack, patternNames, placedLooks, spansOf } from '../../../src/export/looks';
-import type { Work } from '../../../src/model/work';
+import type { PatternPixels, Work } from '../../../src/model/work';
 import { handMade, presetWorks } from '../samples';
 
 /*
@@ -17,7 +19,6 @@ import { handMade, presetWorks } from '../samples';
  *   VOREL_PYTHON    a Python that has the package
  *   VOREL_JAVA      the face of Java: the classes and the folders of the native libraries
  *   VOREL_FONT      the file of the samples' font
- *   VOREL_PACKAGES  the node_modules in which the package of JavaScript is; without it, it is left out
  */
 const { VOREL_EXPORTS: folder = '', VOREL_BUILD: build = '' } = process.env;
 const root = new URL('../../../..', import.meta.url).pathname;
@@ -26,13 +27,22 @@ const here = new URL('.', import.meta.url).pathname;
 const works = new Map([...presetWorks(), ...Object.entries(handMade)]);
 const names = [...works.keys()];
 
-/** Vorelpaint stands in for the engine: it writes the style beside which it finds the pictures. */
-function engineOf(name: string): ExportEngine {
+/** The package writes the calls of the classes, as it does for the page. */
+async function engineOfThePage(): Promise<ExportEngine> {
+    const { Style } = await load();
+    const pixelsOf = ({ width, height, data }: PatternPixels): Pixels => ({
+        width,
+        height,
+        data: new Uint8ClampedArray(Buffer.from(data, 'base64')),
+    });
     return {
-        toCpp: (_style, size, { opacity }) => {
-            const more = opacity === undefined ? [] : ['--opacity', String(opacity)];
-            const words = ['--style', 'title.json', '--size', String(size), ...more, '--write-cpp'];
-            return run(join(build, 'tools/vorelpaint'), words, join(folder, name));
+        toCpp: (style, size, { name, patterns, ...options }) => {
+            const pictures = Object.entries(patterns).map(([image, each]) => [
+                image,
+                pixelsOf(each),
+            ]);
+            const images = Object.fromEntries(pictures) as Record<string, Pixels>;
+            return Style.fromJSON(style, { images }).toCpp(name, size, options);
         },
     };
 }
@@ -136,13 +146,14 @@ function sourceOf(name: string, kind: ExportName): string {
 
 /** Each sample has a folder with what is exported, and with the pictures of its patterns. */
 async function exportAll(): Promise<void> {
+    const engine = await engineOfThePage();
     for (const [name, work] of works) {
         mkdirSync(join(folder, name), { recursive: true });
         for (const picture of await patternPictures(work))
             writeFileSync(join(folder, name, picture.name), picture.bytes);
         const made = new Map<ExportName, string>();
         for (const [kind, exporter] of Object.entries(exporters)) {
-            const { name: file, text } = exporter(work, engineOf(name));
+            const { name: file, text } = exporter(work, engine);
             write(join(name, file), text);
             made.set(kind as ExportName, text);
         }
@@ -290,7 +301,7 @@ function bytesOf(name: string, kind: string): Buffer {
 }
 
 function runJavaScript(): void {
-    symlinkSync(process.env.VOREL_PACKAGES ?? '', join(folder, 'node_modules'));
+    symlinkSync(join(root, 'studio/node_modules'), join(folder, 'node_modules'));
     const files = names.map((name) => {
         const { style } = works.get(name) as Work;
         return [name, Object.fromEntries(patternFiles(style))];
@@ -310,27 +321,18 @@ describe.skipIf(folder === '')('an export', () => {
         buildNative();
         run(join(folder, 'run_exports'), [folder]);
         runJava();
+        runJavaScript();
     }, 300_000);
 
     it.each(['cpp-look', 'cpp-classes', 'c', 'java'])('for %s paints the very bytes', (kind) => {
         const other = names.filter((name) => !bytesOf(name, `.${kind}`).equals(bytesOf(name, '')));
         expect(other).toEqual([]);
     });
-    it.each(['python', 'command'])('for %s paints the very bytes', (kind) => {
+    it.each(['python', 'javascript', 'command'])('for %s paints the very bytes', (kind) => {
         const painted = (name: string): Buffer => bytesOf(name, `.${kind}`);
         const other = names.filter((name) => !painted(name).equals(bytesOf(name, '.straight')));
         expect(other).toEqual([]);
     });
-    it.skipIf(process.env.VOREL_PACKAGES === undefined)(
-        'for javascript paints the very bytes',
-        () => {
-            runJavaScript();
-            const painted = (name: string): Buffer => bytesOf(name, '.javascript');
-            const other = names.filter((name) => !painted(name).equals(bytesOf(name, '.straight')));
-            expect(other).toEqual([]);
-        },
-        60_000,
-    );
     it('is not all of clear pixels', () => {
         const clear = names.filter((name) => bytesOf(name, '').every((byte) => byte === 0));
         expect(clear).toEqual([]);
