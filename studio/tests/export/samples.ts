@@ -261,6 +261,16 @@ export const handMade: Readonly<Record<string, Work>> = {
         ],
         { opacity: 0.55, padding: 20 },
     ),
+    aroundTheLook: workOf(
+        [{ color: '#FFF', stroke: { size: 2, color: '#000', position: 'outside' } }],
+        {
+            text: 'a <c #F40>red</c> &amp;\n<c #08F>b</c>',
+            markup: true,
+            background: '#204060',
+            align: 'right',
+            opacity: 0.8,
+        },
+    ),
     hostile: workOf(
         {
             version: 2,

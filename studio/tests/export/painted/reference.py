@@ -28,7 +28,7 @@ def painted(case, **options):
     opacity = None if case["opacity"] == 1 else case["opacity"]
     return ve.text_picture(case["text"], font=case["font"], size=case["size"], look=style, align=case["align"],
                            line_height=case["lineHeight"], letter_spacing=case["letterSpacing"], opacity=opacity,
-                           padding=case["padding"], **options)
+                           padding=case["padding"], markup=case["markup"], **options)
 
 
 def keep(picture, name):
@@ -41,7 +41,8 @@ def main(folder):
         picture = painted(case, premultiplied=True)
         pages.append(f"{name} {picture.width} {picture.height} {picture.x} {picture.y}\n")
         picture.array.tofile(folder / f"{name}.rgba")
-        painted(case).array.tofile(folder / f"{name}.straight.rgba")
+        background = case["background"] if case["background"].startswith("#") else None
+        painted(case, background=background).array.tofile(folder / f"{name}.straight.rgba")
         os.chdir(folder / name)
         exec(compile(Path("title.py").read_bytes(), f"{name}/title.py", "exec"), {})
         keep("title.png", folder / f"{name}.python.rgba")
