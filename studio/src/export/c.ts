@@ -1,6 +1,6 @@
 import { noted } from './exported';
 import type { Exporter } from './exported';
-import { glyphNotes, headerLines, moved, unpaintedComments } from './glyph_notes';
+import { glyphNotes, headerLines, inLines, moved, unpaintedComments } from './glyph_notes';
 import type { EffectCall, PlacedLook, RampStop } from './looks';
 import { isPlainStack, patternNames, patternsOf, placedLooks, spansOf } from './looks';
 import { floatLiteral } from './numbers';
@@ -122,44 +122,72 @@ static vorel_status paint_title_runs(vorel_look* look, const title_run* runs, si
 }
 `;
 
+/** How a look is called among so many. */
+function variable(i: number, count: number): string {
+    return count === 1 ? 'look' : `looks[${i}]`;
+}
+
 /** The statement that paints one look in its place. */
-function painting(look: PlacedLook, i: number): string {
+function painting(look: Pick<PlacedLook, 'x' | 'y' | 'span'>, i: number, count: number): string {
     const place = `page, ${moved('x', look.x)}, ${moved('y', look.y)}`;
     const { span } = look;
+    const own = variable(i, count);
     const call =
         span === 'block'
-            ? `vorel_paint(&looks[${i}], 1, text, count, ${place}, NULL)`
-            : `paint_title_runs(looks[${i}], ${span}s, ${span}_count, ${place})`;
+            ? `vorel_paint(&${own}, 1, text, count, ${place}, NULL)`
+            : `paint_title_runs(${own}, ${span}s, ${span}_count, ${place})`;
     return `    if (status == VOREL_OK) status = ${call};\n`;
 }
 
 function parametersOf(looks: PlacedLook[], patterns: PatternNames): string {
     const hasBlock = looks.some((look) => look.span === 'block');
-    return [
+    const parameters = [
         ...(hasBlock ? ['const vorel_glyph* text, size_t count'] : []),
         ...spansOf(looks).map((span) => `const title_run* ${span}s, size_t ${span}_count`),
         ...[...patterns.values()].map((pattern) => `const vorel_pixels* ${pattern}`),
         'const vorel_view* page, int32_t x, int32_t y',
-    ].join(',\n                         ');
+    ];
+    return inLines(parameters, 25, 102);
+}
+
+/** The statements that make the looks. */
+function making(looks: PlacedLook[], patterns: PatternNames): string[] {
+    const count = looks.length;
+    return looks.map((look, i) => {
+        const taken = patternsOf(look, patterns).map((pattern) => `, ${pattern}`);
+        const call = `${nameOf(i, count)}(&${variable(i, count)}${taken.join('')})`;
+        return `${i === 0 ? '    vorel_status' : '    if (status == VOREL_OK)'} status = ${call};\n`;
+    });
+}
+
+/** The declaration of the looks, the statement that paints them as a stack, and those that free them. */
+function stackStatements(count: number): { declared: string; painted: string; freed: string } {
+    if (count === 1) {
+        return {
+            declared: '    vorel_look* look = NULL;\n',
+            painted: painting({ x: 0, y: 0, span: 'block' }, 0, 1),
+            freed: '    vorel_look_free(look);\n',
+        };
+    }
+    const call = `vorel_paint(looks, ${count}, text, count, page, x, y, NULL)`;
+    return {
+        declared: `    vorel_look* looks[${count}] = {NULL};\n`,
+        painted: `    if (status == VOREL_OK) status = ${call};\n`,
+        freed: `    for (size_t i = 0; i < ${count}; ++i)\n        vorel_look_free(looks[i]);\n`,
+    };
 }
 
 function paintFunction(looks: PlacedLook[], patterns: PatternNames): string {
     const count = looks.length;
-    const making = looks.map((look, i) => {
-        const taken = patternsOf(look, patterns).map((pattern) => `, ${pattern}`);
-        const call = `${nameOf(i, count)}(&looks[${i}]${taken.join('')})`;
-        const start = i === 0 ? '    vorel_status' : '    if (status == VOREL_OK)';
-        return `${start} status = ${call};\n`;
-    });
-    const stack = `    if (status == VOREL_OK) status = vorel_paint(looks, ${count}, text, count, page, x, y, NULL);\n`;
+    const { declared, painted, freed } = stackStatements(count);
     return [
         '// Paints the text with its origin at (x, y), look by look, each over those before.\n',
         ...(spansOf(looks).length > 0 ? ['// Runs stand in reading order.\n'] : []),
         `vorel_status paint_title(${parametersOf(looks, patterns)}) {\n`,
-        `    vorel_look* looks[${count}] = {${looks.map(() => 'NULL').join(', ')}};\n`,
-        ...making,
-        ...(isPlainStack(looks) ? [stack] : looks.map(painting)),
-        `    for (size_t i = 0; i < ${count}; ++i)\n        vorel_look_free(looks[i]);\n`,
+        declared,
+        ...making(looks, patterns),
+        ...(isPlainStack(looks) ? [painted] : looks.map((look, i) => painting(look, i, count))),
+        freed,
         '    return status;\n}\n',
     ].join('');
 }

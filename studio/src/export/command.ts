@@ -5,6 +5,8 @@ import { styleName } from './style';
 import { fontName, textOptions } from './text_options';
 import { hasUnseen, printable, printfFormat, sentence, shellWord, wellFormed } from './words';
 
+const width = 100;
+
 /**
  * The text as the last word of a command, and what stands before the command for it. Characters that a
  * terminal would act upon, or that would not be seen, are printed by the shell; a substitution drops line
@@ -40,13 +42,20 @@ export const command: Exporter = (work, engine) => {
         ['--padding', padding],
         ['--background', background],
     ];
-    const words = options.flatMap(([name, value]) =>
+    const parts = options.flatMap(([name, value]) =>
         value === undefined ? [] : [`${name}${between(value)}${nameWord(String(value))}`],
     );
-    const all = [...words, ...(markup ? ['--markup'] : []), '-o title.png', '--', word];
+    const all = [
+        'vorelpaint',
+        ...parts,
+        ...(markup ? ['--markup'] : []),
+        '-o title.png',
+        `-- ${word}`,
+    ];
+    const isLong = all.join(' ').length > width;
     const said = work.style.description ?? '';
     const comment = said === '' ? '' : `# ${sentence(said)}\n`;
-    const text = `${comment}${before}vorelpaint ${all.join(' ')}\n`;
+    const text = `${comment}${before}${all.join(isLong ? ' \\\n    ' : ' ')}\n`;
     const files = [styleName, ...patternFiles(work.style).values()].join(', ');
     const zero = work.text.includes('\0') ? 'No command takes a text with U+0000.' : undefined;
     return { name: 'title.sh', language: 'sh', text, ...noted(`It reads ${files}.`, zero) };

@@ -1,6 +1,6 @@
 import { noted } from './exported';
 import type { Exporter } from './exported';
-import { glyphNotes, headerLines, moved, unpaintedComments } from './glyph_notes';
+import { glyphNotes, headerLines, inLines, moved, unpaintedComments } from './glyph_notes';
 import type { EffectCall, PlacedLook, RampStop } from './looks';
 import { isPlainStack, patternNames, patternsOf, placedLooks, spansOf } from './looks';
 import { floatLiteral } from './numbers';
@@ -42,15 +42,15 @@ function effect(call: EffectCall, patterns: PatternNames): string {
         case 'outerGlow':
         case 'innerGlow': {
             const name = call.kind === 'outerGlow' ? 'OuterGlow' : 'InnerGlow';
-            const stops = call.stops.length > 0 ? `.stops(${list(call.stops, 60)})` : '';
+            const stops = call.stops.length > 0 ? `.stops(${list(call.stops, 46)})` : '';
             return `${name}(${number(call.size)}, rgb(0x${call.color}))${stops}${opacity}`;
         }
         case 'linearGradient': {
             const rest = chained('angle', call.angle, 0) + chained('scale', call.scale, 1);
-            return `LinearGradient(${list(call.stops, 60)})${rest}${opacity}`;
+            return `LinearGradient(${list(call.stops, 46)})${rest}${opacity}`;
         }
         case 'radialGradient':
-            return `RadialGradient(${list(call.stops, 60)})${chained('scale', call.scale, 1)}${opacity}`;
+            return `RadialGradient(${list(call.stops, 46)})${chained('scale', call.scale, 1)}${opacity}`;
         case 'stroke': {
             const { size, color, position } = call;
             const where = position === 'outside' ? '' : `.position(Position::${position})`;
@@ -133,7 +133,7 @@ function paintFunction(looks: PlacedLook[], patterns: PatternNames): string {
         '/// Paints the text with its origin at (x, y), look by look, each over those before. False where\n',
         '/// something cannot be painted.\n',
         told,
-        `bool paintTitle(${parameters.join(',\n                ')}) {\n`,
+        `bool paintTitle(${inLines(parameters, 16, 102)}) {\n`,
         ...looks.map((look, i) => painting(look, i, looks.length, patterns)),
         '    return true;\n}\n',
     ].join('');

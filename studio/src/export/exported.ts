@@ -30,6 +30,7 @@ export interface ExportEngine {
     fontName?(font: string): string;
 }
 
+/** Writes a work that check.ts has found to be one; of its words it takes any. Throws nothing of its own. */
 export type Exporter = (work: Work, engine: ExportEngine) => Exported;
 
 /** The notes as one, none where there are none. */

@@ -40,6 +40,12 @@ export function unpaintedComments(look: PlacedLook): string[] {
     return look.unpainted.map((effect) => `${effect}: the library has no core for it.`);
 }
 
+/** The parts of a list in a line, if that fits behind `taken` columns of `width`, else in a line for each. */
+export function inLines(parts: readonly string[], taken: number, width = 105): string {
+    const line = parts.join(', ');
+    return taken + line.length <= width ? line : parts.join(`,\n${' '.repeat(taken)}`);
+}
+
 /** A coordinate, moved: 'x + 3'. */
 export function moved(coordinate: string, by: number): string {
     return by === 0 ? coordinate : `${coordinate} ${by < 0 ? '-' : '+'} ${Math.abs(by)}`;

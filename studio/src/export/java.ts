@@ -1,6 +1,6 @@
 import { noted } from './exported';
 import type { Exporter } from './exported';
-import { glyphNotes, headerLines, moved, unpaintedComments } from './glyph_notes';
+import { glyphNotes, headerLines, inLines, moved, unpaintedComments } from './glyph_notes';
 import type { EffectCall, PlacedLook, RampStop } from './looks';
 import { isPlainStack, patternNames, patternsOf, placedLooks, spansOf } from './looks';
 import { floatLiteral } from './numbers';
@@ -137,7 +137,7 @@ function paintMethod(looks: PlacedLook[], patterns: PatternNames): string {
     return [
         '    // Paints the text with its origin at (x, y), look by look, each over those before.\n',
         runs,
-        `    static void paint(${parameters.join(', ')}) {\n`,
+        `    static void paint(${inLines(parameters, 22, 102)}) {\n`,
         ...looks.map((look, i) => painting(look, i, looks.length, patterns)),
         '    }\n',
     ].join('');

@@ -67,14 +67,14 @@ export function presetWorks(): Map<string, Work> {
     );
 }
 
-/** Pixels of 5 x 3 in which all four channels vary, clear and half clear ones among them. */
-export const tile: PatternPixels = {
-    width: 5,
-    height: 3,
-    data: Buffer.from(
-        Array.from({ length: 60 }, (_, i) => (i % 4 === 3 ? (i * 37) % 256 : (i * 61 + 9) % 256)),
-    ).toString('base64'),
-};
+/** Pixels in which all four channels vary, clear and half clear ones among them. */
+function tileOf(width: number, height: number): PatternPixels {
+    const byte = (i: number): number => (i % 4 === 3 ? i * 37 : i * 61 + 9) % 256;
+    const bytes = Array.from({ length: width * height * 4 }, (_, i) => byte(i));
+    return { width, height, data: Buffer.from(bytes).toString('base64') };
+}
+
+export const tile = tileOf(5, 3);
 
 const ramp = [
     { location: 0, color: '#F40' },
@@ -143,13 +143,18 @@ export const handMade: Readonly<Record<string, Work>> = {
         [
             {
                 pattern: { image: 'tile.png', width: '30%' },
-                stroke: { ...ramp[0], size: 2, color: '#222', position: 'outside' } as never,
+                stroke: { size: 2, color: '#222', position: 'outside' },
             },
             { pattern: { image: 'other', width: 7 }, textOpacity: 0, span: 'word' },
             { fill: false, pattern: { image: 'other', width: '1000%', opacity: 0.2 } },
         ],
         { patterns: { 'tile.png': tile, other: tile } },
     ),
+    // As floats, 31 / 7 * 7 is less than 31: the tile would be a pixel too narrow.
+    roundedTile: workOf([{ pattern: { image: 'seven.png', width: 31 } }], {
+        size: 90,
+        patterns: { 'seven.png': tileOf(7, 2) },
+    }),
     textFill: workOf([
         { text: { color: '#8B2', opacity: 0.5 }, outerShadow: shadow, textOpacity: 1 },
         { innerShadow: shadow, text: { color: '#2B8', opacity: 0.6 }, textOpacity: 0.5 },
@@ -256,6 +261,16 @@ export const handMade: Readonly<Record<string, Work>> = {
         ],
         { opacity: 0.55, padding: 20 },
     ),
+    aroundTheLook: workOf(
+        [{ color: '#FFF', stroke: { size: 2, color: '#000', position: 'outside' } }],
+        {
+            text: 'a <c #F40>red</c> &amp;\n<c #08F>b</c>',
+            markup: true,
+            background: '#204060',
+            align: 'right',
+            opacity: 0.8,
+        },
+    ),
     hostile: workOf(
         {
             version: 2,
@@ -266,6 +281,6 @@ export const handMade: Readonly<Record<string, Work>> = {
                 { description: 'coding: utf-7', color: '#654321', offset: { x: 1 } },
             ],
         },
-        { text: '-o "\'; $(exit 3) `x` \\n %s \ud83d\ude00\n\u00e9 </script>\\' },
+        { text: '-o "\'; $(exit 3) `x` \\n %s \u2192\n\u00e9 </script>\\' },
     ),
 };
