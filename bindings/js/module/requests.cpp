@@ -93,6 +93,7 @@ Request requestOf(const JsonObject& given) {
     request.fit = word(given, "fit", vorelcompose::kFits, request.fit);
     request.box = word(given, "box", vorelcompose::kBoxes, request.box);
     request.strict = given.boolean("strict", false);
+    checkCanvas(request);
     return request;
 }
 

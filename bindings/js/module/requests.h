@@ -49,7 +49,7 @@ struct TextRequest {
 ///     premultiplied  leaves the pixels so: false
 ///     strict         takes every note for an error: false
 ///
-/// Throws RequestError.
+/// Throws RequestError, and ComposeError for a fit without the sides that it needs.
 TextRequest textRequest(std::string_view json);
 
 /// Of a style, what is written as C++. Throws RequestError.

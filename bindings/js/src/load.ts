@@ -33,13 +33,13 @@ export type WasmSource =
 export type Fetch = (address: string) => Promise<ResponseLike | Uint8Array<ArrayBuffer>>;
 
 /** What of a module is asked for. */
-export interface Wanted {
+export interface Wanted<Kind extends Engine = Engine> {
     /** Of the file, for errors. */
     readonly name: string;
     /** Exports, one of each part. */
     readonly exports: readonly string[];
     /** Makes the engine of an instance. */
-    readonly engine: new (exports: Record<string, unknown>) => Engine;
+    readonly engine: new (exports: Record<string, unknown>) => Kind;
 }
 
 /** What the library's own module has. */
@@ -64,7 +64,11 @@ export function bytesFrom(base64: string): Uint8Array<ArrayBuffer> {
  * A fresh instance. Throws TypeError for what is no source, VorelError for what is no module of this version, and
  * where the platform has not what it takes.
  */
-export async function engineOf(source: WasmSource, fetch: Fetch, wanted: Wanted): Promise<Engine> {
+export async function engineOf<Kind extends Engine>(
+    source: WasmSource,
+    fetch: Fetch,
+    wanted: Wanted<Kind>,
+): Promise<Kind> {
     const module = await moduleOf(source, fetch);
     const names = new Set(WebAssembly.Module.exports(module).map(({ name }) => name));
     const missing = wanted.exports.find((name) => !names.has(name));

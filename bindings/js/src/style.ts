@@ -139,11 +139,11 @@ export class Style {
 
     /** C++17 that makes the calls of the library; its function is called `name`. */
     toCpp(name: string, size: number, given: CppOptions = {}): string {
-        const { color: fill, opacity, effectScale } = options(given, [
-            'color',
-            'opacity',
-            'effectScale',
-        ]);
+        const {
+            color: fill,
+            opacity,
+            effectScale,
+        } = options(given, ['color', 'opacity', 'effectScale']);
         if (typeof name !== 'string') throw new TypeError(`name: a string, not ${kindOf(name)}`);
         const request = {
             name,
@@ -230,10 +230,7 @@ function withPixels(state: ToldState, bytes: Uint8Array<ArrayBuffer>): LookState
 }
 
 /** Named pictures in memory: the two arguments that they are. */
-export function imagesIn(
-    scope: Scope,
-    images: Readonly<Record<string, Pixels>>,
-): [number, number] {
+export function imagesIn(scope: Scope, images: Readonly<Record<string, Pixels>>): [number, number] {
     const entries = Object.entries(object(images, 'images'));
     const words = entries.flatMap(([name, pixels]) => {
         const { data, width, height } = packed(pixels);

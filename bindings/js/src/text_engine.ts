@@ -51,7 +51,7 @@ export class TextEngine extends Engine {
 }
 
 /** What the module with text has. */
-export const WITH_TEXT: Wanted = {
+export const WITH_TEXT: Wanted<TextEngine> = {
     name: 'voreleffect-text.wasm',
     exports: ['memory', '_initialize', 'malloc', 'free', 'vorel_version', 'vorel_text_picture'],
     engine: TextEngine,

@@ -4,16 +4,7 @@ import { Look } from './look.js';
 import type { LookState, Pixels } from './look_state.js';
 import { imagesIn, Style, type StyleClass } from './style.js';
 import { TextEngine } from './text_engine.js';
-import {
-    color,
-    integer,
-    kindOf,
-    number,
-    object,
-    options,
-    spelled,
-    type Color,
-} from './values.js';
+import { color, integer, kindOf, number, object, options, spelled, type Color } from './values.js';
 
 /** Where the text stands in a width or height that is asked for. */
 export type Anchor =

@@ -1,4 +1,3 @@
-import type { Engine } from './engine.js';
 import { fontClassOf, type FontClass } from './font.js';
 import { presetNames, styleClassOf, type StyleClass } from './style.js';
 import type { TextEngine } from './text_engine.js';
@@ -15,8 +14,7 @@ export interface VoreleffectText extends Voreleffect {
 }
 
 /** The face of an instance of the module with text. */
-export function textFaceOf(given: Engine): VoreleffectText {
-    const engine = given as TextEngine;
+export function textFaceOf(engine: TextEngine): VoreleffectText {
     const face = faceOf(engine);
     const Style = styleClassOf(engine, face.Look);
     return Object.freeze({

@@ -4,7 +4,9 @@
 #include <algorithm>
 #include <cstdint>
 #include <cstdio>
+#include <iterator>
 #include <map>
+#include <random>
 #include <string>
 #include <vector>
 
@@ -24,6 +26,8 @@ using Text = std::vector<utf32_t>;
 using Answers = std::string;
 
 constexpr utf32_t kLastCharacter = 0x10FFFF;
+constexpr utf32_t kFirstFlag = 0x1F1E6;
+constexpr utf32_t kLastFlag = 0x1F1FF;
 
 /// A class of characters is told by its first one. Halves of flags end the library's program where they
 /// are not the first: nobody asks for them (text/line_breaks.cpp), and they stand among the unknown ones
@@ -51,7 +55,7 @@ struct Classes {
     }
 };
 
-/// What the library says of the places before the last `count` characters.
+/// What the library says of the places before each of the last `count` characters.
 Answers answersOf(const Text& text, size_t count) {
     Answers breaks(text.size(), '\0');
     set_linebreaks_utf32(text.data(), text.size(), nullptr, breaks.data());
@@ -100,6 +104,43 @@ Automaton learnt(const std::vector<utf32_t>& examples) {
         }
     }
     return automaton;
+}
+
+size_t classOf(const Classes& classes, utf32_t code) {
+    const auto behind =
+        std::upper_bound(classes.runs.begin(), classes.runs.end(), code,
+                         [](utf32_t place, const auto& run) { return place < run.first; });
+    return std::prev(behind)->second;
+}
+
+/// What the library says of all places of a text but the last, by the automaton.
+Answers walked(const Automaton& automaton, const Classes& classes, const Text& text) {
+    Answers answers;
+    size_t state = automaton.first[classOf(classes, text.front())];
+    for (size_t i = 1; i < text.size(); ++i) {
+        const size_t next = classOf(classes, text[i]);
+        answers += automaton.answers[state][next];
+        state = automaton.next[state][next];
+    }
+    return answers;
+}
+
+/// Whether the automaton says of long texts what the library does: of characters of all classes, and of
+/// any.
+bool isTrue(const Automaton& automaton, const Classes& classes) {
+    constexpr int kTexts = 200000;
+    std::mt19937 random(1);
+    for (int i = 0; i < kTexts; ++i) {
+        Text text;
+        for (size_t length = 2 + random() % 30; length > 0; --length) {
+            const utf32_t any = random() % (i % 2 == 0 ? 0x3100 : kLastCharacter);
+            const bool isAskedFor = any != EOS && (any < kFirstFlag || any > kLastFlag);
+            text.push_back(
+                i % 4 < 2 || !isAskedFor ? classes.examples[random() % classes.examples.size()] : any);
+        }
+        if (answersOf(text, text.size() - 1) != walked(automaton, classes, text)) return false;
+    }
+    return true;
 }
 
 /// Classes that the automaton tells apart in no state are of one kind.
@@ -158,6 +199,11 @@ int main() {
     init_linebreak();
     const Classes classes;
     const Automaton automaton = learnt(classes.examples);
+    if (!isTrue(automaton, classes)) {
+        std::fputs("libunibreak does not break lines by the class of the next character alone\n",
+                   stderr);
+        return 1;
+    }
     const std::vector<size_t> kinds = kindsOf(automaton);
     std::puts("// Written by learn_line_breaks.");
     writeRuns(classes, kinds);
