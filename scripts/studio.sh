@@ -15,7 +15,10 @@ need_packages fonts-dejavu-core fonts-lobster fonts-bebas-neue fonts-lohit-deva
 command -v node > /dev/null || need_packages nodejs
 command -v npm > /dev/null || need_packages npm
 
+# install FOLDER: what its lock file names, unless it is there already
 install() {
+    local installed=$1/node_modules/.package-lock.json
+    [[ ! $installed -nt $1/package-lock.json ]] || return 0
     ! grep -q '"resolved": "http' "$1/package-lock.json" ||
         { echo "$1/package-lock.json names a registry" >&2; return 1; }
     (cd "$1" && quietly npm ci --ignore-scripts --no-audit --no-fund)

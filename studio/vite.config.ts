@@ -18,6 +18,5 @@ export default defineConfig({
         assetsInlineLimit: 0,
     },
     worker: { format: 'es' },
-    server: { host: '127.0.0.1', fs: { allow: ['..'] }, headers: isolation },
     preview: { host: '127.0.0.1', port: 4173, strictPort: true, headers: isolation },
 });

@@ -114,6 +114,23 @@ test('shows layers alone, facts and overlays', async ({ studio }) => {
     await expect(studio.locator('.overlay rect')).toHaveCount(4);
 });
 
+test('shows the picture on other grounds, and itself in other colours', async ({ studio }) => {
+    const stage = studio.locator('.stage');
+    await studio.getByRole('button', { name: 'Background: Black' }).click();
+    await expect(stage).toHaveCSS('background-color', 'rgb(20, 23, 28)');
+    const [chooser] = await Promise.all([
+        studio.waitForEvent('filechooser'),
+        studio.getByText('Picture…').click(),
+    ]);
+    await chooser.setFiles('../style/presets/tiles.png');
+    await expect(stage.locator('img')).toBeVisible();
+    const colours = studio.getByRole('button', { name: /^Colours of the page/ });
+    for (const theme of ['light', 'dark', 'system']) {
+        await colours.click();
+        await expect(studio.locator('html')).toHaveAttribute('data-theme', theme);
+    }
+});
+
 test('zooms and moves the picture', async ({ studio }) => {
     const width = () => picture(studio).evaluate((canvas) => canvas.getBoundingClientRect().width);
     const fitted = await width();

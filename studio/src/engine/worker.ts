@@ -13,15 +13,8 @@ const scope = globalThis as unknown as DedicatedWorkerGlobalScope;
 
 async function begin(): Promise<Studio> {
     const engine = await load(new URL(wasm, scope.location.href));
-    return new Studio(
-        engine,
-        new URL(import.meta.env.BASE_URL + 'fonts/', pageOf(scope.location.href)),
-    );
-}
-
-/** The folder of the page: the worker's own file lies in `assets/` of it. */
-function pageOf(address: string): URL {
-    return new URL(import.meta.env.DEV ? '/' : '../', address);
+    // The worker's own file lies in a folder of the page, as that of the fonts does.
+    return new Studio(engine, new URL('../fonts/', scope.location.href));
 }
 
 const studio = begin();
