@@ -7,7 +7,7 @@ cd "$(dirname "$0")/.."
 . scripts/packages.sh
 . scripts/quietly.sh
 
-need_packages chromium fonts-dejavu-core
+need_packages chromium fonts-dejavu-core fonts-hosny-amiri fonts-lohit-deva fonts-inter-variable fonts-bebas-neue
 command -v node > /dev/null || need_packages nodejs
 command -v npm > /dev/null || need_packages npm
 [[ $(node --print 'parseInt(process.versions.node)') -ge 20 ]] || { echo 'node 20 or later is needed' >&2; exit 1; }
@@ -20,4 +20,10 @@ node build.mjs
 npx eslint .
 npx prettier --log-level warn --check .
 node --test --test-concurrency="$(nproc)" tests/*.test.js
+# Beside the tool, whose pictures are compared.
+if [[ ! -x ../../build/release/tools/vorelpaint ]]; then
+    quietly cmake -S ../.. --preset release
+    quietly cmake --build ../../build/release --target vorelpaint
+fi
+node tests/equality.mjs ../../build/release/tools/vorelpaint
 node sizes.mjs
