@@ -109,16 +109,15 @@ function StyleField() {
         const fresh = styleText();
         if (!touched.peek()) text.value = fresh;
     });
-    const take = async () => {
-        if (await takeStyle(text.value)) {
-            touched.value = false;
-            text.value = styleText();
-        }
-    };
     const drop = () => {
         touched.value = false;
         text.value = styleText();
         styleError.value = '';
+    };
+    const take = async () => {
+        const given = text.value;
+        // What was written while the engine read the style stays.
+        if ((await takeStyle(given)) && text.value === given) drop();
     };
     return (
         <section class="fact" aria-labelledby="save-style">
