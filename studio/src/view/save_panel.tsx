@@ -10,6 +10,7 @@ import {
     fileName,
     onGround,
     openJson,
+    savePatterns,
     savePng,
     styleError,
     styleText,
@@ -233,7 +234,12 @@ function Code() {
                         onClick={() => void copy(shown.text, `Code for ${shown.label}`)}
                     >
                         <Icon name="copy" /> Copy
-                    </button>
+                    </button>{' '}
+                    {Object.keys(work.value.patterns).length > 0 && (
+                        <button type="button" class="button" onClick={() => void savePatterns()}>
+                            <Icon name="load" /> Pictures of patterns
+                        </button>
+                    )}
                     <pre tabIndex={0} aria-label={`Code for ${shown.label}`}>
                         <code>{shown.text}</code>
                     </pre>
