@@ -64,3 +64,16 @@ fi
 mkdir -p "$folder/json"
 rm -rf "$folder/json/nlohmann"
 cp -rp /usr/include/nlohmann "$folder/json/"
+
+# The licences of what is compiled into the module, for the NOTICE of the package.
+heading() { printf '\n%s\n%s\n\n' "$(printf -- '-%.0s' {1..108})" "$1"; }
+{
+    heading 'FreeType, in voreleffect-text.wasm'
+    cat "$folder/freetype/docs/FTL.TXT"
+    heading 'HarfBuzz, in voreleffect-text.wasm'
+    cat "$folder/harfbuzz/COPYING"
+    heading 'FriBidi, in voreleffect-text.wasm; scripts/wasm_libraries.sh gets its sources'
+    cat "$folder/fribidi/COPYING"
+    heading 'libunibreak, in voreleffect-text.wasm: tables of what it says, made by learn_line_breaks.cpp'
+    cat /usr/share/doc/libunibreak1/copyright
+} > "$folder/NOTICE"

@@ -58,4 +58,8 @@ for (const { name } of modules.filter(({ entry }) => existsSync(`src/${entry}.ts
     writeFileSync(`dist/${name.replaceAll('-', '_')}_bytes.js`, inlined(file));
 }
 writeFileSync('dist/preset_files.js', presetFiles());
-for (const name of ['LICENSE', 'NOTICE']) copyFileSync(join(root, name), name);
+copyFileSync(join(root, 'LICENSE'), 'LICENSE');
+const notices = ['NOTICE', 'build/wasm_sources/NOTICE'].map((file) =>
+    readFileSync(join(root, file)),
+);
+writeFileSync('NOTICE', Buffer.concat(notices));

@@ -142,8 +142,3 @@ export function setFill(look: LookStyle, filled: boolean): LookStyle {
 export function withStyle(work: Work, change: (style: StyleFile) => StyleFile): Work {
     return { ...work, style: change(work.style) };
 }
-
-/** The names of the pictures that a style asks for. */
-export function imagesOf(style: StyleFile): Set<string> {
-    return new Set(style.looks.flatMap((look) => (look.pattern ? [look.pattern.image] : [])));
-}

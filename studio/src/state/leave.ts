@@ -1,5 +1,6 @@
 import { signal } from '@preact/signals';
 import type { Code } from '../engine/messages';
+import { patternPictures } from '../export';
 import { asWork, CheckError, readStyle } from '../model/check';
 import { writeLink } from '../model/permalink';
 import { notice } from './notices';
@@ -42,6 +43,13 @@ export async function savePng(scale: number): Promise<void> {
         announce('PNG saved');
     } catch (error) {
         notice('error', `No PNG: ${(error as Error).message}`);
+    }
+}
+
+/** The pictures of patterns, which lie beside a style file or a program. */
+export async function savePatterns(): Promise<void> {
+    for (const { name, bytes } of await patternPictures(work.value)) {
+        download(name, new Uint8Array(bytes), 'image/png');
     }
 }
 

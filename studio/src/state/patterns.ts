@@ -3,7 +3,7 @@ import halftone from '../../../style/presets/halftone.png?url';
 import spray from '../../../style/presets/spray.png?url';
 import stripes from '../../../style/presets/stripes.png?url';
 import tiles from '../../../style/presets/tiles.png?url';
-import { imagesOf } from '../model/edit';
+import { imagesOf } from '../export/patterns';
 import type { StyleFile } from '../model/style_file';
 import type { PatternPixels, Work } from '../model/work';
 import { engine } from './painting';
@@ -61,7 +61,7 @@ export async function patternsFor(
     style: StyleFile,
     given: Record<string, PatternPixels>,
 ): Promise<Record<string, PatternPixels>> {
-    const names = [...imagesOf(style)];
+    const names = imagesOf(style);
     const pixels = await Promise.all(
         names.map((name) => {
             const known = Object.hasOwn(given, name) ? given[name] : undefined;

@@ -106,7 +106,8 @@ function lookNamed(index: number): string {
 
 /** As fine as the browser's clock: one of pages that are isolated from others tells microseconds. */
 function timeOf(milliseconds: number): string {
-    return `${milliseconds.toFixed(crossOriginIsolated ? 3 : 1)} ms`;
+    if (crossOriginIsolated) return `${milliseconds.toFixed(3)} ms`;
+    return milliseconds < 0.1 ? 'below 0.1 ms' : `${milliseconds.toFixed(1)} ms`;
 }
 
 function StepRow({ step, longest }: { step: Step; longest: number }) {

@@ -10,6 +10,7 @@ import {
     fileName,
     onGround,
     openJson,
+    savePatterns,
     savePng,
     styleError,
     styleText,
@@ -109,16 +110,15 @@ function StyleField() {
         const fresh = styleText();
         if (!touched.peek()) text.value = fresh;
     });
-    const take = async () => {
-        if (await takeStyle(text.value)) {
-            touched.value = false;
-            text.value = styleText();
-        }
-    };
     const drop = () => {
         touched.value = false;
         text.value = styleText();
         styleError.value = '';
+    };
+    const take = async () => {
+        const given = text.value;
+        // What was written while the engine read the style stays.
+        if ((await takeStyle(given)) && text.value === given) drop();
     };
     return (
         <section class="fact" aria-labelledby="save-style">
@@ -234,7 +234,12 @@ function Code() {
                         onClick={() => void copy(shown.text, `Code for ${shown.label}`)}
                     >
                         <Icon name="copy" /> Copy
-                    </button>
+                    </button>{' '}
+                    {Object.keys(work.value.patterns).length > 0 && (
+                        <button type="button" class="button" onClick={() => void savePatterns()}>
+                            <Icon name="load" /> Pictures of patterns
+                        </button>
+                    )}
                     <pre tabIndex={0} aria-label={`Code for ${shown.label}`}>
                         <code>{shown.text}</code>
                     </pre>

@@ -1,7 +1,7 @@
 #pragma once
 
-// The packaged C library for WebAssembly has no setjmp: the compiler makes both calls to the functions of
-// setjmp.c, which throw and catch by the instructions of WebAssembly.
+// The packaged C library for WebAssembly has no setjmp: the compiler makes both calls to the functions
+// of setjmp.c, which throw and catch by the instructions of WebAssembly.
 typedef struct {
     void* call;          // of the function that setjmp stands in
     unsigned int place;  // of the setjmp within it
