@@ -19,3 +19,5 @@ build/python-venv/bin/python -B scripts/docs/python_blocks.py
 [[ -d build/js-consumer/node_modules/voreleffect ]] || scripts/js.sh > /dev/null # the package of JavaScript
 node scripts/docs/js_blocks.mjs build/js-consumer
 python3 -B scripts/docs/build.py "$PWD/build/demo" "$PWD/build/docs"
+# The studio, where it was built, comes along with the site.
+[[ ! -d build/studio ]] || { rm -rf build/docs/html/studio && cp -r build/studio build/docs/html/studio; }

@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
-# Builds the library as WebAssembly modules, with vectors and without, and tests it: the unit tests, the table
-# of hashes and the fuzzing inputs under node at both levels, the modules as they are shipped, and the table in
+# Builds the library as WebAssembly modules, with vectors, without, and with text, and tests it: the unit tests,
+# the table of hashes and the fuzzing inputs under node at both levels, the modules as they are shipped, and the table in
 # headless Chromium. Installs what it needs on Debian (as root).
 #
 #     scripts/wasm.sh            all of it
