@@ -132,7 +132,10 @@ export class Style {
         return bytesOfHex(this.#facts(size, scale).key);
     }
 
-    /** How far it paints beyond the glyphs of a font of `size` pixels. */
+    /**
+     * How far it paints beyond the glyphs of a font of `size` pixels. The faint end of a glow may be a few pixels
+     * farther; the `margins` of a look have room for it.
+     */
     margins(size: number, scale: ScaleOptions = {}): Margins {
         return sidesOf(this.#facts(size, scale).margins);
     }

@@ -43,7 +43,7 @@ export class TextPicture {
     readonly ink: Box;
     /** Of the kind that was asked for. */
     readonly box: Box;
-    /** How far the effects reach beyond the glyphs. */
+    /** How far the effects reach beyond the glyphs; the faint end of a glow may be a few pixels farther. */
     readonly margins: Margins;
     /** Of the looks, for a cache: that of their style, which does not tell the pixels of patterns. */
     readonly key: Uint8Array<ArrayBuffer>;

@@ -225,6 +225,15 @@ test('Style_IsWrittenAsAFunctionOfANameOfOne', () => {
     }
 });
 
+test('Margins_OfAGlowLeaveOutItsFaintEnd', () => {
+    const look = new Look().outerGlow(50, '#0f0');
+    const options = { ...HIGH, look, padding: 200, premultiplied: true };
+    const { width, data, ink, margins } = Text.picture('a', options);
+    const row = Math.floor(data.findIndex((byte) => byte > 0) / 4 / width);
+    assert.equal(margins.top, 50);
+    assert.ok(ink.top - row > margins.top && ink.top - row <= look.margins.top);
+});
+
 test('Key_DoesNotTellThePixelsOfPatterns', () => {
     const of = (red) => {
         const pattern = { width: 1, height: 1, data: Uint8Array.of(red, 0, 0, 255) };
