@@ -41,10 +41,11 @@ bool contains(const Limits<Number>& limits, Number number) {
 template <typename Number>
 std::string spelled(const Limits<Number>& limits) {
     const auto written = [](Number number) {
-        if constexpr (std::is_integral_v<Number>)
+        if constexpr (std::is_integral_v<Number>) {
             return std::to_string(number);
-        else
+        } else {
             return vorelunicode::decimal(double{number});
+        }
     };
     return written(limits.low) + " to " + written(limits.high);
 }
