@@ -18,7 +18,7 @@ to_chars_result copied(char* first, char* last, const char* text, size_t length)
 
 template <typename Number>
 to_chars_result shortest(char* first, char* last, Number number) {
-    char text[vorelscript::kMostLetters];
+    char text[vorelscript::kMostLetters]{};
     return copied(first, last, text, vorelscript::spellShortest(text, number));
 }
 
@@ -34,7 +34,7 @@ to_chars_result to_chars(char* first, char* last, float number) {
 
 /// Of the format "general" alone, which is all that is asked for.
 to_chars_result to_chars(char* first, char* last, double number, chars_format /*format*/, int digits) {
-    char text[vorelscript::kMostLetters];
+    char text[vorelscript::kMostLetters]{};
     const int length = snprintf(text, sizeof text, "%.*g", digits, number);
     return copied(first, last, text, static_cast<size_t>(length));
 }
