@@ -32,12 +32,15 @@ prepare_apt() {
     "${apt[@]}" update
 }
 
-# fetch SOURCE: unpacks it, with Debian's patches, into the folder of its name
+# fetch SOURCE: unpacks it, with Debian's patches, into the folder of its name. Where Debian has gone on to another
+# revision that one is taken, if it is of the same upstream version.
 fetch() {
-    local name=${1%%=*} work
+    local name=${1%%=*} version=${1#*=} work
     [ -n "${apt-}" ] || prepare_apt
     work=$(mktemp -d "$folder/unpacking.XXXXXX")
-    (cd "$work" && "${apt[@]}" source "$1" > /dev/null)
+    (cd "$work" && { "${apt[@]}" source "$1" || "${apt[@]}" source "$name"; } > /dev/null)
+    version=${version#*:} && version=${version%-*}
+    [ -d "$work/$name-$version" ] || { echo "there is no source of $name $version" >&2; return 1; }
     rm -rf "${folder:?}/$name"
     mv "$work/$name"-*/ "$folder/$name"
     rm -r "$work"

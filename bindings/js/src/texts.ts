@@ -95,6 +95,7 @@ export function textsOf(engine: TextEngine, styles: StyleClass): Text {
     const layout = (text: string, options: TextOptions): TextLayout =>
         engine.scoped((scope) => {
             const request = requestIn(scope, requestOf(engine, text, options));
+            styleIn(engine, scope, options.look, styles); // no layout follows a look, but a wrong one is told
             const given = [engine.fonts, ...request];
             const { told, bytes } = engine.answer<ToldLayout>('vorel_text_layout', ...given);
             return {

@@ -190,6 +190,7 @@ test('Text_ThatCannotBeIsRefused', () => {
     refused({}, TextError, /no visible character/, ' ');
     refused({}, RangeError, /surrogate/, '\ud800');
     refused({}, RangeError, /^text: longer than 65536 bytes/, 'x'.repeat(65537));
+    assert.throws(() => Text.layout('a', { ...HIGH, look: 3 }), TypeError);
 });
 
 test('Style_TellsThePathOfWhatIsWrong', () => {
