@@ -30,7 +30,7 @@ test('takes a font that is dropped, and keeps it', async ({ studio }) => {
     const before = await pictureHash(studio);
     await drop(studio, 'My Own.otf', readFileSync('public/fonts/BebasNeue-Bold.otf'));
     const own = await changed(studio, before);
-    await expect(studio.getByLabel('Font', { exact: true })).toHaveValue('My Own');
+    await expect(studio.getByLabel('Font', { exact: true })).toHaveValue('My Own.otf');
     await studio.waitForTimeout(600);
     await studio.reload();
     await expect.poll(() => pictureHash(studio).catch(() => '')).toBe(own);

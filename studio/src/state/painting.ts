@@ -1,5 +1,6 @@
 import { computed, effect, signal } from '@preact/signals';
 import { Engine } from '../engine/engine';
+import { shippedFonts } from '../engine/fonts';
 import type { Facts, Layer, Painted } from '../engine/messages';
 import { missingSupport } from '../engine/support';
 import type { Work } from '../model/work';
@@ -121,7 +122,9 @@ export async function forgetFont(name: string): Promise<void> {
 export async function addFont(file: File): Promise<string> {
     if (file.size > 32 * 1024 * 1024) throw new Error(`${file.name} has more than 32 MiB`);
     const bytes = await file.arrayBuffer();
-    const name = file.name.replace(/\.[^.]*$/, '') || file.name;
+    // With its ending, as a command takes the file where it lies.
+    const isShipped = shippedFonts.some(({ id }) => id === file.name);
+    const name = isShipped ? `${file.name}.font` : file.name;
     try {
         await sendFont(name, bytes);
     } catch (error) {
