@@ -32,8 +32,13 @@ build() {
     (cd studio && node tools/copy_files.js && quietly npx vite build)
 }
 
+# With the tool, whose pictures are compared.
 check() {
-    need_packages chromium
+    need_packages chromium fonts-hosny-amiri
+    if [[ ! -x build/release/tools/vorelpaint ]]; then
+        quietly cmake --preset release
+        quietly cmake --build build/release --target vorelpaint
+    fi
     cd studio
     npx prettier --log-level warn --check .
     npx eslint .

@@ -1,6 +1,6 @@
 import AxeBuilder from '@axe-core/playwright';
 import type { Page } from '@playwright/test';
-import { expect, open, test } from './page';
+import { drop, expect, open, test } from './page';
 
 const panels = ['Text', 'Presets', 'Looks', 'Facts', 'Save'];
 
@@ -88,3 +88,45 @@ for (const dock of [/^Facts:/, /^Save:/]) {
         expect(reached.size).toBe(count);
     });
 }
+
+test('shows its colours where those of the page are forced', async ({ page }) => {
+    await page.emulateMedia({ forcedColors: 'active' });
+    await open(page);
+    await expect(page.locator('.ramp-colours')).toHaveCSS('background-image', /linear-gradient/);
+    await expect(page.locator('.ground-button').nth(2)).toHaveCSS(
+        'background-color',
+        'rgb(255, 255, 255)',
+    );
+});
+
+for (const width of [1000, 1024, 1280, 1440]) {
+    test(`cuts nothing off below the picture, ${width} pixels wide`, async ({ page }) => {
+        await page.setViewportSize({ width, height: 800 });
+        await open(page);
+        await expect(page.locator('.layer')).not.toHaveCount(1);
+        for (const name of [/^Save:/, /^Facts:/]) {
+            await page.getByRole('button', { name }).click();
+            const cut = await page
+                .locator('.dock, .dock-bar, .dock .panel.wide')
+                .evaluateAll((all) => all.some((each) => each.scrollWidth > each.clientWidth));
+            expect(cut, String(name)).toBe(false);
+        }
+    });
+}
+
+test('grows with the letters that the reader has chosen', async ({ page }) => {
+    await open(page);
+    const size = () => page.evaluate(() => parseFloat(getComputedStyle(document.body).fontSize));
+    const before = await size();
+    await page.evaluate(() => (document.documentElement.style.fontSize = '200%'));
+    expect(await size()).toBe(2 * before);
+});
+
+test('has no control beneath a message', async ({ page }) => {
+    await open(page);
+    await page.getByRole('button', { name: /^Facts:/ }).click();
+    await drop(page, 'a.exe', Buffer.from('no'));
+    await expect(page.getByRole('alert')).toBeVisible();
+    await page.getByRole('button', { name: /^Save:/ }).click({ timeout: 2000 });
+    await expect(page.getByRole('tab')).toHaveCount(8);
+});

@@ -56,3 +56,18 @@ export async function changed(page: Page, before: string): Promise<string> {
     await expect.poll(() => pictureHash(page)).not.toBe(before);
     return pictureHash(page);
 }
+
+/** Drops a file of these bytes onto the page. */
+export async function drop(page: Page, name: string, bytes: Uint8Array): Promise<void> {
+    const transfer = await page.evaluateHandle(
+        ({ name, base64 }) => {
+            const binary = atob(base64);
+            const array = Uint8Array.from(binary, (letter) => letter.charCodeAt(0));
+            const data = new DataTransfer();
+            data.items.add(new File([array], name));
+            return data;
+        },
+        { name, base64: Buffer.from(bytes).toString('base64') },
+    );
+    await page.dispatchEvent('.stage', 'drop', { dataTransfer: transfer });
+}

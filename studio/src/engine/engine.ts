@@ -105,6 +105,7 @@ export class Engine {
         worker.onmessage = (event: MessageEvent<Answer>) => this.answered(event.data);
         worker.onerror = (event) => {
             event.preventDefault();
+            if (worker !== this.worker) return;
             this.restart(event.message || 'the painting worker stopped');
         };
         return worker;

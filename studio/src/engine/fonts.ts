@@ -22,7 +22,7 @@ export const shippedFonts: readonly ShippedFont[] = [
         label: 'Lobster',
         file: 'Lobster.otf',
         licence: 'fonts-lobster.txt',
-        query: 'Lobster',
+        query: 'Lobster Two',
     },
     {
         id: 'bebas-neue-bold',

@@ -117,7 +117,10 @@ export class Studio {
         return {
             toCpp: (style, size, { name, patterns, ...options }) =>
                 this.style(style, patterns).toCpp(name, size, options),
-            fontName: (id) => shippedFonts.find((font) => font.id === id)?.query ?? id,
+            fontNames: (work) =>
+                this.fontIds(work).map(
+                    (id) => shippedFonts.find((font) => font.id === id)?.query ?? id,
+                ),
         };
     }
 
@@ -144,10 +147,14 @@ export class Studio {
         };
     }
 
-    private fontsOf(work: Work): Promise<Font[]> {
+    /** The chosen font, and those that have what it lacks. */
+    private fontIds(work: Work): string[] {
         const more = this.lacking === lackingKey(work) ? fallbackFonts : [];
-        const names = new Set([work.font, ...more]);
-        return Promise.all([...names].map((name) => this.font(name)));
+        return [...new Set([work.font, ...more])];
+    }
+
+    private fontsOf(work: Work): Promise<Font[]> {
+        return Promise.all(this.fontIds(work).map((name) => this.font(name)));
     }
 
     private font(name: string): Promise<Font> {

@@ -19,6 +19,11 @@ async function begin(): Promise<Studio> {
 
 const studio = begin();
 
+// Held for life, so that the page gets it when this worker ends.
+if ('locks' in navigator) {
+    navigator.locks.request(scope.name, () => new Promise(() => undefined)).catch(() => undefined);
+}
+
 type Answers = { [Name in CallName]: (ask: Calls[Name]['ask']) => Promise<Calls[Name]['answer']> };
 
 const answers: Answers = {

@@ -2,7 +2,7 @@ import { noted } from './exported';
 import type { Exporter } from './exported';
 import { patternFiles } from './patterns';
 import { styleName } from './style';
-import { fontName, textOptions } from './text_options';
+import { fontNames, textOptions } from './text_options';
 import { hasUnseen, printable, printfFormat, sentence, shellWord, wellFormed } from './words';
 
 const width = 100;
@@ -33,7 +33,7 @@ export const command: Exporter = (work, engine) => {
     const { before, word } = textWord(work.text);
     const options: [string, string | number | undefined][] = [
         ['--style', styleName],
-        ['--font', fontName(work, engine)],
+        ...fontNames(work, engine).map((name): [string, string] => ['--font', name]),
         ['--size', work.size],
         ['--align', align],
         ['--line-height', lineHeight],

@@ -26,8 +26,8 @@ export interface CppOptions {
 export interface ExportEngine {
     /** The style as calls of the library's classes, for a font of `size` pixels. */
     toCpp(style: StyleFile, size: number, options: CppOptions): string;
-    /** What `vorelpaint --font` takes for a font of the work; without it, the font's own name. */
-    fontName?(font: string): string;
+    /** What `vorelpaint --font` takes for the fonts of the work's text; without it, its font's own name. */
+    fontNames?(work: Work): readonly string[];
 }
 
 /** Writes a work that check.ts has found to be one; of its words it takes any. Throws nothing of its own. */

@@ -13,6 +13,7 @@ export type { CppOptions, Exported, Exporter, ExportEngine } from './exported';
 export { patternFiles, patternPictures } from './patterns';
 export { png } from './png';
 export { resolved } from './resolve';
+export { style as styleFile } from './style';
 
 export type ExportName =
     'style' | 'cpp-look' | 'cpp-classes' | 'c' | 'java' | 'python' | 'javascript' | 'command';

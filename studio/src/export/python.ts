@@ -5,7 +5,7 @@ import type { EffectCall, PlacedLook, RampStop } from './looks';
 import { isPlainStack, placedLooks } from './looks';
 import { spelled } from './numbers';
 import { patternFiles, patternNote, withPatternFiles } from './patterns';
-import { fontName, textOptions } from './text_options';
+import { fontNames, textOptions } from './text_options';
 import { sentence, stringLiteral } from './words';
 import type { Work } from '../model/work';
 import { python as notation, written } from './written';
@@ -99,13 +99,14 @@ function styleValue(work: Work): string {
 }
 
 /** The call that paints. */
-function painting(work: Work, font: string, opacity: number): string {
+function painting(work: Work, fonts: readonly string[], opacity: number): string {
     const { align, lineHeight, letterSpacing, markup, padding, background } = textOptions(work);
     const spacing =
         typeof letterSpacing === 'string' ? stringLiteral(letterSpacing, '"') : letterSpacing;
+    const names = fonts.map((font) => stringLiteral(font, '"'));
     const parts = [
         stringLiteral(work.text, '"'),
-        `font=${stringLiteral(font, '"')}`,
+        `font=${names.length === 1 ? names[0] : `[${names.join(', ')}]`}`,
         `size=${work.size}`,
         'look=look',
         ...(align === undefined ? [] : [`align=${stringLiteral(align, '"')}`]),
@@ -137,7 +138,7 @@ export const python: Exporter = (work, engine) => {
         said === '' ? '' : `# ${sentence(said)}\n`,
         isPlain ? lookValues(work, looks) : styleValue(work),
         // Looks as values have the work's opacity in them.
-        painting(work, fontName(work, engine), isPlain ? 1 : work.opacity),
+        painting(work, fontNames(work, engine), isPlain ? 1 : work.opacity),
         'image.save("title.png")\n',
     ].join('');
     const size = isPlain ? `Lengths are in pixels, for text of ${work.size} pixels.` : undefined;

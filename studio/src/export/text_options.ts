@@ -27,7 +27,7 @@ export function textOptions(work: Work): TextOptions {
     };
 }
 
-/** What --font and the package of Python take for the work's font. */
-export function fontName(work: Work, engine: ExportEngine): string {
-    return engine.fontName?.(work.font) ?? work.font;
+/** What --font and the package of Python take for the fonts of the work: each has what those before it lack. */
+export function fontNames(work: Work, engine: ExportEngine): readonly string[] {
+    return engine.fontNames?.(work) ?? [work.font];
 }

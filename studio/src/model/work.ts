@@ -14,7 +14,7 @@ export interface Work {
     text: string;
     /** Whether `<c #RRGGBB>word</c>` in the text colours words. */
     markup: boolean;
-    /** Id of a shipped font, or the name of the person's own. */
+    /** Id of a shipped font, or the file's name of the person's own. */
     font: string;
     /** Whole pixels, 1 to 1000. */
     size: number;

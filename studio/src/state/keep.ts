@@ -4,10 +4,14 @@ const stores = { work: 'work', fonts: 'fonts' } as const;
 
 export type Store = keyof typeof stores;
 
+/** Milliseconds after which a browser that does not answer is taken for one that keeps nothing. */
+const patience = 3000;
+
 let opened: Promise<IDBDatabase | undefined> | undefined;
 
 function open(): Promise<IDBDatabase | undefined> {
     opened ??= new Promise((done) => {
+        setTimeout(() => done(undefined), patience);
         try {
             const request = indexedDB.open('voreleffect-studio', 1);
             request.onupgradeneeded = () => {
@@ -30,16 +34,43 @@ function settled<T>(request: IDBRequest<T>): Promise<T | undefined> {
     });
 }
 
-export async function get(store: Store, key: string): Promise<unknown> {
+/** The store to be read; a database that was taken away meanwhile has none. */
+async function readable(store: Store): Promise<IDBObjectStore | undefined> {
+    try {
+        return (await open())?.transaction(store).objectStore(store);
+    } catch {
+        return undefined;
+    }
+}
+
+/** Makes the change and resolves to whether it was kept: a full disk shows only when all is written. */
+async function changed(
+    store: Store,
+    change: (objects: IDBObjectStore) => unknown,
+): Promise<boolean> {
     const database = await open();
-    return database && settled(database.transaction(store).objectStore(store).get(key));
+    if (!database) return false;
+    return new Promise((done) => {
+        try {
+            const transaction = database.transaction(store, 'readwrite');
+            transaction.oncomplete = () => done(true);
+            transaction.onabort = () => done(false);
+            change(transaction.objectStore(store));
+        } catch {
+            done(false);
+        }
+    });
+}
+
+export async function get(store: Store, key: string): Promise<unknown> {
+    const from = await readable(store);
+    return from && settled(from.get(key));
 }
 
 /** Every value of a store by its key. */
 export async function all(store: Store): Promise<[string, unknown][]> {
-    const database = await open();
-    if (!database) return [];
-    const from = database.transaction(store).objectStore(store);
+    const from = await readable(store);
+    if (!from) return [];
     const [keys, values] = await Promise.all([settled(from.getAllKeys()), settled(from.getAll())]);
     return (keys ?? []).map((key, at) => [
         typeof key === 'string' ? key : '',
@@ -48,21 +79,12 @@ export async function all(store: Store): Promise<[string, unknown][]> {
 }
 
 /** Whether it could be kept: a full disk is no reason to stop. */
-export async function put(store: Store, key: string, value: unknown): Promise<boolean> {
-    const database = await open();
-    if (!database) return false;
-    try {
-        const request = database.transaction(store, 'readwrite').objectStore(store).put(value, key);
-        return (await settled(request)) !== undefined;
-    } catch {
-        return false;
-    }
+export function put(store: Store, key: string, value: unknown): Promise<boolean> {
+    return changed(store, (objects) => objects.put(value, key));
 }
 
 export async function remove(store: Store, key: string): Promise<void> {
-    const database = await open();
-    if (database)
-        await settled(database.transaction(store, 'readwrite').objectStore(store).delete(key));
+    await changed(store, (objects) => objects.delete(key));
 }
 
 /** Small settings of the page, in localStorage. */

@@ -1,6 +1,6 @@
 import { signal } from '@preact/signals';
 import type { Code } from '../engine/messages';
-import { patternPictures } from '../export';
+import { patternPictures, styleFile } from '../export';
 import { asWork, CheckError, readStyle } from '../model/check';
 import { writeLink } from '../model/permalink';
 import { notice } from './notices';
@@ -44,6 +44,12 @@ export async function savePng(scale: number): Promise<void> {
     } catch (error) {
         notice('error', `No PNG: ${(error as Error).message}`);
     }
+}
+
+/** The style file, by the name that commands and programs ask for. */
+export function saveStyle(): void {
+    const { name, text } = styleFile(work.value);
+    download(name, text, 'application/json');
 }
 
 /** The pictures of patterns, which lie beside a style file or a program. */

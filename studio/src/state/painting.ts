@@ -1,9 +1,11 @@
 import { computed, effect, signal } from '@preact/signals';
 import { Engine } from '../engine/engine';
+import { shippedFonts } from '../engine/fonts';
 import type { Facts, Layer, Painted } from '../engine/messages';
 import { missingSupport } from '../engine/support';
 import type { Work } from '../model/work';
 import * as keep from './keep';
+import { notice } from './notices';
 import { announce, work } from './store';
 
 /** The picture of the work and what is known of it. */
@@ -29,11 +31,15 @@ export const ownFonts = signal<string[]>([]);
 export const engine: Engine | undefined = unsupported.value ? undefined : startEngine();
 
 function startEngine(): Engine {
-    const start = () =>
-        new Worker(new URL('../engine/worker.ts', import.meta.url), {
+    const start = () => {
+        const name = `painter ${crypto.randomUUID()}`;
+        const worker = new Worker(new URL('../engine/worker.ts', import.meta.url), {
             type: 'module',
-            name: 'painter',
+            name,
         });
+        worker.addEventListener('message', () => watch(worker, name), { once: true });
+        return worker;
+    };
     return new Engine(start, {
         painted(result, of) {
             picture.value = result;
@@ -43,12 +49,18 @@ function startEngine(): Engine {
         },
         failed(reason, dead) {
             failure.value = dead
-                ? `${reason} Painting was started anew; the last picture stays.`
+                ? `${reason.replace(/\.$/, '')}. Painting was started anew; the last picture stays.`
                 : reason;
             announce(failure.value);
         },
         restarted: () => void sendOwnFonts(),
     });
+}
+
+/** A worker holds the lock of its name as long as it lives: who gets it finds that the worker has ended. */
+function watch(worker: Worker, name: string): void {
+    const ended = () => worker.dispatchEvent(new ErrorEvent('error', { cancelable: true }));
+    if ('locks' in navigator) navigator.locks.request(name, ended).catch(() => undefined);
 }
 
 let factsTimer: ReturnType<typeof setTimeout> | undefined;
@@ -121,7 +133,9 @@ export async function forgetFont(name: string): Promise<void> {
 export async function addFont(file: File): Promise<string> {
     if (file.size > 32 * 1024 * 1024) throw new Error(`${file.name} has more than 32 MiB`);
     const bytes = await file.arrayBuffer();
-    const name = file.name.replace(/\.[^.]*$/, '') || file.name;
+    // With its ending, as a command takes the file where it lies.
+    const isShipped = shippedFonts.some(({ id }) => id === file.name);
+    const name = isShipped ? `${file.name}.font` : file.name;
     try {
         await sendFont(name, bytes);
     } catch (error) {
@@ -130,6 +144,8 @@ export async function addFont(file: File): Promise<string> {
         });
     }
     ownFonts.value = [...new Set([...ownFonts.value, name])];
-    await keep.put('fonts', name, bytes);
+    if (!(await keep.put('fonts', name, bytes))) {
+        notice('error', `${file.name} could not be kept, and is there until the page is left.`);
+    }
     return name;
 }

@@ -4,6 +4,7 @@ import spray from '../../../style/presets/spray.png?url';
 import stripes from '../../../style/presets/stripes.png?url';
 import tiles from '../../../style/presets/tiles.png?url';
 import { imagesOf } from '../export/patterns';
+import { limits } from '../model/check';
 import type { StyleFile } from '../model/style_file';
 import type { PatternPixels, Work } from '../model/work';
 import { engine } from './painting';
@@ -19,6 +20,8 @@ const shipped: Record<string, string> = {
 };
 
 export const shippedPatterns: readonly string[] = Object.keys(shipped);
+
+const tooMany = `a work has at most ${limits.patterns} patterns`;
 
 const read = new Map<string, Promise<PatternPixels>>();
 
@@ -62,6 +65,9 @@ export async function patternsFor(
     given: Record<string, PatternPixels>,
 ): Promise<Record<string, PatternPixels>> {
     const names = imagesOf(style);
+    if (names.length > limits.patterns) {
+        throw new Error(tooMany);
+    }
     const pixels = await Promise.all(
         names.map((name) => {
             const known = Object.hasOwn(given, name) ? given[name] : undefined;
@@ -74,4 +80,16 @@ export async function patternsFor(
 /** The work with another style and the pictures that it needs. */
 export async function withStyleAndPatterns(work: Work, style: StyleFile): Promise<Work> {
     return { ...work, style, patterns: await patternsFor(style, work.patterns) };
+}
+
+/**
+ * The work with the pixels of a pattern. Where it has too many, those go that no look asks for; throws a sentence
+ * for the reader where all are asked for.
+ */
+export function withPattern(work: Work, name: string, pixels: PatternPixels): Work {
+    const used = imagesOf(work.style);
+    if (used.length > limits.patterns) throw new Error(tooMany);
+    const all = Object.entries({ ...work.patterns, [name]: pixels });
+    const kept = all.length > limits.patterns ? all.filter(([image]) => used.includes(image)) : all;
+    return { ...work, patterns: Object.fromEntries(kept) };
 }

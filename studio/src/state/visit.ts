@@ -9,16 +9,20 @@ import { beginWith, replaceWork, work } from './store';
 export async function beginVisit(): Promise<void> {
     const before = await keptWork();
     if (before) beginWith(before);
+    startKeeping();
     await openLink();
     addEventListener('hashchange', () => void openLink());
-    startKeeping();
 }
 
 async function keptWork() {
+    const kept = await keep.get('work', 'now');
     try {
-        const kept = await keep.get('work', 'now');
         return kept === undefined ? undefined : asWork(kept);
-    } catch {
+    } catch (error) {
+        notice(
+            'error',
+            `The work of the last visit could not be opened: ${(error as Error).message}`,
+        );
         return undefined;
     }
 }
@@ -39,12 +43,26 @@ async function openLink(): Promise<void> {
     }
 }
 
+const nothingKept =
+    'This browser keeps nothing of this page, or has no room: download the whole work before you leave.';
+
+/** Keeps each change. A tab in which nothing was changed leaves alone what another one has kept. */
 function startKeeping(): void {
     let timer: ReturnType<typeof setTimeout> | undefined;
-    const keepNow = () => void keep.put('work', 'now', work.peek());
+    let kept = work.peek();
+    let told = false;
+    const keepNow = async () => {
+        clearTimeout(timer);
+        const now = work.peek();
+        if (now === kept) return;
+        kept = now;
+        if ((await keep.put('work', 'now', now)) || told) return;
+        told = true;
+        notice('error', nothingKept);
+    };
     work.subscribe(() => {
         clearTimeout(timer);
-        timer = setTimeout(keepNow, 300);
+        timer = setTimeout(() => void keepNow(), 300);
     });
-    addEventListener('pagehide', keepNow);
+    addEventListener('pagehide', () => void keepNow());
 }

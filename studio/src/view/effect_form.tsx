@@ -2,7 +2,7 @@ import { freshEffects, setField } from '../model/edit';
 import { fieldsOf, type Field } from '../model/schema';
 import type { EffectName, Length, LookStyle, Stop } from '../model/style_file';
 import { notice } from '../state/notices';
-import { ownPattern, shippedPattern, shippedPatterns } from '../state/patterns';
+import { ownPattern, shippedPattern, shippedPatterns, withPattern } from '../state/patterns';
 import { edit, editLook, work } from '../state/store';
 import { ChoiceField, ColourField, FileButton, LengthField, NumberField } from './fields';
 import { GradientEditor } from './gradient';
@@ -176,11 +176,7 @@ export async function choosePattern(lookIndex: number, from: string | File): Pro
                       }
                     : look,
             );
-            return {
-                ...now,
-                style: { ...now.style, looks },
-                patterns: { ...now.patterns, [name]: pixels },
-            };
+            return withPattern({ ...now, style: { ...now.style, looks } }, name, pixels);
         });
     } catch (error) {
         notice('error', (error as Error).message);

@@ -27,6 +27,7 @@ function valueWithin(input: HTMLInputElement, min: number, max: number): number 
 export function NumberField(props: NumberProps) {
     const { label, help, value, min, max, step, sliderMax = max, onChange, unit } = props;
     const id = useId();
+    const shown = Math.round(value * 1000) / 1000;
     const taken = (event: Event) => {
         const number = valueWithin(event.currentTarget as HTMLInputElement, min, max);
         if (number !== undefined) onChange(number);
@@ -50,8 +51,10 @@ export function NumberField(props: NumberProps) {
                     min={min}
                     max={max}
                     step="any"
-                    value={Math.round(value * 1000) / 1000}
+                    value={shown}
                     onInput={taken}
+                    // What could not be taken does not stay as if it were.
+                    onBlur={(event) => (event.currentTarget.value = String(shown))}
                 />
                 {unit}
             </span>

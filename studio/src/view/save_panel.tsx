@@ -12,6 +12,7 @@ import {
     openJson,
     savePatterns,
     savePng,
+    saveStyle,
     styleError,
     styleText,
     takeStyle,
@@ -151,11 +152,7 @@ function StyleField() {
                 <button type="button" class="button" disabled={!touched.value} onClick={drop}>
                     Drop changes
                 </button>
-                <button
-                    type="button"
-                    class="button"
-                    onClick={() => download(fileName('.json'), styleText(), 'application/json')}
-                >
+                <button type="button" class="button" onClick={saveStyle}>
                     <Icon name="load" /> Download
                 </button>
                 <button

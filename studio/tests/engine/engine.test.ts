@@ -48,6 +48,14 @@ describe('the engine', () => {
         );
     });
 
+    it('does not mind the end of a worker that it has given up', () => {
+        const first = worker();
+        first.onerror?.({ message: 'gone', preventDefault: vi.fn() });
+        first.onerror?.({ message: 'gone', preventDefault: vi.fn() });
+        expect(SlowWorker.all).toHaveLength(2);
+        expect(listener.failed.mock.calls).toEqual([['gone', true]]);
+    });
+
     it('paints the newest work and drops those that it overtook', async () => {
         for (const size of [10, 11, 12, 13]) engine.paint(sized(size));
         worker().answer('first');

@@ -347,10 +347,11 @@ two'
     it.each(['0', '0%', '0px', '-0.0'])('has no letter spacing of %s', (letterSpacing) => {
         expect(textOf('command', [{}], { letterSpacing })).not.toContain('spacing');
     });
-    it('has a font by the name that others know', () => {
-        const known = { ...engine, fontName: (font: string) => `${font}!` };
-        const { text } = exporters.command(workOf([{}], { font: 'sans' }), known);
-        expect(text).toContain("--font 'sans!'");
+    it('has the fonts by the names that others know', () => {
+        const known = { ...engine, fontNames: ({ font }: Work) => [`${font}!`, 'Other'] };
+        const work = workOf([{}], { font: 'sans' });
+        expect(exporters.command(work, known).text).toContain("--font 'sans!' --font Other");
+        expect(exporters.python(work, known).text).toContain('font=["sans!", "Other"]');
     });
     it('has colours of words that masks have not, as the note says', () => {
         for (const name of ['cpp-look', 'c', 'java', 'cpp-classes'] as const)
