@@ -64,11 +64,56 @@ test('has no more patterns than it can keep', async ({ studio }) => {
 test('paints again when its worker has ended', async ({ studio }) => {
     const before = await pictureHash(studio);
     await studio.workers()[0]?.evaluate(() => self.close());
-    await expect(studio.locator('.trouble')).toContainText('started anew; the last picture stays');
+    await expect(studio.locator('.notice')).toContainText('started anew; the last picture stays');
     expect(await pictureHash(studio)).toBe(before);
     await textField(studio).fill('Again');
     await expect(picture(studio)).toHaveAccessibleName('Painted text: Again');
     await expect(studio.locator('.trouble')).toHaveCount(0);
+});
+
+test('says that it still paints, and stops where it is asked to', async ({ studio }) => {
+    const before = await pictureHash(studio);
+    // The worker is busy for so long that the picture waits.
+    studio
+        .workers()[0]
+        ?.evaluate(() => {
+            const end = Date.now() + 25_000;
+            while (Date.now() < end);
+        })
+        .catch(() => undefined);
+    await textField(studio).fill('Slow');
+    await studio.getByRole('button', { name: 'Stop', exact: true }).click();
+    await expect(studio.getByText('Still painting')).toHaveCount(0);
+    await expect(studio.locator('.trouble')).toContainText('Stopped');
+    await expect(studio.locator('.trouble')).toContainText('the last picture stays');
+    expect(await pictureHash(studio)).toBe(before);
+    await textField(studio).fill('Quick');
+    await expect(picture(studio)).toHaveAccessibleName('Painted text: Quick');
+    await expect(studio.locator('.trouble')).toHaveCount(0);
+});
+
+test('closes by itself what a success has made untrue', async ({ studio }) => {
+    const alerts = studio.getByRole('alert');
+    await studio.evaluate(() => {
+        let refused = false;
+        const written = () =>
+            (refused = !refused) ? Promise.reject(new DOMException()) : Promise.resolve();
+        Object.defineProperty(navigator.clipboard, 'writeText', { value: written });
+    });
+    await studio.getByRole('button', { name: /^Save:/ }).click();
+    await studio.getByRole('button', { name: 'Copy link' }).click();
+    await expect(alerts).toContainText('could not be copied');
+    await drop(studio, 'broken.ttf', new Uint8Array(40));
+    await expect(alerts).toHaveCount(2);
+    await studio.getByRole('button', { name: 'Copy link' }).click();
+    await expect(alerts).toHaveCount(1);
+    await drop(studio, 'broken.json', new TextEncoder().encode('{'));
+    await expect(alerts).toHaveCount(2);
+    await expect(studio.locator('#style-error')).toBeEmpty();
+    await drop(studio, 'good.json', new TextEncoder().encode('{"version": 1}'));
+    await expect(alerts).toHaveCount(1);
+    await drop(studio, 'good.otf', readFileSync('public/fonts/Lobster.otf'));
+    await expect(alerts).toHaveCount(0);
 });
 
 test('shows the number that counts where another one could not be taken', async ({ studio }) => {

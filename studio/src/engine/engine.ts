@@ -13,6 +13,8 @@ export interface Listener {
     failed(reason: string, dead: boolean): void;
     /** A new worker runs, which knows no fonts of the person's own. */
     restarted(): void;
+    /** Whether the worker has been at one question for longer than a person waits without asking why. */
+    slow(slow: boolean): void;
 }
 
 /** A question was overtaken by one of the same kind, or the worker ended before it answered. */
@@ -28,6 +30,9 @@ interface Waiting {
 /** Milliseconds after which a worker that does not answer is given up. */
 const patience = 30_000;
 
+/** Milliseconds after which it is told that the worker is slow. */
+const unasked = 1500;
+
 /** Workers that may end before a picture, until what waits is given up instead of asked again. */
 const mostDeaths = 3;
 
@@ -39,6 +44,7 @@ export class Engine {
     /** Workers that ended since the last picture. */
     private deaths = 0;
     private timer: ReturnType<typeof setTimeout> | undefined;
+    private hint: ReturnType<typeof setTimeout> | undefined;
 
     constructor(
         private readonly start: () => Worker,
@@ -89,13 +95,23 @@ export class Engine {
 
     /** Ends the worker and starts another one; what waits is asked again, what was with the worker fails. */
     restart(reason: string): void {
+        this.deaths++;
+        this.startAnew(reason);
+    }
+
+    /** As `restart`, because a person would not wait: the worker did nothing wrong. */
+    stop(): void {
+        this.startAnew('Stopped');
+    }
+
+    private startAnew(reason: string): void {
         this.worker.terminate();
         this.worker = this.started();
         const lost = this.current;
         this.settle();
         lost?.fail(new Dropped(reason));
         this.listener.failed(reason, true);
-        if (++this.deaths < mostDeaths) this.listener.restarted();
+        if (this.deaths < mostDeaths) this.listener.restarted();
         else for (const waiting of this.queue.splice(0)) waiting.fail(new Dropped(reason));
         this.next();
     }
@@ -126,11 +142,14 @@ export class Engine {
             () => this.restart('painting took too long and was given up'),
             patience,
         );
+        this.hint = setTimeout(() => this.listener.slow(true), unasked);
         this.worker.postMessage(waiting.ask, waiting.transfer);
     }
 
     private settle(): void {
         clearTimeout(this.timer);
+        clearTimeout(this.hint);
+        this.listener.slow(false);
         this.current = undefined;
     }
 

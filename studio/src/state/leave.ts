@@ -3,7 +3,7 @@ import type { Code } from '../engine/messages';
 import { patternPictures, styleFile } from '../export';
 import { asWork, CheckError, readStyle } from '../model/check';
 import { writeLink } from '../model/permalink';
-import { notice } from './notices';
+import { notice, settle } from './notices';
 import { engine } from './painting';
 import { withStyleAndPatterns } from './patterns';
 import { announce, replaceWork, work } from './store';
@@ -39,10 +39,11 @@ export async function savePng(scale: number): Promise<void> {
         });
         if (!result) return;
         download(fileName(scale > 1 ? `@${scale}x.png` : '.png'), result.bytes, 'image/png');
-        if (result.notes.length > 0) notice('info', result.notes.join(' '));
+        settle('png');
+        if (result.notes.length > 0) notice('info', 'png', result.notes.join(' '));
         announce('PNG saved');
     } catch (error) {
-        notice('error', `No PNG: ${(error as Error).message}`);
+        notice('error', 'png', `No PNG: ${(error as Error).message}`);
     }
 }
 
@@ -63,9 +64,9 @@ export async function savePatterns(): Promise<void> {
 export async function copy(text: string, what: string): Promise<void> {
     try {
         await navigator.clipboard.writeText(text);
-        notice('info', `${what} copied.`);
+        notice('info', 'copy', `${what} copied.`);
     } catch {
-        notice('error', `${what} could not be copied: the browser does not allow it here.`);
+        notice('error', 'copy', `${what} could not be copied: the browser does not allow it here.`);
     }
 }
 
@@ -79,25 +80,20 @@ export async function copyLink(): Promise<void> {
         address.hash = await writeLink(work.value);
         await copy(address.href, `Link of ${address.href.length} characters`);
     } catch (error) {
-        notice('error', (error as Error).message);
+        notice('error', 'copy', (error as Error).message);
     }
 }
 
-/** What is wrong with the style that was opened last, for beside its field. */
-export const styleError = signal('');
-
-/** Takes the text of a style file as the style of the work, or tells in `styleError` why not. */
-export async function takeStyle(text: string): Promise<boolean> {
+/** Takes the text of a style file as the style of the work. Resolves to why not, or to an empty text. */
+export async function takeStyle(text: string): Promise<string> {
     try {
         const taken = await withStyleAndPatterns(work.value, readStyle(text));
         await engine?.call('style', { style: taken.style, patterns: taken.patterns });
         replaceWork(taken);
-        styleError.value = '';
         announce('Style taken');
-        return true;
+        return '';
     } catch (error) {
-        styleError.value = (error as Error).message;
-        return false;
+        return (error as Error).message;
     }
 }
 
@@ -105,7 +101,8 @@ export async function takeStyle(text: string): Promise<boolean> {
 export async function openJson(file: File): Promise<void> {
     const wrong =
         file.size > maxFile ? 'it has more than 64 MiB' : await takeJson(await file.text());
-    if (wrong) notice('error', `${file.name}: ${wrong}`);
+    if (wrong) notice('error', 'file', `${file.name}: ${wrong}`);
+    else settle('file');
 }
 
 const maxFile = 64 * 1024 * 1024;
@@ -114,7 +111,7 @@ const maxFile = 64 * 1024 * 1024;
 async function takeJson(text: string): Promise<string> {
     const whole = readWork(text);
     if (whole instanceof CheckError) return whole.message;
-    if (!whole) return (await takeStyle(text)) ? '' : styleError.value;
+    if (!whole) return takeStyle(text);
     replaceWork(whole);
     return '';
 }

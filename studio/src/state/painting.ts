@@ -15,6 +15,8 @@ export const picture = signal<Painted | undefined>(undefined);
 export const pictured = signal<Work | undefined>(undefined);
 /** Why the work as it stands is not painted; empty when it is. */
 export const failure = signal('');
+/** Whether the worker has been at something for a while. */
+export const isSlow = signal(false);
 /** Why this browser cannot paint at all. */
 export const unsupported = signal(missingSupport());
 export const facts = signal<Facts | undefined>(undefined);
@@ -48,13 +50,22 @@ function startEngine(): Engine {
             askFacts(of);
         },
         failed(reason, dead) {
-            failure.value = dead
-                ? `${reason.replace(/\.$/, '')}. Painting was started anew; the last picture stays.`
-                : reason;
-            announce(failure.value);
+            const told = dead ? startedAnew(reason) : reason;
+            // What shows the work as it is needs no newer work to be true again.
+            if (dead && pictured.value === work.value) notice('info', 'painter', told);
+            else failure.value = told;
+            announce(told);
+        },
+        slow(slow) {
+            isSlow.value = slow;
         },
         restarted: () => void sendOwnFonts(),
     });
+}
+
+function startedAnew(reason: string): string {
+    const stays = picture.value ? '; the last picture stays' : '';
+    return `${reason.replace(/\.$/, '')}. Painting was started anew${stays}.`;
 }
 
 /** A worker holds the lock of its name as long as it lives: who gets it finds that the worker has ended. */
@@ -145,7 +156,11 @@ export async function addFont(file: File): Promise<string> {
     }
     ownFonts.value = [...new Set([...ownFonts.value, name])];
     if (!(await keep.put('fonts', name, bytes))) {
-        notice('error', `${file.name} could not be kept, and is there until the page is left.`);
+        notice(
+            'error',
+            'kept fonts',
+            `${file.name} could not be kept, and is there until the page is left.`,
+        );
     }
     return name;
 }

@@ -6,7 +6,7 @@ import { firstWork, type Work } from '../model/work';
 import { engine, picture } from './painting';
 import { patternsFor, withStyleAndPatterns } from './patterns';
 import { replaceWork, work } from './store';
-import { notice } from './notices';
+import { notice, settle } from './notices';
 
 const files = import.meta.glob<string>('../../../style/presets/*.json', {
     query: '?raw',
@@ -54,7 +54,8 @@ export function paintPresets(): void {
 export async function usePreset(preset: Preset): Promise<void> {
     try {
         replaceWork(await withStyleAndPatterns(work.value, preset.style));
+        settle('pattern');
     } catch (error) {
-        notice('error', (error as Error).message);
+        notice('error', 'pattern', (error as Error).message);
     }
 }

@@ -1,7 +1,7 @@
 import { computed, signal } from '@preact/signals';
 import { keepSetting, setting } from './keep';
 import * as keep from './keep';
-import { notice } from './notices';
+import { notice, settle } from './notices';
 import { picture, wantsFacts } from './painting';
 
 /** How the picture is looked at: zoom, place, ground and what is drawn over it. */
@@ -88,9 +88,10 @@ export async function useGround(file: File): Promise<boolean> {
         const bitmap = await createImageBitmap(file);
         bitmap.close();
     } catch {
-        notice('error', `${file.name} is no picture that this browser can show`);
+        notice('error', 'ground', `${file.name} is no picture that this browser can show`);
         return false;
     }
+    settle('ground');
     if (groundPicture.value) URL.revokeObjectURL(groundPicture.value);
     groundPicture.value = URL.createObjectURL(file);
     await keep.put('work', 'ground', file);

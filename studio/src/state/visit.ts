@@ -1,7 +1,7 @@
 import { asWork } from '../model/check';
 import { readLink } from '../model/permalink';
 import * as keep from './keep';
-import { notice } from './notices';
+import { notice, settle } from './notices';
 import { beginWith, replaceWork, work } from './store';
 
 /** How a visit begins, from a link or from what was there the last time, and how it is kept. */
@@ -21,6 +21,7 @@ async function keptWork() {
     } catch (error) {
         notice(
             'error',
+            'work',
             `The work of the last visit could not be opened: ${(error as Error).message}`,
         );
         return undefined;
@@ -34,10 +35,11 @@ async function openLink(): Promise<void> {
     window.history.replaceState(null, '', location.pathname + location.search);
     try {
         replaceWork(await readLink(fragment));
-        notice('info', 'Opened from the link. Undo brings back what was here before.');
+        notice('info', 'file', 'Opened from the link. Undo brings back what was here before.');
     } catch (error) {
         notice(
             'error',
+            'file',
             `The link could not be opened: ${(error as Error).message}. Nothing was changed.`,
         );
     }
@@ -56,9 +58,13 @@ function startKeeping(): void {
         const now = work.peek();
         if (now === kept) return;
         kept = now;
-        if ((await keep.put('work', 'now', now)) || told) return;
-        told = true;
-        notice('error', nothingKept);
+        if (await keep.put('work', 'now', now)) {
+            told = false;
+            settle('keeping');
+        } else if (!told) {
+            told = true;
+            notice('error', 'keeping', nothingKept);
+        }
     };
     work.subscribe(() => {
         clearTimeout(timer);

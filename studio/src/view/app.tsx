@@ -3,7 +3,7 @@ import { useEffect } from 'preact/hooks';
 import { firstWork } from '../model/work';
 import { picture } from '../state/painting';
 import { announced, canRedo, canUndo, openLook, redo, replaceWork, undo } from '../state/store';
-import { close, notices, notice } from '../state/notices';
+import { close, notices, notice, settle } from '../state/notices';
 import { openJson } from '../state/leave';
 import { theme, turnTheme } from '../state/theme';
 import { dock, openDock, openTab, tab, type Tab } from '../state/viewing';
@@ -124,7 +124,7 @@ function Header() {
 /** The work of a first visit, in place of this one. */
 function startOver(): void {
     replaceWork(firstWork);
-    notice('info', 'A new work. Undo brings back the one before.');
+    notice('info', 'work', 'A new work. Undo brings back the one before.');
 }
 
 /** Size of the picture, and what it took to paint. */
@@ -238,8 +238,14 @@ function useDrop(): boolean {
 
 function takeFile(file: File): void {
     const ending = file.name.split('.').at(-1)?.toLowerCase() ?? '';
+    settle('file');
     if (['ttf', 'otf', 'ttc', 'otc', 'woff'].includes(ending)) void useFontFile(file);
     else if (ending === 'json') void openJson(file);
     else if (ending === 'png') void choosePattern(openLook.value, file);
-    else notice('error', `${file.name}: a font, a style (.json) or a PNG can be dropped here`);
+    else
+        notice(
+            'error',
+            'file',
+            `${file.name}: a font, a style (.json) or a PNG can be dropped here`,
+        );
 }

@@ -1,7 +1,7 @@
 import { freshEffects, setField } from '../model/edit';
 import { fieldsOf, type Field } from '../model/schema';
 import type { EffectName, Length, LookStyle, Stop } from '../model/style_file';
-import { notice } from '../state/notices';
+import { notice, settle } from '../state/notices';
 import { ownPattern, shippedPattern, shippedPatterns, withPattern } from '../state/patterns';
 import { edit, editLook, work } from '../state/store';
 import { ChoiceField, ColourField, FileButton, LengthField, NumberField } from './fields';
@@ -178,8 +178,9 @@ export async function choosePattern(lookIndex: number, from: string | File): Pro
             );
             return withPattern({ ...now, style: { ...now.style, looks } }, name, pixels);
         });
+        settle('pattern');
     } catch (error) {
-        notice('error', (error as Error).message);
+        notice('error', 'pattern', (error as Error).message);
     }
 }
 

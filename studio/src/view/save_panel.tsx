@@ -13,7 +13,6 @@ import {
     savePatterns,
     savePng,
     saveStyle,
-    styleError,
     styleText,
     takeStyle,
     writeCodes,
@@ -107,6 +106,7 @@ function sizeAt(scale: number): string {
 function StyleField() {
     const text = useSignal(styleText());
     const touched = useSignal(false);
+    const wrong = useSignal('');
     useSignalEffect(() => {
         const fresh = styleText();
         if (!touched.peek()) text.value = fresh;
@@ -114,12 +114,13 @@ function StyleField() {
     const drop = () => {
         touched.value = false;
         text.value = styleText();
-        styleError.value = '';
+        wrong.value = '';
     };
     const take = async () => {
         const given = text.value;
         // What was written while the engine read the style stays.
-        if ((await takeStyle(given)) && text.value === given) drop();
+        wrong.value = await takeStyle(given);
+        if (!wrong.value && text.value === given) drop();
     };
     return (
         <section class="fact" aria-labelledby="save-style">
@@ -130,7 +131,7 @@ function StyleField() {
                 spellcheck={false}
                 aria-labelledby="save-style"
                 aria-describedby="style-error"
-                aria-invalid={styleError.value !== ''}
+                aria-invalid={wrong.value !== ''}
                 value={text.value}
                 onInput={(event) => {
                     text.value = event.currentTarget.value;
@@ -138,7 +139,7 @@ function StyleField() {
                 }}
             />
             <p id="style-error" class="error" role="status">
-                {styleError.value}
+                {wrong.value}
             </p>
             <div class="row">
                 <button

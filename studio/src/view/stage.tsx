@@ -2,7 +2,9 @@ import { useEffect, useRef } from 'preact/hooks';
 import type { Box } from '../engine/messages';
 import {
     facts,
+    engine,
     failure,
+    isSlow,
     layers,
     picture,
     pictured,
@@ -45,6 +47,7 @@ export function Stage() {
                 )}
                 <Sheet />
                 <Trouble />
+                <Slow />
             </div>
             <StageBar />
         </section>
@@ -139,6 +142,25 @@ function Trouble() {
     return (
         <p class="trouble" role="alert">
             <Icon name="warning" /> {text}
+        </p>
+    );
+}
+
+/** That a picture takes its time, with a way out. */
+function Slow() {
+    if (!isSlow.value) return null;
+    return (
+        <p class="slow" role="status">
+            Still painting…
+            <button
+                type="button"
+                class="button"
+                onClick={() => engine?.stop()}
+                // The stage would take the pointer for moving the picture.
+                onPointerDown={(event) => event.stopPropagation()}
+            >
+                Stop
+            </button>
         </p>
     );
 }

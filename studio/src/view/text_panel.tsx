@@ -119,9 +119,9 @@ export async function useFontFile(file: File): Promise<void> {
     try {
         const font = await addFont(file);
         edit((now) => ({ ...now, font }));
-        notice('info', `${font} is used, and stays in this browser only.`);
+        notice('info', 'font', `${font} is used, and stays in this browser only.`);
     } catch (error) {
-        notice('error', (error as Error).message);
+        notice('error', 'font', (error as Error).message);
     }
 }
 

@@ -41,7 +41,7 @@ describe('the engine', () => {
 
     beforeEach(() => {
         SlowWorker.all = [];
-        listener = { painted: vi.fn(), failed: vi.fn(), restarted: vi.fn() };
+        listener = { painted: vi.fn(), failed: vi.fn(), restarted: vi.fn(), slow: vi.fn() };
         engine = new Engine(
             () => new SlowWorker() as unknown as Worker,
             listener as unknown as Listener,
@@ -125,6 +125,31 @@ describe('the engine', () => {
         worker().answer('well');
         await settled();
         expect(listener.painted).toHaveBeenCalledTimes(1);
+    });
+
+    it('says that a picture takes its time, until it is there', async () => {
+        vi.useFakeTimers();
+        engine.paint(sized(10));
+        vi.advanceTimersByTime(1400);
+        expect(listener.slow).not.toHaveBeenCalledWith(true);
+        vi.advanceTimersByTime(200);
+        expect(listener.slow).toHaveBeenLastCalledWith(true);
+        worker().answer('well');
+        expect(listener.slow).toHaveBeenLastCalledWith(false);
+        vi.advanceTimersByTime(2000);
+        expect(listener.slow).toHaveBeenLastCalledWith(false);
+        vi.useRealTimers();
+        await settled();
+    });
+
+    it('stops as often as a person likes, and holds the fonts', async () => {
+        for (let size = 1; size < 6; size++) {
+            engine.paint(sized(size));
+            engine.stop();
+            await settled();
+        }
+        expect(listener.restarted).toHaveBeenCalledTimes(5);
+        expect(listener.failed).toHaveBeenLastCalledWith('Stopped', true);
     });
 
     it('gives up a worker that does not answer', () => {
