@@ -1,6 +1,6 @@
 import AxeBuilder from '@axe-core/playwright';
 import type { Page } from '@playwright/test';
-import { drop, expect, open, test } from './page';
+import { changed, drop, expect, open, pictureHash, test, textField } from './page';
 
 const panels = ['Text', 'Presets', 'Looks', 'Facts', 'Save'];
 
@@ -129,4 +129,64 @@ test('has no control beneath a message', async ({ page }) => {
     await expect(page.getByRole('alert')).toBeVisible();
     await page.getByRole('button', { name: /^Save:/ }).click({ timeout: 2000 });
     await expect(page.getByRole('tab')).toHaveCount(8);
+});
+
+test('makes a look by keys alone, and never loses the place', async ({ studio }) => {
+    const focused = studio.locator(':focus');
+    const press = async (name: string | RegExp, key = 'Enter') => {
+        await studio.getByRole('button', { name, exact: true }).focus();
+        await studio.keyboard.press(key);
+    };
+    const add = async (letters: string) => {
+        await studio.getByLabel('Add an effect').focus();
+        await studio.keyboard.press('ArrowDown');
+        await studio.keyboard.type(letters);
+        await studio.keyboard.press('Enter');
+        await expect(studio.getByRole('button', { name: `Remove ${letters}` })).toBeVisible();
+    };
+    const first = await pictureHash(studio);
+    await textField(studio).focus();
+    await studio.keyboard.press('Control+a');
+    await studio.keyboard.type('Keys');
+    const written = await changed(studio, first);
+    await press('Add look');
+    await add('Stroke');
+    await add('Linear gradient');
+    const made = await changed(studio, written);
+    await studio.locator('.stop').first().focus();
+    await studio.keyboard.press('Enter');
+    await expect(focused).toHaveAttribute('aria-label', 'Stop 2 of 3');
+    await studio.keyboard.press('Delete');
+    await expect(focused).toHaveAttribute('aria-label', 'Stop 1 of 2');
+    await press('Move Linear gradient down');
+    await expect(focused).toHaveAccessibleName('Move Linear gradient up');
+    await studio.keyboard.press('Enter');
+    await expect(focused).toHaveAccessibleName('Move Linear gradient down');
+    await studio.getByLabel('Opacity, slider').last().focus();
+    await studio.keyboard.press('ArrowLeft');
+    await changed(studio, made);
+    await press('Remove Linear gradient');
+    await expect(focused).toHaveText('Stroke');
+    await press('Remove Stroke');
+    await expect(focused).toHaveAccessibleName('Add an effect');
+    await press('Move Look 3 down');
+    await expect(focused).toHaveAccessibleName('Move Look 2 down');
+    await press('Remove Look 2');
+    await expect(focused).toHaveText('Edge and shadow');
+    await press('Undo');
+    while (await studio.getByRole('button', { name: 'Undo' }).isEnabled())
+        await studio.keyboard.press('Enter');
+    await expect(focused).toHaveAccessibleName('Redo');
+    await press('New');
+    await press('Close this message');
+    await expect(focused).toHaveClass(/stage/);
+    await press(/^Save:/);
+    await studio.getByRole('textbox', { name: 'Style file' }).focus();
+    await studio.keyboard.press('End');
+    await studio.keyboard.type(' ');
+    await press('Take over');
+    await expect(focused).toHaveRole('textbox');
+    const saved = studio.waitForEvent('download');
+    await press('Download');
+    expect((await saved).suggestedFilename()).toBe('title.json');
 });

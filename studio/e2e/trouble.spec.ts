@@ -95,9 +95,9 @@ test('says that it still paints, and stops where it is asked to', async ({ studi
 test('closes by itself what a success has made untrue', async ({ studio }) => {
     const alerts = studio.getByRole('alert');
     await studio.evaluate(() => {
-        let refused = false;
+        let asked = 0;
         const written = () =>
-            (refused = !refused) ? Promise.reject(new DOMException()) : Promise.resolve();
+            ++asked === 1 ? Promise.reject(new DOMException()) : Promise.resolve();
         Object.defineProperty(navigator.clipboard, 'writeText', { value: written });
     });
     await studio.getByRole('button', { name: /^Save:/ }).click();

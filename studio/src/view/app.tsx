@@ -9,6 +9,7 @@ import { theme, turnTheme } from '../state/theme';
 import { dock, openDock, openTab, tab, type Tab } from '../state/viewing';
 import { choosePattern } from './effect_form';
 import { FactsPanel } from './facts_panel';
+import { focusSoon } from './focus';
 import { Icon, IconButton } from './icons';
 import { LooksPanel } from './looks_panel';
 import { PresetPanel } from './preset_panel';
@@ -108,9 +109,19 @@ function Header() {
             <button type="button" class="button" onClick={startOver}>
                 New
             </button>
-            <div class="bar-group" role="group" aria-label="History">
-                <IconButton icon="undo" label="Undo" disabled={!canUndo.value} onClick={undo} />
-                <IconButton icon="redo" label="Redo" disabled={!canRedo.value} onClick={redo} />
+            <div class="bar-group history" role="group" aria-label="History">
+                <IconButton
+                    icon="undo"
+                    label="Undo"
+                    disabled={!canUndo.value}
+                    onClick={() => turnBack(undo, canUndo)}
+                />
+                <IconButton
+                    icon="redo"
+                    label="Redo"
+                    disabled={!canRedo.value}
+                    onClick={() => turnBack(redo, canRedo)}
+                />
             </div>
             <IconButton
                 icon={theme.value}
@@ -119,6 +130,13 @@ function Header() {
             />
         </header>
     );
+}
+
+/** When there is no more of it the button is switched off, and the keyboard goes to the other one. */
+function turnBack(turn: () => void, canTurn: { value: boolean }): void {
+    turn();
+    if (canTurn.value) return;
+    focusSoon(() => document.querySelector<HTMLElement>('.history button:not(:disabled)'));
 }
 
 /** The work of a first visit, in place of this one. */
@@ -175,12 +193,18 @@ function Notices() {
                     <IconButton
                         icon="cross"
                         label="Close this message"
-                        onClick={() => close(text)}
+                        onClick={() => closed(text)}
                     />
                 </div>
             ))}
         </div>
     );
+}
+
+/** From a message the keyboard goes on to the next one, or to the picture. */
+function closed(text: string): void {
+    close(text);
+    focusSoon(() => document.querySelector<HTMLElement>('.notice button, .stage'));
 }
 
 /** Ctrl+Z, Ctrl+Y and Ctrl+Shift+Z, but where a text is being written that has its own. */

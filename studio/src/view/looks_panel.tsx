@@ -29,6 +29,7 @@ import {
     NumberField,
     TextField,
 } from './fields';
+import { focusButton, focusPlace } from './focus';
 import { Icon, IconButton } from './icons';
 import { useReorder } from './reorder';
 
@@ -59,6 +60,8 @@ function LookList({ looks, open }: { looks: LookStyle[]; open: number }) {
         openLook.value = to;
         announce(`Look moved to place ${last - to + 1} of ${last + 1} from the top`);
     };
+    const remove = (index: number) =>
+        edit((now) => withStyle(now, (style) => removeLook(style, index)));
     const { list, handle } = useReorder((from, to) => move(last - from, last - to));
     return (
         <section class="group" aria-labelledby="looks-title">
@@ -98,16 +101,11 @@ function LookList({ looks, open }: { looks: LookStyle[]; open: number }) {
                             </button>
                             <RowButtons
                                 name={lookName(look, index)}
+                                list={list}
+                                row={row}
                                 up={index < last ? () => move(index, index + 1) : undefined}
                                 down={index > 0 ? () => move(index, index - 1) : undefined}
-                                remove={
-                                    last > 0
-                                        ? () =>
-                                              edit((now) =>
-                                                  withStyle(now, (s) => removeLook(s, index)),
-                                              )
-                                        : undefined
-                                }
+                                remove={last > 0 ? () => remove(index) : undefined}
                             />
                         </li>
                     );
@@ -119,33 +117,43 @@ function LookList({ looks, open }: { looks: LookStyle[]; open: number }) {
 
 interface RowButtonsProps {
     name: string;
+    list: { readonly current: HTMLElement | null };
+    /** Place in the list, 0 the topmost. */
+    row: number;
     up?: (() => void) | undefined;
     down?: (() => void) | undefined;
     remove?: (() => void) | undefined;
 }
 
-const nothing = () => undefined;
-
-function RowButtons({ name, up, down, remove }: RowButtonsProps) {
+/** The keyboard stays with the row that moves, and in the list when one goes. */
+function RowButtons({ name, list, row, up, down, remove }: RowButtonsProps) {
+    const turned = (move: (() => void) | undefined, to: number, button: number) => () => {
+        move?.();
+        focusButton(list.current, to, button);
+    };
+    const removed = () => {
+        remove?.();
+        focusPlace(list.current, row);
+    };
     return (
         <span class="row-buttons">
             <IconButton
                 icon="up"
                 label={`Move ${name} up`}
                 disabled={!up}
-                onClick={up ?? nothing}
+                onClick={turned(up, row - 1, 0)}
             />
             <IconButton
                 icon="down"
                 label={`Move ${name} down`}
                 disabled={!down}
-                onClick={down ?? nothing}
+                onClick={turned(down, row + 1, 1)}
             />
             <IconButton
                 icon="cross"
                 label={`Remove ${name}`}
                 disabled={!remove}
-                onClick={remove ?? nothing}
+                onClick={removed}
             />
         </span>
     );
@@ -180,6 +188,8 @@ function LookEditor({ look, index }: { look: LookStyle; index: number }) {
                         <RowName name={name} label={labelOf(name)} />
                         <RowButtons
                             name={labelOf(name)}
+                            list={list}
+                            row={row}
                             up={row > 0 ? () => move(name, last - row + 1) : undefined}
                             down={row < last ? () => move(name, last - row - 1) : undefined}
                             remove={() => editLook(index, (now) => removeEffect(now, name))}
@@ -215,6 +225,14 @@ function RowName({ name, label }: { name: EffectName | 'fill'; label: string }) 
     );
 }
 
+/** A closed list would add an effect at each arrow or letter, the first that it leads to: such keys open it. */
+function openChoices(event: KeyboardEvent & { currentTarget: HTMLSelectElement }): void {
+    const turns = event.key.length === 1 || event.key.startsWith('Arrow');
+    if (!turns || event.ctrlKey || event.metaKey) return;
+    event.preventDefault();
+    event.currentTarget.showPicker();
+}
+
 function AddEffect({ look, index }: { look: LookStyle; index: number }) {
     const free = paintedEffects.filter(
         (name) => !look[name] && (name !== 'text' || look.fill !== false),
@@ -230,6 +248,7 @@ function AddEffect({ look, index }: { look: LookStyle; index: number }) {
             aria-label="Add an effect"
             value=""
             disabled={free.length === 0}
+            onKeyDown={openChoices}
             onChange={(event) => {
                 const chosen = free.find((name) => name === event.currentTarget.value);
                 event.currentTarget.value = '';

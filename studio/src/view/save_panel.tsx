@@ -107,6 +107,7 @@ function StyleField() {
     const text = useSignal(styleText());
     const touched = useSignal(false);
     const wrong = useSignal('');
+    const field = useRef<HTMLTextAreaElement>(null);
     useSignalEffect(() => {
         const fresh = styleText();
         if (!touched.peek()) text.value = fresh;
@@ -115,6 +116,7 @@ function StyleField() {
         touched.value = false;
         text.value = styleText();
         wrong.value = '';
+        field.current?.focus();
     };
     const take = async () => {
         const given = text.value;
@@ -126,6 +128,7 @@ function StyleField() {
         <section class="fact" aria-labelledby="save-style">
             <h3 id="save-style">Style file</h3>
             <textarea
+                ref={field}
                 class="code"
                 rows={8}
                 spellcheck={false}

@@ -22,6 +22,7 @@ import {
     zoom,
     zoomBy,
 } from '../state/viewing';
+import { focusSoon } from './focus';
 import { Icon } from './icons';
 import { Pixels } from './pixels';
 import { StageBar } from './stage_bar';
@@ -146,6 +147,11 @@ function Trouble() {
     );
 }
 
+function stop(): void {
+    engine?.stop();
+    focusSoon(() => document.querySelector<HTMLElement>('.stage'));
+}
+
 /** That a picture takes its time, with a way out. */
 function Slow() {
     if (!isSlow.value) return null;
@@ -155,7 +161,7 @@ function Slow() {
             <button
                 type="button"
                 class="button"
-                onClick={() => engine?.stop()}
+                onClick={stop}
                 // The stage would take the pointer for moving the picture.
                 onPointerDown={(event) => event.stopPropagation()}
             >
