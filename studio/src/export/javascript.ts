@@ -5,7 +5,7 @@ import type { EffectCall, PlacedLook, RampStop } from './looks';
 import { isPlainStack, placedLooks } from './looks';
 import { spelled } from './numbers';
 import { patternFiles, withPatternFiles } from './patterns';
-import { textOptions } from './text_options';
+import { fontNames, textOptions } from './text_options';
 import { sentence, stringLiteral } from './words';
 import type { Work } from '../model/work';
 import { javaScript as notation, written } from './written';
@@ -110,12 +110,12 @@ function styleValue(work: Work): string {
     return `Style.fromJSON(${written({ ...withPatternFiles(work.style), $schema: undefined }, notation, 1, 33)}${images})`;
 }
 
-function painting(work: Work, opacity: number): string {
+function painting(work: Work, fonts: readonly string[], opacity: number): string {
     const { align, lineHeight, letterSpacing, markup, padding, background } = textOptions(work);
     const more = { align, lineHeight, letterSpacing, markup, padding, background };
     const told = Object.entries(opacity === 1 ? more : { ...more, opacity });
     const parts = [
-        'fonts: new Font(font)',
+        fonts.length === 1 ? 'fonts: new Font(font)' : 'fonts: fonts.map((font) => new Font(font))',
         `size: ${work.size}`,
         'look',
         ...told
@@ -130,20 +130,28 @@ function painting(work: Work, opacity: number): string {
 }
 
 /** A module with a function that paints the text, in a browser or in node. */
-export const javascript: Exporter = (work) => {
+export const javascript: Exporter = (work, engine) => {
     const looks = placedLooks(work);
     const isPlain = isPlainStack(looks);
     const files = [...patternFiles(work.style).values()];
     const said = work.style.description ?? '';
-    const pixels = files.length === 0 ? '' : `, the pixels of ${files.join(', ')} by these names`;
+    const fonts = fontNames(work, engine);
+    const taken = fonts.length === 1 ? 'a font file' : 'font files, in their order';
+    const pixels =
+        files.length === 0 ? '' : `, and the pixels of ${files.join(', ')} by these names`;
+    const parameters = [
+        fonts.length === 1 ? 'font' : 'fonts',
+        ...(files.length === 0 ? [] : ['patterns']),
+    ];
     const text = [
         "import { load } from 'voreleffect/text';\n\n",
         `const { Font, ${isPlain ? 'Look' : 'Style'}, Text } = await load();\n\n`,
         said === '' ? '' : `// ${sentence(said)}\n`,
-        `/** Paints a text; takes the bytes of a font file${pixels}. */\n`,
-        `export function paintTitle(font${files.length === 0 ? '' : ', patterns'}) {\n`,
+        `// ${sentence(`${fonts.length === 1 ? 'Font' : 'Fonts'}: ${fonts.join(', ')}`)}\n`,
+        `/** Paints a text; takes the bytes of ${taken}${pixels}. */\n`,
+        `export function paintTitle(${parameters.join(', ')}) {\n`,
         `    const look = ${isPlain ? lookValues(work, looks) : styleValue(work)};\n`,
-        painting(work, isPlain ? 1 : work.opacity),
+        painting(work, fonts, isPlain ? 1 : work.opacity),
         '}\n',
     ].join('');
     const size = isPlain ? `Lengths are in pixels, for text of ${work.size} pixels.` : undefined;

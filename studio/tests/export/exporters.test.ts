@@ -117,6 +117,7 @@ image.save("title.png")
 
 const { Font, Look, Text } = await load();
 
+// Font: DejaVu Sans:bold.
 /** Paints a text; takes the bytes of a font file. */
 export function paintTitle(font) {
     const look = new Look()
@@ -352,6 +353,10 @@ two'
         const work = workOf([{}], { font: 'sans' });
         expect(exporters.command(work, known).text).toContain("--font 'sans!' --font Other");
         expect(exporters.python(work, known).text).toContain('font=["sans!", "Other"]');
+        const { text } = exporters.javascript(work, known);
+        expect(text).toContain('// Fonts: sans!, Other.\n');
+        expect(text).toContain('export function paintTitle(fonts) {');
+        expect(text).toContain('fonts: fonts.map((font) => new Font(font))');
     });
     it('has colours of words that masks have not, as the note says', () => {
         for (const name of ['cpp-look', 'c', 'java', 'cpp-classes'] as const)
