@@ -28,6 +28,25 @@ test('takes back and gives again', async ({ studio }) => {
     await expect(studio.getByRole('button', { name: 'Undo' })).toBeDisabled();
 });
 
+test('takes back as one what an input method composed', async ({ studio, context }) => {
+    const keyboard = await context.newCDPSession(studio);
+    await textField(studio).fill('');
+    await studio.waitForTimeout(1000);
+    for (const text of ['n', 'ni', 'nih']) {
+        const end = text.length;
+        await keyboard.send('Input.imeSetComposition', {
+            text,
+            selectionStart: end,
+            selectionEnd: end,
+        });
+        await studio.waitForTimeout(1000);
+    }
+    await keyboard.send('Input.insertText', { text: 'に' });
+    await expect(textField(studio)).toHaveValue('に');
+    await studio.getByRole('button', { name: 'Undo' }).click();
+    await expect(textField(studio)).toHaveValue('');
+});
+
 test('adds, moves and removes looks and effects', async ({ studio }) => {
     const first = await pictureHash(studio);
     await studio.getByRole('button', { name: 'Add look' }).click();

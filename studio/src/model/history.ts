@@ -15,10 +15,20 @@ export function begin<T>(now: T): History<T> {
     return { past: [], now, future: [], last: { what: '', at: 0 } };
 }
 
-/** `what` names the thing that changes, as 'looks.0.stroke.size'; an empty name is always a step of its own. */
-export function change<T>(history: History<T>, now: T, what: string, at: number): History<T> {
+/**
+ * `what` names the thing that changes, as 'looks.0.stroke.size'; an empty name is always a step of its own. With
+ * `goesOn` the change is of one step with that of the same thing before, however long ago that was.
+ */
+export function change<T>(
+    history: History<T>,
+    now: T,
+    what: string,
+    at: number,
+    goesOn = false,
+): History<T> {
     if (now === history.now) return history;
-    const same = what !== '' && what === history.last.what && at - history.last.at < oneStep;
+    const isSoon = goesOn || at - history.last.at < oneStep;
+    const same = what !== '' && what === history.last.what && isSoon;
     const past = same ? history.past : [...history.past, history.now].slice(-maxSteps);
     return { past, now, future: [], last: { what, at } };
 }

@@ -24,10 +24,10 @@ export function announce(text: string): void {
     announced.value = text;
 }
 
-/** Changes the work; changes of one `what` that follow at once are one step to undo. */
-export function edit(change: (work: Work) => Work, what = ''): void {
+/** Changes the work; changes of one `what` that follow at once, or where it `goesOn`, are one step to undo. */
+export function edit(change: (work: Work) => Work, what = '', goesOn = false): void {
     const now = change(steps.value.now);
-    steps.value = history.change(steps.value, now, what, Date.now());
+    steps.value = history.change(steps.value, now, what, Date.now(), goesOn);
     openLook.value = Math.min(openLook.value, now.style.looks.length - 1);
 }
 

@@ -1,3 +1,4 @@
+import { useRef } from 'preact/hooks';
 import { shippedFonts } from '../engine/fonts';
 import { limits } from '../model/check';
 import type { Field } from '../model/schema';
@@ -12,6 +13,13 @@ export function TextPanel() {
     const now = work.value;
     const set = <Key extends keyof Work>(key: Key, value: Work[Key]) =>
         edit((before) => ({ ...before, [key]: value }), key);
+    const composes = useRef(false);
+    // A word that an input method composes is one step to undo, however long it takes.
+    const write = (event: InputEvent & { currentTarget: HTMLTextAreaElement }) => {
+        const text = event.currentTarget.value;
+        edit((before) => ({ ...before, text }), 'text', composes.current);
+        composes.current = event.isComposing;
+    };
     return (
         <div class="form">
             <label class="label" for="text">
@@ -25,7 +33,8 @@ export function TextPanel() {
                 spellcheck={false}
                 aria-describedby="text-notes"
                 value={now.text}
-                onInput={(event) => set('text', event.currentTarget.value)}
+                onInput={write}
+                onCompositionEnd={() => (composes.current = false)}
             />
             <TextNotes />
             <FontField font={now.font} onChange={(font) => set('font', font)} />
