@@ -47,6 +47,14 @@ test('takes back as one what an input method composed', async ({ studio, context
     await expect(textField(studio)).toHaveValue('');
 });
 
+test('takes decimals as they are typed', async ({ studio }) => {
+    const height = studio.getByLabel('Line height', { exact: true });
+    await height.fill('');
+    await height.pressSequentially('1.05');
+    await height.blur();
+    await expect(height).toHaveValue('1.05');
+});
+
 test('adds, moves and removes looks and effects', async ({ studio }) => {
     const first = await pictureHash(studio);
     await studio.getByRole('button', { name: 'Add look' }).click();

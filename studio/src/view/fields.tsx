@@ -1,4 +1,4 @@
-import { useId } from 'preact/hooks';
+import { useId, useLayoutEffect, useRef } from 'preact/hooks';
 import { inUnit, readLength, writeLength, type Unit } from '../model/lengths';
 import type { Field } from '../model/schema';
 import type { Length } from '../model/style_file';
@@ -23,11 +23,21 @@ function valueWithin(input: HTMLInputElement, min: number, max: number): number 
     return value >= min && value <= max ? value : undefined;
 }
 
+function thousandths(value: number): number {
+    return Math.round(value * 1000) / 1000;
+}
+
 /** A slider and a field of one number. */
 export function NumberField(props: NumberProps) {
     const { label, help, value, min, max, step, sliderMax = max, onChange, unit } = props;
     const id = useId();
-    const shown = Math.round(value * 1000) / 1000;
+    const shown = thousandths(value);
+    const field = useRef<HTMLInputElement>(null);
+    // A number that is being written stays as it is: 1.0 may become 1.05.
+    useLayoutEffect(() => {
+        const input = field.current;
+        if (input && thousandths(input.valueAsNumber) !== shown) input.value = String(shown);
+    }, [shown]);
     const taken = (event: Event) => {
         const number = valueWithin(event.currentTarget as HTMLInputElement, min, max);
         if (number !== undefined) onChange(number);
@@ -46,12 +56,12 @@ export function NumberField(props: NumberProps) {
             />
             <span class="field-value">
                 <input
+                    ref={field}
                     id={id}
                     type="number"
                     min={min}
                     max={max}
                     step="any"
-                    value={shown}
                     onInput={taken}
                     // What could not be taken does not stay as if it were.
                     onBlur={(event) => (event.currentTarget.value = String(shown))}
