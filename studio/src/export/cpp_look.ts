@@ -139,6 +139,13 @@ function paintFunction(looks: PlacedLook[], patterns: PatternNames): string {
     ].join('');
 }
 
+/** How looks of which none is moved are painted. */
+function usage(looks: PlacedLook[], patterns: PatternNames): string {
+    const name = looks.length === 1 ? nameOf(0, 1) : 'titleLooks';
+    const made = `${name}(${[...patterns.values()].join(', ')})`;
+    return `// To lay text over a page, its origin at (x, y):\n//     paint(${made}, glyphs, page, x, y);\n`;
+}
+
 /** Functions of look.h: one for each look, and what paints them where they are several. */
 export const cppLook: Exporter = (work) => {
     const looks = placedLooks(work);
@@ -150,6 +157,7 @@ export const cppLook: Exporter = (work) => {
     if (isPlain && looks.length > 1) parts.push(stackFunction(looks, patterns));
     const needsVector = looks.length > 1 || !isPlain;
     const includes = `#include <voreleffect/look.h>\n${needsVector ? '\n#include <vector>\n' : ''}`;
-    const text = `${header}${includes}\nusing namespace VFontEffect;\n\n${parts.join('\n')}`;
+    const use = isPlain ? usage(looks, patterns) : '';
+    const text = `${header}${use}${includes}\nusing namespace VFontEffect;\n\n${parts.join('\n')}`;
     return { name: 'title.cpp', language: 'cpp', text, ...noted(...glyphNotes(work, looks)) };
 };

@@ -150,6 +150,17 @@ function imports(looks: PlacedLook[], source: string): string {
     return lists + used.map((name) => `import org.voreleffect.${name};\n`).join('');
 }
 
+/** How looks of which none is moved are painted. */
+function usage(looks: PlacedLook[], patterns: PatternNames): string {
+    const given = patternArguments([...patterns.values()]);
+    const use =
+        looks.length === 1
+            ? `Title.${nameOf(0, 1)}(${given}).paint(glyphs, page, x, y);`
+            : `try (Painter painter = new Painter(Title.looks(${given}))) {\n` +
+              '//         painter.paint(glyphs, page, x, y);\n//     }';
+    return `// To lay text over a page, its origin at (x, y):\n//     ${use}\n`;
+}
+
 /** A class of org.voreleffect's looks, with what paints them where they are several. */
 export const java: Exporter = (work) => {
     const looks = placedLooks(work);
@@ -161,7 +172,8 @@ export const java: Exporter = (work) => {
     if (isPlain && looks.length > 1) parts.push(stackMethod(looks, patterns));
     const body = parts.join('\n');
     const code = body.replace(/^ *\/\/.*$/gm, '');
-    const start = `${header}final class Title {\n    private Title() {}\n\n`;
+    const use = isPlain ? usage(looks, patterns) : '';
+    const start = `${header}${use}final class Title {\n    private Title() {}\n\n`;
     const text = `${imports(looks, code)}\n${start}${body}}\n`;
     return { name: 'Title.java', language: 'java', text, ...noted(...glyphNotes(work, looks)) };
 };
