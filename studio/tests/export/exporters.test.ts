@@ -37,6 +37,8 @@ const withTile = { patterns: { 'a/b.png': tile } };
 describe('a badge', () => {
     it('is a function of look.h', () => {
         expect(textOf('cpp-look', [badge])).toBe(`// Lengths are in pixels, for text of 40 pixels.
+// To lay text over a page, its origin at (x, y):
+//     paint(titleLook(), glyphs, page, x, y);
 #include <voreleffect/look.h>
 
 using namespace VFontEffect;
@@ -82,6 +84,8 @@ import org.voreleffect.Position;
 import org.voreleffect.Stops;
 
 // Lengths are in pixels, for text of 40 pixels.
+// To lay text over a page, its origin at (x, y):
+//     Title.look().paint(glyphs, page, x, y);
 final class Title {
     private Title() {}
 
