@@ -73,14 +73,13 @@ test('paints again when its worker has ended', async ({ studio }) => {
 
 test('says that it still paints, and stops where it is asked to', async ({ studio }) => {
     const before = await pictureHash(studio);
-    // The worker is busy for so long that the picture waits.
-    studio
-        .workers()[0]
-        ?.evaluate(() => {
-            const end = Date.now() + 25_000;
-            while (Date.now() < end);
-        })
-        .catch(() => undefined);
+    await expect(studio.getByText(/^Cache key of/)).toBeVisible();
+    await expect(studio.getByText(/^Layers one by one/)).toBeVisible();
+    await studio.waitForTimeout(300);
+    // It has told all there is of the picture; from here on the worker gives no answer, and so is as one that paints for long.
+    await studio.workers()[0]?.evaluate(() => {
+        self.postMessage = () => undefined;
+    });
     await textField(studio).fill('Slow');
     await studio.getByRole('button', { name: 'Stop', exact: true }).click();
     await expect(studio.getByText('Still painting')).toHaveCount(0);
