@@ -6,7 +6,10 @@ export default defineConfig({
     testDir: 'e2e',
     fullyParallel: true,
     workers: 2,
-    timeout: 30_000,
+    // What waits for long waits for a busy machine; a page that a browser loses there is tried once more.
+    timeout: 120_000,
+    expect: { timeout: 20_000 },
+    retries: 1,
     reporter: [['list']],
     use: {
         baseURL: `http://127.0.0.1:${port}/`,

@@ -76,7 +76,8 @@ test('says that it still paints, and stops where it is asked to', async ({ studi
     await expect(studio.getByText(/^Cache key of/)).toBeVisible();
     await expect(studio.getByText(/^Layers one by one/)).toBeVisible();
     await studio.waitForTimeout(300);
-    // It has told all there is of the picture; from here on the worker gives no answer, and so is as one that paints for long.
+    // It has told all there is of the picture. From here on the worker gives no answer, and so is as one
+    // that paints for long.
     await studio.workers()[0]?.evaluate(() => {
         self.postMessage = () => undefined;
     });
