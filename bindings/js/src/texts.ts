@@ -125,9 +125,13 @@ export function textsOf(engine: TextEngine, styles: StyleClass): Text {
 
     const explain = (text: string, options: TextOptions): Explanation => {
         const rounds = Array.from({ length: ROUNDS }, () =>
-            stepped(text, options, (steps, plan) => timesOf(engine, steps, plan)),
+            stepped(text, options, (steps, plan) => ({
+                plan,
+                times: timesOf(engine, steps, plan),
+            })),
         );
-        return stepped(text, options, (_, plan) => explanationOf(withTimes(plan, rounds)));
+        const times = rounds.map((round) => round.times);
+        return explanationOf(withTimes(rounds[0]!.plan, times));
     };
 
     const layers = (text: string, options: TextOptions): LayerPicture[] =>
