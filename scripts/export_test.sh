@@ -9,13 +9,10 @@ cd "$(dirname "$0")/.."
 . scripts/quietly.sh
 . scripts/installed.sh
 
-need_packages cmake ninja-build g++ pkg-config libfreetype-dev libfribidi-dev libharfbuzz-dev libunibreak-dev \
-    libfontconfig-dev libpng-dev libdeflate-dev nlohmann-json3-dev libcli11-dev openjdk-17-jdk-headless \
-    python3-numpy python3-pil fonts-dejavu-core
+need_packages openjdk-17-jdk-headless python3-numpy python3-pil fonts-dejavu-core
 command -v npm > /dev/null || need_packages nodejs npm
 
-[[ -f build/release/build.ninja ]] || quietly cmake --preset release
-quietly cmake --build --preset release --target vorelpaint
+release_tool
 java=$PWD/build/android_tests/voreleffect
 [[ -f $java/android/libvoreleffect_jni.so ]] || quietly scripts/android_test.sh --build
 [[ -f bindings/js/dist/text.js && -d studio/node_modules/voreleffect ]] || quietly scripts/studio.sh build

@@ -1,6 +1,7 @@
 # shellcheck shell=bash
-# To be sourced, behind quietly.sh: install_library installs the library for what is built against it,
-# python_with_the_package the package of Python, project_with_the_package that of JavaScript.
+# To be sourced, behind packages.sh and quietly.sh: install_library installs the library for what is built against it,
+# release_tool builds vorelpaint, python_with_the_package the package of Python, project_with_the_package that of
+# JavaScript.
 
 # install_library: says where it is
 install_library() {
@@ -8,6 +9,14 @@ install_library() {
     quietly cmake -S . -B "$build/library" -G Ninja -DCMAKE_BUILD_TYPE=Release \
         -DCMAKE_INSTALL_PREFIX="$build/prefix" && quietly cmake --build "$build/library" --target install &&
         echo "$build/prefix"
+}
+
+# release_tool: builds vorelpaint in build/release, for what compares its pictures
+release_tool() {
+    need_packages cmake ninja-build g++ pkg-config libfreetype-dev libfribidi-dev libharfbuzz-dev libunibreak-dev \
+        libfontconfig-dev libpng-dev libdeflate-dev nlohmann-json3-dev libcli11-dev
+    [[ -f build/release/build.ninja ]] || quietly cmake --preset release
+    quietly cmake --build --preset release --target vorelpaint
 }
 
 # python_with_the_package: says which Python has the package; that of scripts/python.sh, which runs where it has not

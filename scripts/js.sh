@@ -6,6 +6,7 @@ set -euo pipefail
 cd "$(dirname "$0")/.."
 . scripts/packages.sh
 . scripts/quietly.sh
+. scripts/installed.sh
 
 need_packages chromium fonts-dejavu-core fonts-hosny-amiri fonts-lohit-deva fonts-inter-variable fonts-bebas-neue \
     fonts-noto-color-emoji
@@ -14,6 +15,7 @@ command -v npm > /dev/null || need_packages npm
 [[ $(node --print 'parseInt(process.versions.node)') -ge 20 ]] || { echo 'node 20 or later is needed' >&2; exit 1; }
 
 quietly scripts/wasm.sh modules
+release_tool # whose pictures are compared
 cd bindings/js
 ! grep -q '"resolved"' package-lock.json || { echo 'package-lock.json names a registry' >&2; exit 1; }
 quietly npm ci --ignore-scripts --no-audit --no-fund
@@ -21,10 +23,5 @@ node build.mjs
 npx eslint .
 npx prettier --log-level warn --check .
 node --test --test-concurrency="$(nproc)" tests/*.test.js
-# Beside the tool, whose pictures are compared.
-if [[ ! -x ../../build/release/tools/vorelpaint ]]; then
-    quietly cmake -S ../.. --preset release
-    quietly cmake --build ../../build/release --target vorelpaint
-fi
 node tests/equality.mjs ../../build/release/tools/vorelpaint
 node sizes.mjs

@@ -9,6 +9,7 @@ set -euo pipefail
 cd "$(dirname "$0")/.."
 . scripts/packages.sh
 . scripts/quietly.sh
+. scripts/installed.sh
 
 # The fonts that lie beside the page.
 need_packages fonts-dejavu-core fonts-lobster fonts-bebas-neue fonts-lohit-deva
@@ -35,10 +36,7 @@ build() {
 # With the tool, whose pictures are compared.
 check() {
     need_packages chromium fonts-hosny-amiri
-    if [[ ! -x build/release/tools/vorelpaint ]]; then
-        quietly cmake --preset release
-        quietly cmake --build build/release --target vorelpaint
-    fi
+    release_tool
     cd studio
     npx prettier --log-level warn --check .
     npx eslint .
