@@ -39,23 +39,16 @@ using capi::VFontEffect::Effect;
 using capi::VFontEffect::Failure;
 using capi::VFontEffect::Glyph;
 using capi::VFontEffect::Glyphs;
-using capi::VFontEffect::InnerGlow;
-using capi::VFontEffect::InnerShadow;
-using capi::VFontEffect::LinearGradient;
 using capi::VFontEffect::Look;
 using capi::VFontEffect::Margins;
-using capi::VFontEffect::OuterGlow;
-using capi::VFontEffect::OuterShadow;
 using capi::VFontEffect::Painter;
-using capi::VFontEffect::Pattern;
 using capi::VFontEffect::Picture;
 using capi::VFontEffect::PictureView;
 using capi::VFontEffect::PixelOrder;
+using capi::VFontEffect::PixelView;
 using capi::VFontEffect::Position;
-using capi::VFontEffect::RadialGradient;
 using capi::VFontEffect::rgb;
-using capi::VFontEffect::Stop;
-using capi::VFontEffect::Stroke;
+using capi::VFontEffect::look_internal::Kind;
 
 struct vorel_look {
     Look look;
@@ -115,16 +108,6 @@ std::optional<PictureView> viewOf(const vorel_view* view) {
     return PictureView{view->data, view->width, view->height, view->stride, order};
 }
 
-/// The first 256: what is beyond is not painted.
-std::vector<Stop> stopsOf(const vorel_stop* stops, size_t count) {
-    constexpr size_t kMostStops = 256;
-    std::vector<Stop> list;
-    list.reserve(std::min(count, kMostStops));
-    for (size_t i = 0; i < std::min(count, kMostStops); ++i)
-        list.push_back({rgb(stops[i].color), stops[i].opacity, stops[i].place});
-    return list;
-}
-
 void takeGlyphs(std::vector<Glyph>& list, const vorel_glyph* glyphs, size_t count) {
     list.clear();
     list.reserve(count);
@@ -147,19 +130,47 @@ vorel_painter painterOf(vorel_look* const* looks, size_t count) {
     return {Painter(list), {}};
 }
 
-/// Adds what `make()` gives; `isGood` tells whether its arguments are.
-template <class Make>
-vorel_status add(vorel_look* look, bool isGood, const Make& make) {
-    if (look == nullptr || !isGood) return VOREL_BAD_ARGUMENT;
+/// The numbers that a call tells of an effect; those that it leaves out do not count for its kind.
+struct Numbers {
+    float opacity;
+    float size = 0;
+    float angle = 0;
+    float distance = 0;
+    float scale = 1;
+    Position position = Position::outside;
+};
+
+/// An effect of a kind that is told by its number: one function adds all of them, which the classes of
+/// look.h would take one each for.
+class AnyEffect : public Effect {
+  public:
+    AnyEffect(Kind kind, uint32_t color, const Numbers& numbers) : Effect(Data(kind, rgb(color))) {
+        mData.opacity = numbers.opacity;
+        mData.size = numbers.size;
+        mData.angle = numbers.angle;
+        mData.distance = numbers.distance;
+        mData.scale = numbers.scale;
+        mData.position = numbers.position;
+    }
+    /// The first 256: what is beyond is not painted.
+    void take(const vorel_stop* stops, size_t count) {
+        constexpr size_t kMostStops = 256;
+        mData.stops.reserve(std::min(count, kMostStops));
+        for (size_t i = 0; i < std::min(count, kMostStops); ++i)
+            mData.stops.push_back({rgb(stops[i].color), stops[i].opacity, stops[i].place});
+    }
+    void take(const PixelView& pixels) { mData.tile = capi::VFontEffect::look_internal::tileOf(pixels); }
+};
+
+vorel_status add(vorel_look* look, Kind kind, uint32_t color, const Numbers& numbers,
+                 const vorel_stop* stops = nullptr, size_t count = 0) {
+    if (look == nullptr || areNull(stops, count)) return VOREL_BAD_ARGUMENT;
     return guarded([&] {
-        look->look.add(make());
+        AnyEffect effect(kind, color, numbers);
+        effect.take(stops, count);
+        look->look.add(effect);
         return VOREL_OK;
     });
-}
-
-template <class Shadow>
-Shadow shadowOf(float angle, float distance, float size, uint32_t color, float opacity) {
-    return Shadow(rgb(color)).angle(angle).distance(distance).size(size).opacity(opacity);
 }
 
 vorel_status paint(vorel_painter& painter, const vorel_glyph* glyphs, size_t count,
@@ -245,39 +256,32 @@ vorel_status vorel_look_text_opacity(vorel_look* look, float opacity) {
 
 vorel_status vorel_look_outer_shadow(vorel_look* look, float angle, float distance, float size,
                                      uint32_t color, float opacity) {
-    return add(look, true, [&] { return shadowOf<OuterShadow>(angle, distance, size, color, opacity); });
+    return add(look, Kind::kOuterShadow, color, {opacity, size, angle, distance});
 }
 
 vorel_status vorel_look_inner_shadow(vorel_look* look, float angle, float distance, float size,
                                      uint32_t color, float opacity) {
-    return add(look, true, [&] { return shadowOf<InnerShadow>(angle, distance, size, color, opacity); });
+    return add(look, Kind::kInnerShadow, color, {opacity, size, angle, distance});
 }
 
 vorel_status vorel_look_outer_glow(vorel_look* look, float size, uint32_t color, float opacity,
                                    const vorel_stop* stops, size_t count) {
-    return add(look, !areNull(stops, count), [&] {
-        return OuterGlow(size, rgb(color)).opacity(opacity).stops(stopsOf(stops, count));
-    });
+    return add(look, Kind::kOuterGlow, color, {opacity, size}, stops, count);
 }
 
 vorel_status vorel_look_inner_glow(vorel_look* look, float size, uint32_t color, float opacity,
                                    const vorel_stop* stops, size_t count) {
-    return add(look, !areNull(stops, count), [&] {
-        return InnerGlow(size, rgb(color)).opacity(opacity).stops(stopsOf(stops, count));
-    });
+    return add(look, Kind::kInnerGlow, color, {opacity, size}, stops, count);
 }
 
 vorel_status vorel_look_linear_gradient(vorel_look* look, float angle, float scale, float opacity,
                                         const vorel_stop* stops, size_t count) {
-    return add(look, !areNull(stops, count), [&] {
-        return LinearGradient(stopsOf(stops, count)).angle(angle).scale(scale).opacity(opacity);
-    });
+    return add(look, Kind::kLinearGradient, 0, {opacity, 0, angle, 0, scale}, stops, count);
 }
 
 vorel_status vorel_look_radial_gradient(vorel_look* look, float scale, float opacity,
                                         const vorel_stop* stops, size_t count) {
-    return add(look, !areNull(stops, count),
-               [&] { return RadialGradient(stopsOf(stops, count)).scale(scale).opacity(opacity); });
+    return add(look, Kind::kRadialGradient, 0, {opacity, 0, 0, 0, scale}, stops, count);
 }
 
 vorel_status vorel_look_stroke(vorel_look* look, float size, uint32_t color, float opacity,
@@ -285,9 +289,8 @@ vorel_status vorel_look_stroke(vorel_look* look, float size, uint32_t color, flo
     static_assert(static_cast<int>(Position::centre) == VOREL_CENTRE);
     static_assert(static_cast<int>(Position::outside) == VOREL_OUTSIDE);
     static_assert(static_cast<int>(Position::inside) == VOREL_INSIDE);
-    return add(look, position >= VOREL_CENTRE && position <= VOREL_INSIDE, [&] {
-        return Stroke(size, rgb(color)).opacity(opacity).position(static_cast<Position>(position));
-    });
+    if (position < VOREL_CENTRE || position > VOREL_INSIDE) return VOREL_BAD_ARGUMENT;
+    return add(look, Kind::kStroke, color, {opacity, size, 0, 0, 1, static_cast<Position>(position)});
 }
 
 vorel_status vorel_look_pattern(vorel_look* look, const vorel_pixels* pixels, float scale,
@@ -295,10 +298,11 @@ vorel_status vorel_look_pattern(vorel_look* look, const vorel_pixels* pixels, fl
     if (look == nullptr || pixels == nullptr) return VOREL_BAD_ARGUMENT;
     const vorel_status status = statusOf(*pixels);
     if (status != VOREL_OK) return status;
-    return add(look, true, [&] {
-        return Pattern({pixels->data, pixels->width, pixels->height, pixels->stride})
-            .scale(scale)
-            .opacity(opacity);
+    return guarded([&] {
+        AnyEffect pattern(Kind::kPattern, 0, {opacity, 0, 0, 0, scale});
+        pattern.take(PixelView{pixels->data, pixels->width, pixels->height, pixels->stride});
+        look->look.add(pattern);
+        return VOREL_OK;
     });
 }
 
