@@ -49,7 +49,8 @@ VOREL_INLINE int64_t wholeVectors(int64_t columns) {
 struct Group {
     U8s rows[kQuad];
 
-    static VOREL_INLINE Group of(const SourceStrip& strip, int64_t y) {
+    /// Not inline: up to four loops take groups, and calls are a twentieth of a small blur at most.
+    static __attribute__((noinline)) Group of(const SourceStrip& strip, int64_t y) {
         if (!strip.has(y) || !strip.has(y + kQuad - 1)) return atEdge(strip, y);
         Group group;
         unrolled<kQuad>([&](auto i) VOREL_INLINE_LAMBDA {
