@@ -19,6 +19,9 @@ function(vorel_objects target)
     # The old floating-point registers of 32-bit x86 would keep more than single precision.
     target_compile_options(${target} PRIVATE -msse2 -mfpmath=sse)
   endif()
+  # Nothing takes the place of the library's own functions, and linkers may fold them.
+  target_compile_options(${target} PRIVATE
+    -fno-semantic-interposition -ffunction-sections -fdata-sections)
   # Beyond this level compilers unroll loops that are vectors already: half the size again, no speed.
   target_compile_options(${target} PRIVATE $<$<CONFIG:Release>:-O2>)
   if(VOREL_ASSERTIONS)
@@ -36,6 +39,26 @@ endfunction()
 # the shared library is loaded, lets the whole process flush subnormal numbers. Not for this one.
 function(vorel_strict_link target)
   target_link_options(${target} PRIVATE -O2 -fno-fast-math -fno-unsafe-math-optimizations)
+endfunction()
+
+# vorel_small_link(TARGET): a shared library without what its linker can leave out. Functions of equal
+# instructions are one where it folds them, as Android's does. Code and constants share a segment: one apart
+# would begin on a page of its own, of 16 KB. Names have one table, but on Android, which reads the newer
+# kind from API 23 on. What the library calls of its own is not looked up by name.
+include(CheckLinkerFlag)
+check_linker_flag(CXX -Wl,--icf=all VOREL_LINKER_FOLDS)
+check_linker_flag(CXX -Wl,-z,noseparate-code VOREL_LINKER_JOINS)
+function(vorel_small_link target)
+  target_link_options(${target} PRIVATE -Wl,-Bsymbolic-functions)
+  if(VOREL_LINKER_FOLDS)
+    target_link_options(${target} PRIVATE -Wl,--icf=all)
+  endif()
+  if(VOREL_LINKER_JOINS)
+    target_link_options(${target} PRIVATE -Wl,-z,noseparate-code)
+  endif()
+  if(NOT ANDROID)
+    target_link_options(${target} PRIVATE -Wl,--hash-style=gnu)
+  endif()
 endfunction()
 
 # vorel_library(TARGET CHOICE LEVELS LEVEL...): makes a library of all objects, of the choice of the level,
