@@ -37,12 +37,26 @@ if(VOREL_FOR_X86_64 OR VOREL_FOR_AARCH64)
   list(APPEND VOREL_FLAGS_scalar $<$<CONFIG:Release>:-Os>)
 endif()
 
+# What the loops gain by their vectors compilers do not add to: g++ need not copy conditions of loops before
+# them, nor align jumps, and clang need not unroll these sources (docs/benchmarks.md, "Size").
+if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
+  set(VOREL_LOOP_FLAGS -fno-tree-ch -fno-align-jumps -fno-align-labels)
+elseif(NOT VOREL_FOR_WASM)
+  set_source_files_properties(
+    ops/blur/difference_loops.cpp
+    ops/dilate/dilation_loops.cpp
+    ops/grow/growth_loops.cpp
+    ops/ramp/ramp_loops.cpp
+    PROPERTIES COMPILE_OPTIONS $<$<CONFIG:Release>:-Os>)
+endif()
+
 # vorel_level_objects(TARGET LEVEL SOURCE...): objects of sources that are compiled once for each level.
 function(vorel_level_objects target level)
   add_library(${target} OBJECT ${ARGN})
   vorel_objects(${target})
   target_compile_definitions(${target} PRIVATE
     VOREL_LEVEL=${level} VOREL_VECTOR_BYTES=${VOREL_BYTES_${level}})
+  target_compile_options(${target} PRIVATE "$<$<CONFIG:Release>:${VOREL_LOOP_FLAGS}>")
   # Vectors are passed within a level's sources alone: their calling convention is moot.
   target_compile_options(${target} PRIVATE ${VOREL_FLAGS_${level}} -Wno-psabi)
   if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
