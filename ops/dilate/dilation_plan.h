@@ -48,11 +48,12 @@ class DilationPlan {
 
   private:
     uint8_t* nextRows(int64_t y, int64_t count);
+    void beginStrategy();
     CoverageRows asRows(const uint8_t* values, int64_t count) const;
 
     DilationInput mInput;
     const DilationLoops& mLoops;
-    const DilationStrategy& mStrategy;
+    const DilationStrategy* mStrategy;
     int64_t mMemoryBytes;
     LineBuffer mMemory;
     Dilation mDilation = {};  ///< of the window
