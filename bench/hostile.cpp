@@ -1,3 +1,5 @@
+#include <malloc.h>
+
 #include <algorithm>
 #include <chrono>
 #include <cstdio>
@@ -13,13 +15,14 @@
 #include "hostile_masks.h"
 #include "level.h"
 
-/// How much longer than text the slowest mask of the gallery takes, a pixel, for each effect, size and level:
+/// How much longer than text the slowest mask of the gallery takes, a pixel, for each effect, size and
+/// level:
 ///
-///     voreleffect_hostile [--side PIXELS] [--each] [REGEX]
+///     voreleffect_hostile [--side PIXELS] [--mask REGEX] [EFFECTS]
 ///
 ///     --side PIXELS   of the masks, 512 without it
-///     --each          a row for each mask instead of the slowest one's
-///     REGEX           the effects to measure: stroke/outside/R:8 ...
+///     --mask REGEX    only these masks, a row for each one
+///     EFFECTS         a regular expression for the effects to measure: stroke/outside/8 ...
 namespace {
 
 using namespace vorel_bench;
@@ -43,8 +46,8 @@ void addStrokes(std::vector<Effect>& effects) {
             const int reach = position == 0 ? (size + 1) / 2 : position == 1 ? size : 0;
             effects.push_back({std::string("stroke/") + positions[position] + "/" + std::to_string(size),
                                reach,
-                               coreWith<VFStroke>(VFStrokeProperty(static_cast<float>(size), kColour, 1.0F,
-                                                                   0, position))});
+                               coreWith<VFStroke>(VFStrokeProperty(static_cast<float>(size), kColour,
+                                                                   1.0F, 0, position))});
         }
     }
 }
@@ -53,12 +56,12 @@ void addBlurs(std::vector<Effect>& effects) {
     for (const int size : {2, 8, 32, 100}) {
         const auto px = static_cast<float>(size);
         const std::string at = "/" + std::to_string(size);
-        effects.push_back({"shadow/outer" + at, size,
-                           coreWith<VFOuterShadow>(
-                               VFOuterShadowProperty(kAngle, kDistance, px, kColour, 1.0F))});
-        effects.push_back({"shadow/inner" + at, 0,
-                           coreWith<VFInnerShadow>(
-                               VFInnerShadowProperty(kAngle, kDistance, px, kColour, 1.0F))});
+        effects.push_back(
+            {"shadow/outer" + at, size,
+             coreWith<VFOuterShadow>(VFOuterShadowProperty(kAngle, kDistance, px, kColour, 1.0F))});
+        effects.push_back(
+            {"shadow/inner" + at, 0,
+             coreWith<VFInnerShadow>(VFInnerShadowProperty(kAngle, kDistance, px, kColour, 1.0F))});
         effects.push_back({"glow/outer" + at, size,
                            coreWith<VFOuterGlow>(VFOuterGlowProperty(px, kColour, 1.0F, 0, nullptr))});
         effects.push_back({"glow/inner" + at, 0,
@@ -112,47 +115,56 @@ double fastestCall(const Effect& effect, const Workload& mask) {
 
 void printRow(const std::string& effect, const Level& level, double text, double slowest,
               const std::string& mask) {
-    std::printf("| %-18s | %-7s | %8.3f | %8.3f | %6.1f | %-30s |\n", effect.c_str(), level.label.c_str(), text,
-                slowest, slowest / text, mask.c_str());
+    std::printf("| %-18s | %-7s | %8.3f | %8.3f | %6.1f | %-30s |\n", effect.c_str(),
+                level.label.c_str(), text, slowest, slowest / text, mask.c_str());
     std::fflush(stdout);
 }
 
 void measure(const Effect& effect, const Level& level, const Workload& page,
-             const std::vector<Workload>& masks, bool each) {
+             const std::vector<Workload>& masks, const std::string& each) {
     level.choose();
     const double text = fastestCall(effect, page);
     double slowest = 0;
     const Workload* which = nullptr;
     for (const Workload& mask : masks) {
+        if (!std::regex_search(mask.name, std::regex(each))) continue;
         const double taken = fastestCall(effect, mask);
-        if (each) printRow(effect.name, level, text, taken, mask.name);
+        if (!each.empty()) printRow(effect.name, level, text, taken, mask.name);
         if (taken <= slowest) continue;
         slowest = taken;
         which = &mask;
     }
-    if (!each) printRow(effect.name, level, text, slowest, which->name);
+    if (each.empty()) printRow(effect.name, level, text, slowest, which->name);
 }
 
 }  // namespace
 
 int main(int argc, char** argv) {
+    // Of large blocks, which come from the system anew for each call, a call would mostly take their
+    // pages.
+    mallopt(M_MMAP_THRESHOLD, 1 << 30);
+    mallopt(M_TRIM_THRESHOLD, 1 << 30);
     int side = 512;
-    bool each = false;
+    std::string each;
     std::string wanted = ".";
     for (int i = 1; i < argc; ++i) {
         const std::string argument = argv[i];
         if (argument == "--side" && i + 1 < argc) {
             side = std::atoi(argv[++i]);
-        } else if (argument == "--each") {
-            each = true;
+        } else if (argument == "--mask" && i + 1 < argc) {
+            each = argv[++i];
         } else {
             wanted = argument;
         }
     }
     const std::vector<Workload> masks = hostileMasks(side);
     const Workload page = textPage(side);
-    std::printf("| effect             | level   |     text |  slowest |  times | mask                           |\n");
-    std::printf("| ------------------ | ------- | -------: | -------: | -----: | ------------------------------ |\n");
+    std::printf(
+        "| effect             | level   |     text |  slowest |  times | mask                           "
+        "|\n");
+    std::printf(
+        "| ------------------ | ------- | -------: | -------: | -----: | ------------------------------ "
+        "|\n");
     for (const Effect& effect : allEffects()) {
         if (!std::regex_search(effect.name, std::regex(wanted))) continue;
         for (const Level& level : levels())

@@ -68,9 +68,10 @@ void addPlateaus(std::vector<Workload>& masks, int side) {
 
 void addGradients(std::vector<Workload>& masks, int side) {
     masks.push_back(maskOf("ramp across", side, [=](int x, int) { return x * 256 / side; }));
-    masks.push_back(maskOf("ramp of 256 pixels, aslant", side, [](int x, int y) { return (x + y) % 256; }));
-    masks.push_back(maskOf("ramp of 64 pixels, aslant", side,
-                           [](int x, int y) { return (2 * x + y) % 64 * 4; }));
+    masks.push_back(
+        maskOf("ramp of 256 pixels, aslant", side, [](int x, int y) { return (x + y) % 256; }));
+    masks.push_back(
+        maskOf("ramp of 64 pixels, aslant", side, [](int x, int y) { return (2 * x + y) % 64 * 4; }));
     masks.push_back(maskOf("cone", side, [=](int x, int y) {
         return 255 - rounded(std::hypot(x - side / 2, y - side / 2) * 360 / side);
     }));
@@ -108,8 +109,8 @@ void addPictures(std::vector<Workload>& masks, int side) {
     }));
     const Workload page = textPage(side);
     masks.push_back(maskOf("text in chalk", side, [&](int x, int y) {
-        const int coverage = page.mask[static_cast<size_t>(y) * static_cast<size_t>(side) +
-                                       static_cast<size_t>(x)];
+        const int coverage =
+            page.mask[static_cast<size_t>(y) * static_cast<size_t>(side) + static_cast<size_t>(x)];
         return coverage * random.between(0, 255) / 255;
     }));
 }

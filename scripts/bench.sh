@@ -3,6 +3,7 @@
 #
 #     scripts/bench.sh [--peers] [--quick] [--filter REGEX] [--save FILE] [--compare FILE] [--counts]
 #     scripts/bench.sh --document
+#     scripts/bench.sh --hostile [--document]
 #
 #     --peers          OpenCV, pixman, cairo, libass and FreeType's stroker on the same masks
 #     --quick          fewer and shorter repetitions
@@ -11,13 +12,14 @@
 #     --compare FILE   adds the change against a kept run
 #     --counts         instructions instead of time, under callgrind
 #     --document       everything, into docs/benchmarks.md
+#     --hostile        how much longer than text masks take that nothing like text: noise, ramps, halftones
 set -euo pipefail
 invoked=$PWD
 cd "$(dirname "$0")/.."
 . scripts/packages.sh
 . scripts/figures.sh
 
-peers=OFF times=yes counts='' document='' filter='' save='' compare=''
+peers=OFF times=yes counts='' document='' hostile='' filter='' save='' compare=''
 sampling=(--benchmark_min_time=0.02 --benchmark_repetitions=15)
 while [[ $# -gt 0 ]]; do
     case $1 in
@@ -27,11 +29,13 @@ while [[ $# -gt 0 ]]; do
         --filter) filter=$2; shift ;;
         --save) save=$(cd "$invoked" && realpath -m "$2"); shift ;;
         --compare) compare=$(cd "$invoked" && realpath -e "$2"); shift ;;
-        --document) document=docs/benchmarks.md peers=ON counts=yes ;;
+        --document) document=docs/benchmarks.md ;;
+        --hostile) hostile=yes ;;
         *) sed -n '2,/^set/{/^#/p}' "scripts/${0##*/}" >&2; exit 2 ;;
     esac
     shift
 done
+[[ -z $document || -n $hostile ]] || peers=ON counts=yes
 
 need_packages cmake ninja-build clang-14 pkg-config libbenchmark-dev libfreetype-dev fonts-dejavu-core python3
 [[ -z $counts ]] || need_packages valgrind
@@ -74,6 +78,12 @@ print_all() {
     [[ -z $times ]] || print_times
     [[ -z $counts ]] || print_counts
 }
+
+if [[ -n $hostile ]]; then
+    "$build/bench/voreleffect_hostile" ${filter:+"$filter"} | tee "$build/hostile.md"
+    [[ -z $document ]] || write_figures 'hostile figures' "$build/hostile.md" "$document"
+    exit
+fi
 
 if [[ -n $times ]]; then "$build/bench/voreleffect_bench" --check; fi
 if [[ -z $document ]]; then

@@ -15,10 +15,10 @@
 /// row, and the rest is the middle square, four of the largest side. A plane for each side holds the
 /// largest coverage of every square at its upper left corner, so a square is one load.
 ///
-/// What lies around the middle square is cut into 16 sectors, two of an octant: corners, and cells of the
-/// rim. A few squares around a sector tell the largest coverage in it. Where that is no more than what
-/// has been found the sector is left out, and its rim where it is no more than 1 above, as any cell of
-/// the rim lacks at least 1 to 255. The largest coverage under a disc is rarely in many sectors.
+/// What lies around the middle square is cut into 16 sectors, two of an octant: corners, and cells of
+/// the rim. A few squares around a sector tell the largest coverage in it. Where that is no more than
+/// what has been found the sector is left out, and its rim where it is no more than 1 above, as any cell
+/// of the rim lacks at least 1 to 255. The largest coverage under a disc is rarely in many sectors.
 ///
 /// Cost for a reach of r: 4 loads for each plane, of which there are about log2(1.4 r), and for each
 /// vector of results some 60 loads, and per sector that is looked into up to r / 7 squares and r / 2
@@ -149,13 +149,14 @@ inline void addBounds(LoadLists& lists, const DiscShape& disc, const Image& imag
         lists.addSquare(image, plane, outermost, row);
 }
 
+/// The sector's last row makes corners of its own, so that the squares reach inwards from there as well.
 inline void addCorners(LoadLists& lists, const DiscShape& disc, const Image& image, OctantRows rows) {
     const int64_t half = halfOfMiddle(disc);
-    for (int64_t row = rows.first; row <= min(rows.last, half); ++row) {
+    const int64_t last = min(rows.last, half);
+    for (int64_t row = rows.first; row <= last; ++row) {
         const int64_t column = disc.flatReach[row];
-        const bool isCorner = row == disc.reach || disc.flatReach[row + 1] < column;
-        if (isCorner && column > half)
-            lists.addSquare(image, planeWithin(2 * row + 1), column, row);
+        const bool isCorner = row == last || disc.flatReach[row + 1] < column;
+        if (isCorner && column > half) lists.addSquare(image, planeWithin(2 * row + 1), column, row);
     }
 }
 

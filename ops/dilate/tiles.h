@@ -54,10 +54,11 @@ constexpr int64_t kWindowSlack = kLongestWindow + 2 * kBytes;
 /// ones.
 constexpr int64_t kMostTaps = 16;
 
-/// A window is given up when its tiles take more rows of the source than these at first and as many for
-/// each tile of the results so far. Text takes 0.5 to 3.
+/// A window is given up when its tiles have been evaluated by more rows of the source than so many at
+/// first and so many for each tile of the results. Text takes 1 to 2 a tile, and up to 3500 more where
+/// its letters begin.
 constexpr int64_t kFirstAllowance = 4096;
-constexpr int64_t kAllowancePerTile = 8;
+constexpr int64_t kAllowancePerTile = 4;
 
 VOREL_INLINE int64_t tilesOf(int64_t columns) {
     return (columns + kTile - 1) / kTile;
@@ -444,8 +445,7 @@ inline Tile dilatedTile(const Dilation& dilation, const TileLayout& planes, int6
     open.add(min(max(y, rows.first), rows.last));
     open.add((rows.first + rows.last) / 2);
     const uint64_t unsettled = open.unsettled(planes.largest);
-    if (unsettled != 0)
-        allowance -= addTouching(open, rows, firstLane(unsettled), lastLane(unsettled));
+    if (unsettled != 0) allowance -= addTouching(open, rows, firstLane(unsettled), lastLane(unsettled));
     return open.result;
 }
 
