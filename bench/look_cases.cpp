@@ -152,12 +152,20 @@ class LiteralLookJob : public Job {
     literal::Picture mLayer;
 };
 
-void addLook(Cases& cases, const std::string& name, Describe<VFEffect> ours,
-             Describe<literal::Engine> literally) {
+Describe<VFEffect> describing(char look) {
+    switch (look) {
+        case 'A': return lookA<VFEffect>;
+        case 'B': return lookB<VFEffect>;
+        case 'C': return lookC<VFEffect>;
+        default: return lookD<VFEffect>;
+    }
+}
+
+void addLook(Cases& cases, char look, Describe<literal::Engine> literally) {
     for (const Workload* workload : {&glyph48(), &line48(), &title160()}) {
-        const std::string row = "look/" + name + "/" + workload->name;
-        const int64_t pixels = workload->grownPixels(kMargin);
-        cases.push_back(caseOf<LookJob>(row, kOurs, pixels, workload, ours));
+        cases.push_back(lookCase(look, *workload));
+        const std::string row = cases.back().row;
+        const int64_t pixels = cases.back().pixels;
         cases.push_back(caseOf<LiteralLookJob>(row, kLiteral, pixels, workload, literally));
         cases.push_back(copyCase(row, pixels, 4 * pixels));
     }
@@ -165,11 +173,16 @@ void addLook(Cases& cases, const std::string& name, Describe<VFEffect> ours,
 
 }  // namespace
 
+Case lookCase(char look, const Workload& workload) {
+    return caseOf<LookJob>(std::string("look/") + look + "/" + workload.name, kOurs,
+                           workload.grownPixels(kMargin), &workload, describing(look));
+}
+
 void addLookCases(Cases& cases) {
-    addLook(cases, "A", lookA<VFEffect>, lookA<literal::Engine>);
-    addLook(cases, "B", lookB<VFEffect>, lookB<literal::Engine>);
-    addLook(cases, "C", lookC<VFEffect>, lookC<literal::Engine>);
-    addLook(cases, "D", lookD<VFEffect>, lookD<literal::Engine>);
+    addLook(cases, 'A', lookA<literal::Engine>);
+    addLook(cases, 'B', lookB<literal::Engine>);
+    addLook(cases, 'C', lookC<literal::Engine>);
+    addLook(cases, 'D', lookD<literal::Engine>);
 }
 
 }  // namespace vorel_bench
