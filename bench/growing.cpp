@@ -50,8 +50,8 @@ double fastestCall(const Case& which) {
 }  // namespace
 
 int main() {
-    // The layers of a large picture come from the system anew for each call, which takes longer than many
-    // an effect, and is its caller's choice of an allocator: kept ones are measured.
+    // The layers of a large picture come from the system anew for each call, which takes longer than
+    // many an effect, and is its caller's choice of an allocator: kept ones are measured.
     mallopt(M_MMAP_THRESHOLD, 1 << 30);
     mallopt(M_TRIM_THRESHOLD, 1 << 30);
     std::printf("| ns/px  | level   |");

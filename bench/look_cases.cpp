@@ -154,10 +154,14 @@ class LiteralLookJob : public Job {
 
 Describe<VFEffect> describing(char look) {
     switch (look) {
-        case 'A': return lookA<VFEffect>;
-        case 'B': return lookB<VFEffect>;
-        case 'C': return lookC<VFEffect>;
-        default: return lookD<VFEffect>;
+        case 'A':
+            return lookA<VFEffect>;
+        case 'B':
+            return lookB<VFEffect>;
+        case 'C':
+            return lookC<VFEffect>;
+        default:
+            return lookD<VFEffect>;
     }
 }
 
