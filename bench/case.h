@@ -56,6 +56,9 @@ Case copyCase(const std::string& row, int64_t pixels, int64_t bytes);
 
 struct Workload;
 
+/// Pixels on each side of a workload in the pictures of looks.
+constexpr int kLookMargin = 40;
+
 /// The library paints look A, B, C or D on a workload, which must outlive the case.
 Case lookCase(char look, const Workload& workload);
 

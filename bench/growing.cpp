@@ -2,17 +2,20 @@
 
 #include <algorithm>
 #include <chrono>
+#include <cmath>
 #include <cstdio>
 #include <limits>
 #include <memory>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "case.h"
 #include "hostile_masks.h"
 #include "level.h"
 
-/// What a pixel takes in pictures of any size: each look on square pages of text, by the side in pixels.
+/// What a pixel takes in pictures of any size: each look on square pictures, by their side in pixels.
+/// Text covers a third of each one, its middle, so that larger ones hold more of the same.
 ///
 ///     voreleffect_growing
 namespace {
@@ -20,13 +23,17 @@ namespace {
 using namespace vorel_bench;
 using Clock = std::chrono::steady_clock;
 
-constexpr int kSides[] = {100, 300, 1000, 3000, 8000};
+constexpr int kSides[] = {180, 500, 1000, 2000, 4000, 8000};
+constexpr double kTextShare = 1.0 / 3.0;
 
-/// A page whose glyph is all of its text.
-Workload pageOf(int side) {
-    Workload page = textPage(side);
-    page.glyphs.push_back({0, 0, side, side, page.mask});
-    return page;
+/// What lies within the margin of a look; one glyph holds all of the text.
+Workload pictureOf(int side) {
+    const auto textSide = static_cast<int>(std::sqrt(kTextShare) * side);
+    Workload picture = textPage(textSide);
+    const int margin = (side - textSide) / 2 - kLookMargin;
+    picture.glyphs.push_back({margin, margin, textSide, textSide, std::move(picture.mask)});
+    picture.width = picture.height = side - 2 * kLookMargin;
+    return picture;
 }
 
 /// Nanoseconds a pixel of the fastest call.
@@ -61,17 +68,17 @@ int main() {
     for (size_t i = 0; i < std::size(kSides); ++i)
         std::printf(" -----: |");
     std::printf(" ---------------: |\n");
-    std::vector<Workload> pages;
+    std::vector<Workload> pictures;
     for (const int side : kSides)
-        pages.push_back(pageOf(side));
+        pictures.push_back(pictureOf(side));
     for (const char look : {'A', 'B', 'C', 'D'}) {
         for (const Level& level : levels()) {
             level.choose();
             std::printf("| look/%c | %-7s |", look, level.label.c_str());
             double smallest = std::numeric_limits<double>::infinity();
             double largest = 0;
-            for (const Workload& page : pages) {
-                const double taken = fastestCall(lookCase(look, page));
+            for (const Workload& picture : pictures) {
+                const double taken = fastestCall(lookCase(look, picture));
                 smallest = std::min(smallest, taken);
                 largest = std::max(largest, taken);
                 std::printf(" %6.3f |", taken);

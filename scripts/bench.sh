@@ -4,6 +4,7 @@
 #     scripts/bench.sh [--peers] [--quick] [--filter REGEX] [--save FILE] [--compare FILE] [--counts]
 #     scripts/bench.sh --document
 #     scripts/bench.sh --hostile [--document]
+#     scripts/bench.sh --growing [--document]
 #
 #     --peers          OpenCV, pixman, cairo, libass and FreeType's stroker on the same masks
 #     --quick          fewer and shorter repetitions
@@ -12,14 +13,15 @@
 #     --compare FILE   adds the change against a kept run
 #     --counts         instructions instead of time, under callgrind
 #     --document       everything, into docs/benchmarks.md
-#     --hostile        how much longer than text masks take that nothing like text: noise, ramps, halftones
+#     --hostile        how much longer than text masks take that are nothing like it: noise, ramps, halftones
+#     --growing        what a pixel of a look takes in small and in large pictures
 set -euo pipefail
 invoked=$PWD
 cd "$(dirname "$0")/.."
 . scripts/packages.sh
 . scripts/figures.sh
 
-peers=OFF times=yes counts='' document='' hostile='' filter='' save='' compare=''
+peers=OFF times=yes counts='' document='' alone='' filter='' save='' compare=''
 sampling=(--benchmark_min_time=0.02 --benchmark_repetitions=15)
 while [[ $# -gt 0 ]]; do
     case $1 in
@@ -30,12 +32,12 @@ while [[ $# -gt 0 ]]; do
         --save) save=$(cd "$invoked" && realpath -m "$2"); shift ;;
         --compare) compare=$(cd "$invoked" && realpath -e "$2"); shift ;;
         --document) document=docs/benchmarks.md ;;
-        --hostile) hostile=yes ;;
+        --hostile | --growing) alone=${1#--} ;;
         *) sed -n '2,/^set/{/^#/p}' "scripts/${0##*/}" >&2; exit 2 ;;
     esac
     shift
 done
-[[ -z $document || -n $hostile ]] || peers=ON counts=yes
+[[ -z $document || -n $alone ]] || peers=ON counts=yes
 
 need_packages cmake ninja-build clang-14 pkg-config libbenchmark-dev libfreetype-dev fonts-dejavu-core python3
 [[ -z $counts ]] || need_packages valgrind
@@ -79,9 +81,13 @@ print_all() {
     [[ -z $counts ]] || print_counts
 }
 
-if [[ -n $hostile ]]; then
-    "$build/bench/voreleffect_hostile" ${filter:+"$filter"} | tee "$build/hostile.md"
-    [[ -z $document ]] || write_figures 'hostile figures' "$build/hostile.md" "$document"
+if [[ -n $alone ]]; then
+    {
+        describe_run clang++-14
+        echo
+        "$build/bench/voreleffect_$alone" ${filter:+"$filter"}
+    } | tee "$build/$alone.md"
+    [[ -z $document ]] || write_figures "$alone figures" "$build/$alone.md" "$document"
     exit
 fi
 
