@@ -54,6 +54,14 @@ Case caseOf(const std::string& row, const std::string& maker, int64_t pixels, Ar
 /// Copies `bytes` bytes: what any change of as many bytes costs at least.
 Case copyCase(const std::string& row, int64_t pixels, int64_t bytes);
 
+struct Workload;
+
+/// Pixels on each side of a workload in the pictures of looks.
+constexpr int kLookMargin = 40;
+
+/// The library paints look A, B, C or D on a workload, which must outlive the case.
+Case lookCase(char look, const Workload& workload);
+
 /// The sizes that strokes, shadows and glows are measured at.
 constexpr int kRadii[] = {1, 2, 4, 8, 16, 32, 64, 100};
 

@@ -4,6 +4,7 @@
 
 #include "core/effect_types.h"
 #include "core/float_state.h"
+#include "core/line_buffer.h"
 #include "core/numeric.h"
 #include "core/size_limit.h"
 #include "core/windows.h"
@@ -28,12 +29,18 @@ class Outline {
   public:
     Outline(CpuLevel level, const CoverageBox& box, const DiscShape& disc, const StrokeShape& shape,
             int64_t bytesOfPlan)
-        : mGrown(level, {box.rows(shape.growsGlyph ? kAsIs : kInverse), disc}, bytesOfPlan) {
-        if (shape.side == StrokeSide::centre)
-            mInverse.emplace(level, DilationInput{box.rows(kInverse), disc}, bytesOfPlan);
+        : mMemory(bytesOfPlan, plansOf(shape)),
+          mGrown(level, {box.rows(shape.growsGlyph ? kAsIs : kInverse), disc}, mMemory.data(),
+                 bytesOfPlan) {
+        if (plansOf(shape) == 2) {
+            mInverse.emplace(level, DilationInput{box.rows(kInverse), disc},
+                             mMemory.data() + bytesOfPlan, bytesOfPlan);
+        }
     }
 
-    explicit operator bool() const { return mGrown && (!mInverse || *mInverse); }
+    explicit operator bool() const { return static_cast<bool>(mMemory); }
+
+    static int64_t plansOf(const StrokeShape& shape) { return shape.side == StrokeSide::centre ? 2 : 1; }
 
     void begin(const Box& window) {
         mGrown.begin(window);
@@ -45,6 +52,7 @@ class Outline {
     }
 
   private:
+    LineBuffer mMemory;
     DilationPlan mGrown;
     std::optional<DilationPlan> mInverse;
 };
@@ -75,7 +83,7 @@ void internal::paintStroke(const VFECore::ParamPostProcessing* params, const VFS
     const Box reached = DilationPlan::reached({box.rows(), disc});
     const Box visible = boundingBox(targets[0].seen(reached), targets[1].seen(reached));
     if (visible.empty()) return;
-    const int64_t bytesOfEach = shape.side == StrokeSide::centre ? workingBytes / 2 : workingBytes;
+    const int64_t bytesOfEach = workingBytes / Outline::plansOf(shape);
     const auto bytesOfPlan = [&](const Windows& cut) {
         return DilationPlan::memoryBytes(level, {box.rows(), disc}, cut);
     };

@@ -3,6 +3,8 @@
 #
 #     scripts/bench.sh [--peers] [--quick] [--filter REGEX] [--save FILE] [--compare FILE] [--counts]
 #     scripts/bench.sh --document
+#     scripts/bench.sh --hostile [--document]
+#     scripts/bench.sh --growing [--document]
 #
 #     --peers          OpenCV, pixman, cairo, libass and FreeType's stroker on the same masks
 #     --quick          fewer and shorter repetitions
@@ -11,13 +13,15 @@
 #     --compare FILE   adds the change against a kept run
 #     --counts         instructions instead of time, under callgrind
 #     --document       everything, into docs/benchmarks.md
+#     --hostile        how much longer than text masks take that are nothing like it: noise, ramps, halftones
+#     --growing        what a pixel of a look takes in small and in large pictures
 set -euo pipefail
 invoked=$PWD
 cd "$(dirname "$0")/.."
 . scripts/packages.sh
 . scripts/figures.sh
 
-peers=OFF times=yes counts='' document='' filter='' save='' compare=''
+peers=OFF times=yes counts='' document='' alone='' filter='' save='' compare=''
 sampling=(--benchmark_min_time=0.02 --benchmark_repetitions=15)
 while [[ $# -gt 0 ]]; do
     case $1 in
@@ -27,11 +31,13 @@ while [[ $# -gt 0 ]]; do
         --filter) filter=$2; shift ;;
         --save) save=$(cd "$invoked" && realpath -m "$2"); shift ;;
         --compare) compare=$(cd "$invoked" && realpath -e "$2"); shift ;;
-        --document) document=docs/benchmarks.md peers=ON counts=yes ;;
+        --document) document=docs/benchmarks.md ;;
+        --hostile | --growing) alone=${1#--} ;;
         *) sed -n '2,/^set/{/^#/p}' "scripts/${0##*/}" >&2; exit 2 ;;
     esac
     shift
 done
+[[ -z $document || -n $alone ]] || peers=ON counts=yes
 
 need_packages cmake ninja-build clang-14 pkg-config libbenchmark-dev libfreetype-dev fonts-dejavu-core python3
 [[ -z $counts ]] || need_packages valgrind
@@ -74,6 +80,16 @@ print_all() {
     [[ -z $times ]] || print_times
     [[ -z $counts ]] || print_counts
 }
+
+if [[ -n $alone ]]; then
+    {
+        describe_run clang++-14
+        echo
+        "$build/bench/voreleffect_$alone" ${filter:+"$filter"}
+    } | tee "$build/$alone.md"
+    [[ -z $document ]] || write_figures "$alone figures" "$build/$alone.md" "$document"
+    exit
+fi
 
 if [[ -n $times ]]; then "$build/bench/voreleffect_bench" --check; fi
 if [[ -z $document ]]; then

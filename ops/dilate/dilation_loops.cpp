@@ -2,6 +2,7 @@
 
 #include "ops/dilate/cells.h"
 #include "ops/dilate/spreading.h"
+#include "ops/dilate/squares.h"
 #include "ops/dilate/tiles.h"
 
 namespace VFontEffect::internal::VOREL_LEVEL {
@@ -15,7 +16,7 @@ void keepMin(uint8_t* first, const uint8_t* second, int64_t count) {
 }  // namespace
 
 extern const DilationLoops kDilationLoops = {
-    {kCells<0>, kCells<1>, kCells<2>}, kSpreading, kTiles, kLongestSpreadReach, keepMin,
+    {kCells<0>, kCells<1>, kCells<2>}, kSpreading, kTiles, kSquares, kLongestSpreadReach, keepMin,
 };
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

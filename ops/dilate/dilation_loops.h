@@ -45,7 +45,8 @@ struct DilationStrategy {
     /// values.
     void (*begin)(const Dilation& dilation, uint8_t* memory);
     /// `count` rows of results from row y on, first column `left`: from row `top` on a band after the
-    /// other, all of bandRows rows but the last. They may be changed, and stay until the next call.
+    /// other, all of bandRows rows but the last. They may be changed, and stay until the next call. Null
+    /// when the strategy gives the window up, as it takes too long there.
     uint8_t* (*rows)(const Dilation& dilation, uint8_t* memory, int64_t y, int64_t count);
 };
 
@@ -55,7 +56,8 @@ constexpr int kLongestCellReach = 2;
 struct DilationLoops {
     DilationStrategy cells[kLongestCellReach + 1];  ///< by reach
     DilationStrategy spreading;
-    DilationStrategy tiles;
+    DilationStrategy tiles;    ///< may give up
+    DilationStrategy squares;  ///< for what tiles give up
     /// Up to this reach spreading takes less time than tiles.
     int64_t longestSpreadReach;
     /// first = min(first, second), whole rows of results

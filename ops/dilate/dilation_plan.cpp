@@ -59,23 +59,35 @@ const DilationStrategy& strategyFor(const DilationLoops& loops, int reach) {
 }  // namespace
 
 int64_t DilationPlan::memoryBytes(CpuLevel level, const DilationInput& input, const Windows& windows) {
-    return strategyFor(dilationLoops(level), input.disc.reach)
-        .memoryBytes(largestDilation(input, windows));
+    const DilationLoops& loops = dilationLoops(level);
+    const DilationStrategy& strategy = strategyFor(loops, input.disc.reach);
+    const Dilation largest = largestDilation(input, windows);
+    const int64_t bytes = strategy.memoryBytes(largest);
+    return &strategy == &loops.tiles ? std::max(bytes, loops.squares.memoryBytes(largest)) : bytes;
 }
 
-DilationPlan::DilationPlan(CpuLevel level, const DilationInput& input, int64_t memoryBytes)
+DilationPlan::DilationPlan(CpuLevel level, const DilationInput& input, uint8_t* memory,
+                           int64_t memoryBytes)
     : mInput(input),
       mLoops(dilationLoops(level)),
-      mStrategy(strategyFor(mLoops, input.disc.reach)),
-      mMemoryBytes(memoryBytes),
-      mMemory(mMemoryBytes) {}
+      mStrategy(&strategyFor(mLoops, input.disc.reach)),
+      mMemory(memory),
+      mMemoryBytes(memoryBytes) {}
 
 void DilationPlan::begin(const Box& window) {
     mDilation = dilationOf(mInput, window);
-    VOREL_ASSERT(*this && mStrategy.memoryBytes(mDilation) <= mMemoryBytes);
-    mStrategy.begin(mDilation, mMemory.data());
     mFirstRow = window.top - mDilation.top;
     mNextRow = window.top;
+    beginStrategy();
+}
+
+void DilationPlan::giveUpTiles() {
+    if (mStrategy == &mLoops.tiles) mStrategy = &mLoops.squares;
+}
+
+void DilationPlan::beginStrategy() {
+    VOREL_ASSERT(mStrategy->memoryBytes(mDilation) <= mMemoryBytes);
+    mStrategy->begin(mDilation, mMemory);
 }
 
 CoverageRows DilationPlan::rows(int64_t y, int64_t count) {
@@ -90,9 +102,15 @@ CoverageRows DilationPlan::minRows(DilationPlan& other, int64_t y, int64_t count
 }
 
 uint8_t* DilationPlan::nextRows(int64_t y, int64_t count) {
-    VOREL_ASSERT(*this && y == mNextRow && count > 0 && count <= bandRows());
+    VOREL_ASSERT(y == mNextRow && count > 0 && count <= bandRows());
     mNextRow += count;
-    return mStrategy.rows(mDilation, mMemory.data(), y - mFirstRow, count);
+    uint8_t* const rows = mStrategy->rows(mDilation, mMemory, y - mFirstRow, count);
+    if (rows != nullptr) return rows;
+    // Here and in the windows that follow, which hold more of the same.
+    giveUpTiles();
+    mDilation.top = y - mFirstRow;
+    beginStrategy();
+    return mStrategy->rows(mDilation, mMemory, mDilation.top, count);
 }
 
 CoverageRows DilationPlan::asRows(const uint8_t* values, int64_t count) const {

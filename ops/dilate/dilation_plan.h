@@ -4,7 +4,6 @@
 
 #include "core/box.h"
 #include "core/coverage_rows.h"
-#include "core/line_buffer.h"
 #include "core/windows.h"
 #include "ops/dilate/dilation_loops.h"
 
@@ -16,8 +15,9 @@ struct DilationInput {
     const DiscShape& disc;
 };
 
-/// A dilation, planned once: the strategy and its memory, which serves one window after the other. It is
-/// ready, or empty when memory ran out.
+/// A dilation, planned once: the strategy, whose memory serves one window after the other. Memory is the
+/// caller's, who may need several plans: one block of it costs less than several, which allocators give
+/// back to the system, and take anew page by page.
 class DilationPlan {
   public:
     /// All that the disc reaches from a source and the pixel around it, in the source's coordinates.
@@ -25,16 +25,18 @@ class DilationPlan {
         return expanded(wholeOf(input.source), input.disc.reach + kDilationBorder);
     }
 
-    /// What a plan for any of the windows takes.
+    /// What a plan for any of the windows takes: a multiple of kArenaAlignment.
     static int64_t memoryBytes(CpuLevel level, const DilationInput& input, const Windows& windows);
 
-    /// Takes so much memory. Windows, in the source's coordinates, are of what is reached.
-    DilationPlan(CpuLevel level, const DilationInput& input, int64_t memoryBytes);
-
-    explicit operator bool() const { return static_cast<bool>(mMemory); }
+    /// So many bytes of memory, aligned to kArenaAlignment, must outlive the plan. Windows, in the
+    /// source's coordinates, are of what is reached.
+    DilationPlan(CpuLevel level, const DilationInput& input, uint8_t* memory, int64_t memoryBytes);
 
     /// Turns to a window, or a part of one.
     void begin(const Box& window);
+
+    /// From the next window on what tiles would do is done by squares, as if they had given up.
+    void giveUpTiles();
 
     /// Rows that are asked for at once; the last ones of a window may be fewer.
     int64_t bandRows() const { return mDilation.bandRows; }
@@ -48,13 +50,14 @@ class DilationPlan {
 
   private:
     uint8_t* nextRows(int64_t y, int64_t count);
+    void beginStrategy();
     CoverageRows asRows(const uint8_t* values, int64_t count) const;
 
     DilationInput mInput;
     const DilationLoops& mLoops;
-    const DilationStrategy& mStrategy;
+    const DilationStrategy* mStrategy;
+    uint8_t* mMemory;
     int64_t mMemoryBytes;
-    LineBuffer mMemory;
     Dilation mDilation = {};  ///< of the window
     int64_t mFirstRow = 0;    ///< of the source, its row 0
     int64_t mNextRow = 0;

@@ -54,6 +54,12 @@ constexpr int64_t kWindowSlack = kLongestWindow + 2 * kBytes;
 /// ones.
 constexpr int64_t kMostTaps = 16;
 
+/// A window is given up when its tiles have been evaluated by more rows of the source than so many at
+/// first and so many for each tile of the results. Text takes 1 to 2 a tile, and up to 3500 more where
+/// its letters begin.
+constexpr int64_t kFirstAllowance = 4096;
+constexpr int64_t kAllowancePerTile = 4;
+
 VOREL_INLINE int64_t tilesOf(int64_t columns) {
     return (columns + kTile - 1) / kTile;
 }
@@ -85,6 +91,7 @@ struct TileLayout {
     Tile* rimDeficits;
     uint8_t* outerReach;  ///< by dy, from -reach to reach, at most 255, then zeros
     uint8_t* results;     ///< of a band
+    int64_t allowance;    ///< source rows that tiles may still be evaluated by
 
     static TileLayout of(const Dilation& dilation, Arena& arena) {
         const int64_t height = dilation.height;
@@ -119,6 +126,7 @@ struct TileLayout {
         layout.rimDeficits = arena.take<Tile>(DiscShape::kMostRimCells + (reach + 1) * kFewestRimCells);
         layout.outerReach = arena.take<uint8_t>(2 * reach + 1 + kOverhang);
         layout.results = arena.take<uint8_t>(dilation.bandRows * dilatedStride(dilation));
+        layout.allowance = kFirstAllowance;
         return layout;
     }
 };
@@ -409,16 +417,20 @@ inline RowRange touchingRange(const OpenTile& tile, RowRange rows) {
     return touching;
 }
 
-/// Adds the rows that touch any of the given lanes.
-inline void addTouching(OpenTile& tile, RowRange rows, int firstOpen, int lastOpen) {
+/// Adds the rows that touch any of the given lanes; how many there are.
+inline int64_t addTouching(OpenTile& tile, RowRange rows, int firstOpen, int lastOpen) {
+    int64_t added = 0;
     for (int64_t row = rows.first; row <= rows.last; row += kBytes) {
         uint64_t lanes = tile.touching(row, rows.last, firstOpen, lastOpen);
-        for (; lanes != 0; lanes = withoutFirst(lanes))
+        for (; lanes != 0; lanes = withoutFirst(lanes), ++added)
             tile.add(row + firstLane(lanes));
     }
+    return added;
 }
 
-inline Tile dilatedTile(const Dilation& dilation, const TileLayout& planes, int64_t y, int64_t tile) {
+/// Takes the rows that it evaluates from the allowance.
+inline Tile dilatedTile(const Dilation& dilation, const TileLayout& planes, int64_t y, int64_t tile,
+                        int64_t& allowance) {
     const int64_t reach = dilation.disc->reach;
     OpenTile open = {planes,
                      y,
@@ -433,12 +445,12 @@ inline Tile dilatedTile(const Dilation& dilation, const TileLayout& planes, int6
     open.add(min(max(y, rows.first), rows.last));
     open.add((rows.first + rows.last) / 2);
     const uint64_t unsettled = open.unsettled(planes.largest);
-    if (unsettled != 0) addTouching(open, rows, firstLane(unsettled), lastLane(unsettled));
+    if (unsettled != 0) allowance -= addTouching(open, rows, firstLane(unsettled), lastLane(unsettled));
     return open.result;
 }
 
 inline void dilateRowByTiles(const Dilation& dilation, const TileLayout& planes, int64_t y,
-                             uint8_t* results) {
+                             uint8_t* results, int64_t& allowance) {
     const int64_t nearest = min(max<int64_t>(y, 0), dilation.height - 1);
     const auto away = static_cast<Reach>(y < nearest ? nearest - y : y - nearest);
     const Reach* const full = planes.full + nearest * planes.reachStride;
@@ -455,7 +467,7 @@ inline void dilateRowByTiles(const Dilation& dilation, const TileLayout& planes,
         }
         for (int64_t i = tile; i < end; ++i, results += kTile) {
             const bool known = full[i] >= away || touched[i] < away;
-            store(results, !known            ? dilatedTile(dilation, planes, y, i)
+            store(results, !known            ? dilatedTile(dilation, planes, y, i, allowance)
                            : full[i] >= away ? most
                                              : Tile{});
         }
@@ -464,9 +476,14 @@ inline void dilateRowByTiles(const Dilation& dilation, const TileLayout& planes,
 
 inline uint8_t* rowsByTiles(const Dilation& dilation, uint8_t* memory, int64_t y, int64_t count) {
     const auto planes = layoutIn<TileLayout>(memory);
-    for (int64_t i = 0; i < count; ++i)
-        dilateRowByTiles(dilation, planes, y + i, planes.results + i * dilatedStride(dilation));
-    return planes.results;
+    int64_t allowance = planes.allowance;
+    for (int64_t i = 0; i < count && allowance >= 0; ++i) {
+        uint8_t* const results = planes.results + i * dilatedStride(dilation);
+        dilateRowByTiles(dilation, planes, y + i, results, allowance);
+        allowance += kAllowancePerTile * (planes.endTile - planes.firstTile);
+    }
+    reinterpret_cast<TileLayout*>(memory)->allowance = allowance;
+    return allowance >= 0 ? planes.results : nullptr;
 }
 
 constexpr DilationStrategy kTiles = {layoutBytes<TileLayout>, beginTiles, rowsByTiles};

@@ -22,11 +22,12 @@ struct GrowthJob {
 
 constexpr int64_t kGrowthMargin = 64;
 
-/// What is skipped where nothing changes any more: squares of 16 pixels, or wider at some levels.
-constexpr int64_t kGrowthTile = 16;
+/// What is skipped where nothing changes any more: so many rows of one vector each.
+constexpr int64_t kGrowthTileRows = 16;
+constexpr int64_t kNarrowestGrowthTile = 4;
 
 inline int64_t growthTileBytes(int64_t width, int64_t height) {
-    return 2 * (width / kGrowthTile + 3) * (height / kGrowthTile + 3);
+    return 2 * (width / kNarrowestGrowthTile + 3) * (height / kGrowthTileRows + 3);
 }
 
 struct GrowthLoops {

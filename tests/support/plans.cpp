@@ -4,6 +4,7 @@
 #include <cstddef>
 
 #include "core/effect_types.h"
+#include "core/line_buffer.h"
 #include "cores/glow.h"
 #include "cores/painters.h"
 #include "ops/blur/blur_plan.h"
@@ -127,14 +128,19 @@ std::vector<uint8_t> blurred(const BlurInput& input) {
 }
 
 std::vector<uint8_t> dilated(const CoverageRows& source, const DiscShape& disc, const Box& part,
-                             bool andInverse, const WindowSize& size) {
+                             bool andInverse, const WindowSize& size, LargeDiscs largeDiscs) {
     const Windows windows = cut(part, size);
     const int64_t bytes = DilationPlan::memoryBytes(chosenLevel(), {source, disc}, windows);
-    DilationPlan plan(chosenLevel(), {source, disc}, bytes);
+    LineBuffer memory(bytes, 2);
+    if (!memory) return {};
+    DilationPlan plan(chosenLevel(), {source, disc}, memory.data(), bytes);
     CoverageRows inverse = source;
     inverse.invertMask ^= kInverse;
-    DilationPlan other(chosenLevel(), {inverse, disc}, bytes);
-    if (!plan || !other) return {};
+    DilationPlan other(chosenLevel(), {inverse, disc}, memory.data() + bytes, bytes);
+    if (largeDiscs == LargeDiscs::bySquares) {
+        plan.giveUpTiles();
+        other.giveUpTiles();
+    }
     Collected values(part);
     windows.forEach([&](const Box& window) {
         plan.begin(window);
@@ -182,8 +188,9 @@ void askForRowsOutOfOrder() {
     const DiscShape disc(1.0F);
     const Box part = {0, 0, 1, 2};
     const DilationInput input = {{&pixel, 1, 1, 1, kAsIs}, disc};
-    DilationPlan plan(chosenLevel(), input,
-                      DilationPlan::memoryBytes(chosenLevel(), input, Windows::oneOf(part)));
+    const int64_t bytes = DilationPlan::memoryBytes(chosenLevel(), input, Windows::oneOf(part));
+    LineBuffer memory(bytes);
+    DilationPlan plan(chosenLevel(), input, memory.data(), bytes);
     plan.begin(part);
     plan.rows(1, 1);
 }

@@ -33,12 +33,16 @@ VF_API std::vector<uint8_t> blurredByDifferences(const VFontEffect::internal::Bl
                                                  const WindowSize& size = {});
 VF_API std::vector<uint8_t> blurred(const VFontEffect::internal::BlurInput& input);
 
+/// What large discs are dilated by: tiles as far as they do not give up, or squares alone.
+enum class LargeDiscs { asTheyCome, bySquares };
+
 /// The part's values, row after row: of a source dilated by a disc, or the smaller ones of that and of
 /// its inverse, dilated likewise.
 VF_API std::vector<uint8_t> dilated(const VFontEffect::internal::CoverageRows& source,
                                     const VFontEffect::internal::DiscShape& disc,
                                     const VFontEffect::internal::Box& part, bool andInverse,
-                                    const WindowSize& size = {});
+                                    const WindowSize& size = {},
+                                    LargeDiscs largeDiscs = LargeDiscs::asTheyCome);
 
 /// All that a source has grown to, with its margin, row after row.
 VF_API std::vector<uint8_t> grown(const VFontEffect::internal::GrowthInput& input,

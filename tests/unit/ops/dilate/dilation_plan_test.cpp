@@ -106,6 +106,78 @@ TEST(DilationPlan, OfEveryReach_IsTheDefinedOne) {
     }
 }
 
+/// A single pixel grows to the disc itself: each of its cells is found, in whichever square or sector.
+void expectDiscBySquares(float radius) {
+    const uint8_t pixel = 255;
+    const DiscShape disc(radius);
+    const Box part = expanded(Box{0, 0, 1, 1}, disc.reach);
+    const auto values = dilated({&pixel, 1, 1, 1, kAsIs}, disc, part, false, {}, LargeDiscs::bySquares);
+    ASSERT_EQ(values.size(), static_cast<size_t>(part.width() * part.height()));
+    size_t i = 0;
+    for (int64_t y = part.top; y < part.bottom; ++y) {
+        for (int64_t x = part.left; x < part.right; ++x) {
+            ASSERT_EQ(values[i++], discWeight(std::abs(x), std::abs(y), radius))
+                << "radius " << radius << ", cell " << x << " " << y;
+        }
+    }
+}
+
+TEST(DilationPlan, Squares_HaveEveryCellOfEveryDisc) {
+    for (int reach = 9; reach <= DiscShape::kLongestReach; ++reach) {
+        forSeeds(static_cast<uint64_t>(reach) * 10, reach < 60 ? 6 : 1, [&](Random& random) {
+            // Discs whose last rows are full or of the rim alone.
+            expectDiscBySquares(std::min(static_cast<float>(reach) + random.real(-0.5F, 0.49F), 256.0F));
+        });
+        if (HasFatalFailure()) return;
+    }
+}
+
+/// Of an area of any size the pixels that lie on a random grid.
+void expectDefinedHereAndThere(Random& random, const CoverageRows& source, float radius,
+                               LargeDiscs largeDiscs) {
+    const DiscShape disc(radius);
+    const Box part = expanded(wholeOf(source), disc.reach);
+    const WindowSize windows =
+        random.chance(50) ? WindowSize{random.between(60, 300), 70} : WindowSize{};
+    const auto values = dilated(source, disc, part, false, windows, largeDiscs);
+    for (int i = 0; i < 40; ++i) {
+        const int64_t x = random.between(0, static_cast<int>(part.width()) - 1);
+        const int64_t y = random.between(0, static_cast<int>(part.height()) - 1);
+        ASSERT_EQ(values.at(static_cast<size_t>(y * part.width() + x)),
+                  definedDilation(source, radius, part.left + x, part.top + y))
+            << source.width << " x " << source.height << ", radius " << radius << ", at " << x << " "
+            << y;
+    }
+}
+
+/// Noise that is sparse or dense, ramps, and plateaus with grain.
+literal::Mask unlikeText(Random& random, int width, int height) {
+    literal::Mask mask =
+        noiseMask(random, width, height, random.chance(50) ? 0 : random.between(50, 99));
+    const int step = random.between(0, 5);
+    const int grain = random.between(1, 256);
+    for (int y = 0; y < height && step > 0; ++y) {
+        for (int x = 0; x < width; ++x) {
+            uint8_t& value = mask.bytes[static_cast<size_t>(y * width + x)];
+            value = static_cast<uint8_t>(std::min((x * step + y) % 240 + value % grain, 255));
+        }
+    }
+    return mask;
+}
+
+TEST(DilationPlan, WhatTilesGiveUp_IsTheDefinedOne) {
+    forSeeds(7000, 60, [&](Random& random) {
+        const int width = random.between(20, 400);
+        const int height = random.between(20, 300);
+        const literal::Mask mask = unlikeText(random, width, height);
+        const uint8_t invertMask = random.chance(50) ? kAsIs : kInverse;
+        const CoverageRows source = {mask.bytes.data(), width, width, height, invertMask};
+        const float radius = random.real(17.0F, 70.0F);
+        expectDefinedHereAndThere(random, source, radius, LargeDiscs::bySquares);
+        expectDefinedHereAndThere(random, source, radius, LargeDiscs::asTheyCome);
+    });
+}
+
 TEST(DilationPlan, ReachesOnePixelFartherThanTheDisc) {
     const CoverageRows source = {nullptr, 7, 5, 3, kAsIs};
     const DiscShape disc(4.0F);

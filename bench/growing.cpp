@@ -1,0 +1,91 @@
+#include <malloc.h>
+
+#include <algorithm>
+#include <chrono>
+#include <cmath>
+#include <cstdio>
+#include <limits>
+#include <memory>
+#include <string>
+#include <utility>
+#include <vector>
+
+#include "case.h"
+#include "hostile_masks.h"
+#include "level.h"
+
+/// What a pixel takes in pictures of any size: each look on square pictures, by their side in pixels.
+/// Text covers a third of each one, its middle, so that larger ones hold more of the same.
+///
+///     voreleffect_growing
+namespace {
+
+using namespace vorel_bench;
+using Clock = std::chrono::steady_clock;
+
+constexpr int kSides[] = {180, 500, 1000, 2000, 4000, 8000};
+constexpr double kTextShare = 1.0 / 3.0;
+
+/// What lies within the margin of a look; one glyph holds all of the text.
+Workload pictureOf(int side) {
+    const auto textSide = static_cast<int>(std::sqrt(kTextShare) * side);
+    Workload picture = textPage(textSide);
+    const int margin = (side - textSide) / 2 - kLookMargin;
+    picture.glyphs.push_back({margin, margin, textSide, textSide, std::move(picture.mask)});
+    picture.width = picture.height = side - 2 * kLookMargin;
+    return picture;
+}
+
+/// Nanoseconds a pixel of the fastest call.
+double fastestCall(const Case& which) {
+    constexpr int kFewestCalls = 3;
+    constexpr double kSeconds = 0.1;
+    const std::unique_ptr<Job> job = which.make();
+    double fastest = std::numeric_limits<double>::infinity();
+    double taken = 0;
+    for (int calls = 0; calls < kFewestCalls || taken < kSeconds; ++calls) {
+        job->reset();
+        const Clock::time_point before = Clock::now();
+        job->paint();
+        const double seconds = std::chrono::duration<double>(Clock::now() - before).count();
+        taken += seconds;
+        fastest = std::min(fastest, seconds);
+    }
+    return fastest * 1e9 / static_cast<double>(which.pixels);
+}
+
+}  // namespace
+
+int main() {
+    // The layers of a large picture come from the system anew for each call, which takes longer than
+    // many an effect, and is its caller's choice of an allocator: kept ones are measured.
+    mallopt(M_MMAP_THRESHOLD, 1 << 30);
+    mallopt(M_TRIM_THRESHOLD, 1 << 30);
+    std::printf("| ns/px  | level   |");
+    for (const int side : kSides)
+        std::printf(" %6d |", side);
+    std::printf(" largest/smallest |\n| ------ | ------- |");
+    for (size_t i = 0; i < std::size(kSides); ++i)
+        std::printf(" -----: |");
+    std::printf(" ---------------: |\n");
+    std::vector<Workload> pictures;
+    for (const int side : kSides)
+        pictures.push_back(pictureOf(side));
+    for (const char look : {'A', 'B', 'C', 'D'}) {
+        for (const Level& level : levels()) {
+            level.choose();
+            std::printf("| look/%c | %-7s |", look, level.label.c_str());
+            double smallest = std::numeric_limits<double>::infinity();
+            double largest = 0;
+            for (const Workload& picture : pictures) {
+                const double taken = fastestCall(lookCase(look, picture));
+                smallest = std::min(smallest, taken);
+                largest = std::max(largest, taken);
+                std::printf(" %6.3f |", taken);
+                std::fflush(stdout);
+            }
+            std::printf(" %16.2f |\n", largest / smallest);
+        }
+    }
+    return 0;
+}
