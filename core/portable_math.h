@@ -13,10 +13,14 @@ namespace VFontEffect::internal {
 /// e to the power of x, for x in -80..0; 0 below.
 float portableExp(float x);
 
+struct Turn {
+    float sine;
+    float cosine;
+    float tangent;
+};
+
 /// Sine, cosine and tangent of an angle in radians. Beyond 100,000 radians, and for infinities and
 /// NaN, they are the C library's.
-float portableSin(float radians);
-float portableCos(float radians);
-float portableTan(float radians);
+Turn portableTurn(float radians);
 
 }  // namespace VFontEffect::internal

@@ -19,9 +19,9 @@ struct ShadowOffset {
 /// the light comes from, with y downwards; the shadow falls on the far side. Deliberate: only the
 /// horizontal move is negated, and pi has six digits.
 inline ShadowOffset shadowOffset(float angleDeg, float distancePx) {
-    const float angle = angleDeg * 3.14159F / 180.0F;
-    const float across = portableCos(angle) * distancePx;
-    const float down = portableSin(angle) * distancePx;
+    const Turn angle = portableTurn(angleDeg * 3.14159F / 180.0F);
+    const float across = angle.cosine * distancePx;
+    const float down = angle.sine * distancePx;
     return {toInt((across < 0.0F ? 0.5F : -0.5F) - across), toInt(down + (down > 0.0F ? 0.5F : -0.5F))};
 }
 

@@ -66,7 +66,7 @@ int VFEffect::addEffect(int id, int type, VFProperty* property) {
     mOrdered = false;
     VFECore* core = getEffect(type);
     if (core == nullptr) {
-        mEffects.reserve(mEffects.size() + 1);  // may throw: before there is a core to leak
+        mEffects.reserve(kNoEffect);  // one of each type; may throw: before there is a core to leak
         core = createEffect(id, type, nullptr);
         if (core == nullptr) return -1;
         mEffects.push_back(core);
