@@ -62,18 +62,13 @@ void GrowthPlan::copyIn(const Box& worked) {
     const CoverageRows& source = mInput.source;
     const Box framed = expanded(worked, 1);
     const Box inside = intersection(framed, wholeOf(source));
-    const int64_t left = inside.left - framed.left;
-    for (int64_t y = framed.top; y < framed.bottom; ++y) {
-        uint8_t* const row = mLayout.row(0, y - worked.top) - 1;
-        if (inside.empty() || y < inside.top || y >= inside.bottom) {
-            std::memset(row, source.invertMask, static_cast<size_t>(framed.width()));
-            continue;
-        }
-        const int64_t end = left + inside.width();
-        std::memset(row, source.invertMask, static_cast<size_t>(left));
+    uint8_t* const start = mLayout.row(0, -1) - 1;
+    std::memset(start, source.invertMask, static_cast<size_t>(framed.height() * mLayout.stride));
+    if (inside.empty()) return;
+    for (int64_t y = inside.top; y < inside.bottom; ++y) {
         mLoops.copyInverted(source.start + y * source.stride + inside.left, inside.width(),
-                            source.invertMask, row + left);
-        std::memset(row + end, source.invertMask, static_cast<size_t>(framed.width() - end));
+                            source.invertMask,
+                            mLayout.row(0, y - worked.top) + inside.left - worked.left);
     }
 }
 
