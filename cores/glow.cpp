@@ -115,7 +115,6 @@ struct Growing {
 /// memory ran out.
 [[nodiscard]] bool paintBlurred(CpuLevel level, const Growing& growing, const PlacedTarget& target,
                                 const Box& visible, const ValueColours& colours, int64_t workingBytes) {
-    if (!growing.weights) return false;
     const auto memoryBytes = [&](const Windows& cut) {
         return GrowthPlan::memoryBytes(growing.input, growing.widthFor(cut), growing.heightFor(cut)) +
                BlurPlan::memoryBytes(level, growing.largestBlur(cut));

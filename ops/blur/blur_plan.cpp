@@ -23,7 +23,6 @@ int64_t BlurPlan::memoryBytes(CpuLevel level, const BlurInput& input) {
 }
 
 BlurPlan::BlurPlan(CpuLevel level, const BlurInput& largest) {
-    if (!largest.weights) return;
     VOREL_ASSERT(!largest.window.empty());
     VOREL_ASSERT(largest.weights.total <= kLargestTotal);
     const DotLoops& dots = dotLoops(level);

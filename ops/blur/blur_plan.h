@@ -54,7 +54,6 @@ void forBands(BlurPlan& plan, const BlurInput& input, Paint paint) {
 /// of all; for none when memory ran out.
 template <class Paint>
 void blurInWindows(CpuLevel level, const BlurInput& input, int64_t workingBytes, Paint paint) {
-    if (!input.weights) return;
     const auto memoryBytes = [&](const Windows& cut) {
         return BlurPlan::memoryBytes(level, input.largestOf(cut));
     };

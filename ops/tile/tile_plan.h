@@ -1,11 +1,10 @@
 #pragma once
 
 #include <algorithm>
-#include <cmath>
 #include <cstdint>
 
+#include "core/line_buffer.h"
 #include "core/numeric.h"
-#include "core/pixel_buffer.h"
 #include "core/views.h"
 #include "ops/tile/tile_loops.h"
 
@@ -29,10 +28,10 @@ class TileAxis {
     };
     Tap at(int64_t coordinate) const {
         const float position = static_cast<float>(coordinate % mTileSize) / mScale;
-        const float whole = std::floor(position);
-        const auto farWeight =
-            static_cast<uint32_t>(std::clamp(toInt((position - whole) * 255.0F), 0, 255));
-        const int64_t near = std::clamp<int64_t>(toInt(whole), 0, mPatternSize - 1);
+        const int32_t whole = toInt(position);
+        const auto fraction = position - static_cast<float>(whole);
+        const auto farWeight = static_cast<uint32_t>(std::clamp(toInt(fraction * 255.0F), 0, 255));
+        const int64_t near = std::clamp<int64_t>(whole, 0, mPatternSize - 1);
         const int64_t far = near + 1 < mPatternSize ? near + 1 : 0;
         return {static_cast<int32_t>(near), static_cast<int32_t>(far), 255 - farWeight, farWeight};
     }
@@ -58,7 +57,7 @@ class TilePlan {
     /// plan.
     TilePlan(CpuLevel level, const ColourView& pattern, float scale, float opacity, int64_t width);
 
-    explicit operator bool() const { return mTaps && mMixed[0].planes && mMixed[1].planes && mRow; }
+    explicit operator bool() const { return static_cast<bool>(mMemory); }
 
     /// Row y: R, G, B, A, premultiplied. It stays until the next call.
     const uint32_t* row(int64_t y);
@@ -68,16 +67,13 @@ class TilePlan {
 
     /// A pattern row mixed along its columns.
     struct KeptRow {
-        explicit KeptRow(int64_t width);
-        MixedRow mixed() { return {planes.data(), planes.data() + length}; }
-
-        PixelBuffer<uint32_t> planes;
-        int64_t length;
+        MixedRow mixed = {};
         int32_t row = kNoRow;
     };
 
+    int64_t layOut(uint8_t* memory);
     void listTaps();
-    ColumnTaps taps();
+    ColumnTaps taps() const;
     MixedRow mixedRow(int32_t row, int32_t other);
     void repeat();
 
@@ -88,9 +84,11 @@ class TilePlan {
     float mOpacity;
     int64_t mWidth;
     int64_t mSampled;
-    PixelBuffer<uint32_t> mTaps;
+    int64_t mLength;            ///< of what is kept for each sampled column
+    uint32_t* mTaps = nullptr;  ///< four planes of words, as ColumnTaps names them
     KeptRow mMixed[2];
-    PixelBuffer<uint32_t> mRow;
+    uint32_t* mRow = nullptr;
+    LineBuffer mMemory;
 };
 
 }  // namespace VFontEffect::internal

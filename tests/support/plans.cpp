@@ -189,9 +189,9 @@ void askForRowsOutOfOrder() {
 }
 
 TermsOfWeights termsOf(const BlurWeights& weights) {
-    const WeightTerms memory(differenceLoops(chosenLevel()), weights);
-    if (!memory) return {};
-    const DifferenceTerms& terms = *memory;
+    std::vector<int32_t> memory(static_cast<size_t>(termBytes(weights.radius)) / sizeof(int32_t));
+    const DifferenceTerms terms = differenceTerms(differenceLoops(chosenLevel()), weights,
+                                                  reinterpret_cast<uint8_t*>(memory.data()));
     TermsOfWeights result = {terms.pairs.distance, terms.pairs.areDifferences, {}};
     append(terms.added, 1, result.terms);
     append(terms.takenAway, -1, result.terms);
