@@ -115,14 +115,16 @@ struct Growing {
 /// memory ran out.
 [[nodiscard]] bool paintBlurred(CpuLevel level, const Growing& growing, const PlacedTarget& target,
                                 const Box& visible, const ValueColours& colours, int64_t workingBytes) {
+    const auto growthBytes = [&](const Windows& cut) {
+        return GrowthPlan::memoryBytes(growing.input, growing.widthFor(cut), growing.heightFor(cut));
+    };
     const auto memoryBytes = [&](const Windows& cut) {
-        return GrowthPlan::memoryBytes(growing.input, growing.widthFor(cut), growing.heightFor(cut)) +
-               BlurPlan::memoryBytes(level, growing.largestBlur(cut));
+        return growthBytes(cut) + BlurPlan::memoryBytes(level, growing.largestBlur(cut));
     };
     const int64_t reach = int64_t{growing.weights.radius} + growing.input.passes;
     const Windows windows = windowsWithin(workingBytes, visible, reach, memoryBytes);
     GrowthPlan growth(level, growing.input, growing.widthFor(windows), growing.heightFor(windows));
-    BlurPlan blur(level, growing.largestBlur(windows));
+    BlurPlan blur(level, growing.largestBlur(windows), windows.memoryBytes - growthBytes(windows));
     if (!growth || !blur) return false;
     windows.forEach([&](const Box& window) {
         const Box part = growing.partFor(window);

@@ -17,8 +17,9 @@ class BlurPlan {
     /// What a plan for an input takes beside the weights.
     static int64_t memoryBytes(CpuLevel level, const BlurInput& input);
 
-    /// For inputs that take no more memory than this one, of the same weights, order and endings.
-    BlurPlan(CpuLevel level, const BlurInput& largest);
+    /// For inputs that take no more memory than this one, which is `memoryBytes`, of the same weights,
+    /// order and endings.
+    BlurPlan(CpuLevel level, const BlurInput& largest, int64_t memoryBytes);
 
     explicit operator bool() const;
 
@@ -58,7 +59,7 @@ void blurInWindows(CpuLevel level, const BlurInput& input, int64_t workingBytes,
         return BlurPlan::memoryBytes(level, input.largestOf(cut));
     };
     const Windows windows = windowsWithin(workingBytes, input.window, input.weights.radius, memoryBytes);
-    BlurPlan plan(level, input.largestOf(windows));
+    BlurPlan plan(level, input.largestOf(windows), windows.memoryBytes);
     if (!plan) return;
     windows.forEach([&](const Box& window) { forBands(plan, input.of(window), paint); });
 }

@@ -139,7 +139,8 @@ int64_t DifferenceBlur::memoryBytes(const DifferenceLoops& loops, const BlurInpu
     return arena.used;
 }
 
-DifferenceBlur::DifferenceBlur(const DifferenceLoops& loops, const BlurInput& largest)
+DifferenceBlur::DifferenceBlur(const DifferenceLoops& loops, const BlurInput& largest,
+                               int64_t memoryBytes)
     : mLoops(loops),
       mDownFirst(largest.order == BlurInput::Order::downThenAcross),
       mFirst(largest.first),
@@ -148,7 +149,7 @@ DifferenceBlur::DifferenceBlur(const DifferenceLoops& loops, const BlurInput& la
       mTotal(largest.weights.total),
       mInverse(inverseAbove(mTotal)),
       mSide(loops.vectorBytes),
-      mMemoryBytes(memoryBytes(loops, largest)),
+      mMemoryBytes(memoryBytes),
       mMemory(mMemoryBytes + termBytes(mRadius)) {
     if (mMemory) mTerms = differenceTerms(loops, largest.weights, mMemory.data() + mMemoryBytes);
 }

@@ -28,8 +28,8 @@ class DifferenceBlur {
     /// What a blur takes for an input beside its weights.
     static int64_t memoryBytes(const DifferenceLoops& loops, const BlurInput& input);
 
-    /// For inputs that take no more than this one.
-    DifferenceBlur(const DifferenceLoops& loops, const BlurInput& largest);
+    /// For inputs that take no more than this one, which is `memoryBytes`.
+    DifferenceBlur(const DifferenceLoops& loops, const BlurInput& largest, int64_t memoryBytes);
 
     /// Whether there is memory for it.
     explicit operator bool() const { return static_cast<bool>(mMemory); }

@@ -106,7 +106,7 @@ TapGroups takeGroups(const DotLoops& loops, const BlurWeights& weights, int64_t 
     taps.missing = needed;
     taps.steps = tapSteps(weights.radius);
     taps.capacity = std::min(taps.steps - 1 + kSpareGroups, needed.end - needed.first);
-    taps.strips = roundedUp(width, loops.vectorBytes) / loops.vectorBytes;
+    taps.strips = (width + loops.vectorBytes - 1) / loops.vectorBytes;
     taps.groupBytes = kQuad * loops.vectorBytes * pixelBytes(loops, weights);
     const int64_t stripBytes = taps.groupBytes * taps.capacity;
     uint8_t* const groups = arena.take<uint8_t>(stripBytes * taps.strips);
@@ -190,11 +190,11 @@ int64_t DotBlur::memoryBytes(const DotLoops& loops, const BlurInput& input) {
 
 // --- Passes -----------------------------------------------------------------------------------------
 
-DotBlur::DotBlur(const DotLoops& loops, const BlurInput& largest)
+DotBlur::DotBlur(const DotLoops& loops, const BlurInput& largest, int64_t memoryBytes)
     : mLoops(loops),
       mFirst(largest.first),
       mSecond(largest.second),
-      mMemoryBytes(memoryBytes(loops, largest)),
+      mMemoryBytes(memoryBytes),
       mMemory(mMemoryBytes + packedBytes(loops, largest.weights.radius)) {
     if (mMemory) mBlur = packed(loops, largest.weights, mMemory.data() + mMemoryBytes);
 }

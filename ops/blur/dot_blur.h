@@ -51,8 +51,8 @@ class DotBlur {
     /// What a blur takes for an input beside its weights.
     static int64_t memoryBytes(const DotLoops& loops, const BlurInput& input);
 
-    /// For inputs that take no more than this one.
-    DotBlur(const DotLoops& loops, const BlurInput& largest);
+    /// For inputs that take no more than this one, which is `memoryBytes`.
+    DotBlur(const DotLoops& loops, const BlurInput& largest, int64_t memoryBytes);
 
     /// Whether there is memory for it.
     explicit operator bool() const { return static_cast<bool>(mMemory); }

@@ -80,8 +80,11 @@ void GrowthPlan::setFrame() {
         std::memcpy(mLayout.row(other, y) - 1, mLayout.row(mCurrent, y) - 1,
                     static_cast<size_t>(width + 2));
     }
-    for (int64_t y = 0; y < mLayout.height; ++y)
-        mLayout.row(other, y)[-1] = mLayout.row(other, y)[width] = mInput.source.invertMask;
+    const uint8_t around = mInput.source.invertMask;
+    uint8_t* row = mLayout.row(other, 0);
+    const int64_t stride = mLayout.stride;
+    for (int64_t rows = mLayout.height; rows > 0; --rows, row += stride)
+        row[-1] = row[width] = around;
 }
 
 void GrowthPlan::grow(int passes) {

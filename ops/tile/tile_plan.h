@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cstdint>
 
+#include "core/inline.h"
 #include "core/line_buffer.h"
 #include "core/numeric.h"
 #include "core/views.h"
@@ -26,8 +27,9 @@ class TileAxis {
         uint32_t nearWeight;
         uint32_t farWeight;
     };
-    Tap at(int64_t coordinate) const {
-        const float position = static_cast<float>(coordinate % mTileSize) / mScale;
+    VOREL_INLINE Tap at(int64_t coordinate) const {
+        const int64_t inTile = coordinate < mTileSize ? coordinate : coordinate % mTileSize;
+        const float position = static_cast<float>(inTile) / mScale;
         const int32_t whole = toInt(position);
         const auto fraction = position - static_cast<float>(whole);
         const auto farWeight = static_cast<uint32_t>(std::clamp(toInt(fraction * 255.0F), 0, 255));

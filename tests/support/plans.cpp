@@ -108,18 +108,22 @@ void paintWithin(int64_t workingBytes, int type, const VFProperty& record,
 
 std::vector<uint8_t> blurredByDots(const BlurInput& input, const WindowSize& size) {
     const Windows windows = cut(input.window, size);
-    DotBlur blur(dotLoops(chosenLevel()), input.largestOf(windows));
+    const DotLoops& loops = dotLoops(chosenLevel());
+    const BlurInput largest = input.largestOf(windows);
+    DotBlur blur(loops, largest, DotBlur::memoryBytes(loops, largest));
     return collected(blur, input, windows);
 }
 
 std::vector<uint8_t> blurredByDifferences(const BlurInput& input, const WindowSize& size) {
     const Windows windows = cut(input.window, size);
-    DifferenceBlur blur(differenceLoops(chosenLevel()), input.largestOf(windows));
+    const DifferenceLoops& loops = differenceLoops(chosenLevel());
+    const BlurInput largest = input.largestOf(windows);
+    DifferenceBlur blur(loops, largest, DifferenceBlur::memoryBytes(loops, largest));
     return collected(blur, input, windows);
 }
 
 std::vector<uint8_t> blurred(const BlurInput& input) {
-    BlurPlan plan(chosenLevel(), input);
+    BlurPlan plan(chosenLevel(), input, BlurPlan::memoryBytes(chosenLevel(), input));
     if (!plan) return {};
     Collected values(input.window);
     forBands(plan, input, [&](const Box& band, const BlurredRows& rows) { values.put(band, rows); });
