@@ -4,19 +4,18 @@
 #include <cstdint>
 #include <cstring>
 
-#include "core/inline.h"
 #include "core/numeric.h"
 
 namespace VFontEffect::internal {
 namespace {
 
 /// c[0] + c[1] * x + c[2] * x^2 + ..., by Horner's rule.
-template <int kFirst = 0, int kTerms>
-VOREL_INLINE double polynomial(double x, const double (&c)[kTerms]) {
-    if constexpr (kFirst == kTerms - 1)
-        return c[kFirst];
-    else
-        return c[kFirst] + x * polynomial<kFirst + 1>(x, c);
+template <int Terms>
+double polynomial(double x, const double (&c)[Terms]) {
+    double sum = c[Terms - 1];
+    for (int i = Terms - 2; i >= 0; --i)
+        sum = c[i] + x * sum;
+    return sum;
 }
 
 /// Taylor series around 0; on the reduced arguments their remainders lie below 1e-17.
