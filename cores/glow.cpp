@@ -26,6 +26,8 @@ constexpr float kRadiusPerPad = 0.9F;
 static_assert(totalBound(128, static_cast<uint32_t>((kLargestSizePx + 1) * kRadiusPerPad)) <=
                   kLargestTotal,
               "a glow of the size limit divides by reciprocals");
+static_assert((kLargestSizePx + 1) * kRadiusPerPad <= static_cast<float>(BlurWeights::kLongestRadius),
+              "and has room for its weights");
 
 /// `pad`, the whole size + 1, is the unit of a glow: growth and blur are fractions of it, the margin is
 /// twice of it.

@@ -27,6 +27,8 @@ inline ShadowOffset shadowOffset(float angleDeg, float distancePx) {
 
 static_assert(totalBound(100, static_cast<uint32_t>(kLargestSizePx)) <= kLargestTotal,
               "a shadow of the size limit divides by reciprocals");
+static_assert(kLargestSizePx + 0.5F < static_cast<float>(BlurWeights::kLongestRadius + 1),
+              "and has room for its weights");
 
 /// The blur radius of a shadow; a negative size does not blur.
 inline int shadowRadius(float sizePx) {

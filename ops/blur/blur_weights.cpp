@@ -4,7 +4,6 @@
 #include <cmath>
 #include <cstdint>
 
-#include "core/assert.h"
 #include "core/numeric.h"
 #include "core/portable_math.h"
 
@@ -16,7 +15,6 @@ constexpr float kLn100 = 4.60517F;
 /// `round` turns the exponential of a tap into its whole weight.
 template <class Round>
 BlurWeights makeWeights(int radius, uint32_t centre, Round round) {
-    VOREL_ASSERT(radius >= 0 && radius <= BlurWeights::kLongestRadius);
     BlurWeights weights;
     weights.radius = radius;
     weights.total = weights.byDistance[0] = centre;
