@@ -62,14 +62,19 @@ void GrowthPlan::copyIn(const Box& worked) {
     const CoverageRows& source = mInput.source;
     const Box framed = expanded(worked, 1);
     const Box inside = intersection(framed, wholeOf(source));
-    uint8_t* const start = mLayout.row(0, -1) - 1;
-    std::memset(start, source.invertMask, static_cast<size_t>(framed.height() * mLayout.stride));
-    if (inside.empty()) return;
-    for (int64_t y = inside.top; y < inside.bottom; ++y) {
+    uint8_t* at = mLayout.row(0, -1) - 1;
+    uint8_t* const end = at + framed.height() * mLayout.stride;
+    const auto fillTo = [&](const uint8_t* next) {
+        std::memset(at, source.invertMask, static_cast<size_t>(next - at));
+    };
+    for (int64_t y = inside.top; !inside.empty() && y < inside.bottom; ++y) {
+        uint8_t* const row = mLayout.row(0, y - worked.top) + inside.left - worked.left;
+        fillTo(row);
         mLoops.copyInverted(source.start + y * source.stride + inside.left, inside.width(),
-                            source.invertMask,
-                            mLayout.row(0, y - worked.top) + inside.left - worked.left);
+                            source.invertMask, row);
+        at = row + inside.width();
     }
+    fillTo(end);
 }
 
 /// The frame of the other plane: as it is in this one above and below.
