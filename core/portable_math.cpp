@@ -1,6 +1,10 @@
 #include "core/portable_math.h"
 
 #include <cmath>
+#include <cstdint>
+#include <cstring>
+
+#include "core/numeric.h"
 
 namespace VFontEffect::internal {
 namespace {
@@ -62,31 +66,25 @@ constexpr double kTwoOverPi = 0.63661977236758134308;
 constexpr float kSmallestExponent = -80.0F;
 constexpr float kLargestAngle = 100000.0F;
 
-double nearestWhole(double x) {
-    return std::floor(x + 0.5);
+/// Of a number within 32 bits.
+int32_t nearestWhole(double x) {
+    const double above = x + 0.5;
+    const int32_t whole = toInt(above);
+    return whole > above ? whole - 1 : whole;
 }
 
-struct SineCosine {
-    double sine;
-    double cosine;
-};
+/// Of an exponent that normal numbers have.
+double powerOfTwo(int32_t exponent) {
+    constexpr int32_t kBias = 1023;
+    constexpr int kFractionBits = 52;
+    const uint64_t bits = static_cast<uint64_t>(kBias + exponent) << kFractionBits;
+    double power = 0.0;
+    std::memcpy(&power, &bits, sizeof power);
+    return power;
+}
 
-/// Both of an angle up to kLargestAngle: less whole quarter turns, in -pi/4..pi/4, then turned back.
-SineCosine sineCosine(double radians) {
-    const double quarters = nearestWhole(radians * kTwoOverPi);
-    const double r = (radians - quarters * kHalfPiHigh) - quarters * kHalfPiLow;
-    const double sine = r * polynomial(r * r, kSineSeries);
-    const double cosine = polynomial(r * r, kCosineSeries);
-    switch (static_cast<int>(quarters) & 3) {
-        case 0:
-            return {sine, cosine};
-        case 1:
-            return {cosine, -sine};
-        case 2:
-            return {-sine, -cosine};
-        default:
-            return {-cosine, sine};
-    }
+Turn turnOf(double sine, double cosine) {
+    return {static_cast<float>(sine), static_cast<float>(cosine), static_cast<float>(sine / cosine)};
 }
 
 bool isReducible(float radians) {
@@ -97,23 +95,28 @@ bool isReducible(float radians) {
 
 float portableExp(float x) {
     if (!(x >= kSmallestExponent)) return 0.0F;
-    const double halvings = nearestWhole(x * kLog2E);
+    const int32_t halvings = nearestWhole(x * kLog2E);
     const double r = (x - halvings * kLn2High) - halvings * kLn2Low;
-    return static_cast<float>(std::ldexp(polynomial(r, kExpSeries), static_cast<int>(halvings)));
+    return static_cast<float>(polynomial(r, kExpSeries) * powerOfTwo(halvings));
 }
 
-float portableSin(float radians) {
-    return isReducible(radians) ? static_cast<float>(sineCosine(radians).sine) : std::sin(radians);
-}
-
-float portableCos(float radians) {
-    return isReducible(radians) ? static_cast<float>(sineCosine(radians).cosine) : std::cos(radians);
-}
-
-float portableTan(float radians) {
-    if (!isReducible(radians)) return std::tan(radians);
-    const SineCosine both = sineCosine(radians);
-    return static_cast<float>(both.sine / both.cosine);
+// Whole quarter turns are taken away, which leaves -pi/4..pi/4, then turned back.
+Turn portableTurn(float radians) {
+    if (!isReducible(radians)) return {std::sin(radians), std::cos(radians), std::tan(radians)};
+    const int32_t quarters = nearestWhole(radians * kTwoOverPi);
+    const double r = (radians - quarters * kHalfPiHigh) - quarters * kHalfPiLow;
+    const double sine = r * polynomial(r * r, kSineSeries);
+    const double cosine = polynomial(r * r, kCosineSeries);
+    switch (quarters & 3) {
+        case 0:
+            return turnOf(sine, cosine);
+        case 1:
+            return turnOf(cosine, -sine);
+        case 2:
+            return turnOf(-sine, -cosine);
+        default:
+            return turnOf(-cosine, sine);
+    }
 }
 
 }  // namespace VFontEffect::internal

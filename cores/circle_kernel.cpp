@@ -16,13 +16,18 @@ namespace {
 /// A disc beyond this takes seconds and is no text effect: it counts as one that memory cannot hold.
 constexpr int64_t kLargestSide = 8192;
 
-/// The weights of the walk's row, `middle` being its cell in the disc's middle column.
-void fillRow(const RimWalk& walk, int64_t reach, unsigned char* middle) {
-    std::memset(middle - reach, 0, static_cast<size_t>(2 * reach + 1));
-    if (walk.flatReach >= 0)
-        std::memset(middle - walk.flatReach, 255, static_cast<size_t>(2 * walk.flatReach + 1));
-    for (int64_t dx = walk.flatReach + 1; dx <= walk.outerReach; ++dx)
-        middle[dx] = middle[-dx] = walk.weight(dx);
+/// A disc of zeros becomes that disc.
+void fillDisc(unsigned char* disc, int64_t reach, float radius) {
+    const int64_t side = 2 * reach + 1;
+    const auto middleOf = [&](int64_t y) { return disc + (reach + y) * side + reach; };
+    const auto setCell = [&](int64_t x, int64_t y, uint8_t weight) {
+        middleOf(y)[x] = middleOf(y)[-x] = weight;
+    };
+    walkRim(reach, radius, setCell, [&](int64_t y, int64_t flatReach, int64_t) {
+        if (flatReach >= 0)
+            std::memset(middleOf(y) - flatReach, 255, static_cast<size_t>(2 * flatReach + 1));
+        if (y != 0) std::memcpy(middleOf(-y) - reach, middleOf(y) - reach, static_cast<size_t>(side));
+    });
 }
 
 /// As makeCircleKernel.
@@ -32,15 +37,10 @@ int storeDisc(unsigned char** kernel, float radius) {
     if (side < 1 || side > std::numeric_limits<int32_t>::max() / side) return 0;
     if (kernel != nullptr && side <= kLargestSide) {
         const auto rowBytes = static_cast<size_t>(side);
-        auto* const disc = static_cast<unsigned char*>(std::malloc(rowBytes * rowBytes));
+        auto* const disc = static_cast<unsigned char*>(std::calloc(rowBytes, rowBytes));
         if (disc != nullptr) {
             *kernel = disc;
-            for (RimWalk walk(reach, radius); !walk.done(); walk.nextRow()) {
-                unsigned char* const below = disc + (reach + walk.row()) * side;
-                unsigned char* const above = disc + (reach - walk.row()) * side;
-                fillRow(walk, reach, below + reach);
-                if (above != below) std::memcpy(above, below, rowBytes);
-            }
+            fillDisc(disc, reach, radius);
         }
     }
     return static_cast<int>(side);

@@ -26,6 +26,8 @@ constexpr float kRadiusPerPad = 0.9F;
 static_assert(totalBound(128, static_cast<uint32_t>((kLargestSizePx + 1) * kRadiusPerPad)) <=
                   kLargestTotal,
               "a glow of the size limit divides by reciprocals");
+static_assert((kLargestSizePx + 1) * kRadiusPerPad <= static_cast<float>(BlurWeights::kLongestRadius),
+              "and has room for its weights");
 
 /// `pad`, the whole size + 1, is the unit of a glow: growth and blur are fractions of it, the margin is
 /// twice of it.
@@ -115,15 +117,16 @@ struct Growing {
 /// memory ran out.
 [[nodiscard]] bool paintBlurred(CpuLevel level, const Growing& growing, const PlacedTarget& target,
                                 const Box& visible, const ValueColours& colours, int64_t workingBytes) {
-    if (!growing.weights) return false;
+    const auto growthBytes = [&](const Windows& cut) {
+        return GrowthPlan::memoryBytes(growing.input, growing.widthFor(cut), growing.heightFor(cut));
+    };
     const auto memoryBytes = [&](const Windows& cut) {
-        return GrowthPlan::memoryBytes(growing.input, growing.widthFor(cut), growing.heightFor(cut)) +
-               BlurPlan::memoryBytes(level, growing.largestBlur(cut));
+        return growthBytes(cut) + BlurPlan::memoryBytes(level, growing.largestBlur(cut));
     };
     const int64_t reach = int64_t{growing.weights.radius} + growing.input.passes;
     const Windows windows = windowsWithin(workingBytes, visible, reach, memoryBytes);
     GrowthPlan growth(level, growing.input, growing.widthFor(windows), growing.heightFor(windows));
-    BlurPlan blur(level, growing.largestBlur(windows));
+    BlurPlan blur(level, growing.largestBlur(windows), windows.memoryBytes - growthBytes(windows));
     if (!growth || !blur) return false;
     windows.forEach([&](const Box& window) {
         const Box part = growing.partFor(window);

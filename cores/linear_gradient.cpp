@@ -21,9 +21,9 @@ namespace {
 constexpr float kRadiansPerDegree = -0.01745328F;
 
 /// The length of the line through the centre of a w x h box at an angle.
-float lengthAcross(float angle, float w, float h) {
-    if (std::fabs(portableTan(angle)) < h / w) return w / std::fabs(portableCos(angle));
-    return h / std::fabs(portableSin(angle));
+float lengthAcross(const Turn& angle, float w, float h) {
+    if (std::fabs(angle.tangent) < h / w) return w / std::fabs(angle.cosine);
+    return h / std::fabs(angle.sine);
 }
 
 }  // namespace
@@ -40,10 +40,9 @@ void VFLinearGradient::doPostProcessing(ParamPostProcessing* params) {
 
     const auto w = static_cast<float>(box.width);
     const auto h = static_cast<float>(box.height);
-    const float angle = mProperty->mAngle * kRadiansPerDegree;
+    const Turn angle = portableTurn(mProperty->mAngle * kRadiansPerDegree);
     const float step = (256.0F / mProperty->mScale) / lengthAcross(angle, w, h);
-    const LinearRamp ramp = {table.pixels(), portableCos(angle) * step, portableSin(angle) * step,
-                             w * 0.5F, h * 0.5F};
+    const LinearRamp ramp = {table.pixels(), angle.cosine * step, angle.sine * step, w * 0.5F, h * 0.5F};
     fillCovered(level, box, params->dstBitmap, [&](const BlendJob& job) { loops.linear(job, ramp); });
 }
 

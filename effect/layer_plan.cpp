@@ -38,9 +38,11 @@ void reorder(std::vector<VFECore*>& cores, bool layered) {
         if (core->getStyle() == kText) return 1;
         return !layered && placementOf(*core).underText ? 2 : 0;
     };
+    const auto isAbove = [&](int place, VFECore* core) { return place < rank(core); };
     std::reverse(cores.begin(), cores.end());
-    std::stable_sort(cores.begin(), cores.end(),
-                     [&](VFECore* a, VFECore* b) { return rank(a) < rank(b); });
+    // By insertion: the list is short, and a stable sort would take memory for it.
+    for (auto next = cores.begin(); next != cores.end(); ++next)
+        std::rotate(std::upper_bound(cores.begin(), next, rank(*next), isAbove), next, next + 1);
 }
 
 template <class Query>

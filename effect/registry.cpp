@@ -52,7 +52,6 @@ VFEffect::VFEffect(const VFEffect& other)
       mNextEffectId(other.mNextEffectId),
       mTextAlpha(other.mTextAlpha),
       mOrdered(other.mOrdered) {
-    mEffects.reserve(other.mEffects.size());
     for (VFECore* core : other.mEffects)
         addEffect(core->getId(), core->getStyle(), core->getProperty());
 }
@@ -66,7 +65,8 @@ int VFEffect::addEffect(int id, int type, VFProperty* property) {
     mOrdered = false;
     VFECore* core = getEffect(type);
     if (core == nullptr) {
-        mEffects.reserve(mEffects.size() + 1);  // may throw: before there is a core to leak
+        // Room for one of each type. The first time it may throw: before there is a core to leak.
+        mEffects.reserve(kNoEffect);
         core = createEffect(id, type, nullptr);
         if (core == nullptr) return -1;
         mEffects.push_back(core);

@@ -22,15 +22,14 @@ int64_t BlurPlan::memoryBytes(CpuLevel level, const BlurInput& input) {
                                          : DotBlur::memoryBytes(dots, input);
 }
 
-BlurPlan::BlurPlan(CpuLevel level, const BlurInput& largest) {
-    if (!largest.weights) return;
+BlurPlan::BlurPlan(CpuLevel level, const BlurInput& largest, int64_t memoryBytes) {
     VOREL_ASSERT(!largest.window.empty());
     VOREL_ASSERT(largest.weights.total <= kLargestTotal);
     const DotLoops& dots = dotLoops(level);
     if (suitsDifferences(dots, largest)) {
-        mDifferences.emplace(differenceLoops(level), largest);
+        mDifferences.emplace(differenceLoops(level), largest, memoryBytes);
     } else {
-        mDots.emplace(dots, largest);
+        mDots.emplace(dots, largest, memoryBytes);
     }
 }
 

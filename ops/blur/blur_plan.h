@@ -17,8 +17,9 @@ class BlurPlan {
     /// What a plan for an input takes beside the weights.
     static int64_t memoryBytes(CpuLevel level, const BlurInput& input);
 
-    /// For inputs that take no more memory than this one, of the same weights, order and endings.
-    BlurPlan(CpuLevel level, const BlurInput& largest);
+    /// For inputs that take no more memory than this one, which is `memoryBytes`, of the same weights,
+    /// order and endings.
+    BlurPlan(CpuLevel level, const BlurInput& largest, int64_t memoryBytes);
 
     explicit operator bool() const;
 
@@ -54,12 +55,11 @@ void forBands(BlurPlan& plan, const BlurInput& input, Paint paint) {
 /// of all; for none when memory ran out.
 template <class Paint>
 void blurInWindows(CpuLevel level, const BlurInput& input, int64_t workingBytes, Paint paint) {
-    if (!input.weights) return;
     const auto memoryBytes = [&](const Windows& cut) {
         return BlurPlan::memoryBytes(level, input.largestOf(cut));
     };
     const Windows windows = windowsWithin(workingBytes, input.window, input.weights.radius, memoryBytes);
-    BlurPlan plan(level, input.largestOf(windows));
+    BlurPlan plan(level, input.largestOf(windows), windows.memoryBytes);
     if (!plan) return;
     windows.forEach([&](const Box& window) { forBands(plan, input.of(window), paint); });
 }

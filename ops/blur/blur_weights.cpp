@@ -15,14 +15,14 @@ constexpr float kLn100 = 4.60517F;
 /// `round` turns the exponential of a tap into its whole weight.
 template <class Round>
 BlurWeights makeWeights(int radius, uint32_t centre, Round round) {
-    BlurWeights weights = {PixelBuffer<uint32_t>::uninitialised(int64_t{radius} + 1), radius, centre};
-    if (!weights) return weights;
-    weights.byDistance[0] = centre;
+    BlurWeights weights;
+    weights.radius = radius;
+    weights.total = weights.byDistance[0] = centre;
     const float spread = static_cast<float>(radius) * static_cast<float>(radius) / kLn100;
     for (int i = 1; i <= radius; ++i) {
         const auto weight =
             static_cast<uint32_t>(round(portableExp(static_cast<float>(-(i * i)) / spread)));
-        weights.byDistance[static_cast<size_t>(i)] = weight;
+        weights.byDistance[i] = weight;
         weights.total += 2 * weight;
     }
     return weights;

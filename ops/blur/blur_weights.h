@@ -2,7 +2,7 @@
 
 #include <cstdint>
 
-#include "core/pixel_buffer.h"
+#include "core/size_limit.h"
 #include "ops/blur/dot_loops.h"
 
 /// The weights of the separable integer Gaussian blur.
@@ -13,18 +13,18 @@
 namespace VFontEffect::internal {
 
 struct BlurWeights {
-    PixelBuffer<uint32_t> byDistance;  // 0 to radius; empty when memory ran out
+    static constexpr int kLongestRadius = static_cast<int>(kLargestSizePx);
+
+    uint32_t byDistance[kLongestRadius + 1];  // 0 to radius
     int radius;
     uint32_t total;
-
-    explicit operator bool() const { return static_cast<bool>(byDistance); }
 };
 
-/// Weights on a scale of 100, rounded in single precision.
-[[nodiscard]] BlurWeights gaussianOf100(int radius);
+/// Weights on a scale of 100, rounded in single precision, of a radius up to kLongestRadius.
+BlurWeights gaussianOf100(int radius);
 
-/// Weights on a scale of 128, rounded in double precision.
-[[nodiscard]] BlurWeights gaussianOf128(int radius);
+/// Weights on a scale of 128, rounded in double precision, likewise.
+BlurWeights gaussianOf128(int radius);
 
 /// The smallest float that is not below 1 / total. With it the product in single precision of any sum up
 /// to 256 * total - 1, truncated, is the whole quotient, while total is at most kLargestTotal: a sum of

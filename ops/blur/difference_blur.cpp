@@ -35,8 +35,7 @@ void fillDifference(const BlurWeights& weights, int32_t* cells) {
     const int64_t count = cellsOf(weights.radius);
     for (int64_t i = 0; i < count; ++i) {
         const int64_t distance = std::abs(i - kOrder - weights.radius);
-        cells[i] =
-            distance > weights.radius ? 0 : static_cast<int32_t>(weights.byDistance.data()[distance]);
+        cells[i] = distance > weights.radius ? 0 : static_cast<int32_t>(weights.byDistance[distance]);
     }
     // A result takes the tap at distance k with the weight there, the one before with that at k + 1.
     for (int n = 0; n < kOrder; ++n) {
@@ -74,13 +73,18 @@ void splitTerms(int radius, int64_t lineBytes, int32_t* cells, int32_t* memory, 
 
 }  // namespace
 
-WeightTerms::WeightTerms(const DifferenceLoops& loops, const BlurWeights& weights)
-    : mMemory(PixelBuffer<int32_t>::uninitialised(2 * kMostTerms + cellsOf(weights.radius))),
-      mTerms{pairsFor(weights.radius), {}, {}} {
-    if (!mMemory) return;
-    int32_t* const cells = mMemory.data() + 2 * kMostTerms;
+int64_t termBytes(int radius) {
+    return (2 * kMostTerms + cellsOf(radius)) * int64_t{sizeof(int32_t)};
+}
+
+DifferenceTerms differenceTerms(const DifferenceLoops& loops, const BlurWeights& weights,
+                                uint8_t* memory) {
+    auto* const lines = reinterpret_cast<int32_t*>(memory);
+    int32_t* const cells = lines + 2 * kMostTerms;
+    DifferenceTerms terms = {pairsFor(weights.radius), {}, {}};
     fillDifference(weights, cells);
-    splitTerms(weights.radius, kLinePixelBytes * loops.vectorBytes, cells, mMemory.data(), mTerms);
+    splitTerms(weights.radius, kLinePixelBytes * loops.vectorBytes, cells, lines, terms);
+    return terms;
 }
 
 // --- Layout -----------------------------------------------------------------------------------------
@@ -135,7 +139,8 @@ int64_t DifferenceBlur::memoryBytes(const DifferenceLoops& loops, const BlurInpu
     return arena.used;
 }
 
-DifferenceBlur::DifferenceBlur(const DifferenceLoops& loops, const BlurInput& largest)
+DifferenceBlur::DifferenceBlur(const DifferenceLoops& loops, const BlurInput& largest,
+                               int64_t memoryBytes)
     : mLoops(loops),
       mDownFirst(largest.order == BlurInput::Order::downThenAcross),
       mFirst(largest.first),
@@ -144,9 +149,10 @@ DifferenceBlur::DifferenceBlur(const DifferenceLoops& loops, const BlurInput& la
       mTotal(largest.weights.total),
       mInverse(inverseAbove(mTotal)),
       mSide(loops.vectorBytes),
-      mTerms(loops, largest.weights),
-      mMemoryBytes(memoryBytes(loops, largest)),
-      mMemory(mMemoryBytes) {}
+      mMemoryBytes(memoryBytes),
+      mMemory(mMemoryBytes + termBytes(mRadius)) {
+    if (mMemory) mTerms = differenceTerms(loops, largest.weights, mMemory.data() + mMemoryBytes);
+}
 
 void DifferenceBlur::begin(const BlurInput& input) {
     Arena arena = {mMemory.data()};
@@ -158,7 +164,7 @@ void DifferenceBlur::begin(const BlurInput& input) {
 
 void DifferenceBlur::blurStrip(const PassEnding& ending, const CoverageRows& source, int64_t x,
                                const Axis& axis, const SquareRows& out) {
-    const DifferencePass pass = {*mTerms, mRadius, mTotal, mInverse, ending};
+    const DifferencePass pass = {mTerms, mRadius, mTotal, mInverse, ending};
     mLoops.blurStrip(pass, source, x, mLayout.lines, axis.first, axis.count, out);
 }
 

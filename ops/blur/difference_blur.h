@@ -5,25 +5,15 @@
 #include "core/arena.h"
 #include "core/line_buffer.h"
 #include "core/numeric.h"
-#include "core/pixel_buffer.h"
 #include "ops/blur/blur_input.h"
 #include "ops/blur/difference_loops.h"
 
 namespace VFontEffect::internal {
 
-/// The second difference of weights as a sum of few lines.
-class WeightTerms {
-  public:
-    WeightTerms(const DifferenceLoops& loops, const BlurWeights& weights);
-
-    /// Whether there is memory for it.
-    explicit operator bool() const { return static_cast<bool>(mMemory); }
-    const DifferenceTerms& operator*() const { return mTerms; }
-
-  private:
-    PixelBuffer<int32_t> mMemory;
-    DifferenceTerms mTerms;
-};
+/// The second difference of weights as a sum of few lines, whose list takes termBytes(radius).
+int64_t termBytes(int radius);
+DifferenceTerms differenceTerms(const DifferenceLoops& loops, const BlurWeights& weights,
+                                uint8_t* memory);
 
 /// A wide blur, by differences of the weights: either order of the passes is the same loop over strips a
 /// vector wide, `side` lanes, from a strip of the source to a strip of the intermediate plane and from
@@ -38,11 +28,11 @@ class DifferenceBlur {
     /// What a blur takes for an input beside its weights.
     static int64_t memoryBytes(const DifferenceLoops& loops, const BlurInput& input);
 
-    /// For inputs that take no more than this one.
-    DifferenceBlur(const DifferenceLoops& loops, const BlurInput& largest);
+    /// For inputs that take no more than this one, which is `memoryBytes`.
+    DifferenceBlur(const DifferenceLoops& loops, const BlurInput& largest, int64_t memoryBytes);
 
     /// Whether there is memory for it.
-    explicit operator bool() const { return mTerms && mMemory; }
+    explicit operator bool() const { return static_cast<bool>(mMemory); }
 
     void begin(const BlurInput& input);
 
@@ -103,9 +93,9 @@ class DifferenceBlur {
     uint32_t mTotal;
     float mInverse;  // just above 1 / mTotal
     int64_t mSide;
-    WeightTerms mTerms;
     int64_t mMemoryBytes;
-    LineBuffer mMemory;
+    LineBuffer mMemory;  // of the layout, and behind it of the terms
+    DifferenceTerms mTerms = {};
     Layout mLayout = {};
 };
 

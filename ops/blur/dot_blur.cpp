@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <cstdint>
-#include <cstdlib>
 #include <cstring>
 
 #include "core/assert.h"
@@ -24,47 +23,59 @@ int64_t quadsOf(int64_t rows) {
 int64_t cellsOf(int radius) {
     return roundedUp(kCellsBefore + 2 * int64_t{radius} + 1 + kCellsBehind, 4);
 }
+constexpr int64_t kMostCells =
+    kCellsBefore + 2 * int64_t{BlurWeights::kLongestRadius} + 1 + kCellsBehind + 3;
 
 bool isNarrow(const DotLoops& loops, const BlurWeights& weights) {
     return loops.hasNarrow && weights.radius <= kLargestNarrowRadius && weights.total <= 0xFF;
 }
 
-/// The total of the weights before each cell.
-void fillTotals(const BlurWeights& weights, uint32_t* totals) {
-    uint32_t total = 0;
-    for (int64_t i = 0; i < cellsOf(weights.radius); ++i) {
-        totals[i] = total;
-        const int64_t distance = std::abs(i - kCellsBefore - weights.radius);
-        if (distance <= weights.radius) total += weights.byDistance.data()[distance];
-    }
+/// The weights from the first cell's on, and those behind the last one.
+void fillString(const BlurWeights& weights, uint8_t* string) {
+    std::fill_n(string, cellsOf(weights.radius) + kWeightsBehindCell, uint8_t{0});
+    uint8_t* const centre = string + kCellsBefore + weights.radius;
+    for (int64_t k = 0; k <= weights.radius; ++k)
+        centre[k] = centre[-k] = static_cast<uint8_t>(weights.byDistance[k]);
 }
 
 }  // namespace
 
 // --- Weights --------------------------------------------------------------------------------------
 
-PackedWeights::PackedWeights(const DotLoops& loops, const BlurWeights& weights)
-    : mMemory(PixelBuffer<uint8_t>::uninitialised(cellsOf(weights.radius),
-                                                  loops.cellBytes + int64_t{sizeof(uint32_t)})),
-      mBlur{} {
-    mBlur.radius = weights.radius;
-    mBlur.total = weights.total;
-    if (!mMemory) return;
-    loops.fillCells(weights.byDistance.data(), weights.radius, mMemory.data());
-    auto* const totals =
-        reinterpret_cast<uint32_t*>(mMemory.data() + cellsOf(weights.radius) * loops.cellBytes);
-    fillTotals(weights, totals);
-    mBlur.cells = mMemory.data() + kCellsBefore * loops.cellBytes;
-    mBlur.totals = totals + kCellsBefore;
-    mBlur.inverse = inverseAbove(weights.total);
-    mBlur.isNarrow = isNarrow(loops, weights);
-    if (!mBlur.isNarrow) return;
+namespace {
+
+int64_t packedBytes(const DotLoops& loops, int radius) {
+    return cellsOf(radius) * (loops.cellBytes + int64_t{sizeof(uint32_t)});
+}
+
+/// The weights in the form of a level's loops, in memory of packedBytes().
+PackedBlur packed(const DotLoops& loops, const BlurWeights& weights, uint8_t* memory) {
+    const int64_t count = cellsOf(weights.radius);
+    uint8_t string[kMostCells + kWeightsBehindCell];
+    fillString(weights, string);
+    loops.fillCells(string, count, memory);
+    auto* const totals = reinterpret_cast<uint32_t*>(memory + count * loops.cellBytes);
+    uint32_t before = 0;
+    for (int64_t i = 0; i < count; before += string[i++])
+        totals[i] = before;
+
+    PackedBlur blur = {};
+    blur.radius = weights.radius;
+    blur.total = weights.total;
+    blur.inverse = inverseAbove(weights.total);
+    blur.cells = memory + kCellsBefore * loops.cellBytes;
+    blur.totals = totals + kCellsBefore;
+    blur.isNarrow = isNarrow(loops, weights);
+    if (!blur.isNarrow) return blur;
     const uint32_t scale = weights.total < 128 ? 2 : 1;
     for (int k = 0; k <= weights.radius; ++k)
-        mBlur.weights[k] = static_cast<uint16_t>(weights.byDistance.data()[k] * scale);
-    mBlur.narrowTotal = static_cast<uint16_t>(weights.total * scale);
-    mBlur.division = narrowDivision(mBlur.narrowTotal);
+        blur.weights[k] = static_cast<uint16_t>(weights.byDistance[k] * scale);
+    blur.narrowTotal = static_cast<uint16_t>(weights.total * scale);
+    blur.division = narrowDivision(blur.narrowTotal);
+    return blur;
 }
+
+}  // namespace
 
 // --- Working memory -------------------------------------------------------------------------------
 
@@ -95,7 +106,7 @@ TapGroups takeGroups(const DotLoops& loops, const BlurWeights& weights, int64_t 
     taps.missing = needed;
     taps.steps = tapSteps(weights.radius);
     taps.capacity = std::min(taps.steps - 1 + kSpareGroups, needed.end - needed.first);
-    taps.strips = roundedUp(width, loops.vectorBytes) / loops.vectorBytes;
+    taps.strips = (width + loops.vectorBytes - 1) / loops.vectorBytes;
     taps.groupBytes = kQuad * loops.vectorBytes * pixelBytes(loops, weights);
     const int64_t stripBytes = taps.groupBytes * taps.capacity;
     uint8_t* const groups = arena.take<uint8_t>(stripBytes * taps.strips);
@@ -179,26 +190,27 @@ int64_t DotBlur::memoryBytes(const DotLoops& loops, const BlurInput& input) {
 
 // --- Passes -----------------------------------------------------------------------------------------
 
-DotBlur::DotBlur(const DotLoops& loops, const BlurInput& largest)
+DotBlur::DotBlur(const DotLoops& loops, const BlurInput& largest, int64_t memoryBytes)
     : mLoops(loops),
       mFirst(largest.first),
       mSecond(largest.second),
-      mWeights(loops, largest.weights),
-      mMemoryBytes(memoryBytes(loops, largest)),
-      mMemory(mMemoryBytes) {}
+      mMemoryBytes(memoryBytes),
+      mMemory(mMemoryBytes + packedBytes(loops, largest.weights.radius)) {
+    if (mMemory) mBlur = packed(loops, largest.weights, mMemory.data() + mMemoryBytes);
+}
 
 void DotBlur::begin(const BlurInput& input) {
     Arena arena = {mMemory.data()};
     mLayout = Layout::of(mLoops, input, arena);
     VOREL_ASSERT(arena.used <= mMemoryBytes);
     mLayout.taps.clear();
-    mLoops.clear(*mWeights, mLayout.intermediate);
+    mLoops.clear(mBlur, mLayout.intermediate);
 }
 
 void DotBlur::blurAcross(const PassEnding& ending, uint8_t* out) {
     const Box& window = mLayout.window;
     VOREL_ASSERT(roundedUp(window.width(), mLoops.vectorBytes) <= mLayout.stride);
-    mLoops.across(*mWeights, mLayout.intermediate, window.left - mLayout.intermediateLeft,
+    mLoops.across(mBlur, mLayout.intermediate, window.left - mLayout.intermediateLeft,
                   window.right - mLayout.intermediateLeft, {out, mLayout.stride, ending});
 }
 
@@ -206,11 +218,11 @@ void DotBlur::feed(int64_t group) {
     const CoverageRows& part = mLayout.source.part;
     const TapColumns& columns = mLayout.taps.columns;
     const int64_t row = mLayout.firstRow + kQuad * group;
-    if (mLayout.across == nullptr) return mLoops.feed(*mWeights, part, row, columns, group);
-    mLoops.copy(*mWeights, part, row, mLayout.intermediate);
+    if (mLayout.across == nullptr) return mLoops.feed(mBlur, part, row, columns, group);
+    mLoops.copy(mBlur, part, row, mLayout.intermediate);
     blurAcross(mFirst, mLayout.across);
     const CoverageRows across = {mLayout.across, mLayout.stride, mLayout.window.width(), kQuad, kAsIs};
-    mLoops.feed(*mWeights, across, 0, columns, group);
+    mLoops.feed(mBlur, across, 0, columns, group);
 }
 
 BlurredRows DotBlur::rows(int64_t y) {
@@ -219,9 +231,9 @@ BlurredRows DotBlur::rows(int64_t y) {
     mLayout.taps.complete(quad, [&](int64_t group) { feed(group); });
     const TapColumns& columns = mLayout.taps.columns;
     if (mLayout.across != nullptr) {
-        mLoops.downToBytes(*mWeights, columns, quad, {mLayout.out, mLayout.stride, mSecond});
+        mLoops.downToBytes(mBlur, columns, quad, {mLayout.out, mLayout.stride, mSecond});
     } else {
-        mLoops.down(*mWeights, columns, quad, mLayout.intermediate);
+        mLoops.down(mBlur, columns, quad, mLayout.intermediate);
         blurAcross(mSecond, mLayout.out);
     }
     return {mLayout.out, mLayout.stride};

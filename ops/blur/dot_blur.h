@@ -6,25 +6,10 @@
 #include "core/arena.h"
 #include "core/assert.h"
 #include "core/line_buffer.h"
-#include "core/pixel_buffer.h"
 #include "ops/blur/blur_input.h"
 #include "ops/blur/dot_loops.h"
 
 namespace VFontEffect::internal {
-
-/// Weights in the form of a level's loops.
-class PackedWeights {
-  public:
-    PackedWeights(const DotLoops& loops, const BlurWeights& weights);
-
-    explicit operator bool() const { return static_cast<bool>(mMemory); }
-    const PackedBlur& operator*() const { return mBlur; }
-    const PackedBlur* operator->() const { return &mBlur; }
-
-  private:
-    PixelBuffer<uint8_t> mMemory;
-    PackedBlur mBlur;
-};
 
 /// Groups of four rows.
 struct GroupRange {
@@ -66,11 +51,11 @@ class DotBlur {
     /// What a blur takes for an input beside its weights.
     static int64_t memoryBytes(const DotLoops& loops, const BlurInput& input);
 
-    /// For inputs that take no more than this one.
-    DotBlur(const DotLoops& loops, const BlurInput& largest);
+    /// For inputs that take no more than this one, which is `memoryBytes`.
+    DotBlur(const DotLoops& loops, const BlurInput& largest, int64_t memoryBytes);
 
     /// Whether there is memory for it.
-    explicit operator bool() const { return mWeights && mMemory; }
+    explicit operator bool() const { return static_cast<bool>(mMemory); }
 
     void begin(const BlurInput& input);
 
@@ -102,9 +87,9 @@ class DotBlur {
     const DotLoops& mLoops;
     PassEnding mFirst;
     PassEnding mSecond;
-    PackedWeights mWeights;
     int64_t mMemoryBytes;
-    LineBuffer mMemory;
+    LineBuffer mMemory;  // of the layout, and behind it of the weights
+    PackedBlur mBlur = {};
     Layout mLayout = {};
 };
 

@@ -440,16 +440,10 @@ void across(const PackedBlur& blur, const IntermediateRows& intermediate, int64_
 
 // --- The table ----------------------------------------------------------------------------------------
 
-void fillCells(const uint32_t* weights, int radius, uint8_t* cells) {
-    const auto weightAt = [&](int64_t distance) VOREL_INLINE_LAMBDA {
-        const int64_t k = distance < 0 ? -distance : distance;
-        return static_cast<uint8_t>(k <= radius ? weights[k] : 0);
-    };
-    for (int64_t k = -radius - kCellsBefore; k <= radius + kCellsBehind; ++k) {
-        const uint8_t three[] = {weightAt(k), weightAt(k + 1), weightAt(k + 2)};
-        const WeightCell cell = cellOf(three);
-        std::memcpy(cells, &cell, sizeof cell);
-        cells += sizeof cell;
+void fillCells(const uint8_t* weights, int64_t count, uint8_t* cells) {
+    for (int64_t i = 0; i < count; ++i) {
+        const WeightCell cell = cellOf(weights + i);
+        std::memcpy(cells + i * static_cast<int64_t>(sizeof cell), &cell, sizeof cell);
     }
 }
 

@@ -91,6 +91,8 @@ struct BlurRows {
 /// Cells of zeros before and behind those of the weights.
 constexpr int64_t kCellsBefore = 4;
 constexpr int64_t kCellsBehind = 20;
+/// A cell is made of the weight of its place and of so many behind it.
+constexpr int64_t kWeightsBehindCell = 2;
 
 struct DotLoops {
     int64_t vectorBytes;
@@ -100,8 +102,8 @@ struct DotLoops {
     bool hasNarrow;
     /// Bytes of a weight's cell.
     int64_t cellBytes;
-    /// Makes the cells of the weights at distances 0 to radius and of the zeros around them.
-    void (*fillCells)(const uint32_t* weights, int radius, uint8_t* cells);
+    /// Makes `count` cells of as many weights and kWeightsBehindCell more.
+    void (*fillCells)(const uint8_t* weights, int64_t count, uint8_t* cells);
 
     /// Fills rows between the passes, with their margins, with 0: once, before the first quad.
     void (*clear)(const PackedBlur& blur, const IntermediateRows& intermediate);

@@ -1,5 +1,6 @@
 #include "ops/dilate/disc_shape.h"
 
+#include <algorithm>
 #include <cmath>
 
 #include "core/numeric.h"
@@ -20,15 +21,18 @@ DiscShape::DiscShape(float radius) : reach(-1) {
     const int64_t wanted = discReach(radius);
     if (wanted < 0 || wanted > kLongestReach) return;
     reach = static_cast<int>(wanted);
+    int16_t start = 0;
     int16_t cells = 0;
-    for (RimWalk walk(reach, radius); !walk.done(); walk.nextRow()) {
-        const int64_t row = walk.row();
-        flatReach[row] = static_cast<int16_t>(walk.flatReach);
-        outerReach[row] = static_cast<int16_t>(walk.outerReach);
-        rimStart[row] = cells;
-        for (int64_t dx = walk.flatReach + 1; dx <= walk.outerReach; ++dx)
-            rimDeficit[cells++] = static_cast<uint8_t>(255 - walk.weight(dx));
-    }
+    const auto addCell = [&](int64_t, int64_t, uint8_t weight) {
+        rimDeficit[cells++] = static_cast<uint8_t>(255 - weight);
+    };
+    walkRim(reach, radius, addCell, [&](int64_t row, int64_t flat, int64_t outer) {
+        flatReach[row] = static_cast<int16_t>(flat);
+        outerReach[row] = static_cast<int16_t>(outer);
+        rimStart[row] = start;
+        std::reverse(rimDeficit + start, rimDeficit + cells);
+        start = cells;
+    });
 }
 
 }  // namespace VFontEffect::internal

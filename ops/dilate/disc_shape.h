@@ -14,40 +14,25 @@ int64_t discReach(float radius);
 /// the pixel outside of it. The farther, the smaller.
 uint8_t discWeight(int64_t dx, int64_t dy, float radius);
 
-/// Walks along the disc's rim, from the middle row outwards: how far the full and the weighted cells of
-/// each row reach. As both only shrink, the walk looks at few cells but those of the rim.
-class RimWalk {
-  public:
-    RimWalk(int64_t reach, float radius)
-        : flatReach(reach), outerReach(reach), mRow(0), mReach(reach), mRadius(radius) {
-        shrink();
+/// Walks along the disc's rim, from the middle row outwards. Calls cell(x, y, weight) for the cells of a
+/// row between no weight and full weight, from the outside inwards, and row(y, flatReach, outerReach)
+/// behind them: the last cell of weight 255, and of any weight, each -1 when there is none. As both only
+/// shrink, it looks at few cells but those of the rim.
+template <class Cell, class Row>
+void walkRim(int64_t reach, float radius, Cell cell, Row row) {
+    int64_t outer = reach;
+    for (int64_t y = 0; y <= reach; ++y) {
+        uint8_t weight = 0;
+        while (outer >= 0 && (weight = discWeight(outer, y, radius)) == 0)
+            --outer;
+        int64_t flat = outer;
+        while (flat >= 0 && weight < 255) {
+            cell(flat, y, weight);
+            if (--flat >= 0) weight = discWeight(flat, y, radius);
+        }
+        row(y, flat, outer);
     }
-
-    /// The last cell of the row with weight 255, and with any weight; -1 when there is none.
-    int64_t flatReach;
-    int64_t outerReach;
-
-    int64_t row() const { return mRow; }
-    uint8_t weight(int64_t dx) const { return discWeight(dx, mRow, mRadius); }
-    bool done() const { return mRow > mReach; }
-    void nextRow() {
-        ++mRow;
-        shrink();
-    }
-
-  private:
-    void shrink() {
-        while (outerReach >= 0 && weight(outerReach) == 0)
-            --outerReach;
-        if (flatReach > outerReach) flatReach = outerReach;
-        while (flatReach >= 0 && weight(flatReach) < 255)
-            --flatReach;
-    }
-
-    int64_t mRow;
-    int64_t mReach;
-    float mRadius;
-};
+}
 
 /// A disc row by row: full cells in the middle, then cells of falling weight.
 struct DiscShape {

@@ -62,19 +62,19 @@ void GrowthPlan::copyIn(const Box& worked) {
     const CoverageRows& source = mInput.source;
     const Box framed = expanded(worked, 1);
     const Box inside = intersection(framed, wholeOf(source));
-    const int64_t left = inside.left - framed.left;
-    for (int64_t y = framed.top; y < framed.bottom; ++y) {
-        uint8_t* const row = mLayout.row(0, y - worked.top) - 1;
-        if (inside.empty() || y < inside.top || y >= inside.bottom) {
-            std::memset(row, source.invertMask, static_cast<size_t>(framed.width()));
-            continue;
-        }
-        const int64_t end = left + inside.width();
-        std::memset(row, source.invertMask, static_cast<size_t>(left));
+    uint8_t* at = mLayout.row(0, -1) - 1;
+    uint8_t* const end = at + framed.height() * mLayout.stride;
+    const auto fillTo = [&](const uint8_t* next) {
+        std::memset(at, source.invertMask, static_cast<size_t>(next - at));
+    };
+    for (int64_t y = inside.top; !inside.empty() && y < inside.bottom; ++y) {
+        uint8_t* const row = mLayout.row(0, y - worked.top) + inside.left - worked.left;
+        fillTo(row);
         mLoops.copyInverted(source.start + y * source.stride + inside.left, inside.width(),
-                            source.invertMask, row + left);
-        std::memset(row + end, source.invertMask, static_cast<size_t>(framed.width() - end));
+                            source.invertMask, row);
+        at = row + inside.width();
     }
+    fillTo(end);
 }
 
 /// The frame of the other plane: as it is in this one above and below.
@@ -85,8 +85,11 @@ void GrowthPlan::setFrame() {
         std::memcpy(mLayout.row(other, y) - 1, mLayout.row(mCurrent, y) - 1,
                     static_cast<size_t>(width + 2));
     }
-    for (int64_t y = 0; y < mLayout.height; ++y)
-        mLayout.row(other, y)[-1] = mLayout.row(other, y)[width] = mInput.source.invertMask;
+    const uint8_t around = mInput.source.invertMask;
+    uint8_t* row = mLayout.row(other, 0);
+    const int64_t stride = mLayout.stride;
+    for (int64_t rows = mLayout.height; rows > 0; --rows, row += stride)
+        row[-1] = row[width] = around;
 }
 
 void GrowthPlan::grow(int passes) {

@@ -92,7 +92,11 @@ void mixStops(const RampSegment& segment, const float* positions, int64_t count,
         const U32s even = (weight * upperEven + rest * lowerEven) >> 8 & kEvenBytes;
         const U32s odd = (weight * upperOdd + rest * lowerOdd) & ~kEvenBytes;
         const U32s mixed = even | odd;
-        std::memcpy(colours + i, &mixed, static_cast<size_t>(4 * min(kU32Lanes, count - i)));
+        if (count - i >= kU32Lanes) {
+            std::memcpy(colours + i, &mixed, sizeof mixed);
+        } else {
+            std::memcpy(colours + i, &mixed, static_cast<size_t>(4 * (count - i)));
+        }
     }
 }
 

@@ -1,11 +1,11 @@
 #pragma once
 
 #include <algorithm>
-#include <cmath>
 #include <cstdint>
 
+#include "core/inline.h"
+#include "core/line_buffer.h"
 #include "core/numeric.h"
-#include "core/pixel_buffer.h"
 #include "core/views.h"
 #include "ops/tile/tile_loops.h"
 
@@ -27,12 +27,13 @@ class TileAxis {
         uint32_t nearWeight;
         uint32_t farWeight;
     };
-    Tap at(int64_t coordinate) const {
-        const float position = static_cast<float>(coordinate % mTileSize) / mScale;
-        const float whole = std::floor(position);
-        const auto farWeight =
-            static_cast<uint32_t>(std::clamp(toInt((position - whole) * 255.0F), 0, 255));
-        const int64_t near = std::clamp<int64_t>(toInt(whole), 0, mPatternSize - 1);
+    VOREL_INLINE Tap at(int64_t coordinate) const {
+        const int64_t inTile = coordinate < mTileSize ? coordinate : coordinate % mTileSize;
+        const float position = static_cast<float>(inTile) / mScale;
+        const int32_t whole = toInt(position);
+        const auto fraction = position - static_cast<float>(whole);
+        const auto farWeight = static_cast<uint32_t>(std::clamp(toInt(fraction * 255.0F), 0, 255));
+        const int64_t near = std::clamp<int64_t>(whole, 0, mPatternSize - 1);
         const int64_t far = near + 1 < mPatternSize ? near + 1 : 0;
         return {static_cast<int32_t>(near), static_cast<int32_t>(far), 255 - farWeight, farWeight};
     }
@@ -58,7 +59,7 @@ class TilePlan {
     /// plan.
     TilePlan(CpuLevel level, const ColourView& pattern, float scale, float opacity, int64_t width);
 
-    explicit operator bool() const { return mTaps && mMixed[0].planes && mMixed[1].planes && mRow; }
+    explicit operator bool() const { return static_cast<bool>(mMemory); }
 
     /// Row y: R, G, B, A, premultiplied. It stays until the next call.
     const uint32_t* row(int64_t y);
@@ -68,16 +69,13 @@ class TilePlan {
 
     /// A pattern row mixed along its columns.
     struct KeptRow {
-        explicit KeptRow(int64_t width);
-        MixedRow mixed() { return {planes.data(), planes.data() + length}; }
-
-        PixelBuffer<uint32_t> planes;
-        int64_t length;
+        MixedRow mixed = {};
         int32_t row = kNoRow;
     };
 
+    int64_t layOut(uint8_t* memory);
     void listTaps();
-    ColumnTaps taps();
+    ColumnTaps taps() const;
     MixedRow mixedRow(int32_t row, int32_t other);
     void repeat();
 
@@ -88,9 +86,11 @@ class TilePlan {
     float mOpacity;
     int64_t mWidth;
     int64_t mSampled;
-    PixelBuffer<uint32_t> mTaps;
+    int64_t mLength;            ///< of what is kept for each sampled column
+    uint32_t* mTaps = nullptr;  ///< four planes of words, as ColumnTaps names them
     KeptRow mMixed[2];
-    PixelBuffer<uint32_t> mRow;
+    uint32_t* mRow = nullptr;
+    LineBuffer mMemory;
 };
 
 }  // namespace VFontEffect::internal

@@ -109,18 +109,22 @@ void paintWithin(int64_t workingBytes, int type, const VFProperty& record,
 
 std::vector<uint8_t> blurredByDots(const BlurInput& input, const WindowSize& size) {
     const Windows windows = cut(input.window, size);
-    DotBlur blur(dotLoops(chosenLevel()), input.largestOf(windows));
+    const DotLoops& loops = dotLoops(chosenLevel());
+    const BlurInput largest = input.largestOf(windows);
+    DotBlur blur(loops, largest, DotBlur::memoryBytes(loops, largest));
     return collected(blur, input, windows);
 }
 
 std::vector<uint8_t> blurredByDifferences(const BlurInput& input, const WindowSize& size) {
     const Windows windows = cut(input.window, size);
-    DifferenceBlur blur(differenceLoops(chosenLevel()), input.largestOf(windows));
+    const DifferenceLoops& loops = differenceLoops(chosenLevel());
+    const BlurInput largest = input.largestOf(windows);
+    DifferenceBlur blur(loops, largest, DifferenceBlur::memoryBytes(loops, largest));
     return collected(blur, input, windows);
 }
 
 std::vector<uint8_t> blurred(const BlurInput& input) {
-    BlurPlan plan(chosenLevel(), input);
+    BlurPlan plan(chosenLevel(), input, BlurPlan::memoryBytes(chosenLevel(), input));
     if (!plan) return {};
     Collected values(input.window);
     forBands(plan, input, [&](const Box& band, const BlurredRows& rows) { values.put(band, rows); });
@@ -196,9 +200,9 @@ void askForRowsOutOfOrder() {
 }
 
 TermsOfWeights termsOf(const BlurWeights& weights) {
-    const WeightTerms memory(differenceLoops(chosenLevel()), weights);
-    if (!memory) return {};
-    const DifferenceTerms& terms = *memory;
+    std::vector<int32_t> memory(static_cast<size_t>(termBytes(weights.radius)) / sizeof(int32_t));
+    const DifferenceTerms terms = differenceTerms(differenceLoops(chosenLevel()), weights,
+                                                  reinterpret_cast<uint8_t*>(memory.data()));
     TermsOfWeights result = {terms.pairs.distance, terms.pairs.areDifferences, {}};
     append(terms.added, 1, result.terms);
     append(terms.takenAway, -1, result.terms);

@@ -24,35 +24,38 @@ void forEachAngle(Visit visit) {
 
 TEST(PortableMath, WholeDegrees_GiveTheNearestFloat) {
     forEachAngle([](float angle) {
-        EXPECT_EQ(portableSin(angle), nearest(std::sin(static_cast<long double>(angle)))) << angle;
-        EXPECT_EQ(portableCos(angle), nearest(std::cos(static_cast<long double>(angle)))) << angle;
-        EXPECT_EQ(portableTan(angle), nearest(std::tan(static_cast<long double>(angle)))) << angle;
+        EXPECT_EQ(portableTurn(angle).sine, nearest(std::sin(static_cast<long double>(angle)))) << angle;
+        EXPECT_EQ(portableTurn(angle).cosine, nearest(std::cos(static_cast<long double>(angle))))
+            << angle;
+        EXPECT_EQ(portableTurn(angle).tangent, nearest(std::tan(static_cast<long double>(angle))))
+            << angle;
     });
 }
 
 TEST(PortableMath, WholeDegrees_StayWithinAUnitOfTheCLibrary) {
     forEachAngle([](float angle) {
-        EXPECT_FLOAT_EQ(portableSin(angle), std::sin(angle));
-        EXPECT_FLOAT_EQ(portableCos(angle), std::cos(angle));
-        EXPECT_FLOAT_EQ(portableTan(angle), std::tan(angle));
+        EXPECT_FLOAT_EQ(portableTurn(angle).sine, std::sin(angle));
+        EXPECT_FLOAT_EQ(portableTurn(angle).cosine, std::cos(angle));
+        EXPECT_FLOAT_EQ(portableTurn(angle).tangent, std::tan(angle));
     });
 }
 
 TEST(PortableMath, OtherAngles_GiveTheNearestFloat) {
     for (float angle = -1000.0F; angle < 1000.0F; angle += 0.37F) {
-        EXPECT_EQ(portableSin(angle), nearest(std::sin(static_cast<long double>(angle)))) << angle;
-        EXPECT_EQ(portableCos(angle), nearest(std::cos(static_cast<long double>(angle)))) << angle;
+        EXPECT_EQ(portableTurn(angle).sine, nearest(std::sin(static_cast<long double>(angle)))) << angle;
+        EXPECT_EQ(portableTurn(angle).cosine, nearest(std::cos(static_cast<long double>(angle))))
+            << angle;
     }
 }
 
 TEST(PortableMath, AnglesBeyondTheReduction_AreTheCLibrarys) {
     for (const float angle : {100001.0F, -3e7F, 1e30F}) {
-        EXPECT_EQ(portableSin(angle), std::sin(angle));
-        EXPECT_EQ(portableCos(angle), std::cos(angle));
-        EXPECT_EQ(portableTan(angle), std::tan(angle));
+        EXPECT_EQ(portableTurn(angle).sine, std::sin(angle));
+        EXPECT_EQ(portableTurn(angle).cosine, std::cos(angle));
+        EXPECT_EQ(portableTurn(angle).tangent, std::tan(angle));
     }
-    EXPECT_TRUE(std::isnan(portableCos(std::numeric_limits<float>::infinity())));
-    EXPECT_TRUE(std::isnan(portableSin(std::numeric_limits<float>::quiet_NaN())));
+    EXPECT_TRUE(std::isnan(portableTurn(std::numeric_limits<float>::infinity()).cosine));
+    EXPECT_TRUE(std::isnan(portableTurn(std::numeric_limits<float>::quiet_NaN()).sine));
 }
 
 TEST(PortableMath, Exponential_GivesTheNearestFloat) {

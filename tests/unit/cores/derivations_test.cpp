@@ -15,11 +15,9 @@ constexpr int kLargestRadius = 256;
 
 template <class Weights>
 void expectWeights(const internal::BlurWeights& weights, const Weights& expected, int radius) {
-    ASSERT_TRUE(static_cast<bool>(weights));
     uint32_t total = 0;
     for (size_t i = 0; i < expected.size(); ++i) {
-        ASSERT_EQ(weights.byDistance.data()[i], static_cast<uint32_t>(expected[i]))
-            << radius << " at " << i;
+        ASSERT_EQ(weights.byDistance[i], static_cast<uint32_t>(expected[i])) << radius << " at " << i;
         total += static_cast<uint32_t>(expected[i]) * (i == 0 ? 1U : 2U);
     }
     EXPECT_EQ(weights.total, total);

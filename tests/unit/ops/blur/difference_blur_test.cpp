@@ -43,7 +43,7 @@ std::vector<int64_t> secondDifference(const BlurWeights& weights) {
         int64_t sum = 0;
         for (int i = 0; i < 3; ++i) {
             const int distance = std::abs(k + i);
-            if (distance <= weights.radius) sum += binomials[i] * weights.byDistance.data()[distance];
+            if (distance <= weights.radius) sum += binomials[i] * weights.byDistance[distance];
         }
         difference.push_back(sum);
     }
@@ -120,7 +120,7 @@ std::string describe(const BlurCase& blur) {
     text << blur.source.width << " x " << blur.source.height << ", radius " << blur.weights.radius
          << ", window " << blur.window.left << " " << blur.window.top << " " << blur.window.right << " "
          << blur.window.bottom << ", full before " << blur.full.before << " and from " << blur.full.from
-         << ", centre " << blur.weights.byDistance.data()[0] << ", mask " << int{blur.source.invertMask}
+         << ", centre " << blur.weights.byDistance[0] << ", mask " << int{blur.source.invertMask}
          << ", inverted " << blur.inverted << ", windows " << blur.windows.width << " x "
          << blur.windows.height;
     return text.str();
