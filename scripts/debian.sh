@@ -18,6 +18,7 @@ build=build/debian
 quietly cmake -S . -B "$build" -G Ninja -DCMAKE_BUILD_TYPE=Release -DCMAKE_INSTALL_PREFIX=/usr \
     -DCMAKE_SKIP_INSTALL_RPATH=ON -DVOREL_BUILD_TOOLS=ON -DVOREL_BUILD_PYTHON=ON \
     -DPython3_EXECUTABLE=/usr/bin/python3 -DVOREL_WERROR="${VOREL_WERROR:-OFF}" \
+    -DVOREL_UNITY="${VOREL_UNITY:-OFF}" \
     -DVOREL_PRESET_DIR=/usr/share/voreleffect/presets
 quietly cmake --build "$build"
 

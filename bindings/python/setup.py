@@ -46,6 +46,7 @@ class BuildWithCMake(build_ext):
         subprocess.run(["cmake", "-S", ROOT, "-B", build, "-G", "Ninja", "-DCMAKE_BUILD_TYPE=Release",
                         "-DVOREL_BUILD_PYTHON=ON", "-DVOREL_INSTALL=OFF",
                         f"-DVOREL_WERROR={os.environ.get('VOREL_WERROR', 'OFF')}",
+                        f"-DVOREL_UNITY={os.environ.get('VOREL_UNITY', 'OFF')}",
                         f"-DPython3_EXECUTABLE={sys.executable}",
                         f"-DVOREL_PYBIND11_INCLUDE={pybind11_include()}"], check=True, stdout=subprocess.DEVNULL)
         subprocess.run(["cmake", "--build", build, "--target", "_voreleffect", "--", "--quiet"], check=True)

@@ -9,6 +9,7 @@
 #include <string>
 #include <vector>
 
+#include "tests/support/bitmap_bytes.h"
 #include "tests/support/fake_core.h"
 
 namespace vorel_test {
@@ -48,12 +49,6 @@ class SolidGlyph {
     std::vector<uint8_t> pixels;
     VFontEffect::VFGlyph glyph;
 };
-
-inline std::vector<uint8_t> bytesOf(const VFontEffect::VFBitmap& bitmap) {
-    if (bitmap.mData == nullptr) return {};
-    const size_t count = size_t{bitmap.mWidth} * bitmap.mHeight * bitmap.mBytesPerPixel;
-    return {bitmap.mData, bitmap.mData + count};
-}
 
 inline void fillBytes(const VFontEffect::VFBitmap& bitmap, uint8_t value) {
     std::memset(bitmap.mData, value, size_t{bitmap.mWidth} * bitmap.mHeight * bitmap.mBytesPerPixel);

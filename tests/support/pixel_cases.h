@@ -7,6 +7,7 @@
 #include <ostream>
 #include <vector>
 
+#include "bitmap_bytes.h"
 #include "guarded.h"
 #include "random.h"
 
@@ -69,11 +70,6 @@ inline void fillColour(Random& random, GuardedBuffer& bytes) {
 
 inline std::vector<uint8_t> bytesOf(const GuardedBuffer& buffer) {
     return std::vector<uint8_t>(buffer.begin(), buffer.end());
-}
-
-inline std::vector<uint8_t> bytesOf(const VFontEffect::VFBitmap& bitmap) {
-    const size_t size = size_t{bitmap.mWidth} * bitmap.mHeight * bitmap.mBytesPerPixel;
-    return std::vector<uint8_t>(bitmap.mData, bitmap.mData + size);
 }
 
 /// A destination and where a source of width x height pixels lies on it.

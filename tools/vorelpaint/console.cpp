@@ -15,7 +15,7 @@
 namespace vorelpaint {
 namespace {
 
-constexpr size_t kUsualWidth = 80;
+constexpr size_t kUsualColumns = 80;
 constexpr std::string_view kErase = "\r\x1B[K";
 
 std::string gStatus;
@@ -24,7 +24,7 @@ volatile std::sig_atomic_t gStatusShown = 0;
 size_t terminalWidth() {
     winsize size{};
     const bool known = ::ioctl(STDERR_FILENO, TIOCGWINSZ, &size) == 0 && size.ws_col > 0;
-    return known ? size.ws_col : kUsualWidth;
+    return known ? size.ws_col : kUsualColumns;
 }
 
 void drawStatus() {

@@ -94,14 +94,14 @@ std::string entry(const char* name, const std::string& value) {
     return label + std::string(12 - label.size(), ' ') + value + "\n";
 }
 
-std::string inQuotes(const std::string& name) {
+std::string printableInQuotes(const std::string& name) {
     return "'" + printable(name) + "'";
 }
 
 std::string styleText(const Options& options, const Style& style) {
     if (options.preset)
         return "preset " + printable(*options.preset) + ": " + printable(style.description);
-    if (options.style) return "file " + inQuotes(*options.style);
+    if (options.style) return "file " + printableInQuotes(*options.style);
     return "none";
 }
 
@@ -221,7 +221,7 @@ std::string headText(const Options& options, const LayerSet& looks, const Margin
 std::string fontsText(const TextLayout& text) {
     std::string names;
     for (const std::string& name : text.fontsUsed())
-        names += (names.empty() ? "" : ", ") + inQuotes(name);
+        names += (names.empty() ? "" : ", ") + printableInQuotes(name);
     return names;
 }
 

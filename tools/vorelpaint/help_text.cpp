@@ -14,7 +14,7 @@ using voreltext::TextLayout;
 
 constexpr size_t kHelpWidth = 100;
 
-std::string jobKeys() {
+std::string joinedJobKeys() {
     std::vector<std::string> keys;
     for (const Setting& setting : settings()) {
         if (setting.inJobs) keys.push_back(setting.name);
@@ -70,7 +70,7 @@ const std::vector<Topic>& topics() {
          "font has, lengths beyond the library's 100 pixels, what a canvas cuts off, effects without "
          "a core. With --strict the first note is an error, and the picture is not painted."},
         {"Batches",
-         "Each line of a batch is a JSON object with the keys of one picture: " + jobKeys() +
+         "Each line of a batch is a JSON object with the keys of one picture: " + joinedJobKeys() +
              ". They mean what the options of these names mean; style may also be a style itself. "
              "What a job does not say, it takes from the command line. Paths start at the working "
              "directory. A line that fails is reported with its number, and the next one goes on. "

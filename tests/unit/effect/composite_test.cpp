@@ -81,10 +81,10 @@ TEST(Composite, InsideKeepsThePictureAndOutsideTakesTheOuterLayer) {
 /// carry all 256 values of the picture.
 TEST(Composite, AllValuesMatchTheLiteralForm) {
     constexpr int kSide = 256;
-    constexpr size_t kPixels = kSide * kSide;
-    std::vector<uint8_t> outer(kPixels);
-    std::vector<uint8_t> mask(kPixels);
-    for (size_t i = 0; i < kPixels; ++i) {
+    constexpr size_t kArea = kSide * kSide;
+    std::vector<uint8_t> outer(kArea);
+    std::vector<uint8_t> mask(kArea);
+    for (size_t i = 0; i < kArea; ++i) {
         outer[i] = static_cast<uint8_t>(i % kSide);
         mask[i] = static_cast<uint8_t>(i / kSide);
     }
@@ -93,10 +93,10 @@ TEST(Composite, AllValuesMatchTheLiteralForm) {
         VFEffect look;
         prepareLayers(look, outer, mask, kSide, kSide);
         GuardedBitmap picture(kSide, kSide, 4);
-        for (size_t i = 0; i < kPixels * 4; ++i)
+        for (size_t i = 0; i < kArea * 4; ++i)
             picture.pixels().data()[i] = static_cast<uint8_t>(run * 4 + static_cast<int>(i % 4));
         std::vector<uint8_t> expected = bytesOf(picture.pixels());
-        literal::composite(expected.data(), outerPixels.data(), mask.data(), static_cast<int>(kPixels));
+        literal::composite(expected.data(), outerPixels.data(), mask.data(), static_cast<int>(kArea));
         look.compositeLayers(picture.bitmap());
         ASSERT_TRUE(sameBytes(expected.data(), picture.pixels().data(), kSide, kSide, 4)) << run;
     }
