@@ -62,5 +62,6 @@
 /// | [VOREL_DOT_PRODUCTS]          | said where addDots is one instruction                                |
 ///
 /// and pixels, in one of two forms: pixels_packed.h (which asks for loadInPairs, highBytesInPairs and
-/// swapRedBlue) or pixels_planar.h.
+/// swapRedBlue; pairs are moved up by kAmountShift: 8 where multiplyHigh is one instruction, otherwise 0)
+/// or pixels_planar.h.
 // clang-format on

@@ -11,6 +11,7 @@ constexpr int64_t kPixels = kBytes;
 struct Pixels {
     uint8x16x4_t channels;  // red, green, blue, alpha
 };
+using Halves = Pixels;  // as products take and leave them
 using Amounts = uint8x16_t;
 using Where = uint8x16_t;  // all ones or all zeros for each pixel
 
@@ -45,12 +46,11 @@ VOREL_INLINE Pixels splatColour(uint32_t color) {
 
 VOREL_INLINE Amounts alphaOf(const Pixels& p) { return p.channels.val[3]; }
 VOREL_INLINE Amounts inverse(Amounts a) { return vmvnq_u8(a); }
-/// Whether all pixels are zeros.
-VOREL_INLINE bool isClear(const Pixels& p) {
-    const uint8x16_t* const c = p.channels.val;
-    return allZero(bitCast<U8s>(vorrq_u8(vorrq_u8(c[0], c[1]), vorrq_u8(c[2], c[3]))));
-}
+VOREL_INLINE Amounts inverseAlphaOf(const Pixels& p) { return inverse(alphaOf(p)); }
+/// Sixteen pixels are rarely clear together: no look for it.
+VOREL_INLINE bool isKnownClear(const Pixels&) { return false; }
 VOREL_INLINE Where isZero(Amounts a) { return vceqzq_u8(a); }
+VOREL_INLINE Where isFull(Amounts a) { return isZero(inverse(a)); }
 VOREL_INLINE Where isTransparent(const Pixels& p) { return isZero(alphaOf(p)); }
 VOREL_INLINE Amounts raisedToFull(Where where, Amounts a) { return vorrq_u8(a, where); }
 
@@ -80,6 +80,10 @@ VOREL_INLINE uint8x16_t productOf(uint8x16_t x, uint8x16_t y) {
 VOREL_INLINE Pixels scaled(const Pixels& p, Amounts amounts) {
     return perChannel(p, p, [amounts](uint8x16_t x, uint8x16_t) { return productOf(x, amounts); });
 }
+
+VOREL_INLINE Halves halvesOf(const Pixels& p) { return p; }
+VOREL_INLINE Pixels joined(const Halves& h) { return h; }
+VOREL_INLINE Pixels sumOf(const Halves& a, const Halves& b) { return added(a, b); }
 
 /// min(product(a + b, amount), 255), where a + b may reach 510. With a + b + 1 = 256 h + l it is
 /// h * amount + (l * amount >> 8).
