@@ -78,7 +78,7 @@ struct DstOverClip {
         const Amounts rest = inverseAlphaOf(d);
         const Where empty = isFull(rest);
         const Halves beneath = scaled(scaled(halvesOf(colour), mask), rest);
-        return scaledSum(halvesOf(cleared(empty, d)), beneath, raisedToFull(empty, mask));
+        return scaledSum(filled(empty, inverse(d)), beneath, raisedToFull(empty, mask));
     }
 };
 

@@ -50,6 +50,7 @@ VOREL_INLINE Pixels splatColour(uint32_t color) {
 }
 
 VOREL_INLINE Amounts alphaOf(const Pixels& p) { return {highBytesInPairs(p.bytes)}; }
+VOREL_INLINE Pixels inverse(const Pixels& p) { return {~p.bytes}; }
 /// 255 - alpha. Inverted before it is spread: one instruction takes the upper byte of the inverse.
 VOREL_INLINE Amounts inverseAlphaOf(const Pixels& p) { return {highBytesInPairs(~p.bytes)}; }
 VOREL_INLINE Amounts inverse(Amounts a) { return {a.u16s ^ kAmountByte}; }
@@ -74,6 +75,10 @@ VOREL_INLINE Amounts raisedToFull(Where where, Amounts a) {
     return {bitCast<U16s>(_mm512_mask_mov_epi32(bitCast<__m512i>(a.u16s), where,
                                                 bitCast<__m512i>(splat<U16s>(kAmountByte))))};
 }
+VOREL_INLINE Pixels filled(Where where, const Pixels& p) {
+    return {bitCast<U8s>(_mm512_mask_mov_epi32(bitCast<__m512i>(p.bytes), where,
+                                               bitCast<__m512i>(splat<U8s>(uint8_t{255}))))};
+}
 VOREL_INLINE Pixels kept(Where where, const Pixels& p) {
     return {bitCast<U8s>(_mm512_maskz_mov_epi32(where, bitCast<__m512i>(p.bytes)))};
 }
@@ -93,6 +98,7 @@ VOREL_INLINE Where isTransparent(const Pixels& p) {
 /// Amounts for scaledSum: 255 in some pixels, or all ones, which are as good for sums up to 255, as
 /// (x + 1) * 0xFFFF >> 16 = x.
 VOREL_INLINE Amounts raisedToFull(Where where, Amounts a) { return {a.u16s | bitCast<U16s>(where)}; }
+VOREL_INLINE Pixels filled(Where where, const Pixels& p) { return {p.bytes | bitCast<U8s>(where)}; }
 VOREL_INLINE Pixels kept(Where where, const Pixels& p) { return {p.bytes & bitCast<U8s>(where)}; }
 VOREL_INLINE Pixels cleared(Where where, const Pixels& p) { return {p.bytes & bitCast<U8s>(~where)}; }
 
@@ -122,15 +128,17 @@ VOREL_INLINE Pixels sumOf(const Halves& a, const Halves& b) {
     return joined({a.even + b.even, a.odd + b.odd});
 }
 
-/// min(product(a + b, amount), 255), where a + b may reach 510 and the product 17 bits: the amount
-/// stands in the upper byte, and the upper half of the 32-bit product is the result.
-VOREL_INLINE Pixels scaledSum(const Halves& a, const Halves& b, Amounts amounts) {
+/// min(product(a + b, amount), 255) of 255 - a, where a + b may reach 510 and the product 17 bits: the
+/// amount stands in the upper byte, and the upper half of the 32-bit product is the result. In 16 bits
+/// a + b + 1 is b - (0xFF00 + 255 - a).
+VOREL_INLINE Pixels scaledSum(const Pixels& inverseOfA, const Halves& b, Amounts amounts) {
     const U16s factor = amounts.u16s << (8 - kAmountShift);
-    const auto scaledLanes = [factor](U16s x, U16s y) {
-        const U16s result = multiplyHigh(x + y + 1, factor);
+    const auto scaledLanes = [factor](U16s inverseOfX, U16s y) {
+        const U16s result = multiplyHigh(y - (inverseOfX | 0xFF00), factor);
         return bitCast<U16s>(min(bitCast<I16s>(result), splat<I16s>(int16_t{255})));
     };
-    return joined({scaledLanes(a.even, b.even), scaledLanes(a.odd, b.odd)});
+    const auto inverse = bitCast<U16s>(inverseOfA.bytes);
+    return joined({scaledLanes(inverse, b.even), scaledLanes(inverse >> 8, b.odd)});
 }
 
 /// The colours of `p` with the alpha of `alpha`.
