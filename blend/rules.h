@@ -11,10 +11,12 @@ namespace VFontEffect::internal::VOREL_LEVEL {
 /// What an empty mask, or an image of nothing but zeros, does to the destination.
 enum class Empty { keeps, clears, copiesImage };
 
-/// `source` under the destination, in the pixels that are `painted`; elsewhere source must be 0. Over a
-/// transparent destination it takes the pixel whole, whatever colour channels stood there.
-VOREL_INLINE Pixels under(const Pixels& d, const Halves& source, Where painted) {
-    if (isKnownClear(d)) return joined(source);
+/// `source`, of pixels or their halves, under the destination, in the pixels that are `painted`;
+/// elsewhere source must be 0. Over a transparent destination it takes the pixel whole, whatever colour
+/// channels stood there.
+template <class Source>
+VOREL_INLINE Pixels under(const Pixels& d, const Source& source, Where painted) {
+    if (isClear(d)) return joined(source);
     const Amounts rest = inverseAlphaOf(d);
     const Pixels base = cleared(isFull(rest) & painted, d);
     return added(base, joined(scaled(source, rest)));
@@ -52,7 +54,7 @@ struct DstOverGate {
 
     static VOREL_INLINE Pixels apply(const Pixels& d, Amounts mask, const Pixels& colour) {
         const Where painted = ~isZero(mask);
-        return under(d, halvesOf(kept(painted, colour)), painted);
+        return under(d, kept(painted, colour), painted);
     }
 };
 
@@ -95,7 +97,7 @@ struct SrcOver {
 struct DstOver {
     static VOREL_INLINE Pixels apply(const Pixels& d, const Pixels& source) {
         const Where painted = ~isTransparent(source);
-        return under(d, halvesOf(kept(painted, source)), painted);
+        return under(d, kept(painted, source), painted);
     }
 };
 

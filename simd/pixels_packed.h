@@ -2,7 +2,6 @@
 
 #include "core/fixed_point.h"
 #include "simd/lanes.h"
-#include "simd/tuning.h"
 
 /// Packed pixels: one a 32-bit lane, multiplied as even and odd bytes in 16-bit lanes.
 namespace VFontEffect::internal::VOREL_LEVEL {
@@ -54,8 +53,8 @@ VOREL_INLINE Pixels inverse(const Pixels& p) { return {~p.bytes}; }
 /// 255 - alpha. Inverted before it is spread: one instruction takes the upper byte of the inverse.
 VOREL_INLINE Amounts inverseAlphaOf(const Pixels& p) { return {highBytesInPairs(~p.bytes)}; }
 VOREL_INLINE Amounts inverse(Amounts a) { return {a.u16s ^ kAmountByte}; }
-/// Whether all pixels are zeros; false as well where a look costs more than it saves.
-VOREL_INLINE bool isKnownClear(const Pixels& p) { return kLooksForClear && allZero(p.bytes); }
+/// Whether all pixels are zeros.
+VOREL_INLINE bool isClear(const Pixels& p) { return allZero(p.bytes); }
 
 #if defined(VOREL_MASK_REGISTERS)
 
@@ -109,6 +108,7 @@ VOREL_INLINE Pixels added(const Pixels& a, const Pixels& b) { return {addSaturat
 VOREL_INLINE Halves halvesOf(const Pixels& p) {
     return {bitCast<U16s>(p.bytes) & kEvenByte, bitCast<U16s>(p.bytes) >> 8};
 }
+VOREL_INLINE Pixels joined(const Pixels& p) { return p; }
 VOREL_INLINE Pixels joined(const Halves& h) { return {bitCast<U8s>(h.even | h.odd << 8)}; }
 
 /// product(x, amount). An amount in the upper byte makes the upper half of one multiplication of it.

@@ -54,8 +54,11 @@ VOREL_INLINE Pixels splatColour(uint32_t color) {
 VOREL_INLINE Amounts alphaOf(const Pixels& p) { return p.channels[3]; }
 VOREL_INLINE Amounts inverse(Amounts a) { return vmvnq_u8(a); }
 VOREL_INLINE Amounts inverseAlphaOf(const Pixels& p) { return inverse(alphaOf(p)); }
-/// Sixteen pixels are rarely clear together: no look for it.
-VOREL_INLINE bool isKnownClear(const Pixels&) { return false; }
+/// Whether all pixels are zeros.
+VOREL_INLINE bool isClear(const Pixels& p) {
+    const uint8x16_t* const c = p.channels;
+    return allZero(bitCast<U8s>(vorrq_u8(vorrq_u8(c[0], c[1]), vorrq_u8(c[2], c[3]))));
+}
 VOREL_INLINE Where isZero(Amounts a) { return vceqzq_u8(a); }
 VOREL_INLINE Where isFull(Amounts a) { return isZero(inverse(a)); }
 VOREL_INLINE Where isTransparent(const Pixels& p) { return isZero(alphaOf(p)); }

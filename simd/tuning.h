@@ -44,15 +44,6 @@ constexpr int kLargestDotRadius = 20;
 constexpr int kLargestDotRadius = 15;
 #endif
 
-// Whether what is painted beneath looks for vectors of the destination that are clear. Without the look
-// random pixels take 0.86 of the time at 64 bytes and text as much; at 16 bytes 0.97 and 1.36
-// (blend/dst-over/).
-#if defined(__AVX2__)
-constexpr bool kLooksForClear = false;
-#else
-constexpr bool kLooksForClear = true;
-#endif
-
 // Up to this reach of the disc a dilation by spreading takes less time than one by tiles, whose vectors
 // are short (stroke/outside/). Tiles by spreading: at 64 bytes 1.6 to 4.0 at 16 and 0.7 to 1.8 at 32, at
 // 16 bytes 1.8 to 3.8 at 8 and 0.7 to 1.6 at 16.
