@@ -11,13 +11,15 @@ namespace VFontEffect::internal::VOREL_LEVEL {
 /// What an empty mask, or an image of nothing but zeros, does to the destination.
 enum class Empty { keeps, clears, copiesImage };
 
-/// `source` under the destination, in the pixels that are `painted`; elsewhere source must be 0. Over a
-/// transparent destination it takes the pixel whole, whatever colour channels stood there.
-VOREL_INLINE Pixels under(const Pixels& d, const Pixels& source, Where painted) {
-    if (isClear(d)) return source;
-    const Amounts alpha = alphaOf(d);
-    const Pixels base = cleared(isZero(alpha) & painted, d);
-    return added(base, scaled(source, inverse(alpha)));
+/// `source`, of pixels or their halves, under the destination, in the pixels that are `painted`;
+/// elsewhere source must be 0. Over a transparent destination it takes the pixel whole, whatever colour
+/// channels stood there.
+template <class Source>
+VOREL_INLINE Pixels under(const Pixels& d, const Source& source, Where painted) {
+    if (isClear(d)) return joined(source);
+    const Amounts rest = inverseAlphaOf(d);
+    const Pixels base = cleared(isFull(rest) & painted, d);
+    return added(base, joined(scaled(source, rest)));
 }
 
 // --- One colour through a mask --------------------------------------------------------------------
@@ -31,7 +33,7 @@ struct SrcOverMask {
         const Pixels product = scaled(colour, mask);
         // A colour channel above its alpha may outlast it; nothing of it is painted.
         const Pixels source = cleared(isTransparent(product), product);
-        return added(scaled(d, inverse(alphaOf(source))), source);
+        return added(scaled(d, inverseAlphaOf(source)), source);
     }
 };
 
@@ -41,7 +43,7 @@ struct DstOverMask {
     static constexpr bool kIsSparse = false;
 
     static VOREL_INLINE Pixels apply(const Pixels& d, Amounts mask, const Pixels& colour) {
-        return under(d, scaled(colour, mask), ~isZero(mask));
+        return under(d, scaled(halvesOf(colour), mask), ~isZero(mask));
     }
 };
 
@@ -75,10 +77,10 @@ struct DstOverClip {
     static constexpr bool kIsSparse = true;
 
     static VOREL_INLINE Pixels apply(const Pixels& d, Amounts mask, const Pixels& colour) {
-        const Amounts alpha = alphaOf(d);
-        const Where empty = isZero(alpha);
-        const Pixels beneath = scaled(scaled(colour, mask), inverse(alpha));
-        return scaledSum(cleared(empty, d), beneath, raisedToFull(empty, mask));
+        const Amounts rest = inverseAlphaOf(d);
+        const Where empty = isFull(rest);
+        const Halves beneath = scaled(scaled(halvesOf(colour), mask), rest);
+        return scaledSum(filled(empty, inverse(d)), beneath, raisedToFull(empty, mask));
     }
 };
 
@@ -87,7 +89,7 @@ struct DstOverClip {
 /// Source over destination.
 struct SrcOver {
     static VOREL_INLINE Pixels apply(const Pixels& d, const Pixels& source) {
-        return added(source, scaled(d, inverse(alphaOf(source))));
+        return added(source, scaled(d, inverseAlphaOf(source)));
     }
 };
 
@@ -115,7 +117,7 @@ struct MixByCoverage {
     static constexpr Empty kEmpty = Empty::copiesImage;
 
     static VOREL_INLINE Pixels apply(const Pixels& d, const Pixels& outer, Amounts mask) {
-        return added(scaled(outer, inverse(mask)), scaled(d, mask));
+        return sumOf(scaled(halvesOf(outer), inverse(mask)), scaled(halvesOf(d), mask));
     }
 };
 

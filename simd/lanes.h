@@ -30,6 +30,7 @@
 /// | ----------------------------- | -------------------------------------------------------------------- |
 /// | addSaturated, subSaturated    | bytes: a + b, at most 255; a - b, at least 0                         |
 /// | multiplyHigh                  | the upper 16 bits of products of 16-bit lanes                        |
+/// | [multiplyHighSum]             | the upper 16 bits of a * x + b * y of 16-bit lanes, below 2^32       |
 /// | allZero                       | whether no lane holds anything but 0                                 |
 /// | nonZeroLanes, kLaneBits       | kLaneBits ones for each byte but 0, the first one's lowest           |
 /// | toInt                         | as core/numeric.h converts: toward zero, saturating, NaN to 0        |
@@ -62,5 +63,6 @@
 /// | [VOREL_DOT_PRODUCTS]          | said where addDots is one instruction                                |
 ///
 /// and pixels, in one of two forms: pixels_packed.h (which asks for loadInPairs, highBytesInPairs and
-/// swapRedBlue) or pixels_planar.h.
+/// swapRedBlue; pairs are moved up by kAmountShift: 8 where multiplyHigh is one instruction, otherwise 0)
+/// or pixels_planar.h.
 // clang-format on

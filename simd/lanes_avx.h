@@ -9,11 +9,11 @@ namespace VFontEffect::internal::VOREL_LEVEL {
 VOREL_INLINE U16s loadInPairs(const uint8_t* from) {
     return bitCast<U16s>(
         shuffled(bitCast<U8s>(widened(from)),
-                 _mm_setr_epi8(0, -1, 0, -1, 4, -1, 4, -1, 8, -1, 8, -1, 12, -1, 12, -1)));
+                 _mm_setr_epi8(-1, 0, -1, 0, -1, 4, -1, 4, -1, 8, -1, 8, -1, 12, -1, 12)));
 }
 VOREL_INLINE U16s highBytesInPairs(U8s v) {
     return bitCast<U16s>(
-        shuffled(v, _mm_setr_epi8(3, -1, 3, -1, 7, -1, 7, -1, 11, -1, 11, -1, 15, -1, 15, -1)));
+        shuffled(v, _mm_setr_epi8(-1, 3, -1, 3, -1, 7, -1, 7, -1, 11, -1, 11, -1, 15, -1, 15)));
 }
 VOREL_INLINE U8s swapRedBlue(U8s v) {
     return shuffled(v, _mm_setr_epi8(2, 1, 0, 3, 6, 5, 4, 7, 10, 9, 8, 11, 14, 13, 12, 15));

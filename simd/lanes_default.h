@@ -13,6 +13,15 @@ VOREL_INLINE U8s loadFirst(const uint8_t* from, int64_t count) {
 }
 #endif
 
+#if !defined(VOREL_NATIVE_MULTIPLY_HIGH_SUM)
+VOREL_INLINE U16s multiplyHighSum(U16s a, U16s x, U16s b, U16s y) {
+    // The upper halves of both products, and the carry of the lower ones.
+    const U16s low = a * x;
+    const U16s carry = bitCast<U16s>(low + b * y < low);
+    return multiplyHigh(a, x) + multiplyHigh(b, y) - carry;
+}
+#endif
+
 #if !defined(VOREL_NATIVE_GATHER)
 template <class Index, size_t... kLanes>
 VOREL_INLINE U32s gather(const uint32_t* table, const Index& indices, std::index_sequence<kLanes...>) {

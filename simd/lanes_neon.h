@@ -27,6 +27,17 @@ VOREL_INLINE U16s multiplyHigh(U16s a, U16s b) {
     return bitCast<U16s>(
         vuzp2q_u16(bitCast<uint16x8_t>(low), bitCast<uint16x8_t>(vmull_high_u16(x, y))));
 }
+#define VOREL_NATIVE_MULTIPLY_HIGH_SUM
+VOREL_INLINE U16s multiplyHighSum(U16s a, U16s x, U16s b, U16s y) {
+    const auto a16 = bitCast<uint16x8_t>(a);
+    const auto x16 = bitCast<uint16x8_t>(x);
+    const auto b16 = bitCast<uint16x8_t>(b);
+    const auto y16 = bitCast<uint16x8_t>(y);
+    const uint32x4_t first = vmull_u16(vget_low_u16(a16), vget_low_u16(x16));
+    const uint32x4_t low = vmlal_u16(first, vget_low_u16(b16), vget_low_u16(y16));
+    const uint32x4_t high = vmlal_high_u16(vmull_high_u16(a16, x16), b16, y16);
+    return bitCast<U16s>(vuzp2q_u16(bitCast<uint16x8_t>(low), bitCast<uint16x8_t>(high)));
+}
 VOREL_INLINE I32s toInt(F32s v) { return bitCast<I32s>(vcvtq_s32_f32(bitCast<float32x4_t>(v))); }
 VOREL_INLINE F32s squareRoot(F32s v) { return bitCast<F32s>(vsqrtq_f32(bitCast<float32x4_t>(v))); }
 VOREL_INLINE U16s widenLow(U8s v) {

@@ -18,6 +18,7 @@ VOREL_INLINE U16s multiplyHigh(U16s a, U16s b) {
 VOREL_INLINE bool allZero(U8s v) { return bitCast<U32s>(v)[0] == 0; }
 constexpr int kLaneBits = 8;
 VOREL_INLINE uint64_t nonZeroLanes(U8s v) { return bitCast<U32s>(v != 0)[0]; }
+constexpr int kAmountShift = 0;
 VOREL_INLINE U16s loadInPairs(const uint8_t* from) { return bitCast<U16s>(U32s{*from * 0x10001U}); }
 VOREL_INLINE U16s highBytesInPairs(U8s v) { return bitCast<U16s>((bitCast<U32s>(v) >> 24) * 0x10001U); }
 VOREL_INLINE U8s swapRedBlue(U8s v) { return U8s{v[2], v[1], v[0], v[3]}; }

@@ -35,6 +35,7 @@ VOREL_INLINE uint64_t nonZeroLanes(U8s v) { return wasm_i8x16_bitmask(bits(v != 
 VOREL_INLINE I32s toInt(F32s v) { return bitCast<I32s>(wasm_i32x4_trunc_sat_f32x4(bits(v))); }
 VOREL_INLINE F32s squareRoot(F32s v) { return bitCast<F32s>(wasm_f32x4_sqrt(bits(v))); }
 
+constexpr int kAmountShift = 0;
 // By indices in a register, of which -1 gives 0: with shuffles of a vector and zeros in their place
 // blends take a quarter more time in V8 (blend/mask-mode1/random).
 VOREL_INLINE U16s loadInPairs(const uint8_t* from) {

@@ -29,7 +29,7 @@ VOREL_INLINE uint64_t nonZeroLanes(U8s v) {
     return static_cast<uint32_t>(_mm_movemask_epi8(ints(v != 0)));
 }
 VOREL_INLINE U16s loadInPairs(const uint8_t* from) {
-    const __m128i u16s = _mm_unpacklo_epi8(_mm_cvtsi32_si128(load<int>(from)), _mm_setzero_si128());
+    const __m128i u16s = _mm_unpacklo_epi8(_mm_setzero_si128(), _mm_cvtsi32_si128(load<int>(from)));
     return bitCast<U16s>(_mm_unpacklo_epi16(u16s, u16s));
 }
 /// Moves the 16-bit lanes of each word: both take the one that `selector` names for them.
@@ -38,7 +38,8 @@ VOREL_INLINE U16s u16sMoved(U16s v) {
     return bitCast<U16s>(_mm_shufflehi_epi16(_mm_shufflelo_epi16(ints(v), kSelector), kSelector));
 }
 VOREL_INLINE U16s highBytesInPairs(U8s v) {
-    return u16sMoved<_MM_SHUFFLE(3, 3, 1, 1)>(bitCast<U16s>(v) >> 8);
+    const U32s high = bitCast<U32s>(v) & 0xFF000000U;
+    return bitCast<U16s>(high | high >> 16);
 }
 VOREL_INLINE U8s swapRedBlue(U8s v) {
     const U16s ends = bitCast<U16s>(v) & 0x00FF;

@@ -13,6 +13,8 @@ VOREL_INLINE X86Ints ints(V v) {
     return bitCast<X86Ints>(v);
 }
 
+constexpr int kAmountShift = 8;
+
 VOREL_INLINE U8s addSaturated(U8s a, U8s b) {
     return bitCast<U8s>(VOREL_X86(adds_epu8)(ints(a), ints(b)));
 }

@@ -9,13 +9,21 @@ namespace VFontEffect::internal::VOREL_LEVEL {
 constexpr int64_t kPixels = kBytes;
 
 struct Pixels {
-    uint8x16x4_t channels;  // red, green, blue, alpha
+    uint8x16_t channels[4];  // red, green, blue, alpha
 };
+using Halves = Pixels;  // as products take and leave them
 using Amounts = uint8x16_t;
 using Where = uint8x16_t;  // all ones or all zeros for each pixel
 
-VOREL_INLINE Pixels loadPixels(const uint8_t* from) { return {vld4q_u8(from)}; }
-VOREL_INLINE void storePixels(uint8_t* to, const Pixels& pixels) { vst4q_u8(to, pixels.channels); }
+VOREL_INLINE Pixels loadPixels(const uint8_t* from) {
+    const uint8x16x4_t p = vld4q_u8(from);
+    return {{p.val[0], p.val[1], p.val[2], p.val[3]}};
+}
+VOREL_INLINE void storePixels(uint8_t* to, const Pixels& pixels) {
+    const uint8x16_t* const c = pixels.channels;
+    const uint8x16x4_t planes = {{c[0], c[1], c[2], c[3]}};
+    vst4q_u8(to, planes);
+}
 /// Pixels in memory order from the words that `wordsAt(i)` gives for pixel i and the next ones.
 template <class WordsAt>
 VOREL_INLINE Pixels madeOfWords(WordsAt wordsAt) {
@@ -28,38 +36,40 @@ VOREL_INLINE Pixels madeOfWords(WordsAt wordsAt) {
 /// From words 0xAARRGGBB: memory order B, G, R, A.
 VOREL_INLINE Pixels loadWords(const uint8_t* from) {
     const uint8x16x4_t p = vld4q_u8(from);
-    return {{{p.val[2], p.val[1], p.val[0], p.val[3]}}};
+    return {{p.val[2], p.val[1], p.val[0], p.val[3]}};
 }
 /// From memory order A, R, G, B.
 VOREL_INLINE Pixels loadArgb(const uint8_t* from) {
     const uint8x16x4_t p = vld4q_u8(from);
-    return {{{p.val[1], p.val[2], p.val[3], p.val[0]}}};
+    return {{p.val[1], p.val[2], p.val[3], p.val[0]}};
 }
 VOREL_INLINE Amounts loadAmounts(const uint8_t* from) { return vld1q_u8(from); }
 
 /// The same colour word 0xAARRGGBB in every pixel.
 VOREL_INLINE Pixels splatColour(uint32_t color) {
     const auto channel = [color](int shift) { return vdupq_n_u8(static_cast<uint8_t>(color >> shift)); };
-    return {{{channel(16), channel(8), channel(0), channel(24)}}};
+    return {{channel(16), channel(8), channel(0), channel(24)}};
 }
 
-VOREL_INLINE Amounts alphaOf(const Pixels& p) { return p.channels.val[3]; }
+VOREL_INLINE Amounts alphaOf(const Pixels& p) { return p.channels[3]; }
 VOREL_INLINE Amounts inverse(Amounts a) { return vmvnq_u8(a); }
+VOREL_INLINE Amounts inverseAlphaOf(const Pixels& p) { return inverse(alphaOf(p)); }
 /// Whether all pixels are zeros.
 VOREL_INLINE bool isClear(const Pixels& p) {
-    const uint8x16_t* const c = p.channels.val;
+    const uint8x16_t* const c = p.channels;
     return allZero(bitCast<U8s>(vorrq_u8(vorrq_u8(c[0], c[1]), vorrq_u8(c[2], c[3]))));
 }
 VOREL_INLINE Where isZero(Amounts a) { return vceqzq_u8(a); }
+VOREL_INLINE Where isFull(Amounts a) { return isZero(inverse(a)); }
 VOREL_INLINE Where isTransparent(const Pixels& p) { return isZero(alphaOf(p)); }
 VOREL_INLINE Amounts raisedToFull(Where where, Amounts a) { return vorrq_u8(a, where); }
 
 template <class Operation>
 VOREL_INLINE Pixels perChannel(const Pixels& a, const Pixels& b, Operation operation) {
-    const uint8x16_t* const x = a.channels.val;
-    const uint8x16_t* const y = b.channels.val;
+    const uint8x16_t* const x = a.channels;
+    const uint8x16_t* const y = b.channels;
     return {
-        {{operation(x[0], y[0]), operation(x[1], y[1]), operation(x[2], y[2]), operation(x[3], y[3])}}};
+        {operation(x[0], y[0]), operation(x[1], y[1]), operation(x[2], y[2]), operation(x[3], y[3])}};
 }
 
 VOREL_INLINE Pixels kept(Where where, const Pixels& p) {
@@ -67,6 +77,12 @@ VOREL_INLINE Pixels kept(Where where, const Pixels& p) {
 }
 VOREL_INLINE Pixels cleared(Where where, const Pixels& p) {
     return perChannel(p, p, [where](uint8x16_t x, uint8x16_t) { return vbicq_u8(x, where); });
+}
+VOREL_INLINE Pixels filled(Where where, const Pixels& p) {
+    return perChannel(p, p, [where](uint8x16_t x, uint8x16_t) { return vorrq_u8(x, where); });
+}
+VOREL_INLINE Pixels inverse(const Pixels& p) {
+    return perChannel(p, p, [](uint8x16_t x, uint8x16_t) { return vmvnq_u8(x); });
 }
 VOREL_INLINE Pixels added(const Pixels& a, const Pixels& b) {
     return perChannel(a, b, [](uint8x16_t x, uint8x16_t y) { return vqaddq_u8(x, y); });
@@ -81,12 +97,16 @@ VOREL_INLINE Pixels scaled(const Pixels& p, Amounts amounts) {
     return perChannel(p, p, [amounts](uint8x16_t x, uint8x16_t) { return productOf(x, amounts); });
 }
 
-/// min(product(a + b, amount), 255), where a + b may reach 510. With a + b + 1 = 256 h + l it is
+VOREL_INLINE Halves halvesOf(const Pixels& p) { return p; }
+VOREL_INLINE Pixels joined(const Halves& h) { return h; }
+VOREL_INLINE Pixels sumOf(const Halves& a, const Halves& b) { return added(a, b); }
+
+/// min(product(a + b, amount), 255) of 255 - a. With b - (255 - a) = 256 (h - 1) + l it is
 /// h * amount + (l * amount >> 8).
-VOREL_INLINE Pixels scaledSum(const Pixels& a, const Pixels& b, Amounts amounts) {
-    return perChannel(a, b, [amounts](uint8x16_t x, uint8x16_t y) {
-        const uint8x16_t low = vsubq_u8(vaddq_u8(x, y), vdupq_n_u8(255));
-        const uint8x16_t carry = vcgeq_u8(y, vmvnq_u8(x));
+VOREL_INLINE Pixels scaledSum(const Pixels& inverseOfA, const Halves& b, Amounts amounts) {
+    return perChannel(inverseOfA, b, [amounts](uint8x16_t x, uint8x16_t y) {
+        const uint8x16_t low = vsubq_u8(y, x);
+        const uint8x16_t carry = vcgeq_u8(y, x);
         const uint8x8_t near = vshrn_n_u16(vmull_u8(vget_low_u8(low), vget_low_u8(amounts)), 8);
         const uint8x16_t scaledLow = vshrn_high_n_u16(near, vmull_high_u8(low, amounts), 8);
         return vqaddq_u8(scaledLow, vandq_u8(carry, amounts));
@@ -95,7 +115,7 @@ VOREL_INLINE Pixels scaledSum(const Pixels& a, const Pixels& b, Amounts amounts)
 
 /// The colours of `p` with the alpha of `alpha`.
 VOREL_INLINE Pixels withAlphaOf(const Pixels& p, const Pixels& alpha) {
-    return {{{p.channels.val[0], p.channels.val[1], p.channels.val[2], alpha.channels.val[3]}}};
+    return {{p.channels[0], p.channels[1], p.channels[2], alpha.channels[3]}};
 }
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

@@ -32,24 +32,17 @@ void mixColumns(const uint32_t* patternRow, const ColumnTaps& taps, int64_t coun
     }
 }
 
-/// (near * nearWeight + far * farWeight) >> 16: the upper halves of both products, and the carry of the
-/// lower ones.
-VOREL_INLINE U16s mixed(const uint32_t* near, const uint32_t* far, U16s nearWeight, U16s farWeight) {
-    const auto n = load<U16s>(near);
-    const auto f = load<U16s>(far);
-    const U16s low = n * nearWeight;
-    const U16s carry = bitCast<U16s>(low + f * farWeight < low);
-    return multiplyHigh(n, nearWeight) + multiplyHigh(f, farWeight) - carry;
-}
-
 // Deliberate: weights of 255 and a shift by 16 sample an opaque pattern as 253.
 void mixRows(const MixedRow& near, const MixedRow& far, uint32_t nearWeight, uint32_t farWeight,
              float opacity, int64_t count, uint32_t* out) {
     const auto n = splat<U16s>(static_cast<uint16_t>(nearWeight));
     const auto f = splat<U16s>(static_cast<uint16_t>(farWeight));
     for (int64_t x = 0; x < count; x += kU32Lanes) {
-        const U16s redBlue = mixed(near.redBlue + x, far.redBlue + x, n, f);
-        const U16s greenAlpha = mixed(near.greenAlpha + x, far.greenAlpha + x, n, f);
+        const auto mixed = [=](const uint32_t* nearRow, const uint32_t* farRow) VOREL_INLINE_LAMBDA {
+            return multiplyHighSum(load<U16s>(nearRow + x), n, load<U16s>(farRow + x), f);
+        };
+        const U16s redBlue = mixed(near.redBlue, far.redBlue);
+        const U16s greenAlpha = mixed(near.greenAlpha, far.greenAlpha);
         const auto straightAlpha = bitCast<I32s>(bitCast<U32s>(greenAlpha) >> 16);
         const I32s seenAlpha = toInt(__builtin_convertvector(straightAlpha, F32s) * opacity);
         const auto alpha = bitCast<U32s>(clamped(seenAlpha, 0, 255));

@@ -112,6 +112,10 @@ const char* wrongOfU16s(Lanes& random) {
         expected[i] = static_cast<uint16_t>(uint32_t{a[i]} * b[i] >> 16);
     if (!same(multiplyHigh(x, y), expected)) return "multiplyHigh";
     for (int i = 0; i < kU16Lanes; ++i)
+        expected[i] =
+            static_cast<uint16_t>((uint32_t{a[i]} * (b[i] >> 1) + uint32_t{b[i]} * (a[i] >> 1)) >> 16);
+    if (!same(multiplyHighSum(x, y >> 1, y, x >> 1), expected)) return "multiplyHighSum";
+    for (int i = 0; i < kU16Lanes; ++i)
         expected[i] = interleaved(a, b, i, false);
     if (!same(interleaveLow(x, y), expected)) return "interleaveLow of 16-bit lanes";
     for (int i = 0; i < kU16Lanes; ++i)
