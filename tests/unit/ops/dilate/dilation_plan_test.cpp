@@ -6,6 +6,7 @@
 #include <cstdint>
 #include <sstream>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "tests/support/core_compare.h"
@@ -130,6 +131,19 @@ TEST(DilationPlan, Squares_HaveEveryCellOfEveryDisc) {
         });
         if (HasFatalFailure()) return;
     }
+}
+
+TEST(DilationPlan, Squares_LookAtARimThatLacksOneTo255) {
+    // Cells at a distance of 25 weigh 254.
+    const DiscShape disc(25.0F - 1.0F / 255.0F);
+    literal::Mask mask = filledMask(101, 101, 253);
+    mask.bytes[50 * 101 + 50] = 255;
+    const CoverageRows source = {mask.bytes.data(), 101, 101, 101, kAsIs};
+    const auto values = dilated(source, disc, wholeOf(source), false, {}, LargeDiscs::bySquares);
+    constexpr std::pair<int, int> kCells[] = {{25, 0},   {0, -25},  {20, 15},
+                                              {-15, 20}, {-24, -7}, {7, -24}};
+    for (const auto& [x, y] : kCells)
+        EXPECT_EQ(values.at(static_cast<size_t>((50 + y) * 101 + 50 + x)), 254) << x << " " << y;
 }
 
 /// Of an area of any size a few pixels anywhere: of a dilation, or of the smaller one of that and the
