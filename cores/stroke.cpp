@@ -32,7 +32,7 @@ class Outline {
         : mMemory(bytesOfPlan, plansOf(shape)),
           mGrown(level, {box.rows(shape.growsGlyph ? kAsIs : kInverse), disc}, mMemory.data(),
                  bytesOfPlan) {
-        if (plansOf(shape) == 2) {
+        if (mMemory && plansOf(shape) == 2) {
             mInverse.emplace(level, DilationInput{box.rows(kInverse), disc},
                              mMemory.data() + bytesOfPlan, bytesOfPlan);
         }

@@ -13,7 +13,7 @@
 #     --compare FILE   adds the change against a kept run
 #     --counts         instructions instead of time, under callgrind
 #     --document       everything, into docs/benchmarks.md
-#     --hostile        how much longer than text masks take that are nothing like it: noise, ramps, halftones
+#     --hostile        how many times as long as text masks take that are nothing like it: noise, ramps ...
 #     --growing        what a pixel of a look takes in small and in large pictures
 set -euo pipefail
 invoked=$PWD

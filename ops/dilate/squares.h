@@ -11,9 +11,11 @@
 /// The full cells of a disc are a union of squares whose sides are powers of two. Let [-h, h]^2 be the
 /// largest square of full cells, and (w, d) the corners of the outline's staircase, w > h >= d, with
 /// their mirror images: [-w, w] x [-d, d] is full, and the largest square in its corner, whose side is a
-/// power of two, is longer than d. So the squares of the corners reach from the staircase to the middle
-/// row, and the rest is the middle square, four of the largest side. A plane for each side holds the
-/// largest coverage of every square at its upper left corner, so a square is one load.
+/// power of two, is longer than d. The steps there are one column wide: (w - 1, d + 1) is no farther
+/// from the centre than (w, d) is. So each column beyond h has a corner, whose square reaches from the
+/// staircase to the middle row, and the rest is the middle square, four of the largest side. A plane for
+/// each side holds the largest coverage of every square at its upper left corner, so a square is one
+/// load.
 ///
 /// What lies around the middle square is cut into 16 sectors, two of an octant: corners, and cells of
 /// the rim. A few squares around a sector tell the largest coverage in it. Where that is no more than
@@ -126,6 +128,7 @@ class LoadLists {
 
   private:
     void add(const Image& image, int64_t plane, int64_t x, int64_t y) {
+        VOREL_ASSERT(plane < mLayout.planes);
         const int64_t column = image.transposed ? y : x;
         const int64_t row = image.transposed ? x : y;
         *mNext++ = static_cast<int32_t>(plane * mLayout.planeBytes + row * mLayout.rows.stride + column);
@@ -218,6 +221,7 @@ inline void listSquares(const SquareLayout& layout, int64_t half, int64_t perRow
 inline void beginSquares(const Dilation& dilation, uint8_t* memory) {
     const DiscShape& disc = *dilation.disc;
     SquareLayout& layout = layOut<SquareLayout>(dilation, memory);
+    VOREL_ASSERT(layout.planes * layout.planeBytes <= INT32_MAX);
     const int64_t side = int64_t{1} << (layout.planes - 1);
     const int64_t perRow = (2 * int64_t{disc.reach} + side) / side;
     VOREL_ASSERT(perRow <= 3);
@@ -250,12 +254,13 @@ inline void joinSquares(const SquareLayout& layout, int64_t plane, int64_t row) 
     }
 }
 
-/// Drops the rows before one of the source.
+/// Drops the rows before one of the source. All planes have rows from there on.
 inline void dropRows(SquareLayout& layout, int64_t firstRow) {
-    const int64_t dropped = min(firstRow - layout.firstRow, layout.filledRows);
+    const int64_t dropped = firstRow - layout.firstRow;
     for (int64_t plane = 0; plane < layout.planes; ++plane) {
         uint8_t* const rows = layout.rows.start + plane * layout.planeBytes;
-        const int64_t kept = max<int64_t>(rowsOfPlane(plane, layout.filledRows) - dropped, 0);
+        const int64_t kept = rowsOfPlane(plane, layout.filledRows) - dropped;
+        VOREL_ASSERT(dropped > 0 && kept >= 0);
         std::memmove(rows, rows + dropped * layout.rows.stride,
                      static_cast<size_t>(kept * layout.rows.stride));
     }

@@ -6,6 +6,7 @@
 #include <cstdint>
 #include <sstream>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "tests/support/core_compare.h"
@@ -132,21 +133,41 @@ TEST(DilationPlan, Squares_HaveEveryCellOfEveryDisc) {
     }
 }
 
-/// Of an area of any size the pixels that lie on a random grid.
+TEST(DilationPlan, Squares_LookAtARimThatLacksOneTo255) {
+    // Cells at a distance of 25 weigh 254.
+    const DiscShape disc(25.0F - 1.0F / 255.0F);
+    literal::Mask mask = filledMask(101, 101, 253);
+    mask.bytes[50 * 101 + 50] = 255;
+    const CoverageRows source = {mask.bytes.data(), 101, 101, 101, kAsIs};
+    const auto values = dilated(source, disc, wholeOf(source), false, {}, LargeDiscs::bySquares);
+    constexpr std::pair<int, int> kCells[] = {{25, 0},   {0, -25},  {20, 15},
+                                              {-15, 20}, {-24, -7}, {7, -24}};
+    for (const auto& [x, y] : kCells)
+        EXPECT_EQ(values.at(static_cast<size_t>((50 + y) * 101 + 50 + x)), 254) << x << " " << y;
+}
+
+/// Of an area of any size a few pixels anywhere: of a dilation, or of the smaller one of that and the
+/// inverse's, of which often just one gives up.
 void expectDefinedHereAndThere(Random& random, const CoverageRows& source, float radius,
                                LargeDiscs largeDiscs) {
     const DiscShape disc(radius);
-    const Box part = expanded(wholeOf(source), disc.reach);
+    const Box part = DilationPlan::reached({source, disc});
     const WindowSize windows =
-        random.chance(50) ? WindowSize{random.between(60, 300), 70} : WindowSize{};
-    const auto values = dilated(source, disc, part, false, windows, largeDiscs);
+        random.chance(50) ? WindowSize{random.between(20, 300), random.between(20, 100)} : WindowSize{};
+    const bool andInverse = random.chance(50);
+    CoverageRows inverse = source;
+    inverse.invertMask ^= kInverse;
+    const auto values = dilated(source, disc, part, andInverse, windows, largeDiscs);
     for (int i = 0; i < 40; ++i) {
         const int64_t x = random.between(0, static_cast<int>(part.width()) - 1);
         const int64_t y = random.between(0, static_cast<int>(part.height()) - 1);
-        ASSERT_EQ(values.at(static_cast<size_t>(y * part.width() + x)),
-                  definedDilation(source, radius, part.left + x, part.top + y))
-            << source.width << " x " << source.height << ", radius " << radius << ", at " << x << " "
-            << y;
+        uint8_t expected = definedDilation(source, radius, part.left + x, part.top + y);
+        if (andInverse) {
+            expected = std::min(expected, definedDilation(inverse, radius, part.left + x, part.top + y));
+        }
+        ASSERT_EQ(values.at(static_cast<size_t>(y * part.width() + x)), expected)
+            << describe({source, radius, part, windows}) << ", with the inverse " << andInverse
+            << ", at " << x << " " << y;
     }
 }
 
