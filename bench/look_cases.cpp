@@ -18,7 +18,6 @@ namespace {
 namespace literal = vorel_test::literal;
 
 constexpr uint32_t kInk = 0x3060A0U;
-constexpr int kMargin = 40;
 
 /// Ramp and tile in the types of either set.
 template <class Set>
@@ -85,8 +84,8 @@ class LookJob : public Job {
     LookJob(const Workload* workload, Describe<VFEffect> describe)
         : mGlyphs(workload->glyphs),
           mDescribe(describe),
-          mLayer(static_cast<unsigned int>(workload->width + 2 * kMargin),
-                 static_cast<unsigned int>(workload->height + 2 * kMargin), 4) {}
+          mLayer(static_cast<unsigned int>(workload->width + 2 * kLookMargin),
+                 static_cast<unsigned int>(workload->height + 2 * kLookMargin), 4) {}
 
     void paint() override {
         std::fill_n(mLayer.mData, painted().size, uint8_t{0});
@@ -98,7 +97,7 @@ class LookJob : public Job {
         for (Glyph& glyph : mGlyphs) {
             VFGlyph record = {glyph.coverage.data(), static_cast<unsigned short>(glyph.width),
                               static_cast<unsigned short>(glyph.height)};
-            set.renderEffectLayer(kMargin + glyph.x, kMargin + glyph.y, &record);
+            set.renderEffectLayer(kLookMargin + glyph.x, kLookMargin + glyph.y, &record);
         }
         set.doEffectPostProcessing();
         set.compositeLayers(&mLayer);
@@ -123,8 +122,8 @@ class LiteralLookJob : public Job {
   public:
     LiteralLookJob(const Workload* workload, Describe<literal::Engine> describe)
         : mGlyphs(workload->glyphs), mDescribe(describe) {
-        mLayer.width = workload->width + 2 * kMargin;
-        mLayer.height = workload->height + 2 * kMargin;
+        mLayer.width = workload->width + 2 * kLookMargin;
+        mLayer.height = workload->height + 2 * kLookMargin;
         mLayer.bytes.resize(size_t{4} * static_cast<size_t>(mLayer.width * mLayer.height));
     }
 
@@ -137,7 +136,7 @@ class LiteralLookJob : public Job {
         set.setDstBitmap(&mLayer);
         for (const Glyph& glyph : mGlyphs) {
             const literal::Mask mask = {glyph.width, glyph.height, glyph.coverage};
-            set.renderEffectLayer(kMargin + glyph.x, kMargin + glyph.y, &mask);
+            set.renderEffectLayer(kLookMargin + glyph.x, kLookMargin + glyph.y, &mask);
         }
         set.doEffectPostProcessing();
         set.compositeLayers(mLayer);
@@ -152,41 +151,47 @@ class LiteralLookJob : public Job {
     literal::Picture mLayer;
 };
 
-Describe<VFEffect> describing(char look) {
+template <class Set>
+Describe<Set> describing(char look) {
     switch (look) {
         case 'A':
-            return lookA<VFEffect>;
+            return lookA<Set>;
         case 'B':
-            return lookB<VFEffect>;
+            return lookB<Set>;
         case 'C':
-            return lookC<VFEffect>;
+            return lookC<Set>;
         default:
-            return lookD<VFEffect>;
+            return lookD<Set>;
     }
 }
 
-void addLook(Cases& cases, char look, Describe<literal::Engine> literally) {
-    for (const Workload* workload : {&glyph48(), &line48(), &title160()}) {
-        cases.push_back(lookCase(look, *workload));
-        const std::string row = cases.back().row;
-        const int64_t pixels = cases.back().pixels;
-        cases.push_back(caseOf<LiteralLookJob>(row, kLiteral, pixels, workload, literally));
-        cases.push_back(copyCase(row, pixels, 4 * pixels));
-    }
+/// The look in a picture whose margins count as well.
+template <class LookJobType, class Set>
+Case lookCaseBy(const char* maker, char look, const Workload& workload) {
+    return caseOf<LookJobType>(std::string("look/") + look + "/" + workload.name, maker,
+                               workload.grownPixels(kLookMargin), &workload, describing<Set>(look));
 }
 
 }  // namespace
 
 Case lookCase(char look, const Workload& workload) {
-    return caseOf<LookJob>(std::string("look/") + look + "/" + workload.name, kOurs,
-                           workload.grownPixels(kMargin), &workload, describing(look));
+    return lookCaseBy<LookJob, VFEffect>(kOurs, look, workload);
+}
+
+Case literalLookCase(char look, const Workload& workload) {
+    return lookCaseBy<LiteralLookJob, literal::Engine>(kLiteral, look, workload);
 }
 
 void addLookCases(Cases& cases) {
-    addLook(cases, 'A', lookA<literal::Engine>);
-    addLook(cases, 'B', lookB<literal::Engine>);
-    addLook(cases, 'C', lookC<literal::Engine>);
-    addLook(cases, 'D', lookD<literal::Engine>);
+    for (const char look : kLooks) {
+        for (const Workload* workload : {&glyph48(), &line48(), &title160()}) {
+            cases.push_back(lookCase(look, *workload));
+            cases.push_back(literalLookCase(look, *workload));
+            const std::string row = cases.back().row;
+            const int64_t pixels = cases.back().pixels;
+            cases.push_back(copyCase(row, pixels, 4 * pixels));
+        }
+    }
 }
 
 }  // namespace vorel_bench
