@@ -4,6 +4,7 @@
 #     scripts/bench.sh [--peers] [--quick] [--filter REGEX] [--save FILE] [--compare FILE] [--counts]
 #     scripts/bench.sh --document
 #     scripts/bench.sh --hostile [--document]
+#     scripts/bench.sh --costs [--quick] [--document]
 #
 #     --peers          OpenCV, pixman, cairo, libass and FreeType's stroker on the same masks
 #     --quick          fewer and shorter repetitions
@@ -13,34 +14,45 @@
 #     --counts         instructions instead of time, under callgrind
 #     --document       everything, into docs/benchmarks.md
 #     --hostile        how much longer than text masks take that nothing like text: noise, ramps, halftones
+#     --costs          the table for a reader in a hurry, beside Skia and OpenCV, and looks in pictures of any size
 set -euo pipefail
 invoked=$PWD
 cd "$(dirname "$0")/.."
 . scripts/packages.sh
+. scripts/quietly.sh
 . scripts/figures.sh
+. scripts/skia.sh
 
-peers=OFF times=yes counts='' document='' hostile='' filter='' save='' compare=''
+peers=OFF times=yes counts='' document='' hostile='' costs='' quick='' filter='' save='' compare=''
 sampling=(--benchmark_min_time=0.02 --benchmark_repetitions=15)
 while [[ $# -gt 0 ]]; do
     case $1 in
         --peers) peers=ON ;;
-        --quick) sampling=(--benchmark_min_time=0.01 --benchmark_repetitions=5) ;;
+        --quick) quick=--quick sampling=(--benchmark_min_time=0.01 --benchmark_repetitions=5) ;;
         --counts) counts=yes times='' ;;
         --filter) filter=$2; shift ;;
         --save) save=$(cd "$invoked" && realpath -m "$2"); shift ;;
         --compare) compare=$(cd "$invoked" && realpath -e "$2"); shift ;;
         --document) document=docs/benchmarks.md ;;
         --hostile) hostile=yes ;;
+        --costs) costs=yes ;;
         *) sed -n '2,/^set/{/^#/p}' "scripts/${0##*/}" >&2; exit 2 ;;
     esac
     shift
 done
-[[ -z $document || -n $hostile ]] || peers=ON counts=yes
+[[ -z $document || -n $hostile || -n $costs ]] || peers=ON counts=yes
 
 need_packages cmake ninja-build clang-14 pkg-config libbenchmark-dev libfreetype-dev fonts-dejavu-core python3
 [[ -z $counts ]] || need_packages valgrind
-[[ $peers == OFF ]] ||
+need_peers() {
     need_packages libopencv-core-dev libopencv-imgproc-dev libpixman-1-dev libcairo2-dev libass-dev
+}
+[[ $peers == OFF ]] || need_peers
+# Without one its column is empty.
+if [[ -n $costs ]]; then
+    ! need_peers || peers=ON
+    install_skia build/bench/node || true
+fi
 
 build=build/bench
 cmake --preset bench -DVOREL_BENCH_PEERS="$peers" > /dev/null
@@ -82,6 +94,27 @@ print_all() {
 if [[ -n $hostile ]]; then
     "$build/bench/voreleffect_hostile" ${filter:+"$filter"} | tee "$build/hostile.md"
     [[ -z $document ]] || write_figures 'hostile figures' "$build/hostile.md" "$document"
+    exit
+fi
+
+print_costs() {
+    describe_run clang++-14
+    echo
+    RIVALS_NODE=$build/node python3 -B bench/costs.py --programs "$build/bench" $quick
+}
+
+print_growing() {
+    describe_run clang++-14
+    echo
+    "$build/bench/voreleffect_growing"
+}
+
+if [[ -n $costs ]]; then
+    print_costs | tee "$build/costs.md"
+    [[ -z $document ]] || write_figures costs "$build/costs.md" "$document"
+    [[ -z $quick ]] || exit 0
+    print_growing | tee "$build/growing.md"
+    [[ -z $document ]] || write_figures 'growing figures' "$build/growing.md" "$document"
     exit
 fi
 
