@@ -6,7 +6,7 @@
 //
 // Each look gets SECONDS on a picture. Glyphs stay in Skia's caches from call to call.
 import { readFileSync, writeFileSync } from "node:fs";
-import { argv } from "node:process";
+import process, { argv } from "node:process";
 import { castShadow, createCanvas, GlobalFonts, printVersion } from "./skia.mjs";
 
 const tileSide = 32;
@@ -124,15 +124,27 @@ function paint(page, look) {
     page.finish();
 }
 
+/** In seconds; for calls from a millisecond on the processor's time, which stops when another process has the core. */
+function clockFor(fastest) {
+    if (fastest < 1e-3) {
+        return () => performance.now() / 1e3;
+    }
+    return () => {
+        const { user, system } = process.cpuUsage();
+        return (user + system) / 1e6;
+    };
+}
+
 /** The seconds of the fastest call; the first one, which fills the caches, does not count. */
 function fastestCall(page, look, seconds) {
     paint(page, look);
     let fastest = Infinity;
     let taken = 0;
     for (let calls = 0; calls < 3 || taken < seconds; calls++) {
-        const before = performance.now();
+        const now = clockFor(calls > 0 ? fastest : 0);
+        const before = now();
         paint(page, look);
-        const call = (performance.now() - before) / 1000;
+        const call = now() - before;
         taken += call;
         fastest = Math.min(fastest, call);
     }
