@@ -23,6 +23,7 @@ Case copyCase(const std::string& row, int64_t pixels, int64_t bytes) {
 
 #ifndef VOREL_BENCH_PEERS
 void addPeerCases(Cases&) {}
+void addLookPeers(Cases&, const Workload&) {}
 #endif
 
 Cases allCases() {

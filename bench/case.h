@@ -56,11 +56,16 @@ Case copyCase(const std::string& row, int64_t pixels, int64_t bytes);
 
 struct Workload;
 
-/// Pixels on each side of a workload in the pictures of looks.
+constexpr char kLooks[] = {'A', 'B', 'C', 'D'};
+/// Clear pixels on each side of a workload that wears a look.
 constexpr int kLookMargin = 40;
 
-/// The library paints look A, B, C or D on a workload, which must outlive the case.
+/// The library paints a look on a workload, which must outlive the case.
 Case lookCase(char look, const Workload& workload);
+/// The literal form does.
+Case literalLookCase(char look, const Workload& workload);
+/// Other programs do what the looks need at least; nothing in a build without peers.
+void addLookPeers(Cases& cases, const Workload& workload);
 
 /// The sizes that strokes, shadows and glows are measured at.
 constexpr int kRadii[] = {1, 2, 4, 8, 16, 32, 64, 100};

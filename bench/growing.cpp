@@ -1,7 +1,6 @@
 #include <malloc.h>
 
 #include <algorithm>
-#include <chrono>
 #include <cmath>
 #include <cstdio>
 #include <limits>
@@ -11,6 +10,7 @@
 #include <vector>
 
 #include "case.h"
+#include "fastest_call.h"
 #include "hostile_masks.h"
 #include "level.h"
 
@@ -21,7 +21,6 @@
 namespace {
 
 using namespace vorel_bench;
-using Clock = std::chrono::steady_clock;
 
 constexpr int kSides[] = {180, 500, 1000, 2000, 4000, 8000};
 constexpr double kTextShare = 1.0 / 3.0;
@@ -37,21 +36,9 @@ Workload pictureOf(int side) {
 }
 
 /// Nanoseconds a pixel of the fastest call.
-double fastestCall(const Case& which) {
-    constexpr int kFewestCalls = 3;
-    constexpr double kSeconds = 0.1;
+double nanosecondsAPixel(const Case& which) {
     const std::unique_ptr<Job> job = which.make();
-    double fastest = std::numeric_limits<double>::infinity();
-    double taken = 0;
-    for (int calls = 0; calls < kFewestCalls || taken < kSeconds; ++calls) {
-        job->reset();
-        const Clock::time_point before = Clock::now();
-        job->paint();
-        const double seconds = std::chrono::duration<double>(Clock::now() - before).count();
-        taken += seconds;
-        fastest = std::min(fastest, seconds);
-    }
-    return fastest * 1e9 / static_cast<double>(which.pixels);
+    return fastestCall(*job, 0.1) * 1e9 / static_cast<double>(which.pixels);
 }
 
 }  // namespace
@@ -71,14 +58,14 @@ int main() {
     std::vector<Workload> pictures;
     for (const int side : kSides)
         pictures.push_back(pictureOf(side));
-    for (const char look : {'A', 'B', 'C', 'D'}) {
+    for (const char look : kLooks) {
         for (const Level& level : levels()) {
             level.choose();
             std::printf("| look/%c | %-7s |", look, level.label.c_str());
             double smallest = std::numeric_limits<double>::infinity();
             double largest = 0;
             for (const Workload& picture : pictures) {
-                const double taken = fastestCall(lookCase(look, picture));
+                const double taken = nanosecondsAPixel(lookCase(look, picture));
                 smallest = std::min(smallest, taken);
                 largest = std::max(largest, taken);
                 std::printf(" %6.3f |", taken);

@@ -1,7 +1,6 @@
 #include <malloc.h>
 
 #include <algorithm>
-#include <chrono>
 #include <cstdio>
 #include <cstdlib>
 #include <limits>
@@ -11,6 +10,7 @@
 #include <vector>
 
 #include "core_jobs.h"
+#include "fastest_call.h"
 #include "fill_paint.h"
 #include "hostile_masks.h"
 #include "level.h"
@@ -27,7 +27,6 @@ namespace {
 
 using namespace vorel_bench;
 using namespace VFontEffect;
-using Clock = std::chrono::steady_clock;
 
 struct Effect {
     std::string name;
@@ -96,21 +95,9 @@ std::vector<Effect> allEffects() {
 }
 
 /// Nanoseconds a pixel of the fastest call.
-double fastestCall(const Effect& effect, const Workload& mask) {
-    constexpr int kFewestCalls = 3;
-    constexpr double kSeconds = 0.01;
+double nanosecondsAPixel(const Effect& effect, const Workload& mask) {
     CoreJob job(&mask, effect.reach, effect.makeCore);
-    double fastest = std::numeric_limits<double>::infinity();
-    double taken = 0;
-    for (int calls = 0; calls < kFewestCalls || taken < kSeconds; ++calls) {
-        job.reset();
-        const Clock::time_point before = Clock::now();
-        job.paint();
-        const double seconds = std::chrono::duration<double>(Clock::now() - before).count();
-        taken += seconds;
-        fastest = std::min(fastest, seconds);
-    }
-    return fastest * 1e9 / static_cast<double>(mask.grownPixels(effect.reach));
+    return fastestCall(job, 0.01) * 1e9 / static_cast<double>(mask.grownPixels(effect.reach));
 }
 
 void printRow(const std::string& effect, const Level& level, double text, double slowest,
@@ -123,12 +110,12 @@ void printRow(const std::string& effect, const Level& level, double text, double
 void measure(const Effect& effect, const Level& level, const Workload& page,
              const std::vector<Workload>& masks, const std::string& each) {
     level.choose();
-    const double text = fastestCall(effect, page);
+    const double text = nanosecondsAPixel(effect, page);
     double slowest = 0;
     const Workload* which = nullptr;
     for (const Workload& mask : masks) {
         if (!std::regex_search(mask.name, std::regex(each))) continue;
-        const double taken = fastestCall(effect, mask);
+        const double taken = nanosecondsAPixel(effect, mask);
         if (!each.empty()) printRow(effect.name, level, text, taken, mask.name);
         if (taken <= slowest) continue;
         slowest = taken;

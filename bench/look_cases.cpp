@@ -151,41 +151,47 @@ class LiteralLookJob : public Job {
     literal::Picture mLayer;
 };
 
-Describe<VFEffect> describing(char look) {
+template <class Set>
+Describe<Set> describing(char look) {
     switch (look) {
         case 'A':
-            return lookA<VFEffect>;
+            return lookA<Set>;
         case 'B':
-            return lookB<VFEffect>;
+            return lookB<Set>;
         case 'C':
-            return lookC<VFEffect>;
+            return lookC<Set>;
         default:
-            return lookD<VFEffect>;
+            return lookD<Set>;
     }
 }
 
-void addLook(Cases& cases, char look, Describe<literal::Engine> literally) {
-    for (const Workload* workload : {&glyph48(), &line48(), &title160()}) {
-        cases.push_back(lookCase(look, *workload));
-        const std::string row = cases.back().row;
-        const int64_t pixels = cases.back().pixels;
-        cases.push_back(caseOf<LiteralLookJob>(row, kLiteral, pixels, workload, literally));
-        cases.push_back(copyCase(row, pixels, 4 * pixels));
-    }
+/// The look in a picture whose margins count as well.
+template <class LookJobType, class Set>
+Case lookCaseBy(const char* maker, char look, const Workload& workload) {
+    return caseOf<LookJobType>(std::string("look/") + look + "/" + workload.name, maker,
+                               workload.grownPixels(kLookMargin), &workload, describing<Set>(look));
 }
 
 }  // namespace
 
 Case lookCase(char look, const Workload& workload) {
-    return caseOf<LookJob>(std::string("look/") + look + "/" + workload.name, kOurs,
-                           workload.grownPixels(kLookMargin), &workload, describing(look));
+    return lookCaseBy<LookJob, VFEffect>(kOurs, look, workload);
+}
+
+Case literalLookCase(char look, const Workload& workload) {
+    return lookCaseBy<LiteralLookJob, literal::Engine>(kLiteral, look, workload);
 }
 
 void addLookCases(Cases& cases) {
-    addLook(cases, 'A', lookA<literal::Engine>);
-    addLook(cases, 'B', lookB<literal::Engine>);
-    addLook(cases, 'C', lookC<literal::Engine>);
-    addLook(cases, 'D', lookD<literal::Engine>);
+    for (const char look : kLooks) {
+        for (const Workload* workload : {&glyph48(), &line48(), &title160()}) {
+            cases.push_back(lookCase(look, *workload));
+            cases.push_back(literalLookCase(look, *workload));
+            const std::string row = cases.back().row;
+            const int64_t pixels = cases.back().pixels;
+            cases.push_back(copyCase(row, pixels, 4 * pixels));
+        }
+    }
 }
 
 }  // namespace vorel_bench

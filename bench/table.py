@@ -58,10 +58,9 @@ def number(value):
     return f"{value:.1f}" if value >= 10 else f"{value:.3f}"
 
 
-def print_table(title, head, lines):
+def print_table(head, lines):
     widths = [max(len(line[i]) for line in [head] + lines) for i in range(len(head))]
     rule = ["-" * (widths[0])] + ["-" * (width - 1) + ":" for width in widths[1:]]
-    print(f"\n### {title}\n")
     for line in [head, rule] + lines:
         first = line[0].ljust(widths[0])
         print("| " + " | ".join([first] + [cell.rjust(w) for cell, w in zip(line[1:], widths[1:])]) + " |")
@@ -86,7 +85,8 @@ def print_subject(subject, rows, run, saved):
         if saved:
             line += [change(run.fastest(row, level), saved.fastest(row, level)) for level in levels]
         lines.append(line)
-    print_table(subject, head, lines)
+    print(f"\n### {subject}\n")
+    print_table(head, lines)
 
 
 def ratio(above, below):
@@ -125,7 +125,8 @@ def print_goals(run):
             lines.append([goal["row"], level, said, number(value), "yes" if met else "no"])
     if lines:
         met = sum(line[-1] == "yes" for line in lines)
-        print_table(f"Goals: {met} of {len(lines)} met", ["row", "level", "goal", "figure", "met"], lines)
+        print(f"\n### Goals: {met} of {len(lines)} met\n")
+        print_table(["row", "level", "goal", "figure", "met"], lines)
 
 
 def main():

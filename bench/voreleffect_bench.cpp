@@ -3,7 +3,6 @@
 #include <algorithm>
 #include <cstdio>
 #include <cstring>
-#include <ctime>
 #include <limits>
 #include <memory>
 #include <regex>
@@ -11,6 +10,7 @@
 #include <vector>
 
 #include "case.h"
+#include "fastest_call.h"
 #include "level.h"
 
 /// Times every case; see docs/benchmarks.md.
@@ -20,11 +20,6 @@
 namespace {
 
 using namespace vorel_bench;
-double now(clockid_t clock) {
-    timespec time = {};
-    clock_gettime(clock, &time);
-    return static_cast<double>(time.tv_sec) + static_cast<double>(time.tv_nsec) * 1e-9;
-}
 
 /// What a benchmark remembers from repetition to repetition.
 struct Memory {
@@ -34,16 +29,12 @@ struct Memory {
 
     /// What takes seconds is sampled seldom: past these budgets a case is not painted again.
     bool usedUp() const { return inCalls > 1.5 || inAll > 8.0; }
-
-    /// A thread's own clock stops when another process has the core, but reading it takes a system call
-    /// that a short call would feel.
-    clockid_t clock() const { return fastest > 1e-3 ? CLOCK_THREAD_CPUTIME_ID : CLOCK_MONOTONIC; }
 };
 
 /// The seconds of one call. The refill of the destination is not part of them.
 double timedCall(Job& job, Memory& memory) {
     job.reset();
-    const clockid_t clock = memory.clock();
+    const clockid_t clock = clockFor(memory.fastest);
     const double before = now(clock);
     job.paint();
     const double after = now(clock);

@@ -29,19 +29,6 @@ void cropToExtents(Workload& workload) {
     workload.height = bottom - top;
 }
 
-void mergeGlyphs(Workload& workload) {
-    workload.mask.assign(static_cast<size_t>(workload.width) * static_cast<size_t>(workload.height), 0);
-    for (const Glyph& glyph : workload.glyphs) {
-        for (int y = 0; y < glyph.height; ++y) {
-            for (int x = 0; x < glyph.width; ++x) {
-                uint8_t& target =
-                    workload.mask[static_cast<size_t>((glyph.y + y) * workload.width + glyph.x + x)];
-                target = std::max(target, glyph.coverage[static_cast<size_t>(y * glyph.width + x)]);
-            }
-        }
-    }
-}
-
 Workload textLine(const char* name, const char* text, const char* font, int sizePx) {
     Workload workload;
     workload.name = name;
@@ -67,6 +54,19 @@ Workload uniformNoise() {
 }
 
 }  // namespace
+
+void mergeGlyphs(Workload& workload) {
+    workload.mask.assign(static_cast<size_t>(workload.width) * static_cast<size_t>(workload.height), 0);
+    for (const Glyph& glyph : workload.glyphs) {
+        for (int y = 0; y < glyph.height; ++y) {
+            for (int x = 0; x < glyph.width; ++x) {
+                uint8_t& target =
+                    workload.mask[static_cast<size_t>((glyph.y + y) * workload.width + glyph.x + x)];
+                target = std::max(target, glyph.coverage[static_cast<size_t>(y * glyph.width + x)]);
+            }
+        }
+    }
+}
 
 const Workload& line48() {
     static const Workload workload = textLine("LINE48", "Summer Sale: 50% Off Everything!", kSans, 48);

@@ -32,6 +32,9 @@ struct Workload {
     }
 };
 
+/// Makes the mask of the glyphs.
+void mergeGlyphs(Workload& workload);
+
 const Workload& line48();    ///< "Summer Sale: 50% Off Everything!" at 48 pixels
 const Workload& title160();  ///< "Typefaces", bold, at 160 pixels
 const Workload& glyph48();   ///< "R" at 48 pixels

@@ -3,6 +3,7 @@
 #
 #     scripts/bench.sh [--peers] [--quick] [--filter REGEX] [--save FILE] [--compare FILE] [--counts]
 #     scripts/bench.sh --document
+#     scripts/bench.sh --costs [--quick] [--document]
 #     scripts/bench.sh --hostile [--document]
 #     scripts/bench.sh --growing [--document]
 #
@@ -14,25 +15,28 @@
 #     --counts         instructions instead of time, under callgrind
 #     --document       everything, into docs/benchmarks.md
 #     --hostile        how many times as long as text masks take that are nothing like it: noise, ramps ...
+#     --costs          the table for a reader in a hurry, beside Skia and OpenCV
 #     --growing        what a pixel of a look takes in small and in large pictures
 set -euo pipefail
 invoked=$PWD
 cd "$(dirname "$0")/.."
 . scripts/packages.sh
+. scripts/quietly.sh
 . scripts/figures.sh
+. scripts/skia.sh
 
-peers=OFF times=yes counts='' document='' alone='' filter='' save='' compare=''
+peers=OFF times=yes counts='' document='' alone='' quick='' filter='' save='' compare=''
 sampling=(--benchmark_min_time=0.02 --benchmark_repetitions=15)
 while [[ $# -gt 0 ]]; do
     case $1 in
         --peers) peers=ON ;;
-        --quick) sampling=(--benchmark_min_time=0.01 --benchmark_repetitions=5) ;;
+        --quick) quick=--quick sampling=(--benchmark_min_time=0.01 --benchmark_repetitions=5) ;;
         --counts) counts=yes times='' ;;
         --filter) filter=$2; shift ;;
         --save) save=$(cd "$invoked" && realpath -m "$2"); shift ;;
         --compare) compare=$(cd "$invoked" && realpath -e "$2"); shift ;;
         --document) document=docs/benchmarks.md ;;
-        --hostile | --growing) alone=${1#--} ;;
+        --costs | --hostile | --growing) alone=${1#--} ;;
         *) sed -n '2,/^set/{/^#/p}' "scripts/${0##*/}" >&2; exit 2 ;;
     esac
     shift
@@ -41,8 +45,15 @@ done
 
 need_packages cmake ninja-build clang-14 pkg-config libbenchmark-dev libfreetype-dev fonts-dejavu-core python3
 [[ -z $counts ]] || need_packages valgrind
-[[ $peers == OFF ]] ||
+need_peers() {
     need_packages libopencv-core-dev libopencv-imgproc-dev libpixman-1-dev libcairo2-dev libass-dev
+}
+[[ $peers == OFF ]] || need_peers
+# Without one its column is empty.
+if [[ $alone == costs ]]; then
+    ! need_peers || peers=ON
+    install_skia build/bench/node || true
+fi
 
 build=build/bench
 cmake --preset bench -DVOREL_BENCH_PEERS="$peers" > /dev/null
@@ -81,12 +92,18 @@ print_all() {
     [[ -z $counts ]] || print_counts
 }
 
-if [[ -n $alone ]]; then
-    {
-        describe_run clang++-14
-        echo
+print_alone() {
+    describe_run clang++-14
+    echo
+    if [[ $alone == costs ]]; then
+        RIVALS_NODE=$build/node python3 -B bench/costs.py --programs "$build/bench" $quick
+    else
         "$build/bench/voreleffect_$alone" ${filter:+"$filter"}
-    } | tee "$build/$alone.md"
+    fi
+}
+
+if [[ -n $alone ]]; then
+    print_alone | tee "$build/$alone.md"
     [[ -z $document ]] || write_figures "$alone figures" "$build/$alone.md" "$document"
     exit
 fi

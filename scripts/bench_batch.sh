@@ -13,6 +13,7 @@ cd "$(dirname "$0")/.."
 . scripts/packages.sh
 . scripts/quietly.sh
 . scripts/figures.sh
+. scripts/skia.sh
 
 quick='' against='' tool='' document=''
 while [[ $# -gt 0 ]]; do
@@ -27,8 +28,6 @@ while [[ $# -gt 0 ]]; do
 done
 
 build=build/bench_batch
-canvas=@napi-rs/canvas@1.1.1
-mkdir -p "$build/node"
 
 # build_tool SOURCE FOLDER
 build_tool() {
@@ -49,8 +48,7 @@ extract() {
 install_rivals() {
     local package
     for package in imagemagick librsvg2-bin; do need_packages "$package" || true; done
-    command -v npm > /dev/null || need_packages nodejs npm || return 0
-    quietly npm install --prefix "$build/node" --no-audit --no-fund "$canvas" || true
+    install_skia "$build/node" || true
 }
 
 need_packages cmake ninja-build g++ pkg-config libfreetype-dev libharfbuzz-dev libfribidi-dev \

@@ -64,10 +64,10 @@ void addFilters(Cases& cases, const Workload& workload, int radius) {
                                       blur(radius)));
 }
 
-/// The filters alone that the looks A and C need: a bound, not the looks.
-void addLookFilters(Cases& cases, const Workload& workload) {
-    constexpr int kMargin = 40;
-    const int64_t pixels = workload.grownPixels(kMargin);
+}  // namespace
+
+void addOpencvLookFilters(Cases& cases, const Workload& workload) {
+    const int64_t pixels = workload.grownPixels(kLookMargin);
     const OpencvJob::Filter lookA = [stroke = dilation(4), shadow = blur(8)](const cv::Mat& mask,
                                                                              cv::Mat& result) {
         stroke(mask, result);
@@ -81,19 +81,17 @@ void addLookFilters(Cases& cases, const Workload& workload) {
         cv::subtract(result, inner, result);
         shadow(mask, result);
     };
-    cases.push_back(
-        caseOf<OpencvJob>("look/A/" + workload.name, kOpencv, pixels, &workload, kMargin, false, lookA));
-    cases.push_back(
-        caseOf<OpencvJob>("look/C/" + workload.name, kOpencv, pixels, &workload, kMargin, false, lookC));
+    cases.push_back(caseOf<OpencvJob>("look/A/" + workload.name, kOpencv, pixels, &workload, kLookMargin,
+                                      false, lookA));
+    cases.push_back(caseOf<OpencvJob>("look/C/" + workload.name, kOpencv, pixels, &workload, kLookMargin,
+                                      false, lookC));
 }
-
-}  // namespace
 
 void addOpencvCases(Cases& cases) {
     for (const Workload* workload : {&line48(), &title160()}) {
         for (const int radius : kRadii)
             addFilters(cases, *workload, radius);
-        addLookFilters(cases, *workload);
+        addOpencvLookFilters(cases, *workload);
     }
 }
 

@@ -10,4 +10,8 @@ void addPeerCases(Cases& cases) {
     addFreetypeCases(cases);
 }
 
+void addLookPeers(Cases& cases, const Workload& workload) {
+    addOpencvLookFilters(cases, workload);
+}
+
 }  // namespace vorel_bench

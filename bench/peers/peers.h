@@ -7,6 +7,8 @@
 namespace vorel_bench {
 
 void addOpencvCases(Cases& cases);
+/// The filters alone that the looks A and C need: a bound, not the looks.
+void addOpencvLookFilters(Cases& cases, const Workload& workload);
 void addPixmanCases(Cases& cases);
 void addCairoCases(Cases& cases);
 void addLibassCases(Cases& cases);

@@ -3,15 +3,11 @@
 //     skia_titles.mjs shadow|gradient|glow TITLES FOLDER JOBS
 //     skia_titles.mjs --version
 //
-// RIVALS_NODE is the folder that the package is installed in. A thread has one canvas for all pictures.
+// A thread has one canvas for all pictures.
 import { readFileSync, writeFileSync } from "node:fs";
-import { createRequire } from "node:module";
-import { resolve } from "node:path";
-import { argv, env } from "node:process";
+import { argv } from "node:process";
 import { isMainThread, Worker, workerData } from "node:worker_threads";
-
-const require = createRequire(resolve(env.RIVALS_NODE, "package.json"));
-const { createCanvas, GlobalFonts } = require("@napi-rs/canvas");
+import { castShadow, createCanvas, GlobalFonts, printVersion } from "./skia.mjs";
 
 const width = 1500;
 const height = 130;
@@ -26,13 +22,6 @@ function drawOutline(context, text, colour, lineWidth) {
     context.strokeStyle = colour;
     context.lineWidth = lineWidth;
     context.strokeText(text, ...centre);
-}
-
-/** What is drawn next throws a shadow; twice the sigma of the blur is its size. */
-function castShadow(context, colour, size, distance) {
-    context.shadowColor = colour;
-    context.shadowBlur = size;
-    context.shadowOffsetX = context.shadowOffsetY = distance;
 }
 
 const looks = {
@@ -72,8 +61,7 @@ function paintShare({ look, titles, folder, share, jobs }) {
 
 function main() {
     if (argv[2] === "--version") {
-        const { version } = require("@napi-rs/canvas/package.json");
-        console.log(`Skia by napi-rs canvas ${version}`);
+        printVersion();
         return;
     }
     const [look, file, folder] = argv.slice(2);
