@@ -14,9 +14,13 @@ need_packages() {
         echo "missing packages: ${missing[*]} (install them, or run this as root)" >&2
         return 1
     fi
-    apt-get -qq update >/dev/null &&
-        DEBIAN_FRONTEND=noninteractive apt-get -qq -y --no-install-recommends \
-            install "${missing[@]}" >/dev/null && return 0
+    # One script at a time: they may run side by side.
+    (
+        flock 9
+        apt-get -qq update >/dev/null &&
+            DEBIAN_FRONTEND=noninteractive apt-get -qq -y --no-install-recommends \
+                install "${missing[@]}" >/dev/null
+    ) 9> "${TMPDIR:-/tmp}/voreleffect-packages.lock" && return 0
     echo "could not install: ${missing[*]}" >&2
     return 1
 }
