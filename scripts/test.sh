@@ -4,7 +4,8 @@
 #
 #     scripts/test.sh              all three builds
 #     scripts/test.sh quick        the unit tests of the g++ Release build alone, an eighth of the random cases
-#     scripts/test.sh release      one of them: release, sanitize, arm64; dev, or libcxx (clang, libc++)
+#     scripts/test.sh release      one of them: release, sanitize, arm64; dev; or the library's tests alone by
+#                                  libcxx (clang, libc++)
 set -euo pipefail
 cd "$(dirname "$0")/.."
 . scripts/packages.sh
@@ -25,13 +26,19 @@ for preset in "${presets[@]}"; do
     TIMEFORMAT="== $preset: %U s user, %S s system, %R s on the clock"
     time {
         labels=()
-        target=all
-        if [[ $preset == quick ]]; then
-            preset=release target=unit_tests labels=(--label-regex '^unit$')
-            export VOREL_THINNED=8
-        fi
+        targets=(all)
+        case $preset in
+            quick)
+                preset=release targets=(unit_tests) labels=(--label-regex '^unit$')
+                export VOREL_THINNED=8
+                ;;
+            libcxx)
+                targets=(unit_tests reliability_allocation_tests)
+                labels=(--label-regex '^(unit|memory)$')
+                ;;
+        esac
         cmake --preset "$preset" > /dev/null
-        cmake --build --preset "$preset" --target "$target" -- --quiet
+        cmake --build --preset "$preset" --target "${targets[@]}" -- --quiet
         ctest --preset "$preset" --parallel "$(nproc)" --progress "${labels[@]}"
     }
 done
