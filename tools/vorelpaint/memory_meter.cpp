@@ -57,10 +57,12 @@ bool MemoryMeter::works() {
 extern "C" {
 
 // The C library's own allocator, beneath the functions that are defined here.
+// NOLINTBEGIN(readability-identifier-naming)
 void* __libc_malloc(size_t size) noexcept;
 void* __libc_calloc(size_t count, size_t size) noexcept;
 void* __libc_realloc(void* block, size_t size) noexcept;
 void __libc_free(void* block) noexcept;
+// NOLINTEND(readability-identifier-naming)
 
 }  // extern "C"
 
