@@ -93,7 +93,7 @@ def test_a_process_that_is_killed_takes_its_jobs_along_and_no_others():
 
 def test_other_threads_run_while_it_paints():
     painter = ve.Painter(ve.Look().outer_glow(90, "#fff").stroke(90, "#f00"))
-    mask = np.full((1500, 1500), 255, np.uint8)
+    mask = np.random.default_rng(1).integers(0, 256, (2500, 2500), np.uint8)
     done = threading.Event()
 
     def paint():
