@@ -91,9 +91,14 @@ def test_a_process_that_is_killed_takes_its_jobs_along_and_no_others():
             assert np.array_equal(each.array, ve.text_picture(f"{index}", size=200, look="gold").array)
 
 
+def slow_mask():
+    """Noise, so large that others see it being painted."""
+    return np.random.default_rng(1).integers(0, 256, (2500, 2500), np.uint8)
+
+
 def test_other_threads_run_while_it_paints():
     painter = ve.Painter(ve.Look().outer_glow(90, "#fff").stroke(90, "#f00"))
-    mask = np.random.default_rng(1).integers(0, 256, (2500, 2500), np.uint8)
+    mask = slow_mask()
     done = threading.Event()
 
     def paint():
@@ -169,7 +174,7 @@ def test_a_forked_child_paints():
 
 def test_a_forked_child_paints_with_a_painter_that_another_thread_holds():
     painter = ve.Painter(ve.Look().outer_glow(90, "#fff").stroke(90, "#f00"))
-    small, large = np.full((4, 4), 255, np.uint8), np.full((1500, 1500), 255, np.uint8)
+    small, large = np.full((4, 4), 255, np.uint8), slow_mask()
     expected = painter.paint(small).array
     thread = threading.Thread(target=painter.paint, args=(large,))
     thread.start()
