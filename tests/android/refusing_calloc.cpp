@@ -5,7 +5,7 @@
 
 /// Loaded before everything else, this refuses the layers of two sizes that only the tests of refused
 /// memory paint: the mask of 211 x 199 pixels, the outer layer of 197 x 223. And once, after a pattern
-/// of 1009 pixels, an object of nine pointers: the list of a look with every effect.
+/// of 1009 pixels, an object of thirteen pointers: a look's list, which has room for each type of effect.
 
 namespace {
 
@@ -28,7 +28,7 @@ void* calloc(size_t count, size_t size) noexcept {
 }
 
 void* operator new(size_t size) {
-    const bool refused = size == 9 * sizeof(void*) && std::exchange(gRefusesList, false);
+    const bool refused = size == 13 * sizeof(void*) && std::exchange(gRefusesList, false);
     void* const block = refused ? nullptr : std::malloc(size);
     if (block == nullptr) throw std::bad_alloc();
     return block;

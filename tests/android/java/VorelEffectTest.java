@@ -408,14 +408,13 @@ public final class VorelEffectTest extends Checks {
         }
     }
 
-    /** refusing_calloc.cpp refuses the next list of nine effects after a pattern of 1009 pixels. */
-    void testListOfEffectsThatCannotGrowIsReported() {
+    /** refusing_calloc.cpp refuses the next list of effects after a pattern of 1009 pixels. */
+    void testListOfEffectsThatCannotBeMadeIsReported() {
         for (boolean withKey : new boolean[] {false, true}) {
-            try (VorelEffect look = new VorelEffect()) {
-                describeEverything(look);
-                look.addRadialGradientText(1, 1, COLORS, OPACITIES, LOCATIONS);
-                look.addPatternText(new int[1009], 1009, 1, 1, 1);
+            try (VorelEffect other = everything();
+                    VorelEffect look = new VorelEffect()) {
                 byte[] key = look.getMapKey();
+                other.addPatternText(new int[1009], 1009, 1, 1, 1);
                 expect(
                         OutOfMemoryError.class,
                         () -> {
