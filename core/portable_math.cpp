@@ -102,7 +102,11 @@ float portableExp(float x) {
 
 // Whole quarter turns are taken away, which leaves -pi/4..pi/4, then turned back.
 Turn portableTurn(float radians) {
-    if (!isReducible(radians)) return {std::sin(radians), std::cos(radians), std::tan(radians)};
+    if (!isReducible(radians)) {
+        // Read anew for each: compilers would ask the C library for sine and cosine at once.
+        const volatile float angle = radians;
+        return {std::sin(angle), std::cos(angle), std::tan(angle)};
+    }
     const int32_t quarters = nearestWhole(radians * kTwoOverPi);
     const double r = (radians - quarters * kHalfPiHigh) - quarters * kHalfPiLow;
     const double sine = r * polynomial(r * r, kSineSeries);
