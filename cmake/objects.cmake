@@ -21,7 +21,7 @@ function(vorel_objects target)
   endif()
   # Nothing takes the place of the library's own functions, and linkers may fold them.
   target_compile_options(${target} PRIVATE
-    -fno-semantic-interposition -ffunction-sections -fdata-sections)
+    $<$<NOT:$<BOOL:${VOREL_FOR_WASM}>>:-fno-semantic-interposition> -ffunction-sections -fdata-sections)
   # Beyond this level compilers unroll loops that are vectors already: half the size again, no speed.
   target_compile_options(${target} PRIVATE $<$<CONFIG:Release>:-O2>)
   if(VOREL_ASSERTIONS)
