@@ -5,7 +5,8 @@
 
 /// Loaded before everything else, this refuses the layers of two sizes that only the tests of refused
 /// memory paint: the mask of 211 x 199 pixels, the outer layer of 197 x 223. And once, after a pattern
-/// of 1009 pixels, an object of thirteen pointers: a look's list, which has room for each type of effect.
+/// of 1009 pixels, an object of thirteen pointers: a look's list, which has room for each type of
+/// effect.
 
 namespace {
 
