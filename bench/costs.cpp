@@ -11,10 +11,10 @@
 
 /// What looks take on a glyph, a line, a title and a poster; see bench/costs.py.
 ///
-///     voreleffect_costs SECONDS      a line a figure: row, maker, seconds of the fastest call. Each
-///     maker
-///                                    gets SECONDS for a row.
+///     voreleffect_costs SECONDS      a line a figure: row, maker, seconds of the fastest call
 ///     voreleffect_costs --pictures   the texts of the pictures and their places, as JSON
+///
+/// Each maker gets SECONDS for a row.
 namespace {
 
 using namespace vorel_bench;

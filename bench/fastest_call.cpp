@@ -1,5 +1,7 @@
 #include "fastest_call.h"
 
+#include <malloc.h>
+
 #include <algorithm>
 #include <limits>
 
@@ -30,6 +32,12 @@ double fastestCall(Job& job, double seconds) {
         fastest = std::min(fastest, call);
     }
     return fastest;
+}
+
+void keepLargeBlocks() {
+    constexpr int kNeverReached = 1 << 30;
+    mallopt(M_MMAP_THRESHOLD, kNeverReached);
+    mallopt(M_TRIM_THRESHOLD, kNeverReached);
 }
 
 }  // namespace vorel_bench

@@ -17,4 +17,9 @@ clockid_t clockFor(double fastest);
 /// `seconds`, at least three times, but what takes more than a second only once.
 double fastestCall(Job& job, double seconds);
 
+/// From now on large blocks of memory stay with the process. Those that come from the system anew for
+/// each call take longer than many an effect, page by page, and are their caller's choice of an
+/// allocator.
+void keepLargeBlocks();
+
 }  // namespace vorel_bench

@@ -1,5 +1,3 @@
-#include <malloc.h>
-
 #include <algorithm>
 #include <cmath>
 #include <cstdio>
@@ -44,10 +42,7 @@ double nanosecondsAPixel(const Case& which) {
 }  // namespace
 
 int main() {
-    // The layers of a large picture come from the system anew for each call, which takes longer than
-    // many an effect, and is its caller's choice of an allocator: kept ones are measured.
-    mallopt(M_MMAP_THRESHOLD, 1 << 30);
-    mallopt(M_TRIM_THRESHOLD, 1 << 30);
+    keepLargeBlocks();
     std::printf("| ns/px  | level   |");
     for (const int side : kSides)
         std::printf(" %6d |", side);

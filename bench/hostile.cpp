@@ -1,5 +1,3 @@
-#include <malloc.h>
-
 #include <algorithm>
 #include <cstdio>
 #include <cstdlib>
@@ -127,10 +125,7 @@ void measure(const Effect& effect, const Level& level, const Workload& page,
 }  // namespace
 
 int main(int argc, char** argv) {
-    // Of large blocks, which come from the system anew for each call, a call would mostly take their
-    // pages.
-    mallopt(M_MMAP_THRESHOLD, 1 << 30);
-    mallopt(M_TRIM_THRESHOLD, 1 << 30);
+    keepLargeBlocks();
     int side = 512;
     std::string each;
     std::string wanted = ".";
