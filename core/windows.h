@@ -29,6 +29,52 @@ struct Windows {
     }
 };
 
+/// A walk through all windows of a part, that can rest after any band of rows, or, where windows lie
+/// side by side, after any row of them.
+class WindowWalk {
+  public:
+    explicit WindowWalk(const Windows& windows) : mWindows(windows), mNext(windows.part.top) {}
+
+    /// Goes on with all that ends above a row. `bands` has begin(window), bandRows() and paint(band),
+    /// the box of the window's next so many rows or of what is left of it. Returns the row above which
+    /// nothing is left.
+    template <class Bands>
+    int64_t goAbove(int64_t limit, Bands bands) {
+        const Box& part = mWindows.part;
+        while (mNext < std::min(limit, part.bottom)) {
+            const int64_t top = mNext - (mNext - part.top) % mWindows.height;
+            const int64_t bottom = std::min(top + mWindows.height, part.bottom);
+            if (mWindows.areCutAcross()) {
+                if (bottom > limit) return mNext;
+                for (int64_t x = part.left; x < part.right; x += mWindows.width) {
+                    bands.begin(Box{x, top, std::min(x + mWindows.width, part.right), bottom});
+                    for (mNext = top; mNext < bottom;)
+                        paintBand(x, std::min(x + mWindows.width, part.right), bottom, bands);
+                }
+            } else {
+                if (!mIsInWindow) bands.begin(Box{part.left, top, part.right, bottom});
+                mIsInWindow = true;
+                if (std::min(mNext + bands.bandRows(), bottom) > limit) return mNext;
+                paintBand(part.left, part.right, bottom, bands);
+                mIsInWindow = mNext < bottom;
+            }
+        }
+        return limit;
+    }
+
+  private:
+    template <class Bands>
+    void paintBand(int64_t left, int64_t right, int64_t bottom, Bands& bands) {
+        const int64_t end = std::min(mNext + bands.bandRows(), bottom);
+        bands.paint(Box{left, mNext, right, end});
+        mNext = end;
+    }
+
+    Windows mWindows;
+    int64_t mNext;             ///< the first row that is left
+    bool mIsInWindow = false;  ///< some of whose rows are done
+};
+
 /// An effect takes about so much working memory at most, whatever the size of its picture.
 constexpr int64_t kWorkingBytes = 3'900'000;
 

@@ -1,9 +1,18 @@
 #pragma once
 
 #include <cstdint>
+#include <optional>
 
+#include "core/box.h"
 #include "core/strict_math.h"
 #include "core/windows.h"
+#include "cores/paint_input.h"
+#include "cores/placed_target.h"
+#include "cores/row_painter.h"
+#include "ops/blur/blur_plan.h"
+#include "ops/grow/growth_plan.h"
+#include "ops/ramp/ramp_loops.h"
+#include "ops/ramp/stop_ramp.h"
 #include "simd/cpu_level.h"
 #include "voreleffect/VFECore.h"
 
@@ -42,9 +51,92 @@ void fillGlowTable(CpuLevel level, const GlowRecord& record, float fadeStart, in
 /// runs out it stays as it was.
 void growByBoxFilter(CpuLevel level, unsigned char* mask, int passes, int width, int height);
 
-/// Paints a glow in windows that take `workingBytes` at most, if they can. All of it is taken before the
-/// first pixel is painted: without it nothing is.
-void paintGlow(const VFECore::ParamPostProcessing* params, const GlowRecord& record, GlowSide side,
-               int64_t workingBytes = kWorkingBytes);
+/// What a glow of a size does around a box, in the coordinates of the box.
+struct GlowShape {
+    int passes;
+    int radius;
+    Box image;
+    Box blurred;  ///< the part of the image that is not its border
+
+    static GlowShape of(const CoverageBox& box, int pad);
+};
+
+/// The colours of the blurred values. Strong values lie near the text, at the start of the table.
+/// Deliberate: values end at 255, so entry 0 is never taken.
+class ValueColours {
+  public:
+    ValueColours(CpuLevel level, const GlowRecord& record);
+
+    /// Paints values of a part that is seen beneath the destination, and may change them. A single
+    /// colour differs in its alpha only: the values become that, and the mask of the opaque colour, for
+    /// product(255, alpha) = alpha.
+    void paint(const PlacedTarget& target, const Box& part, uint8_t* values, int64_t stride) const;
+
+  private:
+    const RampLoops& mRamps;
+    bool mIsOne;
+    uint32_t mColor;
+    uint32_t mPixels[kTableLast];  ///< by value, as in memory, if there are several
+};
+
+/// What has grown, in the part that the blur of a window reaches, blurred: a window after the other, a
+/// band of rows at a time. Around coverage's inverse everything is full, and stays so; coverage itself
+/// spreads by a pixel a pass. It is ready, or empty when memory ran out.
+class GrownBlur {
+  public:
+    GrownBlur(CpuLevel level, const GrowthInput& input, int radius, const FullColumns& full,
+              const Box& visible, int64_t workingBytes);
+
+    explicit operator bool() const { return mGrowth && mBlur && *mGrowth && *mBlur; }
+
+    /// As WindowedBlur does.
+    template <class Paint>
+    int64_t paintAbove(int64_t limit, Paint paint);
+
+  private:
+    Box partFor(const Box& window) const {
+        return intersection(expanded(window, mWeights.radius), mInput.whole());
+    }
+    BlurInput blurOf(const Box& window, const Box& part, const CoverageRows& grown) const;
+    BlurInput largestBlur(const Windows& windows) const;
+    int64_t growthBytes(const Windows& windows) const;
+
+    GrowthInput mInput;
+    BlurWeights mWeights;
+    FullColumns mFull;
+    std::optional<GrowthPlan> mGrowth;
+    std::optional<BlurPlan> mBlur;
+    std::optional<WindowWalk> mWalk;
+    Box mPart = {};  ///< of what has grown, of the window
+};
+
+/// A glow.
+class GlowPainter final : public RowPainter {
+  public:
+    GlowPainter(const CoverageBox& box, const VFBitmap* destination, const GlowRecord& record,
+                GlowSide side, int pad, int64_t workingBytes);
+
+    /// Whether there is anything to paint, and memory for it.
+    explicit operator bool() const { return mIsReady; }
+
+    int64_t paintAbove(int64_t limit) override;
+
+  private:
+    void paintBorder(const Box& rows) const;
+    void paintCorners(const Box& rows) const;
+
+    PlacedTarget mTarget;
+    GlowSide mSide;
+    GlowShape mShape;
+    ValueColours mColours;
+    std::optional<GrownBlur> mBlur;
+    RemainingRows mBorder;
+    bool mIsReady = false;
+};
+
+/// Makes a painter of a glow, in windows that take `workingBytes` at most, if they can; none when there
+/// is nothing to paint, or no memory for it.
+void begin(std::optional<GlowPainter>& painter, const VFECore::ParamPostProcessing* params,
+           const GlowRecord& record, GlowSide side, int64_t workingBytes = kWorkingBytes);
 
 }  // namespace VFontEffect::internal

@@ -39,33 +39,26 @@ int VFInnerShadow::getOffset() {
 }
 
 void VFInnerShadow::doPostProcessing(ParamPostProcessing* params) {
-    if (mProperty != nullptr) paintInnerShadow(params, *mProperty);
+    if (mProperty != nullptr) paintAll<ShadowPainter>(params, *mProperty);
 }
 
-void internal::paintInnerShadow(const VFECore::ParamPostProcessing* params,
-                                const VFInnerShadowProperty& record, int64_t workingBytes) {
-    const OwnFloatState floatState;
+void internal::begin(std::optional<ShadowPainter>& painter, const VFECore::ParamPostProcessing* params,
+                     const VFInnerShadowProperty& record, int64_t workingBytes) {
     const CoverageBox box = coverageOf(params);
     if (!box || exceedsSizeLimit(record.mSize)) return;
-
     const CpuLevel level = chosenLevel();
-    const PlacedTarget target(level, params->dstBitmap, box.left, box.top);
-    const Box visible = target.seen(wholeOf(box.rows()));
-    if (visible.empty()) return;
     const int radius = shadowRadius(record.mSize);
     const ShadowOffset offset = shadowOffset(record.mAngle, record.mDistance);
-    if (!meetsItself(box, radius, offset.x, offset.y)) {
+    const int64_t dx = offset.x;
+    const int64_t dy = offset.y;
+    if (!meetsItself(box, radius, dx, dy)) {
         // The glyph moved clear of itself: all of it lies in shadow, by its own coverage.
-        return target.paintCoverage(&BlendLoops::dstOverMask, box.rows(), 0, 0, record.mColor);
+        const PlacedTarget unmoved(level, params->dstBitmap, box.left, box.top);
+        return beginPlain(painter, unmoved, box.rows(), record.mColor);
     }
-
-    const Box unmoved = translated(visible, -int64_t{offset.x}, -int64_t{offset.y});
-    const BlurWeights weights = gaussianOf100(radius);
-    const BlurInput input = BlurInput::inverseAcross(weights, box.rows(), unmoved);
-    blurInWindows(level, input, workingBytes, [&](const Box& band, const BlurredRows& rows) {
-        target.paint(&BlendLoops::dstOverMask, translated(band, offset.x, offset.y), rows.values,
-                     rows.stride, record.mColor);
-    });
+    const PlacedTarget target(level, params->dstBitmap, box.left + dx, box.top + dy);
+    beginBlurred(painter, target, box.rows(), BlurPainter::Of::inverse, radius,
+                 translated(wholeOf(box.rows()), -dx, -dy), record.mColor, workingBytes);
 }
 
 }  // namespace VFontEffect

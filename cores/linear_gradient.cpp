@@ -1,13 +1,9 @@
 #include <cmath>
 
 #include "core/effect_types.h"
-#include "core/float_state.h"
 #include "core/portable_math.h"
-#include "cores/covered_fill.h"
-#include "cores/paint_input.h"
+#include "cores/fills.h"
 #include "cores/property_copy.h"
-#include "ops/ramp/ramp_loops.h"
-#include "ops/ramp/stop_ramp.h"
 #include "voreleffect/VFECore.h"
 
 namespace VFontEffect {
@@ -31,19 +27,34 @@ float lengthAcross(const Turn& angle, float w, float h) {
 VOREL_KEEPS_RECORD(VFLinearGradient, kLinearGradient)
 
 void VFLinearGradient::doPostProcessing(ParamPostProcessing* params) {
-    const OwnFloatState floatState;
-    const CoverageBox box = coverageOf(params);
-    if (!box || !canFill(mProperty)) return;
-    const CpuLevel level = chosenLevel();
-    const RampLoops& loops = rampLoops(level);
-    const GradientTable table(loops, mProperty->mGradient, mProperty->mGradientCount);
+    if (mProperty != nullptr) paintAll<LinearPainter>(params, *mProperty);
+}
 
+namespace internal {
+
+LinearPainter::LinearPainter(CpuLevel level, const CoverageBox& box, const VFBitmap* destination,
+                             const VFLinearGradientProperty& record)
+    : mLoops(rampLoops(level)),
+      mFill(level, box, destination),
+      mTable(mLoops, record.mGradient, record.mGradientCount) {
     const auto w = static_cast<float>(box.width);
     const auto h = static_cast<float>(box.height);
-    const Turn angle = portableTurn(mProperty->mAngle * kRadiansPerDegree);
-    const float step = (256.0F / mProperty->mScale) / lengthAcross(angle, w, h);
-    const LinearRamp ramp = {table.pixels(), angle.cosine * step, angle.sine * step, w * 0.5F, h * 0.5F};
-    fillCovered(level, box, params->dstBitmap, [&](const BlendJob& job) { loops.linear(job, ramp); });
+    const Turn angle = portableTurn(record.mAngle * kRadiansPerDegree);
+    const float step = (256.0F / record.mScale) / lengthAcross(angle, w, h);
+    mRamp = {mTable.pixels(), angle.cosine * step, angle.sine * step, w * 0.5F, h * 0.5F};
 }
+
+int64_t LinearPainter::paintAbove(int64_t limit) {
+    return mFill.paintAbove(limit,
+                            [&](const BlendJob& job, int64_t y) { mLoops.linear(job, y, mRamp); });
+}
+
+void begin(std::optional<LinearPainter>& painter, const VFECore::ParamPostProcessing* params,
+           const VFLinearGradientProperty& record) {
+    const CoverageBox box = coverageOf(params);
+    if (box && canFill(record)) painter.emplace(chosenLevel(), box, params->dstBitmap, record);
+}
+
+}  // namespace internal
 
 }  // namespace VFontEffect

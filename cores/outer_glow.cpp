@@ -22,7 +22,8 @@ void VFOuterGlow::increaseByBoxFilter(unsigned char* mask, int passes, int width
 }
 
 void VFOuterGlow::doPostProcessing(ParamPostProcessing* params) {
-    if (mProperty != nullptr) paintGlow(params, GlowRecord::of(mProperty), GlowSide::outside);
+    if (mProperty != nullptr)
+        paintAll<GlowPainter>(params, GlowRecord::of(mProperty), GlowSide::outside);
 }
 
 }  // namespace VFontEffect

@@ -7,10 +7,8 @@
 #include "core/size_limit.h"
 #include "cores/paint_input.h"
 #include "cores/painters.h"
-#include "cores/placed_target.h"
 #include "cores/property_copy.h"
 #include "cores/shadow_offset.h"
-#include "ops/blur/blur_plan.h"
 #include "voreleffect/VFECore.h"
 
 namespace VFontEffect {
@@ -62,30 +60,21 @@ int VFOuterShadow::getBottomOffset() {
 }
 
 void VFOuterShadow::doPostProcessing(ParamPostProcessing* params) {
-    if (mProperty != nullptr) paintOuterShadow(params, *mProperty, {mOffsetX, mOffsetY});
+    if (mProperty != nullptr)
+        paintAll<ShadowPainter>(params, *mProperty, ShadowOffset{mOffsetX, mOffsetY});
 }
 
-void internal::paintOuterShadow(const VFECore::ParamPostProcessing* params,
-                                const VFOuterShadowProperty& record, const ShadowOffset& offset,
-                                int64_t workingBytes) {
-    const OwnFloatState floatState;
+void internal::begin(std::optional<ShadowPainter>& painter, const VFECore::ParamPostProcessing* params,
+                     const VFOuterShadowProperty& record, const ShadowOffset& offset,
+                     int64_t workingBytes) {
     const CoverageBox box = coverageOf(params);
     if (!box || exceedsSizeLimit(record.mSize)) return;
-
-    const CpuLevel level = chosenLevel();
-    const PlacedTarget target(level, params->dstBitmap, box.left + offset.x, box.top + offset.y);
+    const PlacedTarget target(chosenLevel(), params->dstBitmap, box.left + offset.x, box.top + offset.y);
     const int radius = shadowRadius(record.mSize);
     // Without blur the coverage itself is the shadow.
-    if (radius == 0)
-        return target.paintCoverage(&BlendLoops::dstOverMask, box.rows(), 0, 0, record.mColor);
-    const Box visible = target.seen(expanded(wholeOf(box.rows()), radius));
-    if (visible.empty()) return;
-
-    const BlurWeights weights = gaussianOf100(radius);
-    const BlurInput input = BlurInput::down(weights, box.rows(), visible, kNoFullColumns, false);
-    blurInWindows(level, input, workingBytes, [&](const Box& band, const BlurredRows& rows) {
-        target.paint(&BlendLoops::dstOverMask, band, rows.values, rows.stride, record.mColor);
-    });
+    if (radius == 0) return beginPlain(painter, target, box.rows(), record.mColor);
+    beginBlurred(painter, target, box.rows(), BlurPainter::Of::coverage, radius,
+                 expanded(wholeOf(box.rows()), radius), record.mColor, workingBytes);
 }
 
 }  // namespace VFontEffect

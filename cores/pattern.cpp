@@ -2,11 +2,8 @@
 #include <cstdint>
 
 #include "core/effect_types.h"
-#include "core/float_state.h"
-#include "cores/covered_fill.h"
-#include "cores/paint_input.h"
+#include "cores/fills.h"
 #include "cores/property_copy.h"
-#include "ops/tile/tile_plan.h"
 #include "voreleffect/VFECore.h"
 
 namespace VFontEffect {
@@ -31,23 +28,37 @@ CoverageBox fillBox(const VFECore::ParamPostProcessing* params) {
 VOREL_KEEPS_RECORD(VFPattern, kPattern)
 
 void VFPattern::doPostProcessing(ParamPostProcessing* params) {
-    const OwnFloatState floatState;
-    const CoverageBox box = fillBox(params);
-    if (!box || mProperty == nullptr || mProperty->mScale < kSmallestScale) return;
-    const ColourView pattern = ColourView::of(mProperty->mPattern);
-    if (!pattern || pattern.width == 0 || pattern.height == 0) return;
+    if (mProperty != nullptr) paintAll<PatternPainter>(params, *mProperty);
+}
 
-    const CpuLevel level = chosenLevel();
-    TilePlan tiles(level, pattern, mProperty->mScale, mProperty->mOpacity, box.width);
-    if (!tiles) return;
-    const BlendLoop paint = blendLoops(level).dstOverWhereCovered;
-    fillCovered(level, box, params->dstBitmap, [&](const BlendJob& job) {
-        for (int64_t y = 0; y < job.height; ++y) {
-            BlendJob row = rowOf(job, y);
-            row.image = reinterpret_cast<const uint8_t*>(tiles.row(y));
-            paint(row);
+namespace internal {
+
+PatternPainter::PatternPainter(CpuLevel level, const CoverageBox& box, const VFBitmap* destination,
+                               const ColourView& pattern, const VFPatternProperty& record)
+    : mPaint(blendLoops(level).dstOverWhereCovered),
+      mFill(level, box, destination),
+      mTiles(level, pattern, record.mScale, record.mOpacity, box.width) {}
+
+int64_t PatternPainter::paintAbove(int64_t limit) {
+    return mFill.paintAbove(limit, [&](const BlendJob& job, int64_t y) {
+        for (int64_t i = 0; i < job.height; ++i) {
+            BlendJob row = rowOf(job, i);
+            row.image = reinterpret_cast<const uint8_t*>(mTiles.row(y + i));
+            mPaint(row);
         }
     });
 }
+
+void begin(std::optional<PatternPainter>& painter, const VFECore::ParamPostProcessing* params,
+           const VFPatternProperty& record) {
+    const CoverageBox box = fillBox(params);
+    if (!box || record.mScale < kSmallestScale) return;
+    const ColourView pattern = ColourView::of(record.mPattern);
+    if (!pattern || pattern.width == 0 || pattern.height == 0) return;
+    painter.emplace(chosenLevel(), box, params->dstBitmap, pattern, record);
+    if (!*painter) painter.reset();
+}
+
+}  // namespace internal
 
 }  // namespace VFontEffect

@@ -18,6 +18,10 @@ class PlacedTarget {
     PlacedTarget(CpuLevel level, const VFBitmap* destination, int64_t left, int64_t top)
         : mLoops(blendLoops(level)), mPixels(ColourView::of(destination)), mLeft(left), mTop(top) {}
 
+    /// The picture's row that lies on that row of the destination.
+    int64_t ownRow(int64_t row) const { return row - mTop; }
+    int64_t destinationRow(int64_t ownRow) const { return ownRow + mTop; }
+
     /// The part of the picture that lies on the destination; empty for one that cannot be trusted.
     Box seen(const Box& part) const {
         return intersection(part, translated({0, 0, mPixels.width, mPixels.height}, -mLeft, -mTop));

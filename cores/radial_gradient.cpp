@@ -1,10 +1,6 @@
 #include "core/effect_types.h"
-#include "core/float_state.h"
-#include "cores/covered_fill.h"
-#include "cores/paint_input.h"
+#include "cores/fills.h"
 #include "cores/property_copy.h"
-#include "ops/ramp/ramp_loops.h"
-#include "ops/ramp/stop_ramp.h"
 #include "voreleffect/VFECore.h"
 
 namespace VFontEffect {
@@ -14,18 +10,33 @@ using namespace internal;
 VOREL_KEEPS_RECORD(VFRadialGradient, kRadialGradient)
 
 void VFRadialGradient::doPostProcessing(ParamPostProcessing* params) {
-    const OwnFloatState floatState;
-    const CoverageBox box = coverageOf(params);
-    if (!box || !canFill(mProperty)) return;
-    const CpuLevel level = chosenLevel();
-    const RampLoops& loops = rampLoops(level);
-    const GradientTable table(loops, mProperty->mGradient, mProperty->mGradientCount);
+    if (mProperty != nullptr) paintAll<RadialPainter>(params, *mProperty);
+}
 
+namespace internal {
+
+RadialPainter::RadialPainter(CpuLevel level, const CoverageBox& box, const VFBitmap* destination,
+                             const VFRadialGradientProperty& record)
+    : mLoops(rampLoops(level)),
+      mFill(level, box, destination),
+      mTable(mLoops, record.mGradient, record.mGradientCount) {
     // Deliberate: the radius is measured by the width alone, so a tall box ends in a plain colour.
     const auto w = static_cast<float>(box.width);
-    const float step = (256.0F / w + 256.0F / w) / mProperty->mScale;
-    const RadialRamp ramp = {table.pixels(), step, w * 0.5F, static_cast<float>(box.height) * 0.5F};
-    fillCovered(level, box, params->dstBitmap, [&](const BlendJob& job) { loops.radial(job, ramp); });
+    const float step = (256.0F / w + 256.0F / w) / record.mScale;
+    mRamp = {mTable.pixels(), step, w * 0.5F, static_cast<float>(box.height) * 0.5F};
 }
+
+int64_t RadialPainter::paintAbove(int64_t limit) {
+    return mFill.paintAbove(limit,
+                            [&](const BlendJob& job, int64_t y) { mLoops.radial(job, y, mRamp); });
+}
+
+void begin(std::optional<RadialPainter>& painter, const VFECore::ParamPostProcessing* params,
+           const VFRadialGradientProperty& record) {
+    const CoverageBox box = coverageOf(params);
+    if (box && canFill(record)) painter.emplace(chosenLevel(), box, params->dstBitmap, record);
+}
+
+}  // namespace internal
 
 }  // namespace VFontEffect

@@ -21,44 +21,6 @@ namespace VFontEffect {
 
 using namespace internal;
 
-namespace {
-
-/// The outline's coverage in a window, a band of rows at a time; empty when memory ran out. What is
-/// centred lies within the disc's radius of the edge on both sides of it.
-class Outline {
-  public:
-    Outline(CpuLevel level, const CoverageBox& box, const DiscShape& disc, const StrokeShape& shape,
-            int64_t bytesOfPlan)
-        : mMemory(bytesOfPlan, plansOf(shape)),
-          mGrown(level, {box.rows(shape.growsGlyph ? kAsIs : kInverse), disc}, mMemory.data(),
-                 bytesOfPlan) {
-        if (mMemory && plansOf(shape) == 2) {
-            mInverse.emplace(level, DilationInput{box.rows(kInverse), disc},
-                             mMemory.data() + bytesOfPlan, bytesOfPlan);
-        }
-    }
-
-    explicit operator bool() const { return static_cast<bool>(mMemory); }
-
-    static int64_t plansOf(const StrokeShape& shape) { return shape.side == StrokeSide::centre ? 2 : 1; }
-
-    void begin(const Box& window) {
-        mGrown.begin(window);
-        if (mInverse) mInverse->begin(window);
-    }
-    int64_t bandRows() const { return mGrown.bandRows(); }
-    CoverageRows rows(int64_t y, int64_t count) {
-        return mInverse ? mGrown.minRows(*mInverse, y, count) : mGrown.rows(y, count);
-    }
-
-  private:
-    LineBuffer mMemory;
-    DilationPlan mGrown;
-    std::optional<DilationPlan> mInverse;
-};
-
-}  // namespace
-
 VOREL_KEEPS_RECORD(VFStroke, kStroke)
 
 int VFStroke::getOffset() {
@@ -66,41 +28,71 @@ int VFStroke::getOffset() {
 }
 
 void VFStroke::doPostProcessing(ParamPostProcessing* params) {
-    if (mProperty != nullptr) paintStroke(params, *mProperty);
+    if (mProperty != nullptr) paintAll<StrokePainter>(params, *mProperty);
 }
 
-void internal::paintStroke(const VFECore::ParamPostProcessing* params, const VFStrokeProperty& record,
-                           int64_t workingBytes) {
-    const OwnFloatState floatState;
+namespace internal {
+
+StrokePainter::StrokePainter(const VFECore::ParamPostProcessing& params, const VFStrokeProperty& record,
+                             const CoverageBox& box, int64_t workingBytes)
+    : mTargets{{chosenLevel(), params.dstBitmap, box.left, box.top},
+               {chosenLevel(), params.subDstBitmap, box.left, box.top}},
+      mRule(&BlendLoops::dstOverMask),
+      mColor(record.mColor),
+      mDisc(StrokeShape(record).radiusPx) {
+    if (!mDisc) return;
+    const StrokeShape shape(record);
+    const bool isCentred = shape.side == StrokeSide::centre;
+    if (isCentred && params.useOuterLayer != 1) mRule = &BlendLoops::srcOverMask;
+    const CpuLevel level = chosenLevel();
+    const DilationInput grown = {box.rows(shape.growsGlyph ? kAsIs : kInverse), mDisc};
+    const Box reached = DilationPlan::reached(grown);
+    const Box visible = boundingBox(mTargets[0].seen(reached), mTargets[1].seen(reached));
+    if (visible.empty()) return;
+    const int64_t plans = isCentred ? 2 : 1;
+    const auto bytesOfPlan = [&](const Windows& cut) {
+        return DilationPlan::memoryBytes(level, grown, cut);
+    };
+    const Windows windows = windowsWithin(workingBytes / plans, visible, mDisc.reach, bytesOfPlan);
+    const int64_t bytes = windows.memoryBytes;
+    mMemory.emplace(bytes, plans);
+    if (!*mMemory) return;
+    mGrown.emplace(level, grown, mMemory->data(), bytes);
+    if (isCentred)
+        mInverse.emplace(level, DilationInput{box.rows(kInverse), mDisc}, mMemory->data() + bytes,
+                         bytes);
+    mWalk.emplace(windows);
+}
+
+int64_t StrokePainter::paintAbove(int64_t limit) {
+    struct Bands {
+        StrokePainter& stroke;
+
+        void begin(const Box& window) {
+            stroke.mGrown->begin(window);
+            if (stroke.mInverse) stroke.mInverse->begin(window);
+        }
+        int64_t bandRows() const { return stroke.mGrown->bandRows(); }
+        void paint(const Box& band) {
+            const CoverageRows rows =
+                stroke.mInverse ? stroke.mGrown->minRows(*stroke.mInverse, band.top, band.height())
+                                : stroke.mGrown->rows(band.top, band.height());
+            for (const PlacedTarget& target : stroke.mTargets)
+                target.paintCoverage(stroke.mRule, rows, band.left, band.top, stroke.mColor);
+        }
+    };
+    const PlacedTarget& target = mTargets[0];
+    return target.destinationRow(mWalk->goAbove(target.ownRow(limit), Bands{*this}));
+}
+
+void begin(std::optional<StrokePainter>& painter, const VFECore::ParamPostProcessing* params,
+           const VFStrokeProperty& record, int64_t workingBytes) {
     const CoverageBox box = coverageOf(params);
     if (!box || exceedsSizeLimit(record.mSize)) return;
-    const StrokeShape shape(record);
-    const DiscShape disc(shape.radiusPx);
-    if (!disc) return;
-    const CpuLevel level = chosenLevel();
-    const PlacedTarget targets[] = {{level, params->dstBitmap, box.left, box.top},
-                                    {level, params->subDstBitmap, box.left, box.top}};
-    const Box reached = DilationPlan::reached({box.rows(), disc});
-    const Box visible = boundingBox(targets[0].seen(reached), targets[1].seen(reached));
-    if (visible.empty()) return;
-    const int64_t bytesOfEach = workingBytes / Outline::plansOf(shape);
-    const auto bytesOfPlan = [&](const Windows& cut) {
-        return DilationPlan::memoryBytes(level, {box.rows(), disc}, cut);
-    };
-    const Windows windows = windowsWithin(bytesOfEach, visible, disc.reach, bytesOfPlan);
-    Outline outline(level, box, disc, shape, windows.memoryBytes);
-    if (!outline) return;
-
-    const bool overText = shape.side == StrokeSide::centre && params->useOuterLayer != 1;
-    const auto rule = overText ? &BlendLoops::srcOverMask : &BlendLoops::dstOverMask;
-    windows.forEach([&](const Box& window) {
-        outline.begin(window);
-        for (int64_t y = window.top; y < window.bottom; y += outline.bandRows()) {
-            const CoverageRows band = outline.rows(y, std::min(outline.bandRows(), window.bottom - y));
-            for (const PlacedTarget& target : targets)
-                target.paintCoverage(rule, band, window.left, y, record.mColor);
-        }
-    });
+    painter.emplace(*params, record, box, workingBytes);
+    if (!*painter) painter.reset();
 }
+
+}  // namespace internal
 
 }  // namespace VFontEffect

@@ -1,6 +1,6 @@
 #include "core/effect_types.h"
 #include "core/views.h"
-#include "cores/placed_target.h"
+#include "cores/painters.h"
 #include "cores/property_copy.h"
 #include "voreleffect/VFECore.h"
 
@@ -11,7 +11,12 @@ using namespace internal;
 VOREL_KEEPS_RECORD(VFText, kText)
 
 void VFText::doPostProcessing(ParamPostProcessing* params) {
-    if (params == nullptr || mProperty == nullptr || params->dstBitmap == nullptr) return;
+    if (mProperty != nullptr) paintAll<CoveragePainter>(params, *mProperty);
+}
+
+void internal::begin(std::optional<CoveragePainter>& painter, const VFECore::ParamPostProcessing* params,
+                     const VFTextProperty& record) {
+    if (params == nullptr || params->dstBitmap == nullptr) return;
     const MaskView mask = MaskView::of(params->srcBitmap);
     if (!mask) return;
     const PlacedTarget target(chosenLevel(), params->dstBitmap, 0, 0);
@@ -19,7 +24,15 @@ void VFText::doPostProcessing(ParamPostProcessing* params) {
     // so far to the glyph.
     const auto rule = params->useOuterLayer == 1 ? &BlendLoops::dstOverGate : &BlendLoops::dstOverClip;
     const CoverageRows coverage = {mask.data, mask.width, mask.width, mask.height, kAsIs};
-    target.paintCoverage(rule, coverage, 0, 0, mProperty->mColor);
+    painter.emplace(rule, target, coverage, record.mColor);
+}
+
+int64_t internal::CoveragePainter::paintAbove(int64_t limit) {
+    const Box part = mRest.takenAbove(mTarget.ownRow(limit));
+    if (part.empty()) return limit;
+    const uint8_t* const mask = mCoverage.start + part.top * mCoverage.stride + part.left;
+    mTarget.paint(mRule, part, mask, mCoverage.stride, mColor);
+    return limit;
 }
 
 }  // namespace VFontEffect

@@ -3,7 +3,7 @@
 
 #include "core/numeric.h"
 #include "core/views.h"
-#include "effect/placement.h"
+#include "effect/strips.h"
 #include "voreleffect/VFBlender.h"
 #include "voreleffect/VFEffect.h"
 
@@ -24,14 +24,6 @@ void growTo(VFRect& box, const VFRect& other) {
     box.mTop = std::min(box.mTop, other.mTop);
     box.mRight = std::max(box.mRight, other.mRight);
     box.mBottom = std::max(box.mBottom, other.mBottom);
-}
-
-/// Sets the targets of a core in layered mode. When there are two the destination is the second.
-void route(VFECore& core, VFBitmap* destination, VFBitmap* outerLayer,
-           VFECore::ParamPostProcessing& params) {
-    const Placement& placement = placementOf(core);
-    params.dstBitmap = placement.inOuterLayer ? outerLayer : destination;
-    params.subDstBitmap = placement.inOuterLayer && placement.inDestination ? destination : nullptr;
 }
 
 void clampTo(VFRect& box, const VFBitmap& mask) {
@@ -69,9 +61,11 @@ void VFEffect::doEffectPostProcessing() {
     if (mTextRect.mRight <= mTextRect.mLeft || mTextRect.mBottom <= mTextRect.mTop) return;
     if (mUseOuterLayer == 1 && !ColourView::of(mOuterLayer)) return;
 
-    VFECore::ParamPostProcessing params = {mDstBitmap, mSrcBitmap, &mTextRect, mUseOuterLayer, nullptr};
+    const RunBitmaps run = {mDstBitmap, mUseOuterLayer == 1 ? mOuterLayer : nullptr, mSrcBitmap,
+                            &mTextRect};
+    if (const int64_t rows = stripRowsFor(run)) return paintInStrips(mEffects, run, rows);
     for (VFECore* core : mEffects) {
-        if (mUseOuterLayer == 1) route(*core, mDstBitmap, mOuterLayer, params);
+        VFECore::ParamPostProcessing params = run.paramsFor(*core);
         core->doPostProcessing(&params);
     }
 }

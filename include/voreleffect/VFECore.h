@@ -9,6 +9,10 @@
 /// core that VFEffect::getEffect returned, or to drive one by hand.
 namespace VFontEffect {
 
+namespace internal {
+class ShadowPainter;
+}
+
 /// The interface of an effect core. The virtual operations stand in slot order, the destructor first.
 ///
 /// The cores of the library paint nothing when the parameters, the stored record or a bitmap or box
@@ -174,6 +178,8 @@ class VF_API VFOuterShadow : public VFECoreBase {
     int getBottomOffset() override;
 
   private:
+    friend class internal::ShadowPainter;
+
     VFOuterShadowProperty* mProperty;
     int mOffsetX;
     int mOffsetY;

@@ -69,9 +69,9 @@ struct RampPainter : MaskReader<Empty::keeps, true> {
 };
 
 template <class RampRow, class Ramp>
-void fillRamp(const BlendJob& job, const Ramp& ramp) {
+void fillRamp(const BlendJob& job, int64_t firstRow, const Ramp& ramp) {
     for (int64_t y = 0; y < job.height; ++y) {
-        const RampPainter<RampRow> painter = {{}, RampRow::of(ramp, y)};
+        const RampPainter<RampRow> painter = {{}, RampRow::of(ramp, firstRow + y)};
         const Row row = {job.destination + y * job.destinationStride, nullptr,
                          job.mask + y * job.maskStride};
         paintRow(painter, row, job.width);

@@ -42,9 +42,10 @@ struct RampSegment {
 constexpr uint32_t kFadedValues = 180;
 
 struct RampLoops {
-    /// Fill a covered box from its corner on: the job's mask is its coverage, which gates the colour.
-    void (*linear)(const BlendJob& job, const LinearRamp& ramp);
-    void (*radial)(const BlendJob& job, const RadialRamp& ramp);
+    /// Fill a covered box from row y on, at its left edge: the job's mask is its coverage, which gates
+    /// the colour.
+    void (*linear)(const BlendJob& job, int64_t y, const LinearRamp& ramp);
+    void (*radial)(const BlendJob& job, int64_t y, const RadialRamp& ramp);
 
     /// The colours of a segment at `count` positions, which may be read past their count.
     void (*mixStops)(const RampSegment& segment, const float* positions, int64_t count,

@@ -59,6 +59,19 @@ Windows cut(const Box& part, const WindowSize& size) {
             std::min<int64_t>(size.height, part.height())};
 }
 
+/// Strips down to below the mask, then the rest.
+template <class Painter, class... Arguments>
+void paintRowByRow(int64_t stripRows, const VFECore::ParamPostProcessing* params,
+                   const Arguments&... arguments) {
+    const OwnFloatState floatState;
+    std::optional<Painter> painter;
+    begin(painter, params, arguments...);
+    if (!painter) return;
+    for (int64_t limit = stripRows; limit < params->srcBitmap->mHeight; limit += stripRows)
+        painter->paintAbove(limit);
+    painter->paintAbove(kAllRows);
+}
+
 template <class Blur>
 std::vector<uint8_t> collected(Blur& blur, const BlurInput& input, const Windows& windows) {
     if (!blur) return {};
@@ -88,23 +101,33 @@ void append(const TermList& list, int sign, std::vector<Term>& terms) {
 
 }  // namespace
 
-void paintWithin(int64_t workingBytes, int type, const VFProperty& record,
+void paintWithin(int64_t workingBytes, int64_t stripRows, int type, const VFProperty& record,
                  const VFECore::ParamPostProcessing* params) {
     if (type == kStroke) {
-        paintStroke(params, static_cast<const VFStrokeProperty&>(record), workingBytes);
+        const auto& stroke = static_cast<const VFStrokeProperty&>(record);
+        paintRowByRow<StrokePainter>(stripRows, params, stroke, workingBytes);
     } else if (type == kOuterShadow) {
         const auto& shadow = static_cast<const VFOuterShadowProperty&>(record);
         const ShadowOffset offset = shadowOffset(shadow.mAngle, shadow.mDistance);
-        paintOuterShadow(params, shadow, offset, workingBytes);
+        paintRowByRow<ShadowPainter>(stripRows, params, shadow, offset, workingBytes);
     } else if (type == kInnerShadow) {
-        paintInnerShadow(params, static_cast<const VFInnerShadowProperty&>(record), workingBytes);
+        const auto& shadow = static_cast<const VFInnerShadowProperty&>(record);
+        paintRowByRow<ShadowPainter>(stripRows, params, shadow, workingBytes);
     } else if (type == kOuterGlow) {
-        const auto& glow = static_cast<const VFOuterGlowProperty&>(record);
-        paintGlow(params, GlowRecord::of(&glow), GlowSide::outside, workingBytes);
+        const auto glow = GlowRecord::of(static_cast<const VFOuterGlowProperty*>(&record));
+        paintRowByRow<GlowPainter>(stripRows, params, glow, GlowSide::outside, workingBytes);
     } else if (type == kInnerGlow) {
-        const auto& glow = static_cast<const VFInnerGlowProperty&>(record);
-        paintGlow(params, GlowRecord::of(&glow), GlowSide::inside, workingBytes);
+        const auto glow = GlowRecord::of(static_cast<const VFInnerGlowProperty*>(&record));
+        paintRowByRow<GlowPainter>(stripRows, params, glow, GlowSide::inside, workingBytes);
     }
+}
+
+void paintByTurns(const std::vector<VFECore*>& cores, const RunBitmaps& run, int64_t stripRows) {
+    paintInStrips(cores, run, stripRows);
+}
+
+int64_t rowsOfStrips(const RunBitmaps& run) {
+    return stripRowsFor(run);
 }
 
 std::vector<uint8_t> blurredByDots(const BlurInput& input, const WindowSize& size) {
@@ -124,10 +147,11 @@ std::vector<uint8_t> blurredByDifferences(const BlurInput& input, const WindowSi
 }
 
 std::vector<uint8_t> blurred(const BlurInput& input) {
-    BlurPlan plan(chosenLevel(), input, BlurPlan::memoryBytes(chosenLevel(), input));
-    if (!plan) return {};
+    WindowedBlur blur(chosenLevel(), input, INT64_MAX);
+    if (!blur) return {};
     Collected values(input.window);
-    forBands(plan, input, [&](const Box& band, const BlurredRows& rows) { values.put(band, rows); });
+    blur.paintAbove(input.window.bottom,
+                    [&](const Box& band, const BlurredRows& rows) { values.put(band, rows); });
     return values.values();
 }
 

@@ -4,6 +4,7 @@
 #include <vector>
 
 #include "core/views.h"
+#include "effect/strips.h"
 #include "ops/blur/blur_input.h"
 #include "ops/dilate/disc_shape.h"
 #include "ops/grow/growth_plan.h"
@@ -15,9 +16,17 @@
 namespace vorel_test {
 
 /// Paints what the core of the record does, a stroke, a shadow or a glow, with so many bytes of working
-/// memory.
-VF_API void paintWithin(int64_t workingBytes, int type, const VFontEffect::VFProperty& record,
+/// memory, so many rows at a time.
+VF_API void paintWithin(int64_t workingBytes, int64_t stripRows, int type,
+                        const VFontEffect::VFProperty& record,
                         const VFontEffect::VFECore::ParamPostProcessing* params);
+
+/// Paints with all cores by turns, strips of so many rows each.
+VF_API void paintByTurns(const std::vector<VFontEffect::VFECore*>& cores,
+                         const VFontEffect::internal::RunBitmaps& run, int64_t stripRows);
+
+/// The rows of strips for a run, 0 for none.
+VF_API int64_t rowsOfStrips(const VFontEffect::internal::RunBitmaps& run);
 
 /// Of windows that what is wanted is cut into; 0 for no cut.
 struct WindowSize {

@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cstdint>
 #include <vector>
 
@@ -15,6 +16,7 @@ using VFontEffect::internal::Box;
 using VFontEffect::internal::intersection;
 using VFontEffect::internal::Windows;
 using VFontEffect::internal::windowsWithin;
+using VFontEffect::internal::WindowWalk;
 
 /// An operator that keeps its window and what is in reach around it.
 int64_t planeBytes(const Windows& windows, int64_t reach) {
@@ -43,6 +45,58 @@ TEST(Windows, HaveEachPixelOnce) {
                     ++painted[static_cast<size_t>(y * part.width() + x)];
             }
         });
+        ASSERT_EQ(painted, std::vector<int>(painted.size(), 1));
+    });
+}
+
+/// Notes how often each pixel is painted, and where.
+struct Noted {
+    const Windows& windows;
+    std::vector<int>& painted;
+    Box& window;
+    int64_t& next;
+    int64_t limit;
+
+    void begin(const Box& begun) {
+        window = begun;
+        next = begun.top;
+    }
+    int64_t bandRows() const { return 3; }
+    void paint(const Box& band) {
+        const Box& part = windows.part;
+        ASSERT_EQ(next, band.top);
+        ASSERT_EQ(band, (Box{window.left, next, window.right, std::min(next + 3, window.bottom)}));
+        ASSERT_LE(band.bottom, limit);
+        next = band.bottom;
+        for (int64_t y = band.top - part.top; y < band.bottom - part.top; ++y) {
+            for (int64_t x = band.left - part.left; x < band.right - part.left; ++x)
+                ++painted[static_cast<size_t>(y * part.width() + x)];
+        }
+    }
+};
+
+TEST(WindowWalk, PaintsEachPixelOnce_NoneBelowTheLimitAndAllAboveWhatItReturns) {
+    forSeeds(0, 2000, [](Random& random) {
+        const int left = random.between(-20, 20);
+        const int top = random.between(-20, 20);
+        const Box part = {left, top, left + random.between(1, 30), top + random.between(1, 30)};
+        const Windows windows = {part, random.between(1, 31), random.between(1, 31)};
+        WindowWalk walk(windows);
+        std::vector<int> painted(static_cast<size_t>(part.width() * part.height()));
+        Box window = {};
+        int64_t next = 0;
+        for (int64_t limit = top - 5; limit < part.bottom; limit += random.between(0, 9)) {
+            const int64_t done = walk.goAbove(limit, Noted{windows, painted, window, next, limit});
+            ASSERT_LE(done, limit);
+            // What waits is a band, or a row of windows that lie side by side.
+            ASSERT_GT(done, limit - (windows.areCutAcross() ? windows.height : 3));
+            const int64_t rows = std::clamp<int64_t>(done, part.top, part.bottom) - part.top;
+            const auto end = painted.begin() + rows * part.width();
+            ASSERT_EQ(std::count(painted.begin(), end, 1), end - painted.begin());
+            ASSERT_EQ(std::count(end, painted.end(), 0), painted.end() - end);
+        }
+        const int64_t last = part.bottom + random.between(0, 100);
+        ASSERT_EQ(last, walk.goAbove(last, Noted{windows, painted, window, next, last}));
         ASSERT_EQ(painted, std::vector<int>(painted.size(), 1));
     });
 }

@@ -14,30 +14,31 @@
 #include "tests/support/mask_gallery.h"
 #include "tests/support/plans.h"
 
-/// The cores with little working memory: windows of all sizes down to a pixel, cut anywhere, paint the
-/// bytes of the literal forms.
+/// The cores with little working memory, and with rests: windows of all sizes down to a pixel, cut
+/// anywhere, and strips of any height paint the bytes of the literal forms.
 namespace {
 
 using namespace vorel_test;
 using namespace VFontEffect;
 using VFontEffect::internal::EffectType;
 
-/// A core that paints with so much working memory.
+/// A core that paints with so much working memory, and rests after every so many rows.
 template <class Record>
 class Painter : public VFECoreBase {
   public:
-    Painter(EffectType type, int64_t workingBytes, Record record)
-        : mType(type), mWorkingBytes(workingBytes), mRecord(std::move(record)) {}
+    Painter(EffectType type, int64_t workingBytes, int64_t stripRows, Record record)
+        : mType(type), mWorkingBytes(workingBytes), mStripRows(stripRows), mRecord(std::move(record)) {}
 
     void setProperty(VFProperty* /*property*/) override {}
     VFProperty* getProperty() override { return &mRecord; }
     void doPostProcessing(ParamPostProcessing* params) override {
-        paintWithin(mWorkingBytes, mType, mRecord, params);
+        paintWithin(mWorkingBytes, mStripRows, mType, mRecord, params);
     }
 
   private:
     EffectType mType;
     int64_t mWorkingBytes;
+    int64_t mStripRows;
     Record mRecord;
 };
 
@@ -46,6 +47,11 @@ class Painter : public VFECoreBase {
 int64_t randomBytes(Random& random, float size) {
     const int fewest = random.chance(3) || !(size > 8.0F) ? 8 : size > 24.0F ? 17 : 14;
     return int64_t{1} << random.between(fewest, 19);
+}
+
+/// As often as not enough for all rows at once.
+int64_t randomStripRows(Random& random) {
+    return random.chance(50) ? 1000 : random.between(1, 40);
 }
 
 /// Sizes of all kinds: small, whole, up to the limit of the add-calls, hand-made and odd ones.
@@ -84,7 +90,8 @@ TEST(Painters, StrokesInWindows_AreThoseOfTheLiteralForm) {
         const float size = randomSize(random);
         const uint32_t color = randomPremultiplied(random);
         const int64_t bytes = randomBytes(random, size);
-        Painter<VFStrokeProperty> core(internal::kStroke, bytes, {size, color, 1.0F, 0, position});
+        Painter<VFStrokeProperty> core(internal::kStroke, bytes, randomStripRows(random),
+                                       {size, color, 1.0F, 0, position});
         EXPECT_TRUE(paintsLike(core, scene,
                                [&](Scene& expected) {
                                    literal::paintStroke(expected.dst,
@@ -103,7 +110,7 @@ void expectShadows(EffectType type, LiteralForm literalForm) {
         const Record record(random.real(0.0F, 360.0F), random.real(0.0F, 30.0F), randomSize(random),
                             randomPremultiplied(random), 1.0F);
         const int64_t bytes = randomBytes(random, record.mSize);
-        Painter<Record> core(type, bytes, record);
+        Painter<Record> core(type, bytes, randomStripRows(random), record);
         EXPECT_TRUE(paintsLike(core, scene,
                                [&](Scene& expected) {
                                    literalForm(expected.dst, expected.mask, expected.text, record.mAngle,
@@ -130,7 +137,7 @@ void expectGlows(EffectType type, LiteralForm literalForm) {
         const Record record(randomSize(random), randomStraight(random), 1.0F,
                             static_cast<int>(array.size()), array.data());
         const int64_t bytes = randomBytes(random, record.mSize);
-        Painter<Record> core(type, bytes, record);
+        Painter<Record> core(type, bytes, randomStripRows(random), record);
         EXPECT_TRUE(paintsLike(core, scene,
                                [&](Scene& expected) {
                                    literalForm(expected.dst, expected.mask, expected.text, record.mSize,

@@ -1,0 +1,58 @@
+#pragma once
+
+#include <algorithm>
+#include <cstdint>
+#include <optional>
+
+#include "core/box.h"
+#include "core/float_state.h"
+
+namespace VFontEffect::internal {
+
+/// Below every row, but not so far that places could not be taken from it.
+constexpr int64_t kAllRows = INT64_MAX / 2;
+
+/// An effect that paints from the top of a picture down, as far as it is asked to. What it needs is made
+/// with it, and stays until all is painted: effects can take turns without doing anything twice.
+class RowPainter {
+  public:
+    RowPainter() = default;
+    RowPainter(const RowPainter&) = delete;
+    RowPainter& operator=(const RowPainter&) = delete;
+
+    /// Goes on with what lies above row `limit` of the mask, and paints nothing below it. Returns the
+    /// row above which nothing is left: effects paint several rows at once, or none of them.
+    virtual int64_t paintAbove(int64_t limit) = 0;
+
+  protected:
+    ~RowPainter() = default;
+};
+
+/// The part that an effect has not painted yet.
+class RemainingRows {
+  public:
+    explicit RemainingRows(const Box& part) : mPart(part) {}
+
+    /// What of it lies above a row. It counts as painted from now on.
+    Box takenAbove(int64_t row) {
+        Box taken = mPart;
+        taken.bottom = std::min(row, taken.bottom);
+        mPart.top = std::max(taken.top, taken.bottom);
+        return taken;
+    }
+
+  private:
+    Box mPart;
+};
+
+/// Paints all that an effect has to paint. Each begin() makes a painter if there is anything to paint,
+/// and memory for it: all of that is taken before the first pixel is painted.
+template <class Painter, class... Arguments>
+void paintAll(const Arguments&... arguments) {
+    const OwnFloatState floatState;
+    std::optional<Painter> painter;
+    begin(painter, arguments...);
+    if (painter) painter->paintAbove(kAllRows);
+}
+
+}  // namespace VFontEffect::internal

@@ -1,0 +1,146 @@
+#include "effect/strips.h"
+
+#include <algorithm>
+#include <optional>
+
+#include "core/assert.h"
+#include "core/effect_types.h"
+#include "core/float_state.h"
+#include "core/views.h"
+#include "cores/fills.h"
+#include "cores/glow.h"
+#include "cores/painters.h"
+#include "cores/row_painter.h"
+#include "effect/placement.h"
+
+namespace VFontEffect::internal {
+
+VFECore::ParamPostProcessing RunBitmaps::paramsFor(VFECore& core) const {
+    if (outerLayer == nullptr) return {destination, mask, textRect, 0, nullptr};
+    const Placement& placement = placementOf(core);
+    VFBitmap* const both = placement.inOuterLayer && placement.inDestination ? destination : nullptr;
+    return {placement.inOuterLayer ? outerLayer : destination, mask, textRect, 1, both};
+}
+
+// --- Where strips serve -------------------------------------------------------------------------------
+
+namespace {
+
+/// Targets of fewer bytes stay in the caches while one effect after the other paints them. There turns
+/// cost more than they save: what an effect keeps from row to row has to come back into the nearest
+/// cache.
+constexpr int64_t kLargeBytes = 16 << 20;
+/// So many of the targets stay in the cache that a core has for itself, with the mask and what effects
+/// keep.
+constexpr int64_t kStripBytes = 512 << 10;
+/// Strokes paint so many rows at once.
+constexpr int64_t kFewestRows = 32;
+
+struct ByteRange {
+    uintptr_t start;
+    int64_t count;
+
+    template <int BytesPerPixel>
+    static ByteRange of(const PixelView<BytesPerPixel>& view) {
+        return {reinterpret_cast<uintptr_t>(view.data), view.width * view.height * BytesPerPixel};
+    }
+    bool meets(const ByteRange& other) const {
+        return start < other.start + static_cast<uintptr_t>(other.count) &&
+               other.start < start + static_cast<uintptr_t>(count);
+    }
+};
+
+}  // namespace
+
+int64_t stripRowsFor(const RunBitmaps& run) {
+    const ColourView destination = ColourView::of(run.destination);
+    const ColourView outer = ColourView::of(run.outerLayer);
+    const MaskView mask = MaskView::of(run.mask);
+    if (!destination || !mask) return 0;
+    const ByteRange all[] = {ByteRange::of(destination), ByteRange::of(outer), ByteRange::of(mask)};
+    const int64_t targetBytes = all[0].count + all[1].count;
+    if (targetBytes < kLargeBytes) return 0;
+    const bool areApart = !all[0].meets(all[1]) && !all[0].meets(all[2]) && !all[1].meets(all[2]);
+    return areApart ? std::max(kFewestRows, kStripBytes / (targetBytes / destination.height)) : 0;
+}
+
+// --- Turns ----------------------------------------------------------------------------------------
+
+namespace {
+
+/// The painters of a run, in its order: of each kind there is one at most.
+class RunPainters {
+  public:
+    void add(VFECore& core, const VFECore::ParamPostProcessing& params) {
+        VFProperty* const record = core.getProperty();
+        if (record == nullptr) return;
+        switch (core.getStyle()) {
+            case kOuterShadow:
+                return begun(mOuterShadow, &params, *static_cast<const VFOuterShadowProperty*>(record),
+                             ShadowPainter::offsetOf(static_cast<const VFOuterShadow&>(core)));
+            case kInnerShadow:
+                return begun(mInnerShadow, &params, *static_cast<const VFInnerShadowProperty*>(record));
+            case kOuterGlow:
+                return begun(mOuterGlow, &params,
+                             GlowRecord::of(static_cast<const VFOuterGlowProperty*>(record)),
+                             GlowSide::outside);
+            case kInnerGlow:
+                return begun(mInnerGlow, &params,
+                             GlowRecord::of(static_cast<const VFInnerGlowProperty*>(record)),
+                             GlowSide::inside);
+            case kLinearGradient:
+                return begun(mLinear, &params, *static_cast<const VFLinearGradientProperty*>(record));
+            case kRadialGradient:
+                return begun(mRadial, &params, *static_cast<const VFRadialGradientProperty*>(record));
+            case kStroke:
+                return begun(mStroke, &params, *static_cast<const VFStrokeProperty*>(record));
+            case kPattern:
+                return begun(mPattern, &params, *static_cast<const VFPatternProperty*>(record));
+            case kText:
+                return begun(mText, &params, *static_cast<const VFTextProperty*>(record));
+            default:
+                return;
+        }
+    }
+
+    /// What one has painted the next may paint on.
+    void paintAbove(int64_t limit) {
+        for (int i = 0; i < mCount; ++i)
+            limit = mInOrder[i]->paintAbove(limit);
+    }
+
+  private:
+    template <class Painter, class... Arguments>
+    void begun(std::optional<Painter>& painter, const Arguments&... arguments) {
+        VOREL_ASSERT(!painter);
+        begin(painter, arguments...);
+        if (painter) mInOrder[mCount++] = &*painter;
+    }
+
+    std::optional<ShadowPainter> mOuterShadow;
+    std::optional<ShadowPainter> mInnerShadow;
+    std::optional<GlowPainter> mOuterGlow;
+    std::optional<GlowPainter> mInnerGlow;
+    std::optional<LinearPainter> mLinear;
+    std::optional<RadialPainter> mRadial;
+    std::optional<StrokePainter> mStroke;
+    std::optional<PatternPainter> mPattern;
+    std::optional<CoveragePainter> mText;
+    RowPainter* mInOrder[kNoEffect];
+    int mCount = 0;
+};
+
+}  // namespace
+
+void paintInStrips(const std::vector<VFECore*>& cores, const RunBitmaps& run, int64_t stripRows) {
+    const OwnFloatState floatState;
+    RunPainters painters;
+    for (VFECore* core : cores)
+        painters.add(*core, run.paramsFor(*core));
+    const MaskView mask = MaskView::of(run.mask);
+    for (int64_t limit = stripRows; limit < mask.height; limit += stripRows)
+        painters.paintAbove(limit);
+    painters.paintAbove(kAllRows);
+}
+
+}  // namespace VFontEffect::internal
