@@ -29,50 +29,61 @@ struct Windows {
     }
 };
 
-/// A walk through all windows of a part, that can rest after any band of rows, or, where windows lie
-/// side by side, after any row of them.
+/// What is painted in windows, in bands of rows from a window's top down.
+class WindowBands {
+  public:
+    /// Turns to a window.
+    virtual void beginWindow(const Box& window) = 0;
+    /// Rows of its bands; the last one may have fewer.
+    virtual int64_t bandRows() const = 0;
+    virtual void paintBand(const Box& band) = 0;
+
+  protected:
+    ~WindowBands() = default;
+};
+
+/// A walk through all windows of a part, that can rest after any band, or, where windows lie side by
+/// side, after any row of them.
 class WindowWalk {
   public:
-    explicit WindowWalk(const Windows& windows) : mWindows(windows), mNext(windows.part.top) {}
+    explicit WindowWalk(const Windows& windows) : mWindows(windows) {
+        turnTo(windows.part.left, windows.part.top);
+    }
 
-    /// Goes on with all that ends above a row. `bands` has begin(window), bandRows() and paint(band),
-    /// the box of the window's next so many rows or of what is left of it. Returns the row above which
-    /// nothing is left.
-    template <class Bands>
-    int64_t goAbove(int64_t limit, Bands bands) {
-        const Box& part = mWindows.part;
-        while (mNext < std::min(limit, part.bottom)) {
-            const int64_t top = mNext - (mNext - part.top) % mWindows.height;
-            const int64_t bottom = std::min(top + mWindows.height, part.bottom);
-            if (mWindows.areCutAcross()) {
-                if (bottom > limit) return mNext;
-                for (int64_t x = part.left; x < part.right; x += mWindows.width) {
-                    bands.begin(Box{x, top, std::min(x + mWindows.width, part.right), bottom});
-                    for (mNext = top; mNext < bottom;)
-                        paintBand(x, std::min(x + mWindows.width, part.right), bottom, bands);
-                }
-            } else {
-                if (!mIsInWindow) bands.begin(Box{part.left, top, part.right, bottom});
-                mIsInWindow = true;
-                if (std::min(mNext + bands.bandRows(), bottom) > limit) return mNext;
-                paintBand(part.left, part.right, bottom, bands);
-                mIsInWindow = mNext < bottom;
+    /// Goes on with all that ends above a row. Returns the row above which nothing is left.
+    int64_t goAbove(int64_t limit, WindowBands& bands) {
+        for (; !mWindow.empty(); turnToNext()) {
+            if (limit <= mNext) return limit;
+            if (mWindows.areCutAcross() && limit < mWindow.bottom) return mNext;
+            if (mBandRows == 0) {
+                bands.beginWindow(mWindow);
+                mBandRows = bands.bandRows();
+            }
+            while (mNext < mWindow.bottom) {
+                const int64_t end = std::min(mNext + mBandRows, mWindow.bottom);
+                if (end > limit) return mNext;
+                bands.paintBand({mWindow.left, mNext, mWindow.right, end});
+                mNext = end;
             }
         }
         return limit;
     }
 
   private:
-    template <class Bands>
-    void paintBand(int64_t left, int64_t right, int64_t bottom, Bands& bands) {
-        const int64_t end = std::min(mNext + bands.bandRows(), bottom);
-        bands.paint(Box{left, mNext, right, end});
-        mNext = end;
+    void turnTo(int64_t left, int64_t top) {
+        mWindow = intersection(mWindows.part, {left, top, left + mWindows.width, top + mWindows.height});
+        mNext = top;
+        mBandRows = 0;
+    }
+    void turnToNext() {
+        const bool isLast = mWindow.right == mWindows.part.right;
+        turnTo(isLast ? mWindows.part.left : mWindow.right, isLast ? mWindow.bottom : mWindow.top);
     }
 
     Windows mWindows;
-    int64_t mNext;             ///< the first row that is left
-    bool mIsInWindow = false;  ///< some of whose rows are done
+    Box mWindow;        ///< empty behind the last one
+    int64_t mNext;      ///< its first row that is left
+    int64_t mBandRows;  ///< 0 until it has begun
 };
 
 /// An effect takes about so much working memory at most, whatever the size of its picture.

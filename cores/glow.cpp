@@ -60,110 +60,88 @@ void ValueColours::paint(const PlacedTarget& target, const Box& part, uint8_t* v
 
 namespace {
 
-int64_t withReach(int64_t length, const BlurWeights& weights) {
-    return length + 2 * int64_t{weights.radius};
+/// Deliberate: between the passes of an inner glow the columns that the first pass does not reach are
+/// full; with a radius of 0 those that growth clears, the first one and the last.
+FullColumns fullColumns(const GlowShape& shape, GlowSide side) {
+    if (side == GlowSide::outside) return kNoFullColumns;
+    const int64_t open = std::max(1, shape.radius);
+    return {shape.image.left + open, shape.image.right - open};
+}
+
+GrowthInput growthOf(const CoverageRows& coverage, const GlowShape& shape, GlowSide side) {
+    GrowthInput input = {coverage, shape.passes, shape.passes};
+    if (side == GlowSide::outside) return input;
+    input.source.invertMask = kInverse;
+    input.margin = 0;
+    return input;
 }
 
 }  // namespace
 
-BlurInput GrownBlur::blurOf(const Box& window, const Box& part, const CoverageRows& grown) const {
+GlowPainter::GlowPainter(CpuLevel level, const PlacedTarget& target, const GlowRecord& record,
+                         GlowSide side, const CoverageRows& coverage, const GlowShape& shape,
+                         int64_t workingBytes)
+    : WindowPainter(target),
+      mSide(side),
+      mShape(shape),
+      mColours(level, record),
+      mBorder(target.seen(shape.image)),
+      mInput(growthOf(coverage, shape, side)),
+      mWeights(gaussianOf128(shape.radius)) {
+    const Box visible = target.seen(shape.blurred);
+    if (!visible.empty()) makePlans(level, visible, workingBytes);
+}
+
+BlurInput GlowPainter::blurOf(const Box& window, const Box& part, const CoverageRows& grown) const {
+    const FullColumns full = fullColumns(mShape, mSide);
     return BlurInput::down(mWeights, grown, translated(window, -part.left, -part.top),
-                           {mFull.before - part.left, mFull.from - part.left},
-                           mInput.source.invertMask == kInverse);
+                           {full.before - part.left, full.from - part.left}, mSide == GlowSide::inside);
 }
 
 /// The blur that takes the most memory of those of any of the windows.
-BlurInput GrownBlur::largestBlur(const Windows& windows) const {
+BlurInput GlowPainter::largestBlur(const Windows& windows) const {
     const Box part = partFor(windows.part);
     const CoverageRows sizes = {nullptr, 0, std::max<int64_t>(0, part.width()),
                                 std::max<int64_t>(0, part.height()), kAsIs};
     return blurOf(windows.part, part, sizes).largestOf(windows);
 }
 
-int64_t GrownBlur::growthBytes(const Windows& windows) const {
-    return GrowthPlan::memoryBytes(mInput, withReach(windows.width, mWeights),
-                                   withReach(windows.height, mWeights));
-}
-
-GrownBlur::GrownBlur(CpuLevel level, const GrowthInput& input, int radius, const FullColumns& full,
-                     const Box& visible, int64_t workingBytes)
-    : mInput(input), mWeights(gaussianOf128(radius)), mFull(full) {
+void GlowPainter::makePlans(CpuLevel level, const Box& visible, int64_t workingBytes) {
+    const int64_t around = 2 * int64_t{mWeights.radius};
+    const auto growthBytes = [&](const Windows& cut) {
+        return GrowthPlan::memoryBytes(mInput, cut.width + around, cut.height + around);
+    };
     const auto memoryBytes = [&](const Windows& cut) {
         return growthBytes(cut) + BlurPlan::memoryBytes(level, largestBlur(cut));
     };
-    const int64_t reach = int64_t{radius} + input.passes;
+    const int64_t reach = int64_t{mWeights.radius} + mInput.passes;
     const Windows windows = windowsWithin(workingBytes, visible, reach, memoryBytes);
-    mGrowth.emplace(level, input, withReach(windows.width, mWeights),
-                    withReach(windows.height, mWeights));
+    mGrowth.emplace(level, mInput, windows.width + around, windows.height + around);
     mBlur.emplace(level, largestBlur(windows), windows.memoryBytes - growthBytes(windows));
-    mWalk.emplace(windows);
+    setWindows(windows);
 }
 
-template <class Paint>
-int64_t GrownBlur::paintAbove(int64_t limit, Paint paint) {
-    struct Bands {
-        GrownBlur& blur;
-        Paint& paintRows;
+void GlowPainter::beginWindow(const Box& window) {
+    mPart = partFor(window);
+    const CoverageRows grown = mPart.empty() ? CoverageRows{} : mGrowth->grown(mPart);
+    mBlur->begin(blurOf(window, mPart, grown));
+}
 
-        void begin(const Box& window) {
-            blur.mPart = blur.partFor(window);
-            const bool isClear = blur.mPart.empty();
-            const CoverageRows grown = isClear ? CoverageRows{} : blur.mGrowth->grown(blur.mPart);
-            blur.mBlur->begin(blur.blurOf(window, blur.mPart, grown));
-        }
-        int64_t bandRows() const { return blur.mBlur->bandRows(); }
-        void paint(const Box& band) {
-            paintRows(band, blur.mBlur->rows(band.top - blur.mPart.top, band.height()));
-        }
-    };
-    return mWalk->goAbove(limit, Bands{*this, paint});
+void GlowPainter::paintBand(const Box& band) {
+    const BlurredRows rows = mBlur->rows(band.top - mPart.top, band.height());
+    mColours.paint(mTarget, band, rows.values, rows.stride);
 }
 
 // --- Both glows -------------------------------------------------------------------------------------
 
-namespace {
-
-// Deliberate: between the passes of an inner glow the columns that the first pass does not reach are
-// full; with a radius of 0 those that growth clears, the first one and the last.
-FullColumns fullColumns(const GlowShape& shape) {
-    const int64_t open = std::max(1, shape.radius);
-    return {shape.image.left + open, shape.image.right - open};
-}
-
-}  // namespace
-
-GlowPainter::GlowPainter(const CoverageBox& box, const VFBitmap* destination, const GlowRecord& record,
-                         GlowSide side, int pad, int64_t workingBytes)
-    : mTarget(chosenLevel(), destination, box.left, box.top),
-      mSide(side),
-      mShape(GlowShape::of(box, pad)),
-      mColours(chosenLevel(), record),
-      mBorder(mTarget.seen(mShape.image)) {
-    if (mTarget.seen(mShape.image).empty()) return;
-    const Box visible = mTarget.seen(mShape.blurred);
-    const bool inside = side == GlowSide::inside;
-    const GrowthInput input = {box.rows(inside ? kInverse : kAsIs), inside ? 0 : mShape.passes,
-                               mShape.passes};
-    if (!visible.empty()) {
-        mBlur.emplace(chosenLevel(), input, mShape.radius, inside ? fullColumns(mShape) : kNoFullColumns,
-                      visible, workingBytes);
-    }
-    mIsReady = !mBlur || *mBlur;
-}
-
 int64_t GlowPainter::paintAbove(int64_t limit) {
-    int64_t row = mTarget.ownRow(limit);
-    if (mBlur) {
-        row = mBlur->paintAbove(row, [&](const Box& band, const BlurredRows& rows) {
-            mColours.paint(mTarget, band, rows.values, rows.stride);
-        });
-    }
+    const int64_t done = WindowPainter::paintAbove(limit);
     if (mSide == GlowSide::inside) {
-        const Box rows = mBorder.takenAbove(row);
+        const Box rows = mBorder.takenAbove(mTarget.ownRow(done));
         paintBorder(rows);
         if (mShape.radius == 0) paintCorners(rows);
     }
-    return mTarget.destinationRow(row);
+    return done;
 }
 
 /// Paints the border of an inner glow.
@@ -209,7 +187,11 @@ void begin(std::optional<GlowPainter>& painter, const VFECore::ParamPostProcessi
     const int pad = saturateToInt(int64_t{toInt(record.sizePx)} + 1);
     // With no padding at all (a size of -1) the image would be clear, as it is with a size of 0.
     if (!box || exceedsSizeLimit(record.sizePx) || pad <= 0 || record.sizePx == 0.0F) return;
-    painter.emplace(box, params->dstBitmap, record, side, pad, workingBytes);
+    const CpuLevel level = chosenLevel();
+    const PlacedTarget target(level, params->dstBitmap, box.left, box.top);
+    const GlowShape shape = GlowShape::of(box, pad);
+    if (target.seen(shape.image).empty()) return;
+    painter.emplace(level, target, record, side, box.rows(), shape, workingBytes);
     if (!*painter) painter.reset();
 }
 

@@ -79,59 +79,41 @@ class ValueColours {
     uint32_t mPixels[kTableLast];  ///< by value, as in memory, if there are several
 };
 
-/// What has grown, in the part that the blur of a window reaches, blurred: a window after the other, a
-/// band of rows at a time. Around coverage's inverse everything is full, and stays so; coverage itself
-/// spreads by a pixel a pass. It is ready, or empty when memory ran out.
-class GrownBlur {
+/// A glow: what has grown, in the part that the blur of a window reaches, blurred. Around coverage's
+/// inverse everything is full, and stays so; coverage itself spreads by a pixel a pass.
+class GlowPainter final : public WindowPainter {
   public:
-    GrownBlur(CpuLevel level, const GrowthInput& input, int radius, const FullColumns& full,
-              const Box& visible, int64_t workingBytes);
+    GlowPainter(CpuLevel level, const PlacedTarget& target, const GlowRecord& record, GlowSide side,
+                const CoverageRows& coverage, const GlowShape& shape, int64_t workingBytes);
 
-    explicit operator bool() const { return mGrowth && mBlur && *mGrowth && *mBlur; }
+    /// Whether there was memory for it.
+    explicit operator bool() const { return !mBlur || (*mGrowth && *mBlur); }
 
-    /// As WindowedBlur does.
-    template <class Paint>
-    int64_t paintAbove(int64_t limit, Paint paint);
+    int64_t paintAbove(int64_t limit) override;
 
   private:
+    void beginWindow(const Box& window) override;
+    int64_t bandRows() const override { return mBlur->bandRows(); }
+    void paintBand(const Box& band) override;
+
+    void makePlans(CpuLevel level, const Box& visible, int64_t workingBytes);
     Box partFor(const Box& window) const {
         return intersection(expanded(window, mWeights.radius), mInput.whole());
     }
     BlurInput blurOf(const Box& window, const Box& part, const CoverageRows& grown) const;
     BlurInput largestBlur(const Windows& windows) const;
-    int64_t growthBytes(const Windows& windows) const;
-
-    GrowthInput mInput;
-    BlurWeights mWeights;
-    FullColumns mFull;
-    std::optional<GrowthPlan> mGrowth;
-    std::optional<BlurPlan> mBlur;
-    std::optional<WindowWalk> mWalk;
-    Box mPart = {};  ///< of what has grown, of the window
-};
-
-/// A glow.
-class GlowPainter final : public RowPainter {
-  public:
-    GlowPainter(const CoverageBox& box, const VFBitmap* destination, const GlowRecord& record,
-                GlowSide side, int pad, int64_t workingBytes);
-
-    /// Whether there is anything to paint, and memory for it.
-    explicit operator bool() const { return mIsReady; }
-
-    int64_t paintAbove(int64_t limit) override;
-
-  private:
     void paintBorder(const Box& rows) const;
     void paintCorners(const Box& rows) const;
 
-    PlacedTarget mTarget;
     GlowSide mSide;
     GlowShape mShape;
     ValueColours mColours;
-    std::optional<GrownBlur> mBlur;
     RemainingRows mBorder;
-    bool mIsReady = false;
+    GrowthInput mInput;
+    BlurWeights mWeights;
+    std::optional<GrowthPlan> mGrowth;  ///< and blur: where what is blurred is seen
+    std::optional<BlurPlan> mBlur;
+    Box mPart = {};  ///< of what has grown, of the window
 };
 
 /// Makes a painter of a glow, in windows that take `workingBytes` at most, if they can; none when there

@@ -54,7 +54,8 @@ void internal::begin(std::optional<ShadowPainter>& painter, const VFECore::Param
     if (!meetsItself(box, radius, dx, dy)) {
         // The glyph moved clear of itself: all of it lies in shadow, by its own coverage.
         const PlacedTarget unmoved(level, params->dstBitmap, box.left, box.top);
-        return beginPlain(painter, unmoved, box.rows(), record.mColor);
+        painter.emplace(unmoved, box.rows(), record.mColor);
+        return;
     }
     const PlacedTarget target(level, params->dstBitmap, box.left + dx, box.top + dy);
     beginBlurred(painter, target, box.rows(), BlurPainter::Of::inverse, radius,

@@ -72,7 +72,10 @@ void internal::begin(std::optional<ShadowPainter>& painter, const VFECore::Param
     const PlacedTarget target(chosenLevel(), params->dstBitmap, box.left + offset.x, box.top + offset.y);
     const int radius = shadowRadius(record.mSize);
     // Without blur the coverage itself is the shadow.
-    if (radius == 0) return beginPlain(painter, target, box.rows(), record.mColor);
+    if (radius == 0) {
+        painter.emplace(target, box.rows(), record.mColor);
+        return;
+    }
     beginBlurred(painter, target, box.rows(), BlurPainter::Of::coverage, radius,
                  expanded(wholeOf(box.rows()), radius), record.mColor, workingBytes);
 }

@@ -47,17 +47,19 @@ void begin(std::optional<CoveragePainter>& painter, const VFECore::ParamPostProc
            const VFTextProperty& record);
 
 /// An outline.
-class StrokePainter final : public RowPainter {
+class StrokePainter final : public WindowPainter {
   public:
     StrokePainter(const VFECore::ParamPostProcessing& params, const VFStrokeProperty& record,
                   const CoverageBox& box, int64_t workingBytes);
 
-    explicit operator bool() const { return mWalk.has_value(); }
-
-    int64_t paintAbove(int64_t limit) override;
+    explicit operator bool() const { return mGrown.has_value(); }
 
   private:
-    PlacedTarget mTargets[2];
+    void beginWindow(const Box& window) override;
+    int64_t bandRows() const override { return mGrown->bandRows(); }
+    void paintBand(const Box& band) override;
+
+    PlacedTarget mSecondTarget;
     BlendLoop BlendLoops::*mRule;
     uint32_t mColor;
     DiscShape mDisc;
@@ -66,14 +68,13 @@ class StrokePainter final : public RowPainter {
     // and in what its inverse has.
     std::optional<DilationPlan> mGrown;
     std::optional<DilationPlan> mInverse;
-    std::optional<WindowWalk> mWalk;
 };
 
 void begin(std::optional<StrokePainter>& painter, const VFECore::ParamPostProcessing* params,
            const VFStrokeProperty& record, int64_t workingBytes = kWorkingBytes);
 
 /// One colour through a blur of coverage, or of its inverse.
-class BlurPainter final : public RowPainter {
+class BlurPainter final : public WindowPainter {
   public:
     enum class Of { coverage, inverse };
 
@@ -81,39 +82,52 @@ class BlurPainter final : public RowPainter {
     BlurPainter(CpuLevel level, const PlacedTarget& target, const CoverageRows& coverage, Of of,
                 int radius, const Box& part, uint32_t color, int64_t workingBytes);
 
-    explicit operator bool() const { return static_cast<bool>(mBlur); }
-
-    int64_t paintAbove(int64_t limit) override;
+    explicit operator bool() const { return static_cast<bool>(mPlan); }
 
   private:
-    PlacedTarget mTarget;
+    void beginWindow(const Box& window) override { mPlan.begin(mInput.of(window)); }
+    int64_t bandRows() const override { return mPlan.bandRows(); }
+    void paintBand(const Box& band) override;
+
     uint32_t mColor;
     BlurWeights mWeights;
-    WindowedBlur mBlur;
+    BlurInput mInput;
+    Windows mWindows;
+    BlurPlan mPlan;
 };
 
 /// A shadow, by one of two painters.
 class ShadowPainter final : public RowPainter {
   public:
-    int64_t paintAbove(int64_t limit) override {
-        return plain ? plain->paintAbove(limit) : blurred->paintAbove(limit);
+    /// Of coverage as it is.
+    ShadowPainter(const PlacedTarget& target, const CoverageRows& coverage, uint32_t color) {
+        mPlain.emplace(&BlendLoops::dstOverMask, target, coverage, color);
+    }
+    /// Of a blur, as BlurPainter says.
+    ShadowPainter(CpuLevel level, const PlacedTarget& target, const CoverageRows& coverage,
+                  BlurPainter::Of of, int radius, const Box& part, uint32_t color,
+                  int64_t workingBytes) {
+        mBlurred.emplace(level, target, coverage, of, radius, part, color, workingBytes);
     }
 
     /// How far a core's shadow is moved.
     static ShadowOffset offsetOf(const VFOuterShadow& core) { return {core.mOffsetX, core.mOffsetY}; }
 
-    std::optional<CoveragePainter> plain;
-    std::optional<BlurPainter> blurred;
+    explicit operator bool() const { return mPlain || *mBlurred; }
+
+    int64_t paintAbove(int64_t limit) override {
+        return mPlain ? mPlain->paintAbove(limit) : mBlurred->paintAbove(limit);
+    }
+
+  private:
+    std::optional<CoveragePainter> mPlain;
+    std::optional<BlurPainter> mBlurred;
 };
 
-/// Makes one of coverage as it is.
-void beginPlain(std::optional<ShadowPainter>& painter, const PlacedTarget& target,
-                const CoverageRows& coverage, uint32_t color);
-/// Makes one of a blur, in a part in the coordinates of the coverage.
+/// Makes one of the blur of a part in the coordinates of the coverage.
 void beginBlurred(std::optional<ShadowPainter>& painter, const PlacedTarget& target,
                   const CoverageRows& coverage, BlurPainter::Of of, int radius, const Box& part,
                   uint32_t color, int64_t workingBytes);
-
 void begin(std::optional<ShadowPainter>& painter, const VFECore::ParamPostProcessing* params,
            const VFOuterShadowProperty& record, const ShadowOffset& offset,
            int64_t workingBytes = kWorkingBytes);

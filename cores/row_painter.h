@@ -6,6 +6,8 @@
 
 #include "core/box.h"
 #include "core/float_state.h"
+#include "core/windows.h"
+#include "cores/placed_target.h"
 
 namespace VFontEffect::internal {
 
@@ -26,6 +28,28 @@ class RowPainter {
 
   protected:
     ~RowPainter() = default;
+};
+
+/// One that paints a part of a picture in windows.
+class WindowPainter : public RowPainter, protected WindowBands {
+  public:
+    int64_t paintAbove(int64_t limit) override {
+        if (!mWalk) return limit;
+        return mTarget.destinationRow(mWalk->goAbove(mTarget.ownRow(limit), *this));
+    }
+
+  protected:
+    /// Without windows it paints nothing.
+    explicit WindowPainter(const PlacedTarget& target) : mTarget(target) {}
+    ~WindowPainter() = default;
+
+    /// In the coordinates of the picture that lies on the target.
+    void setWindows(const Windows& windows) { mWalk.emplace(windows); }
+
+    PlacedTarget mTarget;
+
+  private:
+    std::optional<WindowWalk> mWalk;
 };
 
 /// The part that an effect has not painted yet.

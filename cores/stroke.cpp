@@ -35,8 +35,8 @@ namespace internal {
 
 StrokePainter::StrokePainter(const VFECore::ParamPostProcessing& params, const VFStrokeProperty& record,
                              const CoverageBox& box, int64_t workingBytes)
-    : mTargets{{chosenLevel(), params.dstBitmap, box.left, box.top},
-               {chosenLevel(), params.subDstBitmap, box.left, box.top}},
+    : WindowPainter({chosenLevel(), params.dstBitmap, box.left, box.top}),
+      mSecondTarget(chosenLevel(), params.subDstBitmap, box.left, box.top),
       mRule(&BlendLoops::dstOverMask),
       mColor(record.mColor),
       mDisc(StrokeShape(record).radiusPx) {
@@ -47,7 +47,7 @@ StrokePainter::StrokePainter(const VFECore::ParamPostProcessing& params, const V
     const CpuLevel level = chosenLevel();
     const DilationInput grown = {box.rows(shape.growsGlyph ? kAsIs : kInverse), mDisc};
     const Box reached = DilationPlan::reached(grown);
-    const Box visible = boundingBox(mTargets[0].seen(reached), mTargets[1].seen(reached));
+    const Box visible = boundingBox(mTarget.seen(reached), mSecondTarget.seen(reached));
     if (visible.empty()) return;
     const int64_t plans = isCentred ? 2 : 1;
     const auto bytesOfPlan = [&](const Windows& cut) {
@@ -61,28 +61,19 @@ StrokePainter::StrokePainter(const VFECore::ParamPostProcessing& params, const V
     if (isCentred)
         mInverse.emplace(level, DilationInput{box.rows(kInverse), mDisc}, mMemory->data() + bytes,
                          bytes);
-    mWalk.emplace(windows);
+    setWindows(windows);
 }
 
-int64_t StrokePainter::paintAbove(int64_t limit) {
-    struct Bands {
-        StrokePainter& stroke;
+void StrokePainter::beginWindow(const Box& window) {
+    mGrown->begin(window);
+    if (mInverse) mInverse->begin(window);
+}
 
-        void begin(const Box& window) {
-            stroke.mGrown->begin(window);
-            if (stroke.mInverse) stroke.mInverse->begin(window);
-        }
-        int64_t bandRows() const { return stroke.mGrown->bandRows(); }
-        void paint(const Box& band) {
-            const CoverageRows rows =
-                stroke.mInverse ? stroke.mGrown->minRows(*stroke.mInverse, band.top, band.height())
-                                : stroke.mGrown->rows(band.top, band.height());
-            for (const PlacedTarget& target : stroke.mTargets)
-                target.paintCoverage(stroke.mRule, rows, band.left, band.top, stroke.mColor);
-        }
-    };
-    const PlacedTarget& target = mTargets[0];
-    return target.destinationRow(mWalk->goAbove(target.ownRow(limit), Bands{*this}));
+void StrokePainter::paintBand(const Box& band) {
+    const CoverageRows rows = mInverse ? mGrown->minRows(*mInverse, band.top, band.height())
+                                       : mGrown->rows(band.top, band.height());
+    for (const PlacedTarget* target : {&mTarget, &mSecondTarget})
+        target->paintCoverage(mRule, rows, band.left, band.top, mColor);
 }
 
 void begin(std::optional<StrokePainter>& painter, const VFECore::ParamPostProcessing* params,

@@ -40,44 +40,11 @@ class BlurPlan {
     int64_t mNextRow = 0;
 };
 
-/// A blur in windows that take `workingBytes` at most, if they can, as far as its rows are asked for. It
-/// is ready, or empty when memory ran out.
-class WindowedBlur {
-  public:
-    /// The input's weights must outlive it.
-    WindowedBlur(CpuLevel level, const BlurInput& input, int64_t workingBytes)
-        : WindowedBlur(level, input, windowsFor(level, input, workingBytes)) {}
-
-    explicit operator bool() const { return static_cast<bool>(mPlan); }
-
-    /// Calls paint(part, rows) for the bands of the input's window that end above a row and were not
-    /// painted yet, `part` being a band's box. Returns the row above which nothing is left.
-    template <class Paint>
-    int64_t paintAbove(int64_t limit, Paint paint) {
-        struct Bands {
-            WindowedBlur& blur;
-            Paint& paintRows;
-
-            void begin(const Box& window) { blur.mPlan.begin(blur.mInput.of(window)); }
-            int64_t bandRows() const { return blur.mPlan.bandRows(); }
-            void paint(const Box& band) { paintRows(band, blur.mPlan.rows(band.top, band.height())); }
-        };
-        return mWalk.goAbove(limit, Bands{*this, paint});
-    }
-
-  private:
-    static Windows windowsFor(CpuLevel level, const BlurInput& input, int64_t workingBytes) {
-        return windowsWithin(workingBytes, input.window, input.weights.radius, [&](const Windows& cut) {
-            return BlurPlan::memoryBytes(level, input.largestOf(cut));
-        });
-    }
-
-    WindowedBlur(CpuLevel level, const BlurInput& input, const Windows& windows)
-        : mInput(input), mPlan(level, input.largestOf(windows), windows.memoryBytes), mWalk(windows) {}
-
-    BlurInput mInput;
-    BlurPlan mPlan;
-    WindowWalk mWalk;
-};
+/// Windows of a blur that take `workingBytes` at most, if they can.
+inline Windows blurWindows(CpuLevel level, const BlurInput& input, int64_t workingBytes) {
+    return windowsWithin(workingBytes, input.window, input.weights.radius, [&](const Windows& cut) {
+        return BlurPlan::memoryBytes(level, input.largestOf(cut));
+    });
+}
 
 }  // namespace VFontEffect::internal

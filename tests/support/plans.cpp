@@ -147,11 +147,15 @@ std::vector<uint8_t> blurredByDifferences(const BlurInput& input, const WindowSi
 }
 
 std::vector<uint8_t> blurred(const BlurInput& input) {
-    WindowedBlur blur(chosenLevel(), input, INT64_MAX);
-    if (!blur) return {};
+    BlurPlan plan(chosenLevel(), input, BlurPlan::memoryBytes(chosenLevel(), input));
+    if (!plan) return {};
     Collected values(input.window);
-    blur.paintAbove(input.window.bottom,
-                    [&](const Box& band, const BlurredRows& rows) { values.put(band, rows); });
+    plan.begin(input);
+    const Box& window = input.window;
+    for (int64_t y = window.top; y < window.bottom; y += plan.bandRows()) {
+        const int64_t end = std::min(y + plan.bandRows(), window.bottom);
+        values.put({window.left, y, window.right, end}, plan.rows(y, end - y));
+    }
     return values.values();
 }
 

@@ -14,6 +14,7 @@ namespace {
 using namespace vorel_test;
 using VFontEffect::internal::Box;
 using VFontEffect::internal::intersection;
+using VFontEffect::internal::WindowBands;
 using VFontEffect::internal::Windows;
 using VFontEffect::internal::windowsWithin;
 using VFontEffect::internal::WindowWalk;
@@ -50,20 +51,16 @@ TEST(Windows, HaveEachPixelOnce) {
 }
 
 /// Notes how often each pixel is painted, and where.
-struct Noted {
-    const Windows& windows;
-    std::vector<int>& painted;
-    Box& window;
-    int64_t& next;
-    int64_t limit;
+struct Noted : WindowBands {
+    explicit Noted(const Box& all)
+        : part(all), painted(static_cast<size_t>(part.width() * part.height())) {}
 
-    void begin(const Box& begun) {
+    void beginWindow(const Box& begun) override {
         window = begun;
         next = begun.top;
     }
-    int64_t bandRows() const { return 3; }
-    void paint(const Box& band) {
-        const Box& part = windows.part;
+    int64_t bandRows() const override { return 3; }
+    void paintBand(const Box& band) override {
         ASSERT_EQ(next, band.top);
         ASSERT_EQ(band, (Box{window.left, next, window.right, std::min(next + 3, window.bottom)}));
         ASSERT_LE(band.bottom, limit);
@@ -73,6 +70,12 @@ struct Noted {
                 ++painted[static_cast<size_t>(y * part.width() + x)];
         }
     }
+
+    Box part;
+    std::vector<int> painted;
+    Box window = {};
+    int64_t next = 0;
+    int64_t limit = 0;
 };
 
 TEST(WindowWalk, PaintsEachPixelOnce_NoneBelowTheLimitAndAllAboveWhatItReturns) {
@@ -82,11 +85,11 @@ TEST(WindowWalk, PaintsEachPixelOnce_NoneBelowTheLimitAndAllAboveWhatItReturns) 
         const Box part = {left, top, left + random.between(1, 30), top + random.between(1, 30)};
         const Windows windows = {part, random.between(1, 31), random.between(1, 31)};
         WindowWalk walk(windows);
-        std::vector<int> painted(static_cast<size_t>(part.width() * part.height()));
-        Box window = {};
-        int64_t next = 0;
+        Noted noted(part);
+        const std::vector<int>& painted = noted.painted;
         for (int64_t limit = top - 5; limit < part.bottom; limit += random.between(0, 9)) {
-            const int64_t done = walk.goAbove(limit, Noted{windows, painted, window, next, limit});
+            noted.limit = limit;
+            const int64_t done = walk.goAbove(limit, noted);
             ASSERT_LE(done, limit);
             // What waits is a band, or a row of windows that lie side by side.
             ASSERT_GT(done, limit - (windows.areCutAcross() ? windows.height : 3));
@@ -95,8 +98,8 @@ TEST(WindowWalk, PaintsEachPixelOnce_NoneBelowTheLimitAndAllAboveWhatItReturns) 
             ASSERT_EQ(std::count(painted.begin(), end, 1), end - painted.begin());
             ASSERT_EQ(std::count(end, painted.end(), 0), painted.end() - end);
         }
-        const int64_t last = part.bottom + random.between(0, 100);
-        ASSERT_EQ(last, walk.goAbove(last, Noted{windows, painted, window, next, last}));
+        noted.limit = part.bottom + random.between(0, 100);
+        ASSERT_EQ(noted.limit, walk.goAbove(noted.limit, noted));
         ASSERT_EQ(painted, std::vector<int>(painted.size(), 1));
     });
 }
