@@ -63,7 +63,8 @@ void VFEffect::doEffectPostProcessing() {
 
     const RunBitmaps run = {mDstBitmap, mUseOuterLayer == 1 ? mOuterLayer : nullptr, mSrcBitmap,
                             &mTextRect};
-    if (const int64_t rows = stripRowsFor(run)) return paintInStrips(mEffects, run, rows);
+    const int64_t stripRows = stripRowsFor(run);
+    if (stripRows > 0 && paintInStrips(mEffects, run, stripRows)) return;
     for (VFECore* core : mEffects) {
         VFECore::ParamPostProcessing params = run.paramsFor(*core);
         core->doPostProcessing(&params);

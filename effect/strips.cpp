@@ -1,6 +1,8 @@
 #include "effect/strips.h"
 
 #include <algorithm>
+#include <memory>
+#include <new>
 #include <optional>
 
 #include "core/assert.h"
@@ -71,6 +73,8 @@ namespace {
 /// The painters of a run, in its order: of each kind there is one at most.
 class RunPainters {
   public:
+    RunPainters() {}  // nothing is cleared
+
     void add(VFECore& core, const VFECore::ParamPostProcessing& params) {
         VFProperty* const record = core.getProperty();
         if (record == nullptr) return;
@@ -132,15 +136,18 @@ class RunPainters {
 
 }  // namespace
 
-void paintInStrips(const std::vector<VFECore*>& cores, const RunBitmaps& run, int64_t stripRows) {
+bool paintInStrips(const std::vector<VFECore*>& cores, const RunBitmaps& run, int64_t stripRows) {
+    // All painters together take more than the rest of a small stack.
+    const std::unique_ptr<RunPainters> painters(new (std::nothrow) RunPainters);
+    if (!painters) return false;
     const OwnFloatState floatState;
-    RunPainters painters;
     for (VFECore* core : cores)
-        painters.add(*core, run.paramsFor(*core));
+        painters->add(*core, run.paramsFor(*core));
     const MaskView mask = MaskView::of(run.mask);
     for (int64_t limit = stripRows; limit < mask.height; limit += stripRows)
-        painters.paintAbove(limit);
-    painters.paintAbove(kAllRows);
+        painters->paintAbove(limit);
+    painters->paintAbove(kAllRows);
+    return true;
 }
 
 }  // namespace VFontEffect::internal

@@ -25,7 +25,9 @@ struct RunBitmaps {
 int64_t stripRowsFor(const RunBitmaps& run);
 
 /// Paints what doPostProcessing of one core after the other does. Each effect has its working memory
-/// before any of them paints, and without it paints nothing.
-void paintInStrips(const std::vector<VFECore*>& cores, const RunBitmaps& run, int64_t stripRows);
+/// before any of them paints, and without it paints nothing. Returns false, with nothing painted, when
+/// there is no memory to begin with.
+[[nodiscard]] bool paintInStrips(const std::vector<VFECore*>& cores, const RunBitmaps& run,
+                                 int64_t stripRows);
 
 }  // namespace VFontEffect::internal

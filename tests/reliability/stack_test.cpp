@@ -61,6 +61,14 @@ void paintAndCompare() {
     gSame = paintsAsExpected(gLook);
 }
 
+/// On a picture that effects paint by turns.
+void paintLarge() {
+    Kit<VFontEffect::VFEffect> kit;
+    VFontEffect::VFEffect set;
+    describe(gLook, set, kit);
+    paintedRun(set, wholeMask(), {1024, 4200, 500, 2000});
+}
+
 void nothing() {}
 
 TEST(Stack, WholeLooks_UseLittleOfIt) {
@@ -78,6 +86,17 @@ TEST(Stack, WholeLooks_UseLittleOfIt) {
         most = std::max(most, used);
     }
     std::printf("[ stack    ] %zu bytes at most\n", most);
+}
+
+TEST(Stack, LargePictures_UseLittleOfIt) {
+    if (kSanitized) GTEST_SKIP() << "a sanitizer's frames are its own";
+    MeasuredStack stack;
+    const size_t own = stack.usedBy(nothing);
+    for (const WholeLook look : kWholeLooks) {
+        gLook = look;
+        paintLarge();
+        EXPECT_LE(stack.usedBy(paintLarge) - own, kAllowed) << "bytes of stack, look " << look;
+    }
 }
 
 TEST(Stack, ThreadOfSixteenKilobytes_PaintsWholeLooks) {

@@ -122,8 +122,8 @@ void paintWithin(int64_t workingBytes, int64_t stripRows, int type, const VFProp
     }
 }
 
-void paintByTurns(const std::vector<VFECore*>& cores, const RunBitmaps& run, int64_t stripRows) {
-    paintInStrips(cores, run, stripRows);
+bool paintByTurns(const std::vector<VFECore*>& cores, const RunBitmaps& run, int64_t stripRows) {
+    return paintInStrips(cores, run, stripRows);
 }
 
 int64_t rowsOfStrips(const RunBitmaps& run) {

@@ -21,8 +21,8 @@ VF_API void paintWithin(int64_t workingBytes, int64_t stripRows, int type,
                         const VFontEffect::VFProperty& record,
                         const VFontEffect::VFECore::ParamPostProcessing* params);
 
-/// Paints with all cores by turns, strips of so many rows each.
-VF_API void paintByTurns(const std::vector<VFontEffect::VFECore*>& cores,
+/// Paints with all cores by turns, strips of so many rows each; false when memory ran out at once.
+VF_API bool paintByTurns(const std::vector<VFontEffect::VFECore*>& cores,
                          const VFontEffect::internal::RunBitmaps& run, int64_t stripRows);
 
 /// The rows of strips for a run, 0 for none.

@@ -114,7 +114,7 @@ TEST(Strips, OfAllHeights_HaveTheBytesOfOneEffectAfterTheOther) {
         Layers actual(scene, outer);
         paintInTurn(order, expected);
         const int rows = random.between(1, 50);
-        paintByTurns(order, actual.run(), rows);
+        ASSERT_TRUE(paintByTurns(order, actual.run(), rows));
         ASSERT_EQ(bytesOf(expected.destination), bytesOf(actual.destination)) << rows << " rows";
         ASSERT_EQ(bytesOf(expected.outer), bytesOf(actual.outer)) << rows << " rows";
     });
@@ -127,7 +127,7 @@ TEST(Strips, AMovedShadow_StaysWhereItsCoreHasItWhateverItsRecordSaysNow) {
     Layers expected(scene, scene.dst);
     Layers actual(scene, scene.dst);
     paintInTurn({core.get()}, expected);
-    paintByTurns({core.get()}, actual.run(), 4);
+    ASSERT_TRUE(paintByTurns({core.get()}, actual.run(), 4));
     EXPECT_EQ(bytesOf(expected.destination), bytesOf(actual.destination));
     EXPECT_NE(bytesOf(expected.destination), bytesOf(bitmapOf(scene.dst)));
 }
