@@ -65,6 +65,11 @@ CoreJob::MakeCore coreWith(Record record) {
     };
 }
 
+/// The cores of a linear and a radial gradient along rampStops(), and of a pattern of tileBytes().
+CoreJob::MakeCore linearFill();
+CoreJob::MakeCore radialFill();
+CoreJob::MakeCore patternFill();
+
 /// The core and its literal form, in a layer whose margin is a little wider than their reach. A figure
 /// is per pixel of the box grown by `reach`.
 void addCoreCases(Cases& cases, const std::string& row, const Workload& workload, int reach,

@@ -44,6 +44,15 @@ def goals():
             ("B", "TITLE160", 160, 400), ("C", "LINE48", 120, 250), ("C", "TITLE160", 400, 800),
             ("A", "GLYPH48", 8, 15)):
         listed += each("us", [f"look/{look}/{line}"], best, narrow)
+    # Against the literal form on the machine of the run.
+    for look, best, narrow in (("B", 36, 20), ("C", 25, 15)):
+        listed += each("timesLiteral", [f"look/{look}/TITLE160"], best, narrow)
+    # What is more than one source-over, and what another library has as well.
+    listed += each("overRow", ["blend/mask-mode7/text/512x128", "blend/composite/text/512x128"], 1.5, 1.5,
+                   other="blend/src-over/text/512x128")
+    listed += each("timesPeer", [f"blend/{operation}/random/512x128" for operation in
+                                 ("src-over", "dst-over", "mask-mode1", "mask-mode2")],
+                   None, round(1 / 1.3, 2), peer="pixman")
     # The modern face against the classes, glyph by glyph.
     for onto in ("picture", "page"):
         listed += each("overRow", [f"look/glyphs/{onto}/painter"], 1.1, 1.1,

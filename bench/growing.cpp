@@ -3,6 +3,7 @@
 #include <cstdio>
 #include <limits>
 #include <memory>
+#include <regex>
 #include <string>
 #include <utility>
 #include <vector>
@@ -15,7 +16,9 @@
 /// What a pixel takes in pictures of any size: each look on square pictures, by their side in pixels.
 /// Text covers a third of each one, its middle, so that larger ones hold more of the same.
 ///
-///     voreleffect_growing
+///     voreleffect_growing [LOOKS]
+///
+///     LOOKS   a regular expression for the rows to measure: look/A ...
 namespace {
 
 using namespace vorel_bench;
@@ -41,8 +44,9 @@ double nanosecondsAPixel(const Case& which) {
 
 }  // namespace
 
-int main() {
+int main(int argc, char** argv) {
     keepLargeBlocks();
+    const std::regex wanted(argc > 1 ? argv[1] : ".");
     std::printf("| ns/px  | level   |");
     for (const int side : kSides)
         std::printf(" %6d |", side);
@@ -54,6 +58,7 @@ int main() {
     for (const int side : kSides)
         pictures.push_back(pictureOf(side));
     for (const char look : kLooks) {
+        if (!std::regex_search(std::string("look/") + look, wanted)) continue;
         for (const Level& level : levels()) {
             level.choose();
             std::printf("| look/%c | %-7s |", look, level.label.c_str());

@@ -9,7 +9,6 @@
 
 #include "core_jobs.h"
 #include "fastest_call.h"
-#include "fill_paint.h"
 #include "hostile_masks.h"
 #include "level.h"
 
@@ -66,29 +65,13 @@ void addBlurs(std::vector<Effect>& effects) {
     }
 }
 
-void addFills(std::vector<Effect>& effects) {
-    effects.push_back({"fill/linear", 0, [] {
-                           std::vector<VFGradient> ramp = rampStops<VFGradient>();
-                           return coreWith<VFLinearGradient>(VFLinearGradientProperty(
-                               90.0F, 1.0F, 1.0F, static_cast<int>(ramp.size()), ramp.data()))();
-                       }});
-    effects.push_back({"fill/radial", 0, [] {
-                           std::vector<VFGradient> ramp = rampStops<VFGradient>();
-                           return coreWith<VFRadialGradient>(VFRadialGradientProperty(
-                               0.0F, 1.0F, 1.0F, static_cast<int>(ramp.size()), ramp.data()))();
-                       }});
-    effects.push_back({"fill/pattern", 0, [] {
-                           std::vector<uint8_t> bytes = tileBytes();
-                           VFBitmap tile(kTileSide, kTileSide, bytes.data(), 4);
-                           return coreWith<VFPattern>(VFPatternProperty(&tile, kTileScale, 1.0F))();
-                       }});
-}
-
 std::vector<Effect> allEffects() {
     std::vector<Effect> effects;
     addStrokes(effects);
     addBlurs(effects);
-    addFills(effects);
+    effects.push_back({"fill/linear", 0, linearFill()});
+    effects.push_back({"fill/radial", 0, radialFill()});
+    effects.push_back({"fill/pattern", 0, patternFill()});
     return effects;
 }
 

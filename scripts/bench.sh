@@ -9,7 +9,8 @@
 #
 #     --peers          OpenCV, pixman, cairo, libass and FreeType's stroker on the same masks
 #     --quick          fewer and shorter repetitions
-#     --filter REGEX   only the rows that it finds; figures of a row end in its maker: /best, /literal ...
+#     --filter REGEX   only the rows that it finds; figures of a row end in its maker: /best, /literal ...;
+#                      not with --costs
 #     --save FILE      keeps the run
 #     --compare FILE   adds the change against a kept run
 #     --counts         instructions instead of time, under callgrind
@@ -41,6 +42,10 @@ while [[ $# -gt 0 ]]; do
     esac
     shift
 done
+if [[ $alone == costs && -n $filter ]]; then
+    echo 'scripts/bench.sh: --costs takes no --filter' >&2
+    exit 2
+fi
 [[ -z $document || -n $alone ]] || peers=ON counts=yes
 
 need_packages cmake ninja-build clang-14 pkg-config libbenchmark-dev libfreetype-dev fonts-dejavu-core python3

@@ -31,6 +31,12 @@ Layout& layOut(const Dilation& dilation, uint8_t* memory) {
     return layout;
 }
 
+/// Where numbers stand that change from band to band.
+template <class Layout>
+VOREL_INLINE Layout& keptIn(uint8_t* memory) {
+    return *reinterpret_cast<Layout*>(memory);
+}
+
 /// By value: stores of bytes could change what stands in memory, for all that a compiler knows.
 template <class Layout>
 VOREL_INLINE Layout layoutIn(const uint8_t* memory) {

@@ -315,7 +315,7 @@ inline U8s dilatedVector(const SquareLayout& layout, const uint8_t* place) {
 }
 
 inline uint8_t* rowsBySquares(const Dilation& dilation, uint8_t* memory, int64_t y, int64_t count) {
-    SquareLayout& kept = *reinterpret_cast<SquareLayout*>(memory);
+    SquareLayout& kept = keptIn<SquareLayout>(memory);
     const int64_t reach = dilation.disc->reach;
     const int64_t end = y + count + reach;
     if (end - kept.firstRow > kept.rows.count) dropRows(kept, y - reach);

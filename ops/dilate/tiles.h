@@ -482,7 +482,7 @@ inline uint8_t* rowsByTiles(const Dilation& dilation, uint8_t* memory, int64_t y
         dilateRowByTiles(dilation, planes, y + i, results, allowance);
         allowance += kAllowancePerTile * (planes.endTile - planes.firstTile);
     }
-    reinterpret_cast<TileLayout*>(memory)->allowance = allowance;
+    keptIn<TileLayout>(memory).allowance = allowance;
     return allowance >= 0 ? planes.results : nullptr;
 }
 
