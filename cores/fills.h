@@ -11,8 +11,8 @@
 #include "ops/tile/tile_plan.h"
 #include "voreleffect/VFECore.h"
 
-/// What paints gradients and patterns. Each begin() makes a painter of what the core of the record does;
-/// none when there is nothing to paint, or no memory for it.
+/// What paints gradients and patterns. Each begin() makes a painter of what the core of the record does,
+/// or none when there is nothing to paint. It returns false when memory ran out.
 namespace VFontEffect::internal {
 
 /// A gradient or pattern below this scale draws nothing. A NaN is not below it.
@@ -66,8 +66,9 @@ class LinearPainter final : public RowPainter {
     LinearRamp mRamp;
 };
 
-void begin(std::optional<LinearPainter>& painter, const VFECore::ParamPostProcessing* params,
-           const VFLinearGradientProperty& record);
+[[nodiscard]] bool begin(std::optional<LinearPainter>& painter,
+                         const VFECore::ParamPostProcessing* params,
+                         const VFLinearGradientProperty& record);
 
 class RadialPainter final : public RowPainter {
   public:
@@ -83,8 +84,9 @@ class RadialPainter final : public RowPainter {
     RadialRamp mRamp;
 };
 
-void begin(std::optional<RadialPainter>& painter, const VFECore::ParamPostProcessing* params,
-           const VFRadialGradientProperty& record);
+[[nodiscard]] bool begin(std::optional<RadialPainter>& painter,
+                         const VFECore::ParamPostProcessing* params,
+                         const VFRadialGradientProperty& record);
 
 class PatternPainter final : public RowPainter {
   public:
@@ -102,7 +104,7 @@ class PatternPainter final : public RowPainter {
     TilePlan mTiles;
 };
 
-void begin(std::optional<PatternPainter>& painter, const VFECore::ParamPostProcessing* params,
-           const VFPatternProperty& record);
+[[nodiscard]] bool begin(std::optional<PatternPainter>& painter,
+                         const VFECore::ParamPostProcessing* params, const VFPatternProperty& record);
 
 }  // namespace VFontEffect::internal

@@ -138,6 +138,7 @@ int64_t GlowPainter::paintAbove(int64_t limit) {
     const int64_t done = WindowPainter::paintAbove(limit);
     if (mSide == GlowSide::inside) {
         const Box rows = mBorder.takenAbove(mTarget.ownRow(done));
+        if (rows.empty()) return done;
         paintBorder(rows);
         if (mShape.radius == 0) paintCorners(rows);
     }
@@ -181,18 +182,32 @@ void GlowPainter::paintCorners(const Box& rows) const {
     }
 }
 
-void begin(std::optional<GlowPainter>& painter, const VFECore::ParamPostProcessing* params,
-           const GlowRecord& record, GlowSide side, int64_t workingBytes) {
+namespace {
+
+bool beginGlow(std::optional<GlowPainter>& painter, const VFECore::ParamPostProcessing* params,
+               const GlowRecord& record, GlowSide side, int64_t workingBytes) {
     const CoverageBox box = coverageOf(params);
     const int pad = saturateToInt(int64_t{toInt(record.sizePx)} + 1);
     // With no padding at all (a size of -1) the image would be clear, as it is with a size of 0.
-    if (!box || exceedsSizeLimit(record.sizePx) || pad <= 0 || record.sizePx == 0.0F) return;
+    if (!box || exceedsSizeLimit(record.sizePx) || pad <= 0 || record.sizePx == 0.0F) return true;
     const CpuLevel level = chosenLevel();
     const PlacedTarget target(level, params->dstBitmap, box.left, box.top);
     const GlowShape shape = GlowShape::of(box, pad);
-    if (target.seen(shape.image).empty()) return;
+    if (target.seen(shape.image).empty()) return true;
     painter.emplace(level, target, record, side, box.rows(), shape, workingBytes);
-    if (!*painter) painter.reset();
+    return static_cast<bool>(*painter);
+}
+
+}  // namespace
+
+bool begin(std::optional<GlowPainter>& painter, const VFECore::ParamPostProcessing* params,
+           const VFOuterGlowProperty& record, int64_t workingBytes) {
+    return beginGlow(painter, params, GlowRecord::of(&record), GlowSide::outside, workingBytes);
+}
+
+bool begin(std::optional<GlowPainter>& painter, const VFECore::ParamPostProcessing* params,
+           const VFInnerGlowProperty& record, int64_t workingBytes) {
+    return beginGlow(painter, params, GlowRecord::of(&record), GlowSide::inside, workingBytes);
 }
 
 }  // namespace VFontEffect::internal

@@ -116,9 +116,11 @@ class GlowPainter final : public WindowPainter {
     Box mPart = {};  ///< of what has grown, of the window
 };
 
-/// Makes a painter of a glow, in windows that take `workingBytes` at most, if they can; none when there
-/// is nothing to paint, or no memory for it.
-void begin(std::optional<GlowPainter>& painter, const VFECore::ParamPostProcessing* params,
-           const GlowRecord& record, GlowSide side, int64_t workingBytes = kWorkingBytes);
+/// Make a painter of a glow, in windows that take `workingBytes` at most, if they can, or none when
+/// there is nothing to paint. Return false when memory ran out.
+[[nodiscard]] bool begin(std::optional<GlowPainter>& painter, const VFECore::ParamPostProcessing* params,
+                         const VFOuterGlowProperty& record, int64_t workingBytes = kWorkingBytes);
+[[nodiscard]] bool begin(std::optional<GlowPainter>& painter, const VFECore::ParamPostProcessing* params,
+                         const VFInnerGlowProperty& record, int64_t workingBytes = kWorkingBytes);
 
 }  // namespace VFontEffect::internal

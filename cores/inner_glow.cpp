@@ -22,7 +22,7 @@ void VFInnerGlow::increaseByBoxFilter(unsigned char* mask, int passes, int width
 }
 
 void VFInnerGlow::doPostProcessing(ParamPostProcessing* params) {
-    if (mProperty != nullptr) paintAll<GlowPainter>(params, GlowRecord::of(mProperty), GlowSide::inside);
+    if (mProperty != nullptr) paintAll<GlowPainter>(params, *mProperty);
 }
 
 }  // namespace VFontEffect

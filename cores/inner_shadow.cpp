@@ -1,14 +1,11 @@
 #include <cstdint>
 
 #include "core/effect_types.h"
-#include "core/float_state.h"
 #include "core/size_limit.h"
 #include "cores/paint_input.h"
 #include "cores/painters.h"
-#include "cores/placed_target.h"
 #include "cores/property_copy.h"
 #include "cores/shadow_offset.h"
-#include "ops/blur/blur_plan.h"
 #include "voreleffect/VFECore.h"
 
 namespace VFontEffect {
@@ -42,10 +39,10 @@ void VFInnerShadow::doPostProcessing(ParamPostProcessing* params) {
     if (mProperty != nullptr) paintAll<ShadowPainter>(params, *mProperty);
 }
 
-void internal::begin(std::optional<ShadowPainter>& painter, const VFECore::ParamPostProcessing* params,
+bool internal::begin(std::optional<ShadowPainter>& painter, const VFECore::ParamPostProcessing* params,
                      const VFInnerShadowProperty& record, int64_t workingBytes) {
     const CoverageBox box = coverageOf(params);
-    if (!box || exceedsSizeLimit(record.mSize)) return;
+    if (!box || exceedsSizeLimit(record.mSize)) return true;
     const CpuLevel level = chosenLevel();
     const int radius = shadowRadius(record.mSize);
     const ShadowOffset offset = shadowOffset(record.mAngle, record.mDistance);
@@ -55,11 +52,11 @@ void internal::begin(std::optional<ShadowPainter>& painter, const VFECore::Param
         // The glyph moved clear of itself: all of it lies in shadow, by its own coverage.
         const PlacedTarget unmoved(level, params->dstBitmap, box.left, box.top);
         painter.emplace(unmoved, box.rows(), record.mColor);
-        return;
+        return true;
     }
     const PlacedTarget target(level, params->dstBitmap, box.left + dx, box.top + dy);
-    beginBlurred(painter, target, box.rows(), BlurPainter::Of::inverse, radius,
-                 translated(wholeOf(box.rows()), -dx, -dy), record.mColor, workingBytes);
+    return beginBlurred(painter, target, box.rows(), BlurPainter::Of::inverse, radius,
+                        translated(wholeOf(box.rows()), -dx, -dy), record.mColor, workingBytes);
 }
 
 }  // namespace VFontEffect

@@ -49,10 +49,11 @@ int64_t LinearPainter::paintAbove(int64_t limit) {
                             [&](const BlendJob& job, int64_t y) { mLoops.linear(job, y, mRamp); });
 }
 
-void begin(std::optional<LinearPainter>& painter, const VFECore::ParamPostProcessing* params,
+bool begin(std::optional<LinearPainter>& painter, const VFECore::ParamPostProcessing* params,
            const VFLinearGradientProperty& record) {
     const CoverageBox box = coverageOf(params);
     if (box && canFill(record)) painter.emplace(chosenLevel(), box, params->dstBitmap, record);
+    return true;
 }
 
 }  // namespace internal

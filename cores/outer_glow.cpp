@@ -22,8 +22,7 @@ void VFOuterGlow::increaseByBoxFilter(unsigned char* mask, int passes, int width
 }
 
 void VFOuterGlow::doPostProcessing(ParamPostProcessing* params) {
-    if (mProperty != nullptr)
-        paintAll<GlowPainter>(params, GlowRecord::of(mProperty), GlowSide::outside);
+    if (mProperty != nullptr) paintAll<GlowPainter>(params, *mProperty);
 }
 
 }  // namespace VFontEffect

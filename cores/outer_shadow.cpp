@@ -64,20 +64,20 @@ void VFOuterShadow::doPostProcessing(ParamPostProcessing* params) {
         paintAll<ShadowPainter>(params, *mProperty, ShadowOffset{mOffsetX, mOffsetY});
 }
 
-void internal::begin(std::optional<ShadowPainter>& painter, const VFECore::ParamPostProcessing* params,
+bool internal::begin(std::optional<ShadowPainter>& painter, const VFECore::ParamPostProcessing* params,
                      const VFOuterShadowProperty& record, const ShadowOffset& offset,
                      int64_t workingBytes) {
     const CoverageBox box = coverageOf(params);
-    if (!box || exceedsSizeLimit(record.mSize)) return;
+    if (!box || exceedsSizeLimit(record.mSize)) return true;
     const PlacedTarget target(chosenLevel(), params->dstBitmap, box.left + offset.x, box.top + offset.y);
     const int radius = shadowRadius(record.mSize);
     // Without blur the coverage itself is the shadow.
     if (radius == 0) {
         painter.emplace(target, box.rows(), record.mColor);
-        return;
+        return true;
     }
-    beginBlurred(painter, target, box.rows(), BlurPainter::Of::coverage, radius,
-                 expanded(wholeOf(box.rows()), radius), record.mColor, workingBytes);
+    return beginBlurred(painter, target, box.rows(), BlurPainter::Of::coverage, radius,
+                        expanded(wholeOf(box.rows()), radius), record.mColor, workingBytes);
 }
 
 }  // namespace VFontEffect

@@ -19,7 +19,7 @@
 /// patterns in fills.h.
 ///
 /// Each begin() makes a painter of what the core of the record does, in windows that take `workingBytes`
-/// at most, if they can; none when there is nothing to paint, or no memory for it.
+/// at most, if they can, or none when there is nothing to paint. It returns false when memory ran out.
 namespace VFontEffect::internal {
 
 /// One colour through coverage as it is.
@@ -33,7 +33,13 @@ class CoveragePainter final : public RowPainter {
           mColor(color),
           mRest(target.seen(wholeOf(coverage))) {}
 
-    int64_t paintAbove(int64_t limit) override;
+    int64_t paintAbove(int64_t limit) override {
+        const Box part = mRest.takenAbove(mTarget.ownRow(limit));
+        if (part.empty()) return limit;
+        const uint8_t* const mask = mCoverage.start + part.top * mCoverage.stride + part.left;
+        mTarget.paint(mRule, part, mask, mCoverage.stride, mColor);
+        return limit;
+    }
 
   private:
     BlendLoop BlendLoops::*mRule;
@@ -43,16 +49,17 @@ class CoveragePainter final : public RowPainter {
     RemainingRows mRest;
 };
 
-void begin(std::optional<CoveragePainter>& painter, const VFECore::ParamPostProcessing* params,
-           const VFTextProperty& record);
+[[nodiscard]] bool begin(std::optional<CoveragePainter>& painter,
+                         const VFECore::ParamPostProcessing* params, const VFTextProperty& record);
 
 /// An outline.
 class StrokePainter final : public WindowPainter {
   public:
-    StrokePainter(const VFECore::ParamPostProcessing& params, const VFStrokeProperty& record,
-                  const CoverageBox& box, int64_t workingBytes);
+    StrokePainter(const VFECore::ParamPostProcessing& params, const CoverageBox& box,
+                  const StrokeShape& shape, uint32_t color, int64_t workingBytes);
 
-    explicit operator bool() const { return mGrown.has_value(); }
+    /// Whether there was memory for what it paints.
+    explicit operator bool() const { return !mMemory || *mMemory; }
 
   private:
     void beginWindow(const Box& window) override;
@@ -70,8 +77,9 @@ class StrokePainter final : public WindowPainter {
     std::optional<DilationPlan> mInverse;
 };
 
-void begin(std::optional<StrokePainter>& painter, const VFECore::ParamPostProcessing* params,
-           const VFStrokeProperty& record, int64_t workingBytes = kWorkingBytes);
+[[nodiscard]] bool begin(std::optional<StrokePainter>& painter,
+                         const VFECore::ParamPostProcessing* params, const VFStrokeProperty& record,
+                         int64_t workingBytes = kWorkingBytes);
 
 /// One colour through a blur of coverage, or of its inverse.
 class BlurPainter final : public WindowPainter {
@@ -125,13 +133,14 @@ class ShadowPainter final : public RowPainter {
 };
 
 /// Makes one of the blur of a part in the coordinates of the coverage.
-void beginBlurred(std::optional<ShadowPainter>& painter, const PlacedTarget& target,
-                  const CoverageRows& coverage, BlurPainter::Of of, int radius, const Box& part,
-                  uint32_t color, int64_t workingBytes);
-void begin(std::optional<ShadowPainter>& painter, const VFECore::ParamPostProcessing* params,
-           const VFOuterShadowProperty& record, const ShadowOffset& offset,
-           int64_t workingBytes = kWorkingBytes);
-void begin(std::optional<ShadowPainter>& painter, const VFECore::ParamPostProcessing* params,
-           const VFInnerShadowProperty& record, int64_t workingBytes = kWorkingBytes);
+[[nodiscard]] bool beginBlurred(std::optional<ShadowPainter>& painter, const PlacedTarget& target,
+                                const CoverageRows& coverage, BlurPainter::Of of, int radius,
+                                const Box& part, uint32_t color, int64_t workingBytes);
+[[nodiscard]] bool begin(std::optional<ShadowPainter>& painter,
+                         const VFECore::ParamPostProcessing* params, const VFOuterShadowProperty& record,
+                         const ShadowOffset& offset, int64_t workingBytes = kWorkingBytes);
+[[nodiscard]] bool begin(std::optional<ShadowPainter>& painter,
+                         const VFECore::ParamPostProcessing* params, const VFInnerShadowProperty& record,
+                         int64_t workingBytes = kWorkingBytes);
 
 }  // namespace VFontEffect::internal

@@ -49,14 +49,14 @@ int64_t PatternPainter::paintAbove(int64_t limit) {
     });
 }
 
-void begin(std::optional<PatternPainter>& painter, const VFECore::ParamPostProcessing* params,
+bool begin(std::optional<PatternPainter>& painter, const VFECore::ParamPostProcessing* params,
            const VFPatternProperty& record) {
     const CoverageBox box = fillBox(params);
-    if (!box || record.mScale < kSmallestScale) return;
+    if (!box || record.mScale < kSmallestScale) return true;
     const ColourView pattern = ColourView::of(record.mPattern);
-    if (!pattern || pattern.width == 0 || pattern.height == 0) return;
+    if (!pattern || pattern.width == 0 || pattern.height == 0) return true;
     painter.emplace(chosenLevel(), box, params->dstBitmap, pattern, record);
-    if (!*painter) painter.reset();
+    return static_cast<bool>(*painter);
 }
 
 }  // namespace internal

@@ -31,10 +31,11 @@ int64_t RadialPainter::paintAbove(int64_t limit) {
                             [&](const BlendJob& job, int64_t y) { mLoops.radial(job, y, mRamp); });
 }
 
-void begin(std::optional<RadialPainter>& painter, const VFECore::ParamPostProcessing* params,
+bool begin(std::optional<RadialPainter>& painter, const VFECore::ParamPostProcessing* params,
            const VFRadialGradientProperty& record) {
     const CoverageBox box = coverageOf(params);
     if (box && canFill(record)) painter.emplace(chosenLevel(), box, params->dstBitmap, record);
+    return true;
 }
 
 }  // namespace internal

@@ -22,8 +22,9 @@ class RowPainter {
     RowPainter(const RowPainter&) = delete;
     RowPainter& operator=(const RowPainter&) = delete;
 
-    /// Goes on with what lies above row `limit` of the mask, and paints nothing below it. Returns the
-    /// row above which nothing is left: effects paint several rows at once, or none of them.
+    /// Goes on with what lies above row `limit` of the targets, and paints nothing below it. Returns the
+    /// row above which nothing is left. It may lie above `limit`: some effects paint bands of several
+    /// rows, which wait until all of a band may be painted.
     virtual int64_t paintAbove(int64_t limit) = 0;
 
   protected:
@@ -69,14 +70,13 @@ class RemainingRows {
     Box mPart;
 };
 
-/// Paints all that an effect has to paint. Each begin() makes a painter if there is anything to paint,
-/// and memory for it: all of that is taken before the first pixel is painted.
+/// Paints all that an effect has to paint. Its begin() makes a painter if there is anything to paint,
+/// with all memory that it needs, and returns false when there is none.
 template <class Painter, class... Arguments>
 void paintAll(const Arguments&... arguments) {
     const OwnFloatState floatState;
     std::optional<Painter> painter;
-    begin(painter, arguments...);
-    if (painter) painter->paintAbove(kAllRows);
+    if (begin(painter, arguments...) && painter) painter->paintAbove(kAllRows);
 }
 
 }  // namespace VFontEffect::internal

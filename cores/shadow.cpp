@@ -22,13 +22,13 @@ void BlurPainter::paintBand(const Box& band) {
     mTarget.paint(&BlendLoops::dstOverMask, band, rows.values, rows.stride, mColor);
 }
 
-void beginBlurred(std::optional<ShadowPainter>& painter, const PlacedTarget& target,
+bool beginBlurred(std::optional<ShadowPainter>& painter, const PlacedTarget& target,
                   const CoverageRows& coverage, BlurPainter::Of of, int radius, const Box& part,
                   uint32_t color, int64_t workingBytes) {
     const Box visible = target.seen(part);
-    if (visible.empty()) return;
+    if (visible.empty()) return true;
     painter.emplace(chosenLevel(), target, coverage, of, radius, visible, color, workingBytes);
-    if (!*painter) painter.reset();
+    return static_cast<bool>(*painter);
 }
 
 }  // namespace VFontEffect::internal

@@ -1,16 +1,12 @@
-#include <algorithm>
 #include <cstdint>
 #include <optional>
 
 #include "core/effect_types.h"
 #include "core/float_state.h"
-#include "core/line_buffer.h"
 #include "core/numeric.h"
 #include "core/size_limit.h"
-#include "core/windows.h"
 #include "cores/paint_input.h"
 #include "cores/painters.h"
-#include "cores/placed_target.h"
 #include "cores/property_copy.h"
 #include "cores/stroke_shape.h"
 #include "ops/dilate/dilation_plan.h"
@@ -33,15 +29,14 @@ void VFStroke::doPostProcessing(ParamPostProcessing* params) {
 
 namespace internal {
 
-StrokePainter::StrokePainter(const VFECore::ParamPostProcessing& params, const VFStrokeProperty& record,
-                             const CoverageBox& box, int64_t workingBytes)
+StrokePainter::StrokePainter(const VFECore::ParamPostProcessing& params, const CoverageBox& box,
+                             const StrokeShape& shape, uint32_t color, int64_t workingBytes)
     : WindowPainter({chosenLevel(), params.dstBitmap, box.left, box.top}),
       mSecondTarget(chosenLevel(), params.subDstBitmap, box.left, box.top),
       mRule(&BlendLoops::dstOverMask),
-      mColor(record.mColor),
-      mDisc(StrokeShape(record).radiusPx) {
+      mColor(color),
+      mDisc(shape.radiusPx) {
     if (!mDisc) return;
-    const StrokeShape shape(record);
     const bool isCentred = shape.side == StrokeSide::centre;
     if (isCentred && params.useOuterLayer != 1) mRule = &BlendLoops::srcOverMask;
     const CpuLevel level = chosenLevel();
@@ -76,12 +71,12 @@ void StrokePainter::paintBand(const Box& band) {
         target->paintCoverage(mRule, rows, band.left, band.top, mColor);
 }
 
-void begin(std::optional<StrokePainter>& painter, const VFECore::ParamPostProcessing* params,
+bool begin(std::optional<StrokePainter>& painter, const VFECore::ParamPostProcessing* params,
            const VFStrokeProperty& record, int64_t workingBytes) {
     const CoverageBox box = coverageOf(params);
-    if (!box || exceedsSizeLimit(record.mSize)) return;
-    painter.emplace(*params, record, box, workingBytes);
-    if (!*painter) painter.reset();
+    if (!box || exceedsSizeLimit(record.mSize)) return true;
+    painter.emplace(*params, box, StrokeShape(record), record.mColor, workingBytes);
+    return static_cast<bool>(*painter);
 }
 
 }  // namespace internal

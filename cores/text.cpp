@@ -14,25 +14,18 @@ void VFText::doPostProcessing(ParamPostProcessing* params) {
     if (mProperty != nullptr) paintAll<CoveragePainter>(params, *mProperty);
 }
 
-void internal::begin(std::optional<CoveragePainter>& painter, const VFECore::ParamPostProcessing* params,
+bool internal::begin(std::optional<CoveragePainter>& painter, const VFECore::ParamPostProcessing* params,
                      const VFTextProperty& record) {
-    if (params == nullptr || params->dstBitmap == nullptr) return;
+    if (params == nullptr || params->dstBitmap == nullptr) return true;
     const MaskView mask = MaskView::of(params->srcBitmap);
-    if (!mask) return;
+    if (!mask) return true;
     const PlacedTarget target(chosenLevel(), params->dstBitmap, 0, 0);
     // In layered mode the fill only slides beneath what is there; else it also clips everything painted
     // so far to the glyph.
     const auto rule = params->useOuterLayer == 1 ? &BlendLoops::dstOverGate : &BlendLoops::dstOverClip;
     const CoverageRows coverage = {mask.data, mask.width, mask.width, mask.height, kAsIs};
     painter.emplace(rule, target, coverage, record.mColor);
-}
-
-int64_t internal::CoveragePainter::paintAbove(int64_t limit) {
-    const Box part = mRest.takenAbove(mTarget.ownRow(limit));
-    if (part.empty()) return limit;
-    const uint8_t* const mask = mCoverage.start + part.top * mCoverage.stride + part.left;
-    mTarget.paint(mRule, part, mask, mCoverage.stride, mColor);
-    return limit;
+    return true;
 }
 
 }  // namespace VFontEffect

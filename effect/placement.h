@@ -71,4 +71,21 @@ inline const Placement& placementOf(VFECore& core) {
     }
 }
 
+/// What the effects of a run paint into and from.
+struct RunBitmaps {
+    VFBitmap* destination;
+    VFBitmap* outerLayer;  ///< null in a run that is not layered
+    VFBitmap* mask;
+    VFRect* textRect;
+
+    /// What a core is given. Of two targets the destination is the second.
+    VFECore::ParamPostProcessing paramsFor(VFECore& core) const {
+        if (outerLayer == nullptr) return {destination, mask, textRect, 0, nullptr};
+        const Placement& placement = placementOf(core);
+        VFBitmap* const second =
+            placement.inOuterLayer && placement.inDestination ? destination : nullptr;
+        return {placement.inOuterLayer ? outerLayer : destination, mask, textRect, 1, second};
+    }
+};
+
 }  // namespace VFontEffect::internal

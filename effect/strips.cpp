@@ -13,18 +13,8 @@
 #include "cores/glow.h"
 #include "cores/painters.h"
 #include "cores/row_painter.h"
-#include "effect/placement.h"
 
 namespace VFontEffect::internal {
-
-VFECore::ParamPostProcessing RunBitmaps::paramsFor(VFECore& core) const {
-    if (outerLayer == nullptr) return {destination, mask, textRect, 0, nullptr};
-    const Placement& placement = placementOf(core);
-    VFBitmap* const both = placement.inOuterLayer && placement.inDestination ? destination : nullptr;
-    return {placement.inOuterLayer ? outerLayer : destination, mask, textRect, 1, both};
-}
-
-// --- Where strips serve -------------------------------------------------------------------------------
 
 namespace {
 
@@ -32,10 +22,10 @@ namespace {
 /// cost more than they save: what an effect keeps from row to row has to come back into the nearest
 /// cache.
 constexpr int64_t kLargeBytes = 16 << 20;
-/// So many of the targets stay in the cache that a core has for itself, with the mask and what effects
+/// So many of the targets stay in the cache that a CPU has for itself, with the mask and what effects
 /// keep.
 constexpr int64_t kStripBytes = 512 << 10;
-/// Strokes paint so many rows at once.
+/// What is dilated comes in bands of so many rows: lower strips would wait for each other.
 constexpr int64_t kFewestRows = 32;
 
 struct ByteRange {
@@ -61,7 +51,7 @@ int64_t stripRowsFor(const RunBitmaps& run) {
     if (!destination || !mask) return 0;
     const ByteRange all[] = {ByteRange::of(destination), ByteRange::of(outer), ByteRange::of(mask)};
     const int64_t targetBytes = all[0].count + all[1].count;
-    if (targetBytes < kLargeBytes) return 0;
+    if (all[0].count == 0 || targetBytes < kLargeBytes) return 0;
     const bool areApart = !all[0].meets(all[1]) && !all[0].meets(all[2]) && !all[1].meets(all[2]);
     return areApart ? std::max(kFewestRows, kStripBytes / (targetBytes / destination.height)) : 0;
 }
@@ -73,11 +63,10 @@ namespace {
 /// The painters of a run, in its order: of each kind there is one at most.
 class RunPainters {
   public:
-    RunPainters() {}  // nothing is cleared
-
-    void add(VFECore& core, const VFECore::ParamPostProcessing& params) {
+    /// Returns false when there is no memory for what the core paints.
+    [[nodiscard]] bool add(VFECore& core, const VFECore::ParamPostProcessing& params) {
         VFProperty* const record = core.getProperty();
-        if (record == nullptr) return;
+        if (record == nullptr) return true;
         switch (core.getStyle()) {
             case kOuterShadow:
                 return begun(mOuterShadow, &params, *static_cast<const VFOuterShadowProperty*>(record),
@@ -85,13 +74,9 @@ class RunPainters {
             case kInnerShadow:
                 return begun(mInnerShadow, &params, *static_cast<const VFInnerShadowProperty*>(record));
             case kOuterGlow:
-                return begun(mOuterGlow, &params,
-                             GlowRecord::of(static_cast<const VFOuterGlowProperty*>(record)),
-                             GlowSide::outside);
+                return begun(mOuterGlow, &params, *static_cast<const VFOuterGlowProperty*>(record));
             case kInnerGlow:
-                return begun(mInnerGlow, &params,
-                             GlowRecord::of(static_cast<const VFInnerGlowProperty*>(record)),
-                             GlowSide::inside);
+                return begun(mInnerGlow, &params, *static_cast<const VFInnerGlowProperty*>(record));
             case kLinearGradient:
                 return begun(mLinear, &params, *static_cast<const VFLinearGradientProperty*>(record));
             case kRadialGradient:
@@ -103,7 +88,8 @@ class RunPainters {
             case kText:
                 return begun(mText, &params, *static_cast<const VFTextProperty*>(record));
             default:
-                return;
+                VOREL_ASSERT(false);
+                return true;
         }
     }
 
@@ -115,10 +101,11 @@ class RunPainters {
 
   private:
     template <class Painter, class... Arguments>
-    void begun(std::optional<Painter>& painter, const Arguments&... arguments) {
+    bool begun(std::optional<Painter>& painter, const Arguments&... arguments) {
         VOREL_ASSERT(!painter);
-        begin(painter, arguments...);
+        if (!begin(painter, arguments...)) return false;
         if (painter) mInOrder[mCount++] = &*painter;
+        return true;
     }
 
     std::optional<ShadowPainter> mOuterShadow;
@@ -141,10 +128,11 @@ bool paintInStrips(const std::vector<VFECore*>& cores, const RunBitmaps& run, in
     const std::unique_ptr<RunPainters> painters(new (std::nothrow) RunPainters);
     if (!painters) return false;
     const OwnFloatState floatState;
-    for (VFECore* core : cores)
-        painters->add(*core, run.paramsFor(*core));
-    const MaskView mask = MaskView::of(run.mask);
-    for (int64_t limit = stripRows; limit < mask.height; limit += stripRows)
+    for (VFECore* core : cores) {
+        if (!painters->add(*core, run.paramsFor(*core))) return false;
+    }
+    const int64_t height = ColourView::of(run.destination).height;
+    for (int64_t limit = stripRows; limit < height; limit += stripRows)
         painters->paintAbove(limit);
     painters->paintAbove(kAllRows);
     return true;

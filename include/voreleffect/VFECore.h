@@ -178,7 +178,7 @@ class VF_API VFOuterShadow : public VFECoreBase {
     int getBottomOffset() override;
 
   private:
-    friend class internal::ShadowPainter;
+    friend class internal::ShadowPainter;  // the move is that of the last setProperty
 
     VFOuterShadowProperty* mProperty;
     int mOffsetX;

@@ -1,5 +1,7 @@
 #include "ops/blur/blur_plan.h"
 
+#include <algorithm>
+
 #include "core/assert.h"
 
 namespace VFontEffect::internal {

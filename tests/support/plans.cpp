@@ -65,8 +65,7 @@ void paintRowByRow(int64_t stripRows, const VFECore::ParamPostProcessing* params
                    const Arguments&... arguments) {
     const OwnFloatState floatState;
     std::optional<Painter> painter;
-    begin(painter, params, arguments...);
-    if (!painter) return;
+    if (!begin(painter, params, arguments...) || !painter) return;
     for (int64_t limit = stripRows; limit < params->srcBitmap->mHeight; limit += stripRows)
         painter->paintAbove(limit);
     painter->paintAbove(kAllRows);
@@ -114,11 +113,11 @@ void paintWithin(int64_t workingBytes, int64_t stripRows, int type, const VFProp
         const auto& shadow = static_cast<const VFInnerShadowProperty&>(record);
         paintRowByRow<ShadowPainter>(stripRows, params, shadow, workingBytes);
     } else if (type == kOuterGlow) {
-        const auto glow = GlowRecord::of(static_cast<const VFOuterGlowProperty*>(&record));
-        paintRowByRow<GlowPainter>(stripRows, params, glow, GlowSide::outside, workingBytes);
+        const auto& glow = static_cast<const VFOuterGlowProperty&>(record);
+        paintRowByRow<GlowPainter>(stripRows, params, glow, workingBytes);
     } else if (type == kInnerGlow) {
-        const auto glow = GlowRecord::of(static_cast<const VFInnerGlowProperty*>(&record));
-        paintRowByRow<GlowPainter>(stripRows, params, glow, GlowSide::inside, workingBytes);
+        const auto& glow = static_cast<const VFInnerGlowProperty&>(record);
+        paintRowByRow<GlowPainter>(stripRows, params, glow, workingBytes);
     }
 }
 

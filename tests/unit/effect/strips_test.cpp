@@ -5,7 +5,7 @@
 #include <algorithm>
 #include <cstdint>
 #include <memory>
-#include <optional>
+#include <utility>
 #include <vector>
 
 #include "core/effect_types.h"
@@ -13,6 +13,7 @@
 #include "tests/reliability/whole_looks.h"
 #include "tests/support/bitmap_bytes.h"
 #include "tests/support/core_compare.h"
+#include "tests/support/float_states.h"
 #include "tests/support/plans.h"
 
 /// Effects that paint by turns paint what they do one after the other.
@@ -120,6 +121,30 @@ TEST(Strips, OfAllHeights_HaveTheBytesOfOneEffectAfterTheOther) {
     });
 }
 
+TEST(Strips, InAnyFloatState_HaveTheSameBytesAndLeaveTheState) {
+    Random random(11);
+    const std::vector<Core> cores = randomCores(random);
+    std::vector<VFECore*> order;
+    for (const Core& core : cores)
+        order.push_back(core.get());
+    const Scene scene = randomScene(random, maskGallery().front().mask);
+    Layers expected(scene, scene.dst);
+    paintInTurn(order, expected);
+    for (const FloatState& state : floatStates()) {
+        Layers actual(scene, scene.dst);
+        FloatState after = {};
+        {
+            const InFloatState in(state);
+            const FloatState before = currentFloatState();
+            ASSERT_TRUE(paintByTurns(order, actual.run(), 7));
+            after = currentFloatState();
+            EXPECT_TRUE(before == after) << state.name;
+        }
+        EXPECT_EQ(bytesOf(expected.destination), bytesOf(actual.destination)) << state.name;
+        EXPECT_EQ(bytesOf(expected.outer), bytesOf(actual.outer)) << state.name;
+    }
+}
+
 TEST(Strips, AMovedShadow_StaysWhereItsCoreHasItWhateverItsRecordSaysNow) {
     Scene scene = sceneOf(discMask(30, 30, 12.0F, 12.0F, 6.0F, true));
     const Core core = coreOf<VFOuterShadow, VFOuterShadowProperty>(135.0F, 5.0F, 2.0F, kBlack, 1.0F);
@@ -157,28 +182,68 @@ TEST(Strips, ServeLargePictures) {
     }
 }
 
-TEST(Strips, DoNotServeWithoutBitmapsOrWhereTheyShareBytes) {
-    VFBitmap destination(2048, 2048, 4);
-    VFBitmap outer(2048, 2048, 4);
+TEST(Strips, DoNotServeWithoutPixels) {
+    VFBitmap large(2048, 2048, 4);
     VFBitmap mask(2048, 2048, 1);
     VFBitmap hollow;
     VFRect text(0, 0, 1, 1);
-    EXPECT_EQ(32, rowsOfStrips({&destination, &outer, &mask, &text}));
     EXPECT_EQ(0, rowsOfStrips({nullptr, nullptr, &mask, &text}));
-    EXPECT_EQ(0, rowsOfStrips({&destination, nullptr, &hollow, &text}));
-
-    VFBitmap* const colours[] = {&destination, &outer};
-    for (const VFBitmap* layer : colours) {
-        VFBitmap within(2048, 2048, 1);
-        unsigned char* const own = within.mData;
-        constexpr int64_t kLayerBytes = int64_t{2048} * 2048 * 4;
-        constexpr int64_t kMaskBytes = int64_t{2048} * 2048;
-        for (const int64_t offset : {1 - kMaskBytes, int64_t{0}, kLayerBytes / 2, kLayerBytes - 1}) {
-            within.mData = layer->mData + offset;
-            EXPECT_EQ(0, rowsOfStrips({&destination, &outer, &within, &text})) << offset;
-        }
-        within.mData = own;
+    EXPECT_EQ(0, rowsOfStrips({&large, nullptr, &hollow, &text}));
+    for (const auto& [width, height] : {std::pair{2048U, 0U}, {0U, 0U}, {0U, 0xFFFFFFFFU}}) {
+        VFBitmap empty(width, height, 4);
+        EXPECT_EQ(0, rowsOfStrips({&empty, &large, &mask, &text})) << width << " x " << height;
+        Kit<VFEffect> kit;
+        VFEffect set;
+        describe(kCentred, set, kit);
+        set.initEffect(2048, 2048);
+        set.setDstBitmap(&empty);
+        uint8_t coverage = 255;
+        VFGlyph dot = {&coverage, 1, 1};
+        set.renderEffectLayer(5, 5, &dot);
+        set.doEffectPostProcessing();
+        set.compositeLayers(&empty);
     }
+}
+
+/// A bitmap whose pixels stand in somebody else's bytes.
+class Lying {
+  public:
+    Lying(unsigned char* bytes, unsigned width, unsigned height, unsigned bytesPerPixel) : bitmap() {
+        bitmap.mData = bytes;
+        bitmap.mWidth = width;
+        bitmap.mHeight = height;
+        bitmap.mBytesPerPixel = bytesPerPixel;
+    }
+    ~Lying() { bitmap.mData = nullptr; }
+    Lying(const Lying&) = delete;
+    Lying& operator=(const Lying&) = delete;
+
+    VFBitmap bitmap;
+};
+
+TEST(Strips, DoNotServeWhereBitmapsShareAByte) {
+    constexpr int64_t kLayer = int64_t{1024} * 2048 * 4;
+    constexpr int64_t kMask = int64_t{1024} * 2048;
+    std::vector<uint8_t> bytes(static_cast<size_t>(2 * kLayer + kMask));
+    VFRect text(0, 0, 1, 1);
+    const auto rowsAt = [&](int64_t destination, int64_t outer, int64_t mask) {
+        Lying first(bytes.data() + destination, 1024, 2048, 4);
+        Lying second(bytes.data() + outer, 1024, 2048, 4);
+        Lying third(bytes.data() + mask, 1024, 2048, 1);
+        return rowsOfStrips({&first.bitmap, &second.bitmap, &third.bitmap, &text});
+    };
+    // Neighbours, in all orders.
+    EXPECT_EQ(64, rowsAt(0, kLayer, 2 * kLayer));
+    EXPECT_EQ(64, rowsAt(kLayer, 0, 2 * kLayer));
+    EXPECT_EQ(64, rowsAt(kMask, kMask + kLayer, 0));
+    EXPECT_EQ(64, rowsAt(0, kMask + kLayer, kLayer));
+    // A byte of two of them is one.
+    EXPECT_EQ(0, rowsAt(0, kLayer - 1, 2 * kLayer));
+    EXPECT_EQ(0, rowsAt(kLayer - 1, 0, 2 * kLayer));
+    EXPECT_EQ(0, rowsAt(0, kLayer, 2 * kLayer - 1));
+    EXPECT_EQ(0, rowsAt(kMask - 1, kMask + kLayer, 0));
+    EXPECT_EQ(0, rowsAt(0, kLayer, kLayer / 2));
+    EXPECT_EQ(0, rowsAt(0, kLayer, kLayer + 5));
 }
 
 // --- Whole runs -------------------------------------------------------------------------------------
