@@ -40,8 +40,7 @@ struct Range {
 struct Group {
     U8s rows[kQuad];
 
-    /// Not inline: up to four loops take groups, and calls are a twentieth of a small blur at most.
-    static __attribute__((noinline)) Group of(const SourceStrip& strip, int64_t y) {
+    static VOREL_INLINE Group of(const SourceStrip& strip, int64_t y) {
         if (!strip.has(y) || !strip.has(y + kQuad - 1)) return atEdge(strip, y);
         Group group;
         unrolled<kQuad>([&](auto i) VOREL_INLINE_LAMBDA {
@@ -50,6 +49,7 @@ struct Group {
         });
         return group;
     }
+    /// Not inline: most groups are elsewhere.
     static __attribute__((noinline)) Group atEdge(const SourceStrip& strip, int64_t y) {
         Group group;
         for (int64_t i = 0; i < kQuad; ++i)
