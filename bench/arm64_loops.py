@@ -90,8 +90,8 @@ LOOPS = (
     dilation("smaller of two rows", "keepMin", {"umin": 1}, 16),
     dots("down, 16 taps", "down", {"udot": 64}),
     dots("across, 16 taps", "across", {"udot": 64}),
-    dots("down, division", "down<", {"fcvtzs": 16}, bare=True),
-    dots("across, division", "across<", {"fcvtzs": 16}, bare=True),
+    dots("down, division", "down", {"fcvtzs": 16}, bare=True),
+    dots("across, division", "across", {"fcvtzs": 16}, bare=True),
     # Four rows of results at a time, 16 of each.
     Loop("differences, a term", "ops/blur/difference_loops.cpp", "next", {r"(add|sub)\s+v": 8}, 64),
     # Two rows at a time, a pair sum in each.

@@ -1,5 +1,6 @@
 #include "ops/blur/difference_loops.h"
 #include "ops/blur/dot_loops.h"
+#include "ops/blur/narrow_loops.h"
 #include "ops/dilate/dilation_loops.h"
 #include "ops/grow/growth_loops.h"
 #include "ops/ramp/ramp_loops.h"
@@ -14,5 +15,6 @@ VOREL_LEVEL_TABLE(VOREL_EACH_DOTLESS_LEVEL, rampLoops, RampLoops, kRampLoops)
 VOREL_LEVEL_TABLE(VOREL_EACH_DOTLESS_LEVEL, tileLoops, TileLoops, kTileLoops)
 VOREL_LEVEL_TABLE(VOREL_EACH_DOTLESS_LEVEL, growthLoops, GrowthLoops, kGrowthLoops)
 VOREL_LEVEL_TABLE(VOREL_EACH_DOTLESS_LEVEL, differenceLoops, DifferenceLoops, kDifferenceLoops)
+VOREL_LEVEL_TABLE(VOREL_EACH_DOTLESS_LEVEL, narrowLoops, NarrowLoops, kNarrowLoops)
 
 }  // namespace VFontEffect::internal

@@ -47,6 +47,8 @@
 /// |                               | AVX does so in each 128 bits by itself                               |
 /// | pack                          | lanes of at most 255 in half the width, as before interleaving       |
 /// | pairSums                      | of each two neighbouring bytes                                       |
+/// | [pairProducts]                | of bytes of 0 to 255 and -128 to 127, each two neighbouring ones     |
+/// |                               | added, in 16 bits; VOREL_PAIR_PRODUCTS is said where there is one    |
 /// | quarters                      | a quarter of each 16-bit lane, at most 255, from two vectors in turn |
 ///
 /// Dot products of taps, four to a word:

@@ -22,6 +22,11 @@ VOREL_INLINE U16s pairSums(U8s v) {
     return bitCast<U16s>(VOREL_X86(maddubs_epi16)(ints(v), VOREL_X86(set1_epi8)(1)));
 }
 
+#define VOREL_PAIR_PRODUCTS
+VOREL_INLINE U16s pairProducts(U8s a, U8s b) {
+    return bitCast<U16s>(VOREL_X86(maddubs_epi16)(ints(a), ints(b)));
+}
+
 #define VOREL_NATIVE_GATHER
 VOREL_INLINE U32s gather(const uint32_t* table, const uint8_t* indices) {
     return gather(table, bitCast<I32s>(widened(indices)));

@@ -54,14 +54,16 @@ VOREL_INLINE U16s widenHigh(U8s v) {
 VOREL_INLINE U8s narrow(U16s a, U16s b) { return pack(a, b); }
 VOREL_INLINE U16s pairSums(U8s v) { return (bitCast<U16s>(v) & 0x00FF) + (bitCast<U16s>(v) >> 8); }
 
+/// In place: compilers would rather make a tree of all products and spill it, or add the sum to the
+/// product and copy it back.
+VOREL_INLINE void addTo(U32s& sum, __m128i products) {
+    __asm__("paddd %1, %0" : "+x"(sum) : "x"(products));
+}
 template <int64_t kFour>
 VOREL_INLINE U32s addDots(U32s sums, Taps taps, const WeightCell* weights) {
-    const __m128i even = _mm_madd_epi16(ints(taps.even), ints(weights[4 * kFour]));
-    const __m128i odd = _mm_madd_epi16(ints(taps.odd), ints(weights[4 * kFour + 1]));
-    // In this order: compilers would rather make a tree of all the steps' products, and spill it.
-    U32s sum = sums + bitCast<U32s>(even);
-    __asm__("" : "+x"(sum));
-    return sum + bitCast<U32s>(odd);
+    addTo(sums, _mm_madd_epi16(ints(taps.even), ints(weights[4 * kFour])));
+    addTo(sums, _mm_madd_epi16(ints(taps.odd), ints(weights[4 * kFour + 1])));
+    return sums;
 }
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

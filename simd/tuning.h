@@ -44,6 +44,14 @@ constexpr int kLargestDotRadius = 20;
 constexpr int kLargestDotRadius = 15;
 #endif
 
+// Whether a blur whose sums fit in 16 bits takes less time by them than by dot products, which at
+// AVX-512 take 1.3 to 1.6 times as long (shadow/outer/.*/R:[12]/best).
+#if defined(VOREL_DOT_PRODUCTS) && defined(VOREL_PLANAR_PIXELS)
+constexpr bool kLeavesNarrow = false;
+#else
+constexpr bool kLeavesNarrow = true;
+#endif
+
 // Up to this reach of the disc a dilation by spreading takes less time than one by tiles, whose vectors
 // are short (stroke/outside/). Tiles by spreading: at 64 bytes 1.6 to 4.0 at 16 and 0.7 to 1.8 at 32, at
 // 16 bytes 1.8 to 3.8 at 8 and 0.7 to 1.6 at 16.

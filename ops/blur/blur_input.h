@@ -76,20 +76,21 @@ struct BlurInput {
 /// The part of a source that the results in a window depend on, and its place in the source.
 struct ReachedSource {
     CoverageRows part;
-    int64_t left = 0;
-    int64_t top = 0;
+    int64_t left;
+    int64_t top;
 
+    /// Where the window reaches no part there is an empty one, at the reach's upper left corner.
     static ReachedSource of(const BlurInput& input) {
-        const Box reach =
-            intersection(expanded(input.window, input.weights.radius), wholeOf(input.source));
-        ReachedSource reached = {input.source};
+        const Box reach = expanded(input.window, input.weights.radius);
+        const Box common = intersection(reach, wholeOf(input.source));
+        ReachedSource reached = {input.source, reach.left, reach.top};
         reached.part.width = reached.part.height = 0;
-        if (reach.empty()) return reached;
-        reached.part.start += reach.top * input.source.stride + reach.left;
-        reached.part.width = reach.width();
-        reached.part.height = reach.height();
-        reached.left = reach.left;
-        reached.top = reach.top;
+        if (common.empty()) return reached;
+        reached.part.start += common.top * input.source.stride + common.left;
+        reached.part.width = common.width();
+        reached.part.height = common.height();
+        reached.left = common.left;
+        reached.top = common.top;
         return reached;
     }
 };

@@ -6,6 +6,7 @@
 #include "ops/blur/blur_input.h"
 #include "ops/blur/difference_blur.h"
 #include "ops/blur/dot_blur.h"
+#include "ops/blur/narrow_blur.h"
 
 namespace VFontEffect::internal {
 
@@ -20,13 +21,13 @@ class BlurPlan {
     /// order and endings.
     BlurPlan(CpuLevel level, const BlurInput& largest, int64_t memoryBytes);
 
-    explicit operator bool() const;
+    explicit operator bool();
 
     /// Turns to an input.
     void begin(const BlurInput& input);
 
     /// Rows that are asked for at once; the last ones may be fewer.
-    int64_t bandRows() const;
+    int64_t bandRows();
 
     /// `count` rows of results from row y of the source on, first column that of the window. Bands are
     /// asked for in order, from the window's top on. The rows may be changed, and stay until the next
@@ -34,6 +35,10 @@ class BlurPlan {
     BlurredRows rows(int64_t y, int64_t count);
 
   private:
+    template <class Action>
+    auto withBlur(Action action);
+
+    std::optional<NarrowBlur> mNarrow;
     std::optional<DotBlur> mDots;
     std::optional<DifferenceBlur> mDifferences;
     int64_t mNextRow = 0;

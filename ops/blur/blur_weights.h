@@ -3,7 +3,7 @@
 #include <cstdint>
 
 #include "core/size_limit.h"
-#include "ops/blur/dot_loops.h"
+#include "ops/blur/narrow_loops.h"
 
 /// The weights of the separable integer Gaussian blur.
 ///

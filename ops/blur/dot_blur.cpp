@@ -26,10 +26,6 @@ int64_t cellsOf(int radius) {
 constexpr int64_t kMostCells =
     kCellsBefore + 2 * int64_t{BlurWeights::kLongestRadius} + 1 + kCellsBehind + 3;
 
-bool isNarrow(const DotLoops& loops, const BlurWeights& weights) {
-    return loops.hasNarrow && weights.radius <= kLargestNarrowRadius && weights.total <= 0xFF;
-}
-
 /// The weights from the first cell's on, and those behind the last one.
 void fillString(const BlurWeights& weights, uint8_t* string) {
     std::fill_n(string, cellsOf(weights.radius) + kWeightsBehindCell, uint8_t{0});
@@ -65,13 +61,6 @@ PackedBlur packed(const DotLoops& loops, const BlurWeights& weights, uint8_t* me
     blur.inverse = inverseAbove(weights.total);
     blur.cells = memory + kCellsBefore * loops.cellBytes;
     blur.totals = totals + kCellsBefore;
-    blur.isNarrow = isNarrow(loops, weights);
-    if (!blur.isNarrow) return blur;
-    const uint32_t scale = weights.total < 128 ? 2 : 1;
-    for (int k = 0; k <= weights.radius; ++k)
-        blur.weights[k] = static_cast<uint16_t>(weights.byDistance[k] * scale);
-    blur.narrowTotal = static_cast<uint16_t>(weights.total * scale);
-    blur.division = narrowDivision(blur.narrowTotal);
     return blur;
 }
 
@@ -84,18 +73,11 @@ namespace {
 /// More than any quad needs, so that groups rarely move.
 constexpr int64_t kSpareGroups = 16;
 
-/// Bytes of a pixel in a row between the passes.
-int64_t pixelBytes(const DotLoops& loops, const BlurWeights& weights) {
-    return isNarrow(loops, weights) ? kNarrowPixelBytes : 1;
-}
-
 /// The groups that 4 * quads rows of results need of `height` rows. Group 0 begins with row `firstRow`.
-/// A narrow blur reads all the groups around its results. A wide one leaves out groups without coverage,
-/// and so there is no need to store those that lie wholly above or below the rows.
-GroupRange neededGroups(const DotLoops& loops, const BlurWeights& weights, int64_t height,
-                        int64_t firstRow, int64_t quads) {
+/// Groups without coverage are left out, and so there is no need to store those that lie wholly above or
+/// below the rows.
+GroupRange neededGroups(const BlurWeights& weights, int64_t height, int64_t firstRow, int64_t quads) {
     const int64_t end = quads - 1 + tapSteps(weights.radius);
-    if (isNarrow(loops, weights)) return {0, end};
     const int64_t first = std::min(end, std::max<int64_t>(0, -firstRow) / kQuad);
     return {first, std::clamp(quadsOf(std::max<int64_t>(0, height - firstRow)), first, end)};
 }
@@ -106,27 +88,14 @@ TapGroups takeGroups(const DotLoops& loops, const BlurWeights& weights, int64_t 
     taps.missing = needed;
     taps.steps = tapSteps(weights.radius);
     taps.capacity = std::min(taps.steps - 1 + kSpareGroups, needed.end - needed.first);
-    taps.strips = (width + loops.vectorBytes - 1) / loops.vectorBytes;
-    taps.groupBytes = kQuad * loops.vectorBytes * pixelBytes(loops, weights);
+    taps.strips = (width + loops.form.vectorBytes - 1) / loops.form.vectorBytes;
+    taps.groupBytes = kQuad * loops.form.vectorBytes;
     const int64_t stripBytes = taps.groupBytes * taps.capacity;
     uint8_t* const groups = arena.take<uint8_t>(stripBytes * taps.strips);
     auto* const firstCovered = arena.take<int32_t>(taps.strips);
     auto* const lastCovered = arena.take<int32_t>(taps.strips);
     taps.columns = {groups, stripBytes, needed.first, width, firstCovered, lastCovered};
     return taps;
-}
-
-/// Rows that are blurred across, `columns` wide.
-IntermediateRows takeIntermediate(const DotLoops& loops, const BlurWeights& weights,
-                                  int64_t coveredColumn, int64_t columns, const FullColumns& full,
-                                  Arena& arena) {
-    VOREL_ASSERT(coveredColumn % kWidestVector == 0);
-    const int64_t bytes = pixelBytes(loops, weights);
-    const int64_t stride = (strideFor(columns) + 2 * kIntermediateMargin) * bytes;
-    uint8_t* const pixels = arena.take<uint8_t>(stride * kQuad);
-    uint8_t* const covered = arena.take<uint8_t>(strideFor(columns) / loops.vectorBytes);
-    uint8_t* const start = pixels == nullptr ? nullptr : pixels + kIntermediateMargin * bytes;
-    return {start, stride, columns, coveredColumn, full.before, full.from, covered};
 }
 
 }  // namespace
@@ -160,24 +129,10 @@ DotBlur::Layout DotBlur::Layout::of(const DotLoops& loops, const BlurInput& inpu
     const bool acrossFirst = input.order == BlurInput::Order::acrossThenDown;
     if (acrossFirst) layout.across = arena.take<uint8_t>(layout.stride * kQuad);
     const GroupRange needed =
-        neededGroups(loops, weights, part.height, layout.firstRow, quadsOf(window.height()));
+        neededGroups(weights, part.height, layout.firstRow, quadsOf(window.height()));
     layout.taps = takeGroups(loops, weights, acrossFirst ? window.width() : part.width, needed, arena);
 
-    // The rows that are blurred across have the source's columns, and when some of the full ones are in
-    // reach all that are.
-    const Box reach = expanded(window, weights.radius);
-    layout.intermediateLeft = layout.source.left;
-    if (input.full.before <= reach.left && input.full.from >= reach.right) {
-        layout.intermediate = takeIntermediate(loops, weights, 0, part.width, {0, part.width}, arena);
-    } else {
-        const int64_t coveredColumn =
-            roundedUp(std::max<int64_t>(0, layout.source.left - reach.left), kWidestVector);
-        const int64_t left = layout.source.left - coveredColumn;
-        layout.intermediateLeft = left;
-        layout.intermediate =
-            takeIntermediate(loops, weights, coveredColumn, reach.right - left,
-                             {input.full.before - left, input.full.from - left}, arena);
-    }
+    layout.intermediate = PlacedIntermediate::of(input, layout.source, loops.form.vectorBytes, arena);
     layout.out = arena.take<uint8_t>(layout.stride * kQuad);
     return layout;
 }
@@ -204,25 +159,26 @@ void DotBlur::begin(const BlurInput& input) {
     mLayout = Layout::of(mLoops, input, arena);
     VOREL_ASSERT(arena.used <= mMemoryBytes);
     mLayout.taps.clear();
-    mLoops.clear(mBlur, mLayout.intermediate);
+    clear(mLoops.form, mLayout.intermediate.rows);
 }
 
 void DotBlur::blurAcross(const PassEnding& ending, uint8_t* out) {
     const Box& window = mLayout.window;
-    VOREL_ASSERT(roundedUp(window.width(), mLoops.vectorBytes) <= mLayout.stride);
-    mLoops.across(mBlur, mLayout.intermediate, window.left - mLayout.intermediateLeft,
-                  window.right - mLayout.intermediateLeft, {out, mLayout.stride, ending});
+    VOREL_ASSERT(roundedUp(window.width(), mLoops.form.vectorBytes) <= mLayout.stride);
+    const int64_t left = mLayout.intermediate.left;
+    mLoops.across(mBlur, mLayout.intermediate.rows, window.left - left, window.right - left,
+                  {out, mLayout.stride, ending});
 }
 
 void DotBlur::feed(int64_t group) {
     const CoverageRows& part = mLayout.source.part;
     const TapColumns& columns = mLayout.taps.columns;
     const int64_t row = mLayout.firstRow + kQuad * group;
-    if (mLayout.across == nullptr) return mLoops.feed(mBlur, part, row, columns, group);
-    mLoops.copy(mBlur, part, row, mLayout.intermediate);
+    if (mLayout.across == nullptr) return mLoops.feed(part, row, columns, group);
+    mLoops.copy(part, row, mLayout.intermediate.rows);
     blurAcross(mFirst, mLayout.across);
     const CoverageRows across = {mLayout.across, mLayout.stride, mLayout.window.width(), kQuad, kAsIs};
-    mLoops.feed(mBlur, across, 0, columns, group);
+    mLoops.feed(across, 0, columns, group);
 }
 
 BlurredRows DotBlur::rows(int64_t y) {
@@ -233,7 +189,8 @@ BlurredRows DotBlur::rows(int64_t y) {
     if (mLayout.across != nullptr) {
         mLoops.downToBytes(mBlur, columns, quad, {mLayout.out, mLayout.stride, mSecond});
     } else {
-        mLoops.down(mBlur, columns, quad, mLayout.intermediate);
+        mLoops.down(mBlur, columns, quad, mLayout.intermediate.rows);
+        fillFullColumns(mLoops.form, mLayout.intermediate.rows);
         blurAcross(mSecond, mLayout.out);
     }
     return {mLayout.out, mLayout.stride};

@@ -74,8 +74,7 @@ class DotBlur {
         int64_t stride;    // of results
         uint8_t* across;   // results of the pass across, when it is the first
         TapGroups taps;
-        int64_t intermediateLeft;  // column of the source, column 0 of the rows that are blurred across
-        IntermediateRows intermediate;
+        PlacedIntermediate intermediate;
         uint8_t* out;
 
         static Layout of(const DotLoops& loops, const BlurInput& input, Arena& arena);

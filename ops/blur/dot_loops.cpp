@@ -17,10 +17,6 @@
 /// the four results are four rows; across, they are the four bytes of a word. So every vector of taps
 /// that is loaded feeds four sums, and every four weights feed several vectors.
 ///
-/// Up to a radius of 3 sums fit in 16 bits. Where no instruction makes a dot product of bytes, taps are
-/// widened to 16 bits there, those at +k and -k are added before the product, and the division is one by
-/// multiplication in 16 bits.
-///
 /// Exactness: sums are whole numbers and wrap nowhere: 255 times the total stays below 2^23. Their
 /// quotients are whole (inverseAbove in blur_weights.h).
 ///
@@ -38,19 +34,13 @@ struct Range {
     bool empty() const { return first >= end; }
 };
 
-/// So many columns as the vectors have that hold `columns` of them.
-VOREL_INLINE int64_t wholeVectors(int64_t columns) {
-    return roundedUp(columns, kBytes);
-}
-
 // --- Loading --------------------------------------------------------------------------------------
 
 /// Four rows of a strip.
 struct Group {
     U8s rows[kQuad];
 
-    /// Not inline: up to four loops take groups, and calls are a twentieth of a small blur at most.
-    static __attribute__((noinline)) Group of(const SourceStrip& strip, int64_t y) {
+    static VOREL_INLINE Group of(const SourceStrip& strip, int64_t y) {
         if (!strip.has(y) || !strip.has(y + kQuad - 1)) return atEdge(strip, y);
         Group group;
         unrolled<kQuad>([&](auto i) VOREL_INLINE_LAMBDA {
@@ -59,6 +49,7 @@ struct Group {
         });
         return group;
     }
+    /// Not inline: most groups are elsewhere.
     static __attribute__((noinline)) Group atEdge(const SourceStrip& strip, int64_t y) {
         Group group;
         for (int64_t i = 0; i < kQuad; ++i)
@@ -68,11 +59,10 @@ struct Group {
     VOREL_INLINE bool isCovered() const { return !allZero(rows[0] | rows[1] | rows[2] | rows[3]); }
 };
 
-// --- The two methods: how groups are stored, summed and divided ---------------------------------------
+// --- How groups are stored, summed and divided --------------------------------------------------------
 
 /// Sums of 32 bits by dot products.
 struct DotMethod {
-    static constexpr int64_t kPixelBytes = 1;
     static constexpr int64_t kGroupBytes = kQuad * kBytes;
 
     const WeightCell* cells;
@@ -192,107 +182,19 @@ struct DotMethod {
             });
         });
     }
-
-    using Row = U8s;
-    static VOREL_INLINE Row rowOf(U8s row) { return row; }
-    static VOREL_INLINE U8s bytesOf(Row row) { return row; }
-    static VOREL_INLINE void storeIntermediate(Row row, uint8_t* to) { store(to, row ^ kTapBias); }
-    static void fillIntermediate(uint8_t* to, int64_t count, uint8_t value) {
-        if (count > 0) std::memset(to, value ^ kTapBias, static_cast<size_t>(count));
-    }
-};
-
-/// Sums of 16 bits.
-struct NarrowMethod {
-    static constexpr int64_t kPixelBytes = kNarrowPixelBytes;
-    static constexpr int64_t kRowBytes = kPixelBytes * kBytes;
-    static constexpr int64_t kGroupBytes = kQuad * kRowBytes;
-
-    int radius;
-    U16s weights[kLargestNarrowRadius + 1];
-    U16s start;
-    U16s multiplier;
-
-    static NarrowMethod of(const PackedBlur& blur, bool roundsUp) {
-        NarrowMethod method;
-        method.radius = blur.radius;
-        for (int k = 0; k <= blur.radius; ++k)
-            method.weights[k] = splat<U16s>(blur.weights[k]);
-        const uint32_t rounding = roundsUp ? blur.narrowTotal - 1 : 0;
-        method.start = splat<U16s>(static_cast<uint16_t>(blur.division.start + rounding));
-        method.multiplier = splat<U16s>(blur.division.multiplier);
-        return method;
-    }
-
-    struct Row {
-        U16s left;
-        U16s right;
-    };
-    static VOREL_INLINE Row rowOf(U8s row) { return {widenLow(row), widenHigh(row)}; }
-    static VOREL_INLINE U8s bytesOf(const Row& row) { return narrow(row.left, row.right); }
-    static VOREL_INLINE Row loadRow(const uint8_t* from) {
-        return {load<U16s>(from), load<U16s>(from + kBytes)};
-    }
-    static VOREL_INLINE void storeIntermediate(const Row& row, uint8_t* to) {
-        store(to, row.left);
-        store(to + kBytes, row.right);
-    }
-    static void fillIntermediate(uint8_t* to, int64_t count, uint16_t value) {
-        for (int64_t i = 0; i < count; ++i)
-            std::memcpy(to + i * kPixelBytes, &value, sizeof value);
-    }
-
-    static VOREL_INLINE void storeGroup(const Group& group, uint8_t* to) {
-        unrolled<kQuad>([&](auto i) VOREL_INLINE_LAMBDA {
-            storeIntermediate(rowOf(group.rows[i.value]), to + i.value * kRowBytes);
-        });
-    }
-
-    /// The mean of the taps around `centre`, `step` bytes apart.
-    VOREL_INLINE Row mean(const uint8_t* centre, int64_t step) const {
-        const Row middle = loadRow(centre);
-        Row sums = {middle.left * weights[0] + start, middle.right * weights[0] + start};
-        unrolled<kLargestNarrowRadius>([&](auto i) VOREL_INLINE_LAMBDA {
-            constexpr int k = i.value + 1;
-            if (k > radius) return;
-            const Row before = loadRow(centre - k * step);
-            const Row after = loadRow(centre + k * step);
-            sums.left += (before.left + after.left) * weights[k];
-            sums.right += (before.right + after.right) * weights[k];
-        });
-        return {multiplyHigh(sums.left, multiplier) >> kNarrowShift,
-                multiplyHigh(sums.right, multiplier) >> kNarrowShift};
-    }
-
-    template <class GroupAt, class Store>
-    VOREL_INLINE void quadDown(const Range&, GroupAt groupAt, Store store) const {
-        const uint8_t* const centre = groupAt(0) + radius * kRowBytes;
-        for (int j = 0; j < kQuad; ++j)
-            store(j, mean(centre + j * kRowBytes, kRowBytes));
-    }
-    template <class Store>
-    VOREL_INLINE void quadAcross(const Range&, const uint8_t* rows, int64_t stride, int64_t tapColumn,
-                                 Store store) const {
-        const uint8_t* const centre = rows + (tapColumn + radius) * kPixelBytes;
-        for (int j = 0; j < kQuad; ++j)
-            store(j, bytesOf(mean(centre + j * stride, kPixelBytes)));
-    }
 };
 
 // --- Down ---------------------------------------------------------------------------------------------
 
-template <class Method>
 VOREL_INLINE uint8_t* groupAt(const TapColumns& columns, int64_t strip, int64_t group) {
     return columns.groups + strip * columns.stripStride +
-           (group - columns.firstGroup) * Method::kGroupBytes;
+           (group - columns.firstGroup) * DotMethod::kGroupBytes;
 }
 
-template <class Method>
-void feed(const PackedBlur&, const CoverageRows& source, int64_t row, const TapColumns& columns,
-          int64_t index) {
+void feed(const CoverageRows& source, int64_t row, const TapColumns& columns, int64_t index) {
     for (int64_t strip = 0; strip * kBytes < columns.width; ++strip) {
         const Group group = Group::of(SourceStrip::of(source, strip * kBytes), row);
-        Method::storeGroup(group, groupAt<Method>(columns, strip, index));
+        DotMethod::storeGroup(group, groupAt(columns, strip, index));
         if (!group.isCovered()) continue;
         const auto number = static_cast<int32_t>(index);
         if (columns.lastCovered[strip] < columns.firstCovered[strip])
@@ -308,94 +210,56 @@ VOREL_INLINE Range coveredSteps(const TapColumns& columns, int64_t strip, int64_
 }
 
 /// Calls store(strip, j, row) for each of the four rows of each strip.
-template <class Method, class Store>
-VOREL_INLINE void quadDown(const Method& method, const TapColumns& columns, int64_t quad, int radius,
+template <class Store>
+VOREL_INLINE void quadDown(const DotMethod& method, const TapColumns& columns, int64_t quad, int radius,
                            Store store) {
     for (int64_t strip = 0; strip * kBytes < columns.width; ++strip) {
-        const auto storeRow = [&](int j, const typename Method::Row& row)
-                                  VOREL_INLINE_LAMBDA { store(strip, j, row); };
+        const auto storeRow = [&](int j, U8s row) VOREL_INLINE_LAMBDA { store(strip, j, row); };
         const Range steps = coveredSteps(columns, strip, quad, radius);
         if (steps.empty()) {
             for (int j = 0; j < kQuad; ++j)
-                storeRow(j, typename Method::Row{});
+                storeRow(j, U8s{});
         } else {
             method.quadDown(
                 steps,
-                [&](int64_t step)
-                    VOREL_INLINE_LAMBDA { return groupAt<Method>(columns, strip, quad + step); },
+                [&](int64_t step) VOREL_INLINE_LAMBDA { return groupAt(columns, strip, quad + step); },
                 storeRow);
         }
     }
 }
 
-template <class Method>
 VOREL_INLINE uint8_t* intermediateAt(const IntermediateRows& intermediate, int64_t x, int64_t y) {
-    return intermediate.start + y * intermediate.strideBytes + x * Method::kPixelBytes;
+    return intermediate.start + y * intermediate.strideBytes + x;
 }
 
-template <class Method>
-VOREL_INLINE void fillIntermediate(const IntermediateRows& intermediate, int64_t from, int64_t end,
-                                   uint8_t value) {
-    for (int64_t y = 0; y < kQuad && from < end; ++y)
-        Method::fillIntermediate(intermediateAt<Method>(intermediate, from, y), end - from, value);
-}
-
-template <class Method>
-void clear(const PackedBlur&, const IntermediateRows& intermediate) {
-    fillIntermediate<Method>(intermediate, -kIntermediateMargin,
-                             wholeVectors(intermediate.columns) + kIntermediateMargin, 0);
-}
-
-template <class Method>
-void fillFullColumns(const IntermediateRows& intermediate) {
-    fillIntermediate<Method>(intermediate, 0,
-                             min<int64_t>(intermediate.fullBefore, intermediate.columns), 0xFF);
-    fillIntermediate<Method>(intermediate, max<int64_t>(intermediate.fullFrom, 0), intermediate.columns,
-                             0xFF);
-    for (int64_t x = 0; x < intermediate.columns; x += kBytes) {
-        if (x < intermediate.fullBefore || x + kBytes > intermediate.fullFrom)
-            intermediate.covered[x / kBytes] = 1;
-    }
-}
-
-template <class Method>
 void down(const PackedBlur& blur, const TapColumns& columns, int64_t quad,
           const IntermediateRows& intermediate) {
-    const int64_t strips = wholeVectors(intermediate.columns) / kBytes;
+    const int64_t strips = roundedUp(intermediate.columns, kBytes) / kBytes;
     std::memset(intermediate.covered, 0, static_cast<size_t>(strips));
     const int64_t firstStrip = intermediate.coveredColumn / kBytes;
     for (int64_t strip = 0; strip * kBytes < columns.width; ++strip) {
         const Range steps = coveredSteps(columns, strip, quad, blur.radius);
         intermediate.covered[firstStrip + strip] = !steps.empty();
     }
-    quadDown(Method::of(blur, false), columns, quad, blur.radius,
-             [&](int64_t strip, int j, const typename Method::Row& row) VOREL_INLINE_LAMBDA {
-                 Method::storeIntermediate(
-                     row, intermediateAt<Method>(intermediate, (firstStrip + strip) * kBytes, j));
+    quadDown(DotMethod::of(blur, false), columns, quad, blur.radius,
+             [&](int64_t strip, int j, U8s row) VOREL_INLINE_LAMBDA {
+                 store(intermediateAt(intermediate, (firstStrip + strip) * kBytes, j), row ^ kTapBias);
              });
-    if (intermediate.fullBefore > 0 || intermediate.fullFrom < intermediate.columns)
-        fillFullColumns<Method>(intermediate);
 }
 
-template <class Method>
 void downToBytes(const PackedBlur& blur, const TapColumns& columns, int64_t quad, const BlurRows& out) {
-    quadDown(Method::of(blur, out.ending.roundsUp), columns, quad, blur.radius,
-             [&](int64_t strip, int j, const typename Method::Row& row) VOREL_INLINE_LAMBDA {
-                 store(out.start + j * out.stride + strip * kBytes,
-                       Method::bytesOf(row) ^ out.ending.invertMask);
+    quadDown(DotMethod::of(blur, out.ending.roundsUp), columns, quad, blur.radius,
+             [&](int64_t strip, int j, U8s row) VOREL_INLINE_LAMBDA {
+                 store(out.start + j * out.stride + strip * kBytes, row ^ out.ending.invertMask);
              });
 }
 
-template <class Method>
-void copy(const PackedBlur&, const CoverageRows& source, int64_t row,
-          const IntermediateRows& intermediate) {
+void copy(const CoverageRows& source, int64_t row, const IntermediateRows& intermediate) {
     for (int64_t x = 0; x < source.width; x += kBytes) {
         const Group group = Group::of(SourceStrip::of(source, x), row);
         intermediate.covered[x / kBytes] = group.isCovered();
-        for (int j = 0; j < kQuad; ++j) {
-            uint8_t* const to = intermediateAt<Method>(intermediate, x, j);
-            Method::storeIntermediate(Method::rowOf(group.rows[j]), to);
-        }
+        for (int j = 0; j < kQuad; ++j)
+            store(intermediateAt(intermediate, x, j), group.rows[j] ^ kTapBias);
     }
 }
 
@@ -419,10 +283,9 @@ VOREL_INLINE Range coveredSteps(const IntermediateRows& intermediate, int64_t x,
             min<int64_t>(tapSteps(radius), ((last + 1) * kBytes - 1 - firstTap) / 4 + 1)};
 }
 
-template <class Method>
 void across(const PackedBlur& blur, const IntermediateRows& intermediate, int64_t left, int64_t right,
             const BlurRows& out) {
-    const Method method = Method::of(blur, out.ending.roundsUp);
+    const DotMethod method = DotMethod::of(blur, out.ending.roundsUp);
     for (int64_t x = left; x < right; x += kBytes) {
         const auto storeRow = [&](int j, U8s row) VOREL_INLINE_LAMBDA {
             store(out.start + j * out.stride + (x - left), row ^ out.ending.invertMask);
@@ -432,8 +295,8 @@ void across(const PackedBlur& blur, const IntermediateRows& intermediate, int64_
             for (int j = 0; j < kQuad; ++j)
                 storeRow(j, U8s{});
         } else {
-            method.quadAcross(steps, intermediateAt<Method>(intermediate, 0, 0),
-                              intermediate.strideBytes, x - blur.radius, storeRow);
+            method.quadAcross(steps, intermediateAt(intermediate, 0, 0), intermediate.strideBytes,
+                              x - blur.radius, storeRow);
         }
     }
 }
@@ -447,29 +310,19 @@ void fillCells(const uint8_t* weights, int64_t count, uint8_t* cells) {
     }
 }
 
-/// The form of a loop that suits the blur; where it sums in 32 bits always there is one only.
-template <auto kNarrow, auto kWide, class... Arguments>
-void chosen(const PackedBlur& blur, Arguments... arguments) {
-    if constexpr (!kHasDotProducts) {
-        if (blur.isNarrow) return kNarrow(blur, arguments...);
-    }
-    kWide(blur, arguments...);
-}
-
 }  // namespace
 
 extern const DotLoops kDotLoops = {
-    kBytes,
+    {kBytes, kTapBias},
     kLargestDotRadius,
-    !kHasDotProducts,
+    kLeavesNarrow,
     sizeof(WeightCell),
     fillCells,
-    chosen<clear<NarrowMethod>, clear<DotMethod>>,
-    chosen<feed<NarrowMethod>, feed<DotMethod>>,
-    chosen<down<NarrowMethod>, down<DotMethod>>,
-    chosen<downToBytes<NarrowMethod>, downToBytes<DotMethod>>,
-    chosen<copy<NarrowMethod>, copy<DotMethod>>,
-    chosen<across<NarrowMethod>, across<DotMethod>>,
+    feed,
+    down,
+    downToBytes,
+    copy,
+    across,
 };
 
 }  // namespace VFontEffect::internal::VOREL_LEVEL

@@ -87,6 +87,12 @@ const char* wrongOfBytes(Lanes& random) {
     for (int i = 0; i < kU16Lanes; ++i)
         wide[i] = static_cast<uint16_t>(a[2 * i] + a[2 * i + 1]);
     if (!same(pairSums(x), wide)) return "pairSums";
+#if defined(VOREL_PAIR_PRODUCTS)
+    const auto product = [&](int i) { return a[i] / 2 * static_cast<int8_t>(b[i]); };
+    for (int i = 0; i < kU16Lanes; ++i)
+        wide[i] = static_cast<uint16_t>(product(2 * i) + product(2 * i + 1));
+    if (!same(pairProducts(x >> 1, y), wide)) return "pairProducts";
+#endif
 
     uint64_t lanes = 0;
     bool zero = true;

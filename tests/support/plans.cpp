@@ -137,6 +137,14 @@ std::vector<uint8_t> blurredByDots(const BlurInput& input, const WindowSize& siz
     return collected(blur, input, windows);
 }
 
+std::vector<uint8_t> blurredIn16Bits(const BlurInput& input, const WindowSize& size) {
+    const Windows windows = cut(input.window, size);
+    const NarrowLoops& loops = narrowLoops(chosenLevel());
+    const BlurInput largest = input.largestOf(windows);
+    NarrowBlur blur(loops, largest, NarrowBlur::memoryBytes(loops, largest));
+    return collected(blur, input, windows);
+}
+
 std::vector<uint8_t> blurredByDifferences(const BlurInput& input, const WindowSize& size) {
     const Windows windows = cut(input.window, size);
     const DifferenceLoops& loops = differenceLoops(chosenLevel());

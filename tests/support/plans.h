@@ -34,10 +34,12 @@ struct WindowSize {
     int height = 0;
 };
 
-/// The window's values, row after row: by either strategy of the blur, and by the one that the plan
-/// chooses.
+/// The window's values, row after row: by each strategy of the blur, of which one asks for a radius of 1
+/// to 3 and a total of 255 at most, and by the one that the plan chooses.
 VF_API std::vector<uint8_t> blurredByDots(const VFontEffect::internal::BlurInput& input,
                                           const WindowSize& size = {});
+VF_API std::vector<uint8_t> blurredIn16Bits(const VFontEffect::internal::BlurInput& input,
+                                            const WindowSize& size = {});
 VF_API std::vector<uint8_t> blurredByDifferences(const VFontEffect::internal::BlurInput& input,
                                                  const WindowSize& size = {});
 VF_API std::vector<uint8_t> blurred(const VFontEffect::internal::BlurInput& input);
