@@ -54,31 +54,31 @@ BlurPlan::BlurPlan(CpuLevel level, const BlurInput& largest, int64_t memoryBytes
 }
 
 /// What `action` gives for the one blur that there is.
-template <class Action>
-auto BlurPlan::withBlur(Action action) {
-    if (mNarrow) return action(*mNarrow);
-    if (mDots) return action(*mDots);
-    return action(*mDifferences);
+template <class Plan, class Action>
+auto BlurPlan::withBlur(Plan& plan, Action action) {
+    if (plan.mNarrow) return action(*plan.mNarrow);
+    if (plan.mDots) return action(*plan.mDots);
+    return action(*plan.mDifferences);
 }
 
 void BlurPlan::begin(const BlurInput& input) {
     VOREL_ASSERT(*this && !input.window.empty());
-    withBlur([&](auto& blur) { blur.begin(input); });
+    withBlur(*this, [&](auto& blur) { blur.begin(input); });
     mNextRow = input.window.top;
 }
 
-BlurPlan::operator bool() {
-    return withBlur([](auto& blur) { return static_cast<bool>(blur); });
+BlurPlan::operator bool() const {
+    return withBlur(*this, [](auto& blur) { return static_cast<bool>(blur); });
 }
 
-int64_t BlurPlan::bandRows() {
-    return withBlur([](auto& blur) { return blur.bandRows(); });
+int64_t BlurPlan::bandRows() const {
+    return withBlur(*this, [](auto& blur) { return blur.bandRows(); });
 }
 
 BlurredRows BlurPlan::rows(int64_t y, int64_t count) {
     VOREL_ASSERT(*this && y == mNextRow && count > 0 && count <= bandRows());
     mNextRow += count;
-    return withBlur([&](auto& blur) { return blur.rows(y); });
+    return withBlur(*this, [&](auto& blur) { return blur.rows(y); });
 }
 
 }  // namespace VFontEffect::internal

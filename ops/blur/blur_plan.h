@@ -21,13 +21,13 @@ class BlurPlan {
     /// order and endings.
     BlurPlan(CpuLevel level, const BlurInput& largest, int64_t memoryBytes);
 
-    explicit operator bool();
+    explicit operator bool() const;
 
     /// Turns to an input.
     void begin(const BlurInput& input);
 
     /// Rows that are asked for at once; the last ones may be fewer.
-    int64_t bandRows();
+    int64_t bandRows() const;
 
     /// `count` rows of results from row y of the source on, first column that of the window. Bands are
     /// asked for in order, from the window's top on. The rows may be changed, and stay until the next
@@ -35,8 +35,8 @@ class BlurPlan {
     BlurredRows rows(int64_t y, int64_t count);
 
   private:
-    template <class Action>
-    auto withBlur(Action action);
+    template <class Plan, class Action>
+    static auto withBlur(Plan& plan, Action action);
 
     std::optional<NarrowBlur> mNarrow;
     std::optional<DotBlur> mDots;
