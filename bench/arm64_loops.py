@@ -20,9 +20,13 @@ import sys
 import tempfile
 from typing import NamedTuple
 
-COMPILERS = (("g++", ["aarch64-linux-gnu-g++"]), ("clang", ["clang++-14", "--target=aarch64-linux-gnu"]))
-FLAGS = ["-std=c++17", "-O2", "-ffp-contract=off", "-fno-exceptions", "-Wno-psabi", "-DVOREL_VECTOR_BYTES=16",
-         "-DNDEBUG", "-I.", "-Iinclude", "-S"]
+# As cmake/ has the library built.
+COMPILERS = (("g++", ["aarch64-linux-gnu-g++", "-fno-tree-ch", "-fno-align-jumps", "-fno-align-labels"]),
+             ("clang", ["clang++-14", "--target=aarch64-linux-gnu"]))
+FLAGS = ["-std=c++17", "-O2", "-fPIC", "-fvisibility=hidden", "-ffp-contract=off", "-fno-exceptions", "-Wno-psabi",
+         "-DVOREL_VECTOR_BYTES=16", "-DNDEBUG", "-I.", "-Iinclude", "-S"]
+SMALL_WITH_CLANG = ("ops/blur/difference_loops.cpp", "ops/dilate/dilation_loops.cpp",
+                    "ops/grow/growth_loops.cpp", "ops/ramp/ramp_loops.cpp")
 NEON = ("-DVOREL_LEVEL=neon",)
 DOT_PRODUCTS = ("-DVOREL_LEVEL=dotprod", "-march=armv8.2-a+dotprod")
 LIMIT = 1.25
@@ -109,7 +113,8 @@ LOOPS = (
 
 @functools.cache
 def listing_of(compiler, flags, source):
-    command = [*dict(COMPILERS)[compiler], *FLAGS, *flags, "-o", "-", source]
+    size = ["-Os"] if compiler == "clang" and source in SMALL_WITH_CLANG else []
+    command = [*dict(COMPILERS)[compiler], *FLAGS, *size, *flags, "-o", "-", source]
     return subprocess.run(command, capture_output=True, text=True, check=True).stdout
 
 
