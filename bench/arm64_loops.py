@@ -157,7 +157,9 @@ class Cost(NamedTuple):
 
 def operations_of(instruction):
     """A load or store and the addition to its address apart, as the core carries them out: llvm-mca has the
-    new address wait for the data."""
+    new address wait for the data. Loads of a lane as loads of the register, which they fill with zeros:
+    llvm-mca has them keep what stood there, and wait for it."""
+    instruction = re.sub(r"^ldr\s+[bhsd](\d+),", r"ldr q\1,", instruction)
     moved = re.match(r"(.*\[)(\w+)(\]), (\S+)$", instruction)
     if moved:
         access, base, end, step = moved.groups()
