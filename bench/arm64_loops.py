@@ -140,7 +140,7 @@ def loops_of(lines, bare):
         label = re.match(r"(\.\w+):", line)
         if label:
             labels[label.group(1)] = len(code)
-        elif line and not line.startswith("."):
+        elif line and line[0] not in ".#":
             code.append(line)
             target = re.search(r"(\.L\w+)$", line)
             if target and target.group(1) in labels:
@@ -159,8 +159,11 @@ def operations_of(instruction):
     """A load or store and the addition to its address apart, as the core carries them out: llvm-mca has the
     new address wait for the data. Loads of a lane as loads of the register, which they fill with zeros:
     llvm-mca has them keep what stood there, and wait for it."""
-    instruction = re.sub(r"^ldr\s+[bhsd](\d+),", r"ldr q\1,", instruction)
-    moved = re.match(r"(.*\[)(\w+)(\]), (\S+)$", instruction)
+    lane = re.match(r"ldr\s+[bhsd](\d+), \[(\w+)(?:, ([wx]\d+))?.*\]", instruction)
+    if lane:
+        register, base, index = lane.groups()
+        instruction = instruction.replace(lane.group(0), f"ldr q{register}, [{'x' + index[1:] if index else base}]")
+    moved = re.match(r"(.*\[)([xs]\w+)(\]), (\S+)$", instruction)
     if moved:
         access, base, end, step = moved.groups()
         return [access + base + end, f"add {base}, {base}, {step}"]
@@ -177,7 +180,10 @@ def cost(which, compiler):
     straight = [part for i in loop if not re.match(BRANCH, i) for part in operations_of(i)]
     report = subprocess.run(
         ["llvm-mca-14", "-mtriple=aarch64", "-mcpu=cortex-a76", "-mattr=+dotprod", "-iterations=1000"],
-        input="\n".join(straight), capture_output=True, text=True, check=True).stdout
+        input="\n".join(straight), capture_output=True, text=True, check=True)
+    if "error:" in report.stderr:
+        raise ValueError(f"{which.title}: {report.stderr}")
+    report = report.stdout
     cycles = int(re.search(r"Total Cycles:\s+(\d+)", report).group(1)) / 1000
     throughput = float(re.search(r"Block RThroughput:\s+([\d.]+)", report).group(1))
     return Cost(*(value / which.units for value in (len(loop), cycles, throughput)))
