@@ -123,7 +123,7 @@ def functions(compiler, flags, source):
     """Lines of each function by its plain name."""
     lines = {}
     for line in listing_of(compiler, flags, source).splitlines():
-        start = re.match(r"(_Z\w+):", line)
+        start = re.match(r"(_Z[\w.]+):", line)
         if start:
             name = start.group(1)
             lines[name] = []

@@ -38,6 +38,15 @@ VOREL_INLINE U16s multiplyHighSum(U16s a, U16s x, U16s b, U16s y) {
     const uint32x4_t high = vmlal_high_u16(vmull_high_u16(a16, x16), b16, y16);
     return bitCast<U16s>(vuzp2q_u16(bitCast<uint16x8_t>(low), bitCast<uint16x8_t>(high)));
 }
+/// Four numbers less kFirst, 0 or -128, in the bytes of a word: at least 0, at most 255.
+template <int32_t kFirst>
+VOREL_INLINE uint32_t toBytes(I32s v) {
+    static_assert(kFirst == 0 || kFirst == -128);
+    const int16x4_t halved = vqmovn_s32(bitCast<int32x4_t>(v));
+    const int16x8_t both = vcombine_s16(halved, halved);
+    if constexpr (kFirst == 0) return vget_lane_u32(vreinterpret_u32_u8(vqmovun_s16(both)), 0);
+    return vget_lane_u32(vreinterpret_u32_s8(vqmovn_s16(both)), 0) ^ 0x80808080U;
+}
 VOREL_INLINE I32s toInt(F32s v) { return bitCast<I32s>(vcvtq_s32_f32(bitCast<float32x4_t>(v))); }
 VOREL_INLINE F32s squareRoot(F32s v) { return bitCast<F32s>(vsqrtq_f32(bitCast<float32x4_t>(v))); }
 VOREL_INLINE U16s widenLow(U8s v) {

@@ -12,15 +12,17 @@
 namespace VFontEffect::internal::VOREL_LEVEL {
 namespace {
 
-constexpr int32_t kLastEntry = 255;
-constexpr int32_t kMiddleEntry = 128;
+constexpr int32_t kEntries = 256;
 
 /// x - centre for the columns x, x + 1, ...
 VOREL_INLINE F32s columnsFrom(int64_t x, float centre) {
     return __builtin_convertvector(iota<I32s>() + static_cast<int32_t>(x), F32s) - centre;
 }
 
+/// A row of a ramp that begins at place kFirst, and the places of kU32Lanes pixels from column x on.
 struct LinearRow {
+    static constexpr int32_t kFirst = -128;
+
     RampPixels pixels;
     float rowTerm;
     float stepX;
@@ -31,15 +33,14 @@ struct LinearRow {
                 ramp.centreX};
     }
 
-    /// Entries of kU32Lanes pixels from column x on. Saturation on both sides of the ramp first: adding
-    /// the middle afterwards cannot overflow.
-    VOREL_INLINE I32s entries(int64_t x) const {
-        const I32s place = toInt(rowTerm + stepX * columnsFrom(x, centreX));
-        return clamped(place, -kMiddleEntry, kLastEntry - kMiddleEntry) + kMiddleEntry;
+    VOREL_INLINE I32s places(int64_t x) const {
+        return toInt(rowTerm + stepX * columnsFrom(x, centreX));
     }
 };
 
 struct RadialRow {
+    static constexpr int32_t kFirst = 0;
+
     RampPixels pixels;
     float rowTerm;
     float step;
@@ -50,11 +51,30 @@ struct RadialRow {
         return {ramp.pixels, down * down, ramp.step, ramp.centreX};
     }
 
-    VOREL_INLINE I32s entries(int64_t x) const {
+    VOREL_INLINE I32s places(int64_t x) const {
         const F32s across = columnsFrom(x, centreX);
-        return clamped(toInt(step * squareRoot(rowTerm + across * across)), 0, kLastEntry);
+        return toInt(step * squareRoot(rowTerm + across * across));
     }
 };
+
+/// The colours of kPixels pixels from column x on. Saturation on both sides of the ramp first: taking its
+/// beginning away afterwards cannot overflow.
+template <class RampRow>
+VOREL_INLINE Pixels coloursFrom(const RampRow& row, int64_t x) {
+    constexpr int32_t kFirst = RampRow::kFirst;
+#if defined(VOREL_PLANAR_PIXELS)
+    return lookedUp(row.pixels, [&](int64_t i)
+                                    VOREL_INLINE_LAMBDA { return toBytes<kFirst>(row.places(x + i)); });
+#else
+    const I32s places = clamped(row.places(x), kFirst, kFirst + kEntries - 1);
+    return {bitCast<U8s>(gatherNear(row.pixels, kEntries, places - kFirst))};
+#endif
+}
+
+/// Destination-over: what is premultiplied has no colour where it is transparent.
+VOREL_INLINE Pixels underPremultiplied(const Pixels& d, const Pixels& source) {
+    return under(d, source, ~isTransparent(source));
+}
 
 template <class RampRow>
 struct RampPainter : MaskReader<Empty::keeps, true> {
@@ -62,9 +82,8 @@ struct RampPainter : MaskReader<Empty::keeps, true> {
 
     VOREL_INLINE Pixels paint(const Place& place) const {
         const Pixels destination = loadPixels(place.destination());
-        const Pixels colours = madeOfWords(
-            [&](int64_t i) { return gatherNear(row.pixels, kLastEntry + 1, row.entries(place.x + i)); });
-        return DstOverWhereCovered::apply(destination, colours, loadAmounts(place.mask()));
+        const Where covered = ~isZero(loadAmounts(place.mask()));
+        return underPremultiplied(destination, kept(covered, coloursFrom(row, place.x)));
     }
 };
 
@@ -138,8 +157,16 @@ struct ValuePainter : MaskReader<> {
     RampPixels pixels;
 
     VOREL_INLINE Pixels paint(const Place& place) const {
-        const Pixels colours = madeOfWords([&](int64_t i) { return gather(pixels, place.mask() + i); });
-        return DstOver::apply(loadPixels(place.destination()), colours);
+#if defined(VOREL_PLANAR_PIXELS)
+        const Pixels colours = lookedUp(pixels, [&](int64_t i) VOREL_INLINE_LAMBDA {
+            uint32_t four;
+            std::memcpy(&four, place.mask() + i, sizeof four);
+            return four;
+        });
+#else
+        const Pixels colours = {bitCast<U8s>(gather(pixels, place.mask()))};
+#endif
+        return underPremultiplied(loadPixels(place.destination()), colours);
     }
 };
 

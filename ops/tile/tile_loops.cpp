@@ -20,14 +20,16 @@ void mixColumns(const uint32_t* patternRow, const ColumnTaps& taps, int64_t coun
         const U32s argb = gather(patternRow, load<I32s>(columns));
         return argb >> 8 | argb << 24;
     };
+    const ColumnTaps from = taps;
+    const MixedRow to = out;
     for (int64_t x = 0; x < count; x += kU32Lanes) {
-        const U32s near = pixelsAt(taps.near + x);
-        const U32s far = pixelsAt(taps.far + x);
-        const auto nearWeight = load<U32s>(taps.nearWeights + x);
-        const auto farWeight = load<U32s>(taps.farWeights + x);
-        store(out.redBlue + x,
+        const U32s near = pixelsAt(from.near + x);
+        const U32s far = pixelsAt(from.far + x);
+        const auto nearWeight = load<U32s>(from.nearWeights + x);
+        const auto farWeight = load<U32s>(from.farWeights + x);
+        store(to.redBlue + x,
               weighted(near & kEvenBytes, nearWeight) + weighted(far & kEvenBytes, farWeight));
-        store(out.greenAlpha + x,
+        store(to.greenAlpha + x,
               weighted(near >> 8 & kEvenBytes, nearWeight) + weighted(far >> 8 & kEvenBytes, farWeight));
     }
 }
