@@ -42,13 +42,18 @@ class Loop(NamedTuple):
     units: int  # what a round of the loop makes
     flags: tuple = NEON
     bare: bool = False  # whether inner loops do not count
+    part: tuple = ("", "")  # what counts begins and ends with the first and the last instruction like that
 
     def found_in(self, functions):
         loops = [loop for name, code in functions.items() if re.search(self.function, name)
                  for loop in loops_of(code, self.bare) if self.fits(loop)]
         if not loops:
             raise LookupError(f"{self.source}: no loop looks like {self.title}")
-        return min(loops, key=len)
+        loop = min(loops, key=len)
+        first, last = self.part
+        begin = next(i for i, code in enumerate(loop) if re.match(first, code))
+        end = next(i for i in reversed(range(len(loop))) if re.match(last, loop[i]))
+        return loop[begin:end + 1]
 
     def fits(self, loop):
         return all(sum(bool(re.match(kind, i)) for i in loop) >= count for kind, count in self.kinds.items())
@@ -63,9 +68,15 @@ def dilation(title, function, kinds, units):
     return Loop("dilation, " + title, "ops/dilate/dilation_loops.cpp", function, kinds, units)
 
 
-def dots(title, function, kinds, bare=False):
+def dots(title, function):
     """A dot product adds 4 taps to 4 results; 64 results are made at a time."""
-    return Loop("blur, " + title, "ops/blur/dot_loops.cpp", function, kinds, 64, DOT_PRODUCTS, bare)
+    return Loop("blur, " + title, "ops/blur/dot_loops.cpp", function, {"udot": 64}, 64, DOT_PRODUCTS)
+
+
+def division(title, function, flags):
+    """What stands behind the loops over the taps, from the conversion of their sums on."""
+    return Loop("blur, " + title, "ops/blur/dot_loops.cpp", function, {"fcvtzs": 16}, 64, flags, True,
+                ("scvtf", "st"))
 
 
 def ramp(title, function, kinds):
@@ -92,10 +103,10 @@ LOOPS = (
              {"umax": 4, r"ldu?r\s+q": 4, "ldp": 1}, 16),
     dilation("tiles, two windows", "dilatedTile|addTouching|rowsByTiles", {"umax": 2, "ldpsw": 1}, 16),
     dilation("smaller of two rows", "keepMin", {"umin": 1}, 16),
-    dots("down, 16 taps", "down", {"udot": 64}),
-    dots("across, 16 taps", "across", {"udot": 64}),
-    dots("down, division", "down<", {"fcvtzs": 16}, bare=True),
-    dots("across, division", "across<", {"fcvtzs": 16}, bare=True),
+    dots("down, 16 taps", "down"),
+    dots("across, 16 taps", "across"),
+    division("down, division", "down<", DOT_PRODUCTS),
+    division("across, division", "across<", DOT_PRODUCTS),
     # Four rows of results at a time, 16 of each.
     Loop("differences, a term", "ops/blur/difference_loops.cpp", "next", {r"(add|sub)\s+v": 8}, 64),
     # Two rows at a time, a pair sum in each.

@@ -72,6 +72,13 @@ VOREL_INLINE U8s pack(U16s a, U16s b) {
     return bitCast<U8s>(vuzp1q_u8(bitCast<uint8x16_t>(a), bitCast<uint8x16_t>(b)));
 }
 VOREL_INLINE U8s narrow(U16s a, U16s b) { return pack(a, b); }
+#define VOREL_NATIVE_JOINED_BYTES
+VOREL_INLINE U8s joinedBytes(U32s a, U32s b, U32s c, U32s d) {
+    const auto pairs = [](U32s low, U32s high) {
+        return vreinterpretq_u16_u8(vtrn1q_u8(bitCast<uint8x16_t>(low), bitCast<uint8x16_t>(high)));
+    };
+    return bitCast<U8s>(vtrn1q_u16(pairs(a, b), pairs(c, d)));
+}
 VOREL_INLINE U16s pairSums(U8s v) { return bitCast<U16s>(vpaddlq_u8(bitCast<uint8x16_t>(v))); }
 VOREL_INLINE U8s quarters(U16s even, U16s odd) {
     const auto raised = [](U16s sums) {

@@ -186,9 +186,8 @@ struct DotMethod {
             const Grid grid = sums({from, stride, 4}, steps);
             unrolled<kGridVectors>([&](auto v) VOREL_INLINE_LAMBDA {
                 const U32s* const four = grid.sums[v.value];
-                store(kRow + v.value,
-                      bitCast<U8s>(quotient(four[0], inverse) | quotient(four[1], inverse) << 8 |
-                                   quotient(four[2], inverse) << 16 | quotient(four[3], inverse) << 24));
+                store(kRow + v.value, joinedBytes(quotient(four[0], inverse), quotient(four[1], inverse),
+                                                  quotient(four[2], inverse), quotient(four[3], inverse)));
             });
         });
     }
@@ -368,10 +367,11 @@ void down(const PackedBlur& blur, const TapColumns& columns, int64_t quad,
         const Range steps = coveredSteps(columns, strip, quad, blur.radius);
         intermediate.covered[firstStrip + strip] = !steps.empty();
     }
+    uint8_t* const start = intermediateAt<Method>(intermediate, firstStrip * kBytes, 0);
+    const int64_t stride = intermediate.strideBytes;
     quadDown(Method::of(blur, false), columns, quad, blur.radius,
-             [&](int64_t strip, int j, const typename Method::Row& row) VOREL_INLINE_LAMBDA {
-                 Method::storeIntermediate(
-                     row, intermediateAt<Method>(intermediate, (firstStrip + strip) * kBytes, j));
+             [=](int64_t strip, int j, const typename Method::Row& row) VOREL_INLINE_LAMBDA {
+                 Method::storeIntermediate(row, start + j * stride + strip * kBytes * Method::kPixelBytes);
              });
     if (intermediate.fullBefore > 0 || intermediate.fullFrom < intermediate.columns)
         fillFullColumns<Method>(intermediate);
@@ -379,10 +379,12 @@ void down(const PackedBlur& blur, const TapColumns& columns, int64_t quad,
 
 template <class Method>
 void downToBytes(const PackedBlur& blur, const TapColumns& columns, int64_t quad, const BlurRows& out) {
+    uint8_t* const start = out.start;
+    const int64_t stride = out.stride;
+    const U8s invertMask = splat<U8s>(out.ending.invertMask);
     quadDown(Method::of(blur, out.ending.roundsUp), columns, quad, blur.radius,
-             [&](int64_t strip, int j, const typename Method::Row& row) VOREL_INLINE_LAMBDA {
-                 store(out.start + j * out.stride + strip * kBytes,
-                       Method::bytesOf(row) ^ out.ending.invertMask);
+             [=](int64_t strip, int j, const typename Method::Row& row) VOREL_INLINE_LAMBDA {
+                 store(start + j * stride + strip * kBytes, Method::bytesOf(row) ^ invertMask);
              });
 }
 
@@ -423,9 +425,12 @@ template <class Method>
 void across(const PackedBlur& blur, const IntermediateRows& intermediate, int64_t left, int64_t right,
             const BlurRows& out) {
     const Method method = Method::of(blur, out.ending.roundsUp);
+    uint8_t* const start = out.start;
+    const int64_t stride = out.stride;
+    const U8s invertMask = splat<U8s>(out.ending.invertMask);
     for (int64_t x = left; x < right; x += kBytes) {
-        const auto storeRow = [&](int j, U8s row) VOREL_INLINE_LAMBDA {
-            store(out.start + j * out.stride + (x - left), row ^ out.ending.invertMask);
+        const auto storeRow = [=](int j, U8s row) VOREL_INLINE_LAMBDA {
+            store(start + j * stride + (x - left), row ^ invertMask);
         };
         const Range steps = coveredSteps(intermediate, x, blur.radius);
         if (steps.empty()) {
