@@ -46,6 +46,7 @@
 /// | interleaveLow, interleaveHigh | the lanes of two vectors in turn, from their lower, their upper ends; |
 /// |                               | AVX does so in each 128 bits by itself                               |
 /// | pack                          | lanes of at most 255 in half the width, as before interleaving       |
+/// | [upperBytes]                  | the upper bytes of 16-bit lanes: the first vector's, the second's    |
 /// | [joinedBytes]                 | words of at most 255 from four vectors, as the bytes of words        |
 /// | pairSums                      | of each two neighbouring bytes                                       |
 /// | quarters                      | a quarter of each 16-bit lane, at most 255, from two vectors in turn |

@@ -22,6 +22,12 @@ VOREL_INLINE U16s multiplyHighSum(U16s a, U16s x, U16s b, U16s y) {
 }
 #endif
 
+#if !defined(VOREL_NATIVE_UPPER_BYTES)
+VOREL_INLINE U8s upperBytes(U16s a, U16s b) {
+    return narrow(a >> 8, b >> 8);
+}
+#endif
+
 #if !defined(VOREL_NATIVE_JOINED_BYTES)
 VOREL_INLINE U8s joinedBytes(U32s a, U32s b, U32s c, U32s d) {
     return bitCast<U8s>(a | b << 8 | c << 16 | d << 24);

@@ -72,6 +72,10 @@ VOREL_INLINE U8s pack(U16s a, U16s b) {
     return bitCast<U8s>(vuzp1q_u8(bitCast<uint8x16_t>(a), bitCast<uint8x16_t>(b)));
 }
 VOREL_INLINE U8s narrow(U16s a, U16s b) { return pack(a, b); }
+#define VOREL_NATIVE_UPPER_BYTES
+VOREL_INLINE U8s upperBytes(U16s a, U16s b) {
+    return bitCast<U8s>(vuzp2q_u8(bitCast<uint8x16_t>(a), bitCast<uint8x16_t>(b)));
+}
 #define VOREL_NATIVE_JOINED_BYTES
 VOREL_INLINE U8s joinedBytes(U32s a, U32s b, U32s c, U32s d) {
     const auto pairs = [](U32s low, U32s high) {

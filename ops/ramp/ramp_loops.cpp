@@ -104,19 +104,22 @@ void mixStops(const RampSegment& segment, const float* positions, int64_t count,
     const auto lowerOdd = splat<U32s>(segment.lower >> 8 & kEvenBytes);
     const auto upperEven = splat<U32s>(segment.upper & kEvenBytes);
     const auto upperOdd = splat<U32s>(segment.upper >> 8 & kEvenBytes);
-    for (int64_t i = 0; i < count; i += kU32Lanes) {
-        const F32s place = (load<F32s>(positions + i) - segment.start) / segment.span * 256.0F;
+    const float start = segment.start;
+    const float span = segment.span;
+    const auto mixedAt = [=](int64_t i) VOREL_INLINE_LAMBDA {
+        const F32s place = (load<F32s>(positions + i) - start) / span * 256.0F;
         const auto weight = bitCast<U32s>(clamped(toInt(place), 0, 256));
         const U32s rest = 256 - weight;
         const U32s even = (weight * upperEven + rest * lowerEven) >> 8 & kEvenBytes;
         const U32s odd = (weight * upperOdd + rest * lowerOdd) & ~kEvenBytes;
-        const U32s mixed = even | odd;
-        if (count - i >= kU32Lanes) {
-            std::memcpy(colours + i, &mixed, sizeof mixed);
-        } else {
-            std::memcpy(colours + i, &mixed, static_cast<size_t>(4 * (count - i)));
-        }
-    }
+        return even | odd;
+    };
+    int64_t i = 0;
+    for (; i + kU32Lanes <= count; i += kU32Lanes)
+        store(colours + i, mixedAt(i));
+    if (i == count) return;
+    const U32s rest = mixedAt(i);
+    std::memcpy(colours + i, &rest, static_cast<size_t>(4 * (count - i)));
 }
 
 void premultiplied(const uint32_t* colours, int64_t count, uint32_t* pixels) {
@@ -128,21 +131,20 @@ void premultiplied(const uint32_t* colours, int64_t count, uint32_t* pixels) {
     }
 }
 
-/// 256 * value / 180: of the upper half of a product with 2^23 / 180, rounded up, the upper 9 bits. The
-/// rounding adds less than 0.005 for values of a byte, and as 256 / 180 = 64 / 45, fractions are
+/// alpha * min(256 * value / 180, 256). The quotient is the upper half of a product of twice the value with
+/// 2^23 / 180, rounded up. The rounding adds less than 0.005 for values of a byte, and as 256 / 180 = 64 / 45, fractions are
 /// multiples of 1 / 45: none of them reaches the next whole number.
 VOREL_INLINE U16s fadedLanes(U16s values, U16s alpha) {
     constexpr uint16_t kMultiplier = ((1U << 23) + kFadedValues - 1) / kFadedValues;
-    const U16s quotient = multiplyHigh(values << 8, splat<U16s>(kMultiplier)) >> 7;
-    const auto factor = min(bitCast<I16s>(quotient), splat<I16s>(int16_t{256}));
-    return alpha * bitCast<U16s>(factor) >> 8;
+    const U16s quotient = multiplyHigh(values + values, splat<U16s>(kMultiplier));
+    return alpha * bitCast<U16s>(min(bitCast<I16s>(quotient), splat<I16s>(int16_t{256})));
 }
 
 void fade(uint8_t* values, int64_t count, uint32_t alpha) {
     VOREL_ASSERT(alpha <= 255);
     const auto alphas = splat<U16s>(static_cast<uint16_t>(alpha));
     const auto faded = [alphas](U8s v) VOREL_INLINE_LAMBDA {
-        return narrow(fadedLanes(widenLow(v), alphas), fadedLanes(widenHigh(v), alphas));
+        return upperBytes(fadedLanes(widenLow(v), alphas), fadedLanes(widenHigh(v), alphas));
     };
     int64_t x = 0;
     for (; x + kBytes <= count; x += kBytes)
