@@ -47,6 +47,8 @@
 /// |                               | AVX does so in each 128 bits by itself                               |
 /// | pack                          | lanes of at most 255 in half the width, as before interleaving       |
 /// | [upperBytes]                  | the upper bytes of 16-bit lanes: the first vector's, the second's    |
+/// | [upperBytesInTurn]            | the upper bytes of the 16-bit lanes of two vectors, in turn          |
+/// | [inBothHalves]                | words below 2^16, in both of their 16-bit lanes                      |
 /// | [joinedBytes]                 | words of at most 255 from four vectors, as the bytes of words        |
 /// | pairSums                      | of each two neighbouring bytes                                       |
 /// | quarters                      | a quarter of each 16-bit lane, at most 255, from two vectors in turn |

@@ -76,6 +76,14 @@ VOREL_INLINE U8s narrow(U16s a, U16s b) { return pack(a, b); }
 VOREL_INLINE U8s upperBytes(U16s a, U16s b) {
     return bitCast<U8s>(vuzp2q_u8(bitCast<uint8x16_t>(a), bitCast<uint8x16_t>(b)));
 }
+#define VOREL_NATIVE_UPPER_BYTES_IN_TURN
+VOREL_INLINE U8s upperBytesInTurn(U16s a, U16s b) {
+    return bitCast<U8s>(vtrn2q_u8(bitCast<uint8x16_t>(a), bitCast<uint8x16_t>(b)));
+}
+#define VOREL_NATIVE_IN_BOTH_HALVES
+VOREL_INLINE U16s inBothHalves(U32s v) {
+    return bitCast<U16s>(vtrn1q_u16(bitCast<uint16x8_t>(v), bitCast<uint16x8_t>(v)));
+}
 #define VOREL_NATIVE_JOINED_BYTES
 VOREL_INLINE U8s joinedBytes(U32s a, U32s b, U32s c, U32s d) {
     const auto pairs = [](U32s low, U32s high) {
