@@ -34,6 +34,7 @@
 /// | allZero                       | whether no lane holds anything but 0                                 |
 /// | nonZeroLanes, kLaneBits       | kLaneBits ones for each byte but 0, the first one's lowest           |
 /// | toInt                         | as core/numeric.h converts: toward zero, saturating, NaN to 0        |
+/// | [toIntUpTo<most>]             | as toInt, at least 0                                                 |
 /// | squareRoot                    | correctly rounded                                                    |
 /// | [timesFactor, kNumberBias]    | numbers below 2^23, stored with the bias added, as floats, times a   |
 /// |                               | factor, rounded once                                                 |

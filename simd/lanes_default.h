@@ -22,6 +22,13 @@ VOREL_INLINE U16s multiplyHighSum(U16s a, U16s x, U16s b, U16s y) {
 }
 #endif
 
+#if !defined(VOREL_NATIVE_TO_INT_UP_TO)
+template <int32_t kMost>
+VOREL_INLINE U32s toIntUpTo(F32s v) {
+    return bitCast<U32s>(clamped(toInt(v), 0, kMost));
+}
+#endif
+
 #if !defined(VOREL_NATIVE_UPPER_BYTES)
 VOREL_INLINE U8s upperBytes(U16s a, U16s b) {
     return narrow(a >> 8, b >> 8);

@@ -48,6 +48,11 @@ VOREL_INLINE uint32_t toBytes(I32s v) {
     return vget_lane_u32(vreinterpret_u32_s8(vqmovn_s16(both)), 0) ^ 0x80808080U;
 }
 VOREL_INLINE I32s toInt(F32s v) { return bitCast<I32s>(vcvtq_s32_f32(bitCast<float32x4_t>(v))); }
+#define VOREL_NATIVE_TO_INT_UP_TO
+template <int32_t kMost>
+VOREL_INLINE U32s toIntUpTo(F32s v) {
+    return min(bitCast<U32s>(vcvtq_u32_f32(bitCast<float32x4_t>(v))), splat<U32s>(uint32_t{kMost}));
+}
 VOREL_INLINE F32s squareRoot(F32s v) { return bitCast<F32s>(vsqrtq_f32(bitCast<float32x4_t>(v))); }
 VOREL_INLINE U16s widenLow(U8s v) {
     return bitCast<U16s>(vmovl_u8(vget_low_u8(bitCast<uint8x16_t>(v))));

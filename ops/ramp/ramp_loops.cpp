@@ -108,7 +108,7 @@ void mixStops(const RampSegment& segment, const float* positions, int64_t count,
     const float span = segment.span;
     const auto mixedAt = [=](int64_t i) VOREL_INLINE_LAMBDA {
         const F32s place = (load<F32s>(positions + i) - start) / span * 256.0F;
-        const auto weight = bitCast<U32s>(clamped(toInt(place), 0, 256));
+        const U32s weight = toIntUpTo<256>(place);
         const U32s rest = 256 - weight;
         const U32s even = (weight * upperEven + rest * lowerEven) >> 8 & kEvenBytes;
         const U32s odd = (weight * upperOdd + rest * lowerOdd) & ~kEvenBytes;

@@ -48,8 +48,7 @@ void mixRows(const MixedRow& near, const MixedRow& far, uint32_t nearWeight, uin
         const U16s redBlue = mixed(first.redBlue, second.redBlue);
         const auto greenAlpha = bitCast<U32s>(mixed(first.greenAlpha, second.greenAlpha));
         const auto straightAlpha = bitCast<I32s>(greenAlpha >> 16);
-        const I32s seenAlpha = toInt(__builtin_convertvector(straightAlpha, F32s) * opacity);
-        const auto alpha = bitCast<U32s>(clamped(seenAlpha, 0, 255));
+        const U32s alpha = toIntUpTo<255>(__builtin_convertvector(straightAlpha, F32s) * opacity);
         const U16s factor = inBothHalves(alpha);
         // Products before their shift, 256 * alpha in the place of the alpha's own.
         const auto green = bitCast<U16s>((greenAlpha & 0xFFFFU) + 0x01000001U);
