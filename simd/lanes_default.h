@@ -30,21 +30,15 @@ VOREL_INLINE U32s toIntUpTo(F32s v) {
 #endif
 
 #if !defined(VOREL_NATIVE_UPPER_BYTES)
-VOREL_INLINE U8s upperBytes(U16s a, U16s b) {
-    return narrow(a >> 8, b >> 8);
-}
+VOREL_INLINE U8s upperBytes(U16s a, U16s b) { return narrow(a >> 8, b >> 8); }
 #endif
 
 #if !defined(VOREL_NATIVE_UPPER_BYTES_IN_TURN)
-VOREL_INLINE U8s upperBytesInTurn(U16s a, U16s b) {
-    return bitCast<U8s>(a >> 8 | (b & 0xFF00));
-}
+VOREL_INLINE U8s upperBytesInTurn(U16s a, U16s b) { return bitCast<U8s>(a >> 8 | (b & 0xFF00)); }
 #endif
 
 #if !defined(VOREL_NATIVE_IN_BOTH_HALVES)
-VOREL_INLINE U16s inBothHalves(U32s v) {
-    return bitCast<U16s>(v | v << 16);
-}
+VOREL_INLINE U16s inBothHalves(U32s v) { return bitCast<U16s>(v | v << 16); }
 #endif
 
 #if !defined(VOREL_NATIVE_JOINED_BYTES)

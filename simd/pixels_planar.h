@@ -26,17 +26,20 @@ VOREL_INLINE void storePixels(uint8_t* to, const Pixels& pixels) {
     const uint8x16x4_t planes = {{c[0], c[1], c[2], c[3]}};
     vst4q_u8(to, planes);
 #else
+    // g++ computes channels in registers of their own and moves them into the four that the store takes.
     register uint8x16_t red asm("v0") = c[0];
     register uint8x16_t green asm("v1") = c[1];
     register uint8x16_t blue asm("v2") = c[2];
     register uint8x16_t alpha asm("v3") = c[3];
     using Bytes = uint8_t[4 * kPixels];
-    asm("st4 {%1.16b - %4.16b}, %0" : "=Q"(*reinterpret_cast<Bytes*>(to)) : "w"(red), "w"(green), "w"(blue), "w"(alpha));
+    asm("st4 {%1.16b - %4.16b}, %0"
+        : "=Q"(*reinterpret_cast<Bytes*>(to))
+        : "w"(red), "w"(green), "w"(blue), "w"(alpha));
 #endif
 }
-/// The words of a table, as pixels in memory order; indicesAt(i) are those of pixel i and the next three,
-/// in the bytes of a word. The words come together in pairs: a vector takes longer to be put together by
-/// single words.
+/// The words of a table, as pixels in memory order; indicesAt(i) are those of pixel i and the next
+/// three, in the bytes of a word. The words come together in pairs: a vector takes longer to be put
+/// together by single words.
 template <class IndicesAt>
 VOREL_INLINE Pixels lookedUp(const uint32_t* table, IndicesAt indicesAt) {
     uint64_t pairs[kPixels / 2];
@@ -117,6 +120,15 @@ VOREL_INLINE Pixels scaled(const Pixels& p, Amounts amounts) {
 
 VOREL_INLINE Halves halvesOf(const Pixels& p) { return p; }
 VOREL_INLINE Pixels joined(const Halves& h) { return h; }
+/// What has been multiplied and will be again. g++ would keep its lower half apart, for the next
+/// product, and move it to join the upper one.
+VOREL_INLINE Halves inWholeVectors(Halves h) {
+#if !defined(__clang__)
+    for (uint8x16_t& channel : h.channels)
+        asm("" : "+w"(channel));
+#endif
+    return h;
+}
 VOREL_INLINE Pixels sumOf(const Halves& a, const Halves& b) { return added(a, b); }
 
 /// min(product(a + b, amount), 255) of 255 - a. With b - (255 - a) = 256 (h - 1) + l it is

@@ -186,8 +186,9 @@ struct DotMethod {
             const Grid grid = sums({from, stride, 4}, steps);
             unrolled<kGridVectors>([&](auto v) VOREL_INLINE_LAMBDA {
                 const U32s* const four = grid.sums[v.value];
-                store(kRow + v.value, joinedBytes(quotient(four[0], inverse), quotient(four[1], inverse),
-                                                  quotient(four[2], inverse), quotient(four[3], inverse)));
+                store(kRow + v.value,
+                      joinedBytes(quotient(four[0], inverse), quotient(four[1], inverse),
+                                  quotient(four[2], inverse), quotient(four[3], inverse)));
             });
         });
     }
@@ -371,7 +372,8 @@ void down(const PackedBlur& blur, const TapColumns& columns, int64_t quad,
     const int64_t stride = intermediate.strideBytes;
     quadDown(Method::of(blur, false), columns, quad, blur.radius,
              [=](int64_t strip, int j, const typename Method::Row& row) VOREL_INLINE_LAMBDA {
-                 Method::storeIntermediate(row, start + j * stride + strip * kBytes * Method::kPixelBytes);
+                 Method::storeIntermediate(row,
+                                           start + j * stride + strip * kBytes * Method::kPixelBytes);
              });
     if (intermediate.fullBefore > 0 || intermediate.fullFrom < intermediate.columns)
         fillFullColumns<Method>(intermediate);

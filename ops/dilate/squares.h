@@ -30,7 +30,8 @@ namespace VFontEffect::internal::VOREL_LEVEL {
 /// Rows that planes have room for beside those in reach: a number of bands, after which rows are moved.
 constexpr int64_t kRolledRows = 64;
 
-/// Loads of one sector, as offsets from a result's place in the plane of single pixels.
+/// Loads of one sector, as offsets from a result's place in the plane of single pixels. Lists are even,
+/// so that half of a loop's maxima need not wait for each other.
 struct Sector {
     const int32_t* bounds;   ///< squares with all of it
     const int32_t* squares;  ///< of its corners
@@ -90,12 +91,12 @@ inline SquareLayout SquareLayout::of(const Dilation& dilation, Arena& arena) {
     layout.firstRow = layout.filledRows = 0;
     layout.sectors = arena.take<Sector>(kSectors);
     layout.middle = arena.take<int32_t>(4);
-    layout.around = arena.take<int32_t>(9);
+    layout.around = arena.take<int32_t>(10);
     layout.aroundCount = 0;
     // A quarter's staircase has at most a corner in each row, its rim four cells.
     constexpr int64_t kMostBounds = 8;
-    layout.offsets = arena.take<int32_t>(kImages * (5 * (reach + 1) + 2 * kMostBounds));
-    layout.deficits = arena.take<U8s>(4 * (reach + 1));
+    layout.offsets = arena.take<int32_t>(kImages * (5 * (reach + 1) + 2 * kMostBounds) + 3 * kSectors);
+    layout.deficits = arena.take<U8s>(4 * (reach + 1) + 2);
     layout.results = arena.take<uint8_t>(dilation.bandRows * dilatedStride(dilation));
     return layout;
 }
@@ -115,6 +116,16 @@ class LoadLists {
     explicit LoadLists(const SquareLayout& layout) : mLayout(layout), mNext(layout.offsets) {}
 
     int32_t* next() const { return mNext; }
+
+    /// Ends a list that began there: an odd one repeats its last load. Whether it does.
+    bool end(const int32_t* begin) {
+        const bool isOdd = (mNext - begin) % 2 != 0;
+        if (isOdd) {
+            mNext[0] = mNext[-1];
+            ++mNext;
+        }
+        return isOdd;
+    }
 
     /// The square of a plane whose outer corner is that cell.
     void addSquare(const Image& image, int64_t plane, int64_t x, int64_t y) {
@@ -180,10 +191,14 @@ inline Sector listSector(LoadLists& lists, const DiscShape& disc, const Image& i
     Sector sector;
     sector.bounds = lists.next();
     addBounds(lists, disc, image, rows);
+    lists.end(sector.bounds);
     sector.squares = lists.next();
     addCorners(lists, disc, image, rows);
+    lists.end(sector.squares);
     sector.rim = lists.next();
     addRim(lists, disc, image, rows, deficits);
+    const int64_t cells = lists.next() - sector.rim;
+    if (lists.end(sector.rim)) deficits[cells] = deficits[cells - 1];
     sector.deficits = deficits;
     sector.boundCount = static_cast<int32_t>(sector.squares - sector.bounds);
     sector.squareCount = static_cast<int32_t>(sector.rim - sector.squares);
@@ -228,6 +243,7 @@ inline void beginSquares(const Dilation& dilation, uint8_t* memory) {
     listSquares(layout, halfOfMiddle(disc), 2, layout.middle);
     listSquares(layout, disc.reach, perRow, layout.around);
     layout.aroundCount = perRow * perRow;
+    if (layout.aroundCount % 2 != 0) layout.around[layout.aroundCount++] = layout.around[0];
     listSectors(layout, disc);
     layout.firstRow = dilation.top - disc.reach;
     layout.filledRows = 0;
@@ -285,14 +301,17 @@ inline void fillPlanes(const Dilation& dilation, SquareLayout& layout, int64_t e
 // --- Evaluation --------------------------------------------------------------------------------------
 
 VOREL_INLINE U8s largestOf(const uint8_t* place, const int32_t* offsets, int64_t count, U8s value) {
-    for (int64_t i = 0; i < count; ++i)
-        value = max(value, load<U8s>(place + offsets[i]));
+    for (int64_t i = 0; i < count; i += 2)
+        value = max(value, max(load<U8s>(place + offsets[i]), load<U8s>(place + offsets[i + 1])));
     return value;
 }
 
 VOREL_INLINE U8s withRim(const Sector& sector, const uint8_t* place, U8s value) {
-    for (int32_t i = 0; i < sector.rimCount; ++i)
-        value = max(value, subSaturated(load<U8s>(place + sector.rim[i]), sector.deficits[i]));
+    for (int32_t i = 0; i < sector.rimCount; i += 2) {
+        const U8s first = subSaturated(load<U8s>(place + sector.rim[i]), sector.deficits[i]);
+        const U8s second = subSaturated(load<U8s>(place + sector.rim[i + 1]), sector.deficits[i + 1]);
+        value = max(value, max(first, second));
+    }
     return value;
 }
 

@@ -12,8 +12,6 @@
 namespace VFontEffect::internal::VOREL_LEVEL {
 namespace {
 
-constexpr int32_t kEntries = 256;
-
 /// x - centre for the columns x, x + 1, ...
 VOREL_INLINE F32s columnsFrom(int64_t x, float centre) {
     return __builtin_convertvector(iota<I32s>() + static_cast<int32_t>(x), F32s) - centre;
@@ -57,15 +55,16 @@ struct RadialRow {
     }
 };
 
-/// The colours of kPixels pixels from column x on. Saturation on both sides of the ramp first: taking its
-/// beginning away afterwards cannot overflow.
+/// The colours of kPixels pixels from column x on. Saturation on both sides of the ramp first: taking
+/// its beginning away afterwards cannot overflow.
 template <class RampRow>
 VOREL_INLINE Pixels coloursFrom(const RampRow& row, int64_t x) {
     constexpr int32_t kFirst = RampRow::kFirst;
 #if defined(VOREL_PLANAR_PIXELS)
-    return lookedUp(row.pixels, [&](int64_t i)
-                                    VOREL_INLINE_LAMBDA { return toBytes<kFirst>(row.places(x + i)); });
+    return lookedUp(row.pixels,
+                    [&](int64_t i) VOREL_INLINE_LAMBDA { return toBytes<kFirst>(row.places(x + i)); });
 #else
+    constexpr int32_t kEntries = 256;
     const I32s places = clamped(row.places(x), kFirst, kFirst + kEntries - 1);
     return {bitCast<U8s>(gatherNear(row.pixels, kEntries, places - kFirst))};
 #endif
@@ -115,9 +114,9 @@ void mixStops(const RampSegment& segment, const float* positions, int64_t count,
         return even | odd;
     };
     int64_t i = 0;
-    for (; i + kU32Lanes <= count; i += kU32Lanes)
+    for (const int64_t last = count - kU32Lanes; i <= last; i += kU32Lanes)
         store(colours + i, mixedAt(i));
-    if (i == count) return;
+    if (i >= count) return;
     const U32s rest = mixedAt(i);
     std::memcpy(colours + i, &rest, static_cast<size_t>(4 * (count - i)));
 }
@@ -131,9 +130,9 @@ void premultiplied(const uint32_t* colours, int64_t count, uint32_t* pixels) {
     }
 }
 
-/// alpha * min(256 * value / 180, 256). The quotient is the upper half of a product of twice the value with
-/// 2^23 / 180, rounded up. The rounding adds less than 0.005 for values of a byte, and as 256 / 180 = 64 / 45, fractions are
-/// multiples of 1 / 45: none of them reaches the next whole number.
+/// alpha * min(256 * value / 180, 256). The quotient is the upper half of a product of twice the value
+/// with 2^23 / 180, rounded up. The rounding adds less than 0.005 for values of a byte, and as 256 / 180
+/// = 64 / 45, fractions are multiples of 1 / 45: none of them reaches the next whole number.
 VOREL_INLINE U16s fadedLanes(U16s values, U16s alpha) {
     constexpr uint16_t kMultiplier = ((1U << 23) + kFadedValues - 1) / kFadedValues;
     const U16s quotient = multiplyHigh(values + values, splat<U16s>(kMultiplier));
@@ -147,7 +146,7 @@ void fade(uint8_t* values, int64_t count, uint32_t alpha) {
         return upperBytes(fadedLanes(widenLow(v), alphas), fadedLanes(widenHigh(v), alphas));
     };
     int64_t x = 0;
-    for (; x + kBytes <= count; x += kBytes)
+    for (const int64_t last = count - kBytes; x <= last; x += kBytes)
         store(values + x, faded(load<U8s>(values + x)));
     if (x == count) return;
     const U8s rest = faded(loadFirst(values + x, count - x));
