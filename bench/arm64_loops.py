@@ -108,7 +108,7 @@ LOOPS = (
     dilation("tiles, 16 rows that touch", "touchingRange|addTouching|rowsByTiles|dilatedTile", {"uqsub": 2, "cmhs": 1}, 16),
     dilation("squares, joining four", "joinSquares|rowsBySquares|fillPlanes", {"umax": 3, r"str\s+q": 1}, 16),
     dilation("squares, two of them", "dilatedVector|rowsBySquares", {"umax": 2, r"ldr\s+q": 2}, 16),
-    dilation("squares, two cells of the rim", "dilatedVector|rowsBySquares", {"umax": 2, "uqsub": 2}, 16),
+    dilation("squares, a cell of the rim", "dilatedVector|rowsBySquares", {"umax": 1, "uqsub": 1, "ldrsw": 1}, 16),
     dilation("smaller of two rows", "keepMin", {"umin": 1}, 16),
     dots("down, 16 taps", "down"),
     dots("across, 16 taps", "across"),

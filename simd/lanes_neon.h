@@ -43,7 +43,7 @@ template <int32_t kFirst>
 VOREL_INLINE uint32_t toBytes(I32s v) {
     static_assert(kFirst == 0 || kFirst == -128);
     const int16x4_t halved = vqmovn_s32(bitCast<int32x4_t>(v));
-    const int16x8_t both = vcombine_s16(halved, halved);
+    const int16x8_t both = vcombine_s16(halved, vdup_n_s16(0));
     if constexpr (kFirst == 0) return vget_lane_u32(vreinterpret_u32_u8(vqmovun_s16(both)), 0);
     return vget_lane_u32(vreinterpret_u32_s8(vqmovn_s16(both)), 0) ^ 0x80808080U;
 }

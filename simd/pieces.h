@@ -17,11 +17,10 @@ template <int64_t kWidth = kBytes, class Work>
 VOREL_INLINE void forPieces(int64_t count, Work work) {
     using V = typename Piece<kWidth>::Vector;
     if (count >= kWidth) {
-        const int64_t last = count - kWidth;
         int64_t x = 0;
-        for (; x <= last; x += kWidth)
+        for (; x + kWidth <= count; x += kWidth)
             work(V{}, x);
-        if (x < count) work(V{}, last);
+        if (x < count) work(V{}, count - kWidth);
     } else if constexpr (kWidth > 1) {
         forPieces<kWidth / 2>(count, work);
     }

@@ -30,8 +30,8 @@ namespace VFontEffect::internal::VOREL_LEVEL {
 /// Rows that planes have room for beside those in reach: a number of bands, after which rows are moved.
 constexpr int64_t kRolledRows = 64;
 
-/// Loads of one sector, as offsets from a result's place in the plane of single pixels. Lists are even,
-/// so that half of a loop's maxima need not wait for each other.
+/// Loads of one sector, as offsets from a result's place in the plane of single pixels. Squares are
+/// even, so that half of a loop's maxima need not wait for each other.
 struct Sector {
     const int32_t* bounds;   ///< squares with all of it
     const int32_t* squares;  ///< of its corners
@@ -95,8 +95,8 @@ inline SquareLayout SquareLayout::of(const Dilation& dilation, Arena& arena) {
     layout.aroundCount = 0;
     // A quarter's staircase has at most a corner in each row, its rim four cells.
     constexpr int64_t kMostBounds = 8;
-    layout.offsets = arena.take<int32_t>(kImages * (5 * (reach + 1) + 2 * kMostBounds) + 3 * kSectors);
-    layout.deficits = arena.take<U8s>(4 * (reach + 1) + 2);
+    layout.offsets = arena.take<int32_t>(kImages * (5 * (reach + 1) + 2 * kMostBounds) + 2 * kSectors);
+    layout.deficits = arena.take<U8s>(4 * (reach + 1));
     layout.results = arena.take<uint8_t>(dilation.bandRows * dilatedStride(dilation));
     return layout;
 }
@@ -117,14 +117,11 @@ class LoadLists {
 
     int32_t* next() const { return mNext; }
 
-    /// Ends a list that began there: an odd one repeats its last load. Whether it does.
-    bool end(const int32_t* begin) {
-        const bool isOdd = (mNext - begin) % 2 != 0;
-        if (isOdd) {
-            mNext[0] = mNext[-1];
-            ++mNext;
-        }
-        return isOdd;
+    /// Ends a list of squares that began there: an odd one repeats its last load.
+    void end(const int32_t* begin) {
+        if ((mNext - begin) % 2 == 0) return;
+        mNext[0] = mNext[-1];
+        ++mNext;
     }
 
     /// The square of a plane whose outer corner is that cell.
@@ -197,8 +194,6 @@ inline Sector listSector(LoadLists& lists, const DiscShape& disc, const Image& i
     lists.end(sector.squares);
     sector.rim = lists.next();
     addRim(lists, disc, image, rows, deficits);
-    const int64_t cells = lists.next() - sector.rim;
-    if (lists.end(sector.rim)) deficits[cells] = deficits[cells - 1];
     sector.deficits = deficits;
     sector.boundCount = static_cast<int32_t>(sector.squares - sector.bounds);
     sector.squareCount = static_cast<int32_t>(sector.rim - sector.squares);
@@ -307,11 +302,11 @@ VOREL_INLINE U8s largestOf(const uint8_t* place, const int32_t* offsets, int64_t
 }
 
 VOREL_INLINE U8s withRim(const Sector& sector, const uint8_t* place, U8s value) {
-    for (int32_t i = 0; i < sector.rimCount; i += 2) {
-        const U8s first = subSaturated(load<U8s>(place + sector.rim[i]), sector.deficits[i]);
-        const U8s second = subSaturated(load<U8s>(place + sector.rim[i + 1]), sector.deficits[i + 1]);
-        value = max(value, max(first, second));
-    }
+    const int32_t* const rim = sector.rim;
+    const U8s* const deficits = sector.deficits;
+    const int64_t count = sector.rimCount;
+    for (int64_t i = 0; i < count; ++i)
+        value = max(value, subSaturated(load<U8s>(place + rim[i]), deficits[i]));
     return value;
 }
 
