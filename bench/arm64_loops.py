@@ -103,7 +103,7 @@ LOOPS = (
     dilation("tiles, two cells of the rim", "dilatedTile|addTouching|rowsByTiles",
              {"umax": 4, "uqsub": 2, r"ldu?r\s+q": 4, "ldp": 1}, 16),
     dilation("tiles, two windows", "dilatedTile|addTouching|rowsByTiles",
-             {"umax": 2, "ld(p|r|ur)sw": 1, r"ldr\s+q": 2}, 16),
+             {"umax": 2, "asr": 1, r"ldr\s+q": 2}, 16),
     dilation("tiles, a row of reaches", "passReaches|beginTiles", {"smax": 1, r"ldr\s+q": 2, r"str\s+q": 1}, 16),
     dilation("tiles, 16 rows that touch", "touchingRange|addTouching|rowsByTiles|dilatedTile", {"uqsub": 2, "cmhs": 1}, 16),
     dilation("squares, joining four", "joinSquares|rowsBySquares|fillPlanes", {"umax": 3, r"str\s+q": 1}, 16),

@@ -296,17 +296,16 @@ inline void fillPlanes(const Dilation& dilation, SquareLayout& layout, int64_t e
 // --- Evaluation --------------------------------------------------------------------------------------
 
 VOREL_INLINE U8s largestOf(const uint8_t* place, const int32_t* offsets, int64_t count, U8s value) {
-    for (int64_t i = 0; i < count; i += 2)
-        value = max(value, max(load<U8s>(place + offsets[i]), load<U8s>(place + offsets[i + 1])));
+    for (const int32_t* const end = offsets + count; offsets < end; offsets += 2)
+        value = max(value, largerOf<U8s>(place, offsets));
     return value;
 }
 
 VOREL_INLINE U8s withRim(const Sector& sector, const uint8_t* place, U8s value) {
-    const int32_t* const rim = sector.rim;
-    const U8s* const deficits = sector.deficits;
-    const int64_t count = sector.rimCount;
-    for (int64_t i = 0; i < count; ++i)
-        value = max(value, subSaturated(load<U8s>(place + rim[i]), deficits[i]));
+    const U8s* deficits = sector.deficits;
+    const int32_t* const end = sector.rim + sector.rimCount;
+    for (const int32_t* rim = sector.rim; rim < end; ++rim, ++deficits)
+        value = max(value, subSaturated(load<U8s>(place + *rim), *deficits));
     return value;
 }
 

@@ -336,10 +336,6 @@ inline void beginTiles(const Dilation& dilation, uint8_t* memory) {
 
 // --- Evaluation --------------------------------------------------------------------------------------
 
-VOREL_INLINE Tile maxTap(const uint8_t* source, const int32_t* taps) {
-    return max(load<Tile>(source + taps[0]), load<Tile>(source + taps[1]));
-}
-
 /// A difference that stays at 0. Tiles may be shorter than the level's vectors.
 template <class V>
 VOREL_INLINE V lessDeficit(V v, V deficit) {
@@ -360,10 +356,10 @@ VOREL_INLINE Tile dilatedRow(const DiscRow& row, const uint8_t* source) {
     for (int32_t i = kFewestRimCells; i < row.rimCount; i += 2)
         result = max(result, rimPair(source, row.firstRim + i, row.deficits + i));
     if (row.taps == nullptr) return result;
-    const Tile flat = max(maxTap(source, row.taps), maxTap(source, row.taps + 2));
+    const Tile flat = max(largerOf<Tile>(source, row.taps), largerOf<Tile>(source, row.taps + 2));
     result = max(result, flat);
     for (int32_t i = kFewestTaps; i < row.tapCount; i += 2)
-        result = max(result, maxTap(source, row.taps + i));
+        result = max(result, largerOf<Tile>(source, row.taps + i));
     return result;
 }
 
