@@ -23,8 +23,8 @@ from typing import NamedTuple
 # As cmake/ has the library built.
 COMPILERS = (("g++", ["aarch64-linux-gnu-g++", "-fno-tree-ch", "-fno-align-jumps", "-fno-align-labels"]),
              ("clang", ["clang++-14", "--target=aarch64-linux-gnu"]))
-FLAGS = ["-std=c++17", "-O2", "-fPIC", "-fvisibility=hidden", "-ffp-contract=off", "-fno-exceptions", "-Wno-psabi",
-         "-DVOREL_VECTOR_BYTES=16", "-DNDEBUG", "-I.", "-Iinclude", "-S"]
+FLAGS = ["-std=c++17", "-O2", "-fPIC", "-fvisibility=hidden", "-ffp-contract=off", "-fno-exceptions",
+         "-Wno-psabi", "-DVOREL_VECTOR_BYTES=16", "-DNDEBUG", "-I.", "-Iinclude", "-S"]
 SMALL_WITH_CLANG = ("ops/blur/difference_loops.cpp", "ops/dilate/dilation_loops.cpp",
                     "ops/grow/growth_loops.cpp", "ops/ramp/ramp_loops.cpp")
 NEON = ("-DVOREL_LEVEL=neon",)
@@ -73,9 +73,14 @@ def dots(title, function):
     return Loop("blur, " + title, "ops/blur/dot_loops.cpp", function, {"udot": 64}, 64, DOT_PRODUCTS)
 
 
-def division(title, function, flags):
+def plain(title, function, kinds, units):
+    """Without dot products."""
+    return Loop("blur, plain, " + title, "ops/blur/dot_loops.cpp", function, kinds, units)
+
+
+def division(title, function):
     """What stands behind the loops over the taps, from the conversion of their sums on."""
-    return Loop("blur, " + title, "ops/blur/dot_loops.cpp", function, {"fcvtzs": 16}, 64, flags, True,
+    return Loop("blur, " + title, "ops/blur/dot_loops.cpp", function, {"fcvtzs": 16}, 64, DOT_PRODUCTS, True,
                 ("scvtf", "st"))
 
 
@@ -96,8 +101,9 @@ LOOPS = (
     Loop("copy of the larger", "blend/blend_loops.cpp", "maxCoverage", {"umax": 1, r"str\s+q": 1}, 16),
     dilation("cells of reach 1", "rowsByCells<1", {"umax": 8, "uqsub": 3, "str": 1}, 16),
     dilation("cells of reach 2", "rowsByCells<2", {"umax": 24, "uqsub": 6, "str": 1}, 16),
-    dilation("spreading, a pair of columns", "rowsBySpreading", {r"ldr\s+q": 2, "umax": 1, r"str\s+q": 1}, 16),
-    dilation("spreading, a pair of full cells", "rowsBySpreading", {r"ldr\s+q": 1, "umax": 1}, 16),
+    dilation("spreading, a pair of columns", "rowsBySpreading",
+             {r"ldr\s+q": 2, "umax": 1, r"str\s+q": 1}, 16),
+    dilation("spreading, two full cells", "rowsBySpreading", {r"ldr\s+q": 1, "umax": 1}, 16),
     dilation("spreading, a row", "rowsBySpreading", {"ldr": 2, "umax": 1, r"str\s+q": 1}, 16),
     dilation("spreading, a cell of the rim", "rowsBySpreading", {"ldr": 2, "uqsub": 1, "umax": 1}, 16),
     dilation("tiles, a window", "fillRows|beginTiles", {"umax": 3, r"str\s+q": 1}, 16),
@@ -106,24 +112,29 @@ LOOPS = (
     dilation("tiles, two windows", "dilatedTile|addTouching|rowsByTiles",
              {"umax": 2, "asr": 1, r"ldr\s+q": 2}, 16),
     dilation("tiles, the largest coverage", "largestCoverage|beginTiles", {r"ldr\s+q": 1, "umax": 1}, 16),
-    dilation("tiles, neighbours in 8 rows", "findNeighbours|beginTiles", {"smin": 2, r"str\s+q": 1}, 16),
-    dilation("tiles, a row of reaches", "passReaches|beginTiles", {"smax": 1, r"ldr\s+q": 2, r"str\s+q": 1}, 16),
-    dilation("tiles, 16 rows that touch", "touchingRange|addTouching|rowsByTiles|dilatedTile", {"uqsub": 2, "cmhs": 1}, 16),
+    dilation("tiles, neighbours in 8 rows", "findNeighbours|beginTiles",
+             {"smin": 1, r"ldr\s+q": 1, r"str\s+q": 1}, 16),
+    dilation("tiles, a row of reaches", "passReaches|beginTiles",
+             {"smax": 1, r"ldr\s+q": 2, r"str\s+q": 1}, 16),
+    dilation("tiles, 16 rows that touch", "touchingRange|addTouching|rowsByTiles|dilatedTile",
+             {"uqsub": 2, "cmhs": 1}, 16),
     dilation("squares, joining four", "joinSquares|rowsBySquares|fillPlanes", {"umax": 3, r"str\s+q": 1}, 16),
     dilation("squares, two of them", "dilatedVector|rowsBySquares", {"umax": 2, r"ldr\s+q": 2}, 16),
-    dilation("squares, a cell of the rim", "dilatedVector|rowsBySquares", {"umax": 1, "uqsub": 1, "ldrsw": 1}, 16),
+    dilation("squares, a cell of the rim", "dilatedVector|rowsBySquares",
+             {"umax": 1, "uqsub": 1, "ldrsw": 1}, 16),
     dilation("smaller of two rows", "keepMin", {"umin": 1}, 16),
     dots("down, 16 taps", "down"),
     dots("across, 16 taps", "across"),
-    Loop("blur, plain, down, 4 taps", "ops/blur/dot_loops.cpp", "down", {"uadalp": 16}, 64),
-    Loop("blur, plain, across, 4 taps", "ops/blur/dot_loops.cpp", "across", {"uadalp": 16}, 64),
-    Loop("blur, plain, down, a row of radii to 3", "ops/blur/dot_loops.cpp", "downToBytes", {"mla": 8, r"str\s+q": 1}, 16),
-    Loop("blur, plain, across, a row of radii to 3", "ops/blur/dot_loops.cpp", "across", {"mla": 8, r"str\s+q": 1}, 16),
-    division("down, division", "down<", DOT_PRODUCTS),
-    division("across, division", "across<", DOT_PRODUCTS),
+    plain("down, 4 taps", "down", {"uadalp": 16}, 64),
+    plain("across, 4 taps", "across", {"uadalp": 16}, 64),
+    plain("down, a row of radii to 3", "downToBytes", {"mla": 8, r"str\s+q": 1}, 16),
+    plain("across, a row of radii to 3", "across", {"mla": 8, r"str\s+q": 1}, 16),
+    division("down, division", "down<"),
+    division("across, division", "across<"),
     # Four rows of results at a time, 16 of each.
     Loop("differences, a term", "ops/blur/difference_loops.cpp", "next", {r"(add|sub)\s+v": 8}, 64),
-    Loop("differences, transposing four rows", "ops/blur/difference_loops.cpp", "storeTransposed", {"zip": 4, "st": 2}, 64),
+    Loop("differences, transposing four rows", "ops/blur/difference_loops.cpp", "storeTransposed",
+         {"zip": 4, "st": 2}, 64),
     # Two rows at a time, a pair sum in each.
     Loop("growth", "ops/grow/growth_loops.cpp", "grow", {"uaddlp": 2, "st": 1}, 32),
     Loop("copy, inverted", "ops/grow/growth_loops.cpp", "copyInverted", {"eor": 1, "str": 1}, 16),
@@ -189,7 +200,8 @@ def operations_of(instruction):
     lane = re.match(r"ldr\s+[bhsd](\d+), \[(\w+)(?:, ([wx]\d+))?.*\]", instruction)
     if lane:
         register, base, index = lane.groups()
-        instruction = instruction.replace(lane.group(0), f"ldr q{register}, [{'x' + index[1:] if index else base}]")
+        address = "x" + index[1:] if index else base
+        instruction = instruction.replace(lane.group(0), f"ldr q{register}, [{address}]")
     moved = re.match(r"(.*\[)([xs]\w+)(\]), (\S+)$", instruction)
     if moved:
         access, base, end, step = moved.groups()
