@@ -79,7 +79,7 @@ struct DstOverClip {
     static VOREL_INLINE Pixels apply(const Pixels& d, Amounts mask, const Pixels& colour) {
         const Amounts rest = inverseAlphaOf(d);
         const Where empty = isFull(rest);
-        const Halves beneath = scaled(scaled(halvesOf(colour), mask), rest);
+        const Halves beneath = scaled(inWholeVectors(scaled(halvesOf(colour), mask)), rest);
         return scaledSum(filled(empty, inverse(d)), beneath, raisedToFull(empty, mask));
     }
 };

@@ -34,6 +34,7 @@
 /// | allZero                       | whether no lane holds anything but 0                                 |
 /// | nonZeroLanes, kLaneBits       | kLaneBits ones for each byte but 0, the first one's lowest           |
 /// | toInt                         | as core/numeric.h converts: toward zero, saturating, NaN to 0        |
+/// | [toIntUpTo<most>]             | as toInt, at least 0                                                 |
 /// | squareRoot                    | correctly rounded                                                    |
 /// | [timesFactor, kNumberBias]    | numbers below 2^23, stored with the bias added, as floats, times a   |
 /// |                               | factor, rounded once                                                 |
@@ -46,6 +47,10 @@
 /// | interleaveLow, interleaveHigh | the lanes of two vectors in turn, from their lower, their upper ends; |
 /// |                               | AVX does so in each 128 bits by itself                               |
 /// | pack                          | lanes of at most 255 in half the width, as before interleaving       |
+/// | [upperBytes]                  | the upper bytes of 16-bit lanes: the first vector's, the second's    |
+/// | [upperBytesInTurn]            | the upper bytes of the 16-bit lanes of two vectors, in turn          |
+/// | [inBothHalves]                | words below 2^16, in both of their 16-bit lanes                      |
+/// | [joinedBytes]                 | words of at most 255 from four vectors, as the bytes of words        |
 /// | pairSums                      | of each two neighbouring bytes                                       |
 /// | [pairProducts]                | of bytes of 0 to 255 and -128 to 127, each two neighbouring ones     |
 /// |                               | added, in 16 bits; VOREL_PAIR_PRODUCTS is said where there is one    |

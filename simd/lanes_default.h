@@ -22,6 +22,31 @@ VOREL_INLINE U16s multiplyHighSum(U16s a, U16s x, U16s b, U16s y) {
 }
 #endif
 
+#if !defined(VOREL_NATIVE_TO_INT_UP_TO)
+template <int32_t kMost>
+VOREL_INLINE U32s toIntUpTo(F32s v) {
+    return bitCast<U32s>(clamped(toInt(v), 0, kMost));
+}
+#endif
+
+#if !defined(VOREL_NATIVE_UPPER_BYTES)
+VOREL_INLINE U8s upperBytes(U16s a, U16s b) { return narrow(a >> 8, b >> 8); }
+#endif
+
+#if !defined(VOREL_NATIVE_UPPER_BYTES_IN_TURN)
+VOREL_INLINE U8s upperBytesInTurn(U16s a, U16s b) { return bitCast<U8s>(a >> 8 | (b & 0xFF00)); }
+#endif
+
+#if !defined(VOREL_NATIVE_IN_BOTH_HALVES)
+VOREL_INLINE U16s inBothHalves(U32s v) { return bitCast<U16s>(v | v << 16); }
+#endif
+
+#if !defined(VOREL_NATIVE_JOINED_BYTES)
+VOREL_INLINE U8s joinedBytes(U32s a, U32s b, U32s c, U32s d) {
+    return bitCast<U8s>(a | b << 8 | c << 16 | d << 24);
+}
+#endif
+
 #if !defined(VOREL_NATIVE_GATHER)
 template <class Index, size_t... kLanes>
 VOREL_INLINE U32s gather(const uint32_t* table, const Index& indices, std::index_sequence<kLanes...>) {

@@ -38,7 +38,21 @@ VOREL_INLINE U16s multiplyHighSum(U16s a, U16s x, U16s b, U16s y) {
     const uint32x4_t high = vmlal_high_u16(vmull_high_u16(a16, x16), b16, y16);
     return bitCast<U16s>(vuzp2q_u16(bitCast<uint16x8_t>(low), bitCast<uint16x8_t>(high)));
 }
+/// Four numbers less kFirst, 0 or -128, in the bytes of a word: at least 0, at most 255.
+template <int32_t kFirst>
+VOREL_INLINE uint32_t toBytes(I32s v) {
+    static_assert(kFirst == 0 || kFirst == -128);
+    const int16x4_t halved = vqmovn_s32(bitCast<int32x4_t>(v));
+    const int16x8_t both = vcombine_s16(halved, vdup_n_s16(0));
+    if constexpr (kFirst == 0) return vget_lane_u32(vreinterpret_u32_u8(vqmovun_s16(both)), 0);
+    return vget_lane_u32(vreinterpret_u32_s8(vqmovn_s16(both)), 0) ^ 0x80808080U;
+}
 VOREL_INLINE I32s toInt(F32s v) { return bitCast<I32s>(vcvtq_s32_f32(bitCast<float32x4_t>(v))); }
+#define VOREL_NATIVE_TO_INT_UP_TO
+template <int32_t kMost>
+VOREL_INLINE U32s toIntUpTo(F32s v) {
+    return min(bitCast<U32s>(vcvtq_u32_f32(bitCast<float32x4_t>(v))), splat<U32s>(uint32_t{kMost}));
+}
 VOREL_INLINE F32s squareRoot(F32s v) { return bitCast<F32s>(vsqrtq_f32(bitCast<float32x4_t>(v))); }
 VOREL_INLINE U16s widenLow(U8s v) {
     return bitCast<U16s>(vmovl_u8(vget_low_u8(bitCast<uint8x16_t>(v))));
@@ -63,6 +77,25 @@ VOREL_INLINE U8s pack(U16s a, U16s b) {
     return bitCast<U8s>(vuzp1q_u8(bitCast<uint8x16_t>(a), bitCast<uint8x16_t>(b)));
 }
 VOREL_INLINE U8s narrow(U16s a, U16s b) { return pack(a, b); }
+#define VOREL_NATIVE_UPPER_BYTES
+VOREL_INLINE U8s upperBytes(U16s a, U16s b) {
+    return bitCast<U8s>(vuzp2q_u8(bitCast<uint8x16_t>(a), bitCast<uint8x16_t>(b)));
+}
+#define VOREL_NATIVE_UPPER_BYTES_IN_TURN
+VOREL_INLINE U8s upperBytesInTurn(U16s a, U16s b) {
+    return bitCast<U8s>(vtrn2q_u8(bitCast<uint8x16_t>(a), bitCast<uint8x16_t>(b)));
+}
+#define VOREL_NATIVE_IN_BOTH_HALVES
+VOREL_INLINE U16s inBothHalves(U32s v) {
+    return bitCast<U16s>(vtrn1q_u16(bitCast<uint16x8_t>(v), bitCast<uint16x8_t>(v)));
+}
+#define VOREL_NATIVE_JOINED_BYTES
+VOREL_INLINE U8s joinedBytes(U32s a, U32s b, U32s c, U32s d) {
+    const auto pairs = [](U32s low, U32s high) {
+        return vreinterpretq_u16_u8(vtrn1q_u8(bitCast<uint8x16_t>(low), bitCast<uint8x16_t>(high)));
+    };
+    return bitCast<U8s>(vtrn1q_u16(pairs(a, b), pairs(c, d)));
+}
 VOREL_INLINE U16s pairSums(U8s v) { return bitCast<U16s>(vpaddlq_u8(bitCast<uint8x16_t>(v))); }
 VOREL_INLINE U8s quarters(U16s even, U16s odd) {
     const auto raised = [](U16s sums) {

@@ -28,11 +28,6 @@ constexpr uint32_t kAlphaByte = 0xFF000000U;
 VOREL_INLINE Pixels loadPixels(const uint8_t* from) { return {load<U8s>(from)}; }
 VOREL_INLINE void storePixels(uint8_t* to, const Pixels& pixels) { store(to, pixels.bytes); }
 
-/// Pixels in memory order from the words that `wordsAt(i)` gives for pixel i and the next ones.
-template <class WordsAt>
-VOREL_INLINE Pixels madeOfWords(WordsAt wordsAt) {
-    return {bitCast<U8s>(wordsAt(0))};
-}
 /// From words 0xAARRGGBB: memory order B, G, R, A.
 VOREL_INLINE Pixels loadWords(const uint8_t* from) { return {swapRedBlue(load<U8s>(from))}; }
 /// From memory order A, R, G, B.
@@ -108,6 +103,7 @@ VOREL_INLINE Pixels added(const Pixels& a, const Pixels& b) { return {addSaturat
 VOREL_INLINE Halves halvesOf(const Pixels& p) {
     return {bitCast<U16s>(p.bytes) & kEvenByte, bitCast<U16s>(p.bytes) >> 8};
 }
+VOREL_INLINE Halves inWholeVectors(const Halves& h) { return h; }
 VOREL_INLINE Pixels joined(const Pixels& p) { return p; }
 VOREL_INLINE Pixels joined(const Halves& h) { return {bitCast<U8s>(h.even | h.odd << 8)}; }
 

@@ -2,6 +2,7 @@
 
 #include "core/fixed_point.h"
 #include "simd/lanes.h"
+#include "simd/unrolled.h"
 
 /// Planar pixels: one vector a channel, as NEON loads, multiplies and stores them.
 namespace VFontEffect::internal::VOREL_LEVEL {
@@ -21,17 +22,37 @@ VOREL_INLINE Pixels loadPixels(const uint8_t* from) {
 }
 VOREL_INLINE void storePixels(uint8_t* to, const Pixels& pixels) {
     const uint8x16_t* const c = pixels.channels;
+#if defined(__clang__)
     const uint8x16x4_t planes = {{c[0], c[1], c[2], c[3]}};
     vst4q_u8(to, planes);
+#else
+    // g++ computes channels in registers of their own and moves them into the four that the store takes.
+    register uint8x16_t red asm("v0") = c[0];
+    register uint8x16_t green asm("v1") = c[1];
+    register uint8x16_t blue asm("v2") = c[2];
+    register uint8x16_t alpha asm("v3") = c[3];
+    using Bytes = uint8_t[4 * kPixels];
+    asm("st4 {%1.16b - %4.16b}, %0"
+        : "=Q"(*reinterpret_cast<Bytes*>(to))
+        : "w"(red), "w"(green), "w"(blue), "w"(alpha));
+#endif
 }
-/// Pixels in memory order from the words that `wordsAt(i)` gives for pixel i and the next ones.
-template <class WordsAt>
-VOREL_INLINE Pixels madeOfWords(WordsAt wordsAt) {
-    const uint8x16x4_t words = {{bitCast<uint8x16_t>(wordsAt(0)), bitCast<uint8x16_t>(wordsAt(4)),
-                                 bitCast<uint8x16_t>(wordsAt(8)), bitCast<uint8x16_t>(wordsAt(12))}};
-    uint8_t pixels[4 * kPixels] = {};
-    vst1q_u8_x4(pixels, words);
-    return loadPixels(pixels);
+/// The words of a table, as pixels in memory order; indicesAt(i) are those of pixel i and the next
+/// three, in the bytes of a word. The words come together in pairs: a vector takes longer to be put
+/// together by single words.
+template <class IndicesAt>
+VOREL_INLINE Pixels lookedUp(const uint32_t* table, IndicesAt indicesAt) {
+    uint64_t pairs[kPixels / 2];
+    unrolled<kPixels / 4>([&](auto i) VOREL_INLINE_LAMBDA {
+        const uint32_t four = indicesAt(4 * i.value);
+        uint64_t first = table[four & 0xFF] | uint64_t{table[four >> 8 & 0xFF]} << 32;
+        uint64_t second = table[four >> 16 & 0xFF] | uint64_t{table[four >> 24]} << 32;
+        // g++ would make vectors of these shifts.
+        asm("" : "+r"(first), "+r"(second));
+        pairs[2 * i.value] = first;
+        pairs[2 * i.value + 1] = second;
+    });
+    return loadPixels(reinterpret_cast<const uint8_t*>(pairs));
 }
 /// From words 0xAARRGGBB: memory order B, G, R, A.
 VOREL_INLINE Pixels loadWords(const uint8_t* from) {
@@ -99,6 +120,15 @@ VOREL_INLINE Pixels scaled(const Pixels& p, Amounts amounts) {
 
 VOREL_INLINE Halves halvesOf(const Pixels& p) { return p; }
 VOREL_INLINE Pixels joined(const Halves& h) { return h; }
+/// What has been multiplied and will be again. g++ would keep its lower half apart, for the next
+/// product, and move it to join the upper one.
+VOREL_INLINE Halves inWholeVectors(Halves h) {
+#if !defined(__clang__)
+    for (uint8x16_t& channel : h.channels)
+        asm("" : "+w"(channel));
+#endif
+    return h;
+}
 VOREL_INLINE Pixels sumOf(const Halves& a, const Halves& b) { return added(a, b); }
 
 /// min(product(a + b, amount), 255) of 255 - a. With b - (255 - a) = 256 (h - 1) + l it is

@@ -177,8 +177,8 @@ struct DotMethod {
             unrolled<kGridVectors>([&](auto v) VOREL_INLINE_LAMBDA {
                 const U32s* const four = grid.sums[v.value];
                 store(kRow + v.value,
-                      bitCast<U8s>(quotient(four[0], inverse) | quotient(four[1], inverse) << 8 |
-                                   quotient(four[2], inverse) << 16 | quotient(four[3], inverse) << 24));
+                      joinedBytes(quotient(four[0], inverse), quotient(four[1], inverse),
+                                  quotient(four[2], inverse), quotient(four[3], inverse)));
             });
         });
     }
@@ -241,17 +241,20 @@ void down(const PackedBlur& blur, const TapColumns& columns, int64_t quad,
         const Range steps = coveredSteps(columns, strip, quad, blur.radius);
         intermediate.covered[firstStrip + strip] = !steps.empty();
     }
+    uint8_t* const start = intermediateAt(intermediate, firstStrip * kBytes, 0);
+    const int64_t stride = intermediate.strideBytes;
     quadDown(DotMethod::of(blur, false), columns, quad, blur.radius,
-             [&](int64_t strip, int j, U8s row) VOREL_INLINE_LAMBDA {
-                 store(intermediateAt(intermediate, (firstStrip + strip) * kBytes, j), row ^ kTapBias);
-             });
+             [=](int64_t strip, int j, U8s row)
+                 VOREL_INLINE_LAMBDA { store(start + j * stride + strip * kBytes, row ^ kTapBias); });
 }
 
 void downToBytes(const PackedBlur& blur, const TapColumns& columns, int64_t quad, const BlurRows& out) {
+    uint8_t* const start = out.start;
+    const int64_t stride = out.stride;
+    const U8s invertMask = splat<U8s>(out.ending.invertMask);
     quadDown(DotMethod::of(blur, out.ending.roundsUp), columns, quad, blur.radius,
-             [&](int64_t strip, int j, U8s row) VOREL_INLINE_LAMBDA {
-                 store(out.start + j * out.stride + strip * kBytes, row ^ out.ending.invertMask);
-             });
+             [=](int64_t strip, int j, U8s row)
+                 VOREL_INLINE_LAMBDA { store(start + j * stride + strip * kBytes, row ^ invertMask); });
 }
 
 void copy(const CoverageRows& source, int64_t row, const IntermediateRows& intermediate) {
@@ -286,9 +289,12 @@ VOREL_INLINE Range coveredSteps(const IntermediateRows& intermediate, int64_t x,
 void across(const PackedBlur& blur, const IntermediateRows& intermediate, int64_t left, int64_t right,
             const BlurRows& out) {
     const DotMethod method = DotMethod::of(blur, out.ending.roundsUp);
+    uint8_t* const start = out.start;
+    const int64_t stride = out.stride;
+    const U8s invertMask = splat<U8s>(out.ending.invertMask);
     for (int64_t x = left; x < right; x += kBytes) {
-        const auto storeRow = [&](int j, U8s row) VOREL_INLINE_LAMBDA {
-            store(out.start + j * out.stride + (x - left), row ^ out.ending.invertMask);
+        const auto storeRow = [=](int j, U8s row) VOREL_INLINE_LAMBDA {
+            store(start + j * stride + (x - left), row ^ invertMask);
         };
         const Range steps = coveredSteps(intermediate, x, blur.radius);
         if (steps.empty()) {

@@ -30,7 +30,8 @@ namespace VFontEffect::internal::VOREL_LEVEL {
 /// Rows that planes have room for beside those in reach: a number of bands, after which rows are moved.
 constexpr int64_t kRolledRows = 64;
 
-/// Loads of one sector, as offsets from a result's place in the plane of single pixels.
+/// Loads of one sector, as offsets from a result's place in the plane of single pixels. Squares are
+/// even, so that half of a loop's maxima need not wait for each other.
 struct Sector {
     const int32_t* bounds;   ///< squares with all of it
     const int32_t* squares;  ///< of its corners
@@ -90,11 +91,11 @@ inline SquareLayout SquareLayout::of(const Dilation& dilation, Arena& arena) {
     layout.firstRow = layout.filledRows = 0;
     layout.sectors = arena.take<Sector>(kSectors);
     layout.middle = arena.take<int32_t>(4);
-    layout.around = arena.take<int32_t>(9);
+    layout.around = arena.take<int32_t>(10);
     layout.aroundCount = 0;
     // A quarter's staircase has at most a corner in each row, its rim four cells.
     constexpr int64_t kMostBounds = 8;
-    layout.offsets = arena.take<int32_t>(kImages * (5 * (reach + 1) + 2 * kMostBounds));
+    layout.offsets = arena.take<int32_t>(kImages * (5 * (reach + 1) + 2 * kMostBounds) + 2 * kSectors);
     layout.deficits = arena.take<U8s>(4 * (reach + 1));
     layout.results = arena.take<uint8_t>(dilation.bandRows * dilatedStride(dilation));
     return layout;
@@ -115,6 +116,13 @@ class LoadLists {
     explicit LoadLists(const SquareLayout& layout) : mLayout(layout), mNext(layout.offsets) {}
 
     int32_t* next() const { return mNext; }
+
+    /// Ends a list of squares that began there: an odd one repeats its last load.
+    void end(const int32_t* begin) {
+        if ((mNext - begin) % 2 == 0) return;
+        mNext[0] = mNext[-1];
+        ++mNext;
+    }
 
     /// The square of a plane whose outer corner is that cell.
     void addSquare(const Image& image, int64_t plane, int64_t x, int64_t y) {
@@ -180,8 +188,10 @@ inline Sector listSector(LoadLists& lists, const DiscShape& disc, const Image& i
     Sector sector;
     sector.bounds = lists.next();
     addBounds(lists, disc, image, rows);
+    lists.end(sector.bounds);
     sector.squares = lists.next();
     addCorners(lists, disc, image, rows);
+    lists.end(sector.squares);
     sector.rim = lists.next();
     addRim(lists, disc, image, rows, deficits);
     sector.deficits = deficits;
@@ -228,6 +238,7 @@ inline void beginSquares(const Dilation& dilation, uint8_t* memory) {
     listSquares(layout, halfOfMiddle(disc), 2, layout.middle);
     listSquares(layout, disc.reach, perRow, layout.around);
     layout.aroundCount = perRow * perRow;
+    if (layout.aroundCount % 2 != 0) layout.around[layout.aroundCount++] = layout.around[0];
     listSectors(layout, disc);
     layout.firstRow = dilation.top - disc.reach;
     layout.filledRows = 0;
@@ -285,14 +296,16 @@ inline void fillPlanes(const Dilation& dilation, SquareLayout& layout, int64_t e
 // --- Evaluation --------------------------------------------------------------------------------------
 
 VOREL_INLINE U8s largestOf(const uint8_t* place, const int32_t* offsets, int64_t count, U8s value) {
-    for (int64_t i = 0; i < count; ++i)
-        value = max(value, load<U8s>(place + offsets[i]));
+    for (const int32_t* const end = offsets + count; offsets < end; offsets += 2)
+        value = max(value, largerOf<U8s>(place, offsets));
     return value;
 }
 
 VOREL_INLINE U8s withRim(const Sector& sector, const uint8_t* place, U8s value) {
-    for (int32_t i = 0; i < sector.rimCount; ++i)
-        value = max(value, subSaturated(load<U8s>(place + sector.rim[i]), sector.deficits[i]));
+    const U8s* deficits = sector.deficits;
+    const int32_t* const end = sector.rim + sector.rimCount;
+    for (const int32_t* rim = sector.rim; rim < end; ++rim, ++deficits)
+        value = max(value, subSaturated(load<U8s>(place + *rim), *deficits));
     return value;
 }
 

@@ -61,18 +61,23 @@ VOREL_INLINE void noteTile(const TileExtents& extents, int64_t at, uint64_t lane
     extents.holes[at] = static_cast<Distance>(solid ? 0 : last - first);
 }
 
-/// Finds the nearest covered pixels beside each tile.
+/// Finds the nearest covered pixels beside each tile. An empty tile's first and last one are kBeyond
+/// away: no distance grows by more than a tile beyond that.
 inline void findNeighbours(const TileExtents& extents, int64_t tiles) {
     const Distances beyond = splat<Distances>(kBeyond);
+    const Distance* const firsts = extents.first;
+    const Distance* const lasts = extents.last;
+    Distance* const before = extents.before;
+    Distance* const after = extents.after;
     Distances distance = beyond;
     for (int64_t at = 0; at < tiles * kDistances; at += kDistances) {
-        store(extents.before + at, distance);
-        distance = min(min(distance, beyond) + kTile, kTile - load<Distances>(extents.last + at));
+        store(before + at, distance);
+        distance = min(distance + kTile, kTile - load<Distances>(lasts + at));
     }
     distance = beyond;
     for (int64_t at = (tiles - 1) * kDistances; at >= 0; at -= kDistances) {
-        store(extents.after + at, distance);
-        distance = min(min(distance, beyond) + kTile, 1 + load<Distances>(extents.first + at));
+        store(after + at, distance);
+        distance = min(distance + kTile, 1 + load<Distances>(firsts + at));
     }
 }
 

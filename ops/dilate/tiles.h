@@ -336,16 +336,18 @@ inline void beginTiles(const Dilation& dilation, uint8_t* memory) {
 
 // --- Evaluation --------------------------------------------------------------------------------------
 
-VOREL_INLINE Tile maxTap(const uint8_t* source, const int32_t* taps) {
-    return max(load<Tile>(source + taps[0]), load<Tile>(source + taps[1]));
+/// A difference that stays at 0. Tiles may be shorter than the level's vectors.
+template <class V>
+VOREL_INLINE V lessDeficit(V v, V deficit) {
+    if constexpr (sizeof(V) == kBytes) return subSaturated(v, deficit);
+    return max(v, deficit) - deficit;
 }
 
 /// What two cells of the rim add, with their mirror images.
 VOREL_INLINE Tile rimPair(const uint8_t* source, int64_t dx, const Tile* deficits) {
     const Tile inner = max(load<Tile>(source - dx), load<Tile>(source + dx));
     const Tile outer = max(load<Tile>(source - dx - 1), load<Tile>(source + dx + 1));
-    // Differences that stay at 0.
-    return max(max(inner, deficits[0]) - deficits[0], max(outer, deficits[1]) - deficits[1]);
+    return max(lessDeficit(inner, deficits[0]), lessDeficit(outer, deficits[1]));
 }
 
 /// What a source row adds to the tile whose place in it is `source`.
@@ -354,10 +356,10 @@ VOREL_INLINE Tile dilatedRow(const DiscRow& row, const uint8_t* source) {
     for (int32_t i = kFewestRimCells; i < row.rimCount; i += 2)
         result = max(result, rimPair(source, row.firstRim + i, row.deficits + i));
     if (row.taps == nullptr) return result;
-    const Tile flat = max(maxTap(source, row.taps), maxTap(source, row.taps + 2));
+    const Tile flat = max(largerOf<Tile>(source, row.taps), largerOf<Tile>(source, row.taps + 2));
     result = max(result, flat);
     for (int32_t i = kFewestTaps; i < row.tapCount; i += 2)
-        result = max(result, maxTap(source, row.taps + i));
+        result = max(result, largerOf<Tile>(source, row.taps + i));
     return result;
 }
 

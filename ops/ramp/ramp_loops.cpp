@@ -12,15 +12,15 @@
 namespace VFontEffect::internal::VOREL_LEVEL {
 namespace {
 
-constexpr int32_t kLastEntry = 255;
-constexpr int32_t kMiddleEntry = 128;
-
 /// x - centre for the columns x, x + 1, ...
 VOREL_INLINE F32s columnsFrom(int64_t x, float centre) {
     return __builtin_convertvector(iota<I32s>() + static_cast<int32_t>(x), F32s) - centre;
 }
 
+/// A row of a ramp that begins at place kFirst, and the places of kU32Lanes pixels from column x on.
 struct LinearRow {
+    static constexpr int32_t kFirst = -128;
+
     RampPixels pixels;
     float rowTerm;
     float stepX;
@@ -31,15 +31,14 @@ struct LinearRow {
                 ramp.centreX};
     }
 
-    /// Entries of kU32Lanes pixels from column x on. Saturation on both sides of the ramp first: adding
-    /// the middle afterwards cannot overflow.
-    VOREL_INLINE I32s entries(int64_t x) const {
-        const I32s place = toInt(rowTerm + stepX * columnsFrom(x, centreX));
-        return clamped(place, -kMiddleEntry, kLastEntry - kMiddleEntry) + kMiddleEntry;
+    VOREL_INLINE I32s places(int64_t x) const {
+        return toInt(rowTerm + stepX * columnsFrom(x, centreX));
     }
 };
 
 struct RadialRow {
+    static constexpr int32_t kFirst = 0;
+
     RampPixels pixels;
     float rowTerm;
     float step;
@@ -50,11 +49,31 @@ struct RadialRow {
         return {ramp.pixels, down * down, ramp.step, ramp.centreX};
     }
 
-    VOREL_INLINE I32s entries(int64_t x) const {
+    VOREL_INLINE I32s places(int64_t x) const {
         const F32s across = columnsFrom(x, centreX);
-        return clamped(toInt(step * squareRoot(rowTerm + across * across)), 0, kLastEntry);
+        return toInt(step * squareRoot(rowTerm + across * across));
     }
 };
+
+/// The colours of kPixels pixels from column x on. Saturation on both sides of the ramp first: taking
+/// its beginning away afterwards cannot overflow.
+template <class RampRow>
+VOREL_INLINE Pixels coloursFrom(const RampRow& row, int64_t x) {
+    constexpr int32_t kFirst = RampRow::kFirst;
+#if defined(VOREL_PLANAR_PIXELS)
+    return lookedUp(row.pixels,
+                    [&](int64_t i) VOREL_INLINE_LAMBDA { return toBytes<kFirst>(row.places(x + i)); });
+#else
+    constexpr int32_t kEntries = 256;
+    const I32s places = clamped(row.places(x), kFirst, kFirst + kEntries - 1);
+    return {bitCast<U8s>(gatherNear(row.pixels, kEntries, places - kFirst))};
+#endif
+}
+
+/// Destination-over: what is premultiplied has no colour where it is transparent.
+VOREL_INLINE Pixels underPremultiplied(const Pixels& d, const Pixels& source) {
+    return under(d, source, ~isTransparent(source));
+}
 
 template <class RampRow>
 struct RampPainter : MaskReader<Empty::keeps, true> {
@@ -62,9 +81,8 @@ struct RampPainter : MaskReader<Empty::keeps, true> {
 
     VOREL_INLINE Pixels paint(const Place& place) const {
         const Pixels destination = loadPixels(place.destination());
-        const Pixels colours = madeOfWords(
-            [&](int64_t i) { return gatherNear(row.pixels, kLastEntry + 1, row.entries(place.x + i)); });
-        return DstOverWhereCovered::apply(destination, colours, loadAmounts(place.mask()));
+        const Where covered = ~isZero(loadAmounts(place.mask()));
+        return underPremultiplied(destination, kept(covered, coloursFrom(row, place.x)));
     }
 };
 
@@ -85,19 +103,22 @@ void mixStops(const RampSegment& segment, const float* positions, int64_t count,
     const auto lowerOdd = splat<U32s>(segment.lower >> 8 & kEvenBytes);
     const auto upperEven = splat<U32s>(segment.upper & kEvenBytes);
     const auto upperOdd = splat<U32s>(segment.upper >> 8 & kEvenBytes);
-    for (int64_t i = 0; i < count; i += kU32Lanes) {
-        const F32s place = (load<F32s>(positions + i) - segment.start) / segment.span * 256.0F;
-        const auto weight = bitCast<U32s>(clamped(toInt(place), 0, 256));
+    const float start = segment.start;
+    const float span = segment.span;
+    const auto mixedAt = [=](int64_t i) VOREL_INLINE_LAMBDA {
+        const F32s place = (load<F32s>(positions + i) - start) / span * 256.0F;
+        const U32s weight = toIntUpTo<256>(place);
         const U32s rest = 256 - weight;
         const U32s even = (weight * upperEven + rest * lowerEven) >> 8 & kEvenBytes;
         const U32s odd = (weight * upperOdd + rest * lowerOdd) & ~kEvenBytes;
-        const U32s mixed = even | odd;
-        if (count - i >= kU32Lanes) {
-            std::memcpy(colours + i, &mixed, sizeof mixed);
-        } else {
-            std::memcpy(colours + i, &mixed, static_cast<size_t>(4 * (count - i)));
-        }
-    }
+        return even | odd;
+    };
+    int64_t i = 0;
+    for (const int64_t last = count - kU32Lanes; i <= last; i += kU32Lanes)
+        store(colours + i, mixedAt(i));
+    if (i >= count) return;
+    const U32s rest = mixedAt(i);
+    std::memcpy(colours + i, &rest, static_cast<size_t>(4 * (count - i)));
 }
 
 void premultiplied(const uint32_t* colours, int64_t count, uint32_t* pixels) {
@@ -109,24 +130,23 @@ void premultiplied(const uint32_t* colours, int64_t count, uint32_t* pixels) {
     }
 }
 
-/// 256 * value / 180: of the upper half of a product with 2^23 / 180, rounded up, the upper 9 bits. The
-/// rounding adds less than 0.005 for values of a byte, and as 256 / 180 = 64 / 45, fractions are
-/// multiples of 1 / 45: none of them reaches the next whole number.
+/// alpha * min(256 * value / 180, 256). The quotient is the upper half of a product of twice the value
+/// with 2^23 / 180, rounded up. The rounding adds less than 0.005 for values of a byte, and as 256 / 180
+/// = 64 / 45, fractions are multiples of 1 / 45: none of them reaches the next whole number.
 VOREL_INLINE U16s fadedLanes(U16s values, U16s alpha) {
     constexpr uint16_t kMultiplier = ((1U << 23) + kFadedValues - 1) / kFadedValues;
-    const U16s quotient = multiplyHigh(values << 8, splat<U16s>(kMultiplier)) >> 7;
-    const auto factor = min(bitCast<I16s>(quotient), splat<I16s>(int16_t{256}));
-    return alpha * bitCast<U16s>(factor) >> 8;
+    const U16s quotient = multiplyHigh(values + values, splat<U16s>(kMultiplier));
+    return alpha * bitCast<U16s>(min(bitCast<I16s>(quotient), splat<I16s>(int16_t{256})));
 }
 
 void fade(uint8_t* values, int64_t count, uint32_t alpha) {
     VOREL_ASSERT(alpha <= 255);
     const auto alphas = splat<U16s>(static_cast<uint16_t>(alpha));
     const auto faded = [alphas](U8s v) VOREL_INLINE_LAMBDA {
-        return narrow(fadedLanes(widenLow(v), alphas), fadedLanes(widenHigh(v), alphas));
+        return upperBytes(fadedLanes(widenLow(v), alphas), fadedLanes(widenHigh(v), alphas));
     };
     int64_t x = 0;
-    for (; x + kBytes <= count; x += kBytes)
+    for (const int64_t last = count - kBytes; x <= last; x += kBytes)
         store(values + x, faded(load<U8s>(values + x)));
     if (x == count) return;
     const U8s rest = faded(loadFirst(values + x, count - x));
@@ -138,8 +158,16 @@ struct ValuePainter : MaskReader<> {
     RampPixels pixels;
 
     VOREL_INLINE Pixels paint(const Place& place) const {
-        const Pixels colours = madeOfWords([&](int64_t i) { return gather(pixels, place.mask() + i); });
-        return DstOver::apply(loadPixels(place.destination()), colours);
+#if defined(VOREL_PLANAR_PIXELS)
+        const Pixels colours = lookedUp(pixels, [&](int64_t i) VOREL_INLINE_LAMBDA {
+            uint32_t four;
+            std::memcpy(&four, place.mask() + i, sizeof four);
+            return four;
+        });
+#else
+        const Pixels colours = {bitCast<U8s>(gather(pixels, place.mask()))};
+#endif
+        return underPremultiplied(loadPixels(place.destination()), colours);
     }
 };
 

@@ -8,6 +8,7 @@
 namespace VFontEffect::internal {
 
 /// The colours of a gradient, entries 0..255, premultiplied, as pixels in memory: R, G, B, A.
+/// Transparent ones are 0.
 using RampPixels = const uint32_t*;
 
 /// Entry 128 + trunc(stepY * (y - centreY) + stepX * (x - centreX)), counted from the box's corner.

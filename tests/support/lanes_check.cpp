@@ -128,6 +128,19 @@ const char* wrongOfU16s(Lanes& random) {
         expected[i] = interleaved(a, b, i, true);
     if (!same(interleaveHigh(x, y), expected)) return "interleaveHigh of 16-bit lanes";
 
+    uint8_t bytes[kBytes];
+    for (int i = 0; i < kU16Lanes; ++i) {
+        bytes[i] = static_cast<uint8_t>(a[i] >> 8);
+        bytes[kU16Lanes + i] = static_cast<uint8_t>(b[i] >> 8);
+    }
+    if (!same(upperBytes(x, y), bytes)) return "upperBytes";
+    for (int i = 0; i < kBytes; ++i)
+        bytes[i] = static_cast<uint8_t>((i % 2 == 0 ? a : b)[i / 2] >> 8);
+    if (!same(upperBytesInTurn(x, y), bytes)) return "upperBytesInTurn";
+    for (int i = 0; i < kU16Lanes; ++i)
+        expected[i] = a[i / 2 * 2];
+    if (!same(inBothHalves(bitCast<U32s>(x) & 0xFFFFU), expected)) return "inBothHalves";
+
     const U16s small = random.vector<U16s>(a, 255);
     const U32s low = bitCast<U32s>(interleaveLow(small, U16s{}));
     if (!same(pack(low, bitCast<U32s>(interleaveHigh(small, U16s{}))), a)) return "pack of words";
@@ -140,6 +153,14 @@ const char* wrongOfU16s(Lanes& random) {
         quarter[i] = static_cast<uint8_t>(sum / 4 > 255 ? 255 : sum / 4);
     }
     return same(quarters(even, odd), quarter) ? nullptr : "quarters";
+}
+
+const char* wrongOfU32s(Lanes& random) {
+    uint8_t bytes[kBytes];
+    const auto words = bitCast<U32s>(random.vector<U8s>(bytes, 255));
+    const auto byteAt = [words](int i) { return words >> (8 * i) & 0xFFU; };
+    return same(joinedBytes(byteAt(0), byteAt(1), byteAt(2), byteAt(3)), bytes) ? nullptr
+                                                                                : "joinedBytes";
 }
 
 const char* wrongOfFloats(Lanes& random) {
@@ -168,6 +189,9 @@ const char* wrongOfFloats(Lanes& random) {
         whole[i] = internal::toInt(values[i]);
     }
     if (!same(toInt(load<F32s>(values)), whole)) return "toInt";
+    for (int32_t& number : whole)
+        number = number < 0 ? 0 : number > 255 ? 255 : number;
+    if (!same(toIntUpTo<255>(load<F32s>(values)), whole)) return "toIntUpTo";
     for (int i = 0; i < kU32Lanes; ++i) {
         values[i] = static_cast<float>(random.upTo(0x7FFFFFFF)) / 977.0F;
         expected[i] = __builtin_sqrtf(values[i]);
@@ -238,6 +262,7 @@ const char* wrongOperation(uint64_t seed) {
     Lanes random(seed);
     const char* wrong = wrongOfBytes(random);
     if (wrong == nullptr) wrong = wrongOfU16s(random);
+    if (wrong == nullptr) wrong = wrongOfU32s(random);
     if (wrong == nullptr) wrong = wrongOfFloats(random);
     if (wrong == nullptr) wrong = wrongOfTables(random);
     return wrong == nullptr ? wrongOfDots(random) : wrong;
