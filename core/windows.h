@@ -51,34 +51,11 @@ class WindowWalk {
     }
 
     /// Goes on with all that ends above a row. Returns the row above which nothing is left.
-    int64_t goAbove(int64_t limit, WindowBands& bands) {
-        for (; !mWindow.empty(); turnToNext()) {
-            if (limit <= mNext) return limit;
-            if (mWindows.areCutAcross() && limit < mWindow.bottom) return mNext;
-            if (mBandRows == 0) {
-                bands.beginWindow(mWindow);
-                mBandRows = bands.bandRows();
-            }
-            while (mNext < mWindow.bottom) {
-                const int64_t end = std::min(mNext + mBandRows, mWindow.bottom);
-                if (end > limit) return mNext;
-                bands.paintBand({mWindow.left, mNext, mWindow.right, end});
-                mNext = end;
-            }
-        }
-        return limit;
-    }
+    int64_t goAbove(int64_t limit, WindowBands& bands);
 
   private:
-    void turnTo(int64_t left, int64_t top) {
-        mWindow = intersection(mWindows.part, {left, top, left + mWindows.width, top + mWindows.height});
-        mNext = top;
-        mBandRows = 0;
-    }
-    void turnToNext() {
-        const bool isLast = mWindow.right == mWindows.part.right;
-        turnTo(isLast ? mWindows.part.left : mWindow.right, isLast ? mWindow.bottom : mWindow.top);
-    }
+    void turnTo(int64_t left, int64_t top);
+    void turnToNext();
 
     Windows mWindows;
     Box mWindow;        ///< empty behind the last one

@@ -52,12 +52,12 @@ class CoveredFill {
     RemainingRows mRest;
 };
 
-class LinearPainter final : public RowPainter {
+class LinearPainter : public RowPainter {
   public:
     LinearPainter(CpuLevel level, const CoverageBox& box, const VFBitmap* destination,
                   const VFLinearGradientProperty& record);
 
-    int64_t paintAbove(int64_t limit) override;
+    int64_t paintAbove(int64_t limit);
 
   private:
     const RampLoops& mLoops;
@@ -70,12 +70,12 @@ class LinearPainter final : public RowPainter {
                          const VFECore::ParamPostProcessing* params,
                          const VFLinearGradientProperty& record);
 
-class RadialPainter final : public RowPainter {
+class RadialPainter : public RowPainter {
   public:
     RadialPainter(CpuLevel level, const CoverageBox& box, const VFBitmap* destination,
                   const VFRadialGradientProperty& record);
 
-    int64_t paintAbove(int64_t limit) override;
+    int64_t paintAbove(int64_t limit);
 
   private:
     const RampLoops& mLoops;
@@ -88,7 +88,7 @@ class RadialPainter final : public RowPainter {
                          const VFECore::ParamPostProcessing* params,
                          const VFRadialGradientProperty& record);
 
-class PatternPainter final : public RowPainter {
+class PatternPainter : public RowPainter {
   public:
     PatternPainter(CpuLevel level, const CoverageBox& box, const VFBitmap* destination,
                    const ColourView& pattern, const VFPatternProperty& record);
@@ -96,7 +96,7 @@ class PatternPainter final : public RowPainter {
     /// Whether there was memory for it.
     explicit operator bool() const { return static_cast<bool>(mTiles); }
 
-    int64_t paintAbove(int64_t limit) override;
+    int64_t paintAbove(int64_t limit);
 
   private:
     BlendLoop mPaint;

@@ -89,7 +89,7 @@ class GlowPainter final : public WindowPainter {
     /// Whether there was memory for it.
     explicit operator bool() const { return !mBlur || (*mGrowth && *mBlur); }
 
-    int64_t paintAbove(int64_t limit) override;
+    int64_t paintAbove(int64_t limit);
 
   private:
     void beginWindow(const Box& window) override;

@@ -23,7 +23,7 @@
 namespace VFontEffect::internal {
 
 /// One colour through coverage as it is.
-class CoveragePainter final : public RowPainter {
+class CoveragePainter : public RowPainter {
   public:
     CoveragePainter(BlendLoop BlendLoops::*rule, const PlacedTarget& target,
                     const CoverageRows& coverage, uint32_t color)
@@ -33,13 +33,7 @@ class CoveragePainter final : public RowPainter {
           mColor(color),
           mRest(target.seen(wholeOf(coverage))) {}
 
-    int64_t paintAbove(int64_t limit) override {
-        const Box part = mRest.takenAbove(mTarget.ownRow(limit));
-        if (part.empty()) return limit;
-        const uint8_t* const mask = mCoverage.start + part.top * mCoverage.stride + part.left;
-        mTarget.paint(mRule, part, mask, mCoverage.stride, mColor);
-        return limit;
-    }
+    int64_t paintAbove(int64_t limit);
 
   private:
     BlendLoop BlendLoops::*mRule;
@@ -105,7 +99,7 @@ class BlurPainter final : public WindowPainter {
 };
 
 /// A shadow, by one of two painters.
-class ShadowPainter final : public RowPainter {
+class ShadowPainter : public RowPainter {
   public:
     /// Of coverage as it is.
     ShadowPainter(const PlacedTarget& target, const CoverageRows& coverage, uint32_t color) {
@@ -123,9 +117,7 @@ class ShadowPainter final : public RowPainter {
 
     explicit operator bool() const { return mPlain || *mBlurred; }
 
-    int64_t paintAbove(int64_t limit) override {
-        return mPlain ? mPlain->paintAbove(limit) : mBlurred->paintAbove(limit);
-    }
+    int64_t paintAbove(int64_t limit);
 
   private:
     std::optional<CoveragePainter> mPlain;

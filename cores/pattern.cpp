@@ -1,6 +1,7 @@
 #include <algorithm>
 #include <cstdint>
 
+#include "blend/job.h"
 #include "core/effect_types.h"
 #include "cores/fills.h"
 #include "cores/property_copy.h"

@@ -3,8 +3,6 @@
 #include <cstdint>
 
 #include "blend/blend_loops.h"
-#include "blend/job.h"
-#include "core/assert.h"
 #include "core/box.h"
 #include "core/coverage_rows.h"
 #include "core/views.h"
@@ -15,44 +13,26 @@ namespace VFontEffect::internal {
 class PlacedTarget {
   public:
     /// The picture's origin lies at (left, top) of the destination.
-    PlacedTarget(CpuLevel level, const VFBitmap* destination, int64_t left, int64_t top)
-        : mLoops(blendLoops(level)), mPixels(ColourView::of(destination)), mLeft(left), mTop(top) {}
+    PlacedTarget(CpuLevel level, const VFBitmap* destination, int64_t left, int64_t top);
 
     /// The picture's row that lies on that row of the destination.
     int64_t ownRow(int64_t row) const { return row - mTop; }
     int64_t destinationRow(int64_t ownRow) const { return ownRow + mTop; }
 
     /// The part of the picture that lies on the destination; empty for one that cannot be trusted.
-    Box seen(const Box& part) const {
-        return intersection(part, translated({0, 0, mPixels.width, mPixels.height}, -mLeft, -mTop));
-    }
+    Box seen(const Box& part) const;
 
     /// A job on a part that is seen, through a mask of the part's size.
-    BlendJob jobOn(const Box& part, const uint8_t* mask, int64_t stride) const {
-        VOREL_ASSERT(!part.empty() && seen(part) == part);
-        BlendJob job = internal::jobOn(mPixels, translated(part, mLeft, mTop));
-        job.mask = mask;
-        job.maskStride = stride;
-        return job;
-    }
+    BlendJob jobOn(const Box& part, const uint8_t* mask, int64_t stride) const;
 
     /// Paints one colour through such a mask.
     void paint(BlendLoop BlendLoops::*rule, const Box& part, const uint8_t* mask, int64_t stride,
-               uint32_t color) const {
-        BlendJob job = jobOn(part, mask, stride);
-        job.color = color;
-        (mLoops.*rule)(job);
-    }
+               uint32_t color) const;
 
     /// Paints one colour through coverage whose first pixel lies at (x, y) of the picture, where it is
     /// seen.
     void paintCoverage(BlendLoop BlendLoops::*rule, const CoverageRows& coverage, int64_t x, int64_t y,
-                       uint32_t color) const {
-        const Box part = seen(translated(wholeOf(coverage), x, y));
-        if (part.empty()) return;
-        const uint8_t* const mask = coverage.start + (part.top - y) * coverage.stride + (part.left - x);
-        paint(rule, part, mask, coverage.stride, color);
-    }
+                       uint32_t color) const;
 
   private:
     const BlendLoops& mLoops;

@@ -16,25 +16,21 @@ constexpr int64_t kAllRows = INT64_MAX / 2;
 
 /// An effect that paints from the top of a picture down, as far as it is asked to. What it needs is made
 /// with it, and stays until all is painted: effects can take turns without doing anything twice.
+///
+/// paintAbove(limit) of each goes on with what lies above row `limit` of the targets, and paints nothing
+/// below it. It returns the row above which nothing is left, which may lie above `limit`: some effects
+/// paint bands of several rows, which wait until all of a band may be painted.
 class RowPainter {
   public:
     RowPainter() = default;
     RowPainter(const RowPainter&) = delete;
     RowPainter& operator=(const RowPainter&) = delete;
-
-    /// Goes on with what lies above row `limit` of the targets, and paints nothing below it. Returns the
-    /// row above which nothing is left. It may lie above `limit`: some effects paint bands of several
-    /// rows, which wait until all of a band may be painted.
-    virtual int64_t paintAbove(int64_t limit) = 0;
-
-  protected:
-    ~RowPainter() = default;
 };
 
 /// One that paints a part of a picture in windows.
 class WindowPainter : public RowPainter, protected WindowBands {
   public:
-    int64_t paintAbove(int64_t limit) override {
+    int64_t paintAbove(int64_t limit) {
         if (!mWalk) return limit;
         return mTarget.destinationRow(mWalk->goAbove(mTarget.ownRow(limit), *this));
     }

@@ -22,6 +22,10 @@ void BlurPainter::paintBand(const Box& band) {
     mTarget.paint(&BlendLoops::dstOverMask, band, rows.values, rows.stride, mColor);
 }
 
+int64_t ShadowPainter::paintAbove(int64_t limit) {
+    return mPlain ? mPlain->paintAbove(limit) : mBlurred->paintAbove(limit);
+}
+
 bool beginBlurred(std::optional<ShadowPainter>& painter, const PlacedTarget& target,
                   const CoverageRows& coverage, BlurPainter::Of of, int radius, const Box& part,
                   uint32_t color, int64_t workingBytes) {

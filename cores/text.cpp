@@ -28,4 +28,12 @@ bool internal::begin(std::optional<CoveragePainter>& painter, const VFECore::Par
     return true;
 }
 
+int64_t internal::CoveragePainter::paintAbove(int64_t limit) {
+    const Box part = mRest.takenAbove(mTarget.ownRow(limit));
+    if (part.empty()) return limit;
+    const uint8_t* const mask = mCoverage.start + part.top * mCoverage.stride + part.left;
+    mTarget.paint(mRule, part, mask, mCoverage.stride, mColor);
+    return limit;
+}
+
 }  // namespace VFontEffect

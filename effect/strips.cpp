@@ -67,26 +67,28 @@ class RunPainters {
     [[nodiscard]] bool add(VFECore& core, const VFECore::ParamPostProcessing& params) {
         VFProperty* const record = core.getProperty();
         if (record == nullptr) return true;
-        switch (core.getStyle()) {
+        const int style = core.getStyle();
+        mStyles[mCount++] = style;
+        switch (style) {
             case kOuterShadow:
-                return begun(mOuterShadow, &params, *static_cast<const VFOuterShadowProperty*>(record),
+                return begin(mOuterShadow, &params, *static_cast<const VFOuterShadowProperty*>(record),
                              ShadowPainter::offsetOf(static_cast<const VFOuterShadow&>(core)));
             case kInnerShadow:
-                return begun(mInnerShadow, &params, *static_cast<const VFInnerShadowProperty*>(record));
+                return begin(mInnerShadow, &params, *static_cast<const VFInnerShadowProperty*>(record));
             case kOuterGlow:
-                return begun(mOuterGlow, &params, *static_cast<const VFOuterGlowProperty*>(record));
+                return begin(mOuterGlow, &params, *static_cast<const VFOuterGlowProperty*>(record));
             case kInnerGlow:
-                return begun(mInnerGlow, &params, *static_cast<const VFInnerGlowProperty*>(record));
+                return begin(mInnerGlow, &params, *static_cast<const VFInnerGlowProperty*>(record));
             case kLinearGradient:
-                return begun(mLinear, &params, *static_cast<const VFLinearGradientProperty*>(record));
+                return begin(mLinear, &params, *static_cast<const VFLinearGradientProperty*>(record));
             case kRadialGradient:
-                return begun(mRadial, &params, *static_cast<const VFRadialGradientProperty*>(record));
+                return begin(mRadial, &params, *static_cast<const VFRadialGradientProperty*>(record));
             case kStroke:
-                return begun(mStroke, &params, *static_cast<const VFStrokeProperty*>(record));
+                return begin(mStroke, &params, *static_cast<const VFStrokeProperty*>(record));
             case kPattern:
-                return begun(mPattern, &params, *static_cast<const VFPatternProperty*>(record));
+                return begin(mPattern, &params, *static_cast<const VFPatternProperty*>(record));
             case kText:
-                return begun(mText, &params, *static_cast<const VFTextProperty*>(record));
+                return begin(mText, &params, *static_cast<const VFTextProperty*>(record));
             default:
                 VOREL_ASSERT(false);
                 return true;
@@ -96,16 +98,36 @@ class RunPainters {
     /// What one has painted the next may paint on.
     void paintAbove(int64_t limit) {
         for (int i = 0; i < mCount; ++i)
-            limit = mInOrder[i]->paintAbove(limit);
+            limit = paintAbove(mStyles[i], limit);
     }
 
   private:
-    template <class Painter, class... Arguments>
-    bool begun(std::optional<Painter>& painter, const Arguments&... arguments) {
-        VOREL_ASSERT(!painter);
-        if (!begin(painter, arguments...)) return false;
-        if (painter) mInOrder[mCount++] = &*painter;
-        return true;
+    template <class Painter>
+    static int64_t goOn(std::optional<Painter>& painter, int64_t limit) {
+        return painter ? painter->paintAbove(limit) : limit;
+    }
+
+    int64_t paintAbove(int style, int64_t limit) {
+        switch (style) {
+            case kOuterShadow:
+                return goOn(mOuterShadow, limit);
+            case kInnerShadow:
+                return goOn(mInnerShadow, limit);
+            case kOuterGlow:
+                return goOn(mOuterGlow, limit);
+            case kInnerGlow:
+                return goOn(mInnerGlow, limit);
+            case kLinearGradient:
+                return goOn(mLinear, limit);
+            case kRadialGradient:
+                return goOn(mRadial, limit);
+            case kStroke:
+                return goOn(mStroke, limit);
+            case kPattern:
+                return goOn(mPattern, limit);
+            default:
+                return goOn(mText, limit);
+        }
     }
 
     std::optional<ShadowPainter> mOuterShadow;
@@ -117,7 +139,7 @@ class RunPainters {
     std::optional<StrokePainter> mStroke;
     std::optional<PatternPainter> mPattern;
     std::optional<CoveragePainter> mText;
-    RowPainter* mInOrder[kNoEffect];
+    int mStyles[kNoEffect];
     int mCount = 0;
 };
 

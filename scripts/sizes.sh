@@ -20,11 +20,12 @@ build_with() {
 }
 # bytes_of NAME...: of the sections of `sections` whose names begin so
 bytes_of() {
-    local name sum=0
-    for name in "$@"; do
-        sum=$((sum + $(awk -v name="$name" 'index($2, name) == 1 { s += strtonum("0x" $6) } END { print s + 0 }' \
-            <<< "$sections")))
-    done
+    local name section size sum=0
+    while read -r section size; do
+        for name in "$@"; do
+            [[ $section != "$name"* ]] || sum=$((sum + 16#$size))
+        done
+    done < <(awk '{ print $2, $6 }' <<< "$sections")
     echo "$sum"
 }
 # print_row NAME STRIP

@@ -39,6 +39,7 @@
 /// | [timesFactor, kNumberBias]    | numbers below 2^23, stored with the bias added, as floats, times a   |
 /// |                               | factor, rounded once                                                 |
 /// | [loadFirst]                   | 1 to kBytes bytes of memory, zeros after them                        |
+/// | [largerOf]                    | of two vectors of bytes, whose two offsets stand side by side        |
 /// | [gather]                      | the words of a table at kU32Lanes indices, in a vector or in bytes   |
 /// | [gatherNear]                  | the same from a table of `size` words, 32 at least, by indices that  |
 /// |                               | mostly lie close together: looked up in registers then               |

@@ -13,6 +13,13 @@ VOREL_INLINE U8s loadFirst(const uint8_t* from, int64_t count) {
 }
 #endif
 
+#if !defined(VOREL_NATIVE_LARGER_OF)
+template <class V>
+VOREL_INLINE V largerOf(const uint8_t* place, const int32_t* offsets) {
+    return max(load<V>(place + offsets[0]), load<V>(place + offsets[1]));
+}
+#endif
+
 #if !defined(VOREL_NATIVE_MULTIPLY_HIGH_SUM)
 VOREL_INLINE U16s multiplyHighSum(U16s a, U16s x, U16s b, U16s y) {
     // The upper halves of both products, and the carry of the lower ones.

@@ -104,6 +104,15 @@ VOREL_INLINE U8s quarters(U16s even, U16s odd) {
     return bitCast<U8s>(vtrn2q_u8(raised(even), raised(odd)));
 }
 
+#define VOREL_NATIVE_LARGER_OF
+/// Both offsets by one load: that of a pair that widens them takes twice as long.
+template <class V>
+VOREL_INLINE V largerOf(const uint8_t* place, const int32_t* offsets) {
+    int64_t both;
+    std::memcpy(&both, offsets, sizeof both);
+    return max(load<V>(place + static_cast<int32_t>(both)), load<V>(place + (both >> 32)));
+}
+
 #define VOREL_NATIVE_WEIGHTS
 /// A string's first sixteen weights.
 using Weights = uint8x16_t;

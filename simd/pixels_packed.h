@@ -28,6 +28,19 @@ constexpr uint32_t kAlphaByte = 0xFF000000U;
 VOREL_INLINE Pixels loadPixels(const uint8_t* from) { return {load<U8s>(from)}; }
 VOREL_INLINE void storePixels(uint8_t* to, const Pixels& pixels) { store(to, pixels.bytes); }
 
+/// The entries of a ramp of 256, pixels in memory order, at the places of kPixels pixels, the first
+/// entry being that of place kFirst; what lies before or behind has that of the end. placesAt(i) are
+/// those of pixel i and the next kU32Lanes - 1.
+template <int32_t kFirst, class PlacesAt>
+VOREL_INLINE Pixels rampEntries(const uint32_t* ramp, PlacesAt placesAt) {
+    constexpr int32_t kEntries = 256;
+    const I32s places = clamped(placesAt(0), kFirst, kFirst + kEntries - 1);
+    return {bitCast<U8s>(gatherNear(ramp, kEntries, places - kFirst))};
+}
+/// Those of kPixels bytes.
+VOREL_INLINE Pixels rampEntries(const uint32_t* ramp, const uint8_t* bytes) {
+    return {bitCast<U8s>(gather(ramp, bytes))};
+}
 /// From words 0xAARRGGBB: memory order B, G, R, A.
 VOREL_INLINE Pixels loadWords(const uint8_t* from) { return {swapRedBlue(load<U8s>(from))}; }
 /// From memory order A, R, G, B.

@@ -54,6 +54,21 @@ VOREL_INLINE Pixels lookedUp(const uint32_t* table, IndicesAt indicesAt) {
     });
     return loadPixels(reinterpret_cast<const uint8_t*>(pairs));
 }
+/// The entries of a ramp of 256, pixels in memory order, at the places of kPixels pixels, the first
+/// entry being that of place kFirst; what lies before or behind has that of the end. placesAt(i) are
+/// those of pixel i and the next kU32Lanes - 1.
+template <int32_t kFirst, class PlacesAt>
+VOREL_INLINE Pixels rampEntries(const uint32_t* ramp, PlacesAt placesAt) {
+    return lookedUp(ramp, [&](int64_t i) VOREL_INLINE_LAMBDA { return toBytes<kFirst>(placesAt(i)); });
+}
+/// Those of kPixels bytes.
+VOREL_INLINE Pixels rampEntries(const uint32_t* ramp, const uint8_t* bytes) {
+    return lookedUp(ramp, [bytes](int64_t i) VOREL_INLINE_LAMBDA {
+        uint32_t four;
+        std::memcpy(&four, bytes + i, sizeof four);
+        return four;
+    });
+}
 /// From words 0xAARRGGBB: memory order B, G, R, A.
 VOREL_INLINE Pixels loadWords(const uint8_t* from) {
     const uint8x16x4_t p = vld4q_u8(from);

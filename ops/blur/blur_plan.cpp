@@ -53,6 +53,8 @@ BlurPlan::BlurPlan(CpuLevel level, const BlurInput& largest, int64_t memoryBytes
     }
 }
 
+BlurPlan::~BlurPlan() = default;
+
 /// What `action` gives for the one blur that there is.
 template <class Plan, class Action>
 auto BlurPlan::withBlur(Plan& plan, Action action) {

@@ -20,6 +20,7 @@ class BlurPlan {
     /// For inputs that take no more memory than this one, which is `memoryBytes`, of the same weights,
     /// order and endings.
     BlurPlan(CpuLevel level, const BlurInput& largest, int64_t memoryBytes);
+    ~BlurPlan();
 
     explicit operator bool() const;
 

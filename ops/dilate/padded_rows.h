@@ -78,19 +78,6 @@ VOREL_INLINE PaddedRows takeRows(const Dilation& dilation, const Columns& result
     return {arena.take<uint8_t>(count * stride), count, stride, lead, dilation.width};
 }
 
-/// The larger of two vectors whose offsets stand side by side.
-template <class V>
-VOREL_INLINE V largerOf(const uint8_t* place, const int32_t* offsets) {
-#if defined(__aarch64__)
-    // One load for both: that of a pair that widens them takes twice as long.
-    int64_t both;
-    std::memcpy(&both, offsets, sizeof both);
-    return max(load<V>(place + static_cast<int32_t>(both)), load<V>(place + (both >> 32)));
-#else
-    return max(load<V>(place + offsets[0]), load<V>(place + offsets[1]));
-#endif
-}
-
 VOREL_INLINE void setBytes(uint8_t* to, uint8_t value, int64_t count) {
     std::memset(to, value, static_cast<size_t>(count));
 }

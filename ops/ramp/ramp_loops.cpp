@@ -55,21 +55,6 @@ struct RadialRow {
     }
 };
 
-/// The colours of kPixels pixels from column x on. Saturation on both sides of the ramp first: taking
-/// its beginning away afterwards cannot overflow.
-template <class RampRow>
-VOREL_INLINE Pixels coloursFrom(const RampRow& row, int64_t x) {
-    constexpr int32_t kFirst = RampRow::kFirst;
-#if defined(VOREL_PLANAR_PIXELS)
-    return lookedUp(row.pixels,
-                    [&](int64_t i) VOREL_INLINE_LAMBDA { return toBytes<kFirst>(row.places(x + i)); });
-#else
-    constexpr int32_t kEntries = 256;
-    const I32s places = clamped(row.places(x), kFirst, kFirst + kEntries - 1);
-    return {bitCast<U8s>(gatherNear(row.pixels, kEntries, places - kFirst))};
-#endif
-}
-
 /// Destination-over: what is premultiplied has no colour where it is transparent.
 VOREL_INLINE Pixels underPremultiplied(const Pixels& d, const Pixels& source) {
     return under(d, source, ~isTransparent(source));
@@ -82,7 +67,9 @@ struct RampPainter : MaskReader<Empty::keeps, true> {
     VOREL_INLINE Pixels paint(const Place& place) const {
         const Pixels destination = loadPixels(place.destination());
         const Where covered = ~isZero(loadAmounts(place.mask()));
-        return underPremultiplied(destination, kept(covered, coloursFrom(row, place.x)));
+        const Pixels colours = rampEntries<RampRow::kFirst>(
+            row.pixels, [&](int64_t i) VOREL_INLINE_LAMBDA { return row.places(place.x + i); });
+        return underPremultiplied(destination, kept(covered, colours));
     }
 };
 
@@ -158,15 +145,7 @@ struct ValuePainter : MaskReader<> {
     RampPixels pixels;
 
     VOREL_INLINE Pixels paint(const Place& place) const {
-#if defined(VOREL_PLANAR_PIXELS)
-        const Pixels colours = lookedUp(pixels, [&](int64_t i) VOREL_INLINE_LAMBDA {
-            uint32_t four;
-            std::memcpy(&four, place.mask() + i, sizeof four);
-            return four;
-        });
-#else
-        const Pixels colours = {bitCast<U8s>(gather(pixels, place.mask()))};
-#endif
+        const Pixels colours = rampEntries(pixels, place.mask());
         return underPremultiplied(loadPixels(place.destination()), colours);
     }
 };
