@@ -34,7 +34,7 @@
 /// | allZero                       | whether no lane holds anything but 0                                 |
 /// | nonZeroLanes, kLaneBits       | kLaneBits ones for each byte but 0, the first one's lowest           |
 /// | toInt                         | as core/numeric.h converts: toward zero, saturating, NaN to 0        |
-/// | [toIntUpTo<most>]             | as toInt, at least 0                                                 |
+/// | [toIntUpTo<most>]             | as toInt, at least 0, at most `most`                                 |
 /// | squareRoot                    | correctly rounded                                                    |
 /// | [timesFactor, kNumberBias]    | numbers below 2^23, stored with the bias added, as floats, times a   |
 /// |                               | factor, rounded once                                                 |
@@ -54,7 +54,8 @@
 /// | [joinedBytes]                 | words of at most 255 from four vectors, as the bytes of words        |
 /// | pairSums                      | of each two neighbouring bytes                                       |
 /// | [pairProducts]                | of bytes of 0 to 255 and -128 to 127, each two neighbouring ones     |
-/// |                               | added, in 16 bits; VOREL_PAIR_PRODUCTS is said where there is one    |
+/// |                               | added, if that fits in 16 signed bits; VOREL_PAIR_PRODUCTS is said   |
+/// |                               | where there is one                                                   |
 /// | quarters                      | a quarter of each 16-bit lane, at most 255, from two vectors in turn |
 ///
 /// Dot products of taps, four to a word:

@@ -57,7 +57,7 @@ VOREL_INLINE U16s pairSums(U8s v) { return (bitCast<U16s>(v) & 0x00FF) + (bitCas
 /// In place: compilers would rather make a tree of all products and spill it, or add the sum to the
 /// product and copy it back.
 VOREL_INLINE void addTo(U32s& sum, __m128i products) {
-    __asm__("paddd %1, %0" : "+x"(sum) : "x"(products));
+    __asm__("paddd {%1, %0|%0, %1}" : "+x"(sum) : "x"(products));
 }
 template <int64_t kFour>
 VOREL_INLINE U32s addDots(U32s sums, Taps taps, const WeightCell* weights) {

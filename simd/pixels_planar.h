@@ -27,10 +27,12 @@ VOREL_INLINE void storePixels(uint8_t* to, const Pixels& pixels) {
     vst4q_u8(to, planes);
 #else
     // g++ computes channels in registers of their own and moves them into the four that the store takes.
-    register uint8x16_t red asm("v0") = c[0];
-    register uint8x16_t green asm("v1") = c[1];
-    register uint8x16_t blue asm("v2") = c[2];
-    register uint8x16_t alpha asm("v3") = c[3];
+    // Loads come first: what an instrumented build calls for them could change those.
+    const uint8x16_t r = c[0], g = c[1], b = c[2], a = c[3];
+    register uint8x16_t red asm("v0") = r;
+    register uint8x16_t green asm("v1") = g;
+    register uint8x16_t blue asm("v2") = b;
+    register uint8x16_t alpha asm("v3") = a;
     using Bytes = uint8_t[4 * kPixels];
     asm("st4 {%1.16b - %4.16b}, %0"
         : "=Q"(*reinterpret_cast<Bytes*>(to))

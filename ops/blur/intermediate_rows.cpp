@@ -7,6 +7,7 @@
 #include "core/assert.h"
 #include "core/numeric.h"
 #include "ops/blur/blur_input.h"
+#include "ops/blur/narrow_loops.h"
 #include "simd/cpu_level.h"
 
 namespace VFontEffect::internal {
@@ -15,6 +16,8 @@ namespace {
 /// Pixels on both sides of the rows. A vector of results of which one alone has a tap among the columns
 /// is computed as a whole, with the taps of all others.
 constexpr int64_t kMargin = 2 * kWidestVector;
+static_assert(kMargin >= kWidestVector - 1 + 2 * kLargestNarrowRadius,
+              "narrow blurs, which load vectors at every other pixel, have room as well");
 
 IntermediateRows takeRows(int64_t coveredColumn, int64_t columns, const FullColumns& full,
                           int64_t vectorBytes, Arena& arena) {

@@ -58,7 +58,8 @@ struct IntermediateForm {
 
 /// Fills rows between the passes, with their margins, with 0: once, before the first quad.
 void clear(const IntermediateForm& form, const IntermediateRows& rows);
-/// Fills the full columns, which the pass down may have written over.
+/// Fills the full columns, which the pass down may have written over, and marks their vectors as
+/// covered.
 void fillFullColumns(const IntermediateForm& form, const IntermediateRows& rows);
 
 }  // namespace VFontEffect::internal

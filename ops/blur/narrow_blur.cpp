@@ -1,6 +1,5 @@
 #include "ops/blur/narrow_blur.h"
 
-#include <algorithm>
 #include <cstdint>
 #include <cstring>
 
@@ -20,6 +19,7 @@ NarrowWeights narrowed(const BlurWeights& weights) {
     for (int k = 0; k <= weights.radius; ++k)
         narrow.byDistance[k] = static_cast<uint8_t>(weights.byDistance[k] * scale);
     narrow.total = static_cast<uint16_t>(weights.total * scale);
+    VOREL_ASSERT(narrow.total >= 128);
     narrow.division = narrowDivision(narrow.total);
     return narrow;
 }

@@ -17,8 +17,9 @@
 /// multiplied at once, down the columns after two rows have been interleaved. Elsewhere they are parted,
 /// and those at +k and -k are added before the product.
 ///
-/// Exactness: a sum is below 2^16, and what wraps before it is complete does not matter. The division is
-/// one by multiplication (narrowDivision in blur_weights.h).
+/// Exactness: a sum is below 2^16, and what wraps before it is complete does not matter. The sum of a
+/// pair's products, which saturates, has neighbouring weights of 255 at most together: it is between
+/// -255 * 128 and 255 * 127. The division is one by multiplication (narrowDivision in blur_weights.h).
 ///
 /// Cost: (R + 1) products of pairs, or R + 1 of single taps, for a vector of 16-bit lanes and pass.
 /// Vectors of columns without coverage are left out.

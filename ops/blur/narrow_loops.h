@@ -39,7 +39,7 @@ struct TapRows {
 /// The passes of one radius.
 struct NarrowPasses {
     /// The pass down, for `taps.width` columns. Marks vectors of columns with anything but 0 as covered,
-    /// and no others.
+    /// and at the end perhaps their neighbour.
     void (*down)(const NarrowWeights& weights, const TapRows& taps, const BlurRows& out,
                  uint8_t* covered);
     /// The pass across, for the columns `left` to `right` - 1.

@@ -30,8 +30,8 @@ namespace VFontEffect::internal::VOREL_LEVEL {
 /// Rows that planes have room for beside those in reach: a number of bands, after which rows are moved.
 constexpr int64_t kRolledRows = 64;
 
-/// Loads of one sector, as offsets from a result's place in the plane of single pixels. Squares are
-/// even, so that half of a loop's maxima need not wait for each other.
+/// Loads of one sector, as offsets from a result's place in the plane of single pixels. The squares of
+/// each list are even in number, so that half of a loop's maxima need not wait for each other.
 struct Sector {
     const int32_t* bounds;   ///< squares with all of it
     const int32_t* squares;  ///< of its corners

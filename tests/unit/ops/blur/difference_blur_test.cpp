@@ -191,6 +191,18 @@ TEST(NarrowBlur, OfEveryRadius_IsTheOneByDotProducts) {
     }
 }
 
+// The last of them reach full columns, but none of the source: they must not take more memory than
+// others.
+TEST(NarrowBlur, OfWindowsBesideTheSource_IsTheOneOfAll) {
+    const Mask mask = filledMask(150, 5, 255);
+    const CoverageRows source = {mask.bytes.data(), 150, 150, 5, 0};
+    for (const int radius : {1, 2, 3, 8, 30}) {
+        const BlurWeights weights = gaussianOf100(radius);
+        expectAllTheSame({weights, source, {0, 0, 159, 5}, {kNoFullColumns.before, 155}, false, {1, 5}});
+        if (HasFatalFailure()) return;
+    }
+}
+
 TEST(DifferenceBlur, OfSidesLongerThanTheBlur_ReachesTheLargestDifferences) {
     for (const int radius : {13, 100, 150, 256}) {
         const BlurWeights shadow = gaussianOf100(radius);
