@@ -32,6 +32,10 @@ struct Windows {
 /// What is painted in windows, in bands of rows from a window's top down.
 class WindowBands {
   public:
+    WindowBands() = default;
+    WindowBands(const WindowBands&) = delete;
+    WindowBands& operator=(const WindowBands&) = delete;
+
     /// Turns to a window.
     virtual void beginWindow(const Box& window) = 0;
     /// Rows of its bands; the last one may have fewer.

@@ -27,8 +27,8 @@ class RowPainter {
     RowPainter& operator=(const RowPainter&) = delete;
 };
 
-/// One that paints a part of a picture in windows.
-class WindowPainter : public RowPainter, protected WindowBands {
+/// Such an effect that paints a part of a picture in windows.
+class WindowPainter : public WindowBands {
   public:
     int64_t paintAbove(int64_t limit) {
         if (!mWalk) return limit;
