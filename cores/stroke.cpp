@@ -53,9 +53,10 @@ StrokePainter::StrokePainter(const VFECore::ParamPostProcessing& params, const C
     mMemory.emplace(bytes, plans);
     if (!*mMemory) return;
     mGrown.emplace(level, grown, mMemory->data(), bytes);
-    if (isCentred)
+    if (isCentred) {
         mInverse.emplace(level, DilationInput{box.rows(kInverse), mDisc}, mMemory->data() + bytes,
                          bytes);
+    }
     setWindows(windows);
 }
 

@@ -16,7 +16,7 @@ namespace {
 /// Pixels on both sides of the rows. A vector of results of which one alone has a tap among the columns
 /// is computed as a whole, with the taps of all others.
 constexpr int64_t kMargin = 2 * kWidestVector;
-static_assert(kMargin >= kWidestVector - 1 + 2 * kLargestNarrowRadius,
+static_assert(kMargin >= kWidestVector - 1 + int64_t{2} * kLargestNarrowRadius,
               "narrow blurs, which load vectors at every other pixel, have room as well");
 
 IntermediateRows takeRows(int64_t coveredColumn, int64_t columns, const FullColumns& full,

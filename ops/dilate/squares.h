@@ -95,7 +95,8 @@ inline SquareLayout SquareLayout::of(const Dilation& dilation, Arena& arena) {
     layout.aroundCount = 0;
     // A quarter's staircase has at most a corner in each row, its rim four cells.
     constexpr int64_t kMostBounds = 8;
-    layout.offsets = arena.take<int32_t>(kImages * (5 * (reach + 1) + 2 * kMostBounds) + 2 * kSectors);
+    layout.offsets =
+        arena.take<int32_t>(kImages * (5 * (reach + 1) + 2 * kMostBounds) + int64_t{2} * kSectors);
     layout.deficits = arena.take<U8s>(4 * (reach + 1));
     layout.results = arena.take<uint8_t>(dilation.bandRows * dilatedStride(dilation));
     return layout;
