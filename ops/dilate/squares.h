@@ -41,7 +41,7 @@ struct Sector {
     int32_t squareCount;
     int32_t rimCount;
 };
-constexpr int kSectors = 16;
+constexpr int64_t kSectors = 16;
 constexpr int kImages = 8;  ///< of an octant
 
 struct SquareLayout {
@@ -95,8 +95,7 @@ inline SquareLayout SquareLayout::of(const Dilation& dilation, Arena& arena) {
     layout.aroundCount = 0;
     // A quarter's staircase has at most a corner in each row, its rim four cells.
     constexpr int64_t kMostBounds = 8;
-    layout.offsets =
-        arena.take<int32_t>(kImages * (5 * (reach + 1) + 2 * kMostBounds) + int64_t{2} * kSectors);
+    layout.offsets = arena.take<int32_t>(kImages * (5 * (reach + 1) + 2 * kMostBounds) + 2 * kSectors);
     layout.deficits = arena.take<U8s>(4 * (reach + 1));
     layout.results = arena.take<uint8_t>(dilation.bandRows * dilatedStride(dilation));
     return layout;
@@ -317,7 +316,7 @@ VOREL_INLINE bool isMore(U8s bound, U8s value) {
 inline U8s dilatedVector(const SquareLayout& layout, const uint8_t* place) {
     U8s value = largestOf(place, layout.middle, 4, U8s{});
     if (!isMore(largestOf(place, layout.around, layout.aroundCount, U8s{}), value)) return value;
-    for (int i = 0; i < kSectors; ++i) {
+    for (int64_t i = 0; i < kSectors; ++i) {
         const Sector& sector = layout.sectors[i];
         const U8s bound = largestOf(place, sector.bounds, sector.boundCount, U8s{});
         if (!isMore(bound, value)) continue;
