@@ -17,9 +17,13 @@ struct MaskPainter : MaskReader<Rule::kEmpty, Rule::kIsSparse> {
     Pixels fullOverNothing;  ///< what full coverage paints over transparent pixels
 
     VOREL_INLINE bool paintWhole(const Place& place) const {
-        if (!hasFullMask(place) || !isClear<kBytes>(place.destination())) return false;
-        for (int64_t x = 0; x < kBytes; x += kPixels)
-            storePixels(place.destination() + 4 * x, fullOverNothing);
+        if (!isClear<kBytes>(place.destination())) return false;
+        const bool isFull = hasFullMask(place);
+        for (int64_t x = 0; x < kBytes; x += kPixels) {
+            storePixels(
+                place.destination() + 4 * x,
+                isFull ? fullOverNothing : Rule::apply(Pixels{}, loadAmounts(place.mask() + x), colour));
+        }
         return true;
     }
     VOREL_INLINE Pixels paint(const Place& place) const {
