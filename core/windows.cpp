@@ -6,12 +6,10 @@ int64_t WindowWalk::goAbove(int64_t limit, WindowBands& bands) {
     for (; !mWindow.empty(); turnToNext()) {
         if (limit <= mNext) return limit;
         if (mWindows.areCutAcross() && limit < mWindow.bottom) return mNext;
-        if (mBandRows == 0) {
-            bands.beginWindow(mWindow);
-            mBandRows = bands.bandRows();
-        }
+        if (!mHasBegun) bands.beginWindow(mWindow);
+        mHasBegun = true;
         while (mNext < mWindow.bottom) {
-            const int64_t end = std::min(mNext + mBandRows, mWindow.bottom);
+            const int64_t end = std::min(mNext + bands.bandRows(), mWindow.bottom);
             if (end > limit) return mNext;
             bands.paintBand({mWindow.left, mNext, mWindow.right, end});
             mNext = end;
@@ -23,7 +21,7 @@ int64_t WindowWalk::goAbove(int64_t limit, WindowBands& bands) {
 void WindowWalk::turnTo(int64_t left, int64_t top) {
     mWindow = intersection(mWindows.part, {left, top, left + mWindows.width, top + mWindows.height});
     mNext = top;
-    mBandRows = 0;
+    mHasBegun = false;
 }
 
 void WindowWalk::turnToNext() {

@@ -38,7 +38,7 @@ class WindowBands {
 
     /// Turns to a window.
     virtual void beginWindow(const Box& window) = 0;
-    /// Rows of its bands; the last one may have fewer.
+    /// Rows of its next band; the last one may have fewer.
     virtual int64_t bandRows() const = 0;
     virtual void paintBand(const Box& band) = 0;
 
@@ -62,9 +62,9 @@ class WindowWalk {
     void turnToNext();
 
     Windows mWindows;
-    Box mWindow;        ///< empty behind the last one
-    int64_t mNext;      ///< its first row that is left
-    int64_t mBandRows;  ///< 0 until it has begun
+    Box mWindow;    ///< empty behind the last one
+    int64_t mNext;  ///< its first row that is left
+    bool mHasBegun;
 };
 
 /// An effect takes about so much working memory at most, whatever the size of its picture.

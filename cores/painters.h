@@ -57,14 +57,21 @@ class StrokePainter final : public WindowPainter {
 
   private:
     void beginWindow(const Box& window) override;
-    int64_t bandRows() const override { return mGrown->bandRows(); }
+    int64_t bandRows() const override { return mIsCutAnew ? kAllRows : mGrown->bandRows(); }
     void paintBand(const Box& band) override;
+
+    void beginPlans(const Box& window);
+    bool paintNext(const Box& band);
 
     PlacedTarget mSecondTarget;
     BlendLoop BlendLoops::*mRule;
     uint32_t mColor;
     DiscShape mDisc;
     std::optional<LineBuffer> mMemory;
+    // Windows are as wide as tiles' memory allows. Where those give up, which they do on no text, what
+    // is left of a window, and all windows that follow, are cut once more, as squares' memory asks for.
+    Windows mWindowsOfSquares = {};
+    bool mIsCutAnew = false;
     // What is centred lies within the disc's radius of the edge on both sides of it: in what has grown
     // and in what its inverse has.
     std::optional<DilationPlan> mGrown;

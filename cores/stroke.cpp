@@ -1,3 +1,4 @@
+#include <algorithm>
 #include <cstdint>
 #include <optional>
 
@@ -45,11 +46,14 @@ StrokePainter::StrokePainter(const VFECore::ParamPostProcessing& params, const C
     const Box visible = boundingBox(mTarget.seen(reached), mSecondTarget.seen(reached));
     if (visible.empty()) return;
     const int64_t plans = isCentred ? 2 : 1;
-    const auto bytesOfPlan = [&](const Windows& cut) {
-        return DilationPlan::memoryBytes(level, grown, cut);
+    const auto windowsBy = [&](auto memoryBytes) {
+        return windowsWithin(workingBytes / plans, visible, mDisc.reach,
+                             [&](const Windows& cut) { return memoryBytes(level, grown, cut); });
     };
-    const Windows windows = windowsWithin(workingBytes / plans, visible, mDisc.reach, bytesOfPlan);
-    const int64_t bytes = windows.memoryBytes;
+    mWindowsOfSquares = windowsBy(DilationPlan::memoryBytes);
+    const bool isCut = mWindowsOfSquares.areCutAcross() || mWindowsOfSquares.areCutDown();
+    const Windows windows = isCut ? windowsBy(DilationPlan::memoryBytesOfTiles) : mWindowsOfSquares;
+    const int64_t bytes = std::max(windows.memoryBytes, mWindowsOfSquares.memoryBytes);
     mMemory.emplace(bytes, plans);
     if (!*mMemory) return;
     mGrown.emplace(level, grown, mMemory->data(), bytes);
@@ -61,15 +65,35 @@ StrokePainter::StrokePainter(const VFECore::ParamPostProcessing& params, const C
 }
 
 void StrokePainter::beginWindow(const Box& window) {
+    if (!mIsCutAnew) beginPlans(window);
+}
+
+void StrokePainter::paintBand(const Box& band) {
+    if (!mIsCutAnew && paintNext(band)) return;
+    mIsCutAnew = true;
+    const Windows windows = {band, mWindowsOfSquares.width, mWindowsOfSquares.height};
+    windows.forEach([&](const Box& window) {
+        beginPlans(window);
+        for (int64_t y = window.top; y < window.bottom; y += mGrown->bandRows()) {
+            const int64_t end = std::min(y + mGrown->bandRows(), window.bottom);
+            paintNext({window.left, y, window.right, end});
+        }
+    });
+}
+
+void StrokePainter::beginPlans(const Box& window) {
     mGrown->begin(window);
     if (mInverse) mInverse->begin(window);
 }
 
-void StrokePainter::paintBand(const Box& band) {
+/// Paints the next band of the window that the plans have turned to, unless there is no memory for it.
+bool StrokePainter::paintNext(const Box& band) {
     const CoverageRows rows = mInverse ? mGrown->minRows(*mInverse, band.top, band.height())
                                        : mGrown->rows(band.top, band.height());
+    if (rows.start == nullptr) return false;
     for (const PlacedTarget* target : {&mTarget, &mSecondTarget})
         target->paintCoverage(mRule, rows, band.left, band.top, mColor);
+    return true;
 }
 
 bool begin(std::optional<StrokePainter>& painter, const VFECore::ParamPostProcessing* params,

@@ -60,10 +60,15 @@ const DilationStrategy& strategyFor(const DilationLoops& loops, int reach) {
 
 int64_t DilationPlan::memoryBytes(CpuLevel level, const DilationInput& input, const Windows& windows) {
     const DilationLoops& loops = dilationLoops(level);
-    const DilationStrategy& strategy = strategyFor(loops, input.disc.reach);
-    const Dilation largest = largestDilation(input, windows);
-    const int64_t bytes = strategy.memoryBytes(largest);
-    return &strategy == &loops.tiles ? std::max(bytes, loops.squares.memoryBytes(largest)) : bytes;
+    const int64_t bytes = memoryBytesOfTiles(level, input, windows);
+    if (&strategyFor(loops, input.disc.reach) != &loops.tiles) return bytes;
+    return std::max(bytes, loops.squares.memoryBytes(largestDilation(input, windows)));
+}
+
+int64_t DilationPlan::memoryBytesOfTiles(CpuLevel level, const DilationInput& input,
+                                         const Windows& windows) {
+    return strategyFor(dilationLoops(level), input.disc.reach)
+        .memoryBytes(largestDilation(input, windows));
 }
 
 DilationPlan::DilationPlan(CpuLevel level, const DilationInput& input, uint8_t* memory,
@@ -78,16 +83,12 @@ void DilationPlan::begin(const Box& window) {
     mDilation = dilationOf(mInput, window);
     mFirstRow = window.top - mDilation.top;
     mNextRow = window.top;
-    beginStrategy();
+    VOREL_ASSERT(hasMemory());
+    mStrategy->begin(mDilation, mMemory);
 }
 
 void DilationPlan::giveUpTiles() {
     if (mStrategy == &mLoops.tiles) mStrategy = &mLoops.squares;
-}
-
-void DilationPlan::beginStrategy() {
-    VOREL_ASSERT(mStrategy->memoryBytes(mDilation) <= mMemoryBytes);
-    mStrategy->begin(mDilation, mMemory);
 }
 
 CoverageRows DilationPlan::rows(int64_t y, int64_t count) {
@@ -97,7 +98,9 @@ CoverageRows DilationPlan::rows(int64_t y, int64_t count) {
 CoverageRows DilationPlan::minRows(DilationPlan& other, int64_t y, int64_t count) {
     VOREL_ASSERT(mDilation.left == other.mDilation.left && mDilation.right == other.mDilation.right);
     uint8_t* const values = nextRows(y, count);
-    mLoops.keepMin(values, other.nextRows(y, count), dilatedStride(mDilation) * count);
+    const uint8_t* const others = other.nextRows(y, count);
+    if (values == nullptr || others == nullptr) return {};
+    mLoops.keepMin(values, others, dilatedStride(mDilation) * count);
     return asRows(values, count);
 }
 
@@ -108,8 +111,9 @@ uint8_t* DilationPlan::nextRows(int64_t y, int64_t count) {
     if (rows != nullptr) return rows;
     // Here and in the windows that follow, which hold more of the same.
     giveUpTiles();
+    if (!hasMemory()) return nullptr;
     mDilation.top = y - mFirstRow;
-    beginStrategy();
+    mStrategy->begin(mDilation, mMemory);
     return mStrategy->rows(mDilation, mMemory, mDilation.top, count);
 }
 

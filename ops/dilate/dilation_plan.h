@@ -25,8 +25,11 @@ class DilationPlan {
         return expanded(wholeOf(input.source), input.disc.reach + kDilationBorder);
     }
 
-    /// What a plan for any of the windows takes: a multiple of kArenaAlignment.
+    /// What a plan for any of the windows takes, whatever is in it: a multiple of kArenaAlignment.
     static int64_t memoryBytes(CpuLevel level, const DilationInput& input, const Windows& windows);
+    /// Likewise, as long as tiles do not give up. Squares take some three times as much.
+    static int64_t memoryBytesOfTiles(CpuLevel level, const DilationInput& input,
+                                      const Windows& windows);
 
     /// So many bytes of memory, aligned to kArenaAlignment, must outlive the plan. Windows, in the
     /// source's coordinates, are of what is reached.
@@ -43,6 +46,9 @@ class DilationPlan {
 
     /// `count` rows of the window's results from row y of the source on. Bands are asked for in order,
     /// from the window's top on. The rows stay until the next call.
+    ///
+    /// There are none, and their start is null, where tiles give up and memory does not suffice for
+    /// squares: from there on memoryBytes() counts, and the plan has to turn to windows that it allows.
     CoverageRows rows(int64_t y, int64_t count);
 
     /// Likewise, of each result the smaller one of this plan's and of another's for the same window.
@@ -50,7 +56,7 @@ class DilationPlan {
 
   private:
     uint8_t* nextRows(int64_t y, int64_t count);
-    void beginStrategy();
+    bool hasMemory() const { return mStrategy->memoryBytes(mDilation) <= mMemoryBytes; }
     CoverageRows asRows(const uint8_t* values, int64_t count) const;
 
     DilationInput mInput;

@@ -37,4 +37,7 @@ literal::Mask noiseMask(Random& random, int width, int height, int emptyPercent)
 /// One of all the kinds above, with random parameters.
 literal::Mask randomMask(Random& random, int width, int height);
 
+/// Like no text: noise that is sparse or dense, ramps, and plateaus with grain.
+literal::Mask unlikeText(Random& random, int width, int height);
+
 }  // namespace vorel_test

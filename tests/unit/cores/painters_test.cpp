@@ -103,6 +103,21 @@ TEST(Painters, StrokesInWindows_AreThoseOfTheLiteralForm) {
     });
 }
 
+/// Tiles give large strokes of such masks up half-way, where less memory than squares need has to do.
+TEST(Painters, StrokesThatTilesGiveUp_AreTheSameInWindows) {
+    forSeeds(0, 60, [](Random& random) {
+        const int width = random.between(200, 400);
+        const Scene scene = sceneOf(unlikeText(random, width, random.between(80, 200)));
+        const VFStrokeProperty record = {random.real(17.0F, 50.0F), randomPremultiplied(random), 1.0F, 0,
+                                         random.between(0, 2)};
+        const int64_t bytes = int64_t{1} << random.between(17, 19);
+        Painter<VFStrokeProperty> core(internal::kStroke, bytes, randomStripRows(random), record);
+        Painter<VFStrokeProperty> inOne(internal::kStroke, INT32_MAX, INT32_MAX, record);
+        EXPECT_TRUE(samePaint(painted(inOne, scene), painted(core, scene)))
+            << "size " << record.mSize << ", position " << record.mPosition << ", " << bytes << " bytes";
+    });
+}
+
 template <class Record, class LiteralForm>
 void expectShadows(EffectType type, LiteralForm literalForm) {
     forSeeds(0, 800, [&](Random& random) {

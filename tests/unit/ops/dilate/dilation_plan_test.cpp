@@ -171,21 +171,6 @@ void expectDefinedHereAndThere(Random& random, const CoverageRows& source, float
     }
 }
 
-/// Noise that is sparse or dense, ramps, and plateaus with grain.
-literal::Mask unlikeText(Random& random, int width, int height) {
-    literal::Mask mask =
-        noiseMask(random, width, height, random.chance(50) ? 0 : random.between(50, 99));
-    const int step = random.between(0, 5);
-    const int grain = random.between(1, 256);
-    for (int y = 0; y < height && step > 0; ++y) {
-        for (int x = 0; x < width; ++x) {
-            uint8_t& value = mask.bytes[static_cast<size_t>(y * width + x)];
-            value = static_cast<uint8_t>(std::min((x * step + y) % 240 + value % grain, 255));
-        }
-    }
-    return mask;
-}
-
 TEST(DilationPlan, WhatTilesGiveUp_IsTheDefinedOne) {
     forSeeds(7000, 60, [&](Random& random) {
         const int width = random.between(20, 400);
