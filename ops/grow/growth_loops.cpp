@@ -24,13 +24,6 @@ constexpr int64_t kTileColumns = kBytes;
 constexpr int64_t kTileRows = kGrowthTileRows;
 static_assert(kTileColumns >= kNarrowestGrowthTile);
 
-/// What changed in a tile: bits other than 0, in any of its rows, in its first and in its last one.
-struct Changes {
-    U8s all = {};
-    U8s first = {};
-    U8s last = {};
-};
-
 /// Adds to each 16-bit lane the lower, or the upper, of the two bytes that stand there.
 VOREL_INLINE U16s plusLowBytes(U16s sums, U8s v) {
     return sums + (bitCast<U16s>(v) & 0x00FF);
@@ -62,41 +55,42 @@ struct Column {
     int64_t stride;
     U8s inside;  // of the last column, all ones where there are pixels
     U8s behind;  // and what to write elsewhere
+    U8s changes = {};
 
-    /// What changed.
-    VOREL_INLINE U8s put(const Sums& sums) {
+    VOREL_INLINE void put(const Sums& sums) {
         U8s grown = quarters(sums.even, sums.odd);
         if (kLast) grown = (grown & inside) | behind;
         const U8s changed = grown ^ load<U8s>(from);
+        changes |= kLast ? changed & inside : changed;
         store(to, grown);
         from += stride;
         to += stride;
-        return kLast ? changed & inside : changed;
     }
 
-    /// Rows are made by twos: both share the sum of the two rows.
-    VOREL_INLINE Changes grow(int64_t rows) {
-        Changes changes;
+    /// Returns what changed. Rows are made by twos: both share the sum of the two rows.
+    VOREL_INLINE U8s grow(int64_t rows) {
         Sums above = Sums::ofRow(from - stride);
         Sums here = Sums::ofRow(from);
-        for (int64_t row = 0; row + 2 <= rows; row += 2) {
+        for (; rows >= 2; rows -= 2) {
             const Sums below = Sums::ofRow(from + stride);
             const Sums farther = Sums::ofRow(from + 2 * stride);
             const Sums both = here + below;
-            const U8s upper = put(above + both);
-            changes.last = put(both + farther);
-            if (row == 0) changes.first = upper;
-            changes.all |= upper | changes.last;
+            put(above + both);
+            put(both + farther);
             above = below;
             here = farther;
         }
-        if (rows % 2 != 0) {
-            changes.last = put(above + here + Sums::ofRow(from + stride));
-            if (rows == 1) changes.first = changes.last;
-            changes.all |= changes.last;
-        }
+        if (rows != 0) put(above + here + Sums::ofRow(from + stride));
         return changes;
     }
+};
+
+/// Whether the outermost pixels of a tile changed, on each of its sides.
+struct ChangedSides {
+    bool left;
+    bool top;
+    bool right;
+    bool bottom;
 };
 
 /// Which tiles are to do in this pass and in the next one, with a tile more on all sides.
@@ -115,15 +109,9 @@ class Tiles {
 
     /// Those that a change can reach in the next pass: the tile itself, and on each side where its
     /// outermost pixels changed the one beside it.
-    void noteChanges(const Changes& changes, int64_t column, int64_t row) {
-        const uint64_t lanes = nonZeroLanes(changes.all);
-        if (lanes == 0) return;
-        const auto left = static_cast<int64_t>(lanes & 1);
-        const auto right = static_cast<int64_t>(lanes >> (kBytes * kLaneBits - 1) & 1);
-        const int64_t top = allZero(changes.first) ? row : row - 1;
-        const int64_t bottom = allZero(changes.last) ? row : row + 1;
-        for (int64_t y = top; y <= bottom; ++y) {
-            for (int64_t x = column - left; x <= column + right; ++x)
+    void noteChange(const ChangedSides& sides, int64_t column, int64_t row) {
+        for (int64_t y = row - sides.top; y <= row + sides.bottom; ++y) {
+            for (int64_t x = column - sides.left; x <= column + sides.right; ++x)
                 *at(mNext, x, y) = 1;
         }
     }
@@ -146,9 +134,8 @@ class Tiles {
     uint8_t* mNext;
 };
 
-/// Grows a tile by one pass.
-Changes growTile(const GrowthJob& job, int from, int64_t x, int64_t y) {
-    const int64_t rows = job.height - y < kTileRows ? job.height - y : kTileRows;
+/// Grows a tile by one pass and tells what changed.
+U8s growTile(const GrowthJob& job, int from, int64_t x, int64_t y, int64_t rows) {
     const int64_t at = y * job.stride + x;
     const uint8_t* const source = job.planes[from] + at;
     uint8_t* const target = job.planes[1 - from] + at;
@@ -158,15 +145,30 @@ Changes growTile(const GrowthJob& job, int from, int64_t x, int64_t y) {
     return Column<true>{source, target, job.stride, inside, behind}.grow(rows);
 }
 
+/// The sides of a tile in which something changed. One plane holds what it was, the other what it is.
+ChangedSides changedSides(const GrowthJob& job, U8s changes, int64_t x, int64_t y, int64_t rows) {
+    const auto hasChanged = [&](int64_t row) {
+        const int64_t at = row * job.stride + x;
+        return !allZero(load<U8s>(job.planes[0] + at) ^ load<U8s>(job.planes[1] + at));
+    };
+    const uint64_t lanes = nonZeroLanes(changes);
+    return {(lanes & 1) != 0, hasChanged(y), (lanes >> (kBytes * kLaneBits - 1) & 1) != 0,
+            hasChanged(y + rows - 1)};
+}
+
 /// Whether anything changed.
 bool growPass(const GrowthJob& job, int from, Tiles& tiles) {
     bool changed = false;
     for (int64_t row = 0; row * kTileRows < job.height; ++row) {
+        const int64_t y = row * kTileRows;
+        const int64_t rows = job.height - y < kTileRows ? job.height - y : kTileRows;
         for (int64_t column = 0; column * kTileColumns < job.width; ++column) {
             if (!tiles.isToDo(column, row)) continue;
-            const Changes changes = growTile(job, from, column * kTileColumns, row * kTileRows);
-            tiles.noteChanges(changes, column, row);
-            changed = changed || !allZero(changes.all);
+            const int64_t x = column * kTileColumns;
+            const U8s changes = growTile(job, from, x, y, rows);
+            if (allZero(changes)) continue;
+            tiles.noteChange(changedSides(job, changes, x, y, rows), column, row);
+            changed = true;
         }
     }
     tiles.endPass();
