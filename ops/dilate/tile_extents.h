@@ -29,8 +29,12 @@ struct TileExtents {
     Distance* after;  ///< from the tile's last column on to the nearest one behind it
 };
 
+/// Tiles that are noted at once, those of a vector.
+constexpr int64_t kTilesOfVector = kBytes / kTile;
+
 inline TileExtents takeExtents(int64_t tiles, Arena& arena) {
-    const auto take = [&] { return arena.take<Distance>(tiles * kDistances); };
+    const int64_t noted = roundedUp(tiles, kTilesOfVector);
+    const auto take = [&] { return arena.take<Distance>(noted * kDistances); };
     return {take(), take(), take(), take(), take()};
 }
 

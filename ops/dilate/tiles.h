@@ -249,11 +249,11 @@ inline void findExtents(const Dilation& dilation, const TileLayout& planes, int6
     const bool inside = y < dilation.height;
     const uint8_t* const source = planes.rows.at(inside ? y : 0) + planes.columns.left;
     const U8s most = splat<U8s>(planes.largest);
-    for (int64_t tile = 0; tile < planes.tiles; tile += kBytes / kTile) {
+    for (int64_t tile = 0; tile < planes.tiles; tile += kTilesOfVector) {
         const U8s coverage = inside ? load<U8s>(source + tile * kTile) : U8s{};
         const uint64_t covered = nonZeroLanes(coverage);
         const uint64_t isMost = nonZeroLanes(bitCast<U8s>(coverage == most) & coverage);
-        for (int i = 0; i < kBytes / kTile && tile + i < planes.tiles; ++i) {
+        for (int64_t i = 0; i < kTilesOfVector; ++i) {
             const int64_t at = (tile + i) * kDistances + y % kDistances;
             noteTile(planes.covered, at, covered >> (i * kTileBits % 64));
             noteTile(planes.most, at, isMost >> (i * kTileBits % 64));
