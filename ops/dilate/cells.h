@@ -48,11 +48,13 @@ template <int kReach>
 struct Cells {
     U8s deficits[kReach + 1][kReach + 1];
 
-    explicit Cells(const DiscShape& disc) {
-        for (int dx = 0; dx <= kReach; ++dx) {
-            for (int dy = 0; dy <= dx; ++dy)
-                deficits[dx][dy] = splat<U8s>(cellDeficit(disc, dx, dy));
-        }
+    /// Here, so that they stay in registers.
+    VOREL_INLINE explicit Cells(const DiscShape& disc) {
+        unrolled<kReach + 1>([&](auto x) VOREL_INLINE_LAMBDA {
+            unrolled<x.value + 1>([&](auto y) VOREL_INLINE_LAMBDA {
+                deficits[x.value][y.value] = splat<U8s>(cellDeficit(disc, x.value, y.value));
+            });
+        });
     }
     VOREL_INLINE U8s dilated(const uint8_t* source, int64_t stride) const {
         U8s result = {};
