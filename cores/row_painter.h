@@ -36,8 +36,9 @@ class WindowPainter : public WindowBands {
     }
 
   protected:
-    /// Without windows it paints nothing.
-    explicit WindowPainter(const PlacedTarget& target) : mTarget(target) {}
+    /// The target, or what it is made of. Without windows it paints nothing.
+    template <class... Target>
+    explicit WindowPainter(const Target&... target) : mTarget(target...) {}
     ~WindowPainter() = default;
 
     /// In the coordinates of the picture that lies on the target.

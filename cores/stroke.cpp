@@ -32,7 +32,7 @@ namespace internal {
 
 StrokePainter::StrokePainter(const VFECore::ParamPostProcessing& params, const CoverageBox& box,
                              const StrokeShape& shape, uint32_t color, int64_t workingBytes)
-    : WindowPainter({chosenLevel(), params.dstBitmap, box.left, box.top}),
+    : WindowPainter(chosenLevel(), params.dstBitmap, box.left, box.top),
       mSecondTarget(chosenLevel(), params.subDstBitmap, box.left, box.top),
       mRule(&BlendLoops::dstOverMask),
       mColor(color),
@@ -50,10 +50,13 @@ StrokePainter::StrokePainter(const VFECore::ParamPostProcessing& params, const C
         return windowsWithin(workingBytes / plans, visible, mDisc.reach,
                              [&](const Windows& cut) { return memoryBytes(level, grown, cut); });
     };
-    mWindowsOfSquares = windowsBy(DilationPlan::memoryBytes);
-    const bool isCut = mWindowsOfSquares.areCutAcross() || mWindowsOfSquares.areCutDown();
-    const Windows windows = isCut ? windowsBy(DilationPlan::memoryBytesOfTiles) : mWindowsOfSquares;
-    const int64_t bytes = std::max(windows.memoryBytes, mWindowsOfSquares.memoryBytes);
+    Windows windows = windowsBy(DilationPlan::memoryBytes);
+    int64_t bytes = windows.memoryBytes;
+    if (windows.areCutAcross() || windows.areCutDown()) {
+        mWindowsOfSquares = windows;
+        windows = windowsBy(DilationPlan::memoryBytesOfTiles);
+        bytes = std::max(bytes, windows.memoryBytes);
+    }
     mMemory.emplace(bytes, plans);
     if (!*mMemory) return;
     mGrown.emplace(level, grown, mMemory->data(), bytes);
