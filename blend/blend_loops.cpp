@@ -17,6 +17,8 @@ struct MaskPainter : MaskReader<Rule::kEmpty, Rule::kIsSparse> {
     Pixels fullOverNothing;  ///< what full coverage paints over transparent pixels
 
     VOREL_INLINE bool paintWhole(const Place& place) const {
+        // Vectors of so many pixels are looked at by paint() itself.
+        if (kPixels == kBytes && !hasFullMask(place)) return false;
         if (!isClear<kBytes>(place.destination())) return false;
         const bool isFull = hasFullMask(place);
         for (int64_t x = 0; x < kBytes; x += kPixels) {
