@@ -35,7 +35,6 @@ inline uint8_t cellDeficit(const DiscShape& disc, int dx, int dy) {
 template <int kDx, int kDy>
 VOREL_INLINE U8s mirrored(const uint8_t* source, int64_t stride) {
     const uint8_t* const below = source + kDy * stride;
-    if constexpr (kDx == 0 && kDy == 0) return load<U8s>(source);
     if constexpr (kDy == 0) return max(load<U8s>(source - kDx), load<U8s>(source + kDx));
     const uint8_t* const above = source - kDy * stride;
     if constexpr (kDx == 0) return max(load<U8s>(above), load<U8s>(below));
@@ -57,8 +56,8 @@ struct Cells {
         });
     }
     VOREL_INLINE U8s dilated(const uint8_t* source, int64_t stride) const {
-        U8s result = {};
-        unrolled<kReach + 1>([&](auto x) VOREL_INLINE_LAMBDA {
+        U8s result = subSaturated(load<U8s>(source), deficits[0][0]);
+        unrolled<kReach + 1, 1>([&](auto x) VOREL_INLINE_LAMBDA {
             constexpr int kDx = x.value;
             unrolled<kDx + 1>([&](auto y) VOREL_INLINE_LAMBDA {
                 constexpr int kDy = y.value;
