@@ -145,7 +145,8 @@ U8s growTile(const GrowthJob& job, int from, int64_t x, int64_t y, int64_t rows)
     return Column<true>{source, target, job.stride, inside, behind}.grow(rows);
 }
 
-/// The sides of a tile in which something changed. One plane holds what it was, the other what it is.
+/// At least the sides in which something changed. One plane holds what was there, the other what is
+/// there now; behind the rows they may differ in the first pass, which makes a tile to do too many.
 ChangedSides changedSides(const GrowthJob& job, U8s changes, int64_t x, int64_t y, int64_t rows) {
     const auto hasChanged = [&](int64_t row) {
         const int64_t at = row * job.stride + x;
