@@ -60,7 +60,7 @@ class StrokePainter final : public WindowPainter {
     int64_t bandRows() const override { return mIsCutAnew ? kAllRows : mGrown->bandRows(); }
     void paintBand(const Box& band) override;
 
-    void beginPlans(const Box& window);
+    bool beginPlans(const Box& window);
     bool paintNext(const Box& band);
 
     PlacedTarget mSecondTarget;
@@ -69,7 +69,8 @@ class StrokePainter final : public WindowPainter {
     DiscShape mDisc;
     std::optional<LineBuffer> mMemory;
     // Windows are as wide as tiles' memory allows. Where those give up, which they do on no text, what
-    // is left of a window, and all windows that follow, are cut once more, as squares' memory asks for.
+    // is left of a window, and all windows that follow, are cut once more, as squares' memory asks for,
+    // and are then painted as a whole.
     Windows mWindowsOfSquares = {};
     bool mIsCutAnew = false;
     // What is centred lies within the disc's radius of the edge on both sides of it: in what has grown

@@ -2,6 +2,7 @@
 #include <cstdint>
 #include <optional>
 
+#include "core/assert.h"
 #include "core/effect_types.h"
 #include "core/float_state.h"
 #include "core/numeric.h"
@@ -68,25 +69,27 @@ StrokePainter::StrokePainter(const VFECore::ParamPostProcessing& params, const C
 }
 
 void StrokePainter::beginWindow(const Box& window) {
-    if (!mIsCutAnew) beginPlans(window);
+    mIsCutAnew = mIsCutAnew || !beginPlans(window);
 }
 
 void StrokePainter::paintBand(const Box& band) {
     if (!mIsCutAnew && paintNext(band)) return;
     mIsCutAnew = true;
     const Windows windows = {band, mWindowsOfSquares.width, mWindowsOfSquares.height};
+    VOREL_ASSERT(windows.width > 0 && windows.height > 0);
     windows.forEach([&](const Box& window) {
-        beginPlans(window);
+        const bool hasBegun = beginPlans(window);
+        VOREL_ASSERT(hasBegun);
         for (int64_t y = window.top; y < window.bottom; y += mGrown->bandRows()) {
             const int64_t end = std::min(y + mGrown->bandRows(), window.bottom);
-            paintNext({window.left, y, window.right, end});
+            const bool isPainted = paintNext({window.left, y, window.right, end});
+            VOREL_ASSERT(isPainted);
         }
     });
 }
 
-void StrokePainter::beginPlans(const Box& window) {
-    mGrown->begin(window);
-    if (mInverse) mInverse->begin(window);
+bool StrokePainter::beginPlans(const Box& window) {
+    return mGrown->begin(window) && (!mInverse || mInverse->begin(window));
 }
 
 /// Paints the next band of the window that the plans have turned to, unless there is no memory for it.

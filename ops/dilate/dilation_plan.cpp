@@ -79,12 +79,15 @@ DilationPlan::DilationPlan(CpuLevel level, const DilationInput& input, uint8_t* 
       mMemory(memory),
       mMemoryBytes(memoryBytes) {}
 
-void DilationPlan::begin(const Box& window) {
+bool DilationPlan::begin(const Box& window) {
     mDilation = dilationOf(mInput, window);
     mFirstRow = window.top - mDilation.top;
     mNextRow = window.top;
+    // Of all other strategies every window has it.
+    if (mStrategy == &mLoops.squares && !hasMemory()) return false;
     VOREL_ASSERT(hasMemory());
     mStrategy->begin(mDilation, mMemory);
+    return true;
 }
 
 void DilationPlan::giveUpTiles() {
@@ -98,8 +101,9 @@ CoverageRows DilationPlan::rows(int64_t y, int64_t count) {
 CoverageRows DilationPlan::minRows(DilationPlan& other, int64_t y, int64_t count) {
     VOREL_ASSERT(mDilation.left == other.mDilation.left && mDilation.right == other.mDilation.right);
     uint8_t* const values = nextRows(y, count);
+    if (values == nullptr) return {};
     const uint8_t* const others = other.nextRows(y, count);
-    if (values == nullptr || others == nullptr) return {};
+    if (others == nullptr) return {};
     mLoops.keepMin(values, others, dilatedStride(mDilation) * count);
     return asRows(values, count);
 }

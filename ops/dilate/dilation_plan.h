@@ -27,7 +27,7 @@ class DilationPlan {
 
     /// What a plan for any of the windows takes, whatever is in it: a multiple of kArenaAlignment.
     static int64_t memoryBytes(CpuLevel level, const DilationInput& input, const Windows& windows);
-    /// Likewise, as long as tiles do not give up. Squares take some three times as much.
+    /// Likewise, as long as tiles do not give up. Squares of a large disc take more.
     static int64_t memoryBytesOfTiles(CpuLevel level, const DilationInput& input,
                                       const Windows& windows);
 
@@ -35,8 +35,10 @@ class DilationPlan {
     /// source's coordinates, are of what is reached.
     DilationPlan(CpuLevel level, const DilationInput& input, uint8_t* memory, int64_t memoryBytes);
 
-    /// Turns to a window, or a part of one.
-    void begin(const Box& window);
+    /// Turns to a window, or a part of one. Returns false when tiles have given up, in this window or in
+    /// an earlier one, and memory does not suffice for squares: from there on windows have to be such as
+    /// memoryBytes() allows.
+    [[nodiscard]] bool begin(const Box& window);
 
     /// From the next window on what tiles would do is done by squares, as if they had given up.
     void giveUpTiles();
@@ -48,7 +50,7 @@ class DilationPlan {
     /// from the window's top on. The rows stay until the next call.
     ///
     /// There are none, and their start is null, where tiles give up and memory does not suffice for
-    /// squares: from there on memoryBytes() counts, and the plan has to turn to windows that it allows.
+    /// squares.
     CoverageRows rows(int64_t y, int64_t count);
 
     /// Likewise, of each result the smaller one of this plan's and of another's for the same window.

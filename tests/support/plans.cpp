@@ -182,8 +182,7 @@ std::vector<uint8_t> dilated(const CoverageRows& source, const DiscShape& disc, 
     }
     Collected values(part);
     windows.forEach([&](const Box& window) {
-        plan.begin(window);
-        other.begin(window);
+        if (!plan.begin(window) || !other.begin(window)) return;
         for (int64_t y = window.top; y < window.bottom; y += plan.bandRows()) {
             const int64_t count = std::min(plan.bandRows(), window.bottom - y);
             values.put(andInverse ? plan.minRows(other, y, count) : plan.rows(y, count), window.left, y);
@@ -230,8 +229,7 @@ void askForRowsOutOfOrder() {
     const int64_t bytes = DilationPlan::memoryBytes(chosenLevel(), input, Windows::oneOf(part));
     LineBuffer memory(bytes);
     DilationPlan plan(chosenLevel(), input, memory.data(), bytes);
-    plan.begin(part);
-    plan.rows(1, 1);
+    if (plan.begin(part)) plan.rows(1, 1);
 }
 
 TermsOfWeights termsOf(const BlurWeights& weights) {
