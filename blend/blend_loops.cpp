@@ -17,7 +17,7 @@ struct MaskPainter : MaskReader<Rule::kEmpty, Rule::kIsSparse> {
     Pixels fullOverNothing;  ///< what full coverage paints over transparent pixels
 
     VOREL_INLINE bool paintWhole(const Place& place) const {
-        // Vectors of so many pixels are looked at by paint() itself.
+        // Of a vector of so many pixels full coverage alone is painted quicker than by its rule.
         if (kPixels == kBytes && !hasFullMask(place)) return false;
         if (!isClear<kBytes>(place.destination())) return false;
         const bool isFull = hasFullMask(place);

@@ -57,6 +57,8 @@ StrokePainter::StrokePainter(const VFECore::ParamPostProcessing& params, const C
         mWindowsOfSquares = windows;
         windows = windowsBy(DilationPlan::memoryBytesOfTiles);
         bytes = std::max(bytes, windows.memoryBytes);
+        // Else tiles could take more memory in a window that is cut anew than in the wide ones.
+        VOREL_ASSERT(!windows.areCutAcross() || mWindowsOfSquares.areCutAcross());
     }
     mMemory.emplace(bytes, plans);
     if (!*mMemory) return;

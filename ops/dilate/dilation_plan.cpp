@@ -83,7 +83,7 @@ bool DilationPlan::begin(const Box& window) {
     mDilation = dilationOf(mInput, window);
     mFirstRow = window.top - mDilation.top;
     mNextRow = window.top;
-    // Of all other strategies every window has it.
+    // All other strategies have memory for every window.
     if (mStrategy == &mLoops.squares && !hasMemory()) return false;
     VOREL_ASSERT(hasMemory());
     mStrategy->begin(mDilation, mMemory);

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cstddef>
 
+#include "core/assert.h"
 #include "core/effect_types.h"
 #include "core/line_buffer.h"
 #include "cores/glow.h"
@@ -182,7 +183,8 @@ std::vector<uint8_t> dilated(const CoverageRows& source, const DiscShape& disc, 
     }
     Collected values(part);
     windows.forEach([&](const Box& window) {
-        if (!plan.begin(window) || !other.begin(window)) return;
+        const bool hasBegun = plan.begin(window) && other.begin(window);
+        VOREL_ASSERT(hasBegun);
         for (int64_t y = window.top; y < window.bottom; y += plan.bandRows()) {
             const int64_t count = std::min(plan.bandRows(), window.bottom - y);
             values.put(andInverse ? plan.minRows(other, y, count) : plan.rows(y, count), window.left, y);

@@ -60,7 +60,7 @@ struct Noted : WindowBands {
         window = begun;
         next = begun.top;
     }
-    /// 1 to 3, of each band another number.
+    /// 1 to 3, by where it begins.
     int64_t bandRows() const override { return std::abs(next) % 3 + 1; }
     void paintBand(const Box& band) override {
         ASSERT_EQ(next, band.top);

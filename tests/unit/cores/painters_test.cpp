@@ -118,7 +118,6 @@ Scene sceneUnlikeText(Random& random, int width, int height, int from, int margi
     return sceneOf(mask, {margin, margin, margin + width, margin + height});
 }
 
-/// Tiles give large strokes of such masks up half-way, where less memory than squares need has to do.
 void expectTheSameInOneWindow(Random& random, const Scene& scene, float size, int position,
                               int64_t bytes) {
     const VFStrokeProperty record = {size, randomPremultiplied(random), 1.0F, 0, position};
@@ -128,6 +127,7 @@ void expectTheSameInOneWindow(Random& random, const Scene& scene, float size, in
         << "size " << size << ", position " << position << ", " << bytes << " bytes";
 }
 
+/// Tiles give large strokes of such masks up half-way, where less memory than squares need has to do.
 TEST(Painters, StrokesThatTilesGiveUp_AreTheSameInWindows) {
     forSeeds(0, 80, [](Random& random) {
         const int width = random.between(200, 400);
@@ -141,7 +141,7 @@ TEST(Painters, StrokesThatTilesGiveUp_AreTheSameInWindows) {
 }
 
 /// The last window of a row, the narrowest one, may have memory for squares where the next one, as wide
-/// as the others, has none. Each of these is so at some level, with noise in that window alone.
+/// as the others, has none. Each of these is so at some level, where noise begins in that window.
 TEST(Painters, StrokesThatTilesGiveUpInTheLastColumn_AreTheSameInWindows) {
     struct Gap {
         int width, height;
@@ -149,7 +149,8 @@ TEST(Painters, StrokesThatTilesGiveUpInTheLastColumn_AreTheSameInWindows) {
         int position;
         int64_t bytes;
     };
-    constexpr Gap kGaps[] = {{389, 183, 23.0F, 1, 131072},
+    constexpr Gap kGaps[] = {{296, 231, 34.0F, 1, 131072},
+                             {389, 183, 23.0F, 1, 131072},
                              {233, 177, 48.0F, 0, 262144},
                              {385, 161, 44.0F, 0, 262144},
                              {240, 152, 40.0F, 0, 262144}};
@@ -160,6 +161,28 @@ TEST(Painters, StrokesThatTilesGiveUpInTheLastColumn_AreTheSameInWindows) {
             const Scene scene = sceneUnlikeText(random, gap.width, gap.height, from, reach + 1);
             expectTheSameInOneWindow(random, scene, gap.size, gap.position, gap.bytes);
         }
+    }
+}
+
+/// Likewise with full coverage close to every pixel, so that of the two dilations of a centred stroke
+/// only that of the inverse is given up.
+TEST(Painters, StrokesOfWhichOneDilationIsGivenUp_AreTheSameInWindows) {
+    constexpr int kWidth = 819;
+    constexpr int kHeight = 478;
+    constexpr int kMargin = 39;
+    for (const int from : {500, 600, 700}) {
+        Random random(static_cast<uint64_t>(from));
+        literal::Mask mask = filledMask(kWidth + 2 * kMargin, kHeight + 2 * kMargin, 0);
+        for (int y = 0; y < kHeight; ++y) {
+            for (int x = 0; x < kWidth; ++x) {
+                const int ramp = (x + y) % 240 + random.between(0, 15);
+                const bool isFull = x < from || (x % 6 == 0 && y % 6 == 0);
+                mask.bytes[static_cast<size_t>((y + kMargin) * mask.width + x + kMargin)] =
+                    static_cast<uint8_t>(isFull ? 255 : 255 - ramp);
+            }
+        }
+        const literal::Box box = {kMargin, kMargin, kMargin + kWidth, kMargin + kHeight};
+        expectTheSameInOneWindow(random, sceneOf(mask, box), 76.0F, 0, 1 << 20);
     }
 }
 
