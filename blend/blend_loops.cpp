@@ -17,8 +17,9 @@ struct MaskPainter : MaskReader<Rule::kEmpty, Rule::kIsSparse> {
     Pixels fullOverNothing;  ///< what full coverage paints over transparent pixels
 
     VOREL_INLINE bool paintWhole(const Place& place) const {
-        // Of a vector of so many pixels full coverage alone is painted quicker than by its rule.
-        if (kPixels == kBytes && !hasFullMask(place)) return false;
+        // Full coverage alone is worth it where vectors are looked at one by one anyway, or hold as many
+        // pixels.
+        if ((Rule::kIsSparse || kPixels == kBytes) && !hasFullMask(place)) return false;
         if (!isClear<kBytes>(place.destination())) return false;
         const bool isFull = hasFullMask(place);
         for (int64_t x = 0; x < kBytes; x += kPixels) {
